@@ -1,0 +1,27 @@
+# Flags for our own targets alone; they travel by linking this target and never by global variables.
+add_library(quarn_compile_options INTERFACE)
+target_compile_features(quarn_compile_options INTERFACE cxx_std_20)
+target_compile_options(quarn_compile_options INTERFACE -Wall -Wextra -Wpedantic -Wshadow)
+
+if(QUARN_SANITIZERS)
+    target_compile_options(quarn_compile_options INTERFACE
+        -fsanitize=${QUARN_SANITIZERS} -fno-sanitize-recover=all -fno-omit-frame-pointer)
+    target_link_options(quarn_compile_options INTERFACE -fsanitize=${QUARN_SANITIZERS})
+endif()
+if(QUARN_FUZZ)
+    target_compile_options(quarn_compile_options INTERFACE -fsanitize=fuzzer-no-link)
+endif()
+
+# Geometry must come out the same on every machine, so no multiply and add is fused.
+add_library(quarn_exact_arithmetic INTERFACE)
+target_compile_options(quarn_exact_arithmetic INTERFACE -ffp-contract=off)
+
+# Without unique symbols dlclose really unloads a plug-in and destroys its objects.
+add_library(quarn_unloadable INTERFACE)
+target_compile_options(quarn_unloadable INTERFACE $<$<CXX_COMPILER_ID:GNU>:-fno-gnu-unique>)
+
+# The sanitizer runtimes of clang come with the executable, so a library there has open symbols.
+add_library(quarn_no_open_symbols INTERFACE)
+if(NOT (CMAKE_CXX_COMPILER_ID MATCHES "Clang" AND (QUARN_SANITIZERS OR QUARN_FUZZ)))
+    target_link_options(quarn_no_open_symbols INTERFACE -Wl,-z,defs)
+endif()

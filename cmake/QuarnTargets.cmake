@@ -1,0 +1,40 @@
+# Lists the C++ sources that match `pattern` below the current folder.
+#   quarn_sources(<variable> [RECURSE] <pattern>...)
+macro(quarn_sources variable)
+    cmake_parse_arguments(arg "RECURSE" "" "" ${ARGN})
+    if(arg_RECURSE)
+        file(GLOB_RECURSE ${variable} CONFIGURE_DEPENDS ${arg_UNPARSED_ARGUMENTS})
+    else()
+        file(GLOB ${variable} CONFIGURE_DEPENDS ${arg_UNPARSED_ARGUMENTS})
+    endif()
+endmacro()
+
+# Restricts the exported symbols of `target` to what the version script `map` names.
+function(quarn_export_only target map)
+    target_link_options(${target} PRIVATE "-Wl,--version-script=${map}")
+    set_property(TARGET ${target} APPEND PROPERTY LINK_DEPENDS "${map}")
+endfunction()
+
+# Makes `target`, a module, a plug-in file `<name>.qnp` in `folder`.
+function(quarn_plugin_file target name folder)
+    set_target_properties(${target} PROPERTIES
+        PREFIX "" OUTPUT_NAME "${name}" SUFFIX ".qnp"
+        LIBRARY_OUTPUT_DIRECTORY "${folder}")
+endfunction()
+
+# Copies `files` to <build>/<folder> whenever they change, and installs them to <prefix>/<folder>.
+function(quarn_shared_files target folder)
+    set(copies)
+    foreach(file IN LISTS ARGN)
+        cmake_path(GET file FILENAME name)
+        set(copy "${PROJECT_BINARY_DIR}/${folder}/${name}")
+        add_custom_command(OUTPUT "${copy}"
+            COMMAND ${CMAKE_COMMAND} -E copy "${file}" "${copy}"
+            DEPENDS "${file}" VERBATIM)
+        list(APPEND copies "${copy}")
+    endforeach()
+    add_custom_target(${target} ALL DEPENDS ${copies})
+    if(QUARN_INSTALL AND ARGN)
+        install(FILES ${ARGN} DESTINATION ${folder})
+    endif()
+endfunction()
