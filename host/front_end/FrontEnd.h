@@ -1,0 +1,68 @@
+#pragma once
+
+#include "kelmar/KM_wString.h"
+#include "sdk/qncore/QnExport.h"
+#include "sdk/qncore/QnWnd.h"
+
+#include <filesystem>
+#include <optional>
+#include <string_view>
+#include <vector>
+
+namespace quarn {
+
+/// An option that a question offers.
+struct QuestionOption {
+    KM_wString english_name;
+    KM_wString local_name;
+    KM_wString value; ///< shown as `Name=Value`; empty for a plain option
+};
+
+/// A question that a command asks a person.
+struct Question {
+    enum class Kind { option, string, integer, number };
+    Kind kind = Kind::option;
+    KM_wString prompt;                   ///< without a colon
+    std::vector<QuestionOption> options; ///< in the order they were added
+    std::optional<KM_wString> default_answer;
+    bool accepts_nothing = false;
+};
+
+/// What a person answered: a word, Enter, Escape, or nothing because nobody can be asked.
+struct Answer {
+    enum class Kind { text, enter, cancel, nobody };
+    Kind kind = Kind::nobody;
+    KM_wString text;
+};
+
+/// The port through which everything is asked of, and told to, a person. The host calls it on the
+/// main thread only. Implementations throw nothing.
+class QNCORE_API FrontEnd {
+public:
+    virtual ~FrontEnd();
+
+    /// Shows text on the command line; line breaks are part of the text.
+    virtual void print(std::wstring_view text) = 0;
+    /// Asks a question and waits for one answer. The host checks the answer and asks again.
+    virtual Answer ask(const Question& question) = 0;
+    /// Shows a message and waits until it is confirmed. @return 1
+    virtual int showMessage(std::wstring_view text, std::wstring_view title, unsigned flags) = 0;
+    /// Lets a person choose a folder. @return nothing when none was chosen
+    virtual std::optional<std::filesystem::path>
+    chooseFolder(std::wstring_view title, std::wstring_view message,
+                 const std::filesystem::path& start_folder) = 0;
+    /// Works on its events for that long.
+    virtual void pumpEvents(unsigned milliseconds) = 0;
+    /// Whether a key is down now.
+    virtual bool isKeyDown(int virtual_key) = 0;
+    /// Whether the person asked the program to stop. Once true the host refuses further captures.
+    virtual bool isInterrupted() const = 0;
+    /// The main window; null where there is none.
+    virtual HWND mainWindow() = 0;
+    /// Told after a picture of an animation was written.
+    /// @param written  pictures of this recording so far, from 1
+    /// @param total    frames of the animation; 0 when that is not known
+    virtual void frameWritten(const std::filesystem::path& file, int written, int total) = 0;
+};
+
+} // namespace quarn

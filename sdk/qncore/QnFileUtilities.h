@@ -1,0 +1,19 @@
+#pragma once
+
+#include "kelmar/KM_wString.h"
+#include "sdk/qncore/QnExport.h"
+
+/// Questions about files and folders. Paths are absolute or relative to the working folder.
+class QNCORE_API CQuarnFileUtilities {
+public:
+    CQuarnFileUtilities() = delete;
+
+    /// The folder for the user's documents, without a separator at its end.
+    /// @return false, with `folder` untouched, when no such folder is known
+    static bool GetMyDocumentsFolder(KM_wString& folder);
+    /// Whether a folder of this name exists. False for null and for a file.
+    static bool DirExists(const wchar_t* path);
+    /// Makes the folder, and those above it, where it does not exist.
+    /// @return true when the folder exists now; false when it cannot be made or the path is empty
+    static bool CreateDir(const wchar_t* path);
+};

@@ -1,0 +1,26 @@
+#pragma once
+
+/// The host's whole programming interface.
+
+#include "sdk/qncore/QnApp.h"
+#include "sdk/qncore/QnCommand.h"
+#include "sdk/qncore/QnDib.h"
+#include "sdk/qncore/QnDirDialog.h"
+#include "sdk/qncore/QnDisplayAttributes.h"
+#include "sdk/qncore/QnDisplayPipeline.h"
+#include "sdk/qncore/QnDoc.h"
+#include "sdk/qncore/QnDocProperties.h"
+#include "sdk/qncore/QnExport.h"
+#include "sdk/qncore/QnFileUtilities.h"
+#include "sdk/qncore/QnGet.h"
+#include "sdk/qncore/QnLightTable.h"
+#include "sdk/qncore/QnLocalize.h"
+#include "sdk/qncore/QnObject.h"
+#include "sdk/qncore/QnPlatform.h"
+#include "sdk/qncore/QnPlugIn.h"
+#include "sdk/qncore/QnSun.h"
+#include "sdk/qncore/QnTextFile.h"
+#include "sdk/qncore/QnView.h"
+#include "sdk/qncore/QnWinApp.h"
+#include "sdk/qncore/QnWnd.h"
+#include "sdk/qncore/QnZoetrixDynamicAccess.h"
