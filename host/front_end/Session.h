@@ -1,0 +1,88 @@
+#pragma once
+
+#include "host/front_end/FrontEnd.h"
+#include "sdk/qncore/QnCommand.h"
+#include "sdk/qncore/QnDoc.h"
+#include "sdk/qncore/QnExport.h"
+
+#include <filesystem>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace quarn {
+
+/// What a session is started with.
+struct SessionOptions {
+    /// Where plug-ins are looked for when they are needed, in this order.
+    std::vector<std::filesystem::path> plug_in_folders;
+    /// Folders of the host's own string tables (`<language>.json`).
+    std::vector<std::filesystem::path> locale_folders;
+    /// The user's language ("de", "ja"); empty takes it from the environment.
+    std::string language;
+    /// The user's documents folder; empty takes it from the environment, and where that knows none
+    /// there is none.
+    std::filesystem::path documents_folder;
+};
+
+/// How a plug-in file was loaded, or why not.
+struct PlugInLoad {
+    enum class Outcome {
+        loaded,
+        loaded_before,
+        unknown_id,
+        file_missing,
+        not_a_library,
+        exports_missing,
+        version_mismatch,
+        load_refused,
+    };
+    Outcome outcome = Outcome::loaded;
+    /// One sentence for a person; empty when it was loaded.
+    std::string message;
+
+    bool ok() const { return outcome <= Outcome::loaded_before; }
+};
+
+/// The running host: the application, its documents and its plug-ins, behind one front end. There
+/// is at most one session at a time; it belongs to the main thread.
+class QNCORE_API Session {
+public:
+    /// Starts the host with one new document. The front end must outlive the session.
+    Session(FrontEnd& front_end, SessionOptions options);
+    /// Closes the documents, then unloads the plug-ins, the last loaded first.
+    ~Session();
+    Session(const Session&) = delete;
+    Session& operator=(const Session&) = delete;
+
+    /// Loads a plug-in file.
+    PlugInLoad loadPlugIn(const std::filesystem::path& file);
+
+    /// Registers the plug-in and command objects that are built into the program itself, and loads
+    /// that plug-in, as if they had come from a plug-in file.
+    PlugInLoad adoptProgramPlugIn();
+
+    /// Runs one command line, or nothing for a blank one.
+    ///
+    /// @param interactive  true when a person typed it into a window and may be shown dialogs
+    /// @return how the command ended; failure, with a message, for an unknown command
+    CQuarnCommand::result runCommand(std::wstring_view line, bool interactive = false);
+
+    /// Runs a script file: one command line per line; blank lines and lines that start with "#" are
+    /// skipped. Stops at the first command that does not succeed, and tells its line.
+    /// @return true when every command succeeded
+    bool runScriptFile(const std::filesystem::path& file);
+
+    /// The active document; there is always one. Valid until another one is opened.
+    CQuarnDoc& document();
+
+    /// True once a command asked the program to end.
+    bool isExitRequested() const;
+
+private:
+    struct State;
+    std::unique_ptr<State> m_state;
+};
+
+} // namespace quarn
