@@ -1,0 +1,25 @@
+#pragma once
+
+/// Everything of the geometry toolkit.
+
+#include "kelmar/KM_3dPointArray.h"
+#include "kelmar/KM_AnimationProperties.h"
+#include "kelmar/KM_Array.h"
+#include "kelmar/KM_BoundingBox.h"
+#include "kelmar/KM_Circle.h"
+#include "kelmar/KM_Color.h"
+#include "kelmar/KM_Curve.h"
+#include "kelmar/KM_Export.h"
+#include "kelmar/KM_Interval.h"
+#include "kelmar/KM_Light.h"
+#include "kelmar/KM_Line.h"
+#include "kelmar/KM_LineCurve.h"
+#include "kelmar/KM_Mesh.h"
+#include "kelmar/KM_NurbsCurve.h"
+#include "kelmar/KM_Plane.h"
+#include "kelmar/KM_Point.h"
+#include "kelmar/KM_PolylineCurve.h"
+#include "kelmar/KM_Uuid.h"
+#include "kelmar/KM_Viewport.h"
+#include "kelmar/KM_Xform.h"
+#include "kelmar/KM_wString.h"
