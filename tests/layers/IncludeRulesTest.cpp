@@ -1,0 +1,90 @@
+#include "tests/layers/IncludeRules.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+using layers::breachesBelow;
+using layers::Include;
+using layers::includesOf;
+using layers::isAllowed;
+
+std::string listed(const std::vector<std::string>& lines) {
+    std::string text;
+    for (const std::string& line : lines) {
+        text += line + "\n";
+    }
+    return text;
+}
+
+bool allowsQuoted(const std::string& file, const std::string& path) {
+    return isAllowed(file, Include{1, true, path});
+}
+
+bool allowsAngled(const std::string& file, const std::string& path) {
+    return isAllowed(file, Include{1, false, path});
+}
+
+TEST(Layers, NoSourceOfTheProjectIncludesWhatItMayNotKnow) {
+    EXPECT_EQ(listed(breachesBelow(QUARN_SOURCE_DIR)), "");
+}
+
+TEST(Layers, EveryBreachOfTheSampleTreeIsReported) {
+    EXPECT_EQ(listed(breachesBelow(QUARN_SOURCE_DIR "/tests/layers/sample")),
+              "desktop/Window.h:2: may not include host/document/Document.h\n"
+              "host/app/Loader.h:2: may not include zoetrix/plugin/ZoetrixPlugIn.h\n"
+              "host/app/Loader.h:3: may not include vexui/Form.h\n"
+              "kelmar/KM_Shape.h:2: may not include sdk/qncore/QnDoc.h\n"
+              "kelmar/KM_Shape.h:3: may not include embree3/rtcore.h\n"
+              "quarn/Program.h:3: may not include host/app/Loader.h\n"
+              "quarn/Program.h:4: may not include kelmar/KM_Shape.h\n"
+              "sdk/qncore/QnDoc.h:2: may not include host/document/Document.h\n"
+              "vexui/Form.h:4: may not include zoetrix/ui/TurnTableDialog.h\n"
+              "zoetrix/commands/cmdTurntable.h:3: may not include host/app/Loader.h\n"
+              "zoetrix/commands/cmdTurntable.h:4: may not include ZoetrixApp.h\n"
+              "zoetrix/paths/Path.h:3: may not include zoetrix/commands/cmdTurntable.h\n"
+              "zoetrix/plugin/ZoetrixPlugIn.h:3: may not include zoetrix/ZoetrixGlobals.cpp\n"
+              "zoetrix/sun/VyrSun.h:3: may not include kelmar/KM_Shape.h\n");
+}
+
+TEST(Layers, CommentedOutIncludesDoNotCount) {
+    const auto includes =
+        includesOf("// #include <a>\n  #  include \"b/c.h\" // why\n#import <d>\n");
+    ASSERT_EQ(includes.size(), 2u);
+    EXPECT_EQ(includes[0].line, 2);
+    EXPECT_TRUE(includes[0].quoted);
+    EXPECT_EQ(includes[0].path, "b/c.h");
+    EXPECT_EQ(includes[1].line, 3);
+    EXPECT_FALSE(includes[1].quoted);
+    EXPECT_EQ(includes[1].path, "d");
+}
+
+TEST(Layers, TheCalculatorOfTheSunKnowsTheStandardLibraryAlone) {
+    EXPECT_TRUE(allowsAngled("zoetrix/sun/VyrSun.cpp", "cmath"));
+    EXPECT_TRUE(allowsQuoted("zoetrix/sun/VyrSun.cpp", "zoetrix/sun/VyrSun.h"));
+    EXPECT_FALSE(allowsQuoted("zoetrix/sun/VyrSun.cpp", "zoetrix/plugin/ZoetrixUtilities.h"));
+    EXPECT_FALSE(allowsQuoted("zoetrix/sun/VyrSun.h", "sdk/qncore/QnSun.h"));
+}
+
+TEST(Layers, EveryOtherFolderOfThePlugInMayUseTheUtilities) {
+    for (const std::string folder : {"sun", "paths", "commands", "ui", "plugin"}) {
+        EXPECT_TRUE(
+            allowsQuoted("zoetrix/" + folder + "/A.cpp", "zoetrix/plugin/ZoetrixUtilities.h"))
+            << folder;
+    }
+    EXPECT_FALSE(allowsQuoted("zoetrix/sun/A.cpp", "zoetrix/plugin/ZoetrixPlugIn.h"));
+    EXPECT_FALSE(allowsQuoted("zoetrix/ui/A.cpp", "zoetrix/commands/cmdZoetrix.h"));
+}
+
+TEST(Layers, OnlyTheGlobalObjectsStandAboveTheFoldersOfThePlugIn) {
+    EXPECT_TRUE(allowsQuoted("zoetrix/ZoetrixGlobals.cpp", "zoetrix/commands/cmdTurntable.h"));
+    EXPECT_TRUE(allowsQuoted("zoetrix/ZoetrixGlobals.cpp", "zoetrix/plugin/ZoetrixApp.h"));
+    EXPECT_FALSE(allowsQuoted("zoetrix/ZoetrixGlobals.cpp", "host/app/Loader.h"));
+    EXPECT_FALSE(allowsQuoted("zoetrix/commands/A.cpp", "zoetrix/ZoetrixGlobals.h"));
+}
+
+TEST(Layers, AFolderWithoutARuleMayIncludeNothing) {
+    EXPECT_FALSE(allowsQuoted("attic/A.cpp", "kelmar/KM_Point.h"));
+}
+
+} // namespace

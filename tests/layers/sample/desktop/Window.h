@@ -1,0 +1,3 @@
+#pragma once
+#include "host/document/Document.h"
+#include <QWidget>

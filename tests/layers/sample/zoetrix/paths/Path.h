@@ -1,0 +1,3 @@
+#pragma once
+#include "zoetrix/plugin/ZoetrixPlugIn.h"
+#include "zoetrix/commands/cmdTurntable.h"

@@ -1,0 +1,3 @@
+#pragma once
+#include "zoetrix/paths/Path.h"
+#include "zoetrix/ZoetrixGlobals.cpp"

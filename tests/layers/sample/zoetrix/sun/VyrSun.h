@@ -1,0 +1,3 @@
+#pragma once
+#include <cmath>
+#include "kelmar/KM_Shape.h"
