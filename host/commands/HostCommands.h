@@ -1,0 +1,28 @@
+#pragma once
+
+#include "sdk/qncore/QnCommand.h"
+
+#include <memory>
+#include <vector>
+
+namespace quarn {
+
+/// One of the host's own commands.
+struct HostCommandEntry {
+    const wchar_t* name;        ///< English; letters and digits only
+    const char* id;             ///< its fixed UUID
+    const wchar_t* description; ///< English, one line without a full stop, shown by `Help`
+    int description_id;         ///< its number in the string tables, from 41001
+    CQuarnCommand::result (*run)(const CQuarnCommandContext& context);
+};
+
+/// Makes the command objects of the table in HostCommands.cpp, in its order. They are announced
+/// nowhere: whoever takes them registers them.
+std::vector<std::unique_ptr<CQuarnCommand>> makeHostCommands();
+
+CQuarnCommand::result runExit(const CQuarnCommandContext& context);
+CQuarnCommand::result runHelp(const CQuarnCommandContext& context);
+CQuarnCommand::result runLoadPlugIn(const CQuarnCommandContext& context);
+CQuarnCommand::result runRun(const CQuarnCommandContext& context);
+
+} // namespace quarn
