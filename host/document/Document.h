@@ -1,0 +1,95 @@
+#pragma once
+
+#include "host/document/DocumentSun.h"
+#include "host/document/LightStore.h"
+#include "host/document/ObjectTable.h"
+#include "host/document/ViewState.h"
+#include "sdk/qncore/QnDoc.h"
+
+#include <memory>
+#include <string_view>
+#include <vector>
+
+namespace quarn {
+
+class DisplayScene;
+class DocumentList;
+class FrontEnd;
+struct ImportedModel;
+
+/// A camera that a model file brought along.
+struct NamedView {
+    KM_wString name;
+    KM_Viewport viewport;
+};
+
+/// An open document: objects, lights, sun and views. Owned by the DocumentList.
+class Document {
+public:
+    /// The tolerance of a document that no model was read into, in document units.
+    static constexpr double default_absolute_tolerance = 0.001;
+
+    /// A document without objects and with four views: Top, Front and Right in parallel
+    /// projection, and Perspective, which is active.
+    Document(DocumentList& list, unsigned int serial_number);
+    ~Document();
+    Document(const Document&) = delete;
+    Document& operator=(const Document&) = delete;
+
+    /// The document behind the one that plug-ins see.
+    static Document& of(const CQuarnDoc& document);
+    CQuarnDoc& face() { return m_face; }
+
+    unsigned int serialNumber() const { return m_serial_number; }
+    DocumentList& list() const { return m_list; }
+    FrontEnd& frontEnd() const;
+
+    ObjectTable& objects() { return m_objects; }
+    const ObjectTable& objects() const { return m_objects; }
+    LightStore& lights() { return m_lights; }
+    DocumentSun& sun() { return m_sun; }
+    CQuarnDocProperties& properties() { return m_properties; }
+
+    const std::vector<std::unique_ptr<ViewState>>& views() const { return m_views; }
+    ViewState& activeView() const { return *m_active_view; }
+    /// The view with this name, ignoring case, or null.
+    ViewState* findView(std::wstring_view name) const;
+    /// Makes the view with this name, ignoring case, the active one. @return false: there is none
+    bool activateView(std::wstring_view name);
+    const std::vector<NamedView>& namedViews() const { return m_named_views; }
+
+    double absoluteTolerance() const { return m_absolute_tolerance; }
+
+    /// Adds all that a model file holds. Meshes are shared, not copied. The tolerance becomes a
+    /// millionth of the box of all objects where that is less than it was, so that a model of a
+    /// millimetre in a document of metres is not smaller than what counts as one point.
+    void addModel(const ImportedModel& model);
+
+    /// The lights that shine now: the sun, when it is on, and the lights of the table.
+    std::vector<KM_Light> shiningLights() const;
+
+    /// The scene of all objects, brought up to date. Built once for each revision of the objects
+    /// and shared by the views.
+    DisplayScene& scene();
+
+private:
+    void addStandardViews();
+    void fitTolerance();
+
+    DocumentList& m_list;
+    unsigned int m_serial_number;
+    ObjectTable m_objects;
+    LightStore m_lights;
+    DocumentSun m_sun;
+    double m_absolute_tolerance = default_absolute_tolerance;
+    std::vector<NamedView> m_named_views;
+    std::vector<std::unique_ptr<ViewState>> m_views;
+    ViewState* m_active_view = nullptr;
+    std::unique_ptr<DisplayScene> m_scene;
+    CQuarnDocProperties m_properties;
+    CQuarnDoc m_face;
+
+    friend class ::CQuarnDoc;
+};
+
+} // namespace quarn

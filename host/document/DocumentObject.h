@@ -1,0 +1,38 @@
+#pragma once
+
+#include "host/document/Material.h"
+#include "kelmar/KM_BoundingBox.h"
+#include "kelmar/KM_Curve.h"
+#include "kelmar/KM_Mesh.h"
+#include "sdk/qncore/QnObject.h"
+
+#include <memory>
+#include <optional>
+
+namespace quarn {
+
+/// An object of a document: exactly one of mesh, curve and point is there. Owned by its
+/// ObjectTable; others keep its id.
+struct DocumentObject {
+    DocumentObject() : face(*this) {}
+    DocumentObject(const DocumentObject&) = delete;
+    DocumentObject& operator=(const DocumentObject&) = delete;
+
+    KM_UUID id = KM_nil_uuid; ///< never changes
+    KM_wString name;          ///< empty when it has none
+    bool visible = true;
+
+    std::shared_ptr<const KM_Mesh> mesh;      ///< shared with the ray scene, never changed
+    std::shared_ptr<const Material> material; ///< of a mesh; null: the default material
+    std::unique_ptr<KM_Curve> curve;
+    std::optional<KM_3dPoint> point;
+
+    /// "mesh", "curve" or "point", in English.
+    const wchar_t* kind() const;
+    /// The box of the object in world coordinates.
+    KM_BoundingBox boundingBox() const;
+
+    CQuarnObject face; ///< what plug-ins see of it
+};
+
+} // namespace quarn

@@ -1,0 +1,40 @@
+#pragma once
+
+#include "sdk/qncore/QnLightTable.h"
+
+#include <vector>
+
+namespace quarn {
+
+/// The lights of a document. Slots of deleted lights stay, so that an index that was handed out
+/// never means another light.
+class LightStore {
+public:
+    LightStore() : m_face(*this) {}
+    LightStore(const LightStore&) = delete;
+    LightStore& operator=(const LightStore&) = delete;
+
+    int count() const { return static_cast<int>(m_slots.size()); }
+    /// The light in a slot; one that counts as deleted for an index without a slot.
+    const CQuarnLight& at(int index) const;
+    /// @return the index of the light's slot, or -1 when the light has no style, no valid place or
+    ///         no direction where it needs one
+    int add(const KM_Light& light);
+    /// @return false, with nothing changed, when the index names no live light
+    bool remove(int index);
+
+    /// The lights that are there and switched on.
+    std::vector<KM_Light> shiningLights() const;
+
+    /// What plug-ins see of the table.
+    CQuarnLightTable& face() { return m_face; }
+
+private:
+    std::vector<CQuarnLight> m_slots;
+    CQuarnLight m_no_light = deletedLight();
+    CQuarnLightTable m_face;
+
+    static CQuarnLight deletedLight();
+};
+
+} // namespace quarn

@@ -1,0 +1,55 @@
+#pragma once
+
+#include "host/document/DocumentObject.h"
+
+#include <cstdint>
+#include <map>
+#include <memory>
+#include <string_view>
+#include <vector>
+
+namespace quarn {
+
+/// The objects of a document, in the order in which they were added.
+class ObjectTable {
+public:
+    /// Adds an object with a new id. A name that another object has already gets a number behind
+    /// it ("Wall 2"), so that a name typed by a person means one object.
+    /// @return the object; valid until it is removed
+    DocumentObject& addMesh(const KM_wString& name, std::shared_ptr<const KM_Mesh> mesh,
+                            std::shared_ptr<const Material> material);
+    DocumentObject& addCurve(const KM_wString& name, std::unique_ptr<KM_Curve> curve);
+    DocumentObject& addPoint(const KM_wString& name, const KM_3dPoint& point);
+
+    /// Removes an object. @return false when there is none with this id
+    bool remove(const KM_UUID& id);
+
+    /// The object with this id, or null.
+    DocumentObject* find(const KM_UUID& id) const;
+    /// The object with this name, ignoring case, or null.
+    DocumentObject* findByName(std::wstring_view name) const;
+
+    /// Shows or hides an object. @return true when its visibility changed
+    bool setVisible(const KM_UUID& id, bool visible);
+
+    const std::vector<std::unique_ptr<DocumentObject>>& objects() const { return m_objects; }
+    bool empty() const { return m_objects.empty(); }
+
+    /// The box of all visible objects; not valid when there are none.
+    KM_BoundingBox visibleBox() const;
+
+    /// Rises whenever an object is added, removed or changed, but not when it is shown or hidden.
+    std::uint64_t revision() const { return m_revision; }
+
+private:
+    DocumentObject& add(const KM_wString& name);
+    KM_wString freeName(const KM_wString& wish);
+
+    std::vector<std::unique_ptr<DocumentObject>> m_objects;
+    std::map<KM_UUID, DocumentObject*> m_by_id;
+    std::map<KM_wString, DocumentObject*> m_by_name; ///< by the name in lower case
+    std::map<KM_wString, int> m_last_number;         ///< by the name in lower case
+    std::uint64_t m_revision = 1;
+};
+
+} // namespace quarn
