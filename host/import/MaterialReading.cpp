@@ -1,0 +1,205 @@
+#include "host/import/MaterialReading.h"
+
+#include "host/import/ColorSpace.h"
+#include "host/import/TextureDecoding.h"
+
+#include <assimp/GltfMaterial.h>
+#include <assimp/material.h>
+#include <assimp/scene.h>
+
+#include <algorithm>
+#include <array>
+#include <cmath>
+#include <span>
+
+namespace quarn {
+namespace {
+
+struct TextureReference {
+    std::string name;
+    unsigned coordinates = 0;
+    std::array<aiTextureMapMode, 2> modes{aiTextureMapMode_Wrap, aiTextureMapMode_Wrap};
+};
+
+bool findTexture(const aiMaterial& source, TextureReference& reference) {
+    for (const aiTextureType type : {aiTextureType_BASE_COLOR, aiTextureType_DIFFUSE}) {
+        aiString path;
+        if (source.GetTexture(type, 0, &path, nullptr, &reference.coordinates, nullptr, nullptr,
+                              reference.modes.data()) == aiReturn_SUCCESS &&
+            path.length > 0) {
+            reference.name = path.C_Str();
+            return true;
+        }
+    }
+    return false;
+}
+
+TextureWrap wrapOf(aiTextureMapMode mode) {
+    if (mode == aiTextureMapMode_Mirror) {
+        return TextureWrap::mirror;
+    }
+    const bool clamps = mode == aiTextureMapMode_Clamp || mode == aiTextureMapMode_Decal;
+    return clamps ? TextureWrap::clamp : TextureWrap::repeat;
+}
+
+aiColor4D baseColorOf(const aiMaterial& source) {
+    aiColor4D color(0.8F, 0.8F, 0.8F, 1.0F);
+    if (source.Get(AI_MATKEY_BASE_COLOR, color) == aiReturn_SUCCESS) {
+        return color;
+    }
+    source.Get(AI_MATKEY_COLOR_DIFFUSE, color);
+    color.a = 1.0F;
+    source.Get(AI_MATKEY_OPACITY, color.a);
+    return color;
+}
+
+bool hasTransparency(const Texture& texture) {
+    for (std::size_t i = 3; i < texture.rgba.size(); i += 4) {
+        if (texture.rgba[i] < 128) {
+            return true;
+        }
+    }
+    return false;
+}
+
+/// Holes in the texture are holes in the surface, where the file says that its alpha counts.
+void readCutout(const aiMaterial& source, Material& material) {
+    aiString mode;
+    const bool has_mode = source.Get(AI_MATKEY_GLTF_ALPHAMODE, mode) == aiReturn_SUCCESS;
+    const bool has_opacity_map = source.GetTextureCount(aiTextureType_OPACITY) > 0;
+    const std::string_view name = mode.C_Str();
+    material.alpha_cutout = has_mode ? name == "MASK" || name == "BLEND" : has_opacity_map;
+    if (name == "MASK") {
+        source.Get(AI_MATKEY_GLTF_ALPHACUTOFF, material.alpha_cutoff);
+        const float cutoff = material.alpha_cutoff;
+        material.alpha_cutoff = std::isfinite(cutoff) ? std::clamp(cutoff, 0.0F, 1.0F) : 0.5F;
+    }
+    if (material.alpha_cutout && name != "MASK") {
+        material.alpha_cutout =
+            material.base_color_texture != nullptr && hasTransparency(*material.base_color_texture);
+    }
+}
+
+/// Pixels that the file holds as they are. The sizes were checked when the file was read.
+std::shared_ptr<Texture> textureFromPixels(const aiTexture& source) {
+    const std::size_t count = static_cast<std::size_t>(source.mWidth) * source.mHeight;
+    auto texture = std::make_shared<Texture>();
+    texture->width = static_cast<int>(source.mWidth);
+    texture->height = static_cast<int>(source.mHeight);
+    texture->rgba.reserve(4 * count);
+    for (const aiTexel& texel : std::span(source.pcData, count)) {
+        texture->rgba.insert(texture->rgba.end(), {texel.r, texel.g, texel.b, texel.a});
+    }
+    return texture;
+}
+
+Result<Texture> decodeEmbedded(const aiTexture& source) {
+    const auto* bytes = reinterpret_cast<const std::uint8_t*>(source.pcData);
+    return decodeTexture({bytes, source.mWidth});
+}
+
+} // namespace
+
+MaterialReading::MaterialReading(const aiScene& scene, const ModelFolder& folder,
+                                 bool linear_colors, std::vector<std::string>& warnings)
+    : m_scene(scene), m_folder(folder), m_linear_colors(linear_colors), m_warnings(warnings) {}
+
+const ReadMaterial& MaterialReading::at(unsigned index) {
+    const auto found = m_materials.find(index);
+    if (found != m_materials.end()) {
+        return found->second;
+    }
+    ReadMaterial material;
+    if (index < m_scene.mNumMaterials && m_scene.mMaterials[index] != nullptr) {
+        material = read(*m_scene.mMaterials[index]);
+    }
+    return m_materials.emplace(index, std::move(material)).first->second;
+}
+
+ReadMaterial MaterialReading::read(const aiMaterial& source) {
+    ReadMaterial result;
+    aiString name;
+    source.Get(AI_MATKEY_NAME, name);
+    const std::string_view text(name.data, name.length);
+    const bool made_up = text == AI_DEFAULT_MATERIAL_NAME || text.empty();
+    if (made_up && source.GetTextureCount(aiTextureType_DIFFUSE) == 0 && !m_linear_colors) {
+        return result;
+    }
+    result.material = std::make_shared<Material>();
+    result.material->name = KM_wString::FromUtf8(text);
+    const aiColor4D c = baseColorOf(source);
+    result.material->base_color =
+        m_linear_colors ? colorFromLinear(c.r, c.g, c.b, c.a) : colorFromSrgb(c.r, c.g, c.b, c.a);
+    readTexture(source, result);
+    readCutout(source, *result.material);
+    return result;
+}
+
+void MaterialReading::readTexture(const aiMaterial& source, ReadMaterial& result) {
+    TextureReference reference;
+    if (!findTexture(source, reference)) {
+        return;
+    }
+    Material& material = *result.material;
+    result.texture_coordinates = reference.coordinates;
+    material.base_color_texture =
+        texture({reference.name, wrapOf(reference.modes[0]), wrapOf(reference.modes[1])});
+    KM_Color& color = material.base_color;
+    if (material.base_color_texture != nullptr && color.r == 0 && color.g == 0 && color.b == 0) {
+        // Many programs write black where the texture alone gives the colour.
+        color = {255, 255, 255, color.a};
+    }
+}
+
+std::shared_ptr<const Texture> MaterialReading::texture(const TextureKey& key) {
+    const auto found = m_textures.find(key);
+    if (found != m_textures.end()) {
+        return found->second;
+    }
+    const auto& [reference, wrap_u, wrap_v] = key;
+    std::shared_ptr<Texture> loaded = load(reference);
+    if (loaded != nullptr) {
+        loaded->wrap_u = wrap_u;
+        loaded->wrap_v = wrap_v;
+    }
+    m_textures.emplace(key, loaded);
+    return loaded;
+}
+
+std::shared_ptr<Texture> MaterialReading::load(const std::string& reference) {
+    const aiTexture* embedded = m_scene.GetEmbeddedTexture(reference.c_str());
+    if (embedded == nullptr || embedded->pcData == nullptr) {
+        return loadFile(reference);
+    }
+    if (embedded->mHeight > 0) {
+        return textureFromPixels(*embedded);
+    }
+    Result<Texture> decoded = decodeEmbedded(*embedded);
+    if (!decoded) {
+        warnLeftOut(reference, decoded.message());
+        return nullptr;
+    }
+    return std::make_shared<Texture>(std::move(decoded.value()));
+}
+
+std::shared_ptr<Texture> MaterialReading::loadFile(const std::string& reference) {
+    const auto path = m_folder.find(reference);
+    if (!path) {
+        warnLeftOut(reference, m_folder.leadsOutside(reference)
+                                   ? "it lies outside the model's folder"
+                                   : "there is no such file beside the model");
+        return nullptr;
+    }
+    Result<Texture> decoded = readTextureFile(*path);
+    if (!decoded) {
+        warnLeftOut(reference, decoded.message());
+        return nullptr;
+    }
+    return std::make_shared<Texture>(std::move(decoded.value()));
+}
+
+void MaterialReading::warnLeftOut(const std::string& reference, const std::string& why) {
+    m_warnings.push_back("The texture '" + reference + "' was left out: " + why + ".");
+}
+
+} // namespace quarn

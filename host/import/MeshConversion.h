@@ -1,0 +1,35 @@
+#pragma once
+
+#include "kelmar/KM_Mesh.h"
+#include "kelmar/KM_Xform.h"
+
+#include <cstddef>
+#include <memory>
+
+struct aiMesh;
+
+namespace quarn {
+
+/// How one mesh of a model file becomes a mesh of ours.
+struct MeshReading {
+    KM_Xform world_from_mesh;
+    bool keep_normals = true;         ///< false: the file's normals say no more than its triangles
+    bool linear_colors = false;       ///< vertex colours are linear light, not sRGB
+    unsigned texture_coordinates = 0; ///< which set of the mesh to take
+};
+
+struct ConvertedMesh {
+    std::shared_ptr<KM_Mesh> mesh; ///< may be without triangles
+    std::size_t triangles_dropped =
+        0; ///< index out of range, or a coordinate that is no usable number
+};
+
+/// The triangles of `mesh` in world coordinates, with a normal for each vertex. Only vertices that
+/// a triangle uses are kept; where no two triangles share a vertex, equal ones are made one.
+ConvertedMesh convertTriangles(const aiMesh& mesh, const MeshReading& reading);
+
+/// True for a coordinate that can be drawn: a number, and small enough that distances between such
+/// numbers do not overflow.
+bool isUsableCoordinate(double coordinate);
+
+} // namespace quarn

@@ -1,0 +1,139 @@
+#include "host/import/ModelFile.h"
+
+#include "host/import/ModelFileAccess.h"
+#include "host/import/ModelFileCheck.h"
+#include "host/import/SceneReading.h"
+
+#include <assimp/Importer.hpp>
+#include <assimp/commonMetaData.h>
+#include <assimp/config.h>
+#include <assimp/postprocess.h>
+#include <assimp/scene.h>
+
+#include <algorithm>
+#include <array>
+#include <exception>
+#include <set>
+#include <string_view>
+
+namespace quarn {
+namespace {
+
+namespace fs = std::filesystem;
+
+constexpr std::string_view repair = "The file may be damaged; export the model again.";
+
+/// One sentence of the reading library as a part of one of ours.
+std::string cleaned(std::string_view text) {
+    constexpr std::size_t longest = 300;
+    std::string clean(text.substr(0, longest));
+    std::replace_if(
+        clean.begin(), clean.end(), [](char c) { return static_cast<unsigned char>(c) < 32; }, ' ');
+    while (!clean.empty() && (clean.back() == ' ' || clean.back() == '.')) {
+        clean.pop_back();
+    }
+    return clean.empty() ? "its contents cannot be understood" : clean;
+}
+
+bool isOneOf(std::string_view format, std::initializer_list<std::string_view> formats) {
+    return std::find(formats.begin(), formats.end(), format) != formats.end();
+}
+
+/// Version 1 of glTF left the meaning of its colours to shaders, which took them as they are.
+bool hasLinearColors(const aiScene& scene, const std::string& format) {
+    aiString version;
+    const bool old = scene.mMetaData != nullptr &&
+                     scene.mMetaData->Get(AI_METADATA_SOURCE_FORMAT_VERSION, version) &&
+                     std::string_view(version.C_Str()).starts_with("1");
+    return isOneOf(format, {"gltf", "glb"}) && !old;
+}
+
+ModelConventions conventionsOf(const aiScene& scene, const fs::path& path) {
+    const std::string format = modelFormat(path);
+    ModelConventions conventions;
+    conventions.turn_y_up =
+        !isOneOf(format, {"obj", "ply", "stl", "off", "3mf", "amf", "dxf", "xyz"});
+    conventions.keep_normals = format != "stl";
+    conventions.linear_colors = hasLinearColors(scene, format);
+    conventions.file_name = KM_wString::FromUtf8(path.stem().string());
+    return conventions;
+}
+
+void configure(Assimp::Importer& importer) {
+    importer.SetPropertyBool(AI_CONFIG_IMPORT_FBX_PRESERVE_PIVOTS, false);
+    importer.SetPropertyBool(AI_CONFIG_IMPORT_FBX_READ_ANIMATIONS, false);
+    importer.SetPropertyBool(AI_CONFIG_IMPORT_NO_SKELETON_MESHES, true);
+}
+
+void warnOfRefused(const std::set<std::string>& refused, const ModelFolder& folder,
+                   ImportedModel& model) {
+    for (const std::string& name : refused) {
+        if (folder.leadsOutside(name)) {
+            model.warnings.push_back("The file '" + name +
+                                     "' was not read: it lies outside the model's folder.");
+        }
+    }
+}
+
+bool isEmpty(const ImportedModel& model) {
+    return model.meshes.empty() && model.curves.empty() && model.points.Count() == 0;
+}
+
+Error nothingLeft(const fs::path& path, const ImportedModel& model) {
+    const std::string why = model.warnings.empty()
+                                ? "it holds no triangles, lines or points"
+                                : "nothing in it can be shown. " + cleaned(model.warnings.back());
+    return cannotReadModel(path, why, "Export the model again, with its meshes.");
+}
+
+Result<ImportedModel> readChecked(const fs::path& path) {
+    const ModelFolder folder(path);
+    std::set<std::string> refused;
+    Assimp::Importer importer;
+    importer.SetIOHandler(new ModelFileAccess(folder, refused)); // the importer owns it
+    configure(importer);
+    const std::string extension = path.extension().string();
+    if (extension.empty() || !importer.IsExtensionSupported(extension)) {
+        return cannotReadModel(path, "files of this kind are not known",
+                               "Choose a model file (OBJ, glTF, GLB, PLY, STL, ...).");
+    }
+    constexpr unsigned steps = aiProcess_ValidateDataStructure | aiProcess_Triangulate |
+                               aiProcess_SortByPType | aiProcess_TransformUVCoords;
+    if (importer.ReadFile(path.string(), steps) == nullptr) {
+        return cannotReadModel(path, cleaned(importer.GetErrorString()), repair);
+    }
+    const std::unique_ptr<aiScene> scene(importer.GetOrphanedScene());
+    importer.FreeScene();
+    Result<ImportedModel> model = takeScene(*scene, folder, conventionsOf(*scene, path));
+    if (!model) {
+        return cannotReadModel(path, model.message(), repair);
+    }
+    warnOfRefused(refused, folder, model.value());
+    return isEmpty(model.value()) ? nothingLeft(path, model.value()) : std::move(model);
+}
+
+} // namespace
+
+std::size_t ImportedModel::triangleCount() const {
+    std::size_t count = 0;
+    for (const ImportedMesh& mesh : meshes) {
+        count += mesh.mesh->m_F.size();
+    }
+    return count;
+}
+
+Result<ImportedModel> readModelFile(const fs::path& path) {
+    const Result<void> checked = checkModelFile(path);
+    if (!checked) {
+        return checked.error();
+    }
+    try {
+        return readChecked(path);
+    } catch (const std::bad_alloc&) {
+        return cannotReadModel(path, "there is not enough memory", "Use a smaller model.");
+    } catch (const std::exception& failure) {
+        return cannotReadModel(path, cleaned(failure.what()), repair);
+    }
+}
+
+} // namespace quarn

@@ -1,0 +1,75 @@
+#pragma once
+
+#include "host/app/Result.h"
+#include "host/document/Material.h"
+#include "kelmar/KM_3dPointArray.h"
+#include "kelmar/KM_Mesh.h"
+#include "kelmar/KM_Viewport.h"
+#include "kelmar/KM_wString.h"
+
+#include <filesystem>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace quarn {
+
+/// A mesh of a model file, in world coordinates.
+struct ImportedMesh {
+    KM_wString name;                    ///< as the file has it, or the file's own name; never empty
+    std::shared_ptr<KM_Mesh> mesh;      ///< valid, with at least one triangle and vertex normals
+    std::shared_ptr<Material> material; ///< shared between meshes; null: the file gives none
+};
+
+/// Line primitives of a model file that hang together, as one polyline in world coordinates. The
+/// last point of a closed one equals its first.
+struct ImportedCurve {
+    KM_wString name;
+    KM_3dPointArray points; ///< at least two
+};
+
+/// A camera of a model file. Its target is where its line of sight comes closest to the middle of
+/// the model.
+struct ImportedCamera {
+    KM_wString name;
+    KM_Viewport viewport;
+};
+
+/// What a model file holds.
+struct ImportedModel {
+    std::vector<ImportedMesh> meshes;
+    std::vector<ImportedCurve> curves;
+    KM_3dPointArray points;
+    std::vector<ImportedCamera> cameras;
+    std::vector<std::string> warnings; ///< sentences for the person: what was left out and why
+
+    /// All triangles of all meshes.
+    std::size_t triangleCount() const;
+};
+
+/// Reads a model file: OBJ, glTF, GLB, PLY, STL, and what else the Assimp library knows (FBX, DAE,
+/// 3DS, 3MF, OFF, ...).
+///
+/// - Coordinates are in the file's own units. Z is up: formats that are Y-up by their definition
+///   (glTF, GLB), or that Assimp hands out Y-up (FBX, DAE, 3DS and others), are turned, with Y to Z
+///   and Z to -Y. OBJ, PLY, STL, OFF, 3MF, AMF and DXF state no axis or are Z-up: they stay as they
+///   are.
+/// - The transforms of the file's nodes are applied, so a mesh that stands in a scene ten times
+///   becomes ten meshes. Mirroring turns the triangles' winding, so that outside stays outside.
+/// - Vertex normals of the file are kept, except those of STL, which only repeat the facets. Where
+///   they are missing, vertices are smoothed over edges flatter than 40 degrees and sharp edges
+///   stay sharp.
+/// - Colours come out in sRGB: base colour factors and vertex colours of glTF are linear in the
+///   file, those of other formats count as sRGB already.
+/// - Other files that the model names (materials, buffers, textures) are read only from the model's
+///   folder and below it; a name that leads elsewhere is left out with a warning.
+/// - Triangles with an index out of range or a coordinate that is no usable number are left out
+///   with a warning.
+///
+/// @param path  the model file; a relative path counts from the current folder
+/// @return the model, with at least one triangle, curve or point; or an error that names the file:
+///   missing, a folder, empty, not readable, larger than 4 GB, of an unknown kind, damaged, or with
+///   nothing to show
+Result<ImportedModel> readModelFile(const std::filesystem::path& path);
+
+} // namespace quarn

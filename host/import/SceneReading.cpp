@@ -1,0 +1,308 @@
+#include "host/import/SceneReading.h"
+
+#include "host/import/MaterialReading.h"
+#include "host/import/MeshConversion.h"
+#include "host/import/PolylineChains.h"
+
+#include <assimp/camera.h>
+#include <assimp/mesh.h>
+#include <assimp/scene.h>
+
+#include <algorithm>
+#include <cmath>
+#include <cstdint>
+#include <map>
+#include <string_view>
+#include <utility>
+
+namespace quarn {
+namespace {
+
+constexpr std::uint64_t most_triangles = 100'000'000;
+
+KM_Xform xformFrom(const aiMatrix4x4& m) {
+    KM_Xform xform;
+    for (unsigned i = 0; i < 4; ++i) {
+        for (unsigned j = 0; j < 4; ++j) {
+            xform.m_xform[i][j] = static_cast<double>(m[i][j]);
+        }
+    }
+    return xform;
+}
+
+/// Y up to Z up: x stays, y becomes z, z becomes -y.
+KM_Xform zUpFromYUp() {
+    KM_Xform xform;
+    xform.m_xform[1][1] = 0.0;
+    xform.m_xform[1][2] = -1.0;
+    xform.m_xform[2][1] = 1.0;
+    xform.m_xform[2][2] = 0.0;
+    return xform;
+}
+
+KM_wString textOf(const aiString& text) {
+    return KM_wString::FromUtf8(std::string_view(text.data, text.length));
+}
+
+struct PlacedNode {
+    const aiNode* node;
+    KM_Xform world_from_node;
+};
+
+/// All nodes, parents before children, in the file's order. Without recursion: a hostile file nests
+/// deeply.
+std::vector<PlacedNode> placedNodes(const aiNode* root, const KM_Xform& world_from_root) {
+    std::vector<PlacedNode> placed;
+    std::vector<PlacedNode> open;
+    if (root != nullptr) {
+        open.push_back({root, world_from_root});
+    }
+    while (!open.empty()) {
+        const auto [node, world_from_parent] = open.back();
+        open.pop_back();
+        const KM_Xform world_from_node = world_from_parent * xformFrom(node->mTransformation);
+        placed.push_back({node, world_from_node});
+        for (unsigned i = node->mNumChildren; i-- > 0;) {
+            open.push_back({node->mChildren[i], world_from_node});
+        }
+    }
+    return placed;
+}
+
+bool isUsablePoint(const KM_3dPoint& p) {
+    return isUsableCoordinate(p.x) && isUsableCoordinate(p.y) && isUsableCoordinate(p.z);
+}
+
+class SceneReader {
+public:
+    SceneReader(aiScene& scene, const ModelFolder& folder, const ModelConventions& conventions)
+        : m_scene(scene), m_conventions(conventions),
+          m_materials(scene, folder, conventions.linear_colors, m_model.warnings) {}
+
+    Result<ImportedModel> read() {
+        m_nodes = placedNodes(m_scene.mRootNode,
+                              m_conventions.turn_y_up ? zUpFromYUp() : KM_Xform::Identity());
+        if (countUses() > most_triangles) {
+            return Error{"its nodes show more than 100 million triangles in all"};
+        }
+        for (const PlacedNode& placed : m_nodes) {
+            for (unsigned i = 0; i < placed.node->mNumMeshes; ++i) {
+                readMesh(placed, placed.node->mMeshes[i]);
+            }
+        }
+        readCameras();
+        warnOfDropped();
+        return std::move(m_model);
+    }
+
+private:
+    std::uint64_t countUses() {
+        m_uses.assign(m_scene.mNumMeshes, 0);
+        std::uint64_t triangles = 0;
+        for (const PlacedNode& placed : m_nodes) {
+            for (unsigned i = 0; i < placed.node->mNumMeshes; ++i) {
+                const unsigned mesh = placed.node->mMeshes[i];
+                if (mesh < m_scene.mNumMeshes) {
+                    ++m_uses[mesh];
+                    triangles += m_scene.mMeshes[mesh]->mNumFaces;
+                }
+            }
+        }
+        return triangles;
+    }
+
+    void readMesh(const PlacedNode& placed, unsigned index) {
+        if (index >= m_scene.mNumMeshes) {
+            return;
+        }
+        const aiMesh& mesh = *m_scene.mMeshes[index];
+        if (mesh.mPrimitiveTypes & aiPrimitiveType_TRIANGLE) {
+            readTriangles(placed, mesh);
+        } else if (mesh.mPrimitiveTypes & aiPrimitiveType_LINE) {
+            readLines(placed, mesh);
+        } else if (mesh.mPrimitiveTypes & aiPrimitiveType_POINT) {
+            readPoints(placed, mesh);
+        }
+        if (--m_uses[index] == 0) {
+            delete std::exchange(m_scene.mMeshes[index], new aiMesh);
+        }
+    }
+
+    void readTriangles(const PlacedNode& placed, const aiMesh& mesh) {
+        const ReadMaterial& material = m_materials.at(mesh.mMaterialIndex);
+        MeshReading reading;
+        reading.world_from_mesh = placed.world_from_node;
+        reading.keep_normals = m_conventions.keep_normals;
+        reading.linear_colors = m_conventions.linear_colors;
+        reading.texture_coordinates = material.texture_coordinates;
+        ConvertedMesh converted = convertTriangles(mesh, reading);
+        m_triangles += mesh.mNumFaces;
+        m_dropped += converted.triangles_dropped;
+        if (!converted.mesh->m_F.empty()) {
+            m_model.meshes.push_back(
+                {nameOf(placed, mesh), std::move(converted.mesh), material.material});
+        }
+    }
+
+    void readLines(const PlacedNode& placed, const aiMesh& mesh) {
+        std::vector<LineSegment> segments;
+        segments.reserve(mesh.mNumFaces);
+        for (unsigned f = 0; f < mesh.mNumFaces; ++f) {
+            const aiFace& face = mesh.mFaces[f];
+            KM_3dPoint from;
+            KM_3dPoint to;
+            if (face.mNumIndices == 2 && readPoint(placed, mesh, face.mIndices[0], from) &&
+                readPoint(placed, mesh, face.mIndices[1], to)) {
+                segments.emplace_back(from, to);
+            } else {
+                ++m_lines_dropped;
+            }
+        }
+        for (KM_3dPointArray& points : joinSegments(segments)) {
+            m_model.curves.push_back({nameOf(placed, mesh), std::move(points)});
+        }
+    }
+
+    void readPoints(const PlacedNode& placed, const aiMesh& mesh) {
+        for (unsigned f = 0; f < mesh.mNumFaces; ++f) {
+            const aiFace& face = mesh.mFaces[f];
+            KM_3dPoint point;
+            if (face.mNumIndices == 1 && readPoint(placed, mesh, face.mIndices[0], point)) {
+                m_model.points.Append(point);
+            } else {
+                ++m_points_dropped;
+            }
+        }
+    }
+
+    static bool readPoint(const PlacedNode& placed, const aiMesh& mesh, unsigned index,
+                          KM_3dPoint& point) {
+        if (index >= mesh.mNumVertices) {
+            return false;
+        }
+        const aiVector3D& p = mesh.mVertices[index];
+        point = placed.world_from_node * KM_3dPoint(p.x, p.y, p.z);
+        return isUsablePoint(point);
+    }
+
+    /// A name that people gave, not one that the reading library made up.
+    KM_wString nameOf(const PlacedNode& placed, const aiMesh& mesh) const {
+        const bool is_root = placed.node == m_scene.mRootNode;
+        const std::string_view own(mesh.mName.data, mesh.mName.length);
+        if (!is_root && placed.node->mName.length > 0) {
+            return textOf(placed.node->mName);
+        }
+        const bool made_up = own.empty() || own == "defaultobject" || own.front() == '<';
+        return made_up ? m_conventions.file_name : textOf(mesh.mName);
+    }
+
+    void readCameras() {
+        std::map<std::string_view, const PlacedNode*> by_name;
+        for (const PlacedNode& placed : m_nodes) {
+            by_name.emplace(std::string_view(placed.node->mName.data, placed.node->mName.length),
+                            &placed);
+        }
+        for (unsigned i = 0; i < m_scene.mNumCameras; ++i) {
+            const aiCamera& camera = *m_scene.mCameras[i];
+            const auto found =
+                by_name.find(std::string_view(camera.mName.data, camera.mName.length));
+            if (found != by_name.end()) {
+                readCamera(camera, found->second->world_from_node);
+            }
+        }
+    }
+
+    void readCamera(const aiCamera& camera, const KM_Xform& world_from_node) {
+        const auto turned = [&world_from_node](const aiVector3D& v) {
+            return world_from_node * KM_3dVector(v.x, v.y, v.z);
+        };
+        const aiVector3D& p = camera.mPosition;
+        const KM_3dPoint location = world_from_node * KM_3dPoint(p.x, p.y, p.z);
+        KM_3dVector direction = turned(camera.mLookAt);
+        ImportedCamera imported;
+        imported.name = textOf(camera.mName);
+        KM_Viewport& viewport = imported.viewport;
+        if (!isUsablePoint(location) || !direction.Unitize() ||
+            !viewport.SetCameraLocation(location)) {
+            return;
+        }
+        const KM_3dPoint target = location + direction * targetDistance(location, direction);
+        viewport.SetTargetPoint(target);
+        viewport.SetCameraDirection(target - location);
+        viewport.SetCameraUp(turned(camera.mUp));
+        setOpening(camera, viewport);
+        if (viewport.IsValidCamera()) {
+            m_model.cameras.push_back(std::move(imported));
+        }
+    }
+
+    double targetDistance(const KM_3dPoint& location, const KM_3dVector& direction) {
+        if (!m_bounds.IsValid()) {
+            for (const ImportedMesh& mesh : m_model.meshes) {
+                m_bounds.Union(mesh.mesh->BoundingBox());
+            }
+        }
+        const double distance =
+            m_bounds.IsValid() ? (m_bounds.Center() - location) * direction : 1.0;
+        return distance > 1e-6 ? distance : 1.0;
+    }
+
+    static void setOpening(const aiCamera& camera, KM_Viewport& viewport) {
+        const double width = static_cast<double>(camera.mOrthographicWidth);
+        if (width > 0.0 && std::isfinite(width)) {
+            const double aspect = camera.mAspect > 0.0F ? static_cast<double>(camera.mAspect) : 1.0;
+            viewport.SetProjection(KM_parallel_view);
+            viewport.SetFrustum(-width, width, -width / aspect, width / aspect, 0.1, 1000.0);
+            return;
+        }
+        const double half_angle = 0.5 * static_cast<double>(camera.mHorizontalFOV);
+        if (half_angle > 0.01 && half_angle < 1.5) {
+            const double aspect =
+                camera.mAspect > 0.0F ? static_cast<double>(camera.mAspect) : 4.0 / 3.0;
+            const double near_distance = 0.1;
+            const double half_width = near_distance * std::tan(half_angle);
+            viewport.SetFrustum(-half_width, half_width, -half_width / aspect, half_width / aspect,
+                                near_distance, 1000.0);
+        }
+    }
+
+    void warnOfDropped() {
+        warn(m_dropped, m_triangles, "triangles");
+        warn(m_lines_dropped, m_lines_dropped, "line segments");
+        warn(m_points_dropped, m_points_dropped, "points");
+    }
+
+    void warn(std::uint64_t dropped, std::uint64_t all, std::string_view what) {
+        if (dropped == 0) {
+            return;
+        }
+        std::string count = std::to_string(dropped);
+        if (all > dropped) {
+            count += " of " + std::to_string(all);
+        }
+        m_model.warnings.push_back(count + " " + std::string(what) +
+                                   " were left out: they have an index that is out of range or a "
+                                   "coordinate that is no usable number.");
+    }
+
+    aiScene& m_scene;
+    const ModelConventions& m_conventions;
+    ImportedModel m_model;
+    MaterialReading m_materials;
+    std::vector<PlacedNode> m_nodes;
+    std::vector<std::uint64_t> m_uses; ///< how many more times each mesh is shown
+    KM_BoundingBox m_bounds;
+    std::uint64_t m_triangles = 0;
+    std::uint64_t m_dropped = 0;
+    std::uint64_t m_lines_dropped = 0;
+    std::uint64_t m_points_dropped = 0;
+};
+
+} // namespace
+
+Result<ImportedModel> takeScene(aiScene& scene, const ModelFolder& folder,
+                                const ModelConventions& conventions) {
+    return SceneReader(scene, folder, conventions).read();
+}
+
+} // namespace quarn
