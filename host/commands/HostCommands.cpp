@@ -14,8 +14,8 @@ constexpr HostCommandEntry HOST_COMMANDS[] = {
      41002, runHelp},
     {L"LoadPlugIn", "E27F5C18-64A9-4D3B-8E15-90BD1C3A5F03", L"Loads a plug-in file", 41003,
      runLoadPlugIn},
-    {L"Run", "0A6D3B92-C57E-4E81-B6F4-3D9E21A8C704", L"Opens a file with the desktop's program for it",
-     41004, runRun},
+    {L"Run", "0A6D3B92-C57E-4E81-B6F4-3D9E21A8C704",
+     L"Opens a file with the desktop's program for it", 41004, runRun},
 };
 
 class HostCommand final : public CQuarnCommand {

@@ -1,0 +1,81 @@
+#pragma once
+
+#include "host/app/CommandRegistry.h"
+#include "host/app/CommandRunner.h"
+#include "host/app/PlugInLoader.h"
+#include "host/app/StringTables.h"
+#include "host/document/DocumentList.h"
+#include "host/front_end/FrontEnd.h"
+#include "host/front_end/Session.h"
+
+#include <filesystem>
+#include <map>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <thread>
+#include <vector>
+
+namespace quarn {
+
+/// The running host. A session owns it; there is at most one, because the programming interface
+/// names no other.
+class Application {
+public:
+    /// Starts with one new document, the host's commands and the host's texts.
+    Application(FrontEnd& front_end, SessionOptions options);
+    /// Closes the documents, then unloads the plug-ins, the last loaded first.
+    ~Application();
+    Application(const Application&) = delete;
+    Application& operator=(const Application&) = delete;
+
+    /// The application that runs now, or null.
+    static Application* current();
+    /// The application, for a call that belongs on the main thread; null when none runs, and, with
+    /// a line on the error output that names the call, on every other thread.
+    static Application* forCall(const char* call);
+
+    FrontEnd& frontEnd() const { return m_front_end; }
+    const SessionOptions& options() const { return m_options; }
+    StringTables& texts() { return m_texts; }
+    CommandRegistry& commands() { return m_commands; }
+    CommandRunner& runner() { return m_runner; }
+    DocumentList& documents() { return *m_documents; }
+    PlugInLoader& plugIns() { return *m_plug_ins; }
+
+    /// Shows text on the command line as it stands.
+    void print(std::wstring_view text);
+    /// Shows a message of the host (UTF-8) as a line of its own.
+    void tell(std::string_view message);
+    /// Tells that a plug-in broke a rule of the interface.
+    /// @param call  the call that was wrong
+    /// @param rule  what it should have kept to
+    void reportBreach(std::string_view call, std::string_view rule);
+
+    /// To be called after a picture was written to a file: counts it for the command that runs, and
+    /// tells the front end. Without a running command nothing happens.
+    void pictureWritten(const std::filesystem::path& file);
+
+    /// The window object for a window; null for a null window.
+    CWnd* windowFor(HWND window);
+
+    void requestExit() { m_exit_requested = true; }
+    bool isExitRequested() const { return m_exit_requested; }
+
+private:
+    void registerHostCommands();
+
+    FrontEnd& m_front_end;
+    SessionOptions m_options;
+    std::thread::id m_main_thread = std::this_thread::get_id();
+    StringTables m_texts;
+    CommandRegistry m_commands;
+    std::vector<std::unique_ptr<CQuarnCommand>> m_host_commands;
+    CommandRunner m_runner;
+    std::unique_ptr<DocumentList> m_documents;
+    std::unique_ptr<PlugInLoader> m_plug_ins;
+    std::map<HWND, std::unique_ptr<CWnd>> m_windows;
+    bool m_exit_requested = false;
+};
+
+} // namespace quarn
