@@ -9,8 +9,8 @@
 /// Wide text: a value type that owns its characters. Indices count characters from 0.
 ///
 /// No operation depends on the process's locale. Case changes and case-blind comparison know
-/// ASCII, Latin-1, Latin Extended-A, Greek, Cyrillic and Armenian, one character to one
-/// character; every other character is its own upper and lower case.
+/// ASCII, the Latin letters of Europe and Vietnam, Greek, Cyrillic and Armenian, one character to
+/// one character; every other character is its own upper and lower case.
 class KELMAR_API KM_wString {
 public:
     KM_wString() = default;
