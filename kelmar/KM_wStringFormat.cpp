@@ -8,13 +8,16 @@
 #include <cstdarg>
 #include <cstddef>
 #include <cstdint>
+#include <limits>
+#include <utility>
 
 namespace {
 
 constexpr int largest_field = 4096;
 
-// Digits of the largest long double before the point, and room for sign and exponent.
-constexpr std::size_t largest_integral_part = 5000;
+// Digits before the point of the largest number, and room for the point and an exponent.
+template <class Number>
+constexpr std::size_t largest_integral_part = std::numeric_limits<Number>::max_exponent10 + 32;
 
 enum class ArgumentSize { char_size, short_size, int_size, long_size, long_long_size, long_double };
 
@@ -264,7 +267,8 @@ private:
                            : kind == L'g' ? std::chars_format::general
                                           : std::chars_format::hex;
         const int precision = conversion.precision < 0 ? 6 : conversion.precision;
-        std::string buffer(largest_integral_part + static_cast<std::size_t>(precision), '\0');
+        std::string buffer(largest_integral_part<Number> + static_cast<std::size_t>(precision),
+                           '\0');
         char* const begin = buffer.data();
         char* const end = begin + buffer.size();
         const bool shortest = kind == L'a' && conversion.precision < 0;
