@@ -1,15 +1,16 @@
 #pragma once
 
+#include "host/display/DisplayMode.h"
 #include "sdk/qncore/QnDisplayAttributes.h"
 
-#include <array>
 #include <span>
 #include <string_view>
+#include <vector>
 
 namespace quarn {
 
-/// The display modes of the host: Wireframe, Shaded, Rendered, Translucent, X-Ray, Drawing, Clay.
-/// There is one list, because the interface promises modes that live as long as the program.
+/// The display modes of the drawing core, as plug-ins see them, in the same order. There is one
+/// list, because the interface promises modes that live as long as the program.
 class DisplayModeList {
 public:
     static DisplayModeList& instance();
@@ -29,8 +30,12 @@ public:
 private:
     DisplayModeList();
 
-    static constexpr int mode_count = 7;
-    std::array<CDisplayPipelineAttributes, mode_count> m_modes;
+    std::vector<CDisplayPipelineAttributes>
+        m_modes; ///< made once, so that they stay in their place
 };
+
+/// What the drawing core draws for attributes that a plug-in may have changed: the mode of their id
+/// with their settings put over it. An id of no mode is drawn as Shaded.
+DisplayModeAttributes drawingAttributes(const CDisplayPipelineAttributes& attributes);
 
 } // namespace quarn

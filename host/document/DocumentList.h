@@ -2,12 +2,14 @@
 
 #include "host/document/Document.h"
 
+#include <filesystem>
 #include <memory>
 #include <vector>
 
 namespace quarn {
 
 class FrontEnd;
+class ImageFileWriter;
 
 /// The open documents. There is at most one list at a time: the interface finds documents by
 /// number and objects by id with no list given, so the list is known to all.
@@ -23,12 +25,13 @@ public:
     static DocumentList* current();
 
     /// Opens a new document and makes it the active one. The document that was active stays open
-    /// until closeReplaced, because a running command may hold it. The animation record that a
+    /// until commandEnded, because a running command may hold it. The animation record that a
     /// plug-in keeps is emptied first, so that nothing of the old document stays in it.
     Document& openNew();
 
-    /// Closes every document but the active one. Called when no command runs.
-    void closeReplaced();
+    /// Called when the outermost command has ended: closes every document but the active one, and
+    /// counts the pictures of an animation from 1 again.
+    void commandEnded();
 
     /// The active document, or null when none was opened.
     Document* active() const { return m_active; }
@@ -37,6 +40,11 @@ public:
     const std::vector<std::unique_ptr<Document>>& documents() const { return m_documents; }
 
     FrontEnd& frontEnd() const { return m_front_end; }
+
+    /// Tells the front end that a picture was written by the command that runs now.
+    void pictureWritten(const std::filesystem::path& file);
+    /// Writes picture files; kept here because setting up an encoder for every frame costs time.
+    ImageFileWriter& imageWriter() { return *m_image_writer; }
 
     /// Keeps a copy of the animation record as it is now: the one that a new document starts with.
     /// Called once after a plug-in that keeps a record was loaded.
@@ -48,6 +56,8 @@ private:
     FrontEnd& m_front_end;
     std::vector<std::unique_ptr<Document>> m_documents;
     Document* m_active = nullptr;
+    int m_pictures_written = 0;
+    std::unique_ptr<ImageFileWriter> m_image_writer;
     std::unique_ptr<KM_3dmAnimationProperties> m_fresh_record;
 };
 

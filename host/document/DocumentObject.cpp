@@ -1,0 +1,68 @@
+#include "host/document/DocumentObject.h"
+
+#include "host/document/DocumentList.h"
+
+namespace quarn {
+
+const wchar_t* DocumentObject::kind() const {
+    if (mesh)
+        return L"mesh";
+    return curve ? L"curve" : L"point";
+}
+
+KM_BoundingBox DocumentObject::boundingBox() const {
+    if (mesh)
+        return mesh->BoundingBox();
+    if (curve)
+        return curve->BoundingBox();
+    return point ? KM_BoundingBox(*point, *point) : KM_BoundingBox::EmptyBoundingBox;
+}
+
+namespace {
+
+const DocumentObject* findInOpenDocuments(const KM_UUID& id) {
+    const DocumentList* list = DocumentList::current();
+    if (!list || KM_UuidIsNil(id))
+        return nullptr;
+    if (const Document* active = list->active())
+        if (const DocumentObject* object = active->objects().find(id))
+            return object;
+    for (const auto& document : list->documents())
+        if (const DocumentObject* object = document->objects().find(id))
+            return object;
+    return nullptr;
+}
+
+} // namespace
+
+} // namespace quarn
+
+KM_UUID CQuarnObject::Id() const {
+    return m_object->id;
+}
+
+const wchar_t* CQuarnObject::Name() const {
+    return m_object->name.Array();
+}
+
+bool CQuarnObject::IsHidden() const {
+    return !m_object->visible;
+}
+
+const KM_Curve* CQuarnObject::Curve() const {
+    return m_object->curve.get();
+}
+
+CQuarnObjRef::CQuarnObjRef() = default;
+
+CQuarnObjRef::CQuarnObjRef(const KM_UUID& id) : m_id(id) {}
+
+const CQuarnObject* CQuarnObjRef::Object() const {
+    const quarn::DocumentObject* object = quarn::findInOpenDocuments(m_id);
+    return object ? &object->face : nullptr;
+}
+
+const KM_Curve* CQuarnObjRef::Curve() const {
+    const CQuarnObject* object = Object();
+    return object ? object->Curve() : nullptr;
+}

@@ -1,0 +1,78 @@
+#include "host/document/LightStore.h"
+
+#include "sdk/qncore/QnApp.h"
+#include "sdk/qncore/QnLocalize.h"
+
+namespace quarn {
+
+namespace {
+
+bool needsDirection(KM_LightStyle style) {
+    return style != KM_LightStyle::camera_point && style != KM_LightStyle::world_point &&
+           style != KM_LightStyle::ambient;
+}
+
+bool canShine(const KM_Light& light) {
+    if (light.Style() == KM_LightStyle::unknown || !light.Location().IsValid())
+        return false;
+    const KM_3dVector& direction = light.Direction();
+    return !needsDirection(light.Style()) || (direction.IsValid() && !direction.IsZero());
+}
+
+} // namespace
+
+CQuarnLight LightStore::deletedLight() {
+    CQuarnLight light;
+    light.m_deleted = true;
+    return light;
+}
+
+const CQuarnLight& LightStore::at(int index) const {
+    if (index < 0 || index >= count())
+        return m_no_light;
+    return m_slots[static_cast<std::size_t>(index)];
+}
+
+int LightStore::add(const KM_Light& light) {
+    if (!canShine(light))
+        return -1;
+    m_slots.emplace_back().m_light = light;
+    return count() - 1;
+}
+
+bool LightStore::remove(int index) {
+    if (at(index).IsDeleted())
+        return false;
+    m_slots[static_cast<std::size_t>(index)].m_deleted = true;
+    return true;
+}
+
+std::vector<KM_Light> LightStore::shiningLights() const {
+    std::vector<KM_Light> lights;
+    for (const CQuarnLight& slot : m_slots)
+        if (!slot.IsDeleted() && slot.Light().IsEnabled())
+            lights.push_back(slot.Light());
+    return lights;
+}
+
+} // namespace quarn
+
+int CQuarnLightTable::LightCount() const {
+    return m_lights->count();
+}
+
+const CQuarnLight& CQuarnLightTable::operator[](int index) const {
+    return m_lights->at(index);
+}
+
+int CQuarnLightTable::AddLight(const KM_Light& light, const KM_3dmObjectAttributes*) {
+    return m_lights->add(light);
+}
+
+bool CQuarnLightTable::DeleteLight(int index, bool quiet) {
+    const bool deleted = m_lights->remove(index);
+    if (!deleted && !quiet)
+        QuarnApp().Print(KM_wString::FormatToString(
+            QnLocalizeString(L"There is no light with the index %d\n", 40101), index));
+    return deleted;
+}

@@ -1,0 +1,98 @@
+#include "host/document/ObjectTable.h"
+
+#include <algorithm>
+
+namespace quarn {
+
+namespace {
+
+KM_wString lowerCase(std::wstring_view text) {
+    KM_wString lower(text);
+    lower.MakeLower();
+    return lower;
+}
+
+} // namespace
+
+DocumentObject& ObjectTable::addMesh(const KM_wString& name, std::shared_ptr<const KM_Mesh> mesh,
+                                     std::shared_ptr<const Material> material) {
+    DocumentObject& object = add(name);
+    object.mesh = std::move(mesh);
+    object.material = std::move(material);
+    return object;
+}
+
+DocumentObject& ObjectTable::addCurve(const KM_wString& name, std::unique_ptr<KM_Curve> curve) {
+    DocumentObject& object = add(name);
+    object.curve = std::move(curve);
+    return object;
+}
+
+DocumentObject& ObjectTable::addPoint(const KM_wString& name, const KM_3dPoint& point) {
+    DocumentObject& object = add(name);
+    object.point = point;
+    return object;
+}
+
+DocumentObject& ObjectTable::add(const KM_wString& name) {
+    DocumentObject& object = *m_objects.emplace_back(std::make_unique<DocumentObject>());
+    object.id = KM_CreateUuid();
+    object.name = freeName(name);
+    m_by_id[object.id] = &object;
+    if (!object.name.IsEmpty())
+        m_by_name[lowerCase(object.name.View())] = &object;
+    ++m_revision;
+    return object;
+}
+
+KM_wString ObjectTable::freeName(const KM_wString& wish) {
+    if (wish.IsEmpty() || !findByName(wish.View()))
+        return wish;
+    // The number that was given last is kept, so that a thousand equal names stay quick.
+    int& number = m_last_number.try_emplace(lowerCase(wish.View()), 1).first->second;
+    KM_wString numbered;
+    do {
+        numbered = wish + KM_wString::FormatToString(L" %d", ++number);
+    } while (findByName(numbered.View()));
+    return numbered;
+}
+
+bool ObjectTable::remove(const KM_UUID& id) {
+    const DocumentObject* object = find(id);
+    if (!object)
+        return false;
+    if (!object->name.IsEmpty())
+        m_by_name.erase(lowerCase(object->name.View()));
+    m_by_id.erase(id);
+    std::erase_if(m_objects, [&](const auto& entry) { return entry.get() == object; });
+    ++m_revision;
+    return true;
+}
+
+DocumentObject* ObjectTable::find(const KM_UUID& id) const {
+    const auto found = m_by_id.find(id);
+    return found == m_by_id.end() ? nullptr : found->second;
+}
+
+DocumentObject* ObjectTable::findByName(std::wstring_view name) const {
+    const auto found = m_by_name.find(lowerCase(name));
+    return found == m_by_name.end() ? nullptr : found->second;
+}
+
+bool ObjectTable::setVisible(const KM_UUID& id, bool visible) {
+    DocumentObject* object = find(id);
+    if (!object || object->visible == visible)
+        return false;
+    object->visible = visible;
+    return true;
+}
+
+KM_BoundingBox ObjectTable::visibleBox() const {
+    KM_BoundingBox box;
+    for (const auto& object : m_objects)
+        if (object->visible)
+            box.Union(object->boundingBox());
+    return box;
+}
+
+} // namespace quarn
