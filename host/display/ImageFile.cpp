@@ -1,0 +1,89 @@
+#include "host/display/ImageFile.h"
+
+#include "host/app/AtomicFile.h"
+#include "host/display/JpegFormat.h"
+#include "host/display/PlainFormats.h"
+#include "host/display/PngFormat.h"
+
+#include <algorithm>
+#include <array>
+#include <utility>
+
+namespace quarn {
+namespace {
+
+std::string whyNotEncodable(const ImageView& image) {
+    if (image.width <= 0 || image.height <= 0) {
+        return "the picture is empty";
+    }
+    const std::uint64_t pixels =
+        static_cast<std::uint64_t>(image.width) * static_cast<std::uint64_t>(image.height);
+    return image.rgba.size() == 4 * pixels ? std::string()
+                                           : "the picture's pixels do not fit its size";
+}
+
+} // namespace
+
+std::optional<ImageFormat> imageFormatFor(std::string_view extension) {
+    std::string name(extension.substr(extension.starts_with('.') ? 1 : 0));
+    for (char& c : name) {
+        c = c >= 'A' && c <= 'Z' ? static_cast<char>(c + 32) : c;
+    }
+    static constexpr std::array<std::pair<std::string_view, ImageFormat>, 5> formats{
+        {{"jpg", ImageFormat::jpeg},
+         {"jpeg", ImageFormat::jpeg},
+         {"png", ImageFormat::png},
+         {"bmp", ImageFormat::bmp},
+         {"tga", ImageFormat::tga}}};
+    const auto found = std::find_if(formats.begin(), formats.end(),
+                                    [&name](const auto& format) { return format.first == name; });
+    return found == formats.end() ? std::nullopt : std::optional(found->second);
+}
+
+struct ImageEncoder::Buffers {
+    JpegEncoder jpeg;
+    std::vector<std::byte> bytes;
+};
+
+ImageEncoder::ImageEncoder() : m_buffers(std::make_unique<Buffers>()) {}
+ImageEncoder::~ImageEncoder() = default;
+ImageEncoder::ImageEncoder(ImageEncoder&&) noexcept = default;
+ImageEncoder& ImageEncoder::operator=(ImageEncoder&&) noexcept = default;
+
+Result<std::span<const std::byte>> ImageEncoder::encode(const ImageView& image,
+                                                        ImageFormat format) {
+    if (const std::string why = whyNotEncodable(image); !why.empty()) {
+        return Error{why};
+    }
+    if (format == ImageFormat::jpeg) {
+        return m_buffers->jpeg.encode(image);
+    }
+    std::vector<std::byte>& bytes = m_buffers->bytes;
+    bytes.clear();
+    const Result<void> encoded = format == ImageFormat::png   ? encodePng(image, bytes)
+                                 : format == ImageFormat::bmp ? encodeBmp(image, bytes)
+                                                              : encodeTga(image, bytes);
+    if (!encoded) {
+        return encoded.error();
+    }
+    return std::span<const std::byte>(bytes);
+}
+
+Result<void> ImageEncoder::write(const std::filesystem::path& path, const ImageView& image) {
+    const auto format = imageFormatFor(path.extension().string());
+    if (!format) {
+        return Error{"Cannot write '" + path.string() + "': pictures of the kind '" +
+                     path.extension().string() + "' are not known. Choose jpg, png, bmp or tga."};
+    }
+    const auto encoded = encode(image, *format);
+    if (!encoded) {
+        return Error{"Cannot write '" + path.string() + "': " + encoded.message() + "."};
+    }
+    return writeFileAtomically(path, encoded.value());
+}
+
+Result<void> writeImageFile(const std::filesystem::path& path, const ImageView& image) {
+    return ImageEncoder().write(path, image);
+}
+
+} // namespace quarn
