@@ -1,0 +1,20 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <string_view>
+
+namespace quarn::program {
+
+/// The option that picks a capture mode at the prompt of the set-up commands.
+///
+/// @param name  a display mode's name, with or without its blanks and hyphens and in any case,
+///              or the prompt's own name for it ("RenderedViewport"), or a render method
+/// @return the English option as a script writes it ("_RenderedViewport"), or nothing for a name
+///         that is no mode's
+std::optional<std::string> captureOption(std::string_view name);
+
+/// The names that captureOption understands, as a person reads them: "Wireframe, Shaded, ...".
+std::string captureModeNames();
+
+} // namespace quarn::program

@@ -1,0 +1,112 @@
+#include "quarn/ConsoleFrontEnd.h"
+
+#include "quarn/Interruption.h"
+
+#include <thread>
+
+namespace quarn::program {
+
+namespace {
+
+constexpr std::chrono::milliseconds PROGRESS_STEP{50};
+
+std::string utf8(std::wstring_view text) {
+    return KM_wString(text).ToUtf8();
+}
+
+std::string trimmed(const std::string& line) {
+    constexpr const char* BLANKS = " \t\r\n";
+    const std::size_t first = line.find_first_not_of(BLANKS);
+    if (first == std::string::npos)
+        return {};
+    return line.substr(first, line.find_last_not_of(BLANKS) - first + 1);
+}
+
+} // namespace
+
+ConsoleFrontEnd::ConsoleFrontEnd(Prints prints) : m_prints(prints), m_progress(stderr) {}
+
+void ConsoleFrontEnd::beginRecording(int frames) {
+    m_frames_written = 0;
+    m_frames_expected = frames;
+    m_pace = {};
+    m_next_progress = {};
+    forgetLastWords();
+}
+
+std::string ConsoleFrontEnd::lastWords() const {
+    const std::string open_line = trimmed(m_open_line);
+    return open_line.empty() ? m_last_line : open_line;
+}
+
+void ConsoleFrontEnd::forgetLastWords() {
+    m_last_line.clear();
+    m_open_line.clear();
+}
+
+void ConsoleFrontEnd::rememberWords(std::string_view text) {
+    for (const char c : text) {
+        if (c != '\n') {
+            m_open_line += c;
+            continue;
+        }
+        if (std::string line = trimmed(m_open_line); !line.empty())
+            m_last_line = std::move(line);
+        m_open_line.clear();
+    }
+}
+
+void ConsoleFrontEnd::print(std::wstring_view text) {
+    const std::string bytes = utf8(text);
+    rememberWords(bytes);
+    if (m_prints == Prints::hidden)
+        return;
+    m_progress.clear();
+    std::fwrite(bytes.data(), 1, bytes.size(), stdout);
+}
+
+Answer ConsoleFrontEnd::ask(const Question&) {
+    return {};
+}
+
+int ConsoleFrontEnd::showMessage(std::wstring_view text, std::wstring_view title, unsigned) {
+    m_progress.clear();
+    std::fflush(stdout);
+    std::fprintf(stderr, "%s: %s\n", utf8(title).c_str(), trimmed(utf8(text)).c_str());
+    return 1;
+}
+
+std::optional<std::filesystem::path>
+ConsoleFrontEnd::chooseFolder(std::wstring_view, std::wstring_view, const std::filesystem::path&) {
+    return std::nullopt;
+}
+
+void ConsoleFrontEnd::pumpEvents(unsigned milliseconds) {
+    std::this_thread::sleep_for(std::chrono::milliseconds(milliseconds));
+}
+
+bool ConsoleFrontEnd::isKeyDown(int) {
+    return false;
+}
+
+bool ConsoleFrontEnd::isInterrupted() const {
+    return isInterruptionRequested();
+}
+
+HWND ConsoleFrontEnd::mainWindow() {
+    return nullptr;
+}
+
+void ConsoleFrontEnd::frameWritten(const std::filesystem::path&, int written, int total) {
+    const auto now = RecordingPace::Clock::now();
+    m_frames_written = written;
+    forgetLastWords();
+    const int expected = m_frames_expected > 0 ? m_frames_expected : total;
+    m_pace.noteFrame(written, expected, now);
+    if (now < m_next_progress && written != expected)
+        return;
+    m_next_progress = now + PROGRESS_STEP;
+    m_progress.show(m_pace.text());
+}
+
+} // namespace quarn::program

@@ -1,0 +1,58 @@
+#pragma once
+
+#include "host/front_end/FrontEnd.h"
+#include "quarn/ProgressLine.h"
+
+#include <string>
+
+namespace quarn::program {
+
+/// The front end of a program that nobody answers: it shows what it is told to show, keeps the last
+/// words of the host for error messages, and shows how far a recording is.
+class ConsoleFrontEnd final : public FrontEnd {
+public:
+    enum class Prints {
+        hidden, ///< only remembered
+        shown,  ///< on the standard output
+    };
+    explicit ConsoleFrontEnd(Prints prints);
+
+    /// Shows what the program is busy with, where a person can see it go away again.
+    void showStep(std::string_view text) { m_progress.show(text); }
+    void clearProgress() { m_progress.clear(); }
+
+    /// A recording of this many pictures begins: counts from 0 again, and forgets the last words.
+    void beginRecording(int frames);
+    int framesWritten() const { return m_frames_written; }
+
+    /// The last line that the host printed since forgetLastWords; UTF-8, empty when there is none.
+    /// During a recording: since the last picture.
+    std::string lastWords() const;
+    void forgetLastWords();
+
+    void print(std::wstring_view text) override;
+    Answer ask(const Question& question) override;
+    int showMessage(std::wstring_view text, std::wstring_view title, unsigned flags) override;
+    std::optional<std::filesystem::path>
+    chooseFolder(std::wstring_view title, std::wstring_view message,
+                 const std::filesystem::path& start_folder) override;
+    void pumpEvents(unsigned milliseconds) override;
+    bool isKeyDown(int virtual_key) override;
+    bool isInterrupted() const override;
+    HWND mainWindow() override;
+    void frameWritten(const std::filesystem::path& file, int written, int total) override;
+
+private:
+    void rememberWords(std::string_view text);
+
+    Prints m_prints;
+    ProgressLine m_progress;
+    RecordingPace m_pace;
+    RecordingPace::Clock::time_point m_next_progress;
+    std::string m_last_line;
+    std::string m_open_line; ///< printed so far without a line break
+    int m_frames_written = 0;
+    int m_frames_expected = 0;
+};
+
+} // namespace quarn::program

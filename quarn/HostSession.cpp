@@ -1,0 +1,55 @@
+#include "quarn/HostSession.h"
+
+#include "quarn/InstalledFiles.h"
+#include "quarn/Interruption.h"
+#include "quarn/Words.h"
+
+namespace quarn::program {
+
+namespace {
+
+SessionOptions sessionOptions(const CommonOptions& common) {
+    SessionOptions options;
+    options.plug_in_folders = {plugInFolder()};
+    options.locale_folders = {hostLocaleFolder()};
+    options.language = common.language;
+    return options;
+}
+
+} // namespace
+
+HostSession::HostSession(ConsoleFrontEnd& front_end, const CommonOptions& common)
+    : m_front_end(front_end), m_session(front_end, sessionOptions(common)) {}
+
+std::optional<Outcome> HostSession::loadAnimationPlugIn() {
+    const PlugInLoad load = m_session.loadPlugIn(plugInFolder() / "Zoetrix.qnp");
+    if (load.ok())
+        return std::nullopt;
+    return Outcome::failure(load.message);
+}
+
+std::optional<Outcome> HostSession::run(const std::string& line) {
+    if (isInterruptionRequested())
+        return stopped("Stopped before the first picture was recorded.");
+    m_front_end.forgetLastWords();
+    const CQuarnCommand::result result = m_session.runCommand(KM_wString::FromUtf8(line).View());
+    if (result == CQuarnCommand::success)
+        return std::nullopt;
+    const std::string words = m_front_end.lastWords();
+    return Outcome::failure(words.empty() ? "this command failed: " + line : words);
+}
+
+std::optional<Outcome> HostSession::importModel(const std::filesystem::path& model) {
+    if (const auto refusal = whyPathIsRefused("the model's path", model))
+        return Outcome::misuse(*refusal);
+    m_front_end.showStep("reading " + model.filename().native());
+    std::optional<Outcome> trouble = run("_-Import " + quotedPath(model));
+    m_front_end.clearProgress();
+    return trouble;
+}
+
+Outcome stopped(const std::string& message) {
+    return {interruptionExitCode(), message};
+}
+
+} // namespace quarn::program

@@ -1,0 +1,38 @@
+#pragma once
+
+#include "host/front_end/Session.h"
+#include "quarn/CommandLine.h"
+#include "quarn/ConsoleFrontEnd.h"
+
+#include <optional>
+
+namespace quarn::program {
+
+/// The host as this program runs it: with the files that are installed beside the program.
+class HostSession {
+public:
+    HostSession(ConsoleFrontEnd& front_end, const CommonOptions& common);
+
+    /// Loads the plug-in that sets up and records animations.
+    /// @return nothing when it is there, else why it is not
+    std::optional<Outcome> loadAnimationPlugIn();
+
+    /// Runs one host command, in UTF-8.
+    /// @return nothing when it succeeded, else how the program ends
+    std::optional<Outcome> run(const std::string& line);
+
+    /// Reads a model file into the document. Result as of run().
+    std::optional<Outcome> importModel(const std::filesystem::path& model);
+
+    Session& session() { return m_session; }
+    ConsoleFrontEnd& frontEnd() { return m_front_end; }
+
+private:
+    ConsoleFrontEnd& m_front_end;
+    Session m_session;
+};
+
+/// How the program ends when it was asked to stop.
+Outcome stopped(const std::string& message);
+
+} // namespace quarn::program

@@ -1,0 +1,17 @@
+#pragma once
+
+#include <filesystem>
+
+namespace quarn::program {
+
+/// The folder above the program's own: build tree and installed tree look the same from there, so
+/// that either can be moved anywhere. Empty when the system does not tell where the program is.
+std::filesystem::path installedTree();
+
+/// Where plug-in files are.
+std::filesystem::path plugInFolder();
+
+/// Where the host's own string tables are.
+std::filesystem::path hostLocaleFolder();
+
+} // namespace quarn::program

@@ -1,0 +1,13 @@
+#pragma once
+
+#include <filesystem>
+#include <optional>
+#include <string>
+
+namespace quarn::program {
+
+/// Makes the folder where it is not there, and makes sure that files can be written into it.
+/// @return nothing when they can, else why not, naming the folder
+std::optional<std::string> whyFolderCannotBeUsed(const std::filesystem::path& folder);
+
+} // namespace quarn::program

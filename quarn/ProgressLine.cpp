@@ -1,0 +1,80 @@
+#include "quarn/ProgressLine.h"
+
+#include "quarn/Words.h"
+
+#include <cmath>
+#include <unistd.h>
+
+namespace quarn::program {
+
+namespace {
+
+std::string withOneDecimal(double value) {
+    return numberText(std::round(value * 10.0) / 10.0);
+}
+
+std::string longTimeText(long long seconds) {
+    if (seconds < 3600)
+        return std::to_string(seconds / 60) + " min " + std::to_string(seconds % 60) + " s";
+    return std::to_string(seconds / 3600) + " h " + std::to_string(seconds % 3600 / 60) + " min";
+}
+
+} // namespace
+
+ProgressLine::ProgressLine(std::FILE* stream)
+    : m_stream(stream), m_is_terminal(isatty(fileno(stream)) == 1) {}
+
+void ProgressLine::show(std::string_view text) {
+    if (!m_is_terminal)
+        return;
+    std::fprintf(m_stream, "\r%.*s\x1b[K", static_cast<int>(text.size()), text.data());
+    std::fflush(m_stream);
+    m_is_shown = true;
+}
+
+void ProgressLine::clear() {
+    if (!m_is_shown)
+        return;
+    std::fputs("\r\x1b[K", m_stream);
+    std::fflush(m_stream);
+    m_is_shown = false;
+}
+
+void RecordingPace::noteFrame(int written, int total, Clock::time_point now) {
+    if (m_first == 0 || written <= m_written) {
+        m_first = written;
+        m_first_time = now;
+    }
+    m_written = written;
+    m_total = total;
+    m_last_time = now;
+}
+
+double RecordingPace::framesPerSecond() const {
+    const double seconds = std::chrono::duration<double>(m_last_time - m_first_time).count();
+    return seconds > 0.0 ? (m_written - m_first) / seconds : 0.0;
+}
+
+std::string RecordingPace::text() const {
+    std::string text = "frame " + std::to_string(m_written);
+    if (m_total > 0)
+        text += " of " + std::to_string(m_total);
+    const double pace = framesPerSecond();
+    if (pace <= 0.0)
+        return text;
+    text += ", " + withOneDecimal(pace) + " frames/s";
+    if (m_total >= m_written)
+        text += ", " + roughTimeText((m_total - m_written) / pace) + " left";
+    return text;
+}
+
+std::string timeText(double seconds) {
+    return seconds < 59.95 ? withOneDecimal(seconds) + " s" : roughTimeText(seconds);
+}
+
+std::string roughTimeText(double seconds) {
+    const long long whole = std::llround(std::ceil(seconds));
+    return whole < 60 ? std::to_string(whole) + " s" : longTimeText(whole);
+}
+
+} // namespace quarn::program

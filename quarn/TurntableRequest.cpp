@@ -1,0 +1,123 @@
+#include "quarn/TurntableRequest.h"
+
+#include "quarn/AnimationName.h"
+#include "quarn/CaptureMode.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace quarn::program {
+
+namespace {
+
+constexpr int LARGEST_SIZE_PX = 16384;
+constexpr double STEEPEST_ELEVATION_DEG = 89.0;
+
+std::string notBut(const std::string& word) {
+    return ", not \"" + word + "\".";
+}
+
+/// Reads one option after the other and keeps the first mistake.
+class TurntableCheck {
+public:
+    explicit TurntableCheck(const TurntableOptions& options) : m_typed(options) {}
+
+    std::variant<TurntableRequest, Outcome> run() {
+        checkPaths();
+        checkName();
+        checkFrames();
+        checkSize();
+        checkMode();
+        checkFormat();
+        checkDirection();
+        checkCamera();
+        if (m_mistake)
+            return Outcome::misuse(*m_mistake);
+        return m_request;
+    }
+
+private:
+    void refuse(std::optional<std::string> mistake) {
+        if (!m_mistake)
+            m_mistake = std::move(mistake);
+    }
+
+    void checkPaths() {
+        m_request.model = m_typed.model;
+        m_request.folder = m_typed.folder;
+        refuse(whyPathIsRefused("the model's path", m_request.model));
+        refuse(whyPathIsRefused("the path of --out", m_request.folder));
+    }
+
+    void checkName() {
+        if (m_typed.was_name_given)
+            refuse(whyNameIsRefused(m_typed.name));
+        m_request.name = m_typed.was_name_given ? m_typed.name : animationNameFor(m_request.model);
+    }
+
+    void checkFrames() {
+        m_request.frames = wholeNumber(m_typed.frames).value_or(0);
+        if (m_request.frames < 1)
+            refuse("--frames must be a whole number from 1" + notBut(m_typed.frames));
+    }
+
+    void checkSize() {
+        const auto is_good = [](int size_px) { return size_px >= 1 && size_px <= LARGEST_SIZE_PX; };
+        m_request.size = pixelSize(m_typed.size).value_or(PixelSize{0, 0});
+        if (!is_good(m_request.size.width_px) || !is_good(m_request.size.height_px))
+            refuse("--size must be WIDTHxHEIGHT such as 1280x720, each from 1 to " +
+                   std::to_string(LARGEST_SIZE_PX) + notBut(m_typed.size));
+    }
+
+    void checkMode() {
+        const std::optional<std::string> option = captureOption(m_typed.mode);
+        if (!option)
+            refuse("unknown display mode \"" + m_typed.mode + "\"; --mode takes " +
+                   captureModeNames() + ".");
+        m_request.capture_option = option.value_or("");
+    }
+
+    void checkFormat() {
+        constexpr std::array<std::string_view, 4> FORMATS = {"jpg", "png", "bmp", "tga"};
+        m_request.format = lowerCase(m_typed.format);
+        if (std::find(FORMATS.begin(), FORMATS.end(), m_request.format) == FORMATS.end())
+            refuse("--format must be jpg, png, bmp or tga" + notBut(m_typed.format));
+    }
+
+    void checkDirection() {
+        const std::string direction = lowerCase(m_typed.direction);
+        m_request.is_clockwise = direction == "clockwise";
+        if (!m_request.is_clockwise && direction != "anticlockwise")
+            refuse("--direction must be clockwise or anticlockwise" + notBut(m_typed.direction));
+    }
+
+    void checkCamera() {
+        const std::optional<double> elevation = realNumber(m_typed.elevation_deg);
+        if (!elevation || std::abs(*elevation) > STEEPEST_ELEVATION_DEG)
+            refuse("--elevation must be a number of degrees from -89 to 89" +
+                   notBut(m_typed.elevation_deg));
+        m_request.elevation_deg = elevation.value_or(0.0);
+        m_request.distance_factor = realNumber(m_typed.distance_factor);
+        if (!m_typed.distance_factor.empty() && m_request.distance_factor.value_or(0.0) <= 0.0)
+            refuse("--distance must be a number above 0" + notBut(m_typed.distance_factor));
+        m_request.target = triple(m_typed.target);
+        if (!m_typed.target.empty() && !m_request.target)
+            refuse("--target must be three numbers X,Y,Z without blanks" + notBut(m_typed.target));
+    }
+
+    const TurntableOptions& m_typed;
+    TurntableRequest m_request{};
+    std::optional<std::string> m_mistake;
+};
+
+} // namespace
+
+std::variant<TurntableRequest, Outcome> checkTurntable(const TurntableOptions& options) {
+    return TurntableCheck(options).run();
+}
+
+std::filesystem::path pagePath(const TurntableRequest& request) {
+    return request.folder / (request.name + ".html");
+}
+
+} // namespace quarn::program

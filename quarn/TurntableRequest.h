@@ -1,0 +1,35 @@
+#pragma once
+
+#include "quarn/CommandLine.h"
+#include "quarn/Words.h"
+
+#include <filesystem>
+#include <optional>
+#include <string>
+#include <variant>
+
+namespace quarn::program {
+
+/// A turntable that can be recorded: every value is checked.
+struct TurntableRequest {
+    std::filesystem::path model;
+    std::filesystem::path folder;
+    std::string name; ///< of the animation, its pictures and its page; UTF-8
+    int frames;
+    PixelSize size;
+    std::string capture_option; ///< as the capture prompt knows it, with its underscore
+    std::string format;         ///< "jpg", "png", "bmp" or "tga"
+    bool is_clockwise;
+    double elevation_deg; ///< of the camera above the horizon through its target
+    std::optional<double> distance_factor;
+    std::optional<Triple> target;
+};
+
+/// Checks what was typed, before anything runs.
+/// @return the turntable, or the first mistake
+std::variant<TurntableRequest, Outcome> checkTurntable(const TurntableOptions& options);
+
+/// The path of the page that the recording writes.
+std::filesystem::path pagePath(const TurntableRequest& request);
+
+} // namespace quarn::program
