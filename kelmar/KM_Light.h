@@ -43,7 +43,8 @@ public:
     void SetIntensity(double intensity);
     double Intensity() const { return m_intensity; }
 
-    /// How dark the light's shadows are: 0 none, 1 full. Moved into [0, 1]. Default: 1.
+    /// How dark the light's shadows are: 0 none, 1 full. Moved into [0, 1]; an invalid number
+    /// counts as 0. Default: 1.
     void SetShadowIntensity(double intensity);
     double ShadowIntensity() const { return m_shadow_intensity; }
 

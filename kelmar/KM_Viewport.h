@@ -34,7 +34,8 @@ public:
     bool IsParallelProjection() const { return m_projection == KM_parallel_view; }
     KM_ViewProjection Projection() const { return m_projection; }
     /// Changes the projection and keeps the size in which things at the target's distance are seen
-    /// (at the near plane when there is no target in front of the camera).
+    /// (at the near plane when there is no target in front of the camera). A near plane that is not
+    /// in front of the camera is moved there when the projection becomes perspective.
     /// @return false, with nothing changed, for a value that is no projection
     bool SetProjection(KM_ViewProjection projection);
 
@@ -145,7 +146,8 @@ public:
     bool GetScreenFromWorld(KM_Xform& screen_from_world) const;
 
     /// Where a point is seen.
-    /// @param x_px, y_px  receive continuous pixel coordinates, outside the picture too
+    /// @param x_px, y_px  receive continuous pixel coordinates, outside the picture too; may be
+    /// null
     /// @param depth       receives the distance from the camera along the view direction, in model
     ///                    units; may be null
     /// @return false, with the results untouched, when the camera or the point is not valid, or in
@@ -156,7 +158,7 @@ public:
     /// @param origin     the camera location; in a parallel projection the point of the plane
     ///                   through it that is seen there
     /// @param direction  unit vector into the scene
-    /// @return false, with the results untouched, when the camera is not valid
+    /// @return false, with the results untouched, when the camera or a coordinate is not valid
     bool GetRay(double x_px, double y_px, KM_3dPoint& origin, KM_3dVector& direction) const;
     /// The part of that ray between the near and the far plane.
     bool GetRay(double x_px, double y_px, KM_Line& near_to_far) const;
