@@ -71,6 +71,8 @@ public:
     /// The scene of all objects, brought up to date. Built once for each revision of the objects
     /// and shared by the views.
     DisplayScene& scene();
+    /// Brings the scene up to date where it was built before.
+    void regenerate();
 
 private:
     void addStandardViews();

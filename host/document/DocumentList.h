@@ -2,14 +2,13 @@
 
 #include "host/document/Document.h"
 
-#include <filesystem>
 #include <memory>
 #include <vector>
 
 namespace quarn {
 
 class FrontEnd;
-class ImageFileWriter;
+class ImageEncoder;
 
 /// The open documents. There is at most one list at a time: the interface finds documents by
 /// number and objects by id with no list given, so the list is known to all.
@@ -29,8 +28,7 @@ public:
     /// plug-in keeps is emptied first, so that nothing of the old document stays in it.
     Document& openNew();
 
-    /// Called when the outermost command has ended: closes every document but the active one, and
-    /// counts the pictures of an animation from 1 again.
+    /// Called when the outermost command has ended: closes every document but the active one.
     void commandEnded();
 
     /// The active document, or null when none was opened.
@@ -41,10 +39,8 @@ public:
 
     FrontEnd& frontEnd() const { return m_front_end; }
 
-    /// Tells the front end that a picture was written by the command that runs now.
-    void pictureWritten(const std::filesystem::path& file);
-    /// Writes picture files; kept here because setting up an encoder for every frame costs time.
-    ImageFileWriter& imageWriter() { return *m_image_writer; }
+    /// Writes picture files; kept here so that its buffers serve every frame.
+    ImageEncoder& imageEncoder() { return *m_image_encoder; }
 
     /// Keeps a copy of the animation record as it is now: the one that a new document starts with.
     /// Called once after a plug-in that keeps a record was loaded.
@@ -56,8 +52,7 @@ private:
     FrontEnd& m_front_end;
     std::vector<std::unique_ptr<Document>> m_documents;
     Document* m_active = nullptr;
-    int m_pictures_written = 0;
-    std::unique_ptr<ImageFileWriter> m_image_writer;
+    std::unique_ptr<ImageEncoder> m_image_encoder;
     std::unique_ptr<KM_3dmAnimationProperties> m_fresh_record;
 };
 

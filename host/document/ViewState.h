@@ -54,8 +54,8 @@ public:
 
     int frameWidth() const { return m_frame_width; }
     int frameHeight() const { return m_frame_height; }
-    /// Sets the size of the frame buffer; the camera gets its aspect, so that nothing is stretched,
-    /// and the buffer is empty (black) until the next redraw.
+    /// Sets the size of the frame buffer; the camera gets its aspect, so that nothing is stretched.
+    /// What the view showed is gone until the next redraw.
     /// @return false, with nothing changed, unless both sides are from 1 to largest_side_px
     bool setFrameSize(int width_px, int height_px);
 
@@ -69,7 +69,7 @@ public:
     /// As CQuarnView::Redraw.
     void redraw(unsigned int flags);
 
-    /// The picture that the view shows.
+    /// The picture that the view shows; of no size as long as nothing was drawn.
     const Image& frameBuffer() const { return *m_frame_buffer; }
     /// How often the scene was drawn for this view, into its frame buffer or elsewhere.
     std::uint64_t drawCount() const { return m_draw_count; }

@@ -1,0 +1,67 @@
+#include "host/document/DocumentList.h"
+
+#include "host/display/ImageFile.h"
+#include "sdk/qncore/QnZoetrixDynamicAccess.h"
+
+#include <algorithm>
+
+namespace quarn {
+
+namespace {
+
+DocumentList* current_list = nullptr;
+
+/// Numbers outlive the list, because one that a plug-in kept must never mean another document.
+unsigned int nextSerialNumber() {
+    static unsigned int last_number = 0;
+    return ++last_number;
+}
+
+} // namespace
+
+DocumentList::DocumentList(FrontEnd& front_end)
+    : m_front_end(front_end), m_image_encoder(std::make_unique<ImageEncoder>()) {
+    current_list = this;
+}
+
+DocumentList::~DocumentList() {
+    m_active = nullptr;
+    m_documents.clear();
+    current_list = nullptr;
+}
+
+DocumentList* DocumentList::current() {
+    return current_list;
+}
+
+Document& DocumentList::openNew() {
+    m_documents.push_back(std::make_unique<Document>(*this, nextSerialNumber()));
+    m_active = m_documents.back().get();
+    emptyAnimationRecord(*m_active);
+    return *m_active;
+}
+
+void DocumentList::commandEnded() {
+    std::erase_if(m_documents, [&](const auto& document) { return document.get() != m_active; });
+}
+
+Document* DocumentList::find(unsigned int serial_number) const {
+    const auto found = std::find_if(m_documents.begin(), m_documents.end(), [&](const auto& each) {
+        return each->serialNumber() == serial_number;
+    });
+    return found == m_documents.end() ? nullptr : found->get();
+}
+
+void DocumentList::rememberFreshRecord() {
+    m_fresh_record.reset();
+    if (m_active && Zoetrix_QuarnDynamicAccess())
+        m_fresh_record = std::make_unique<KM_3dmAnimationProperties>(
+            m_active->properties().AnimationProperties());
+}
+
+void DocumentList::emptyAnimationRecord(Document& document) {
+    document.properties().SetAnimationProperties(m_fresh_record ? *m_fresh_record
+                                                                : KM_3dmAnimationProperties());
+}
+
+} // namespace quarn
