@@ -1,0 +1,43 @@
+# Installs the build tree, moves the result elsewhere, builds the smallest plug-in against it, and
+# runs that plug-in's command in the installed program.
+#   cmake -DBUILD=<build tree> -DSOURCE=<project root> -DWORK=<scratch folder> -P InstallTree.cmake
+function(run what)
+    execute_process(COMMAND ${ARGN} RESULT_VARIABLE result OUTPUT_VARIABLE text ERROR_VARIABLE text)
+    if(NOT result EQUAL 0)
+        message(FATAL_ERROR "${what} failed (${result}):\n${text}")
+    endif()
+    set(text "${text}" PARENT_SCOPE)
+endfunction()
+
+file(REMOVE_RECURSE "${WORK}")
+run("installing" ${CMAKE_COMMAND} --install "${BUILD}" --prefix "${WORK}/first")
+file(MAKE_DIRECTORY "${WORK}/moved to")
+file(RENAME "${WORK}/first" "${WORK}/moved to/quarn")
+set(tree "${WORK}/moved to/quarn")
+
+foreach(file IN ITEMS bin/quarn lib/libQnCore.so lib/libKelmar.so lib/quarn/plug-ins/Zoetrix.qnp
+        include/quarn/kelmar/kelmar.h include/quarn/sdk/qncore/qncore.h)
+    if(NOT EXISTS "${tree}/${file}")
+        message(FATAL_ERROR "the installed tree lacks ${file}")
+    endif()
+endforeach()
+if(EXISTS "${tree}/include/quarn/host")
+    message(FATAL_ERROR "the installed headers contain the host's own")
+endif()
+
+run("configuring the example" ${CMAKE_COMMAND} -S "${SOURCE}/examples/plug-in" -B "${WORK}/hello"
+    -G Ninja "-DCMAKE_PREFIX_PATH=${tree}" "-DCMAKE_CXX_COMPILER=${COMPILER}"
+    "-DCMAKE_CXX_FLAGS=${FLAGS}")
+run("building the example" ${CMAKE_COMMAND} --build "${WORK}/hello")
+
+file(WRITE "${WORK}/hello.txt" "LoadPlugIn \"${WORK}/hello/Hello.qnp\"\nHello\n")
+run("running the example" "${tree}/bin/quarn" run "${WORK}/hello.txt")
+if(NOT text MATCHES "Hello from a plug-in")
+    message(FATAL_ERROR "the example's command did not speak:\n${text}")
+endif()
+
+file(WRITE "${WORK}/help.txt" "Help\n")
+run("listing the commands" "${tree}/bin/quarn" run "${WORK}/help.txt")
+if(NOT text MATCHES "SetTurntableAnimation")
+    message(FATAL_ERROR "the installed program does not know the plug-in's commands:\n${text}")
+endif()
