@@ -1,0 +1,47 @@
+#pragma once
+
+#include "examples/pavilion/Temple.h"
+
+/// A way for a camera at eye height: in by the gate, past the basin, up the steps, once around the
+/// colonnade, out to the street and back to the square.
+namespace walk {
+
+/// Control points of a uniform cubic B-spline (C. de Boor, "A Practical Guide to Splines", chapter
+/// IX), which starts at the first and ends at the last.
+inline std::vector<Vec> controlPoints() {
+    constexpr double street = 1.70;
+    constexpr double hall = 1.70 + temple::floor_height;
+    return {
+        {0.0, -15.6, street}, {-0.4, -13.4, street}, {-2.4, -12.2, street}, {-3.7, -9.8, street},
+        {-3.9, -7.4, street}, {-2.4, -5.2, street},  {-0.2, -3.9, street},  {0.0, -2.2, street},
+        {0.0, -0.9, hall},    {0.5, 0.1, hall},      {2.2, 0.3, hall},      {3.7, 0.3, hall},
+        {4.6, 0.8, hall},     {4.6, 2.4, hall},      {4.6, 4.6, hall},      {4.0, 5.7, hall},
+        {2.0, 5.75, hall},    {-1.0, 5.75, hall},    {-3.4, 5.75, hall},    {-4.5, 5.3, hall},
+        {-4.6, 4.0, hall},    {-5.0, 3.1, hall},     {-6.1, 3.0, hall},     {-7.4, 2.8, street},
+        {-8.5, 1.6, street},  {-8.6, -0.6, street},  {-7.6, -2.8, street},  {-5.4, -4.4, street},
+        {-3.0, -5.2, street}, {-1.0, -5.0, street}};
+}
+
+inline std::vector<Vec> points() {
+    std::vector<Vec> controls = controlPoints();
+    for (int i = 0; i < 2; ++i) { // a triple end point lies on the curve
+        controls.insert(controls.begin(), controls.front());
+        controls.push_back(controls.back());
+    }
+    constexpr int steps = 12;
+    std::vector<Vec> walk;
+    for (std::size_t i = 0; i + 3 < controls.size(); ++i) {
+        for (int k = 0; k < steps; ++k) {
+            const double t = static_cast<double>(k) / steps;
+            const double s = 1.0 - t;
+            walk.push_back(controls[i] * (s * s * s / 6.0) +
+                           controls[i + 1] * ((3 * t * t * t - 6 * t * t + 4) / 6.0) +
+                           controls[i + 2] * ((3 * s * s * s - 6 * s * s + 4) / 6.0) +
+                           controls[i + 3] * (t * t * t / 6.0));
+        }
+    }
+    walk.push_back(controls.back());
+    return walk;
+}
+
+} // namespace walk
