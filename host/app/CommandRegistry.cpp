@@ -63,11 +63,11 @@ void CommandRegistry::remove(const CQuarnCommand& command) {
                   [&](const RegisteredCommand& entry) { return entry.command == &command; });
 }
 
-CQuarnCommand* CommandRegistry::find(std::wstring_view name, bool english_only) const {
+const RegisteredCommand* CommandRegistry::find(std::wstring_view name, bool english_only) const {
     const KM_wString wanted(name);
     for (const RegisteredCommand& entry : m_commands) {
         if (english_only ? entry.english_name.CompareNoCase(wanted) == 0 : answersTo(entry, wanted))
-            return entry.command;
+            return &entry;
     }
     return nullptr;
 }

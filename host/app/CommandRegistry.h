@@ -35,9 +35,9 @@ public:
     /// Takes a command out; one that is not there is no fault.
     void remove(const CQuarnCommand& command);
 
-    /// The command with this name, ignoring case, or null.
+    /// The command with this name, ignoring case, or null. Valid until a command comes or goes.
     /// @param english_only  leave local names out
-    CQuarnCommand* find(std::wstring_view name, bool english_only = false) const;
+    const RegisteredCommand* find(std::wstring_view name, bool english_only = false) const;
 
     /// All commands in the order of their English names.
     std::vector<RegisteredCommand> sortedByName() const;

@@ -1,0 +1,99 @@
+#include "host/app/Application.h"
+
+#include "host/app/PathText.h"
+#include "host/commands/HostCommands.h"
+#include "host/display/DisplayModeList.h"
+#include "sdk/qncore/QnZoetrixDynamicAccess.h"
+
+#include <cstdio>
+
+namespace quarn {
+
+namespace {
+
+/// The application that runs now. The programming interface reaches it through QuarnApp().
+Application* running_application = nullptr;
+
+/// Frames of the animation of a document; 0 when nothing keeps one.
+int frameCount(Document* document) {
+    const IQnZoetrixDynamicAccess* access = Zoetrix_QuarnDynamicAccess();
+    if (!access || !document)
+        return 0;
+    return access->AnimationProperties(document->face()).FrameCount();
+}
+
+} // namespace
+
+Application* Application::current() {
+    return running_application;
+}
+
+Application* Application::forCall(const char* call) {
+    Application* application = running_application;
+    if (!application || std::this_thread::get_id() == application->m_main_thread)
+        return application;
+    std::fprintf(stderr, "Quarn: %s was called outside the main thread; the call was ignored.\n",
+                 call);
+    return nullptr;
+}
+
+Application::Application(FrontEnd& front_end, SessionOptions options)
+    : m_front_end(front_end), m_options(std::move(options)), m_texts(m_options.language),
+      m_runner(*this) {
+    running_application = this;
+    if (Result<void> texts = m_texts.load("host", m_options.locale_folders); !texts)
+        tell(texts.message());
+    DisplayModeList::instance().localize();
+    registerHostCommands();
+    m_documents = std::make_unique<DocumentList>(front_end);
+    m_documents->openNew();
+    m_plug_ins = std::make_unique<PlugInLoader>(*this);
+}
+
+Application::~Application() {
+    m_documents.reset();
+    m_plug_ins.reset();
+    for (const std::unique_ptr<CQuarnCommand>& command : m_host_commands)
+        m_commands.remove(*command);
+    m_host_commands.clear();
+    running_application = nullptr;
+}
+
+void Application::registerHostCommands() {
+    m_host_commands = makeHostCommands();
+    for (const std::unique_ptr<CQuarnCommand>& command : m_host_commands) {
+        if (Result<void> added = m_commands.add(*command); !added)
+            tell(added.message());
+    }
+}
+
+void Application::print(std::wstring_view text) {
+    m_front_end.print(text);
+}
+
+void Application::tell(std::string_view message) {
+    print((KM_wString::FromUtf8(message) + L"\n").View());
+}
+
+void Application::reportBreach(std::string_view call, std::string_view rule) {
+    tell(std::string(call) + " was refused: " + std::string(rule) + ".");
+}
+
+void Application::pictureWritten(const std::filesystem::path& file) {
+    RunningCommand* command = m_runner.outermost();
+    if (!command)
+        return;
+    ++command->pictures_written;
+    m_front_end.frameWritten(file, command->pictures_written, frameCount(m_documents->active()));
+}
+
+CWnd* Application::windowFor(HWND window) {
+    if (!window)
+        return nullptr;
+    std::unique_ptr<CWnd>& object = m_windows[window];
+    if (!object)
+        object = std::make_unique<CWnd>(window);
+    return object.get();
+}
+
+} // namespace quarn

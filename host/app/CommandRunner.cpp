@@ -1,0 +1,131 @@
+#include "host/app/CommandRunner.h"
+
+#include "host/app/Application.h"
+#include "host/app/Border.h"
+#include "host/app/PathText.h"
+#include "host/app/TextLines.h"
+
+namespace quarn {
+
+namespace {
+
+const char* wordFor(CQuarnCommand::result result) {
+    if (result == CQuarnCommand::cancel)
+        return "was cancelled";
+    return result == CQuarnCommand::nothing ? "did nothing" : "failed";
+}
+
+std::string utf8(std::wstring_view text) {
+    return KM_wString(text).ToUtf8();
+}
+
+bool isSkipped(std::wstring_view line) {
+    const std::size_t first = line.find_first_not_of(L" \t");
+    return first == line.npos || line[first] == L'#';
+}
+
+} // namespace
+
+std::wstring RunningCommand::label() const {
+    const std::wstring own_name(name.View());
+    return place.empty() ? own_name : place + L": " + own_name;
+}
+
+CQuarnCommand::result CommandRunner::run(std::wstring_view line, const CommandOrigin& origin) {
+    if (const RunningCommand* running = outermost()) {
+        m_application.tell(running->name.ToUtf8() + " is running; wait until it has ended.");
+        return CQuarnCommand::failure;
+    }
+    return start(line, origin);
+}
+
+CQuarnCommand::result CommandRunner::runNested(std::wstring_view line,
+                                               const CommandOrigin& origin) {
+    const RunningCommand* running = current();
+    if (!running || !running->command->IsScriptCommand()) {
+        m_application.reportBreach("CQuarnApp::RunScript",
+                                   "only a running CQuarnScriptCommand may call it");
+        return CQuarnCommand::failure;
+    }
+    return start(line, origin);
+}
+
+CQuarnCommand::result CommandRunner::start(std::wstring_view line, const CommandOrigin& origin) {
+    Result<CommandLine> parsed = parseCommandLine(line);
+    if (!parsed) {
+        m_application.tell(parsed.message());
+        return CQuarnCommand::failure;
+    }
+    CommandLine& read = parsed.value();
+    if (read.isBlank())
+        return CQuarnCommand::success;
+    const RegisteredCommand* found = m_application.commands().find(read.name, read.english_name);
+    if (!found) {
+        m_application.tell("Unknown command: " + utf8(read.name) + ". Type Help for the list.");
+        return CQuarnCommand::failure;
+    }
+    RunningCommand running{found->command, found->english_name, origin.place,
+                           std::move(read.words)};
+    const CQuarnCommand::result result =
+        execute(running, origin, origin.interactive && !read.without_dialogs);
+    if (result == CQuarnCommand::success)
+        tellUnusedWords(running);
+    if (m_running.empty())
+        m_application.documents().commandEnded();
+    return result;
+}
+
+CQuarnCommand::result CommandRunner::execute(RunningCommand& running, const CommandOrigin& origin,
+                                             bool interactive) {
+    const CQuarnCommandContext context(*origin.document, interactive);
+    m_running.push_back(&running);
+    const Result<CQuarnCommand::result> ended =
+        acrossBorder([&] { return running.command->RunCommand(context); });
+    m_running.pop_back();
+    if (ended)
+        return ended.value();
+    m_application.tell(utf8(running.label()) + " stopped with an error: " + ended.message());
+    return CQuarnCommand::failure;
+}
+
+void CommandRunner::tellUnusedWords(const RunningCommand& running) {
+    if (running.words.empty())
+        return;
+    std::wstring words;
+    for (const CommandWord& word : running.words)
+        words += L' ' + word.text;
+    m_application.tell(utf8(running.label() + L" did not use:" + words));
+}
+
+bool CommandRunner::runFile(const std::filesystem::path& file) {
+    const Result<std::vector<std::wstring>> lines = readTextLines(file);
+    if (lines)
+        return runLines(lines.value(), std::wstring(textFromPath(file.filename()).View()));
+    m_application.tell(lines.message());
+    return false;
+}
+
+bool CommandRunner::runLines(const std::vector<std::wstring>& lines,
+                             const std::wstring& file_name) {
+    for (std::size_t index = 0; index < lines.size(); ++index) {
+        if (isSkipped(lines[index]))
+            continue;
+        const std::wstring place = file_name + L", line " + std::to_wstring(index + 1);
+        if (m_application.frontEnd().isInterrupted()) {
+            m_application.tell("Stopped before " + utf8(place) + ".");
+            return false;
+        }
+        CQuarnDoc& document = m_application.documents().active()->face();
+        const CQuarnCommand::result result = run(lines[index], {&document, false, place});
+        if (result != CQuarnCommand::success) {
+            m_application.tell(utf8(place) + ": " + utf8(lines[index]) + ": " + wordFor(result) +
+                               ".");
+            return false;
+        }
+        if (m_application.isExitRequested())
+            return true;
+    }
+    return true;
+}
+
+} // namespace quarn

@@ -1,0 +1,229 @@
+#include "host/app/PlugInLoader.h"
+
+#include "host/app/Application.h"
+#include "host/app/Border.h"
+#include "host/app/PlugInExports.h"
+#include "sdk/vexui/VexUi.h"
+
+#include <algorithm>
+
+namespace quarn {
+
+namespace {
+
+using Outcome = PlugInLoad::Outcome;
+
+/// What `adoptProgram` calls the file of the program's own plug-in.
+constexpr const char* PROGRAM = "of this program";
+
+PlugInLoad refused(const std::filesystem::path& file, const std::string& reason) {
+    return {Outcome::load_refused, "The plug-in " + file.string() + " was not loaded: " + reason};
+}
+
+} // namespace
+
+/// A plug-in with what it brought along. The library comes first, so that it goes last.
+struct PlugInLoader::Loaded {
+    LibraryFile library; ///< nothing for the program itself
+    std::filesystem::path file;
+    CWinApp* application = nullptr;
+    CQuarnPlugIn* plug_in = nullptr;
+    KM_UUID id = KM_nil_uuid;
+    std::vector<CQuarnCommand*> commands;
+};
+
+PlugInLoader::PlugInLoader(Application& application) : m_application(application) {
+    m_catalogue[ZelVexUiPlugInId] = "ZEL_VexUI.qnp";
+}
+
+PlugInLoader::~PlugInLoader() {
+    while (!m_loaded.empty()) {
+        unload(*m_loaded.back());
+        m_loaded.pop_back();
+    }
+}
+
+// ---- Finding
+
+const PlugInLoader::Loaded* PlugInLoader::find(const KM_UUID& id) const {
+    const auto found =
+        std::ranges::find(m_loaded, id, [](const auto& loaded) { return loaded->id; });
+    return found == m_loaded.end() ? nullptr : found->get();
+}
+
+void* PlugInLoader::findEntry(const KM_UUID& plug_in_id, const char* name) const {
+    const Loaded* loaded = find(plug_in_id);
+    return loaded ? loaded->library.find(name) : nullptr;
+}
+
+std::filesystem::path PlugInLoader::findInFolders(const std::filesystem::path& name) const {
+    for (const std::filesystem::path& folder : m_application.options().plug_in_folders) {
+        std::error_code error;
+        if (std::filesystem::exists(folder / name, error))
+            return folder / name;
+    }
+    return name;
+}
+
+// ---- Loading
+
+PlugInLoad PlugInLoader::loadById(const KM_UUID& id, bool ignore_disabled) {
+    if (isLoaded(id))
+        return {Outcome::loaded_before, {}};
+    const auto known = m_catalogue.find(id);
+    if (known == m_catalogue.end())
+        return {Outcome::unknown_id,
+                "No plug-in with the id " + KM_UuidToString(id).ToUtf8() + " is known."};
+    const std::filesystem::path file = findInFolders(known->second);
+    const PlugInLoad load_result = load(file, ignore_disabled);
+    if (load_result.ok() && !isLoaded(id))
+        return refused(file, "it has another id than " + KM_UuidToString(id).ToUtf8());
+    return load_result;
+}
+
+PlugInLoad PlugInLoader::load(const std::filesystem::path& file, bool ignore_disabled) {
+    std::error_code error;
+    if (!std::filesystem::is_regular_file(file, error))
+        return {Outcome::file_missing, "There is no plug-in file " + file.string() + "."};
+    const std::filesystem::path whole_path = std::filesystem::canonical(file, error);
+    if (error)
+        return {Outcome::file_missing,
+                "The plug-in file " + file.string() + " cannot be reached: " + error.message()};
+    const auto same_file = [&](const auto& loaded) { return loaded->file == whole_path; };
+    if (std::ranges::any_of(m_loaded, same_file))
+        return {Outcome::loaded_before, {}};
+    if (LibraryFile::isOpen(whole_path))
+        return refused(whole_path, "the program has this file open already");
+    return open(whole_path, ignore_disabled);
+}
+
+PlugInLoad PlugInLoader::open(const std::filesystem::path& file, bool ignore_disabled) {
+    auto candidate = std::make_unique<Loaded>();
+    candidate->file = file;
+    PendingObjects objects;
+    {
+        const PendingObjects::Scope scope;
+        Result<LibraryFile> library = LibraryFile::open(file);
+        if (!library)
+            return refusedByLinker(library.message(), file);
+        candidate->library = std::move(library.value());
+        objects = scope.objects();
+    }
+    if (PlugInLoad checked = checkExports(candidate->library, file); !checked.ok())
+        return checked;
+    return adopt(std::move(candidate), objects, ignore_disabled);
+}
+
+PlugInLoad PlugInLoader::adoptProgram() {
+    const PendingObjects& objects = PendingObjects::program();
+    const auto of_program = [](const auto& loaded) { return loaded->file == PROGRAM; };
+    if (std::ranges::any_of(m_loaded, of_program))
+        return {Outcome::loaded_before, {}};
+    auto candidate = std::make_unique<Loaded>();
+    candidate->file = PROGRAM;
+    return adopt(std::move(candidate), objects, true);
+}
+
+PlugInLoad PlugInLoader::adopt(std::unique_ptr<Loaded> candidate, const PendingObjects& objects,
+                               bool ignore_disabled) {
+    PlugInLoad committed = commit(*candidate, objects, ignore_disabled);
+    if (!committed.ok()) {
+        withdraw(*candidate);
+        return committed;
+    }
+    m_catalogue[candidate->id] = candidate->file;
+    m_loaded.push_back(std::move(candidate));
+    m_application.documents().rememberFreshRecord();
+    return committed;
+}
+
+PlugInLoad PlugInLoader::commit(Loaded& candidate, const PendingObjects& objects,
+                                bool ignore_disabled) {
+    if (objects.plug_ins.size() != 1)
+        return refused(candidate.file, "it has " + std::to_string(objects.plug_ins.size()) +
+                                           " plug-in objects instead of one");
+    if (objects.applications.size() != 1)
+        return refused(candidate.file, "it has " + std::to_string(objects.applications.size()) +
+                                           " application objects instead of one");
+    candidate.application = objects.applications.front();
+    candidate.plug_in = objects.plug_ins.front();
+    candidate.commands = objects.commands;
+
+    const CQuarnPlugIn& plug_in = *candidate.plug_in;
+    const Result<KM_UUID> id = acrossBorder([&] { return plug_in.PlugInID(); });
+    if (!id || KM_UuidIsNil(id.value()))
+        return refused(candidate.file, "it has no id");
+    if (isLoaded(id.value()))
+        return refused(candidate.file, "a plug-in with the id " +
+                                           KM_UuidToString(id.value()).ToUtf8() + " is loaded");
+    candidate.id = id.value();
+    const auto load_time = acrossBorder([&] { return plug_in.PlugInLoadTime(); });
+    if (load_time && load_time.value() == CQuarnPlugIn::load_disabled && !ignore_disabled)
+        return refused(candidate.file, "it is marked as never to be loaded");
+
+    loadTexts(candidate);
+    if (PlugInLoad registered = registerCommands(candidate); !registered.ok())
+        return registered;
+    return startUp(candidate);
+}
+
+void PlugInLoader::loadTexts(const Loaded& candidate) {
+    const std::filesystem::path name = candidate.file.stem();
+    std::vector<std::filesystem::path> folders = {candidate.file.parent_path() / "locale" / name};
+    for (const std::filesystem::path& host_folder : m_application.options().locale_folders)
+        folders.push_back(host_folder.parent_path() / name);
+    if (Result<void> texts = m_application.texts().load(candidate.file.string(), folders); !texts)
+        m_application.tell(texts.message());
+}
+
+PlugInLoad PlugInLoader::registerCommands(Loaded& candidate) {
+    for (CQuarnCommand* command : candidate.commands) {
+        if (Result<void> added = m_application.commands().add(*command); !added)
+            return refused(candidate.file, added.message() + ".");
+        if (!command->PlugIn())
+            CQuarnCommandRegistration::setPlugIn(*command, candidate.plug_in);
+    }
+    return {};
+}
+
+PlugInLoad PlugInLoader::startUp(Loaded& candidate) {
+    CWinApp& application = *candidate.application;
+    CQuarnPlugIn& plug_in = *candidate.plug_in;
+    const Result<bool> started = acrossBorder([&] { return application.InitInstance(); });
+    if (!started)
+        return refused(candidate.file, "InitInstance stopped with an error: " + started.message());
+    if (!started.value())
+        return refused(candidate.file, "its InitInstance refused");
+
+    const Result<bool> loaded = acrossBorder([&] { return plug_in.OnLoadPlugIn(); });
+    if (loaded && loaded.value())
+        return {};
+    (void)acrossBorder([&] { return application.ExitInstance(); });
+    if (!loaded)
+        return refused(candidate.file, "OnLoadPlugIn stopped with an error: " + loaded.message());
+    return refused(candidate.file, "its OnLoadPlugIn refused");
+}
+
+// ---- Unloading
+
+void PlugInLoader::withdraw(Loaded& loaded) {
+    for (CQuarnCommand* command : loaded.commands) {
+        m_application.commands().remove(*command);
+        if (command->PlugIn() == loaded.plug_in)
+            CQuarnCommandRegistration::setPlugIn(*command, nullptr);
+    }
+    m_application.texts().remove(loaded.file.string());
+}
+
+void PlugInLoader::unload(Loaded& loaded) {
+    if (const Result<void> ended = acrossBorder([&] { loaded.plug_in->OnUnloadPlugIn(); }); !ended)
+        m_application.tell("OnUnloadPlugIn of " + loaded.file.string() +
+                           " stopped with an error: " + ended.message());
+    if (const Result<int> ended = acrossBorder([&] { return loaded.application->ExitInstance(); });
+        !ended)
+        m_application.tell("ExitInstance of " + loaded.file.string() +
+                           " stopped with an error: " + ended.message());
+    withdraw(loaded);
+}
+
+} // namespace quarn

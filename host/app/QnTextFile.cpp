@@ -1,0 +1,60 @@
+#include "sdk/qncore/QnTextFile.h"
+
+#include "host/app/AtomicFile.h"
+#include "host/app/PathText.h"
+#include "host/app/TextEncoding.h"
+
+#include <unistd.h>
+
+#include <optional>
+#include <string>
+
+struct CQnTextFile::State {
+    std::optional<std::filesystem::path> path; ///< nothing while no file is open
+    filetype type = filetype::utf8;
+    std::wstring text;
+};
+
+namespace {
+
+bool canBeWritten(const std::filesystem::path& path) {
+    std::error_code error;
+    const std::filesystem::path parent = path.parent_path();
+    const std::filesystem::path folder = parent.empty() ? "." : parent;
+    return !path.filename().empty() && !std::filesystem::is_directory(path, error) &&
+           std::filesystem::is_directory(folder, error) && access(folder.c_str(), W_OK) == 0;
+}
+
+} // namespace
+
+CQnTextFile::CQnTextFile() : m_state(std::make_unique<State>()) {}
+
+CQnTextFile::~CQnTextFile() {
+    Close();
+}
+
+bool CQnTextFile::Open(const wchar_t* path, open_mode mode, filetype type) {
+    if (m_state->path || !path || mode != open_mode::write)
+        return false;
+    const std::filesystem::path file = quarn::pathFromText(path);
+    if (!canBeWritten(file))
+        return false;
+    *m_state = {file, type, {}};
+    return true;
+}
+
+bool CQnTextFile::WriteString(const wchar_t* text) {
+    if (!m_state->path)
+        return false;
+    m_state->text += text ? text : L"";
+    return true;
+}
+
+bool CQnTextFile::Close() {
+    if (!m_state->path)
+        return false;
+    const State closing = std::exchange(*m_state, {});
+    const auto encoding = static_cast<quarn::TextEncoding>(closing.type);
+    const std::string bytes = quarn::encodeTextFile(closing.text, encoding);
+    return quarn::writeFileAtomically(*closing.path, std::as_bytes(std::span(bytes))).ok();
+}

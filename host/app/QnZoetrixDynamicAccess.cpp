@@ -1,0 +1,19 @@
+#include "sdk/qncore/QnZoetrixDynamicAccess.h"
+
+namespace {
+
+/// The object that a plug-in installed. Kept apart from the application, because a plug-in removes
+/// its object also when none runs any more.
+IQnZoetrixDynamicAccess* installed_access = nullptr;
+
+} // namespace
+
+IQnZoetrixDynamicAccess::~IQnZoetrixDynamicAccess() = default;
+
+void Zoetrix_SetQuarnDynamicAccess(IQnZoetrixDynamicAccess* access) {
+    installed_access = access;
+}
+
+IQnZoetrixDynamicAccess* Zoetrix_QuarnDynamicAccess() {
+    return installed_access;
+}

@@ -1,0 +1,68 @@
+#include "host/app/Application.h"
+#include "host/app/PathText.h"
+#include "host/commands/HostCommands.h"
+#include "sdk/qncore/QnGet.h"
+
+namespace quarn {
+
+namespace {
+
+bool hasWordsLeft(Application& application) {
+    const RunningCommand* command = application.runner().current();
+    return command && !command->words.empty();
+}
+
+void printLine(Application& application, const RegisteredCommand& entry) {
+    const KM_wString name = KM_wString::FormatToString(L"%-24s ", entry.local_name.Array());
+    application.print((name + entry.command->CommandDescription() + L"\n").View());
+}
+
+CQuarnCommand::result listCommands(Application& application) {
+    for (const RegisteredCommand& entry : application.commands().sortedByName()) {
+        if (!entry.command->IsHidden())
+            printLine(application, entry);
+    }
+    return CQuarnCommand::success;
+}
+
+} // namespace
+
+CQuarnCommand::result runExit(const CQuarnCommandContext&) {
+    Application::current()->requestExit();
+    return CQuarnCommand::success;
+}
+
+CQuarnCommand::result runHelp(const CQuarnCommandContext&) {
+    Application& application = *Application::current();
+    if (!hasWordsLeft(application))
+        return listCommands(application);
+    CQuarnGetString get;
+    get.SetCommandPrompt(QnLocalizeString(L"Command", 41101));
+    if (get.GetString() != CQuarnGet::string)
+        return get.CommandResult();
+    const RegisteredCommand* entry = application.commands().find(get.String());
+    if (!entry) {
+        application.tell("Unknown command: " + KM_wString(get.String()).ToUtf8() +
+                         ". Type Help for the list.");
+        return CQuarnCommand::failure;
+    }
+    printLine(application, *entry);
+    return CQuarnCommand::success;
+}
+
+CQuarnCommand::result runLoadPlugIn(const CQuarnCommandContext&) {
+    Application& application = *Application::current();
+    CQuarnGetString get;
+    get.SetCommandPrompt(QnLocalizeString(L"Plug-in file", 41102));
+    if (get.GetString() != CQuarnGet::string)
+        return get.CommandResult();
+    const std::filesystem::path file = pathFromText(get.String());
+    const PlugInLoad load = application.plugIns().load(file);
+    if (load.ok())
+        application.tell("Loaded " + file.filename().string() + ".");
+    else
+        application.tell(load.message);
+    return load.ok() ? CQuarnCommand::success : CQuarnCommand::failure;
+}
+
+} // namespace quarn

@@ -1,0 +1,42 @@
+#include "host/front_end/Session.h"
+
+#include "host/app/Application.h"
+
+namespace quarn {
+
+struct Session::State {
+    State(FrontEnd& front_end, SessionOptions options)
+        : application(front_end, std::move(options)) {}
+    Application application;
+};
+
+Session::Session(FrontEnd& front_end, SessionOptions options)
+    : m_state(std::make_unique<State>(front_end, std::move(options))) {}
+
+Session::~Session() = default;
+
+PlugInLoad Session::loadPlugIn(const std::filesystem::path& file) {
+    return m_state->application.plugIns().load(file);
+}
+
+PlugInLoad Session::adoptProgramPlugIn() {
+    return m_state->application.plugIns().adoptProgram();
+}
+
+CQuarnCommand::result Session::runCommand(std::wstring_view line, bool interactive) {
+    return m_state->application.runner().run(line, {&document(), interactive, {}});
+}
+
+bool Session::runScriptFile(const std::filesystem::path& file) {
+    return m_state->application.runner().runFile(file);
+}
+
+CQuarnDoc& Session::document() {
+    return m_state->application.documents().active()->face();
+}
+
+bool Session::isExitRequested() const {
+    return m_state->application.isExitRequested();
+}
+
+} // namespace quarn

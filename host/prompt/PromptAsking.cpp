@@ -1,0 +1,109 @@
+#include "host/prompt/PromptAsking.h"
+
+#include "host/app/Application.h"
+#include "host/prompt/PromptAnswer.h"
+
+namespace quarn {
+
+namespace {
+
+/// An answer and where it came from.
+struct Reply {
+    Answer answer;
+    bool from_script = false;
+    bool literal = false;
+};
+
+/// The answer that a word stands for.
+Answer answerOf(const KM_wString& word) {
+    if (word.CompareNoCase(L"_Enter") == 0)
+        return {Answer::Kind::enter, {}};
+    if (word.CompareNoCase(L"_Cancel") == 0)
+        return {Answer::Kind::cancel, {}};
+    return {Answer::Kind::text, word};
+}
+
+Reply takeWord(RunningCommand& command) {
+    const CommandWord word = std::move(command.words.front());
+    command.words.pop_front();
+    const KM_wString text(std::wstring_view(word.text));
+    if (word.quoted)
+        return {{Answer::Kind::text, text}, true, true};
+    return {answerOf(text), true, false};
+}
+
+/// What a person says; an empty text is Enter.
+Reply askPerson(Application& application, const PromptState& prompt) {
+    Answer answer = application.frontEnd().ask(prompt.question());
+    if (answer.kind == Answer::Kind::text)
+        answer = answer.text.IsEmpty() ? Answer{Answer::Kind::enter, {}} : answerOf(answer.text);
+    return {std::move(answer), false, false};
+}
+
+Reply nextReply(Application& application, RunningCommand& command, const PromptState& prompt) {
+    return command.words.empty() ? askPerson(application, prompt) : takeWord(command);
+}
+
+KM_wString label(const RunningCommand& command) {
+    return std::wstring_view(command.label());
+}
+
+/// "SetTurntableAnimation needs an answer to "Direction" (Clockwise, AntiClockwise); none was
+/// given."
+void tellMissingAnswer(Application& application, const RunningCommand& command,
+                       const PromptState& prompt) {
+    KM_wString choices;
+    for (const PromptOption& option : prompt.options)
+        choices += (choices.IsEmpty() ? L"" : L", ") + option.name.m_local;
+    if (!choices.IsEmpty())
+        choices = L" (" + choices + L")";
+    const KM_wString message = label(command) + L" needs an answer to \"" + prompt.prompt + L"\"" +
+                               choices + L"; none was given.\n";
+    application.print(message.View());
+}
+
+void tellRefusal(Application& application, const RunningCommand& command, const Reply& reply,
+                 const PromptState& prompt, const KM_wString& request) {
+    KM_wString message = request + L".\n";
+    if (reply.from_script) {
+        const KM_wString word =
+            reply.answer.kind == Answer::Kind::enter ? KM_wString(L"_Enter") : reply.answer.text;
+        message = label(command) + L": \"" + word + L"\" does not answer \"" + prompt.prompt +
+                  L"\". " + message;
+    }
+    application.print(message.View());
+}
+
+CQuarnGet::result cancel(PromptState& prompt) {
+    takeAnswer(prompt, {Answer::Kind::cancel, {}}, false);
+    return prompt.result;
+}
+
+} // namespace
+
+CQuarnGet::result askQuestion(PromptState& prompt, const char* call) {
+    prompt.startAsking();
+    Application* application = Application::forCall(call);
+    if (!application)
+        return prompt.result;
+    RunningCommand* command = application->runner().current();
+    if (!command) {
+        application->reportBreach(call, "questions may be asked while a command runs");
+        return prompt.result;
+    }
+    for (;;) {
+        const Reply reply = nextReply(*application, *command, prompt);
+        if (reply.answer.kind == Answer::Kind::nobody) {
+            tellMissingAnswer(*application, *command, prompt);
+            return cancel(prompt);
+        }
+        const std::optional<KM_wString> request = takeAnswer(prompt, reply.answer, reply.literal);
+        if (!request)
+            return prompt.result;
+        tellRefusal(*application, *command, reply, prompt, *request);
+        if (reply.from_script)
+            return cancel(prompt);
+    }
+}
+
+} // namespace quarn

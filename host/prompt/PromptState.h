@@ -1,0 +1,54 @@
+#pragma once
+
+#include "host/front_end/FrontEnd.h"
+#include "kelmar/KM_Point.h"
+#include "sdk/qncore/QnGet.h"
+
+#include <optional>
+#include <string_view>
+#include <vector>
+
+namespace quarn {
+
+/// An option of a prompt. Its index, from 1, is its place in the list.
+struct PromptOption {
+    CQuarnCommandOptionName name;
+    std::optional<CQuarnCommandOptionValue> value; ///< what a plain option shows
+    struct Toggle {
+        CQuarnCommandOptionValue off;
+        CQuarnCommandOptionValue on;
+        bool is_on = false;
+        bool* variable = nullptr; ///< the command's variable; may be null
+    };
+    std::optional<Toggle> toggle;
+
+    /// The value it shows now; null for an option without one.
+    const CQuarnCommandOptionValue* shownValue() const;
+};
+
+/// What a command has set up about a question, and how the question ended.
+struct PromptState {
+    Question::Kind kind = Question::Kind::option;
+    KM_wString prompt;
+    bool accepts_nothing = false;
+    std::optional<KM_wString> default_answer;
+    std::vector<PromptOption> options;
+    double lower_limit = KM_UNSET_VALUE; ///< unset: none
+    double upper_limit = KM_UNSET_VALUE; ///< unset: none
+
+    CQuarnGet::result result = CQuarnGet::no_result;
+    CQuarnCommand::result command_result = CQuarnCommand::success;
+    CQuarnCommandOption picked;
+    KM_wString text;      ///< what was typed, or the default after Enter
+    double number = 0;    ///< what was given, or the default
+    int whole_number = 0; ///< what was given, or the default
+
+    /// Adds an option. @return its index, or 0 when the name is empty or there already
+    int addOption(PromptOption option);
+    /// The question as a front end shows it.
+    Question question() const;
+    /// Forgets how the question ended last time.
+    void startAsking();
+};
+
+} // namespace quarn
