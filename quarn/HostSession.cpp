@@ -25,7 +25,9 @@ std::optional<Outcome> HostSession::loadAnimationPlugIn() {
     const PlugInLoad load = m_session.loadPlugIn(plugInFolder() / "Zoetrix.qnp");
     if (load.ok())
         return std::nullopt;
-    return Outcome::failure(load.message);
+    const bool is_missing = load.outcome == PlugInLoad::Outcome::file_missing;
+    return Outcome::failure(load.message +
+                            (is_missing ? " Install the program with all its files." : ""));
 }
 
 std::optional<Outcome> HostSession::run(const std::string& line) {

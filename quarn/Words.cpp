@@ -104,11 +104,7 @@ std::optional<std::string> whyPathIsRefused(std::string_view subject,
 }
 
 std::string quotedPath(const std::filesystem::path& path) {
-    // "_Enter" answers a prompt and "[Name]" picks an option, even when a file has such a name.
-    constexpr std::string_view WORDS_WITH_A_MEANING = "_-![";
-    const std::string& bytes = path.native();
-    const bool is_plain = WORDS_WITH_A_MEANING.find(bytes.front()) == std::string_view::npos;
-    return '"' + (is_plain ? bytes : "./" + bytes) + '"';
+    return '"' + path.native() + '"';
 }
 
 } // namespace quarn::program

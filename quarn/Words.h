@@ -49,7 +49,7 @@ bool hasControlCharacter(std::string_view text);
 std::optional<std::string> whyPathIsRefused(std::string_view subject,
                                             const std::filesystem::path& path);
 
-/// The path in double quotes, as one word of a script that no prompt takes for an option.
+/// The path as one word of a script, which no prompt takes for an option.
 std::string quotedPath(const std::filesystem::path& path);
 
 } // namespace quarn::program

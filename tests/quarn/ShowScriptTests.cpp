@@ -1,0 +1,154 @@
+#include "tests/quarn/ProgramRun.h"
+
+#include <cmath>
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+#include <numbers>
+
+namespace quarn::test {
+namespace {
+
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using testing::Not;
+using testing::SizeIs;
+using testing::StartsWith;
+
+std::vector<std::string> scriptOf(std::vector<std::string> arguments) {
+    arguments.insert(arguments.begin(), "turntable");
+    arguments.push_back("--show-script");
+    const Ended ended = run(arguments);
+    EXPECT_EQ(ended.exit_code, 0) << ended.err;
+    EXPECT_THAT(ended.err, IsEmpty());
+    return linesOf(ended.out);
+}
+
+std::vector<std::string> scriptWith(std::vector<std::string> options) {
+    options.insert(options.begin(), {"house.obj", "--frames", "8", "--out", "out"});
+    return scriptOf(options);
+}
+
+struct CameraLine {
+    double location[3];
+    double target[3];
+};
+
+CameraLine readCameraLine(const std::string& line) {
+    CameraLine camera{};
+    EXPECT_EQ(std::sscanf(line.c_str(), "_-Camera _Location %lf,%lf,%lf _Target %lf,%lf,%lf _Enter",
+                          &camera.location[0], &camera.location[1], &camera.location[2],
+                          &camera.target[0], &camera.target[1], &camera.target[2]),
+              6)
+        << line;
+    return camera;
+}
+
+double elevation_deg(const CameraLine& camera) {
+    const double x = camera.location[0] - camera.target[0];
+    const double y = camera.location[1] - camera.target[1];
+    const double z = camera.location[2] - camera.target[2];
+    return std::atan2(z, std::hypot(x, y)) * 180.0 / std::numbers::pi;
+}
+
+TEST(ShowScript, IsTheWholeScriptOfTheDefaults) {
+    const auto lines = scriptOf({"models/house.obj", "--frames", "120", "--out", "out/house"});
+    ASSERT_THAT(lines, SizeIs(8));
+    EXPECT_EQ(lines[0], "_-Import \"models/house.obj\"");
+    EXPECT_EQ(lines[1], "_-ViewportSize 1280 720");
+    EXPECT_THAT(lines[2], StartsWith("_-Camera _Location "));
+    EXPECT_EQ(lines[3], "_-FitView _Turn=Yes _Enter");
+    EXPECT_EQ(lines[4], "_-AnimationName \"house\"");
+    EXPECT_EQ(lines[5],
+              "_-SetTurntableAnimation 120 _Clockwise _jpg _RenderedViewport _Enter _Enter");
+    EXPECT_EQ(lines[6], "# The folder must be there before the recording starts.");
+    EXPECT_EQ(lines[7], "_-RecordAnimation _TargetFolder \"out/house\" _Enter");
+}
+
+TEST(ShowScript, TakesEveryOption) {
+    const auto lines =
+        scriptOf({"house.obj", "--frames", "36", "--out", "my out", "--size", "640x480", "--mode",
+                  "x-ray", "--format", "PNG", "--direction", "anticlockwise", "--distance", "1.25",
+                  "--target", "-1,2.5,1e3", "--name", "Town hall"});
+    ASSERT_THAT(lines, SizeIs(8));
+    EXPECT_EQ(lines[1], "_-ViewportSize 640 480");
+    EXPECT_THAT(lines[2], HasSubstr(" _Target -1,2.5,1000 _Enter"));
+    EXPECT_EQ(lines[3], "_-FitView _Turn=Yes _KeepTarget=Yes _Distance 1.25 _Enter");
+    EXPECT_EQ(lines[4], "_-AnimationName \"Town hall\"");
+    EXPECT_EQ(lines[5], "_-SetTurntableAnimation 36 _AntiClockwise _png _XRay _Enter _Enter");
+    EXPECT_EQ(lines[7], "_-RecordAnimation _TargetFolder \"my out\" _Enter");
+}
+
+TEST(ShowScript, CameraStandsAtItsElevationToTheFrontAndTheRight) {
+    const CameraLine by_default = readCameraLine(scriptWith({})[2]);
+    EXPECT_NEAR(elevation_deg(by_default), 22.0, 1e-9);
+    EXPECT_GT(by_default.location[0], 0.0);
+    EXPECT_LT(by_default.location[1], 0.0);
+    const CameraLine below = readCameraLine(scriptWith({"--elevation", "-30.5"})[2]);
+    EXPECT_NEAR(elevation_deg(below), -30.5, 1e-9);
+}
+
+TEST(ShowScript, CameraKeepsItsElevationBesideATargetFarAway) {
+    const CameraLine far_away =
+        readCameraLine(scriptWith({"--target", "7e12,-3,2", "--elevation", "45"})[2]);
+    EXPECT_EQ(far_away.target[0], 7e12);
+    EXPECT_NEAR(elevation_deg(far_away), 45.0, 1e-6);
+}
+
+TEST(ShowScript, NumbersReadBackExactly) {
+    const auto lines = scriptWith({"--target", "0.1,0.30000000000000004,12345678.000000002"});
+    const CameraLine camera = readCameraLine(lines[2]);
+    EXPECT_EQ(camera.target[0], 0.1);
+    EXPECT_EQ(camera.target[1], 0.30000000000000004);
+    EXPECT_EQ(camera.target[2], 12345678.000000002);
+}
+
+TEST(ShowScript, ModeIsTheOptionThatTheCapturePromptKnows) {
+    const std::vector<std::pair<const char*, const char*>> cases = {
+        {"Rendered", "_RenderedViewport"},
+        {"renderedviewport", "_RenderedViewport"},
+        {"X-Ray", "_XRay"},
+        {"xray", "_XRay"},
+        {"_XRay", "_XRay"},
+        {"WIREFRAME", "_Wireframe"},
+        {"Shaded", "_Shaded"},
+        {"RenderFull", "_RenderFull"},
+        {"render_preview", "_RenderPreview"}};
+    for (const auto& [mode, option] : cases)
+        EXPECT_THAT(scriptWith({"--mode", mode})[5], HasSubstr(std::string(" ") + option + " "))
+            << mode;
+}
+
+TEST(ShowScript, NameComesFromTheModelWithoutForbiddenCharacters) {
+    const auto name_of = [](const std::string& model) {
+        return scriptOf({model, "--frames", "8", "--out", "out"})[4];
+    };
+    EXPECT_EQ(name_of("a/b/Grand Hall.v2.glb"), "_-AnimationName \"Grand Hall.v2\"");
+    EXPECT_EQ(name_of("a:b*c?d<e>f|g\\h#i%j.obj"), "_-AnimationName \"a_b_c_d_e_f_g_h_i_j\"");
+    EXPECT_EQ(name_of("größe.obj"), "_-AnimationName \"größe\"");
+    EXPECT_EQ(name_of("_Enter.obj"), "_-AnimationName \"_Enter\"");
+}
+
+TEST(ShowScript, LongNameOfAModelIsCutBetweenTwoCharacters) {
+    std::string model;
+    for (int i = 0; i < 125; ++i)
+        model += "ä"; // two bytes each; 241 bytes hold 120 of them
+    std::string expected;
+    for (int i = 0; i < 120; ++i)
+        expected += "ä";
+    EXPECT_EQ(scriptOf({model, "--frames", "8", "--out", "out"})[4],
+              "_-AnimationName \"" + expected + "\"");
+}
+
+TEST(ShowScript, RunsNothing) {
+    TempFolder folder;
+    Start start;
+    start.folder = folder.path();
+    start.arguments = {"turntable", "missing.obj", "--frames",     "8",
+                       "--out",     "out",         "--show-script"};
+    EXPECT_EQ(run(start).exit_code, 0);
+    EXPECT_TRUE(std::filesystem::is_empty(folder.path()));
+}
+
+} // namespace
+} // namespace quarn::test
