@@ -35,7 +35,7 @@ int hexDigit(char character) {
 
 std::uint32_t randomBits() {
     try {
-        static thread_local std::random_device device;
+        std::random_device device;
         return device();
     } catch (const std::exception&) {
         // No entropy source. Time and a counter still make identifiers of one program differ.
