@@ -1,0 +1,86 @@
+#include "sdk/qncore/QnApp.h"
+#include "sdk/qncore/QnDoc.h"
+#include "sdk/qncore/QnView.h"
+#include "zoetrix/commands/cmdZoetrix.h"
+#include "zoetrix/plugin/ZoetrixUtilities.h"
+
+#include <algorithm>
+#include <string_view>
+
+namespace {
+
+constexpr std::wstring_view invalid_file_characters = L"\\|/:*?\"<>";
+
+/// Names of this length and above are refused.
+constexpr int refused_name_length = 256;
+
+bool IsControlCharacter(wchar_t character) {
+    const auto code = static_cast<unsigned long>(character);
+    return code < 0x20 || (code >= 0x7F && code < 0xA0);
+}
+
+bool IsLineBreak(wchar_t character) {
+    return (character >= L'\n' && character <= L'\r') || character == L'\u0085' ||
+           character == L'\u2028' || character == L'\u2029';
+}
+
+KM_SimpleArray<CQuarnView*> ViewsOf(const CQuarnDoc& doc) {
+    KM_SimpleArray<CQuarnView*> views;
+    doc.GetViewList(views, true, true);
+    return views;
+}
+
+bool HasName(const CQuarnView& view, const KM_wString& name, bool ignore_case) {
+    const wchar_t* view_name = view.MainViewport().Name();
+    return ignore_case ? name.CompareNoCase(view_name) == 0 : name == view_name;
+}
+
+} // namespace
+
+bool GetViewList(KM_ClassArray<KM_wString>& names) {
+    const CQuarnDoc* doc = QuarnApp().ActiveDoc();
+    if (!doc)
+        return true;
+    for (const CQuarnView* view : ViewsOf(*doc)) {
+        if (view)
+            names.Append(view->MainViewport().Name());
+    }
+    return true;
+}
+
+CQuarnView* CZoetrixUtilities::FindQuarnViewByName(CQuarnDoc& doc, const KM_wString& name,
+                                                   bool ignore_case) {
+    for (CQuarnView* view : ViewsOf(doc)) {
+        if (view && HasName(*view, name, ignore_case))
+            return view;
+    }
+    return nullptr;
+}
+
+void CleanExtention(KM_wString& ext) {
+    ext.Remove(L'.');
+}
+
+bool IsValidFileName(KM_wString name) {
+    if (name.IsEmpty() || name.Length() >= refused_name_length)
+        return false;
+    return name.View().find_first_of(invalid_file_characters) == std::wstring_view::npos;
+}
+
+int ReplaceInvalidFileChar(KM_wString& name) {
+    int replaced = 0;
+    for (const wchar_t character : invalid_file_characters)
+        replaced += name.Replace(character, L'_');
+    return replaced;
+}
+
+bool StaysInsideFolder(const KM_wString& name) {
+    return std::ranges::none_of(name.View(), [](wchar_t character) {
+        return character == L'/' || character == L'\\' || IsControlCharacter(character);
+    });
+}
+
+bool CanBeQuotedInScript(const KM_wString& path) {
+    return std::ranges::none_of(
+        path.View(), [](wchar_t character) { return character == L'"' || IsLineBreak(character); });
+}

@@ -1,0 +1,6 @@
+#include "zoetrix/plugin/ZoetrixApp.h"
+
+bool CZoetrixApp::InitInstance() {
+    CWinApp::InitInstance();
+    return true;
+}
