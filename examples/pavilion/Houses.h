@@ -145,6 +145,11 @@ inline void addRoof(ModelWriter& model, const House& h) {
     model.beginObject(h.name + " ridge", "terracotta_dark");
     const Vec top = middle + Vec{0, 0, h.rise + 0.17};
     addBar(model, top - run * half_run, top + run * half_run, 0.12, 14);
+    for (const RoofSlope& slope : slopes) {
+        for (const double end : {0.02, slope.eave_width - 0.02}) {
+            addBar(model, slope.at(end, 0.0, 0.04), slope.at(end, slope.slope_length, 0.04), 0.085);
+        }
+    }
     model.beginObject(h.name + " chimney", h.plaster);
     const Vec stack = middle + run * (0.28 * length_along) + cross({0, 0, 1}, run) * (0.2 * span);
     addBox(model, stack + Vec{-0.35, -0.28, 0.2}, stack + Vec{0.35, 0.28, h.rise + 0.75});

@@ -48,9 +48,14 @@ struct Corner {
 /// decimals, a tenth of a millimetre, and equal ones are stored once.
 class ModelWriter {
 public:
-    /// Faces that follow belong to this object and have this material of the MTL file.
+    /// Faces that follow belong to this object, which may have been begun before, and have this
+    /// material of the MTL file.
     void beginObject(const std::string& name, const std::string& material) {
-        m_body += "o " + name + "\nusemtl " + material + "\n";
+        const auto [found, is_new] = m_object_index.emplace(name, m_objects.size());
+        if (is_new) {
+            m_objects.push_back("o " + name + "\nusemtl " + material + "\n");
+        }
+        m_current = found->second;
     }
 
     /// A flat face with corners anticlockwise as seen from outside.
@@ -68,24 +73,28 @@ public:
 
     /// A part of a curved surface: each corner has a normal of its own.
     void face(std::span<const Corner> corners) {
-        m_body += 'f';
+        std::string& body = m_objects[m_current];
+        body += 'f';
         for (const Corner& corner : corners) {
-            m_body += ' ' + std::to_string(indexOf(m_places, "v", corner.place)) + "//" +
-                      std::to_string(indexOf(m_normals, "vn", unit(corner.normal)));
+            body += ' ' + std::to_string(indexOf(m_places, "v", corner.place)) + "//" +
+                    std::to_string(indexOf(m_normals, "vn", unit(corner.normal)));
         }
-        m_body += '\n';
+        body += '\n';
     }
 
     void polyline(const std::string& name, std::span<const Vec> places) {
-        m_body += "o " + name + "\nl";
+        std::string body = "o " + name + "\nl";
         for (const Vec& place : places) {
-            m_body += ' ' + std::to_string(indexOf(m_places, "v", place));
+            body += ' ' + std::to_string(indexOf(m_places, "v", place));
         }
-        m_body += '\n';
+        m_objects.push_back(body + '\n');
     }
 
     void write(std::ostream& file, const std::string& material_file) const {
-        file << "mtllib " << material_file << '\n' << m_vertices << m_body;
+        file << "mtllib " << material_file << '\n' << m_vertices;
+        for (const std::string& object : m_objects) {
+            file << object;
+        }
     }
 
 private:
@@ -117,7 +126,9 @@ private:
     }
 
     std::string m_vertices;
-    std::string m_body;
+    std::vector<std::string> m_objects;
+    std::size_t m_current = 0; ///< object that faces go to
+    Index m_object_index;
     Index m_places;
     Index m_normals;
 };

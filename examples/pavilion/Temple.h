@@ -92,6 +92,7 @@ inline void addEntablature(ModelWriter& model) {
     ring(0.36, beam_foot, beam_foot + 0.26);
     ring(0.40, beam_foot + 0.26, beam_foot + 0.50);
     ring(0.52, beam_foot + 0.50, beam_foot + 0.58);
+    ring(0.30, beam_foot + 0.58, beam_foot + 0.95); // closes the roof behind the rafters
     model.beginObject("Rafters", "wood_dark");
     const double z = beam_foot + 0.58;
     for (int i = -12; i <= 12; ++i) {

@@ -50,18 +50,21 @@ inline void addFacade(ModelWriter& model, const WallFrame& wall, double width, d
             }
         }
     }
+    if (reveal <= 0.0) {
+        return;
+    }
     for (const Opening& o : openings) {
         const auto p = [&](double right, double up, bool deep) {
             return wall.at(right, up, deep ? reveal : 0.0);
         };
-        model.face({p(o.left, o.bottom, false), p(o.left, o.top, false), p(o.left, o.top, true),
-                    p(o.left, o.bottom, true)});
-        model.face({p(o.right, o.bottom, true), p(o.right, o.top, true), p(o.right, o.top, false),
-                    p(o.right, o.bottom, false)});
-        model.face({p(o.left, o.top, true), p(o.left, o.top, false), p(o.right, o.top, false),
-                    p(o.right, o.top, true)});
-        model.face({p(o.left, o.bottom, false), p(o.left, o.bottom, true),
-                    p(o.right, o.bottom, true), p(o.right, o.bottom, false)});
+        model.face({p(o.left, o.bottom, true), p(o.left, o.top, true), p(o.left, o.top, false),
+                    p(o.left, o.bottom, false)});
+        model.face({p(o.right, o.bottom, false), p(o.right, o.top, false), p(o.right, o.top, true),
+                    p(o.right, o.bottom, true)});
+        model.face({p(o.left, o.top, false), p(o.left, o.top, true), p(o.right, o.top, true),
+                    p(o.right, o.top, false)});
+        model.face({p(o.left, o.bottom, true), p(o.left, o.bottom, false),
+                    p(o.right, o.bottom, false), p(o.right, o.bottom, true)});
     }
 }
 
