@@ -54,7 +54,7 @@ private:
                 }
             }
         }
-        if (best_row < 0 || largest <= 4.0 * epsilon * m_row_size[best_row])
+        if (best_row < 0 || largest <= 16.0 * epsilon * m_row_size[best_row])
             return false;
         m_used[m_column[step]] = true;
         std::swap(m_left[step], m_left[best_row]);
