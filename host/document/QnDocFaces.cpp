@@ -37,6 +37,11 @@ CQuarnSun& CQuarnDoc::Sun() {
     return m_document->sun().face();
 }
 
+const CQuarnObject* CQuarnDoc::FindObjectByName(const wchar_t* name) const {
+    const quarn::DocumentObject* object = name ? m_document->objects().findByName(name) : nullptr;
+    return object ? &object->face : nullptr;
+}
+
 bool CQuarnDoc::HideObject(const CQuarnObjRef& object, bool) {
     return m_document->objects().setVisible(object.ObjectUuid(), false);
 }

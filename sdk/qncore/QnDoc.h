@@ -36,6 +36,10 @@ public:
     CQuarnLightTable& LightTable();
     CQuarnSun& Sun();
 
+    /// The first object with this name, ignoring case, or null. Owned by the document; valid until
+    /// the document changes. A plug-in that wants to find it again keeps its id.
+    const CQuarnObject* FindObjectByName(const wchar_t* name) const;
+
     /// Hides (shows) an object.
     /// @param ignore_modes  also when the object is locked
     /// @return true when its visibility changed; false for a reference to nothing and for an object
