@@ -3,6 +3,7 @@
 #include "host/import/ModelFileAccess.h"
 #include "host/import/ModelFileCheck.h"
 #include "host/import/SceneReading.h"
+#include "host/import/SceneRepair.h"
 
 #include <assimp/Importer.hpp>
 #include <assimp/commonMetaData.h>
@@ -52,7 +53,7 @@ ModelConventions conventionsOf(const aiScene& scene, const fs::path& path) {
     const std::string format = modelFormat(path);
     ModelConventions conventions;
     conventions.turn_y_up =
-        !isOneOf(format, {"obj", "ply", "stl", "off", "3mf", "amf", "dxf", "xyz"});
+        !isOneOf(format, {"obj", "ply", "stl", "off", "3mf", "amf", "dxf", "blend"});
     conventions.keep_normals = format != "stl";
     conventions.linear_colors = hasLinearColors(scene, format);
     conventions.file_name = KM_wString::FromUtf8(path.stem().string());
@@ -86,6 +87,19 @@ Error nothingLeft(const fs::path& path, const ImportedModel& model) {
     return cannotReadModel(path, why, "Export the model again, with its meshes.");
 }
 
+/// Reads the file into the importer's scene; false with the importer's error text otherwise.
+bool readScene(Assimp::Importer& importer, const fs::path& path) {
+    constexpr unsigned steps = aiProcess_ValidateDataStructure | aiProcess_Triangulate |
+                               aiProcess_SortByPType | aiProcess_TransformUVCoords;
+    if (importer.ReadFile(path.string(), 0) == nullptr) {
+        return false;
+    }
+    // The scene is the importer's own, which hands it out as constant only for its users' sake.
+    auto* const scene = const_cast<aiScene*>(importer.GetScene());
+    repairScene(*scene);
+    return scene->mNumMeshes == 0 || importer.ApplyPostProcessing(steps) != nullptr;
+}
+
 Result<ImportedModel> readChecked(const fs::path& path) {
     const ModelFolder folder(path);
     std::set<std::string> refused;
@@ -97,9 +111,7 @@ Result<ImportedModel> readChecked(const fs::path& path) {
         return cannotReadModel(path, "files of this kind are not known",
                                "Choose a model file (OBJ, glTF, GLB, PLY, STL, ...).");
     }
-    constexpr unsigned steps = aiProcess_ValidateDataStructure | aiProcess_Triangulate |
-                               aiProcess_SortByPType | aiProcess_TransformUVCoords;
-    if (importer.ReadFile(path.string(), steps) == nullptr) {
+    if (!readScene(importer, path)) {
         return cannotReadModel(path, cleaned(importer.GetErrorString()), repair);
     }
     const std::unique_ptr<aiScene> scene(importer.GetOrphanedScene());

@@ -7,6 +7,7 @@
 #include <cstdint>
 #include <cstring>
 #include <fstream>
+#include <sstream>
 
 namespace quarn {
 namespace {
@@ -53,11 +54,35 @@ std::string whyBadGlb(std::istream& file, std::uint64_t size) {
     if (file.gcount() < static_cast<std::streamsize>(head.size())) {
         return "the file is cut short";
     }
+    if (littleEndian(&head[4]) != 2) {
+        return {}; // an older layout
+    }
     const std::uint64_t whole_length = littleEndian(&head[8]);
     const std::uint64_t text_length = littleEndian(&head[12]);
     return whole_length <= size && head.size() + text_length <= whole_length
                ? std::string()
                : "the lengths in its header do not fit the file's length";
+}
+
+/// The counts stand at the first line that is neither the keyword nor a comment.
+std::string whyBadOff(std::istream& file, std::uint64_t size) {
+    constexpr int most_lines = 1000;
+    constexpr std::uint64_t least_bytes_a_line = 6; // three numbers
+    std::string line;
+    for (int i = 0; i < most_lines && std::getline(file, line); ++i) {
+        const std::size_t digits = line.find_first_of("0123456789");
+        const std::size_t letters = line.find_first_not_of("OFFCNST4n \t\r0123456789");
+        if (digits == std::string::npos || letters != std::string::npos) {
+            continue;
+        }
+        std::uint64_t vertices = 0;
+        std::uint64_t faces = 0;
+        std::istringstream(line.substr(digits)) >> vertices >> faces;
+        const std::uint64_t most = size / least_bytes_a_line + 1;
+        return vertices <= most && faces <= most ? std::string()
+                                                 : "it claims more vertices or faces than it holds";
+    }
+    return {};
 }
 
 std::string whyBadBytes(const fs::path& path, std::istream& file, std::uint64_t size) {
@@ -67,6 +92,9 @@ std::string whyBadBytes(const fs::path& path, std::istream& file, std::uint64_t 
     }
     if (format == "glb") {
         return whyBadGlb(file, size);
+    }
+    if (format == "off") {
+        return whyBadOff(file, size);
     }
     return format == "ply" ? whyBadPly(file, size) : std::string();
 }

@@ -187,13 +187,15 @@ private:
 
     /// A name that people gave, not one that the reading library made up.
     KM_wString nameOf(const PlacedNode& placed, const aiMesh& mesh) const {
-        const bool is_root = placed.node == m_scene.mRootNode;
-        const std::string_view own(mesh.mName.data, mesh.mName.length);
-        if (!is_root && placed.node->mName.length > 0) {
+        if (placed.node != m_scene.mRootNode && isGivenName(placed.node->mName)) {
             return textOf(placed.node->mName);
         }
-        const bool made_up = own.empty() || own == "defaultobject" || own.front() == '<';
-        return made_up ? m_conventions.file_name : textOf(mesh.mName);
+        return isGivenName(mesh.mName) ? textOf(mesh.mName) : m_conventions.file_name;
+    }
+
+    static bool isGivenName(const aiString& name) {
+        const std::string_view text(name.data, name.length);
+        return !text.empty() && text != "defaultobject" && text.front() != '<';
     }
 
     void readCameras() {
