@@ -3,6 +3,8 @@
 #include "quarn/CaptureMode.h"
 
 #include <CLI/CLI.hpp>
+#include <algorithm>
+#include <sstream>
 
 namespace quarn::program {
 
@@ -64,27 +66,27 @@ void addCommonOptions(CLI::App& command, CommonOptions& common) {
 CLI::App& addTurntable(CLI::App& program, TurntableOptions& options) {
     CLI::App& command =
         *program.add_subcommand("turntable", "Record a turntable as pictures and a page");
-    command.add_option("MODEL", options.model, "The model file: OBJ, glTF, GLB, PLY, STL, ...");
-    command.add_option("--frames", options.frames, "Pictures of one whole turn, from 1");
-    command.add_option("--out", options.folder, "Folder for the pictures and the page");
-    command.add_option("--size", options.size, "Width x height of a picture in pixels")
+    const auto add = [&](const char* name, std::string& value, const char* value_name,
+                         const std::string& description) {
+        return command.add_option(name, value, description)->type_name(value_name);
+    };
+    add("MODEL", options.model, "", "The model file: OBJ, glTF, GLB, PLY, STL, ...")->required();
+    add("--frames", options.frames, "N", "Pictures of one whole turn, from 1")->required();
+    add("--out", options.folder, "DIR", "Folder for the pictures and the page")->required();
+    add("--size", options.size, "WxH", "Size of a picture in pixels")->capture_default_str();
+    add("--mode", options.mode, "NAME", "Display mode: " + captureModeNames())
         ->capture_default_str();
-    command.add_option("--mode", options.mode, "Display mode: " + captureModeNames())
+    add("--format", options.format, "NAME", "jpg, png, bmp or tga")->capture_default_str();
+    add("--direction", options.direction, "NAME",
+        "Way round seen from above, clockwise or anticlockwise")
         ->capture_default_str();
-    command.add_option("--format", options.format, "jpg, png, bmp or tga")->capture_default_str();
-    command
-        .add_option("--direction", options.direction,
-                    "Way round, clockwise or anticlockwise, seen from above")
+    add("--elevation", options.elevation_deg, "DEG",
+        "Angle of the camera above the model, -89 to 89")
         ->capture_default_str();
-    command
-        .add_option("--elevation", options.elevation_deg,
-                    "Degrees that the camera stands above the model, -89 to 89")
-        ->capture_default_str();
-    command.add_option("--distance", options.distance_factor,
-                       "Camera distance times this factor: below 1 nearer, above 1 farther");
-    command.add_option("--target", options.target,
-                       "X,Y,Z of the point to turn about (default: the model's middle)");
-    command.add_option("--name", options.name, "Name of the animation (default: the model file's)");
+    add("--distance", options.distance_factor, "FACTOR",
+        "Camera distance times this: below 1 is nearer, above 1 farther");
+    add("--target", options.target, "X,Y,Z", "Point to turn about (default: the model's middle)");
+    add("--name", options.name, "NAME", "Name of the animation (default: the model file's)");
     command.add_flag("--show-script", options.shows_script,
                      "Print the host commands that would be run, and run nothing");
     command.footer(TURNTABLE_FOOTER);
@@ -94,8 +96,8 @@ CLI::App& addTurntable(CLI::App& program, TurntableOptions& options) {
 
 CLI::App& addRun(CLI::App& program, ScriptOptions& options) {
     CLI::App& command = *program.add_subcommand("run", "Run a script of host commands");
-    command.add_option("SCRIPT", options.script, "The script file");
-    command.add_option("MODEL", options.model, "A model file to read first");
+    command.add_option("SCRIPT", options.script, "The script file")->type_name("")->required();
+    command.add_option("MODEL", options.model, "A model file to read first")->type_name("");
     command.footer(RUN_FOOTER);
     addCommonOptions(command, options.common);
     return command;
@@ -103,7 +105,7 @@ CLI::App& addRun(CLI::App& program, ScriptOptions& options) {
 
 CLI::App& addInfo(CLI::App& program, ModelOptions& options) {
     CLI::App& command = *program.add_subcommand("info", "Tell what a model file holds");
-    command.add_option("MODEL", options.model, "The model file");
+    command.add_option("MODEL", options.model, "The model file")->type_name("")->required();
     command.footer(INFO_FOOTER);
     addCommonOptions(command, options.common);
     return command;
@@ -125,21 +127,16 @@ Outcome refuseLeftOver(const CLI::App& command, const std::string& word) {
     return Outcome::misuse("unexpected argument " + word + hintOf(command));
 }
 
-Outcome refuseMissing(const CLI::App& command, const std::string& what) {
-    return Outcome::misuse(command.get_name() + " needs " + what + hintOf(command));
+/// The command that was typed, or the program where none was.
+const CLI::App& typedCommand(const CLI::App& program) {
+    const auto typed = program.get_subcommands([](const CLI::App* c) { return c->parsed(); });
+    return typed.empty() ? program : *typed.front();
 }
 
-/// Every command is there with all that it cannot do without, and nothing is left over.
-std::variant<Outcome, const CLI::App*> chosenCommand(const CLI::App& program) {
-    if (!program.remaining().empty())
-        return refuseLeftOver(program, program.remaining().front());
-    const std::vector<const CLI::App*> chosen =
-        program.get_subcommands([](const CLI::App* command) { return command->parsed(); });
-    if (chosen.empty())
-        return Outcome{Outcome::misused, SHORT_HELP};
-    if (!chosen.front()->remaining().empty())
-        return refuseLeftOver(*chosen.front(), chosen.front()->remaining().front());
-    return chosen.front();
+Outcome refuseMistake(const CLI::App& program, const CLI::ParseError& mistake) {
+    std::string message = mistake.what();
+    std::replace(message.begin(), message.end(), '\n', ' ');
+    return Outcome::misuse(message + hintOf(typedCommand(program)));
 }
 
 } // namespace
@@ -164,26 +161,22 @@ Request readCommandLine(int argument_count, const char* const* arguments) {
         program.exit(finished, text, text);
         return Outcome::success(text.str());
     } catch (const CLI::ParseError& mistake) {
-        return Outcome::misuse(std::string(mistake.what()) + hintOf(program));
+        return refuseMistake(program, mistake);
     }
 
-    const auto chosen = chosenCommand(program);
-    if (const Outcome* const refusal = std::get_if<Outcome>(&chosen))
-        return *refusal;
-    const CLI::App& command = *std::get<const CLI::App*>(chosen);
+    const CLI::App& command = typedCommand(program);
+    for (const CLI::App* reader : {static_cast<const CLI::App*>(&program), &command})
+        if (!reader->remaining().empty())
+            return refuseLeftOver(*reader, reader->remaining().front());
+    if (&command == &program)
+        return Outcome{Outcome::misused, SHORT_HELP};
     if (&command == &turntable_command) {
         turntable.was_name_given = command.count("--name") > 0;
-        if (turntable.model.empty())
-            return refuseMissing(command, "a model file");
-        if (turntable.frames.empty())
-            return refuseMissing(command, "--frames N, the number of pictures");
-        if (turntable.folder.empty())
-            return refuseMissing(command, "--out DIR, the folder for the pictures");
         return turntable;
     }
     if (&command == &run_command)
-        return script.script.empty() ? Request(refuseMissing(command, "a script file")) : script;
-    return model.model.empty() ? Request(refuseMissing(command, "a model file")) : model;
+        return script;
+    return model;
 }
 
 } // namespace quarn::program

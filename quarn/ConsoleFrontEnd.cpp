@@ -59,6 +59,8 @@ void ConsoleFrontEnd::rememberWords(std::string_view text) {
 void ConsoleFrontEnd::print(std::wstring_view text) {
     const std::string bytes = utf8(text);
     rememberWords(bytes);
+    if (m_keeps_words)
+        m_kept_words += bytes;
     if (m_prints == Prints::hidden)
         return;
     m_progress.clear();

@@ -30,6 +30,10 @@ public:
     std::string lastWords() const;
     void forgetLastWords();
 
+    /// From now on everything that is printed is kept.
+    void keepWords() { m_keeps_words = true; }
+    const std::string& keptWords() const { return m_kept_words; }
+
     void print(std::wstring_view text) override;
     Answer ask(const Question& question) override;
     int showMessage(std::wstring_view text, std::wstring_view title, unsigned flags) override;
@@ -51,6 +55,8 @@ private:
     RecordingPace::Clock::time_point m_next_progress;
     std::string m_last_line;
     std::string m_open_line; ///< printed so far without a line break
+    bool m_keeps_words = false;
+    std::string m_kept_words;
     int m_frames_written = 0;
     int m_frames_expected = 0;
 };

@@ -84,11 +84,11 @@ TEST(Arguments, LeftOverWordIsNamed) {
 }
 
 TEST(Arguments, MissingArgumentIsNamed) {
-    expectRefusal(run({"turntable"}), {"needs a model file"});
-    expectRefusal(turntable({"--out", "out"}), {"needs --frames"});
-    expectRefusal(turntable({"--frames", "3"}), {"needs --out"});
-    expectRefusal(run({"run"}), {"needs a script file"});
-    expectRefusal(run({"info"}), {"needs a model file"});
+    expectRefusal(run({"turntable"}), {"MODEL is required", "quarn turntable --help"});
+    expectRefusal(turntable({"--out", "out"}), {"--frames is required"});
+    expectRefusal(turntable({"--frames", "3"}), {"--out is required"});
+    expectRefusal(run({"run"}), {"SCRIPT is required", "quarn run --help"});
+    expectRefusal(run({"info"}), {"MODEL is required", "quarn info --help"});
     expectRefusal(turntable({"--frames"}), {"--frames"});
 }
 
