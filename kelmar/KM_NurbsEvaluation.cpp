@@ -105,10 +105,9 @@ KM_NurbsCurve::Evaluation KM_NurbsCurve::Evaluate(double t) const {
     const KM_3dVector local(sum.x / sum.w, sum.y / sum.w, sum.z / sum.w);
     Evaluation evaluation;
     evaluation.point = origin + local;
-    // Where a whole set of knots meets, the curve passes through a control point: no rounding then.
-    if (t == u[degree - 1] && u[0] == t)
-        evaluation.point = points[0];
-    else if (t == u[degree] && u[2 * degree - 1] == t)
+    // Where a whole set of knots meets, the curve passes through a control point, without rounding.
+    // At the span's start the sum above already gives it.
+    if (t == u[degree] && u[2 * degree - 1] == t)
         evaluation.point = points[degree];
     evaluation.derivative = (KM_3dVector(change.x, change.y, change.z) - change.w * local) / sum.w;
     evaluation.valid = evaluation.point.IsValid() && evaluation.derivative.IsValid();
