@@ -1,14 +1,3 @@
-# Lists the C++ sources that match `pattern` below the current folder.
-#   quarn_sources(<variable> [RECURSE] <pattern>...)
-macro(quarn_sources variable)
-    cmake_parse_arguments(arg "RECURSE" "" "" ${ARGN})
-    if(arg_RECURSE)
-        file(GLOB_RECURSE ${variable} CONFIGURE_DEPENDS ${arg_UNPARSED_ARGUMENTS})
-    else()
-        file(GLOB ${variable} CONFIGURE_DEPENDS ${arg_UNPARSED_ARGUMENTS})
-    endif()
-endmacro()
-
 # Restricts the exported symbols of `target` to what the version script `map` names.
 function(quarn_export_only target map)
     target_link_options(${target} PRIVATE "-Wl,--version-script=${map}")
