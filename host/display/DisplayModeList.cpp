@@ -14,8 +14,8 @@ constexpr struct {
     const wchar_t* english_name;
     int text_id;
 } MODE_NAME_IDS[] = {
-    {L"Wireframe", 32015}, {L"Shaded", 41101},  {L"Rendered", 19746}, {L"Translucent", 41102},
-    {L"X-Ray", 20120},     {L"Drawing", 41103}, {L"Clay", 41104},
+    {L"Wireframe", 32015}, {L"Shaded", 43001},  {L"Rendered", 19746}, {L"Translucent", 43002},
+    {L"X-Ray", 20120},     {L"Drawing", 43003}, {L"Clay", 43004},
 };
 
 KM_wString localNameOf(const KM_wString& english_name) {

@@ -1,9 +1,10 @@
 #include "host/document/Document.h"
 
 #include "host/display/DisplayMode.h"
-#include "host/display/DisplayScene.h"
 #include "host/document/DocumentList.h"
+#include "host/document/DocumentScene.h"
 #include "host/document/StandardViews.h"
+#include "host/front_end/FrontEnd.h"
 #include "host/import/ModelFile.h"
 #include "kelmar/KM_PolylineCurve.h"
 #include "sdk/qncore/QnLocalize.h"
@@ -91,6 +92,22 @@ std::vector<KM_Light> Document::shiningLights() const {
     if (const auto sun = m_sun.light())
         lights.insert(lights.begin(), *sun);
     return lights;
+}
+
+Result<void> Document::draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode,
+                            int width_px, int height_px, Image& picture) {
+    if (!m_scene)
+        m_scene = std::make_unique<DocumentScene>();
+    if (const auto updated = m_scene->update(m_objects, shiningLights()); !updated)
+        return updated;
+    return m_scene->draw(viewport, mode, width_px, height_px, picture);
+}
+
+void Document::regenerate() {
+    if (!m_scene)
+        return;
+    if (const auto updated = m_scene->update(m_objects, shiningLights()); !updated)
+        frontEnd().print(KM_wString::FromUtf8(updated.message() + "\n").View());
 }
 
 } // namespace quarn

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/app/Result.h"
 #include "host/document/DocumentSun.h"
 #include "host/document/LightStore.h"
 #include "host/document/ObjectTable.h"
@@ -12,9 +13,11 @@
 
 namespace quarn {
 
-class DisplayScene;
 class DocumentList;
+class DocumentScene;
 class FrontEnd;
+struct DisplayModeAttributes;
+struct Image;
 struct ImportedModel;
 
 /// A camera that a model file brought along.
@@ -68,9 +71,11 @@ public:
     /// The lights that shine now: the sun, when it is on, and the lights of the table.
     std::vector<KM_Light> shiningLights() const;
 
-    /// The scene of all objects, brought up to date. Built once for each revision of the objects
-    /// and shared by the views.
-    DisplayScene& scene();
+    /// Draws all that is visible. The scene is built once for each revision of the objects and
+    /// shared by the views.
+    /// @return an error, with the picture unchanged, when the scene cannot be built or drawn
+    Result<void> draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode, int width_px,
+                      int height_px, Image& picture);
     /// Brings the scene up to date where it was built before.
     void regenerate();
 
@@ -87,7 +92,7 @@ private:
     std::vector<NamedView> m_named_views;
     std::vector<std::unique_ptr<ViewState>> m_views;
     ViewState* m_active_view = nullptr;
-    std::unique_ptr<DisplayScene> m_scene;
+    std::unique_ptr<DocumentScene> m_scene; ///< null until something is drawn
     CQuarnDocProperties m_properties;
     CQuarnDoc m_face;
 

@@ -73,6 +73,6 @@ bool CQuarnLightTable::DeleteLight(int index, bool quiet) {
     const bool deleted = m_lights->remove(index);
     if (!deleted && !quiet)
         QuarnApp().Print(KM_wString::FormatToString(
-            QnLocalizeString(L"There is no light with the index %d\n", 40101), index));
+            QnLocalizeString(L"There is no light with the index %d\n", 42090), index));
     return deleted;
 }

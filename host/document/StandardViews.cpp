@@ -5,10 +5,10 @@ namespace quarn {
 namespace {
 
 constexpr StandardView STANDARD_VIEWS[] = {
-    {L"Top", 41201, KM_parallel_view, {0.0, 0.0, 1.0}},
-    {L"Front", 41202, KM_parallel_view, {0.0, -1.0, 0.0}},
-    {L"Right", 41203, KM_parallel_view, {1.0, 0.0, 0.0}},
-    {L"Perspective", 41204, KM_perspective_view, {40.0, -60.0, 35.0}},
+    {L"Top", 43101, KM_parallel_view, {0.0, 0.0, 1.0}},
+    {L"Front", 43102, KM_parallel_view, {0.0, -1.0, 0.0}},
+    {L"Right", 43103, KM_parallel_view, {1.0, 0.0, 0.0}},
+    {L"Perspective", 43104, KM_perspective_view, {40.0, -60.0, 35.0}},
 };
 
 constexpr double LENS_LENGTH_MM = 50.0;

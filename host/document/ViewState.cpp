@@ -90,8 +90,18 @@ bool ViewState::draw(Image& picture, int width_px, int height_px,
         return false;
     if (m_document.frontEnd().isInterrupted())
         return false;
-    render(picture, width_px, height_px, attributes);
-    return true;
+    return render(picture, width_px, height_px, attributes);
+}
+
+bool ViewState::render(Image& picture, int width_px, int height_px,
+                       const CDisplayPipelineAttributes& attributes) {
+    const auto drawn =
+        m_document.draw(m_viewport, drawingAttributes(attributes), width_px, height_px, picture);
+    if (!drawn)
+        m_document.frontEnd().print(KM_wString::FromUtf8(drawn.message() + "\n").View());
+    else
+        ++m_draw_count;
+    return drawn.ok();
 }
 
 bool ViewState::copyToFrameBuffer(const Image& picture) {

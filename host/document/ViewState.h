@@ -60,8 +60,8 @@ public:
     bool setFrameSize(int width_px, int height_px);
 
     /// Draws the scene once.
-    /// @return false, with the picture unchanged, for a side outside 1 to largest_side_px, and
-    ///         once the person has asked the program to stop
+    /// @return false, with the picture unchanged, for a side outside 1 to largest_side_px, once the
+    ///         person has asked the program to stop, and, with a message, when memory lacks
     bool draw(Image& picture, int width_px, int height_px,
               const CDisplayPipelineAttributes& attributes);
     /// @return false for a picture of another size than the frame buffer's
@@ -77,7 +77,7 @@ public:
     std::uint64_t showCount() const { return m_show_count; }
 
 private:
-    void render(Image& picture, int width_px, int height_px,
+    bool render(Image& picture, int width_px, int height_px,
                 const CDisplayPipelineAttributes& attributes);
 
     Document& m_document;

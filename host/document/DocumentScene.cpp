@@ -1,0 +1,62 @@
+#include "host/document/DocumentScene.h"
+
+#include "host/document/ObjectTable.h"
+
+namespace quarn {
+
+namespace {
+
+/// How far a drawn curve may lie beside the true one, as a share of its size: less than a pixel
+/// even when it fills the largest picture.
+constexpr double CHORD_TOLERANCE_OF_SIZE = 5e-5;
+
+KM_3dPointArray displayPolyline(const KM_Curve& curve) {
+    KM_3dPointArray points;
+    const double size = curve.BoundingBox().Diagonal().Length();
+    curve.GetDisplayPolyline(CHORD_TOLERANCE_OF_SIZE * size, points);
+    return points;
+}
+
+} // namespace
+
+Result<void> DocumentScene::update(const ObjectTable& objects, std::vector<KM_Light> lights) {
+    if (m_content.revision != objects.revision())
+        takeObjects(objects);
+    takeVisibility(objects);
+    m_content.lights = std::move(lights);
+    return m_display.update(m_content);
+}
+
+Result<void> DocumentScene::draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode,
+                                 int width_px, int height_px, Image& picture) {
+    return m_pipeline.draw(m_display, viewport, mode, width_px, height_px, picture);
+}
+
+void DocumentScene::takeObjects(const ObjectTable& objects) {
+    m_content = SceneContent();
+    m_content.revision = objects.revision();
+    for (const auto& object : objects.objects()) {
+        if (object->mesh)
+            m_content.meshes.push_back({object->id, object->mesh, object->material, true});
+        else if (object->curve)
+            m_content.curves.push_back({object->id, displayPolyline(*object->curve)});
+        else if (object->point)
+            m_content.points.push_back({object->id, *object->point});
+    }
+}
+
+void DocumentScene::takeVisibility(const ObjectTable& objects) {
+    auto mesh = m_content.meshes.begin();
+    auto curve = m_content.curves.begin();
+    auto point = m_content.points.begin();
+    for (const auto& object : objects.objects()) {
+        if (object->mesh)
+            (mesh++)->visible = object->visible;
+        else if (object->curve)
+            (curve++)->visible = object->visible;
+        else if (object->point)
+            (point++)->visible = object->visible;
+    }
+}
+
+} // namespace quarn

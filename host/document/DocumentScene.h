@@ -1,0 +1,32 @@
+#pragma once
+
+#include "host/display/DisplayPipeline.h"
+#include "host/display/DisplayScene.h"
+#include "host/display/SceneContent.h"
+
+namespace quarn {
+
+class ObjectTable;
+
+/// A document's objects made ready for drawing, once for all its views.
+class DocumentScene {
+public:
+    /// Takes over what changed since the last call: everything when an object was added, removed
+    /// or changed, else the lights and what is shown or hidden.
+    /// @return an error when the scene cannot be built
+    Result<void> update(const ObjectTable& objects, std::vector<KM_Light> lights);
+
+    /// Draws the scene as the last update left it; as DisplayPipeline::draw.
+    Result<void> draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode, int width_px,
+                      int height_px, Image& picture);
+
+private:
+    void takeObjects(const ObjectTable& objects);
+    void takeVisibility(const ObjectTable& objects);
+
+    SceneContent m_content;
+    DisplayScene m_display;
+    DisplayPipeline m_pipeline; ///< keeps its buffers from picture to picture
+};
+
+} // namespace quarn
