@@ -151,6 +151,18 @@ TEST(NurbsCurve, ClampedUniformKnotsStartAtZero) {
     EXPECT_FALSE(KM_NurbsCurve().MakeClampedUniformKnotVector());
 }
 
+TEST(NurbsCurve, ClampedEndsAreTheirControlPointsExactly) {
+    for (int count = 4; count < 60; ++count) {
+        const auto points = randomPoints(count);
+        KM_NurbsCurve curve;
+        ASSERT_TRUE(curve.CreateClampedUniformNurbs(points, 4));
+        curve.SetWeight(0, 0.3);
+        curve.SetWeight(count - 1, 0.7);
+        EXPECT_EQ(curve.PointAtStart(), points.front());
+        EXPECT_EQ(curve.PointAtEnd(), points.back());
+    }
+}
+
 TEST(NurbsCurve, PeriodicCurveIsClosedAndSmoothAtItsSeam) {
     for (int order = 2; order <= 6; ++order) {
         KM_NurbsCurve curve;
