@@ -1,5 +1,6 @@
 #include "host/import/ModelFile.h"
 
+#include "host/import/LargeStack.h"
 #include "host/import/ModelFileAccess.h"
 #include "host/import/ModelFileCheck.h"
 #include "host/import/SceneReading.h"
@@ -66,11 +67,14 @@ void configure(Assimp::Importer& importer) {
     importer.SetPropertyBool(AI_CONFIG_IMPORT_NO_SKELETON_MESHES, true);
 }
 
-void warnOfRefused(const std::set<std::string>& refused, const ModelFolder& folder,
-                   ImportedModel& model) {
+/// The reading library tries many spellings of a name; only files that are there deserve a word.
+void warnOfRefused(const std::set<std::string>& refused, ImportedModel& model) {
+    std::set<fs::path> told;
     for (const std::string& name : refused) {
-        if (folder.leadsOutside(name)) {
-            model.warnings.push_back("The file '" + name +
+        const fs::path path = fs::path(name).lexically_normal();
+        std::error_code ignored;
+        if (fs::is_regular_file(path, ignored) && told.insert(path).second) {
+            model.warnings.push_back("The file '" + path.string() +
                                      "' was not read: it lies outside the model's folder.");
         }
     }
@@ -120,8 +124,18 @@ Result<ImportedModel> readChecked(const fs::path& path) {
     if (!model) {
         return cannotReadModel(path, model.message(), repair);
     }
-    warnOfRefused(refused, folder, model.value());
+    warnOfRefused(refused, model.value());
     return isEmpty(model.value()) ? nothingLeft(path, model.value()) : std::move(model);
+}
+
+Result<ImportedModel> readGuarded(const fs::path& path) {
+    try {
+        return readChecked(path);
+    } catch (const std::bad_alloc&) {
+        return cannotReadModel(path, "there is not enough memory", "Use a smaller model.");
+    } catch (const std::exception& failure) {
+        return cannotReadModel(path, cleaned(failure.what()), repair);
+    }
 }
 
 } // namespace
@@ -139,13 +153,9 @@ Result<ImportedModel> readModelFile(const fs::path& path) {
     if (!checked) {
         return checked.error();
     }
-    try {
-        return readChecked(path);
-    } catch (const std::bad_alloc&) {
-        return cannotReadModel(path, "there is not enough memory", "Use a smaller model.");
-    } catch (const std::exception& failure) {
-        return cannotReadModel(path, cleaned(failure.what()), repair);
-    }
+    Result<ImportedModel> model = ImportedModel{};
+    runWithLargeStack([&path, &model] { model = readGuarded(path); });
+    return model;
 }
 
 } // namespace quarn

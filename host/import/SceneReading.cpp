@@ -283,8 +283,8 @@ private:
             count += " of " + std::to_string(all);
         }
         m_model.warnings.push_back(count + " " + std::string(what) +
-                                   " were left out: they have an index that is out of range or a "
-                                   "coordinate that is no usable number.");
+                                   " were left out: an index is out of range or a coordinate is "
+                                   "no usable number.");
     }
 
     aiScene& m_scene;
