@@ -2,6 +2,7 @@
 //
 // QUARN_PROGRAM  the built `quarn`
 // CHROMIUM       the browser, /usr/bin/chromium by default
+// QUARN_SCREENSHOTS  where pictures of the page are left to look at; a temporary folder by default
 import { spawnSync } from 'node:child_process';
 import { existsSync, readdirSync } from 'node:fs';
 import { dirname, join } from 'node:path';
