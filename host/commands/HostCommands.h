@@ -24,5 +24,15 @@ CQuarnCommand::result runExit(const CQuarnCommandContext& context);
 CQuarnCommand::result runHelp(const CQuarnCommandContext& context);
 CQuarnCommand::result runLoadPlugIn(const CQuarnCommandContext& context);
 CQuarnCommand::result runRun(const CQuarnCommandContext& context);
+CQuarnCommand::result runAnimationName(const CQuarnCommandContext& context);
+CQuarnCommand::result runCamera(const CQuarnCommandContext& context);
+CQuarnCommand::result runDisplayMode(const CQuarnCommandContext& context);
+CQuarnCommand::result runFitView(const CQuarnCommandContext& context);
+CQuarnCommand::result runImport(const CQuarnCommandContext& context);
+CQuarnCommand::result runList(const CQuarnCommandContext& context);
+CQuarnCommand::result runNew(const CQuarnCommandContext& context);
+CQuarnCommand::result runOpen(const CQuarnCommandContext& context);
+CQuarnCommand::result runStandardView(const CQuarnCommandContext& context);
+CQuarnCommand::result runViewportSize(const CQuarnCommandContext& context);
 
 } // namespace quarn

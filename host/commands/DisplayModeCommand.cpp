@@ -1,0 +1,55 @@
+#include "host/commands/CommandEnd.h"
+#include "host/commands/HostCommands.h"
+#include "host/display/DisplayModeList.h"
+#include "host/document/Document.h"
+#include "sdk/qncore/QnGet.h"
+
+namespace quarn {
+
+namespace {
+
+/// A mode's name as an option: options hold letters and digits only.
+KM_wString optionText(KM_wString name) {
+    for (const wchar_t character : {L'_', L' ', L'-', L','})
+        name.Remove(character);
+    return name;
+}
+
+void addModes(CQuarnGetOption& get) {
+    for (const CDisplayPipelineAttributes& mode : DisplayModeList::instance().modes())
+        get.AddCommandOption({optionText(mode.EnglishName()), optionText(mode.LocalName())});
+}
+
+std::string modeNames() {
+    std::string names;
+    for (const CDisplayPipelineAttributes& mode : DisplayModeList::instance().modes())
+        names += (names.empty() ? "" : ", ") + mode.LocalName().ToUtf8();
+    return names;
+}
+
+} // namespace
+
+CQuarnCommand::result runDisplayMode(const CQuarnCommandContext& context) {
+    ViewState& view = Document::of(context.Document()).activeView();
+    const DisplayModeList& list = DisplayModeList::instance();
+    CQuarnGetOption get;
+    get.SetCommandPrompt(QnLocalizeString(L"Display mode", 42030));
+    if (view.displayMode())
+        get.SetDefaultString(view.displayMode()->LocalName());
+    addModes(get);
+
+    const CQuarnGet::result answer = get.GetOption();
+    if (answer != CQuarnGet::option && answer != CQuarnGet::string)
+        return get.CommandResult();
+    const CDisplayPipelineAttributes* mode =
+        answer == CQuarnGet::option
+            ? &list.modes()[static_cast<std::size_t>(get.Option()->m_option_index - 1)]
+            : list.findByName(get.String());
+    if (!mode)
+        return fail("There is no display mode \"" + KM_wString(get.String()).ToUtf8() +
+                    "\". The modes are " + modeNames() + ".");
+    view.setDisplayMode(mode->Id());
+    return CQuarnCommand::success;
+}
+
+} // namespace quarn
