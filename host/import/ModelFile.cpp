@@ -56,6 +56,7 @@ ModelConventions conventionsOf(const aiScene& scene, const fs::path& path) {
     conventions.turn_y_up =
         !isOneOf(format, {"obj", "ply", "stl", "off", "3mf", "amf", "dxf", "blend"});
     conventions.keep_normals = format != "stl";
+    conventions.gltf_cameras = isOneOf(format, {"gltf", "glb"});
     conventions.linear_colors = hasLinearColors(scene, format);
     conventions.file_name = KM_wString::FromUtf8(path.stem().string());
     return conventions;

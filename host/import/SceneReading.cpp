@@ -187,7 +187,7 @@ private:
 
     /// A name that people gave, not one that the reading library made up.
     KM_wString nameOf(const PlacedNode& placed, const aiMesh& mesh) const {
-        if (placed.node != m_scene.mRootNode && isGivenName(placed.node->mName)) {
+        if (isGivenName(placed.node->mName)) {
             return textOf(placed.node->mName);
         }
         return isGivenName(mesh.mName) ? textOf(mesh.mName) : m_conventions.file_name;
@@ -195,7 +195,8 @@ private:
 
     static bool isGivenName(const aiString& name) {
         const std::string_view text(name.data, name.length);
-        return !text.empty() && text != "defaultobject" && text.front() != '<';
+        const bool is_id = text.starts_with("nodes[") || text.starts_with("meshes[");
+        return !text.empty() && !is_id && text != "defaultobject" && text.front() != '<';
     }
 
     void readCameras() {
@@ -218,7 +219,7 @@ private:
         const auto turned = [&world_from_node](const aiVector3D& v) {
             return world_from_node * KM_3dVector(v.x, v.y, v.z);
         };
-        const aiVector3D& p = camera.mPosition;
+        const aiVector3D p = m_conventions.gltf_cameras ? aiVector3D() : camera.mPosition;
         const KM_3dPoint location = world_from_node * KM_3dPoint(p.x, p.y, p.z);
         KM_3dVector direction = turned(camera.mLookAt);
         ImportedCamera imported;
@@ -249,22 +250,28 @@ private:
         return distance > 1e-6 ? distance : 1.0;
     }
 
-    static void setOpening(const aiCamera& camera, KM_Viewport& viewport) {
+    void setOpening(const aiCamera& camera, KM_Viewport& viewport) const {
+        constexpr double near_distance = 0.1;
+        constexpr double far_distance = 1000.0;
+        const double stated = static_cast<double>(camera.mAspect);
+        const double aspect = stated > 0.01 && stated < 100.0 ? stated : 4.0 / 3.0;
+        const auto open = [&](double half_width) {
+            viewport.SetFrustum(-half_width, half_width, -half_width / aspect, half_width / aspect,
+                                near_distance, far_distance);
+        };
         const double width = static_cast<double>(camera.mOrthographicWidth);
         if (width > 0.0 && std::isfinite(width)) {
-            const double aspect = camera.mAspect > 0.0F ? static_cast<double>(camera.mAspect) : 1.0;
             viewport.SetProjection(KM_parallel_view);
-            viewport.SetFrustum(-width, width, -width / aspect, width / aspect, 0.1, 1000.0);
+            open(width);
             return;
         }
-        const double half_angle = 0.5 * static_cast<double>(camera.mHorizontalFOV);
+        const double angle = static_cast<double>(camera.mHorizontalFOV);
+        const double stated_or_one = stated > 0.0 ? stated : 1.0;
+        const double half_angle =
+            0.5 * (m_conventions.gltf_cameras ? angle / stated_or_one : angle);
         if (half_angle > 0.01 && half_angle < 1.5) {
-            const double aspect =
-                camera.mAspect > 0.0F ? static_cast<double>(camera.mAspect) : 4.0 / 3.0;
-            const double near_distance = 0.1;
-            const double half_width = near_distance * std::tan(half_angle);
-            viewport.SetFrustum(-half_width, half_width, -half_width / aspect, half_width / aspect,
-                                near_distance, 1000.0);
+            const double half_size = near_distance * std::tan(half_angle);
+            open(m_conventions.gltf_cameras ? half_size * aspect : half_size);
         }
     }
 

@@ -15,7 +15,10 @@ struct ModelConventions {
     bool turn_y_up = false;     ///< the scene is Y-up and must be turned
     bool keep_normals = true;   ///< false for STL, whose normals only repeat its facets
     bool linear_colors = false; ///< colours are linear light
-    KM_wString file_name;       ///< names what has no name of its own
+    /// The loader of glTF repeats a camera's place, which its node states already, and gives the
+    /// vertical angle times the aspect for the horizontal one.
+    bool gltf_cameras = false;
+    KM_wString file_name; ///< names what has no name of its own
 };
 
 /// Takes a scene of the reading library apart. Each mesh's memory is freed as soon as the last node
