@@ -1,0 +1,51 @@
+#include "host/display/AlphaCutout.h"
+
+#include "host/display/MipTexture.h"
+#include "host/display/RaySurface.h"
+#include "kelmar/KM_Mesh.h"
+
+namespace quarn {
+
+namespace {
+
+float opacityAt(const RaySurface& surface, unsigned triangle, float u, float v) {
+    float opacity = surface.opacity;
+    const std::uint32_t* vertex = surface.triangles[triangle].vi;
+    const float w = 1.0F - u - v;
+    if (surface.colors) {
+        const KM_Color* c = surface.colors;
+        opacity *=
+            (w * static_cast<float>(c[vertex[0]].a) + u * static_cast<float>(c[vertex[1]].a) +
+             v * static_cast<float>(c[vertex[2]].a)) /
+            255.0F;
+    }
+    if (surface.texture && surface.texture_coordinates) {
+        const KM_2fPoint* t = surface.texture_coordinates;
+        const float s = w * t[vertex[0]].x + u * t[vertex[1]].x + v * t[vertex[2]].x;
+        const float r = w * t[vertex[0]].y + u * t[vertex[1]].y + v * t[vertex[2]].y;
+        opacity *= surface.texture->sample(s, r, 0.0F).alpha;
+    }
+    return opacity;
+}
+
+void rejectCutouts(const RTCFilterFunctionNArguments* arguments) {
+    const auto& surface = *static_cast<const RaySurface*>(arguments->geometryUserPtr);
+    for (unsigned i = 0; i < arguments->N; ++i) {
+        if (arguments->valid[i] == 0)
+            continue;
+        const float opacity = opacityAt(surface, RTCHitN_primID(arguments->hit, arguments->N, i),
+                                        RTCHitN_u(arguments->hit, arguments->N, i),
+                                        RTCHitN_v(arguments->hit, arguments->N, i));
+        if (opacity < surface.alpha_cutoff)
+            arguments->valid[i] = 0;
+    }
+}
+
+} // namespace
+
+void setAlphaCutout(RTCGeometry geometry) {
+    rtcSetGeometryIntersectFilterFunction(geometry, rejectCutouts);
+    rtcSetGeometryOccludedFilterFunction(geometry, rejectCutouts);
+}
+
+} // namespace quarn

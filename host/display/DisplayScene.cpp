@@ -1,0 +1,145 @@
+#include "host/display/DisplayScene.h"
+
+#include "host/display/ColorSpace.h"
+#include "host/display/MipTexture.h"
+
+namespace quarn {
+
+namespace {
+
+constexpr std::size_t no_member = static_cast<std::size_t>(-1);
+
+KM_BoundingBox boxOf(const KM_3dPointArray& points) {
+    KM_BoundingBox box;
+    for (const KM_3dPoint& p : points)
+        box.Set(p);
+    return box;
+}
+
+} // namespace
+
+DisplayScene::DisplayScene() = default;
+DisplayScene::~DisplayScene() = default;
+
+Result<void> DisplayScene::update(const SceneContent& content) {
+    if (canKeep(content))
+        updateVisibility(content);
+    else
+        rebuild(content);
+    m_lights = content.lights;
+    updateBoxes();
+    const std::string error = m_rays.takeError();
+    if (error.empty())
+        return {};
+    clear();
+    return Error{"The scene cannot be drawn: " + error + ". Close other programs or hide objects."};
+}
+
+bool DisplayScene::canKeep(const SceneContent& content) const {
+    return m_built && content.revision == m_revision && content.meshes.size() == m_meshes.size() &&
+           content.curves.size() == m_curves.size() && content.points.size() == m_points.size();
+}
+
+void DisplayScene::clear() {
+    m_built = false;
+    m_meshes.clear();
+    m_curves.clear();
+    m_points.clear();
+    m_rays.build({});
+    updateBoxes();
+}
+
+void DisplayScene::rebuild(const SceneContent& content) {
+    const MeshCache earlier_meshes = std::exchange(m_mesh_cache, {});
+    TextureCache earlier_textures = std::exchange(m_texture_cache, {});
+    std::vector<RayScene::Member> members;
+    m_meshes.clear();
+    m_member_of_mesh.clear();
+    for (const SceneMesh& object : content.meshes) {
+        auto& mesh = m_mesh_cache[object.mesh.get()];
+        if (!mesh) {
+            const auto found = earlier_meshes.find(object.mesh.get());
+            mesh = found != earlier_meshes.end() ? found->second
+                                                 : std::make_shared<const RayMesh>(object.mesh);
+        }
+        const bool drawable = mesh->isDrawable();
+        m_meshes.push_back({drawable ? mesh : nullptr, object.visible});
+        m_member_of_mesh.push_back(drawable ? members.size() : no_member);
+        if (drawable)
+            members.push_back({mesh, surfaceOf(object, *mesh, earlier_textures), object.visible});
+    }
+    m_rays.build(std::move(members));
+    m_curves = content.curves;
+    m_points = content.points;
+    m_revision = content.revision;
+    m_built = true;
+}
+
+RaySurface DisplayScene::surfaceOf(const SceneMesh& object, const RayMesh& mesh,
+                                   TextureCache& earlier) {
+    static const Material default_material;
+    const Material& material = object.material ? *object.material : default_material;
+    const LinearColor albedo = linearFromColor(material.base_color);
+    RaySurface surface;
+    surface.triangles = mesh.mesh().m_F.data();
+    surface.vertices = mesh.mesh().m_V.data();
+    surface.corner_normals = mesh.cornerNormals();
+    surface.colors = mesh.mesh().m_C.empty() ? nullptr : mesh.mesh().m_C.data();
+    surface.albedo[0] = albedo.r;
+    surface.albedo[1] = albedo.g;
+    surface.albedo[2] = albedo.b;
+    surface.opacity = static_cast<float>(material.base_color.a) / 255.0F;
+    surface.has_cutout = material.alpha_cutout;
+    surface.alpha_cutoff = material.alpha_cutoff;
+    if (!mesh.mesh().m_T.empty() && material.base_color_texture) {
+        surface.texture_coordinates = mesh.mesh().m_T.data();
+        surface.texture = textureOf(material, earlier);
+    }
+    return surface;
+}
+
+const MipTexture* DisplayScene::textureOf(const Material& material, TextureCache& earlier) {
+    const Texture* const key = material.base_color_texture.get();
+    CachedTexture& cached = m_texture_cache[key];
+    if (const auto found = earlier.find(key); !cached.mips && found != earlier.end())
+        cached = std::move(found->second);
+    if (!cached.mips) {
+        cached.source = material.base_color_texture;
+        cached.mips = std::make_unique<MipTexture>(*cached.source);
+    }
+    return cached.mips.get();
+}
+
+void DisplayScene::updateVisibility(const SceneContent& content) {
+    bool changed = false;
+    for (std::size_t i = 0; i < m_meshes.size(); ++i) {
+        if (m_meshes[i].visible == content.meshes[i].visible)
+            continue;
+        m_meshes[i].visible = content.meshes[i].visible;
+        if (m_member_of_mesh[i] != no_member)
+            m_rays.setVisible(m_member_of_mesh[i], m_meshes[i].visible);
+        changed = true;
+    }
+    if (changed)
+        m_rays.commit();
+    for (std::size_t i = 0; i < m_curves.size(); ++i)
+        m_curves[i].visible = content.curves[i].visible;
+    for (std::size_t i = 0; i < m_points.size(); ++i)
+        m_points[i].visible = content.points[i].visible;
+}
+
+void DisplayScene::updateBoxes() {
+    m_surface_box = KM_BoundingBox();
+    for (const MeshObject& object : m_meshes)
+        if (object.visible && object.mesh)
+            m_surface_box.Union(object.mesh->box());
+    m_box = m_surface_box;
+    for (const SceneCurve& curve : m_curves)
+        if (curve.visible)
+            m_box.Union(boxOf(curve.polyline));
+    for (const ScenePoint& point : m_points)
+        if (point.visible)
+            m_box.Set(point.location);
+}
+
+} // namespace quarn

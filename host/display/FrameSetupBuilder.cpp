@@ -1,0 +1,143 @@
+#include "host/display/FrameSetupBuilder.h"
+
+#include "host/display/ColorSpace.h"
+#include "host/display/DisplayMode.h"
+#include "host/display/DisplayScene.h"
+#include "host/display/SkyModel.h"
+#include "kelmar/KM_Viewport.h"
+
+#include <algorithm>
+
+namespace quarn {
+
+namespace {
+
+void set(float (&to)[3], const LinearColor& color) {
+    to[0] = color.r;
+    to[1] = color.g;
+    to[2] = color.b;
+}
+
+void setPoint(float (&to)[3], const KM_3dPoint& point) {
+    to[0] = static_cast<float>(point.x);
+    to[1] = static_cast<float>(point.y);
+    to[2] = static_cast<float>(point.z);
+}
+
+void setScene(FrameSetup& frame, const DisplayScene& scene) {
+    frame.scene = scene.rays().root();
+    frame.sole_first_surface = scene.rays().soleFirstSurface();
+    frame.first_surfaces = scene.rays().firstSurfaces().data();
+    frame.surfaces = scene.rays().surfaces().data();
+    const KM_BoundingBox& box = scene.surfaceBox();
+    if (!box.IsValid())
+        return;
+    setPoint(frame.scene_min, box.m_min);
+    setPoint(frame.scene_max, box.m_max);
+    frame.scene_size = static_cast<float>(box.Diagonal().Length());
+}
+
+FrameLight frameLight(const DirectionalLight& light) {
+    FrameLight result{};
+    std::copy_n(light.toward, 3, result.toward);
+    set(result.color, light.color);
+    result.shadow = light.shadow;
+    return result;
+}
+
+template <std::size_t capacity>
+int setLights(const std::vector<DirectionalLight>& lights, FrameLight (&to)[capacity]) {
+    const std::size_t count = std::min(lights.size(), capacity);
+    std::transform(lights.begin(), lights.begin() + static_cast<std::ptrdiff_t>(count), to,
+                   frameLight);
+    return static_cast<int>(count);
+}
+
+void setLighting(FrameSetup& frame, const Lighting& lighting) {
+    std::copy_n(lighting.ambient.base, 3, frame.ambient_base);
+    for (int c = 0; c < 3; ++c)
+        std::copy_n(lighting.ambient.slope[c], 3, frame.ambient_slope[c]);
+    frame.fixed_count = setLights(lighting.fixed, frame.fixed);
+    frame.sun_count = setLights(lighting.suns, frame.suns);
+    set(frame.sky_horizon, lighting.sky.horizon);
+    set(frame.sky_zenith, lighting.sky.zenith);
+    set(frame.sky_nadir, lighting.sky.nadir);
+    set(frame.sky_glow, lighting.sky.glow);
+    set(frame.sky_disc, lighting.sky.disc);
+    std::copy_n(lighting.sky.toward_sun, 3, frame.toward_sun);
+}
+
+/// The ground lies a little below the lowest point, so that it never flickers through a floor of
+/// the model's own.
+void setGround(FrameSetup& frame) {
+    if (!frame.scene)
+        return;
+    const float width = frame.scene_max[0] - frame.scene_min[0];
+    const float depth = frame.scene_max[1] - frame.scene_min[1];
+    const float height = frame.scene_max[2] - frame.scene_min[2];
+    const float reach = std::max({width, depth, height});
+    frame.has_ground = true;
+    frame.ground_height = frame.scene_min[2] - 1e-3F * frame.scene_size;
+    frame.ground_center[0] = 0.5F * (frame.scene_min[0] + frame.scene_max[0]);
+    frame.ground_center[1] = 0.5F * (frame.scene_min[1] + frame.scene_max[1]);
+    frame.ground_fade_start = 1.2F * reach;
+    frame.ground_fade_end = 14.0F * reach;
+    set(frame.ground_albedo, {0.47F, 0.465F, 0.45F});
+}
+
+void setStyle(FrameSetup& frame, SurfaceStyle style) {
+    frame.textures = style == SurfaceStyle::lit;
+    if (style == SurfaceStyle::translucent)
+        frame.layers = {12, 0.42F, 0.85F};
+    if (style == SurfaceStyle::x_ray)
+        frame.layers = {24, 0.10F, 0.75F};
+    if (style == SurfaceStyle::clay || style == SurfaceStyle::x_ray || style == SurfaceStyle::paper)
+        frame.base_colors = false;
+    if (style == SurfaceStyle::clay)
+        set(frame.plain_albedo, {0.60F, 0.53F, 0.46F});
+    if (style == SurfaceStyle::x_ray)
+        set(frame.plain_albedo, {0.42F, 0.58F, 0.76F});
+}
+
+/// Paper gives back the background's colour from everywhere.
+Lighting paperLighting(const KM_Color& paper) {
+    Lighting lighting;
+    const LinearColor light = sceneLightShownAs(paper);
+    lighting.ambient.base[0] = light.r;
+    lighting.ambient.base[1] = light.g;
+    lighting.ambient.base[2] = light.b;
+    return lighting;
+}
+
+Lighting lightingOf(const DisplayScene& scene, const DisplayModeAttributes& mode,
+                    const CameraFrame& camera) {
+    if (mode.surface_style == SurfaceStyle::paper)
+        return paperLighting(mode.background_top);
+    if (mode.uses_document_lights)
+        return skyLighting(scene.lights(), mode.casts_shadows, camera);
+    return studioLighting(camera);
+}
+
+} // namespace
+
+FrameSetup makeFrameSetup(const DisplayScene& scene, const KM_Viewport& viewport,
+                          const DisplayModeAttributes& mode, int width, int height) {
+    FrameSetup frame;
+    frame.width = width;
+    frame.height = height;
+    frame.rays = cameraRays(viewport, width, height, scene.boundingBox());
+    if (mode.surface_style != SurfaceStyle::none)
+        setScene(frame, scene);
+    setStyle(frame, mode.surface_style);
+    const CameraFrame camera{frame.rays.camera_x, frame.rays.camera_y, frame.rays.camera_z};
+    setLighting(frame, lightingOf(scene, mode, camera));
+    if (mode.has_ground_plane)
+        setGround(frame);
+    frame.has_sky = mode.has_sky;
+    set(frame.background_top, sceneLightShownAs(mode.background_top));
+    set(frame.background_bottom, sceneLightShownAs(mode.background_bottom));
+    frame.display_table = displayTable().entries();
+    return frame;
+}
+
+} // namespace quarn

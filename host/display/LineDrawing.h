@@ -1,0 +1,44 @@
+#pragma once
+
+#include "host/display/LineRaster.h"
+
+#include <cstddef>
+#include <vector>
+
+namespace quarn {
+
+class DisplayScene;
+struct CameraRays;
+struct DisplayModeAttributes;
+
+/// Draws a scene's lines over a picture: edges of meshes as the mode asks, curves and points
+/// always.
+class LineDrawing {
+public:
+    /// True when the scene has any line that this mode draws.
+    static bool hasLines(const DisplayScene& scene, const DisplayModeAttributes& mode);
+
+    void draw(const DisplayScene& scene, const CameraRays& rays, const DisplayModeAttributes& mode,
+              const LineTarget& target);
+
+private:
+    enum class Source { features, smooth_edges, silhouettes, curve, point };
+    /// A part of one object's lines, small enough for one task.
+    struct Job {
+        Source source;
+        std::size_t object;
+        std::size_t begin;
+        std::size_t end;
+        LineStyle style;
+    };
+
+    void listMeshes(const DisplayScene& scene, const CameraRays& rays,
+                    const DisplayModeAttributes& mode);
+    void listCurvesAndPoints(const DisplayScene& scene, const DisplayModeAttributes& mode);
+    void list(Source source, std::size_t object, std::size_t count, const LineStyle& style);
+
+    std::vector<Job> m_jobs;
+    std::vector<LineBatch> m_batches;
+};
+
+} // namespace quarn

@@ -1,0 +1,234 @@
+#include "host/display/LineRaster.h"
+
+#include "host/display/Image.h"
+
+#include <tbb/parallel_for.h>
+
+#include <algorithm>
+#include <cmath>
+
+namespace quarn {
+
+void LineBatch::reset(const LineStyle& style) {
+    m_style = style;
+    m_segments.clear();
+}
+
+LineBatch::BandRange LineBatch::bandsOf(const ScreenSegment& s, int band_count) const {
+    const float reach = 0.5F * m_style.width_px + 0.5F;
+    const auto band = [band_count](float y) {
+        const float index = std::floor(y / static_cast<float>(band_height));
+        return static_cast<int>(std::clamp(index, 0.0F, static_cast<float>(band_count - 1)));
+    };
+    return {band(std::min(s.from.y, s.to.y) - reach), band(std::max(s.from.y, s.to.y) + reach)};
+}
+
+void LineBatch::sortIntoBands(int picture_height) {
+    const int band_count = (picture_height + band_height - 1) / band_height;
+    m_starts.assign(static_cast<std::size_t>(band_count) + 1, 0);
+    for (const ScreenSegment& s : m_segments) {
+        const BandRange bands = bandsOf(s, band_count);
+        for (int band = bands.first; band <= bands.last; ++band)
+            ++m_starts[static_cast<std::size_t>(band) + 1];
+    }
+    for (std::size_t i = 1; i < m_starts.size(); ++i)
+        m_starts[i] += m_starts[i - 1];
+    m_entries.resize(m_starts.back());
+    // Filling from behind turns each start into its own running end and back.
+    for (std::size_t i = m_segments.size(); i-- > 0;) {
+        const BandRange bands = bandsOf(m_segments[i], band_count);
+        for (int band = bands.first; band <= bands.last; ++band)
+            m_entries[--m_starts[static_cast<std::size_t>(band) + 1]] =
+                static_cast<std::uint32_t>(i);
+    }
+    m_starts.erase(m_starts.begin());
+    m_starts.push_back(static_cast<std::uint32_t>(m_entries.size()));
+}
+
+std::span<const std::uint32_t> LineBatch::inBand(int band) const {
+    const auto index = static_cast<std::size_t>(band);
+    return std::span(m_entries).subspan(m_starts[index], m_starts[index + 1] - m_starts[index]);
+}
+
+namespace {
+
+/// One band of the picture, and how much of each pixel the lines of the present style cover.
+class Band {
+public:
+    Band(const LineTarget& target, int index)
+        : m_target(target), m_top(index * LineBatch::band_height),
+          m_bottom(std::min(target.height, m_top + LineBatch::band_height)),
+          m_cover(static_cast<std::size_t>(target.width) *
+                  static_cast<std::size_t>(m_bottom - m_top)),
+          m_rows(static_cast<std::size_t>(m_bottom - m_top)) {}
+
+    void setStyle(const LineStyle& style) {
+        if (style == m_style)
+            return;
+        blend();
+        m_style = style;
+    }
+    void add(const ScreenSegment& segment);
+    /// Lays the present style over the picture.
+    void blend();
+
+private:
+    struct RowRange {
+        int begin = 0;
+        int end = 0;
+    };
+
+    void addSteep(const ScreenSegment& s, float reach);
+    void addFlat(const ScreenSegment& s, float reach);
+    void cover(int x, int y, const ScreenSegment& s);
+    bool isHidden(int x, int y, float nearness) const;
+    float surfaceNearness(int x, int y) const;
+    void blendPixel(std::uint32_t& pixel, float amount) const;
+
+    const LineTarget& m_target;
+    int m_top;
+    int m_bottom;
+    LineStyle m_style;
+    std::vector<float> m_cover;
+    std::vector<RowRange> m_rows; ///< where the cover is not 0
+};
+
+void Band::add(const ScreenSegment& s) {
+    const float reach = 0.5F * m_style.width_px + 0.5F;
+    if (std::fabs(s.to.x - s.from.x) >= std::fabs(s.to.y - s.from.y))
+        addFlat(s, reach);
+    else
+        addSteep(s, reach);
+}
+
+int firstCenterFrom(float place, int limit) {
+    return std::max(limit, static_cast<int>(std::ceil(place - 0.5F)));
+}
+
+int endOfCentersTo(float place, int limit) {
+    return std::min(limit, static_cast<int>(std::floor(place - 0.5F)) + 1);
+}
+
+/// Column by column.
+void Band::addFlat(const ScreenSegment& s, float reach) {
+    const float dx = s.to.x - s.from.x;
+    const float slope = dx != 0.0F ? (s.to.y - s.from.y) / dx : 0.0F;
+    const float across = reach * std::sqrt(1.0F + slope * slope);
+    const float left = std::min(s.from.x, s.to.x);
+    const float right = std::max(s.from.x, s.to.x);
+    const int end = endOfCentersTo(right + reach, m_target.width);
+    for (int x = firstCenterFrom(left - reach, 0); x < end; ++x) {
+        const float at = std::clamp(static_cast<float>(x) + 0.5F, left, right);
+        const float y = s.from.y + slope * (at - s.from.x);
+        const int y_end = endOfCentersTo(y + across, m_bottom);
+        for (int row = firstCenterFrom(y - across, m_top); row < y_end; ++row)
+            cover(x, row, s);
+    }
+}
+
+/// Row by row.
+void Band::addSteep(const ScreenSegment& s, float reach) {
+    const float slope = (s.to.x - s.from.x) / (s.to.y - s.from.y);
+    const float across = reach * std::sqrt(1.0F + slope * slope);
+    const float upper = std::min(s.from.y, s.to.y);
+    const float lower = std::max(s.from.y, s.to.y);
+    const int end = endOfCentersTo(lower + reach, m_bottom);
+    for (int row = firstCenterFrom(upper - reach, m_top); row < end; ++row) {
+        const float at = std::clamp(static_cast<float>(row) + 0.5F, upper, lower);
+        const float x = s.from.x + slope * (at - s.from.y);
+        const int x_end = endOfCentersTo(x + across, m_target.width);
+        for (int column = firstCenterFrom(x - across, 0); column < x_end; ++column)
+            cover(column, row, s);
+    }
+}
+
+void Band::cover(int x, int y, const ScreenSegment& s) {
+    const float dx = s.to.x - s.from.x;
+    const float dy = s.to.y - s.from.y;
+    const float px = static_cast<float>(x) + 0.5F - s.from.x;
+    const float py = static_cast<float>(y) + 0.5F - s.from.y;
+    const float square = dx * dx + dy * dy;
+    const float t = square > 0.0F ? std::clamp((px * dx + py * dy) / square, 0.0F, 1.0F) : 0.0F;
+    const float ex = px - t * dx;
+    const float ey = py - t * dy;
+    const float distance = std::sqrt(ex * ex + ey * ey);
+    const float half = 0.5F * m_style.width_px;
+    const float amount = std::min(half + 0.5F - distance, std::min(1.0F, m_style.width_px));
+    const auto row = static_cast<std::size_t>(y - m_top);
+    float& covered =
+        m_cover[row * static_cast<std::size_t>(m_target.width) + static_cast<std::size_t>(x)];
+    if (amount <= covered ||
+        isHidden(x, y, s.from.nearness + t * (s.to.nearness - s.from.nearness)))
+        return;
+    covered = amount;
+    RowRange& range = m_rows[row];
+    range = range.end == 0 ? RowRange{x, x + 1}
+                           : RowRange{std::min(range.begin, x), std::max(range.end, x + 1)};
+}
+
+float Band::surfaceNearness(int x, int y) const {
+    const int column = std::clamp(x, 0, m_target.width - 1);
+    const int row = std::clamp(y, 0, m_target.height - 1);
+    return m_target.depth
+        ->nearness[static_cast<std::size_t>(row) * static_cast<std::size_t>(m_target.width) +
+                   static_cast<std::size_t>(column)];
+}
+
+/// A line on a surface is not hidden by it: the surface may rise by as much as it does from the
+/// pixel to the flatter one of its neighbours in each direction.
+bool Band::isHidden(int x, int y, float nearness) const {
+    if (!m_target.depth)
+        return false;
+    const float here = surfaceNearness(x, y);
+    if (here <= nearness)
+        return false;
+    const float across = std::min(std::fabs(here - surfaceNearness(x - 1, y)),
+                                  std::fabs(here - surfaceNearness(x + 1, y)));
+    const float along = std::min(std::fabs(here - surfaceNearness(x, y - 1)),
+                                 std::fabs(here - surfaceNearness(x, y + 1)));
+    return nearness < here - 1.5F * (across + along) - 1e-3F * here;
+}
+
+void Band::blendPixel(std::uint32_t& pixel, float amount) const {
+    const float keep = 1.0F - amount;
+    const auto mixed = [&](int shift, std::uint8_t line) {
+        const auto under = static_cast<float>(pixel >> shift & 255U);
+        return static_cast<std::uint32_t>(keep * under + amount * static_cast<float>(line) + 0.5F)
+               << shift;
+    };
+    pixel = mixed(0, m_style.color.r) | mixed(8, m_style.color.g) | mixed(16, m_style.color.b) |
+            0xFF000000U;
+}
+
+void Band::blend() {
+    for (int y = m_top; y < m_bottom; ++y) {
+        RowRange& range = m_rows[static_cast<std::size_t>(y - m_top)];
+        float* const cover = m_cover.data() + static_cast<std::size_t>(y - m_top) *
+                                                  static_cast<std::size_t>(m_target.width);
+        std::uint32_t* const row = m_target.pixels + static_cast<std::size_t>(y) *
+                                                         static_cast<std::size_t>(m_target.width);
+        for (int x = range.begin; x < range.end; ++x) {
+            if (cover[x] > 0.0F)
+                blendPixel(row[x], cover[x] * m_style.opacity);
+            cover[x] = 0.0F;
+        }
+        range = {};
+    }
+}
+
+} // namespace
+
+void drawLines(std::span<const LineBatch> batches, const LineTarget& target) {
+    const int band_count = (target.height + LineBatch::band_height - 1) / LineBatch::band_height;
+    tbb::parallel_for(0, band_count, [&](int index) {
+        Band band(target, index);
+        for (const LineBatch& batch : batches) {
+            band.setStyle(batch.style());
+            for (const std::uint32_t segment : batch.inBand(index))
+                band.add(batch.segment(segment));
+        }
+        band.blend();
+    });
+}
+
+} // namespace quarn

@@ -1,0 +1,264 @@
+#include "host/display/RayScene.h"
+
+#include "host/display/AlphaCutout.h"
+
+#include <algorithm>
+#include <array>
+#include <numeric>
+#include <string>
+
+namespace quarn {
+
+namespace {
+
+/// A mesh of this many triangles has a scene of its own; smaller ones share scenes of at most so
+/// many, whose rebuild takes about 2 ms.
+constexpr std::size_t large_mesh_triangles = 8192;
+
+constexpr std::array<float, 12> identity{1, 0, 0, 0, 1, 0, 0, 0, 1, 0, 0, 0};
+
+void noteError(void* note, RTCError, const char* message) {
+    auto& text = *static_cast<std::string*>(note);
+    if (text.empty())
+        text = message ? message : "unknown error";
+}
+
+/// Spreads 10 bits so that two free bits follow each.
+std::uint32_t spread(std::uint32_t bits) {
+    bits = (bits | (bits << 16)) & 0x030000FFU;
+    bits = (bits | (bits << 8)) & 0x0300F00FU;
+    bits = (bits | (bits << 4)) & 0x030C30C3U;
+    return (bits | (bits << 2)) & 0x09249249U;
+}
+
+/// Place along a Z-shaped curve through the box: neighbours on the curve are near in space
+/// (G. M. Morton, 1966).
+std::uint32_t mortonCode(const KM_3dPoint& p, const KM_BoundingBox& box) {
+    const KM_3dVector size = box.Diagonal();
+    const KM_3dVector from_corner = p - box.m_min;
+    const auto cell = [](double offset, double length) {
+        return length > 0.0
+                   ? static_cast<std::uint32_t>(1023.0 * std::clamp(offset / length, 0.0, 1.0))
+                   : 0U;
+    };
+    return spread(cell(from_corner.x, size.x)) | (spread(cell(from_corner.y, size.y)) << 1) |
+           (spread(cell(from_corner.z, size.z)) << 2);
+}
+
+void setEnabled(RTCGeometry geometry, bool enabled) {
+    if (enabled)
+        rtcEnableGeometry(geometry);
+    else
+        rtcDisableGeometry(geometry);
+}
+
+} // namespace
+
+RayScene::RayScene() : m_error(std::make_shared<std::string>()), m_device(rtcNewDevice(nullptr)) {
+    if (m_device)
+        rtcSetDeviceErrorFunction(m_device.get(), noteError, m_error.get());
+    else
+        *m_error = "the ray tracing library cannot start on this processor";
+}
+
+std::string RayScene::takeError() {
+    std::string error;
+    if (m_device)
+        error.swap(*m_error);
+    else
+        error = *m_error;
+    return error;
+}
+
+std::vector<std::shared_ptr<RayScene::Group>> RayScene::largeGroups() const {
+    std::vector<std::shared_ptr<Group>> groups;
+    for (const Instance& instance : m_instances)
+        if (instance.group->sole_mesh)
+            groups.push_back(instance.group);
+    return groups;
+}
+
+void RayScene::build(std::vector<Member> members) {
+    if (!m_device)
+        return;
+    auto groups = largeGroups();
+    // The meshes of the taken-over groups must outlive the search for them.
+    const std::vector<Member> earlier_members = std::exchange(m_members, std::move(members));
+    m_instances.clear();
+    m_first_surfaces.clear();
+    m_surfaces.clear();
+    m_surfaces.reserve(m_members.size()); // geometries point into it
+    m_places.assign(m_members.size(), {});
+    m_top = RaySceneHandle(rtcNewScene(m_device.get()));
+
+    for (std::size_t i = 0; i < m_members.size(); ++i)
+        if (m_members[i].mesh->mesh().m_F.size() >= large_mesh_triangles)
+            addLarge(i, groups);
+    const std::vector<std::size_t> small = smallMembersBySpace();
+    std::size_t first = 0;
+    while (first < small.size()) {
+        std::size_t triangles = 0;
+        std::size_t end = first;
+        while (end < small.size() && (end == first || triangles < large_mesh_triangles))
+            triangles += m_members[small[end++]].mesh->mesh().m_F.size();
+        addSmall(std::span(small).subspan(first, end - first));
+        first = end;
+    }
+    for (std::size_t i = 0; i < m_members.size(); ++i) {
+        const bool visible = m_members[i].visible;
+        m_members[i].visible = true;
+        setVisible(i, visible);
+    }
+    commit();
+}
+
+std::vector<std::size_t> RayScene::smallMembersBySpace() const {
+    KM_BoundingBox box;
+    std::vector<std::size_t> order;
+    for (std::size_t i = 0; i < m_members.size(); ++i) {
+        if (m_members[i].mesh->mesh().m_F.size() >= large_mesh_triangles)
+            continue;
+        order.push_back(i);
+        box.Union(m_members[i].mesh->box());
+    }
+    std::vector<std::uint32_t> codes(m_members.size());
+    for (const std::size_t i : order)
+        if (m_members[i].mesh->box().IsValid())
+            codes[i] = mortonCode(m_members[i].mesh->box().Center(), box);
+    std::stable_sort(order.begin(), order.end(),
+                     [&](std::size_t a, std::size_t b) { return codes[a] < codes[b]; });
+    return order;
+}
+
+std::shared_ptr<RayScene::Group> RayScene::makeGroup() const {
+    auto group = std::make_shared<Group>();
+    group->scene = RaySceneHandle(rtcNewScene(m_device.get()));
+    group->changed = true;
+    return group;
+}
+
+RayGeometry RayScene::makeTriangles(std::size_t member) const {
+    const RayMesh& mesh = *m_members[member].mesh;
+    RayGeometry geometry(rtcNewGeometry(m_device.get(), RTC_GEOMETRY_TYPE_TRIANGLE));
+    rtcSetSharedGeometryBuffer(geometry.get(), RTC_BUFFER_TYPE_VERTEX, 0, RTC_FORMAT_FLOAT3,
+                               mesh.paddedVertices(), 0, sizeof(KM_3fPoint),
+                               mesh.mesh().m_V.size());
+    rtcSetSharedGeometryBuffer(geometry.get(), RTC_BUFFER_TYPE_INDEX, 0, RTC_FORMAT_UINT3,
+                               mesh.mesh().m_F.data(), 0, sizeof(KM_MeshTriangle),
+                               mesh.mesh().m_F.size());
+    return geometry;
+}
+
+void RayScene::place(std::size_t member, unsigned geometry) {
+    m_places[member] = {m_instances.size() - 1, geometry};
+    ++m_instances.back().visible_members;
+    m_surfaces.push_back(m_members[member].surface);
+}
+
+void RayScene::addInstance(std::shared_ptr<Group> group) {
+    RayGeometry instance(rtcNewGeometry(m_device.get(), RTC_GEOMETRY_TYPE_INSTANCE));
+    rtcSetGeometryInstancedScene(instance.get(), group->scene.get());
+    rtcSetGeometryTransform(instance.get(), 0, RTC_FORMAT_FLOAT3X4_COLUMN_MAJOR, identity.data());
+    rtcCommitGeometry(instance.get());
+    rtcAttachGeometryByID(m_top.get(), instance.get(), static_cast<unsigned>(m_instances.size()));
+    m_first_surfaces.push_back(static_cast<std::uint32_t>(m_surfaces.size()));
+    m_instances.push_back({std::move(group), std::move(instance), 0, true});
+}
+
+void RayScene::addLarge(std::size_t member, std::vector<std::shared_ptr<Group>>& earlier) {
+    const RayMesh* mesh = m_members[member].mesh.get();
+    const bool cutout = m_members[member].surface.has_cutout;
+    const auto same = [mesh](const auto& group) { return group->sole_mesh == mesh; };
+    const auto found = std::find_if(earlier.begin(), earlier.end(), same);
+    if (found != earlier.end() && !cutout) {
+        addInstance(*found);
+        place(member, 0);
+        return;
+    }
+    auto group = makeGroup();
+    addInstance(group);
+    place(member, 0);
+    group->geometries.push_back(makeTriangles(member));
+    RTCGeometry geometry = group->geometries.back().get();
+    if (cutout) {
+        rtcSetGeometryUserData(geometry, &m_surfaces.back());
+        setAlphaCutout(geometry);
+    } else {
+        group->sole_mesh = mesh;
+        earlier.push_back(group);
+    }
+    rtcCommitGeometry(geometry);
+    rtcAttachGeometryByID(group->scene.get(), geometry, 0);
+}
+
+void RayScene::addSmall(std::span<const std::size_t> members) {
+    auto group = makeGroup();
+    addInstance(group);
+    for (const std::size_t member : members) {
+        const auto id = static_cast<unsigned>(group->geometries.size());
+        place(member, id);
+        group->geometries.push_back(makeTriangles(member));
+        RTCGeometry geometry = group->geometries.back().get();
+        if (m_members[member].surface.has_cutout) {
+            rtcSetGeometryUserData(geometry, &m_surfaces.back());
+            setAlphaCutout(geometry);
+        }
+        rtcCommitGeometry(geometry);
+        rtcAttachGeometryByID(group->scene.get(), geometry, id);
+    }
+}
+
+void RayScene::setVisible(std::size_t member, bool visible) {
+    if (m_members[member].visible == visible)
+        return;
+    m_members[member].visible = visible;
+    Instance& instance = m_instances[m_places[member].instance];
+    instance.visible_members += visible ? 1 : std::size_t(-1);
+    if (instance.group->geometries.size() == 1) // then the instance is switched as a whole
+        return;
+    RTCGeometry geometry = instance.group->geometries[m_places[member].geometry].get();
+    setEnabled(geometry, visible);
+    instance.group->changed = true;
+}
+
+void RayScene::commit() {
+    if (!m_device)
+        return;
+    for (std::size_t i = 0; i < m_instances.size(); ++i) {
+        Instance& instance = m_instances[i];
+        const bool wanted = instance.visible_members > 0;
+        if (instance.group->changed && wanted) {
+            rtcCommitScene(instance.group->scene.get());
+            rtcCommitGeometry(instance.geometry.get());
+            instance.group->changed = false;
+        }
+        if (instance.enabled != wanted)
+            setEnabled(instance.geometry.get(), wanted);
+        instance.enabled = wanted;
+    }
+    chooseRoot();
+}
+
+/// One group needs no instance above it: rays reach it directly, which saves about an eighth of
+/// their time.
+void RayScene::chooseRoot() {
+    const auto shown = [](const Instance& instance) { return instance.enabled; };
+    const auto count = std::count_if(m_instances.begin(), m_instances.end(), shown);
+    m_root = nullptr;
+    m_sole_first_surface = 0;
+    if (count == 1) {
+        const auto sole = std::find_if(m_instances.begin(), m_instances.end(), shown);
+        m_root = sole->group->scene.get();
+        m_sole_first_surface =
+            m_first_surfaces[static_cast<std::size_t>(sole - m_instances.begin())];
+    } else if (count > 1) {
+        rtcCommitScene(m_top.get());
+        m_root = m_top.get();
+    }
+}
+
+RTCScene RayScene::root() const {
+    return m_root;
+}
+
+} // namespace quarn

@@ -1,0 +1,86 @@
+#pragma once
+
+#include "host/display/RayHandle.h"
+#include "host/display/RayMesh.h"
+#include "host/display/RaySurface.h"
+
+#include <cstdint>
+#include <memory>
+#include <span>
+#include <vector>
+
+namespace quarn {
+
+/// The surfaces that rays meet. Meshes of many triangles get a scene of their own under an
+/// instance, small ones share one, so that showing or hiding an object rebuilds little: nothing
+/// for a large one, some thousand triangles for a small one.
+class RayScene {
+public:
+    /// One mesh object; `mesh` is drawable and `surface` describes it.
+    struct Member {
+        std::shared_ptr<const RayMesh> mesh;
+        RaySurface surface;
+        bool visible = true;
+    };
+
+    RayScene();
+
+    /// Replaces everything. Scenes of large meshes that were there before are taken over.
+    void build(std::vector<Member> members);
+    /// Shows or hides one member, by its index in `build`. Takes effect with the next `commit`.
+    void setVisible(std::size_t member, bool visible);
+    /// Makes the changes of visibility good.
+    void commit();
+
+    /// What rays are shot into; null when nothing is visible. Where the library reports no
+    /// instance, the surface is soleFirstSurface() + geomID, else firstSurfaces()[instID] + geomID.
+    RTCScene root() const;
+    std::uint32_t soleFirstSurface() const { return m_sole_first_surface; }
+    std::span<const std::uint32_t> firstSurfaces() const { return m_first_surfaces; }
+    /// In the order of surface indices, which is not that of the members.
+    std::span<const RaySurface> surfaces() const { return m_surfaces; }
+
+    /// What the library complained of since the last call; empty when it did not.
+    std::string takeError();
+
+private:
+    struct Group {
+        RaySceneHandle scene;
+        std::vector<RayGeometry> geometries;
+        const RayMesh* sole_mesh = nullptr; ///< of a large mesh: to find the group again
+        bool changed = false;
+    };
+    struct Instance {
+        std::shared_ptr<Group> group;
+        RayGeometry geometry;
+        std::size_t visible_members = 0;
+        bool enabled = true;
+    };
+    struct Place {
+        std::size_t instance = 0;
+        unsigned geometry = 0;
+    };
+
+    void addLarge(std::size_t member, std::vector<std::shared_ptr<Group>>& earlier);
+    void addSmall(std::span<const std::size_t> members);
+    void addInstance(std::shared_ptr<Group> group);
+    void place(std::size_t member, unsigned geometry);
+    RayGeometry makeTriangles(std::size_t member) const;
+    std::shared_ptr<Group> makeGroup() const;
+    std::vector<std::shared_ptr<Group>> largeGroups() const;
+    std::vector<std::size_t> smallMembersBySpace() const;
+    void chooseRoot();
+
+    std::shared_ptr<std::string> m_error; ///< outlives the device, which writes into it
+    RayDevice m_device;
+    RaySceneHandle m_top;
+    RTCScene m_root = nullptr;
+    std::uint32_t m_sole_first_surface = 0;
+    std::vector<Member> m_members;
+    std::vector<Place> m_places; ///< by member
+    std::vector<Instance> m_instances;
+    std::vector<std::uint32_t> m_first_surfaces;
+    std::vector<RaySurface> m_surfaces;
+};
+
+} // namespace quarn

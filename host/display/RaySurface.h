@@ -1,0 +1,29 @@
+#pragma once
+
+#include <cstdint>
+
+class KM_2fPoint;
+class KM_3fPoint;
+struct KM_Color;
+struct KM_MeshTriangle;
+
+namespace quarn {
+
+class MipTexture;
+
+/// What the ray loops need to know of one mesh object. Pointers live as long as the scene is not
+/// updated.
+struct RaySurface {
+    const KM_MeshTriangle* triangles = nullptr;
+    const KM_3fPoint* vertices = nullptr;
+    const std::uint32_t* corner_normals = nullptr;   ///< three a triangle, packed; null: flat faces
+    const KM_2fPoint* texture_coordinates = nullptr; ///< null unless there is a texture
+    const KM_Color* colors = nullptr;                ///< null when vertices have no colours
+    const MipTexture* texture = nullptr;
+    float albedo[3] = {0.6F, 0.6F, 0.6F}; ///< linear base colour
+    float opacity = 1.0F;                 ///< of the base colour
+    bool has_cutout = false;
+    float alpha_cutoff = 0.5F;
+};
+
+} // namespace quarn

@@ -1,0 +1,58 @@
+#pragma once
+
+namespace quarn {
+
+struct CameraRays;
+
+/// A place of the picture and how near it is, in the measure of DepthImage.
+struct ScreenPoint {
+    float x = 0.0F; ///< continuous pixels
+    float y = 0.0F;
+    float nearness = 0.0F;
+};
+
+/// A straight piece of a line on the screen.
+struct ScreenSegment {
+    ScreenPoint from;
+    ScreenPoint to;
+};
+
+/// Carries points of the world to where the camera's rays see them.
+class ScreenProjection {
+public:
+    /// @param width, height  of the picture, in pixels
+    /// @param margin_px      how far beyond the picture segments are still kept
+    ScreenProjection(const CameraRays& rays, int width, int height, float margin_px);
+
+    /// Projects the segment between two points of the world and clips it: in perspective to what
+    /// lies before the camera, and to the picture with its margin.
+    /// @return false when nothing of it is left or a coordinate is not finite
+    bool project(const double (&from)[3], const double (&to)[3], ScreenSegment& segment) const;
+
+private:
+    struct CameraPoint {
+        double x;
+        double y;
+        double depth;
+    };
+    CameraPoint cameraPoint(const double (&world)[3]) const;
+    ScreenPoint screenPoint(const CameraPoint& p) const;
+    bool clipToPicture(ScreenSegment& segment) const;
+
+    double m_eye[3];
+    double m_x[3];
+    double m_y[3];
+    double m_z[3];
+    double m_left;
+    double m_top;
+    double m_pixels_per_x;
+    double m_pixels_per_y;
+    double m_near;
+    double m_far;
+    bool m_parallel;
+    float m_min;
+    float m_max_x;
+    float m_max_y;
+};
+
+} // namespace quarn

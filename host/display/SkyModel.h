@@ -1,0 +1,64 @@
+#pragma once
+
+#include "host/display/ColorSpace.h"
+
+#include <span>
+#include <vector>
+
+class KM_Light;
+
+namespace quarn {
+
+/// A light that shines everywhere from the same direction.
+struct DirectionalLight {
+    float toward[3] = {0.0F, 0.0F, 1.0F}; ///< unit vector to the light, world coordinates
+    LinearColor color;                    ///< scene light on a white surface that faces it
+    float shadow = 0.0F;                  ///< part of it that an occluder takes away, 0 to 1
+};
+
+/// Light from all sides that changes linearly with the direction in which a surface faces:
+/// channel c on a surface with unit normal n gets base[c] + slope[c] . n.
+struct AmbientLight {
+    float base[3] = {0.0F, 0.0F, 0.0F};
+    float slope[3][3] = {};
+};
+
+/// The sky's colours in scene light.
+struct Sky {
+    LinearColor horizon;
+    LinearColor zenith;
+    LinearColor nadir; ///< straight down, where no ground is seen
+    LinearColor glow;  ///< added around the sun
+    LinearColor disc;  ///< added on the sun's disc
+    float toward_sun[3] = {0.0F, 0.0F, 1.0F};
+};
+
+/// All the light of one picture.
+struct Lighting {
+    AmbientLight ambient;
+    std::vector<DirectionalLight> fixed; ///< cast no shadows
+    std::vector<DirectionalLight> suns;  ///< cast shadows as far as their `shadow` says
+    Sky sky;
+};
+
+/// The camera frame's unit vectors in world coordinates.
+struct CameraFrame {
+    const float* x;
+    const float* y;
+    const float* z; ///< toward the observer
+};
+
+/// A neutral studio light that goes with the camera: a soft key light from the upper left, a weak
+/// fill from the right, more light from above than from below. No surface is overexposed.
+Lighting studioLighting(const CameraFrame& camera);
+
+/// Light of sky and document. The directional lights are suns: the first one's height decides
+/// between day, dusk and night, and one below the horizon shines on nothing. At night a dim blue
+/// light keeps the model readable. Without a directional light a bright, even sky and a head light
+/// make the picture.
+/// @param lights         the lights that are on; other kinds than directional ones add nothing
+/// @param casts_shadows  whether the suns are shadowed
+Lighting skyLighting(std::span<const KM_Light> lights, bool casts_shadows,
+                     const CameraFrame& camera);
+
+} // namespace quarn

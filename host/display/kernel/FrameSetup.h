@@ -1,0 +1,115 @@
+#pragma once
+
+#include "host/display/CameraRays.h"
+#include "host/display/RaySurface.h"
+
+#include <embree3/rtcore.h>
+
+#include <cstdint>
+
+namespace quarn {
+
+/// How many rays travel together: a tile of 4 by 4 pixels.
+inline constexpr int lane_count = 16;
+inline constexpr int tile_size = 4;
+
+/// A directional light as the ray loops use it.
+struct FrameLight {
+    float toward[3];
+    float color[3];
+    float shadow; ///< 0: none are looked for
+};
+
+inline constexpr int max_fixed_lights = 4;
+inline constexpr int max_suns = 8;
+
+/// How layers of see-through surfaces cover what lies behind them.
+struct FrameLayers {
+    int count = 1;             ///< how many surfaces a ray passes at most; 1: they are opaque
+    float facing_opacity = 1;  ///< of a surface that faces the observer
+    float edge_on_opacity = 1; ///< of one that is seen along its face
+};
+
+/// Everything that the ray loops need for one picture; plain numbers and pointers, because the
+/// loops are compiled several times, for several processors.
+struct FrameSetup {
+    int width = 0;
+    int height = 0;
+    CameraRays rays;
+
+    RTCScene scene = nullptr; ///< null: no surfaces
+    std::uint32_t sole_first_surface = 0;
+    const std::uint32_t* first_surfaces = nullptr;
+    const RaySurface* surfaces = nullptr;
+    float scene_min[3] = {0, 0, 0};
+    float scene_max[3] = {0, 0, 0};
+    float scene_size = 0.0F; ///< diagonal of that box
+
+    bool base_colors = true; ///< else every surface has plain_albedo
+    bool textures = false;   ///< textures and vertex colours
+    float plain_albedo[3] = {1, 1, 1};
+    FrameLayers layers;
+
+    float ambient_base[3] = {0, 0, 0};
+    float ambient_slope[3][3] = {};
+    int fixed_count = 0;
+    FrameLight fixed[max_fixed_lights] = {};
+    int sun_count = 0;
+    FrameLight suns[max_suns] = {};
+
+    bool has_ground = false;
+    float ground_height = 0.0F;
+    float ground_center[2] = {0, 0};
+    float ground_fade_start = 0.0F; ///< distance from the centre
+    float ground_fade_end = 1.0F;
+    float ground_albedo[3] = {0.5F, 0.5F, 0.5F};
+
+    bool has_sky = false;
+    float background_top[3] = {1, 1, 1}; ///< without a sky
+    float background_bottom[3] = {1, 1, 1};
+    float sky_horizon[3] = {1, 1, 1};
+    float sky_zenith[3] = {1, 1, 1};
+    float sky_nadir[3] = {1, 1, 1};
+    float sky_glow[3] = {0, 0, 0};
+    float sky_disc[3] = {0, 0, 0};
+    float toward_sun[3] = {0, 0, 1};
+
+    const std::uint32_t* display_table = nullptr; ///< DisplayTable::entries()
+
+    std::uint32_t* pixels = nullptr;  ///< width * height, bytes r, g, b, a in memory
+    float* nearness = nullptr;        ///< see DepthImage; null when nobody asks
+    std::uint32_t* objects = nullptr; ///< surface index + 1, or 0; null when nobody asks
+};
+
+/// A part of the picture, in pixels; the upper left corner lies on a tile's corner.
+struct PixelBlock {
+    int x_begin = 0;
+    int y_begin = 0;
+    int x_end = 0;
+    int y_end = 0;
+};
+
+/// Up to 16 places of the picture to look at, and what is seen there.
+struct SamplePacket {
+    int count = 0;
+    float x[lane_count]; ///< continuous pixels
+    float y[lane_count];
+    std::uint32_t pixels[lane_count];
+    std::uint32_t objects[lane_count];
+};
+
+/// The ray loops, compiled for one kind of processor. All give the same pixels.
+struct RayKernel {
+    const char* name;
+    void (*trace_block)(const FrameSetup& frame, const PixelBlock& block);
+    void (*trace_samples)(const FrameSetup& frame, SamplePacket& samples);
+};
+
+/// The loops for the best processor that this one can stand in for.
+const RayKernel& bestRayKernel();
+
+extern const RayKernel baseline_ray_kernel; ///< any x86-64
+extern const RayKernel avx2_ray_kernel;     ///< x86-64-v3
+extern const RayKernel avx512_ray_kernel;   ///< x86-64-v4
+
+} // namespace quarn
