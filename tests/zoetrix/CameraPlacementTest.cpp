@@ -1,4 +1,4 @@
-#include "tests/zoetrix/PluginTest.h"
+#include "tests/zoetrix/PlugInFixture.h"
 #include "zoetrix/paths/ZoetrixDynamicAccess.h"
 
 #include <cmath>
@@ -8,7 +8,7 @@ namespace {
 
 constexpr double tolerance = 1e-12;
 
-class CameraPlacement : public PluginTest {
+class CameraPlacement : public PlugInFixture {
 protected:
     CQuarnViewport& viewport() { return view(L"Perspective").MainViewport(); }
 

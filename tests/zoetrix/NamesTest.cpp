@@ -1,4 +1,4 @@
-#include "tests/zoetrix/PluginTest.h"
+#include "tests/zoetrix/PlugInFixture.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 #include "zoetrix/plugin/ZoetrixUtilities.h"
 
@@ -14,7 +14,7 @@ KM_wString cleaned(const wchar_t* extension) {
     return text;
 }
 
-class ViewNames : public PluginTest {};
+class ViewNames : public PlugInFixture {};
 
 } // namespace
 

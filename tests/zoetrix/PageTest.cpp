@@ -1,4 +1,4 @@
-#include "tests/zoetrix/PluginTest.h"
+#include "tests/zoetrix/PlugInFixture.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 #include "zoetrix/plugin/ZoetrixUtilities.h"
 
@@ -21,10 +21,10 @@ std::wstring pageOf(KM_3dmAnimationProperties props) {
     return std::wstring(CZoetrixUtilities::GetHTMLtemplate(props).View());
 }
 
-class Page : public PluginTest {};
-class GermanPage : public PluginTest {
+class Page : public PlugInFixture {};
+class GermanPage : public PlugInFixture {
 protected:
-    GermanPage() : PluginTest("", "de") {}
+    GermanPage() : PlugInFixture("", "de") {}
 };
 
 /// Everything before the script's functions, for three images of a turntable called Walk.

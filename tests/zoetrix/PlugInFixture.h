@@ -33,11 +33,11 @@ std::string readFile(const std::filesystem::path& file);
 void writeFile(const std::filesystem::path& file, const std::string& bytes);
 
 /// A running host without a person, with the plug-in loaded, a fresh record and a new document.
-class PluginTest : public ::testing::Test {
+class PlugInFixture : public ::testing::Test {
 protected:
-    PluginTest();
+    PlugInFixture();
     /// @param plug_ins  a folder below the test plug-ins; empty for none
-    explicit PluginTest(const std::string& plug_ins, const std::string& language = "C");
+    explicit PlugInFixture(const std::string& plug_ins, const std::string& language = "C");
 
     CQuarnDoc& doc() { return session->document(); }
     /// The record that the plug-in keeps.

@@ -1,4 +1,4 @@
-#include "tests/zoetrix/PluginTest.h"
+#include "tests/zoetrix/PlugInFixture.h"
 
 #include "zoetrix/plugin/ZoetrixPlugIn.h"
 
@@ -60,9 +60,9 @@ void writeFile(const std::filesystem::path& file, const std::string& bytes) {
     std::ofstream(file, std::ios::binary) << bytes;
 }
 
-PluginTest::PluginTest() : PluginTest("") {}
+PlugInFixture::PlugInFixture() : PlugInFixture("") {}
 
-PluginTest::PluginTest(const std::string& plug_ins, const std::string& language)
+PlugInFixture::PlugInFixture(const std::string& plug_ins, const std::string& language)
     : session(std::make_unique<quarn::Session>(front_end,
                                                optionsFor(folder.path(), plug_ins, language))) {
     ZoetrixPlugIn().SetAnimationProperties(doc(), KM_3dmAnimationProperties());
@@ -70,11 +70,11 @@ PluginTest::PluginTest(const std::string& plug_ins, const std::string& language)
     EXPECT_TRUE(load.ok()) << load.message;
 }
 
-KM_3dmAnimationProperties& PluginTest::record() {
+KM_3dmAnimationProperties& PlugInFixture::record() {
     return ZoetrixPlugIn().AnimationPropertiesForWrite(doc());
 }
 
-CQuarnView& PluginTest::view(const wchar_t* name) {
+CQuarnView& PlugInFixture::view(const wchar_t* name) {
     KM_SimpleArray<CQuarnView*> views;
     doc().GetViewList(views, true, true);
     for (CQuarnView* candidate : views)
@@ -84,12 +84,12 @@ CQuarnView& PluginTest::view(const wchar_t* name) {
     return *views[0];
 }
 
-void PluginTest::answer(std::initializer_list<std::wstring_view> answers) {
+void PlugInFixture::answer(std::initializer_list<std::wstring_view> answers) {
     for (const std::wstring_view text : answers)
         front_end.addAnswer(text);
 }
 
-void PluginTest::insideCommand(const std::function<void(CQuarnDoc&)>& body) {
+void PlugInFixture::insideCommand(const std::function<void(CQuarnDoc&)>& body) {
     bool was_called = false;
     the_body = [&](CQuarnDoc& document) {
         was_called = true;
@@ -100,31 +100,31 @@ void PluginTest::insideCommand(const std::function<void(CQuarnDoc&)>& body) {
     the_body = nullptr;
 }
 
-void PluginTest::importObj(const std::string& text) {
+void PlugInFixture::importObj(const std::string& text) {
     const std::filesystem::path file = folder.path() / "model.obj";
     writeFile(file, text);
     ASSERT_EQ(CQuarnCommand::success, run(L"Import \"" + wide(file) + L"\"")) << "import";
 }
 
-const KM_UUID PluginTest::objectId(const wchar_t* name) {
+const KM_UUID PlugInFixture::objectId(const wchar_t* name) {
     const CQuarnObject* object = doc().FindObjectByName(name);
     EXPECT_TRUE(object) << KM_wString(name).ToUtf8();
     return object ? object->Id() : KM_nil_uuid;
 }
 
-bool PluginTest::isHidden(const wchar_t* name) {
+bool PlugInFixture::isHidden(const wchar_t* name) {
     const CQuarnObject* object = doc().FindObjectByName(name);
     EXPECT_TRUE(object) << KM_wString(name).ToUtf8();
     return object && object->IsHidden();
 }
 
-void PluginTest::placeCamera(const wchar_t* view_name, const KM_3dPoint& camera,
-                             const KM_3dPoint& target) {
+void PlugInFixture::placeCamera(const wchar_t* view_name, const KM_3dPoint& camera,
+                                const KM_3dPoint& target) {
     EXPECT_TRUE(
         view(view_name).MainViewport().SetTargetAndCameraLocation(target, camera, true, true));
 }
 
-void PluginTest::setUpCameraFrames(int frames) {
+void PlugInFixture::setUpCameraFrames(int frames) {
     KM_3dmAnimationProperties& props = record();
     props.SetCaptureType(KM_3dmAnimationProperties::turntable);
     props.SetViewportName(L"Perspective");
@@ -138,7 +138,7 @@ void PluginTest::setUpCameraFrames(int frames) {
     }
 }
 
-void PluginTest::setUpSunFrames(int frames) {
+void PlugInFixture::setUpSunFrames(int frames) {
     setUpCameraFrames(frames);
     KM_3dmAnimationProperties& props = record();
     props.SetCaptureType(KM_3dmAnimationProperties::one_day_sun);
