@@ -9,6 +9,7 @@
 #include <array>
 #include <cmath>
 #include <cstdint>
+#include <span>
 #include <utility>
 #include <vector>
 
@@ -81,6 +82,7 @@ public:
           m_has_texture(reading.texture_coordinates < AI_MAX_NUMBER_OF_TEXTURECOORDS &&
                         source.mTextureCoords[reading.texture_coordinates] != nullptr),
           m_has_colors(source.mColors[0] != nullptr),
+          m_in_place(reading.world_from_mesh.IsIdentity()),
           m_weld(source.mNumVertices / 3 >= source.mNumFaces) {}
 
     ConvertedMesh read() {
@@ -96,6 +98,7 @@ public:
         m_index = {};
         m_table = {};
         completeNormals();
+        releaseSpareRoom();
         return {m_mesh, dropped};
     }
 
@@ -111,14 +114,16 @@ private:
         if (face.mNumIndices != 3) {
             return false;
         }
+        std::array<KM_3dPoint, 3> places;
         for (int k = 0; k < 3; ++k) {
-            if (face.mIndices[k] >= m_source.mNumVertices || !isUsable(face.mIndices[k])) {
+            if (face.mIndices[k] >= m_source.mNumVertices ||
+                !readPlace(face.mIndices[k], places[k])) {
                 return false;
             }
         }
         KM_MeshTriangle triangle{};
         for (int k = 0; k < 3; ++k) {
-            triangle.vi[k] = vertexFor(face.mIndices[k]);
+            triangle.vi[k] = vertexFor(face.mIndices[k], places[k]);
         }
         if (m_normals.mirrors()) {
             std::swap(triangle.vi[1], triangle.vi[2]);
@@ -127,29 +132,30 @@ private:
         return true;
     }
 
-    KM_3dPoint placeOf(unsigned v) const {
-        const aiVector3D& p = m_source.mVertices[v];
-        return m_reading.world_from_mesh * KM_3dPoint(p.x, p.y, p.z);
-    }
-
-    bool isUsable(unsigned v) const {
+    /// Where a vertex stands in the world, unless it is known already; false when it cannot be
+    /// drawn there.
+    bool readPlace(unsigned v, KM_3dPoint& place) const {
         if (m_index[v] != IndexTable::none) {
             return true;
         }
-        const KM_3dPoint p = placeOf(v);
-        return isUsableCoordinate(p.x) && isUsableCoordinate(p.y) && isUsableCoordinate(p.z);
+        const aiVector3D& p = m_source.mVertices[v];
+        place = KM_3dPoint(p.x, p.y, p.z);
+        if (!m_in_place) {
+            place = m_reading.world_from_mesh * place;
+        }
+        return isUsableCoordinate(place.x) && isUsableCoordinate(place.y) &&
+               isUsableCoordinate(place.z);
     }
 
-    std::uint32_t vertexFor(unsigned v) {
+    std::uint32_t vertexFor(unsigned v, const KM_3dPoint& place) {
         if (m_index[v] == IndexTable::none) {
-            m_index[v] = add(readVertex(v));
+            m_index[v] = add(readVertex(v, place));
         }
         return m_index[v];
     }
 
-    Vertex readVertex(unsigned v) const {
+    Vertex readVertex(unsigned v, const KM_3dPoint& p) const {
         Vertex vertex;
-        const KM_3dPoint p = placeOf(v);
         vertex.place = KM_3fPoint(static_cast<float>(p.x) + 0.0F, static_cast<float>(p.y) + 0.0F,
                                   static_cast<float>(p.z) + 0.0F);
         if (m_has_normals) {
@@ -203,6 +209,15 @@ private:
         }
     }
 
+    void releaseSpareRoom() {
+        m_mesh->m_V.shrink_to_fit();
+        m_mesh->m_N.shrink_to_fit();
+        m_mesh->m_T.shrink_to_fit();
+        m_mesh->m_C.shrink_to_fit();
+        m_mesh->m_F.shrink_to_fit();
+        m_mesh->PadForRayTracing();
+    }
+
     void completeNormals() {
         if (m_has_normals) {
             fillMissingNormals(*m_mesh);
@@ -217,6 +232,7 @@ private:
     bool m_has_normals;
     bool m_has_texture;
     bool m_has_colors;
+    bool m_in_place; ///< the mesh stands in world coordinates
     bool m_weld;
     std::vector<std::uint32_t> m_index; ///< of the source's vertices in ours
     IndexTable m_table;
