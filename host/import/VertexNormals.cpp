@@ -52,11 +52,19 @@ Vector cross(const Vector& a, const Vector& b) {
     return {a.y * b.z - a.z * b.y, a.z * b.x - a.x * b.z, a.x * b.y - a.y * b.x};
 }
 
-/// The edges are made unit vectors first, so that neither tiny nor huge triangles leave the range
-/// of a float.
+/// True where products of four lengths, whose square this is, stay well inside the range of a
+/// float.
+bool isModest(float square) {
+    return square > 1e-9F && square < 1e9F;
+}
+
+/// The edges of tiny and huge triangles are made unit vectors first.
 Vector faceNormal(const KM_Mesh& mesh, const KM_MeshTriangle& face) {
     const KM_3fPoint& origin = mesh.m_V[face.vi[0]];
-    return unit(cross(unit(mesh.m_V[face.vi[1]] - origin), unit(mesh.m_V[face.vi[2]] - origin)));
+    const Vector a = mesh.m_V[face.vi[1]] - origin;
+    const Vector b = mesh.m_V[face.vi[2]] - origin;
+    const bool modest = isModest(dot(a, a)) && isModest(dot(b, b));
+    return unit(modest ? cross(a, b) : cross(unit(a), unit(b)));
 }
 
 /// The normal of a triangle at one of its corners, as long as its weight.
@@ -64,7 +72,12 @@ Vector weightedNormal(const KM_Mesh& mesh, const KM_MeshTriangle& face, int corn
     const KM_3fPoint& here = mesh.m_V[face.vi[corner]];
     const Vector a = mesh.m_V[face.vi[(corner + 1) % 3]] - here;
     const Vector b = mesh.m_V[face.vi[(corner + 2) % 3]] - here;
-    const float weight = std::sqrt(dot(a, a) * dot(b, b));
+    const float aa = dot(a, a);
+    const float bb = dot(b, b);
+    if (isModest(aa) && isModest(bb)) {
+        return scaled(cross(a, b), 1.0F / (aa * bb));
+    }
+    const float weight = std::sqrt(aa * bb);
     const Vector turned = cross(unit(a), unit(b));
     return weight > 0.0F && std::isfinite(1.0F / weight) ? scaled(turned, 1.0F / weight) : turned;
 }
