@@ -17,7 +17,10 @@ using Outcome = PlugInLoad::Outcome;
 constexpr const char* PROGRAM = "of this program";
 
 PlugInLoad refused(const std::filesystem::path& file, const std::string& reason) {
-    return {Outcome::load_refused, "The plug-in " + file.string() + " was not loaded: " + reason};
+    std::string message = "The plug-in " + file.string() + " was not loaded: " + reason;
+    if (!message.ends_with("."))
+        message += ".";
+    return {Outcome::load_refused, std::move(message)};
 }
 
 } // namespace
@@ -74,14 +77,15 @@ PlugInLoad PlugInLoader::loadById(const KM_UUID& id, bool ignore_disabled) {
     if (known == m_catalogue.end())
         return {Outcome::unknown_id,
                 "No plug-in with the id " + KM_UuidToString(id).ToUtf8() + " is known."};
-    const std::filesystem::path file = findInFolders(known->second);
-    const PlugInLoad load_result = load(file, ignore_disabled);
-    if (load_result.ok() && !isLoaded(id))
-        return refused(file, "it has another id than " + KM_UuidToString(id).ToUtf8());
-    return load_result;
+    return load(Request{findInFolders(known->second), ignore_disabled, id});
 }
 
-PlugInLoad PlugInLoader::load(const std::filesystem::path& file, bool ignore_disabled) {
+PlugInLoad PlugInLoader::load(const std::filesystem::path& file) {
+    return load(Request{file});
+}
+
+PlugInLoad PlugInLoader::load(const Request& request) {
+    const std::filesystem::path& file = request.file;
     std::error_code error;
     if (!std::filesystem::is_regular_file(file, error))
         return {Outcome::file_missing, "There is no plug-in file " + file.string() + "."};
@@ -94,51 +98,56 @@ PlugInLoad PlugInLoader::load(const std::filesystem::path& file, bool ignore_dis
         return {Outcome::loaded_before, {}};
     if (LibraryFile::isOpen(whole_path))
         return refused(whole_path, "the program has this file open already");
-    return open(whole_path, ignore_disabled);
+    return open(Request{whole_path, request.ignore_disabled, request.wanted_id});
 }
 
-PlugInLoad PlugInLoader::open(const std::filesystem::path& file, bool ignore_disabled) {
+PlugInLoad PlugInLoader::open(const Request& request) {
     auto candidate = std::make_unique<Loaded>();
-    candidate->file = file;
+    candidate->file = request.file;
     PendingObjects objects;
     {
         const PendingObjects::Scope scope;
-        Result<LibraryFile> library = LibraryFile::open(file);
+        Result<LibraryFile> library = LibraryFile::open(request.file);
         if (!library)
-            return refusedByLinker(library.message(), file);
+            return refusedByLinker(library.message(), request.file);
         candidate->library = std::move(library.value());
         objects = scope.objects();
     }
-    if (PlugInLoad checked = checkExports(candidate->library, file); !checked.ok())
+    if (PlugInLoad checked = checkExports(candidate->library, request.file); !checked.ok())
         return checked;
-    return adopt(std::move(candidate), objects, ignore_disabled);
+    return adopt(std::move(candidate), objects, request);
 }
 
 PlugInLoad PlugInLoader::adoptProgram() {
-    const PendingObjects& objects = PendingObjects::program();
     const auto of_program = [](const auto& loaded) { return loaded->file == PROGRAM; };
     if (std::ranges::any_of(m_loaded, of_program))
         return {Outcome::loaded_before, {}};
     auto candidate = std::make_unique<Loaded>();
     candidate->file = PROGRAM;
-    return adopt(std::move(candidate), objects, true);
+    return adopt(std::move(candidate), PendingObjects::program(), Request{PROGRAM});
 }
 
 PlugInLoad PlugInLoader::adopt(std::unique_ptr<Loaded> candidate, const PendingObjects& objects,
-                               bool ignore_disabled) {
-    PlugInLoad committed = commit(*candidate, objects, ignore_disabled);
-    if (!committed.ok()) {
+                               const Request& request) {
+    if (PlugInLoad taken = takeObjects(*candidate, objects); !taken.ok())
+        return taken;
+    if (PlugInLoad identified = identify(*candidate, request); !identified.ok())
+        return identified;
+    loadTexts(*candidate);
+    PlugInLoad started = registerCommands(*candidate);
+    if (started.ok())
+        started = startUp(*candidate);
+    if (!started.ok()) {
         withdraw(*candidate);
-        return committed;
+        return started;
     }
     m_catalogue[candidate->id] = candidate->file;
     m_loaded.push_back(std::move(candidate));
     m_application.documents().rememberFreshRecord();
-    return committed;
+    return started;
 }
 
-PlugInLoad PlugInLoader::commit(Loaded& candidate, const PendingObjects& objects,
-                                bool ignore_disabled) {
+PlugInLoad PlugInLoader::takeObjects(Loaded& candidate, const PendingObjects& objects) const {
     if (objects.plug_ins.size() != 1)
         return refused(candidate.file, "it has " + std::to_string(objects.plug_ins.size()) +
                                            " plug-in objects instead of one");
@@ -148,23 +157,25 @@ PlugInLoad PlugInLoader::commit(Loaded& candidate, const PendingObjects& objects
     candidate.application = objects.applications.front();
     candidate.plug_in = objects.plug_ins.front();
     candidate.commands = objects.commands;
+    return {};
+}
 
+PlugInLoad PlugInLoader::identify(Loaded& candidate, const Request& request) const {
     const CQuarnPlugIn& plug_in = *candidate.plug_in;
-    const Result<KM_UUID> id = acrossBorder([&] { return plug_in.PlugInID(); });
-    if (!id || KM_UuidIsNil(id.value()))
+    const Result<KM_UUID> asked = acrossBorder([&] { return plug_in.PlugInID(); });
+    if (!asked || KM_UuidIsNil(asked.value()))
         return refused(candidate.file, "it has no id");
-    if (isLoaded(id.value()))
-        return refused(candidate.file, "a plug-in with the id " +
-                                           KM_UuidToString(id.value()).ToUtf8() + " is loaded");
-    candidate.id = id.value();
-    const auto load_time = acrossBorder([&] { return plug_in.PlugInLoadTime(); });
-    if (load_time && load_time.value() == CQuarnPlugIn::load_disabled && !ignore_disabled)
-        return refused(candidate.file, "it is marked as never to be loaded");
+    candidate.id = asked.value();
+    const std::string id_text = KM_UuidToString(candidate.id).ToUtf8();
+    if (!KM_UuidIsNil(request.wanted_id) && candidate.id != request.wanted_id)
+        return refused(candidate.file, "it has another id (" + id_text + ") than was asked for");
+    if (isLoaded(candidate.id))
+        return refused(candidate.file, "a plug-in with the id " + id_text + " is loaded");
 
-    loadTexts(candidate);
-    if (PlugInLoad registered = registerCommands(candidate); !registered.ok())
-        return registered;
-    return startUp(candidate);
+    const auto load_time = acrossBorder([&] { return plug_in.PlugInLoadTime(); });
+    if (load_time && load_time.value() == CQuarnPlugIn::load_disabled && !request.ignore_disabled)
+        return refused(candidate.file, "it is marked as never to be loaded");
+    return {};
 }
 
 void PlugInLoader::loadTexts(const Loaded& candidate) {

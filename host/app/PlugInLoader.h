@@ -24,11 +24,11 @@ public:
     PlugInLoader& operator=(const PlugInLoader&) = delete;
 
     /// Loads a plug-in file.
-    /// @param ignore_disabled  also one that says it is never to be loaded
-    PlugInLoad load(const std::filesystem::path& file, bool ignore_disabled = true);
+    PlugInLoad load(const std::filesystem::path& file);
 
     /// Loads a plug-in by its id: the host's dialog plug-in, or one that was loaded before in this
     /// session, from the file it came from.
+    /// @param ignore_disabled  also one that says it is never to be loaded
     PlugInLoad loadById(const KM_UUID& id, bool ignore_disabled);
 
     /// As Session::adoptProgramPlugIn.
@@ -42,11 +42,18 @@ public:
 
 private:
     struct Loaded;
+    struct Request {
+        std::filesystem::path file;
+        bool ignore_disabled = true;
+        KM_UUID wanted_id = KM_nil_uuid; ///< nil takes any
+    };
 
-    PlugInLoad open(const std::filesystem::path& file, bool ignore_disabled);
-    PlugInLoad commit(Loaded& candidate, const PendingObjects& objects, bool ignore_disabled);
+    PlugInLoad load(const Request& request);
+    PlugInLoad open(const Request& request);
     PlugInLoad adopt(std::unique_ptr<Loaded> candidate, const PendingObjects& objects,
-                     bool ignore_disabled);
+                     const Request& request);
+    PlugInLoad takeObjects(Loaded& candidate, const PendingObjects& objects) const;
+    PlugInLoad identify(Loaded& candidate, const Request& request) const;
     PlugInLoad registerCommands(Loaded& candidate);
     PlugInLoad startUp(Loaded& candidate);
     void loadTexts(const Loaded& candidate);

@@ -26,7 +26,12 @@ bool readWord(std::wstring_view text, std::size_t& position, CommandWord& word) 
     return !inside_quotes;
 }
 
-Error oneNameMissing(std::wstring_view line) {
+/// Whether a word is "!" alone.
+bool isSeparator(const CommandWord& word) {
+    return !word.text.empty() && word.text.find_first_not_of(L'!') == std::wstring::npos;
+}
+
+Error nameMissing(std::wstring_view line) {
     return Error{"No command name in: " + KM_wString(line).ToUtf8()};
 }
 
@@ -54,7 +59,7 @@ Result<CommandLine> parseCommandLine(std::wstring_view line) {
         return split.error();
     CommandLine parsed;
     parsed.words = std::move(split.value());
-    while (!parsed.words.empty() && parsed.words.front().text == L"!")
+    while (!parsed.words.empty() && isSeparator(parsed.words.front()))
         parsed.words.pop_front();
     if (parsed.words.empty())
         return parsed;
@@ -63,7 +68,7 @@ Result<CommandLine> parseCommandLine(std::wstring_view line) {
     parsed.words.pop_front();
     const std::size_t name_begin = first.find_first_not_of(L"_-!");
     if (name_begin == std::wstring::npos)
-        return oneNameMissing(line);
+        return nameMissing(line);
     const std::wstring_view prefixes = std::wstring_view(first).substr(0, name_begin);
     parsed.english_name = prefixes.find(L'_') != prefixes.npos;
     parsed.without_dialogs = prefixes.find(L'-') != prefixes.npos;

@@ -1,0 +1,128 @@
+#include "sdk/qncore/QnApp.h"
+#include "sdk/qncore/QnDoc.h"
+#include "sdk/qncore/QnLocalize.h"
+#include "sdk/qncore/QnPlatform.h"
+#include "sdk/qncore/QnView.h"
+#include "sdk/qncore/QnZoetrixDynamicAccess.h"
+#include "sdk/vexui/VexUi.h"
+#include "tests/host/app/TestCommand.h"
+
+#include <thread>
+
+namespace quarn::test {
+namespace {
+
+TEST_F(HostTest, ASessionStartsWithOneDocumentAndItsPerspectiveView) {
+    EXPECT_EQ(QuarnApp().ActiveDoc(), &session.document());
+    ASSERT_NE(QuarnApp().ActiveView(), nullptr);
+    EXPECT_EQ(&QuarnApp().ActiveView()->Document(), &session.document());
+}
+
+TEST_F(HostTest, PrintShowsTextAsItStands) {
+    QuarnApp().Print(L"100 %d %s\n");
+    QuarnApp().Print(nullptr);
+    EXPECT_EQ(printed(), "100 %d %s\n");
+}
+
+TEST_F(HostTest, MessagesWaitingAndKeysGoThroughTheFrontEnd) {
+    EXPECT_EQ(QuarnMessageBox(L"Text", L"Animation", 48), 1);
+    ASSERT_EQ(front_end.messages().size(), 1U);
+    EXPECT_EQ(front_end.messages()[0].title, L"Animation");
+    EXPECT_EQ(front_end.messages()[0].flags, 48U);
+    const unsigned int before = GetTickCount();
+    QuarnApp().Wait(10);
+    EXPECT_GE(GetTickCount() - before, 9U);
+    EXPECT_EQ(front_end.waited_ms(), 10U);
+    EXPECT_EQ(GetAsyncKeyState(VK_ESCAPE), 0);
+    front_end.setKeyDown(VK_ESCAPE, true);
+    EXPECT_LT(GetAsyncKeyState(VK_ESCAPE), 0);
+    EXPECT_EQ(QuarnApp().MainWnd(), nullptr);
+    EXPECT_EQ(CWnd::FromHandle(nullptr), nullptr);
+}
+
+TEST_F(HostTest, OneWindowObjectStandsForOneWindow) {
+    int place = 0;
+    const HWND window = reinterpret_cast<HWND>(&place);
+    ASSERT_NE(CWnd::FromHandle(window), nullptr);
+    EXPECT_EQ(CWnd::FromHandle(window)->m_hWnd, window);
+    EXPECT_EQ(CWnd::FromHandle(window), CWnd::FromHandle(window));
+}
+
+TEST_F(HostTest, CallsFromAnotherThreadAreIgnoredAndTold) {
+    CQuarnDoc* seen = &session.document();
+    testing::internal::CaptureStderr();
+    std::thread([&] {
+        QuarnApp().Print(L"from a thread");
+        seen = QuarnApp().ActiveDoc();
+    }).join();
+    const std::string told = testing::internal::GetCapturedStderr();
+    EXPECT_EQ(seen, nullptr);
+    EXPECT_EQ(printed(), "");
+    EXPECT_NE(told.find("CQuarnApp::Print was called outside the main thread"), std::string::npos);
+    EXPECT_NE(told.find("CQuarnApp::ActiveDoc"), std::string::npos);
+}
+
+TEST(WithoutASession, CallsFindNothingAndDoNoHarm) {
+    EXPECT_EQ(QuarnApp().ActiveDoc(), nullptr);
+    EXPECT_EQ(QuarnApp().ActiveView(), nullptr);
+    QuarnApp().Print(L"nobody listens");
+    EXPECT_FALSE(QuarnApp().RunScript(1, L"Help", 1));
+    EXPECT_EQ(QuarnMessageBox(L"x", L"y", 0), 1);
+    EXPECT_FALSE(CQuarnPlugIn::PlugInIsLoaded(ZelVexUiPlugInId));
+    EXPECT_EQ(CQuarnPlugIn::LoadPlugIn(ZelVexUiPlugInId, true, true), -1);
+    EXPECT_EQ(QnZoetrixVexUiTurnTable(), nullptr);
+    EXPECT_STREQ(QnLocalizeString(L"Text", 16714), L"Text");
+}
+
+// ---- Pictures of a recording
+
+/// Keeps what it is told about written pictures.
+class CountingFrontEnd : public ScriptedFrontEnd {
+public:
+    void frameWritten(const std::filesystem::path& file, int written, int total) override {
+        told.push_back(file.string() + " " + std::to_string(written) + "/" + std::to_string(total));
+    }
+    std::vector<std::string> told;
+};
+
+class FixedAccess : public IQnZoetrixDynamicAccess {
+public:
+    const KM_3dmAnimationProperties& AnimationProperties(const CQuarnDoc&) const override {
+        return record;
+    }
+    void SetAnimationProperties(const CQuarnDoc&, const KM_3dmAnimationProperties& r) override {
+        record = r;
+    }
+    bool AnimatedViewAtFrame(CQuarnDoc&, const KM_3dmAnimationProperties&, int,
+                             KM_Viewport&) override {
+        return false;
+    }
+    bool AnimatedSunAtFrame(CQuarnDoc&, const KM_3dmAnimationProperties&, int, KM_Light&) override {
+        return false;
+    }
+    KM_3dmAnimationProperties record;
+};
+
+TEST(Pictures, AreCountedForEachCommandAndToldWithTheFramesOfTheRecord) {
+    CountingFrontEnd front_end;
+    Session session(front_end, {{}, {}, "C", {}});
+    TestCommand record(L"RecordTwo", [](const CQuarnCommandContext&) {
+        Application::current()->pictureWritten("a0.png");
+        Application::current()->pictureWritten("a1.png");
+        return CQuarnCommand::success;
+    });
+    ASSERT_TRUE(Application::current()->commands().add(record));
+    session.runCommand(L"RecordTwo");
+    FixedAccess access;
+    access.record.SetFrameCount(2);
+    Zoetrix_SetQuarnDynamicAccess(&access);
+    EXPECT_EQ(Zoetrix_QuarnDynamicAccess(), &access);
+    session.runCommand(L"RecordTwo");
+    Zoetrix_SetQuarnDynamicAccess(nullptr);
+    Application::current()->pictureWritten("outside.png");
+    EXPECT_EQ(front_end.told,
+              (std::vector<std::string>{"a0.png 1/0", "a1.png 2/0", "a0.png 1/2", "a1.png 2/2"}));
+}
+
+} // namespace
+} // namespace quarn::test

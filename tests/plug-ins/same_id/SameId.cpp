@@ -1,0 +1,8 @@
+#include "tests/plug-ins/TestPlugIn.h"
+
+namespace {
+TestApplication the_application;
+TestPlugIn the_plug_in("0B7E9B0C-6C1E-4C5B-8C55-3A8D0C9F1A01"); // the good one's
+} // namespace
+
+TEST_PLUGIN_EXPORTS

@@ -1,0 +1,10 @@
+#include "tests/plug-ins/TestPlugIn.h"
+
+namespace {
+TestApplication the_application;
+TestPlugIn the_plug_in("0B7E9B0C-6C1E-4C5B-8C55-3A8D0C9F1A60");
+TestCommand the_first_command(L"TestFirst", "0B7E9B0C-6C1E-4C5B-8C55-3A8D0C9F1A61");
+TestCommand the_taken_command(L"HELP", "0B7E9B0C-6C1E-4C5B-8C55-3A8D0C9F1A62");
+} // namespace
+
+TEST_PLUGIN_EXPORTS

@@ -1,0 +1,10 @@
+#include "tests/plug-ins/TestPlugIn.h"
+
+namespace {
+TestApplication the_application;
+TestPlugIn the_plug_in("0B7E9B0C-6C1E-4C5B-8C55-3A8D0C9F1A20");
+TestCommand the_command(L"TestGood", "0B7E9B0C-6C1E-4C5B-8C55-3A8D0C9F1A21");
+} // namespace
+
+TEST_PLUGIN_VERSIONS(QUARN_SDK_VERSION + 1)
+TEST_PLUGIN_CONTACTS
