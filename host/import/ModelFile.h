@@ -52,8 +52,8 @@ struct ImportedModel {
 ///
 /// - Coordinates are in the file's own units. Z is up: formats that are Y-up by their definition
 ///   (glTF, GLB), or that Assimp hands out Y-up (FBX, DAE, 3DS and others), are turned, with Y to Z
-///   and Z to -Y. OBJ, PLY, STL, OFF, 3MF, AMF and DXF state no axis or are Z-up: they stay as they
-///   are.
+///   and Z to -Y. OBJ, PLY, STL, OFF, 3MF, AMF, DXF and BLEND state no axis or are Z-up: they stay
+///   as they are.
 /// - The transforms of the file's nodes are applied, so a mesh that stands in a scene ten times
 ///   becomes ten meshes. Mirroring turns the triangles' winding, so that outside stays outside.
 /// - Vertex normals of the file are kept, except those of STL, which only repeat the facets. Where
