@@ -24,7 +24,7 @@ protected:
 
 class DialogPlugIn : public PlugInFixture {
 protected:
-    DialogPlugIn() : PlugInFixture("dialogs") {}
+    DialogPlugIn() : PlugInFixture("ZEL_VexUI_double") {}
 };
 
 } // namespace

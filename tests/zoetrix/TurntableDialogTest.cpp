@@ -1,84 +1,31 @@
+#include "sdk/vexui/VexUi.h"
 #include "tests/zoetrix/TurntableFixture.h"
 
 using testing::HasSubstr;
 
 namespace {
 
-using Names = KM_ClassArray<KM_wString>;
-
-/// What the dialog was given when it opened.
-struct Opened {
-    Names files, methods, views, directions;
-    int file = -1, method = -1, view = -1, direction = -1;
-    KM_3dmAnimationProperties record;
-};
-Opened opened;
-
-/// What the person enters. A selection that is not set is left alone.
-struct Entered {
-    std::optional<int> file, method, view, direction;
-    int frames = 12;
-    KM_wString name = L"Walk";
-    bool confirmed = true;
-};
-Entered entered;
-
-bool dialog(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) {
-    opened = {lists.FileList(),
-              lists.CaptureList(),
-              lists.ViewportList(),
-              lists.DirectionList(),
-              lists.FileListSelection(),
-              lists.CaptureListSelection(),
-              lists.ViewportListSelection(),
-              lists.DirectionListSelection(),
-              record};
-    if (entered.file)
-        lists.SetFileListSelection(*entered.file);
-    if (entered.method)
-        lists.SetCaptureListSelection(*entered.method);
-    if (entered.view)
-        lists.SetViewportListSelection(*entered.view);
-    if (entered.direction)
-        lists.SetDirectionListSelection(*entered.direction);
-    record.SetFrameCount(entered.frames);
-    record.SetHtmlFilename(entered.name);
-    // Nothing else of the record counts.
-    record.SetFileExtension(L"gif");
-    record.SetViewportName(L"Nowhere");
-    record.SetCaptureMethod(L"Nothing");
-    record.SetCaptureType(KM_3dmAnimationProperties::seasonal_sun);
-    return entered.confirmed;
-}
-
 class TurntableDialog : public TurntableFixture {
 protected:
-    void SetUp() override {
-        TurntableFixture::SetUp();
-        entered = {};
-        opened = {};
-    }
-    CQuarnCommand::result confirm() { return runInDialog(dialog); }
+    CQuarnCommand::result confirm() { return runInDialog(entered); }
     void expectRecordUntouched() {
         EXPECT_EQ(KM_3dmAnimationProperties::none, record().CaptureType());
         EXPECT_EQ(L"Walk", record().HtmlFilename().View());
         EXPECT_TRUE(record().CameraPoints().IsEmpty());
     }
+
+    Entered entered;
 };
 
 class NoDialogPlugIn : public PlugInFixture {};
 class PlugInWithoutDialogs : public PlugInFixture {
 protected:
-    PlugInWithoutDialogs() : PlugInFixture("no-dialogs") {}
+    PlugInWithoutDialogs() : PlugInFixture("ZEL_VexUI_bare") {}
 };
-class UnansweredDialog : public PlugInFixture {
+class UnansweredDialog : public TurntableFixture {
 protected:
-    UnansweredDialog() : PlugInFixture("dialogs") {}
+    void SetUp() override {}
 };
-
-KM_wString repeated(wchar_t character, std::size_t count) {
-    return KM_wString(std::wstring(count, character));
-}
 
 } // namespace
 
@@ -88,19 +35,16 @@ TEST_F(TurntableDialog, ShowsTheChoicesAndTheRecord) {
     record().SetCaptureMethod(L"XRay");
     record().SetViewportName(L"Right");
     ASSERT_EQ(CQuarnCommand::success, confirm());
-    EXPECT_EQ(Names({L"jpg", L"bmp", L"png", L"tga"}), opened.files);
-    EXPECT_EQ(Names({L"Top", L"Front", L"Right", L"Perspective"}), opened.views);
-    EXPECT_EQ(Names({L"Clockwise", L"AntiClockwise"}), opened.directions);
-    EXPECT_EQ(L"XRay", opened.methods[opened.method].View());
-    EXPECT_EQ(3, opened.file);
-    EXPECT_EQ(2, opened.view);
-    EXPECT_EQ(0, opened.direction);
-    EXPECT_EQ(33, opened.record.FrameCount());
+    EXPECT_EQ("turntable;frames=33;name=Walk;files=jpg,bmp,png,tga@3;"
+              "captures=RenderFull,RenderPreview,Wireframe,Shaded,RenderedViewport,Translucent,"
+              "XRay,Drawing,Clay@6;viewports=Top,Front,Right,Perspective@2;"
+              "directions=Clockwise,AntiClockwise@0",
+              shownInDialog());
     EXPECT_TRUE(front_end.questions().empty());
 }
 
 TEST_F(TurntableDialog, StoresWhatWasChosen) {
-    entered = {.file = 2, .method = 4, .view = 1, .frames = 8, .name = L"Spin"};
+    entered = {.file_type = 2, .method = 4, .viewport = 1, .frames = 8, .name = "Spin"};
     ASSERT_EQ(CQuarnCommand::success, confirm());
     const KM_3dmAnimationProperties& props = record();
     EXPECT_EQ(KM_3dmAnimationProperties::turntable, props.CaptureType());
@@ -167,7 +111,7 @@ TEST_F(TurntableDialog, SelectionsOutsideTheirListsChangeNothing) {
         record().SetCaptureMethod(L"Shaded");
         record().SetViewportName(L"Top");
         record().SetDisplayMode(mode);
-        entered.file = entered.method = entered.view = selection;
+        entered.file_type = entered.method = entered.viewport = selection;
         ASSERT_EQ(CQuarnCommand::success, confirm());
         EXPECT_EQ(L"bmp", record().FileExtension().View());
         EXPECT_EQ(L"Shaded", record().CaptureMethod().View());
@@ -181,7 +125,7 @@ TEST_F(TurntableDialog, ChoosesTheDirectionBothWays) {
     const KM_3dPointArray anticlockwise = record().CameraPoints();
     entered.frames = 4;
     ASSERT_EQ(CQuarnCommand::success, confirm());
-    EXPECT_EQ(1, opened.direction);
+    EXPECT_TRUE(shownInDialog().ends_with("@1")) << shownInDialog();
     EXPECT_EQ(anticlockwise, record().CameraPoints());
 
     entered.direction = 0;
@@ -197,16 +141,16 @@ TEST_F(TurntableDialog, ChoosesTheDirectionBothWays) {
 }
 
 TEST_F(TurntableDialog, ClosedUnconfirmedLeavesEverythingAsItWas) {
-    entered = {.file = 2, .direction = 1, .confirmed = false};
+    entered = {.file_type = 2, .direction = 1, .confirmed = false};
     EXPECT_EQ(CQuarnCommand::cancel, confirm());
     expectRecordUntouched();
     entered = {};
     ASSERT_EQ(CQuarnCommand::success, confirm());
-    EXPECT_EQ(0, opened.direction);
+    EXPECT_TRUE(shownInDialog().ends_with("@0")) << shownInDialog();
 }
 
 TEST_F(TurntableDialog, InvalidNameIsRepairedAndTold) {
-    entered.name = L"a<b>%s";
+    entered.name = "a<b>%s";
     ASSERT_EQ(CQuarnCommand::success, confirm());
     EXPECT_EQ(L"a_b_%s", record().HtmlFilename().View());
     ASSERT_EQ(1U, front_end.messages().size());
@@ -218,7 +162,7 @@ TEST_F(TurntableDialog, InvalidNameIsRepairedAndTold) {
 }
 
 TEST_F(TurntableDialog, NameThatCannotBeRepairedEndsIt) {
-    for (const KM_wString& name : {KM_wString(), repeated(L'a', 256)}) {
+    for (const std::string& name : {std::string(), std::string(256, 'a')}) {
         const std::size_t messages = front_end.messages().size();
         entered.name = name;
         entered.direction = 1;
@@ -231,13 +175,13 @@ TEST_F(TurntableDialog, NameThatCannotBeRepairedEndsIt) {
     }
     entered = {};
     ASSERT_EQ(CQuarnCommand::success, confirm());
-    EXPECT_EQ(0, opened.direction);
+    EXPECT_TRUE(shownInDialog().ends_with("@0")) << shownInDialog();
 }
 
 TEST_F(TurntableDialog, NameOf255CharactersIsTakenAsItIs) {
-    entered.name = repeated(L'a', 255);
+    entered.name = std::string(255, 'a');
     ASSERT_EQ(CQuarnCommand::success, confirm());
-    EXPECT_EQ(entered.name, record().HtmlFilename());
+    EXPECT_EQ(entered.name, record().HtmlFilename().ToUtf8());
 }
 
 TEST_F(NoDialogPlugIn, IsToldAndFails) {
@@ -256,6 +200,8 @@ TEST_F(PlugInWithoutDialogs, FailsWithoutAWord) {
 }
 
 TEST_F(UnansweredDialog, IsLoadedByTheCommandAndCancelsIt) {
-    EXPECT_EQ(CQuarnCommand::cancel, session->runCommand(L"SetTurntableAnimation", true));
+    placeCamera(L"Perspective", eye, target);
+    EXPECT_FALSE(CQuarnPlugIn::PlugInIsLoaded(ZelVexUiPlugInId));
+    EXPECT_EQ(CQuarnCommand::cancel, runInDialog({.confirmed = false}));
     EXPECT_TRUE(CQuarnPlugIn::PlugInIsLoaded(ZelVexUiPlugInId));
 }

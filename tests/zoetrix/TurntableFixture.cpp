@@ -1,49 +1,49 @@
 #include "tests/zoetrix/TurntableFixture.h"
 
 #include <cmath>
-#include <dlfcn.h>
+#include <cstdlib>
 
 namespace {
 
-std::filesystem::path dialogPlugIn() {
-    return std::filesystem::path(TEST_PLUGIN_DIR) / "dialogs" / "ZEL_VexUI.qnp";
+void setWish(const char* name, const std::optional<std::string>& wish) {
+    const std::string variable = std::string("QUARN_DIALOG_") + name;
+    if (wish)
+        setenv(variable.c_str(), wish->c_str(), 1);
+    else
+        unsetenv(variable.c_str());
 }
 
-bool chooseClockwise(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) {
-    lists.SetDirectionListSelection(0);
-    record.SetFrameCount(1);
-    record.SetHtmlFilename(L"Walk");
-    return true;
+void setWish(const char* name, const std::optional<int>& wish) {
+    setWish(name, wish ? std::optional(std::to_string(*wish)) : std::nullopt);
 }
 
 } // namespace
+
+std::string shownInDialog() {
+    const char* shown = std::getenv("QUARN_DIALOG_SHOWN");
+    return shown ? shown : "";
+}
 
 TurntableFixture::TurntableFixture(const std::string& plug_ins) : PlugInFixture(plug_ins) {}
 
 void TurntableFixture::SetUp() {
     placeCamera(L"Perspective", eye, target);
-    // The remembered direction outlives the session; a dialog is what restores it.
-    const quarn::PlugInLoad load = session->loadPlugIn(dialogPlugIn());
-    ASSERT_TRUE(load.ok()) << load.message;
-    ASSERT_EQ(CQuarnCommand::success, runInDialog(chooseClockwise));
+    // The remembered direction outlives the session; the dialog is what restores it.
+    ASSERT_EQ(CQuarnCommand::success, runInDialog({.direction = 0, .frames = 1}));
     record() = KM_3dmAnimationProperties();
     record().SetHtmlFilename(L"Walk");
     record().SetCaptureMethod(L"Shaded");
     front_end.clearPrinted();
 }
 
-void TurntableFixture::answerDialogWith(QnZoetrixVexUiDialog dialog) {
-    void* library = dlopen(dialogPlugIn().c_str(), RTLD_NOW | RTLD_NOLOAD);
-    ASSERT_TRUE(library);
-    using Answering = void (*)(QnZoetrixVexUiDialog);
-    const auto answering = reinterpret_cast<Answering>(dlsym(library, "AnswerTurnTableWith"));
-    ASSERT_TRUE(answering);
-    answering(dialog);
-    dlclose(library);
-}
-
-CQuarnCommand::result TurntableFixture::runInDialog(QnZoetrixVexUiDialog dialog) {
-    answerDialogWith(dialog);
+CQuarnCommand::result TurntableFixture::runInDialog(const Entered& entered) {
+    setWish("CONFIRM", entered.confirmed ? "1" : "0");
+    setWish("FILE_TYPE", entered.file_type);
+    setWish("CAPTURE", entered.method);
+    setWish("VIEWPORT", entered.viewport);
+    setWish("DIRECTION", entered.direction);
+    setWish("FRAMES", entered.frames);
+    setWish("NAME", entered.name);
     return session->runCommand(L"SetTurntableAnimation", true);
 }
 
