@@ -24,14 +24,18 @@ inline void encode(const FrameSetup& frame, const LaneColors& color,
                     table[displayIndex(color.b.v[i])] << 16 | 0xFF000000U;
 }
 
-/// color = under * (1 - weight) + over * weight, in the lanes of `mask`; else `under`.
+/// color = under * (1 - weight) + over * weight, in the lanes of `mask`; else `under`. What the
+/// other lanes of `over` hold is not looked at: it may be no number.
 inline void blendOver(const LaneColors& over, const Lanes& weight, const LaneMask& mask,
                       LaneColors& under) {
     for (int i = 0; i < lane_count; ++i) {
         const float w = mask.v[i] ? weight.v[i] : 0.0F;
-        under.r.v[i] += w * (over.r.v[i] - under.r.v[i]);
-        under.g.v[i] += w * (over.g.v[i] - under.g.v[i]);
-        under.b.v[i] += w * (over.b.v[i] - under.b.v[i]);
+        const float r = under.r.v[i] + w * (over.r.v[i] - under.r.v[i]);
+        const float g = under.g.v[i] + w * (over.g.v[i] - under.g.v[i]);
+        const float b = under.b.v[i] + w * (over.b.v[i] - under.b.v[i]);
+        under.r.v[i] = mask.v[i] ? r : under.r.v[i];
+        under.g.v[i] = mask.v[i] ? g : under.g.v[i];
+        under.b.v[i] = mask.v[i] ? b : under.b.v[i];
     }
 }
 
