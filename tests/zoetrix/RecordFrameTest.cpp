@@ -1,0 +1,173 @@
+#include "tests/zoetrix/RecordingFixture.h"
+#include "zoetrix/commands/cmdZoetrix.h"
+
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+
+namespace {
+
+class RecordFrames : public RecordingFixture {
+protected:
+    bool recordFrame(CQuarnView* drawn) {
+        bool written = false;
+        insideCommand([&](CQuarnDoc& document) {
+            written = RecordFrame(document.RuntimeSerialNumber(), record(), drawn);
+        });
+        return written;
+    }
+    bool recordFrame() { return recordFrame(&view(L"Perspective")); }
+    std::vector<std::wstring> images() {
+        std::vector<std::wstring> names;
+        for (const KM_wString& image : record().Images())
+            names.emplace_back(image.View());
+        return names;
+    }
+};
+
+} // namespace
+
+TEST_F(RecordFrames, FrameFiveOfWalkIsWalk005) {
+    record().SetCurrentFrame(5);
+    ASSERT_TRUE(recordFrame());
+    EXPECT_THAT(files(), ElementsAre("Walk005.jpg"));
+    EXPECT_THAT(images(), ElementsAre(L"Walk005.jpg"));
+    EXPECT_TRUE(isJpeg(frames / "Walk005.jpg"));
+}
+
+TEST_F(RecordFrames, NumbersHaveAtLeastThreeDigits) {
+    for (const int frame : {0, 7, 42, 999, 1000, 1234}) {
+        record().SetCurrentFrame(frame);
+        ASSERT_TRUE(recordFrame());
+    }
+    EXPECT_THAT(images(), ElementsAre(L"Walk000.jpg", L"Walk007.jpg", L"Walk042.jpg",
+                                      L"Walk999.jpg", L"Walk1000.jpg", L"Walk1234.jpg"));
+    EXPECT_EQ(6U, files().size());
+}
+
+TEST_F(RecordFrames, LeadingBlankOfTheNameIsKept) {
+    record().SetHtmlFilename(L" Walk ");
+    record().SetFileExtension(L"png");
+    record().SetCurrentFrame(12);
+    ASSERT_TRUE(recordFrame());
+    EXPECT_THAT(files(), ElementsAre(" Walk 012.png"));
+}
+
+TEST_F(RecordFrames, NameIsNoFormatText) {
+    record().SetHtmlFilename(L"%s%n%d");
+    record().SetCurrentFrame(1);
+    ASSERT_TRUE(recordFrame());
+    EXPECT_THAT(files(), ElementsAre("%s%n%d001.jpg"));
+}
+
+TEST_F(RecordFrames, PictureHasTheViewsSizeAndCaptureSampling) {
+    record().SetFileExtension(L"bmp");
+    CQuarnDisplayPipeline* pipeline = view(L"Perspective").ActiveViewport().DisplayPipeline();
+    ASSERT_NE(2, pipeline->CurrentDisplayAttributes()->m_antialiasing_level);
+    ASSERT_TRUE(recordFrame());
+    EXPECT_EQ(2, pipeline->CurrentDisplayAttributes()->m_antialiasing_level);
+    const std::string bmp = readFile(frames / "Walk001.bmp");
+    ASSERT_GT(bmp.size(), 26U);
+    // Width and height stand at the bytes 18 and 22 of a bitmap file, little-endian.
+    EXPECT_EQ(64, bmp[18]);
+    EXPECT_EQ(48, std::abs(static_cast<signed char>(bmp[22])));
+}
+
+TEST_F(RecordFrames, FolderIsMadeWithThoseAboveIt) {
+    record().SetFolderName(wide(frames / "a" / "b"));
+    ASSERT_TRUE(recordFrame());
+    EXPECT_TRUE(isJpeg(frames / "a" / "b" / "Walk001.jpg"));
+}
+
+TEST_F(RecordFrames, FolderThatCannotBeMadeFails) {
+    writeFile(frames, "a file where the folder should be");
+    EXPECT_FALSE(recordFrame());
+    EXPECT_THAT(images(), IsEmpty());
+    EXPECT_EQ("a file where the folder should be", readFile(frames));
+    record().SetFolderName(L"");
+    EXPECT_FALSE(recordFrame());
+}
+
+TEST_F(RecordFrames, NamesThatLeaveTheFolderAreNotWritten) {
+    for (const wchar_t* name : {L"../Walk", L"a/b", L"a\\b", L"a\nb", L"\x01"}) {
+        record().SetHtmlFilename(name);
+        EXPECT_FALSE(recordFrame());
+    }
+    record().SetHtmlFilename(L"Walk");
+    record().SetFileExtension(L"x/../../y.jpg");
+    EXPECT_FALSE(recordFrame());
+    EXPECT_THAT(images(), IsEmpty());
+    EXPECT_FALSE(std::filesystem::exists(frames));
+}
+
+TEST_F(RecordFrames, UnknownExtensionIsNotWritten) {
+    record().SetFileExtension(L"gif");
+    EXPECT_FALSE(recordFrame());
+    EXPECT_THAT(images(), IsEmpty());
+    EXPECT_THAT(files(), IsEmpty());
+}
+
+TEST_F(RecordFrames, WithoutAViewOnlyTheRendererCanWrite) {
+    EXPECT_FALSE(recordFrame(nullptr));
+    EXPECT_THAT(files(), IsEmpty());
+    loadRenderer();
+    record().SetRenderFull(true);
+    EXPECT_TRUE(recordFrame(nullptr));
+    EXPECT_THAT(files(), ElementsAre("Walk001.jpg"));
+}
+
+TEST_F(RecordFrames, FullRenderIsSavedAndItsWindowClosed) {
+    loadRenderer();
+    record().SetRenderFull(true);
+    record().SetRenderPreview(true);
+    record().SetHtmlFilename(L"a walk");
+    ASSERT_TRUE(recordFrame());
+    EXPECT_EQ("Render SaveRenderWindowAs run ", journal());
+    EXPECT_EQ("Render", readFile(frames / "a walk001.jpg"));
+    EXPECT_THAT(images(), ElementsAre(L"a walk001.jpg"));
+    EXPECT_THAT(printed(), HasSubstr(L"_-SaveRenderWindowAs \"" +
+                                     std::wstring(wide(frames).View()) + L"/a walk001.jpg\""));
+}
+
+TEST_F(RecordFrames, PreviewRenderIsSavedAndItsWindowClosed) {
+    loadRenderer();
+    record().SetRenderPreview(true);
+    ASSERT_TRUE(recordFrame());
+    EXPECT_EQ("RenderPreview SaveRenderWindowAs run ", journal());
+    EXPECT_EQ("RenderPreview", readFile(frames / "Walk001.jpg"));
+}
+
+TEST_F(RecordFrames, PathWithAQuoteNeverReachesAScript) {
+    loadRenderer();
+    record().SetRenderFull(true);
+    record().SetHtmlFilename(L"a\" _Exit \"");
+    EXPECT_FALSE(recordFrame());
+    EXPECT_EQ("", journal());
+    record().SetHtmlFilename(L"Walk");
+    record().SetFolderName(wide(frames) + L"\n_Exit");
+    EXPECT_FALSE(recordFrame());
+    EXPECT_EQ("", journal());
+    EXPECT_FALSE(session->isExitRequested());
+}
+
+TEST_F(RecordFrames, QuoteInTheNameIsWrittenByTheDisplay) {
+    record().SetHtmlFilename(L"a\"b");
+    EXPECT_TRUE(recordFrame());
+    EXPECT_THAT(files(), ElementsAre("a\"b001.jpg"));
+}
+
+TEST_F(RecordFrames, UnknownRendererWritesNothing) {
+    for (const bool full : {true, false}) {
+        record().SetRenderFull(full);
+        record().SetRenderPreview(!full);
+        EXPECT_FALSE(recordFrame());
+    }
+    EXPECT_THAT(files(), IsEmpty());
+    EXPECT_THAT(images(), IsEmpty());
+}
+
+TEST_F(RecordFrames, InterruptedProgramWritesNothing) {
+    front_end.interrupt();
+    EXPECT_FALSE(recordFrame());
+    EXPECT_THAT(files(), IsEmpty());
+}

@@ -1,0 +1,36 @@
+#include "tests/zoetrix/RecordingFixture.h"
+
+#include <algorithm>
+#include <cstdlib>
+
+void RecordingFixture::SetUp() {
+    importObj("v -1 -1 0\nv 1 -1 0\nv 1 1 0\nv -1 1 0\nv 0 0 2\no roof\n"
+              "f 1 2 5\nf 2 3 5\nf 3 4 5\nf 4 1 5\n");
+    ASSERT_EQ(CQuarnCommand::success, run(L"ViewportSize 64 48"));
+    setUpCameraFrames(3);
+    record().SetDisplayMode(CQuarnDisplayAttrsMgr::RenderedModeId());
+    record().SetFolderName(wide(frames));
+    front_end.clearPrinted();
+}
+
+void RecordingFixture::loadRenderer() {
+    const std::filesystem::path file =
+        std::filesystem::path(TEST_PLUGIN_DIR) / "render_commands.qnp";
+    const quarn::PlugInLoad load = session->loadPlugIn(file);
+    ASSERT_TRUE(load.ok()) << load.message;
+    unsetenv("QUARN_TEST_JOURNAL");
+}
+
+std::string RecordingFixture::journal() {
+    const char* words = std::getenv("QUARN_TEST_JOURNAL");
+    return words ? words : "";
+}
+
+std::vector<std::string> RecordingFixture::files() const {
+    std::vector<std::string> names;
+    std::error_code error;
+    for (const auto& entry : std::filesystem::directory_iterator(frames, error))
+        names.push_back(entry.path().filename().string());
+    std::ranges::sort(names);
+    return names;
+}
