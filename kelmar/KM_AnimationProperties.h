@@ -8,6 +8,8 @@
 
 #include <cstdint>
 
+class KM_BinaryArchive;
+
 /// The animation that is set up in a document: what kind it is, where camera and target are in
 /// every frame, date and place of a sun study, how frames are drawn and where recordings go.
 ///
@@ -38,7 +40,22 @@ public:
     KM_3dmAnimationProperties(const KM_3dmAnimationProperties& other);
     /// Copies every field; a record may be assigned to itself.
     KM_3dmAnimationProperties& operator=(const KM_3dmAnimationProperties& other);
+    /// Takes every field over from `other`, whose texts and arrays are unspecified afterwards.
+    KM_3dmAnimationProperties& operator=(KM_3dmAnimationProperties&& other) noexcept;
     ~KM_3dmAnimationProperties();
+
+    /// Writes every field, as a chunk with a layout version of its own.
+    /// @return false when the archive fails, and when the record is one that Read refuses: its
+    ///         capture type is none of the list, or a coordinate of its points is not finite
+    bool Write(KM_BinaryArchive& archive) const;
+
+    /// Replaces every field by what Write wrote, to the last bit. Fields that an older layout lacks
+    /// get their defaults; what a newer minor layout adds is skipped. Frame count, frame numbers
+    /// and dates are taken as they are, so look before playing whether the record can be played.
+    /// @return false, with this record unchanged and the archive failed, when the chunk is cut or
+    ///         damaged, has a newer major layout, or holds what no record can: an unknown capture
+    ///         type, a coordinate that is not finite, a bool other than 0 and 1, ill-formed UTF-8
+    bool Read(KM_BinaryArchive& archive);
 
     /// Kind of animation that is set up. Default: none.
     CaptureTypes CaptureType() const { return m_capture_type; }
@@ -186,6 +203,8 @@ public:
     void SetRenderPreview(bool render_preview) { m_render_preview = render_preview; }
 
 private:
+    struct Fields;
+
     CaptureTypes m_capture_type = none;
     KM_wString m_file_extension = L"jpg";
     KM_wString m_capture_method;
