@@ -5,7 +5,11 @@ install(TARGETS Kelmar QnCore EXPORT QuarnTargets LIBRARY DESTINATION ${QUARN_LI
 install(TARGETS Zoetrix LIBRARY DESTINATION ${QUARN_PLUGIN_FOLDER})
 install(TARGETS quarn RUNTIME DESTINATION ${QUARN_BIN_FOLDER})
 install(DIRECTORY "${PROJECT_SOURCE_DIR}/kelmar" "${PROJECT_SOURCE_DIR}/sdk"
-    DESTINATION ${QUARN_INCLUDE_FOLDER} FILES_MATCHING PATTERN "*.h")
+    DESTINATION ${QUARN_INCLUDE_FOLDER} FILES_MATCHING PATTERN "*.h"
+    # What the toolkit's own sources share is not for plug-in authors.
+    PATTERN "KM_CaseFold.h" EXCLUDE
+    PATTERN "KM_LittleEndian.h" EXCLUDE
+    PATTERN "KM_SpanParameters.h" EXCLUDE)
 
 install(EXPORT QuarnTargets NAMESPACE Quarn:: DESTINATION ${package_folder})
 configure_package_config_file("${PROJECT_SOURCE_DIR}/cmake/QuarnConfig.cmake.in"

@@ -24,6 +24,11 @@ endforeach()
 if(EXISTS "${tree}/include/quarn/host")
     message(FATAL_ERROR "the installed headers contain the host's own")
 endif()
+foreach(internal IN ITEMS KM_CaseFold.h KM_LittleEndian.h KM_SpanParameters.h)
+    if(EXISTS "${tree}/include/quarn/kelmar/${internal}")
+        message(FATAL_ERROR "the installed headers contain the toolkit's own ${internal}")
+    endif()
+endforeach()
 
 run("configuring the example" ${CMAKE_COMMAND} -S "${SOURCE}/examples/plug-in" -B "${WORK}/hello"
     -G Ninja "-DCMAKE_PREFIX_PATH=${tree}" "-DCMAKE_CXX_COMPILER=${COMPILER}"
