@@ -1,6 +1,7 @@
 #include "host/app/Application.h"
 #include "host/commands/HostCommands.h"
 #include "host/document/Document.h"
+#include "host/prompt/NumberText.h"
 
 namespace quarn {
 
@@ -29,6 +30,11 @@ struct ObjectCounts {
     }
 };
 
+KM_wString sizeText(const KM_3dVector& size) {
+    return L"size " + numberText(size.x) + L" x " + numberText(size.y) + L" x " +
+           numberText(size.z) + L"\n";
+}
+
 KM_wString lineOf(const DocumentObject& object) {
     const KM_wString name = object.name.IsEmpty() ? KM_UuidToString(object.id) : object.name;
     KM_wString kind = object.kind();
@@ -53,6 +59,9 @@ CQuarnCommand::result runList(const CQuarnCommandContext& context) {
     for (const NamedView& view : document.namedViews())
         application.print((view.name + L"  named view\n").View());
     application.print(counts.text().View());
+    const KM_BoundingBox box = document.objects().visibleBox();
+    if (box.IsValid())
+        application.print(sizeText(box.Diagonal()).View());
     return CQuarnCommand::success;
 }
 

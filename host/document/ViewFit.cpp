@@ -15,7 +15,7 @@ constexpr double FILL = 0.95;
 
 /// The least distance of the camera from the nearest point, as a share of the objects' size: what
 /// is a line in the direction of view leaves the camera no other bound.
-constexpr double CLEARANCE_OF_SIZE = 0.02;
+constexpr double CLEARANCE_OF_SIZE = 0.005;
 
 constexpr double CHORD_TOLERANCE_OF_SIZE = 1e-4;
 

@@ -1,0 +1,96 @@
+#include "host/document/Document.h"
+#include "tests/host/app/TestCommand.h"
+#include "tests/host/document/DocumentFixtures.h"
+#include "tests/host/import/ModelFixtures.h"
+
+#include <gmock/gmock.h>
+
+namespace quarn::test {
+namespace {
+
+using testing::HasSubstr;
+
+class ModelCommandsTest : public HostTest {
+protected:
+    Document& document() { return Document::of(session.document()); }
+
+    CQuarnCommand::result runOn(const wchar_t* command, const std::filesystem::path& file) {
+        const KM_wString line =
+            KM_wString(command) + L" \"" + KM_wString::FromUtf8(file.string()) + L"\"";
+        return run(line);
+    }
+
+    TemporaryFolder folder;
+    std::filesystem::path triangle =
+        folder.write("my model.obj", "o Roof\nv 0 0 0\nv 1000 0 0\nv 0 1000 0\nf 1 2 3\n");
+};
+
+TEST_F(ModelCommandsTest, ImportAddsToTheOpenDocumentAndShowsTheModel) {
+    const unsigned int number = document().serialNumber();
+    ASSERT_EQ(runOn(L"_-Import", triangle), CQuarnCommand::success);
+    EXPECT_EQ(printed(), "my model.obj: 1 object with 1 triangle\n");
+    EXPECT_EQ(document().serialNumber(), number);
+    ASSERT_NE(document().objects().findByName(L"Roof"), nullptr);
+    EXPECT_EQ(document().activeView().viewport().TargetPoint(), KM_3dPoint(500, 500, 0));
+    EXPECT_GT(document().activeView().viewport().TargetDistance(), 1000.0);
+}
+
+TEST_F(ModelCommandsTest, ASecondImportLeavesTheCameraAlone) {
+    runOn(L"Import", triangle);
+    run(L"Camera Location 1,2,3 Target 0,0,0 _Enter");
+    ASSERT_EQ(runOn(L"Import", triangle), CQuarnCommand::success);
+    EXPECT_EQ(document().objects().objects().size(), 2U);
+    EXPECT_EQ(document().activeView().viewport().CameraLocation(), KM_3dPoint(1, 2, 3));
+}
+
+TEST_F(ModelCommandsTest, OpenMakesANewDocumentAndEmptiesTheRecord) {
+    RecordKeeper keeper;
+    keeper.record.SetFrameCount(3);
+    runOn(L"Import", triangle);
+    const unsigned int number = document().serialNumber();
+    ASSERT_EQ(runOn(L"Open", triangle), CQuarnCommand::success);
+    EXPECT_NE(document().serialNumber(), number);
+    EXPECT_EQ(document().objects().objects().size(), 1U);
+    EXPECT_EQ(keeper.record.FrameCount(), 100);
+    EXPECT_EQ(CQuarnDoc::FromRuntimeSerialNumber(number), nullptr);
+}
+
+TEST_F(ModelCommandsTest, AFileThatCannotBeReadLeavesTheDocument) {
+    runOn(L"Import", triangle);
+    front_end.clearPrinted();
+    const unsigned int number = document().serialNumber();
+    EXPECT_EQ(runOn(L"Open", folder.path() / "none.obj"), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("none.obj"));
+    EXPECT_EQ(runOn(L"Open", folder.write("bad.stl", "solid nothing\nendsolid\n")),
+              CQuarnCommand::failure);
+    EXPECT_EQ(runOn(L"Open", folder.path() / "house.quarn"), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("this version reads model files only"));
+    EXPECT_EQ(document().serialNumber(), number);
+    EXPECT_EQ(document().objects().objects().size(), 1U);
+}
+
+TEST_F(ModelCommandsTest, NewOpensAnEmptyDocument) {
+    runOn(L"Import", triangle);
+    ASSERT_EQ(run(L"New"), CQuarnCommand::success);
+    EXPECT_TRUE(document().objects().empty());
+    EXPECT_STREQ(document().activeView().name(), L"Perspective");
+}
+
+TEST_F(ModelCommandsTest, AMissingFileNameIsNamed) {
+    EXPECT_EQ(run(L"Import"), CQuarnCommand::cancel);
+    EXPECT_THAT(printed(), HasSubstr("Model file"));
+}
+
+TEST_F(ModelCommandsTest, ListShowsObjectsWithTheirKindAndCounts) {
+    runOn(L"Import", triangle);
+    front_end.clearPrinted();
+    document().objects().addPoint(L"Mark", {0, 0, 0}).visible = false;
+    ASSERT_EQ(run(L"List"), CQuarnCommand::success);
+    EXPECT_EQ(printed(), "Roof  mesh, 1 triangles\n"
+                         "Mark  point, hidden\n"
+                         "1 meshes with 1 triangles, 0 curves, 1 points; 1 hidden\n"
+                         "size 1000 x 1000 x 0\n");
+}
+
+} // namespace
+} // namespace quarn::test
