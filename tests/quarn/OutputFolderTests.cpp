@@ -106,7 +106,7 @@ TEST(FullDisk, PictureThatCannotBeWrittenIsCountedOutAndTheOthersStayWhole) {
     EXPECT_THAT(linesOf(ended.err), SizeIs(1)) << ended.err;
     EXPECT_EQ(framesTold(ended.err, 8), stopper);
     EXPECT_THAT(ended.err, HasSubstr("some"));
-    EXPECT_THAT(ended.err, HasSubstr("File too large"));
+    EXPECT_THAT(ended.err, HasSubstr("larger than is allowed"));
     EXPECT_EQ(picturesIn(studio / "some"), stopper);
     expectWholePicturesOnly(studio / "some");
     EXPECT_THAT(readFile(studio / "some/house.html"),
@@ -148,7 +148,7 @@ TEST(FullDisk, IsToldWithTheNumberOfPicturesThatFitted) {
     EXPECT_THAT(linesOf(ended.err), SizeIs(1)) << ended.err;
     EXPECT_EQ(framesTold(ended.err, 30), disk.isMounted() ? 4 : 0) << ended.err;
     EXPECT_THAT(ended.err,
-                HasSubstr(disk.isMounted() ? "No space left on device" : "File too large"));
+                HasSubstr(disk.isMounted() ? "the disk is full" : "larger than is allowed"));
     EXPECT_EQ(picturesIn(studio / "disk"), disk.isMounted() ? 4 : 0);
     expectWholePicturesOnly(studio / "disk");
 }
