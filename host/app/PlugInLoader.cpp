@@ -3,6 +3,7 @@
 #include "host/app/Application.h"
 #include "host/app/Border.h"
 #include "host/app/PlugInExports.h"
+#include "host/display/DisplayModeList.h"
 #include "sdk/vexui/VexUi.h"
 
 #include <algorithm>
@@ -178,6 +179,8 @@ PlugInLoad PlugInLoader::identify(Loaded& candidate, const Request& request) con
     return {};
 }
 
+/// Adds the plug-in's texts. They may name display modes in a language that the host has no table
+/// of; the plug-in then compares its texts with the modes' names, so the modes take them over.
 void PlugInLoader::loadTexts(const Loaded& candidate) {
     const std::filesystem::path name = candidate.file.stem();
     std::vector<std::filesystem::path> folders = {candidate.file.parent_path() / "locale" / name};
@@ -185,6 +188,7 @@ void PlugInLoader::loadTexts(const Loaded& candidate) {
         folders.push_back(host_folder.parent_path() / name);
     if (Result<void> texts = m_application.texts().load(candidate.file.string(), folders); !texts)
         m_application.tell(texts.message());
+    DisplayModeList::instance().localize();
 }
 
 PlugInLoad PlugInLoader::registerCommands(Loaded& candidate) {

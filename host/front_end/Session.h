@@ -17,7 +17,9 @@ namespace quarn {
 struct SessionOptions {
     /// Where plug-ins are looked for when they are needed, in this order.
     std::vector<std::filesystem::path> plug_in_folders;
-    /// Folders of the host's own string tables (`<language>.json`).
+    /// Folders of the host's own string tables (`<language>.json`). The tables of a plug-in
+    /// `Name.qnp` are looked for in `locale/Name` beside its file, then in `Name` beside these
+    /// folders.
     std::vector<std::filesystem::path> locale_folders;
     /// The user's language ("de", "ja"); empty takes it from the environment.
     std::string language;

@@ -77,7 +77,8 @@ protected:
     std::unique_ptr<quarn::PromptState> m_state;
 };
 
-/// Asks for one of several options; any other word is handed on as text (`string`).
+/// Asks for one of several options; any other word is handed on as text (`string`). A default that
+/// names an option picks it when Enter takes the default.
 class QNCORE_API CQuarnGetOption : public CQuarnGet {
 public:
     CQuarnGetOption();

@@ -6,7 +6,8 @@
 
 /// The base of every plug-in. A plug-in file has exactly one such object, a global one. Its
 /// constructor only announces it: the host looks at it after the file's version exports were
-/// checked, and forgets it when they are wrong.
+/// checked, and forgets it when they are wrong. No constructor of a global object of the file may
+/// throw: the linker ends the program then.
 ///
 /// A plug-in file exports `unsigned int QuarnPlugInSdkVersion()`,
 /// `unsigned int QuarnPlugInSdkServiceRelease()`, and the wide-string functions
