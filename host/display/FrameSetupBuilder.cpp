@@ -80,9 +80,11 @@ void setGround(FrameSetup& frame) {
     frame.ground_height = frame.scene_min[2] - 1e-3F * frame.scene_size;
     frame.ground_center[0] = 0.5F * (frame.scene_min[0] + frame.scene_max[0]);
     frame.ground_center[1] = 0.5F * (frame.scene_min[1] + frame.scene_max[1]);
-    frame.ground_fade_start = 1.2F * reach;
-    frame.ground_fade_end = 14.0F * reach;
-    set(frame.ground_albedo, {0.47F, 0.465F, 0.45F});
+    frame.ground_fade_start = 0.5F * reach;
+    frame.ground_fade_end = 5.0F * reach;
+    // Far ground lies in the haze of the horizon, so that both meet without a line.
+    std::copy_n(frame.sky_horizon, 3, frame.sky_nadir);
+    set(frame.ground_albedo, {0.56F, 0.55F, 0.53F});
 }
 
 void setStyle(FrameSetup& frame, SurfaceStyle style) {

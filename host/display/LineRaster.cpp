@@ -174,19 +174,15 @@ float Band::surfaceNearness(int x, int y) const {
                    static_cast<std::size_t>(column)];
 }
 
-/// A line on a surface is not hidden by it: the surface may rise by as much as it does from the
-/// pixel to the flatter one of its neighbours in each direction.
+/// A line on a surface is not hidden by it, nor is one that runs along its outline: the nearest
+/// point of the line may lie in the next pixel, so the farthest of the surfaces seen there counts.
 bool Band::isHidden(int x, int y, float nearness) const {
     if (!m_target.depth)
         return false;
-    const float here = surfaceNearness(x, y);
-    if (here <= nearness)
-        return false;
-    const float across = std::min(std::fabs(here - surfaceNearness(x - 1, y)),
-                                  std::fabs(here - surfaceNearness(x + 1, y)));
-    const float along = std::min(std::fabs(here - surfaceNearness(x, y - 1)),
-                                 std::fabs(here - surfaceNearness(x, y + 1)));
-    return nearness < here - 1.5F * (across + along) - 1e-3F * here;
+    const auto hides = [&](int column, int row) {
+        return nearness < (1.0F - 3e-4F) * surfaceNearness(column, row);
+    };
+    return hides(x, y) && hides(x - 1, y) && hides(x + 1, y) && hides(x, y - 1) && hides(x, y + 1);
 }
 
 void Band::blendPixel(std::uint32_t& pixel, float amount) const {

@@ -36,10 +36,9 @@ float cosine(float angle_deg) {
 }
 
 std::size_t placeHash(const KM_3fPoint& p) {
-    // Adding 0 makes +0 of -0, so that both are one place.
-    const std::uint64_t x = std::bit_cast<std::uint32_t>(p.x + 0.0F);
-    const std::uint64_t y = std::bit_cast<std::uint32_t>(p.y + 0.0F);
-    const std::uint64_t z = std::bit_cast<std::uint32_t>(p.z + 0.0F);
+    const std::uint64_t x = std::bit_cast<std::uint32_t>(p.x);
+    const std::uint64_t y = std::bit_cast<std::uint32_t>(p.y);
+    const std::uint64_t z = std::bit_cast<std::uint32_t>(p.z);
     std::uint64_t h = (x * 0x9E3779B97F4A7C15ULL) ^ (y * 0xC2B2AE3D27D4EB4FULL + (x << 31)) ^
                       (z * 0x165667B19E3779F9ULL);
     h ^= h >> 29;
@@ -47,14 +46,36 @@ std::size_t placeHash(const KM_3fPoint& p) {
     return static_cast<std::size_t>(h ^ (h >> 32));
 }
 
+/// Makes 0 of what rounding left of it, as at the poles of a computed sphere, and +0 of -0.
+class PlaceRounding {
+public:
+    explicit PlaceRounding(const std::vector<KM_3fPoint>& vertices) {
+        float largest = 0.0F;
+        for (const KM_3fPoint& p : vertices)
+            largest = std::max({largest, std::fabs(p.x), std::fabs(p.y), std::fabs(p.z)});
+        m_zero = 1e-7F * largest;
+    }
+    KM_3fPoint operator()(const KM_3fPoint& p) const {
+        const auto rounded = [this](float value) {
+            return std::fabs(value) <= m_zero ? 0.0F : value;
+        };
+        return {rounded(p.x), rounded(p.y), rounded(p.z)};
+    }
+
+private:
+    float m_zero = 0.0F;
+};
+
 /// For each vertex the first one at the same place.
 std::vector<std::uint32_t> weldedVertices(const std::vector<KM_3fPoint>& vertices) {
+    const PlaceRounding place(vertices);
     const std::size_t size = std::bit_ceil(2 * vertices.size() + 1);
     std::vector<std::uint32_t> table(size, no_vertex);
     std::vector<std::uint32_t> first(vertices.size());
     for (std::size_t i = 0; i < vertices.size(); ++i) {
-        std::size_t slot = placeHash(vertices[i]) & (size - 1);
-        while (table[slot] != no_vertex && !(vertices[table[slot]] == vertices[i]))
+        const KM_3fPoint here = place(vertices[i]);
+        std::size_t slot = placeHash(here) & (size - 1);
+        while (table[slot] != no_vertex && !(place(vertices[table[slot]]) == here))
             slot = (slot + 1) & (size - 1);
         if (table[slot] == no_vertex)
             table[slot] = static_cast<std::uint32_t>(i);
@@ -98,6 +119,8 @@ void forEachSide(const KM_Mesh& mesh, const std::vector<std::uint32_t>& welded,
         for (int side = 0; side < 3; ++side) {
             const std::uint32_t a = welded[mesh.m_F[t].vi[side]];
             const std::uint32_t b = welded[mesh.m_F[t].vi[(side + 1) % 3]];
+            if (a == b)
+                continue;
             const auto triangle = static_cast<std::uint32_t>(t);
             if (a < b)
                 function(a, b, triangle);

@@ -85,7 +85,7 @@ Sky duskSky() {
 
 Sky nightSky() {
     Sky sky;
-    sky.horizon = {0.060F, 0.080F, 0.140F};
+    sky.horizon = {0.070F, 0.095F, 0.165F};
     sky.zenith = {0.010F, 0.016F, 0.045F};
     sky.nadir = {0.020F, 0.024F, 0.035F};
     return sky;
@@ -116,9 +116,9 @@ struct TimeOfDay {
 
 AmbientLight skyLight(const TimeOfDay& time, const float* toward_sun) {
     const LinearColor above =
-        time.among({0.36F, 0.43F, 0.54F}, {0.26F, 0.27F, 0.36F}, {0.070F, 0.088F, 0.140F});
+        time.among({0.36F, 0.43F, 0.54F}, {0.31F, 0.32F, 0.41F}, {0.082F, 0.102F, 0.160F});
     const LinearColor below =
-        time.among({0.19F, 0.175F, 0.155F}, {0.12F, 0.10F, 0.09F}, {0.022F, 0.026F, 0.042F});
+        time.among({0.19F, 0.175F, 0.155F}, {0.15F, 0.13F, 0.12F}, {0.028F, 0.033F, 0.052F});
     AmbientLight light = hemisphere(above, below, world_up);
     brightenToward(light, toward_sun,
                    time.among({0.05F, 0.05F, 0.045F}, {0.10F, 0.06F, 0.03F}, {0, 0, 0}));
@@ -170,11 +170,11 @@ Lighting lightingWithoutSun(const CameraFrame& camera) {
 
 Lighting studioLighting(const CameraFrame& camera) {
     Lighting lighting;
-    lighting.ambient = hemisphere({0.40F, 0.41F, 0.43F}, {0.17F, 0.17F, 0.18F}, camera.y);
+    lighting.ambient = hemisphere({0.46F, 0.47F, 0.49F}, {0.24F, 0.24F, 0.25F}, camera.y);
     lighting.fixed.push_back(
-        lightFrom(worldDirection(camera, {-0.45, 0.65, 0.75}), {0.66F, 0.65F, 0.63F}, 0.0F));
+        lightFrom(worldDirection(camera, {-0.50, 0.62, 0.80}), {0.58F, 0.57F, 0.55F}, 0.0F));
     lighting.fixed.push_back(
-        lightFrom(worldDirection(camera, {0.85, -0.05, 0.45}), {0.13F, 0.135F, 0.15F}, 0.0F));
+        lightFrom(worldDirection(camera, {0.85, -0.05, 0.55}), {0.22F, 0.225F, 0.24F}, 0.0F));
     return lighting;
 }
 
@@ -194,7 +194,7 @@ Lighting skyLighting(std::span<const KM_Light> lights, bool casts_shadows,
     std::copy_n(toward, 3, lighting.sky.toward_sun);
     lighting.ambient = skyLight(time, toward);
     lighting.fixed.push_back(headLight(
-        camera, time.among({0.04F, 0.04F, 0.04F}, {0.06F, 0.06F, 0.06F}, {0.05F, 0.06F, 0.085F})));
+        camera, time.among({0.04F, 0.04F, 0.04F}, {0.06F, 0.06F, 0.06F}, {0.07F, 0.082F, 0.11F})));
     std::copy_if(suns.begin(), suns.end(), std::back_inserter(lighting.suns), isLit);
     return lighting;
 }

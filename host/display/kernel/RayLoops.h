@@ -115,7 +115,7 @@ inline void shadeLayers(const FrameSetup& frame, RayPacket& packet, SurfaceLanes
             packet.active.v[i] = packet.hit.v[i] && left.v[i] > 0.02F ? -1 : 0;
             const float reached = packet.rays.ray.tfar[i];
             packet.rays.ray.tnear[i] =
-                packet.active.v[i] ? reached * 1.000004F + 1e-6F * frame.scene_size : 0.0F;
+                packet.active.v[i] ? reached * 1.00002F + 1e-5F * frame.scene_size : 0.0F;
         }
         aim(frame, packet);
         intersect(frame, packet);
