@@ -1,7 +1,10 @@
 #include "host/app/Application.h"
 #include "host/commands/HostCommands.h"
+#include "host/commands/PointText.h"
 #include "host/document/Document.h"
 #include "host/prompt/NumberText.h"
+
+#include <set>
 
 namespace quarn {
 
@@ -11,6 +14,8 @@ namespace {
 struct ObjectCounts {
     int meshes = 0;
     long long triangles = 0;
+    long long vertices = 0;
+    std::set<const Material*> materials;
     int curves = 0;
     int points = 0;
     int hidden = 0;
@@ -18,6 +23,9 @@ struct ObjectCounts {
     void add(const DocumentObject& object) {
         meshes += object.mesh ? 1 : 0;
         triangles += object.mesh ? object.mesh->TriangleCount() : 0;
+        vertices += object.mesh ? object.mesh->VertexCount() : 0;
+        if (object.material)
+            materials.insert(object.material.get());
         curves += object.curve ? 1 : 0;
         points += object.point ? 1 : 0;
         hidden += object.visible ? 0 : 1;
@@ -25,14 +33,17 @@ struct ObjectCounts {
 
     KM_wString text() const {
         return KM_wString::FormatToString(
-            L"%d meshes with %lld triangles, %d curves, %d points; %d hidden\n", meshes, triangles,
-            curves, points, hidden);
+            L"%d meshes with %lld triangles and %lld vertices, %d materials, %d curves, %d points; "
+            L"%d hidden\n",
+            meshes, triangles, vertices, static_cast<int>(materials.size()), curves, points,
+            hidden);
     }
 };
 
-KM_wString sizeText(const KM_3dVector& size) {
-    return L"size " + numberText(size.x) + L" x " + numberText(size.y) + L" x " +
-           numberText(size.z) + L"\n";
+KM_wString sizeText(const KM_BoundingBox& box) {
+    const KM_3dVector size = box.Diagonal();
+    return L"from " + pointText(box.m_min) + L" to " + pointText(box.m_max) + L", size " +
+           numberText(size.x) + L" x " + numberText(size.y) + L" x " + numberText(size.z) + L"\n";
 }
 
 KM_wString lineOf(const DocumentObject& object) {
@@ -61,7 +72,7 @@ CQuarnCommand::result runList(const CQuarnCommandContext& context) {
     application.print(counts.text().View());
     const KM_BoundingBox box = document.objects().visibleBox();
     if (box.IsValid())
-        application.print(sizeText(box.Diagonal()).View());
+        application.print(sizeText(box).View());
     return CQuarnCommand::success;
 }
 
