@@ -24,7 +24,7 @@ protected:
 
 class DialogPlugIn : public PlugInFixture {
 protected:
-    DialogPlugIn() : PlugInFixture("ZEL_VexUI_double") {}
+    DialogPlugIn() : PlugInFixture("dialogs") {}
 };
 
 } // namespace

@@ -155,13 +155,10 @@ TEST(StringTables, TextsThatAreComparedAgree) {
 TEST(StringTables, NamesOfModesAreThoseOfTheHost) {
     const std::filesystem::path host_tables = source_folder / "host" / "locale";
     for (const char* language : languages) {
-        if (!std::filesystem::exists(host_tables / (std::string(language) + ".json")))
-            continue;
         const nlohmann::json ours = tableOf(language)["strings"];
         const nlohmann::json hosts = tableOf(host_tables, language)["strings"];
         for (const char* number : {"32015", "19746", "20120"})
-            if (hosts.contains(number))
-                EXPECT_EQ(hosts[number], ours[number]) << language << " " << number;
+            EXPECT_EQ(hosts[number], ours[number]) << language << " " << number;
     }
 }
 

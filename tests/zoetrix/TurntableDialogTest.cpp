@@ -20,7 +20,7 @@ protected:
 class NoDialogPlugIn : public PlugInFixture {};
 class PlugInWithoutDialogs : public PlugInFixture {
 protected:
-    PlugInWithoutDialogs() : PlugInFixture("ZEL_VexUI_bare") {}
+    PlugInWithoutDialogs() : PlugInFixture("no-dialogs") {}
 };
 class UnansweredDialog : public TurntableFixture {
 protected:
@@ -35,7 +35,7 @@ TEST_F(TurntableDialog, ShowsTheChoicesAndTheRecord) {
     record().SetCaptureMethod(L"XRay");
     record().SetViewportName(L"Right");
     ASSERT_EQ(CQuarnCommand::success, confirm());
-    EXPECT_EQ("turntable;frames=33;name=Walk;files=jpg,bmp,png,tga@3;"
+    EXPECT_EQ("frames=33;name=Walk;files=jpg,bmp,png,tga@3;"
               "captures=RenderFull,RenderPreview,Wireframe,Shaded,RenderedViewport,Translucent,"
               "XRay,Drawing,Clay@6;viewports=Top,Front,Right,Perspective@2;"
               "directions=Clockwise,AntiClockwise@0",

@@ -21,7 +21,7 @@ std::string shownInDialog();
 /// direction that a freshly loaded plug-in has.
 class TurntableFixture : public PlugInFixture {
 protected:
-    explicit TurntableFixture(const std::string& plug_ins = "ZEL_VexUI_double");
+    explicit TurntableFixture(const std::string& plug_ins = "dialogs");
 
     void SetUp() override;
 
