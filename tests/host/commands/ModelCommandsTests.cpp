@@ -89,7 +89,7 @@ TEST_F(ModelCommandsTest, ListShowsObjectsWithTheirKindAndCounts) {
     EXPECT_EQ(printed(),
               "Roof  mesh, 1 triangles\n"
               "Mark  point, hidden\n"
-              "1 meshes with 1 triangles and 3 vertices, 1 materials, 0 curves, 1 points; "
+              "1 meshes with 1 triangles and 3 vertices, 0 materials, 0 curves, 1 points; "
               "1 hidden\n"
               "from 0,0,0 to 1000,1000,0, size 1000 x 1000 x 0\n");
 }
