@@ -44,7 +44,7 @@ std::string fileReport(const std::filesystem::path& model,
     std::error_code error;
     const std::uintmax_t size = std::filesystem::file_size(model, error);
     return "name: " + model.filename().native() + "\nformat: " + formatName(model) +
-           "\nsize: " + (error ? error.message() : byteCountText(size)) +
+           "\nfile size: " + (error ? error.message() : byteCountText(size)) +
            "\nread in: " + millisecondsText(read_time) + "\n";
 }
 

@@ -9,8 +9,9 @@ namespace quarn::program {
 
 namespace {
 
-std::string withOneDecimal(double value) {
-    return numberText(std::round(value * 10.0) / 10.0);
+/// @param steps  how many steps there are from one whole number to the next
+std::string rounded(double value, double steps) {
+    return numberText(std::round(value * steps) / steps);
 }
 
 std::string longTimeText(long long seconds) {
@@ -62,14 +63,16 @@ std::string RecordingPace::text() const {
     const double pace = framesPerSecond();
     if (pace <= 0.0)
         return text;
-    text += ", " + withOneDecimal(pace) + " frames/s";
+    text += ", " + rounded(pace, 10.0) + " frames/s";
     if (m_total >= m_written)
         text += ", " + roughTimeText((m_total - m_written) / pace) + " left";
     return text;
 }
 
 std::string timeText(double seconds) {
-    return seconds < 59.95 ? withOneDecimal(seconds) + " s" : roughTimeText(seconds);
+    if (seconds >= 59.95)
+        return roughTimeText(seconds);
+    return rounded(seconds, seconds < 1.0 ? 100.0 : 10.0) + " s";
 }
 
 std::string roughTimeText(double seconds) {

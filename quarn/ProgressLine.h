@@ -48,9 +48,9 @@ private:
     Clock::time_point m_last_time;
 };
 
-/// A length of time in words: "4.1 s", "3 min 20 s", "2 h 5 min".
+/// A length of time in words: "0.25 s", "4.1 s", "3 min 20 s", "2 h 5 min".
 std::string timeText(double seconds);
-/// The same without tenths of seconds.
+/// The same in whole seconds, rounded up.
 std::string roughTimeText(double seconds);
 
 } // namespace quarn::program

@@ -48,7 +48,7 @@ TEST(RecordingPace, BeginsAnewWithANewRecording) {
 }
 
 TEST(TimeText, GrowsFromSecondsToHours) {
-    EXPECT_EQ(timeText(0.04), "0 s");
+    EXPECT_EQ(timeText(0.042), "0.04 s");
     EXPECT_EQ(timeText(4.14), "4.1 s");
     EXPECT_EQ(timeText(59.94), "59.9 s");
     EXPECT_EQ(timeText(59.96), "1 min 0 s");

@@ -183,7 +183,7 @@ TEST(Turntable, RecordsTheSameInALocaleWithADecimalComma) {
     const Ended ended = run(with_comma);
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     EXPECT_THAT(ended.out,
-                MatchesRegex("2 frames and comma/house\\.html in [0-9]+(\\.[0-9])? s\n"));
+                MatchesRegex("2 frames and comma/house\\.html in [0-9]+(\\.[0-9]+)? s\n"));
     EXPECT_EQ(readFile(studio / "out/house001.jpg"), readFile(studio / "comma/house001.jpg"));
 }
 
