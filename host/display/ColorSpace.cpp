@@ -1,7 +1,7 @@
 #include "host/display/ColorSpace.h"
 
 #include <algorithm>
-#include <bit>
+#include <array>
 #include <cmath>
 
 namespace quarn {
@@ -60,19 +60,6 @@ LinearColor linearFromColor(const KM_Color& color) {
 LinearColor sceneLightShownAs(const KM_Color& color) {
     const LinearColor shown = linearFromColor(color);
     return {sceneLightShownAs(shown.r), sceneLightShownAs(shown.g), sceneLightShownAs(shown.b)};
-}
-
-DisplayTable::DisplayTable() {
-    for (int i = 0; i < count; ++i) {
-        const auto lower = static_cast<std::uint32_t>(first + i) << shift;
-        const float middle = std::bit_cast<float>(lower | (1U << (shift - 1)));
-        m_entries[static_cast<std::size_t>(i)] = srgbByteFromLinear(toneMapped(middle));
-    }
-}
-
-const DisplayTable& displayTable() {
-    static const DisplayTable table;
-    return table;
 }
 
 } // namespace quarn

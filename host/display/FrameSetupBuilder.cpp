@@ -3,6 +3,7 @@
 #include "host/display/ColorSpace.h"
 #include "host/display/DisplayMode.h"
 #include "host/display/DisplayScene.h"
+#include "host/display/DisplayTable.h"
 #include "host/display/SkyModel.h"
 #include "kelmar/KM_Viewport.h"
 
@@ -26,8 +27,9 @@ void setPoint(float (&to)[3], const KM_3dPoint& point) {
 
 void setScene(FrameSetup& frame, const DisplayScene& scene) {
     frame.scene = scene.rays().root();
-    frame.sole_first_surface = scene.rays().soleFirstSurface();
-    frame.first_surfaces = scene.rays().firstSurfaces().data();
+    frame.sole_first_surface = static_cast<std::int32_t>(scene.rays().soleFirstSurface());
+    if (scene.rays().hasInstances())
+        frame.first_surfaces = scene.rays().firstSurfaces().data();
     frame.surfaces = scene.rays().surfaces().data();
     const KM_BoundingBox& box = scene.surfaceBox();
     if (!box.IsValid())

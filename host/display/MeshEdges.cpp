@@ -57,7 +57,7 @@ public:
     }
     KM_3fPoint operator()(const KM_3fPoint& p) const {
         const auto rounded = [this](float value) {
-            return std::fabs(value) <= m_zero ? 0.0F : value;
+            return std::fabs(value) > m_zero ? value : 0.0F;
         };
         return {rounded(p.x), rounded(p.y), rounded(p.z)};
     }

@@ -32,9 +32,10 @@ public:
     /// Makes the changes of visibility good.
     void commit();
 
-    /// What rays are shot into; null when nothing is visible. Where the library reports no
-    /// instance, the surface is soleFirstSurface() + geomID, else firstSurfaces()[instID] + geomID.
+    /// What rays are shot into; null when nothing is visible. The surface of a hit is
+    /// firstSurfaces()[instID] + geomID, or soleFirstSurface() + geomID without instances.
     RTCScene root() const;
+    bool hasInstances() const { return m_root && m_root == m_top.get(); }
     std::uint32_t soleFirstSurface() const { return m_sole_first_surface; }
     std::span<const std::uint32_t> firstSurfaces() const { return m_first_surfaces; }
     /// In the order of surface indices, which is not that of the members.

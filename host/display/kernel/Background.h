@@ -5,80 +5,54 @@
 namespace quarn {
 namespace {
 
-inline float power4(float a) {
-    return a * a * a * a;
+inline Lanes power4(const Lanes& a) {
+    const Lanes square = a * a;
+    return square * square;
 }
-inline float power8(float a) {
+inline Lanes power8(const Lanes& a) {
     return power4(a * a);
 }
 
-/// From the top of the picture to its bottom.
-inline void gradientColors(const FrameSetup& frame, const Lanes& y, LaneColors& color) {
-    const float scale = 1.0F / static_cast<float>(frame.height);
-    for (int i = 0; i < lane_count; ++i) {
-        const float s = clamped(y.v[i] * scale);
-        const float t = s * s * (3.0F - 2.0F * s);
-        const float* const top = frame.background_top;
-        const float* const bottom = frame.background_bottom;
-        color.r.v[i] = top[0] + t * (bottom[0] - top[0]);
-        color.g.v[i] = top[1] + t * (bottom[1] - top[1]);
-        color.b.v[i] = top[2] + t * (bottom[2] - top[2]);
-    }
+inline Lanes mixed(float from, float to, const Lanes& t) {
+    return Lanes(from) + t * (to - from);
 }
 
-/// Sine of the angle above the horizon under which each ray looks. In a parallel view all rays
-/// look the same way; there the picture's height stands in.
-inline void elevations(const FrameSetup& frame, const RayPacket& packet, Lanes& elevation) {
-    const RTCRay16& ray = packet.rays.ray;
-    const float tilt = frame.rays.parallel ? 0.5F / static_cast<float>(frame.height) : 0.0F;
-    const float middle = 0.5F * static_cast<float>(frame.height);
-    for (int i = 0; i < lane_count; ++i) {
-        const float x = ray.dir_x[i];
-        const float y = ray.dir_y[i];
-        const float z = ray.dir_z[i];
-        const float sine = z / squareRoot(x * x + y * y + z * z);
-        elevation.v[i] = sine + tilt * (middle - packet.y.v[i]);
-    }
+/// From the top of the picture to its bottom.
+inline LaneColors gradientColors(const FrameSetup& frame, const Lanes& y) {
+    const Lanes s = clamped(y * (1.0F / static_cast<float>(frame.height)));
+    const Lanes t = s * s * (Lanes(3.0F) - Lanes(2.0F) * s);
+    const float* const top = frame.background_top;
+    const float* const bottom = frame.background_bottom;
+    return {mixed(top[0], bottom[0], t), mixed(top[1], bottom[1], t), mixed(top[2], bottom[2], t)};
 }
 
 /// Zenith and horizon blend with the fourth power of what is missing to straight up, so that the
-/// sky is pale over a narrow band; around the sun there is a glow, and its disc.
-inline void skyColors(const FrameSetup& frame, const RayPacket& packet, LaneColors& color) {
-    const RTCRay16& ray = packet.rays.ray;
-    const float* const sun = frame.toward_sun;
-    Lanes elevation;
-    elevations(frame, packet, elevation);
-    for (int i = 0; i < lane_count; ++i) {
-        const float e = elevation.v[i];
-        const float up = 1.0F - power4(1.0F - clamped(e));
-        const float down = 1.0F - power4(power4(1.0F - clamped(-e)));
-        const float x = ray.dir_x[i];
-        const float y = ray.dir_y[i];
-        const float z = ray.dir_z[i];
-        const float toward =
-            (x * sun[0] + y * sun[1] + z * sun[2]) / squareRoot(x * x + y * y + z * z);
-        const float near_sun = clamped(toward);
-        const float glow =
-            (0.35F * power8(near_sun) + 0.65F * power8(power8(near_sun))) * (1.0F - down);
-        // The disc is drawn a little larger than the sun's half degree, with a soft border.
-        const float disc = clamped((toward - 0.99984F) * (1.0F / 0.00006F)) * (1.0F - down);
-        const auto blend = [&](int c) {
-            const float horizon = frame.sky_horizon[c];
-            return horizon + up * (frame.sky_zenith[c] - horizon) +
-                   down * (frame.sky_nadir[c] - horizon) + glow * frame.sky_glow[c] +
-                   disc * frame.sky_disc[c];
-        };
-        color.r.v[i] = blend(0);
-        color.g.v[i] = blend(1);
-        color.b.v[i] = blend(2);
-    }
+/// sky is pale over a narrow band; around the sun there is a glow, and its disc. In a parallel view
+/// all rays look the same way; there the place in the picture adds to their elevation.
+inline LaneColors skyColors(const FrameSetup& frame, const RayPacket& packet) {
+    const Lanes scale = Lanes(1.0F) / squareRoot(dot(packet.direction, packet.direction));
+    const float tilt = frame.rays.parallel ? 0.5F / static_cast<float>(frame.height) : 0.0F;
+    const float middle = 0.5F * static_cast<float>(frame.height);
+    const Lanes elevation = packet.direction.z * scale + (Lanes(middle) - packet.y) * tilt;
+    const Lanes up = Lanes(1.0F) - power4(Lanes(1.0F) - clamped(elevation));
+    const Lanes down = Lanes(1.0F) - power4(power4(Lanes(1.0F) - clamped(-elevation)));
+    const Lanes toward = dot(packet.direction, frame.toward_sun) * scale;
+    const Lanes near_sun = power8(clamped(toward));
+    const Lanes above = Lanes(1.0F) - down;
+    const Lanes glow = (near_sun * 0.35F + power8(near_sun) * 0.65F) * above;
+    // The disc is drawn a little larger than the sun's half degree, with a soft border.
+    const Lanes disc = clamped((toward - 0.99984F) * (1.0F / 0.00006F)) * above;
+    const auto blend = [&](int c) {
+        const float horizon = frame.sky_horizon[c];
+        return Lanes(horizon) + up * (frame.sky_zenith[c] - horizon) +
+               down * (frame.sky_nadir[c] - horizon) + glow * frame.sky_glow[c] +
+               disc * frame.sky_disc[c];
+    };
+    return {blend(0), blend(1), blend(2)};
 }
 
-inline void backgroundColors(const FrameSetup& frame, const RayPacket& packet, LaneColors& color) {
-    if (frame.has_sky)
-        skyColors(frame, packet, color);
-    else
-        gradientColors(frame, packet.y, color);
+inline LaneColors backgroundColors(const FrameSetup& frame, const RayPacket& packet) {
+    return frame.has_sky ? skyColors(frame, packet) : gradientColors(frame, packet.y);
 }
 
 } // namespace

@@ -38,8 +38,9 @@ struct FrameSetup {
     CameraRays rays;
 
     RTCScene scene = nullptr; ///< null: no surfaces
-    std::uint32_t sole_first_surface = 0;
+    /// By instance; null when the scene has none. Then the first surface is the sole one.
     const std::uint32_t* first_surfaces = nullptr;
+    std::int32_t sole_first_surface = 0;
     const RaySurface* surfaces = nullptr;
     float scene_min[3] = {0, 0, 0};
     float scene_max[3] = {0, 0, 0};
@@ -91,11 +92,11 @@ struct PixelBlock {
 
 /// Up to 16 places of the picture to look at, and what is seen there.
 struct SamplePacket {
+    alignas(64) float x[lane_count] = {}; ///< continuous pixels
+    alignas(64) float y[lane_count] = {};
+    alignas(64) std::uint32_t pixels[lane_count] = {};
+    alignas(64) std::uint32_t objects[lane_count] = {};
     int count = 0;
-    float x[lane_count]; ///< continuous pixels
-    float y[lane_count];
-    std::uint32_t pixels[lane_count];
-    std::uint32_t objects[lane_count];
 };
 
 /// The ray loops, compiled for one kind of processor. All give the same pixels.

@@ -11,6 +11,9 @@ struct RayPacket {
     Lanes y;
     LaneMask active;
     LaneMask hit;
+    LaneVectors origin;
+    LaneVectors direction;
+    Lanes distance; ///< to what the ray met, in lengths of the direction
     RTCRayHit16 rays;
 };
 
@@ -18,63 +21,64 @@ struct RayPacket {
 constexpr float no_distance = -1.0F;
 constexpr float unlimited = 1e30F;
 
-/// Sets what no ray changes on its way.
-inline void prepare(RayPacket& packet) {
-    for (int i = 0; i < lane_count; ++i) {
-        packet.rays.ray.time[i] = 0.0F;
-        packet.rays.ray.mask[i] = 0xFFFFFFFFU;
-        packet.rays.ray.flags[i] = 0;
-        packet.rays.ray.id[i] = 0;
-        packet.rays.ray.tnear[i] = 0.0F;
-    }
+inline void prepare(RTCRay16& ray) {
+    store(ray.tnear, 0.0F);
+    store(ray.time, 0.0F);
+    store(ray.mask, -1);
+    store(ray.id, 0);
+    store(ray.flags, 0);
+}
+
+inline void setOrigin(RTCRay16& ray, const LaneVectors& origin) {
+    store(ray.org_x, origin.x);
+    store(ray.org_y, origin.y);
+    store(ray.org_z, origin.z);
+}
+
+inline void setDirection(RTCRay16& ray, const LaneVectors& direction) {
+    store(ray.dir_x, direction.x);
+    store(ray.dir_y, direction.y);
+    store(ray.dir_z, direction.z);
+}
+
+/// start + x * dx + y * dy
+inline LaneVectors atPixels(const RayPacket& packet, const float (&start)[3], const float (&dx)[3],
+                            const float (&dy)[3]) {
+    return {packet.x * dx[0] + packet.y * dy[0] + start[0],
+            packet.x * dx[1] + packet.y * dy[1] + start[1],
+            packet.x * dx[2] + packet.y * dy[2] + start[2]};
 }
 
 inline void aim(const FrameSetup& frame, RayPacket& packet) {
     const CameraRays& c = frame.rays;
-    RTCRay16& ray = packet.rays.ray;
-    for (int i = 0; i < lane_count; ++i) {
-        const float x = packet.x.v[i];
-        const float y = packet.y.v[i];
-        ray.dir_x[i] = c.direction[0] + x * c.direction_dx[0] + y * c.direction_dy[0];
-        ray.dir_y[i] = c.direction[1] + x * c.direction_dx[1] + y * c.direction_dy[1];
-        ray.dir_z[i] = c.direction[2] + x * c.direction_dx[2] + y * c.direction_dy[2];
-        ray.tfar[i] = packet.active.v[i] ? unlimited : no_distance;
-        packet.rays.hit.geomID[i] = RTC_INVALID_GEOMETRY_ID;
-        packet.rays.hit.instID[0][i] = RTC_INVALID_GEOMETRY_ID;
-    }
-    for (int i = 0; i < lane_count; ++i) {
-        const float x = packet.x.v[i];
-        const float y = packet.y.v[i];
-        ray.org_x[i] = c.origin[0] + x * c.origin_dx[0] + y * c.origin_dy[0];
-        ray.org_y[i] = c.origin[1] + x * c.origin_dx[1] + y * c.origin_dy[1];
-        ray.org_z[i] = c.origin[2] + x * c.origin_dx[2] + y * c.origin_dy[2];
-    }
-}
-
-inline RTCIntersectContext coherentContext() {
-    RTCIntersectContext context;
-    rtcInitIntersectContext(&context);
-    context.flags = RTC_INTERSECT_CONTEXT_FLAG_COHERENT;
-    return context;
+    packet.direction = atPixels(packet, c.direction, c.direction_dx, c.direction_dy);
+    packet.origin = atPixels(packet, c.origin, c.origin_dx, c.origin_dy);
+    setOrigin(packet.rays.ray, packet.origin);
+    setDirection(packet.rays.ray, packet.direction);
 }
 
 /// Finds the nearest surface of each ray.
 inline void intersect(const FrameSetup& frame, RayPacket& packet) {
+    RTCRayHit16& rays = packet.rays;
+    constexpr auto nothing = static_cast<std::int32_t>(RTC_INVALID_GEOMETRY_ID);
+    store(rays.ray.tfar, select(packet.active, unlimited, no_distance));
+    store(rays.hit.geomID, nothing);
+    store(rays.hit.instID[0], nothing);
     if (frame.scene) {
-        RTCIntersectContext context = coherentContext();
-        rtcIntersect16(packet.active.v, frame.scene, &context, &packet.rays);
+        RTCIntersectContext context;
+        rtcInitIntersectContext(&context);
+        context.flags = RTC_INTERSECT_CONTEXT_FLAG_COHERENT;
+        rtcIntersect16(packet.active.data(), frame.scene, &context, &rays);
     }
-    for (int i = 0; i < lane_count; ++i)
-        packet.hit.v[i] = packet.rays.hit.geomID[i] != RTC_INVALID_GEOMETRY_ID ? -1 : 0;
+    packet.hit = load(rays.hit.geomID) != nothing;
+    packet.distance = load(rays.ray.tfar);
 }
 
 /// How near the hits are, in the measure of DepthImage.
-inline void nearnessOf(const FrameSetup& frame, const RayPacket& packet, Lanes& nearness) {
-    for (int i = 0; i < lane_count; ++i) {
-        const float t = packet.rays.ray.tfar[i];
-        const float near = frame.rays.parallel ? frame.rays.far_depth - t : 1.0F / t;
-        nearness.v[i] = packet.hit.v[i] ? near : 0.0F;
-    }
+inline Lanes nearnessOf(const FrameSetup& frame, const RayPacket& packet) {
+    const Lanes nearness = frame.rays.parallel ? Lanes(frame.rays.far_depth) - packet.distance
+                                               : Lanes(1.0F) / packet.distance;
+    return select(packet.hit, nearness, 0.0F);
 }
 
 } // namespace
