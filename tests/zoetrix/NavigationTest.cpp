@@ -75,6 +75,14 @@ TEST_F(Navigation, FrameOutOfRangeIsSteppedFromAsItIs) {
     EXPECT_EQ(29, shownFrame());
 }
 
+TEST_F(Navigation, StepFromANegativeFrameShowsAll) {
+    standAt(-5);
+    const KM_3dPoint before = view(L"Perspective").MainViewport().VP().CameraLocation();
+    ASSERT_EQ(CQuarnCommand::success, run(L"ViewPreviousFrame"));
+    EXPECT_TRUE(near(view(L"Perspective").MainViewport().VP().CameraLocation(), before, 0.0));
+    EXPECT_EQ(29, record().CurrentFrame());
+}
+
 TEST_F(Navigation, PlayingReturnsTheViewAndStoresTheLastFrame) {
     standAt(3);
     const KM_3dPoint before = view(L"Perspective").MainViewport().VP().CameraLocation();
