@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <iterator>
+#include <vector>
 
 namespace {
 
@@ -113,6 +114,36 @@ bool TakeTypedCaptureMethod(KM_3dmAnimationProperties& props, KM_wString text,
     return true;
 }
 
+/// The indices of the capture method prompt's options.
+struct CaptureMethodOptions {
+    int full;
+    int preview;
+    std::vector<int> modes; ///< in the order of the display modes
+};
+
+CaptureMethodOptions AddCaptureMethodOptions(CQuarnGetString& prompt,
+                                             const std::vector<DisplayModeChoice>& modes) {
+    CaptureMethodOptions options;
+    options.full = prompt.AddCommandOption(QnLocalizeCommandOptionName(L"RenderFull", 18437));
+    options.preview = prompt.AddCommandOption(QnLocalizeCommandOptionName(L"RenderPreview", 18438));
+    for (const DisplayModeChoice& mode : modes)
+        options.modes.push_back(
+            prompt.AddCommandOption(QnLocalizeCommandOptionName(mode.local_name, 0)));
+    return options;
+}
+
+void TakePickedCaptureMethod(KM_3dmAnimationProperties& props, int picked,
+                             const CaptureMethodOptions& options,
+                             const std::vector<DisplayModeChoice>& modes) {
+    if (picked == options.full)
+        return ChooseFullRender(props);
+    if (picked == options.preview)
+        return ChoosePreviewRender(props);
+    const auto found = std::ranges::find(options.modes, picked);
+    if (found != options.modes.end())
+        ChooseDisplayMode(props, modes[static_cast<std::size_t>(found - options.modes.begin())]);
+}
+
 int AskCaptureMethod(KM_3dmAnimationProperties& props, bool sun_filter) {
     const std::vector<DisplayModeChoice> modes = ListDisplayModes(sun_filter);
     if (!NormaliseCaptureMethod(props, modes))
@@ -123,30 +154,15 @@ int AskCaptureMethod(KM_3dmAnimationProperties& props, bool sun_filter) {
     prompt.SetCommandPrompt(QnLocalizeString(L"Frame capture method", 16716));
     prompt.SetDefaultString(props.CaptureMethod());
     prompt.AcceptNothing(true);
-    const int full = prompt.AddCommandOption(QnLocalizeCommandOptionName(L"RenderFull", 18437));
-    const int preview =
-        prompt.AddCommandOption(QnLocalizeCommandOptionName(L"RenderPreview", 18438));
-    std::vector<int> options;
-    for (const DisplayModeChoice& mode : modes)
-        options.push_back(prompt.AddCommandOption(QnLocalizeCommandOptionName(mode.local_name, 0)));
-
+    const CaptureMethodOptions options = AddCaptureMethodOptions(prompt, modes);
     const CQuarnGet::result answer = prompt.GetString();
     if (prompt.CommandResult() != CQuarnCommand::success)
         return EndWith(L"Failed to select capture method. Nothing done\n", 16717,
                        prompt.CommandResult());
-    if (answer == CQuarnGet::string)
-        return TakeTypedCaptureMethod(props, prompt.String(), modes) ? CQuarnCommand::success
-                                                                     : CQuarnCommand::failure;
-    const CQuarnCommandOption* picked = prompt.Option();
-    if (!picked)
-        return CQuarnCommand::success;
-    const int index = picked->m_option_index;
-    if (index == full)
-        ChooseFullRender(props);
-    else if (index == preview)
-        ChoosePreviewRender(props);
-    else if (const auto found = std::ranges::find(options, index); found != options.end())
-        ChooseDisplayMode(props, modes[static_cast<std::size_t>(found - options.begin())]);
+    if (answer == CQuarnGet::string && !TakeTypedCaptureMethod(props, prompt.String(), modes))
+        return CQuarnCommand::failure;
+    if (const CQuarnCommandOption* picked = prompt.Option())
+        TakePickedCaptureMethod(props, picked->m_option_index, options, modes);
     return CQuarnCommand::success;
 }
 
