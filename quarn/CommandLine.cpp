@@ -84,7 +84,7 @@ CLI::App& addTurntable(CLI::App& program, TurntableOptions& options) {
         "Angle of the camera above the model, -89 to 89")
         ->capture_default_str();
     add("--distance", options.distance_factor, "FACTOR",
-        "Camera distance times this: below 1 is nearer, above 1 farther");
+        "Camera distance times this: 0.01 to 1000, below 1 is nearer");
     add("--target", options.target, "X,Y,Z", "Point to turn about (default: the model's middle)");
     add("--name", options.name, "NAME", "Name of the animation (default: the model file's)");
     command.add_flag("--show-script", options.shows_script,

@@ -32,7 +32,7 @@ std::optional<Outcome> HostSession::loadAnimationPlugIn() {
 
 std::optional<Outcome> HostSession::run(const std::string& line) {
     if (isInterruptionRequested())
-        return stopped("Stopped before the first picture was recorded.");
+        return stopped("Stopped before anything was recorded.");
     m_front_end.forgetLastWords();
     const CQuarnCommand::result result = m_session.runCommand(KM_wString::FromUtf8(line).View());
     if (result == CQuarnCommand::success)

@@ -75,7 +75,7 @@ Outcome record(const TurntableRequest& request, const std::string& line, HostSes
     if (const auto refusal = whyFolderCannotBeUsed(request.folder))
         return Outcome::failure(*refusal);
     if (isInterruptionRequested())
-        return stopped("Stopped before the first frame was recorded.");
+        return stopped("Stopped before anything was recorded.");
     ConsoleFrontEnd& front_end = host.frontEnd();
     front_end.beginRecording(request.frames);
     const auto trouble = host.run(line);

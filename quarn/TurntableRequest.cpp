@@ -12,6 +12,8 @@ namespace {
 
 constexpr int LARGEST_SIZE_PX = 16384;
 constexpr double STEEPEST_ELEVATION_DEG = 89.0;
+constexpr double NEAREST_DISTANCE = 0.01; // as the command FitView takes them
+constexpr double FARTHEST_DISTANCE = 1000.0;
 
 std::string notBut(const std::string& word) {
     return ", not \"" + word + "\".";
@@ -98,8 +100,11 @@ private:
                    notBut(m_typed.elevation_deg));
         m_request.elevation_deg = elevation.value_or(0.0);
         m_request.distance_factor = realNumber(m_typed.distance_factor);
-        if (!m_typed.distance_factor.empty() && m_request.distance_factor.value_or(0.0) <= 0.0)
-            refuse("--distance must be a number above 0" + notBut(m_typed.distance_factor));
+        const double factor = m_request.distance_factor.value_or(0.0);
+        if (!m_typed.distance_factor.empty() &&
+            (factor < NEAREST_DISTANCE || factor > FARTHEST_DISTANCE))
+            refuse("--distance must be a number from 0.01 to 1000" +
+                   notBut(m_typed.distance_factor));
         m_request.target = triple(m_typed.target);
         if (!m_typed.target.empty() && !m_request.target)
             refuse("--target must be three numbers X,Y,Z without blanks" + notBut(m_typed.target));

@@ -142,8 +142,8 @@ TEST(Arguments, CameraValuesThatAreNoneAreRefused) {
     expectRefusal(wholeTurntable({"--elevation", "90"}), {"--elevation", "90"});
     expectRefusal(wholeTurntable({"--elevation", "high"}), {"--elevation", "high"});
     expectRefusal(wholeTurntable({"--elevation", "nan"}), {"--elevation", "nan"});
-    expectRefusal(wholeTurntable({"--distance", "0"}), {"--distance", "above 0"});
-    expectRefusal(wholeTurntable({"--distance", "-1"}), {"--distance", "above 0"});
+    expectRefusal(wholeTurntable({"--distance", "0"}), {"--distance", "from 0.01 to 1000"});
+    expectRefusal(wholeTurntable({"--distance", "1001"}), {"--distance", "1001"});
     expectRefusal(wholeTurntable({"--distance", "1,5"}), {"--distance", "1,5"});
     for (const char* target : {"1,2", "1,2,3,4", "1,2,x", "1;2;3", "inf,0,0", "1, 2,3"})
         expectRefusal(wholeTurntable({"--target", target}), {"--target", target});
