@@ -2,6 +2,8 @@
 
 #include "host/document/CameraMove.h"
 #include "host/document/ObjectTable.h"
+#include "host/document/Reach.h"
+#include "host/document/TurnProfile.h"
 
 #include <algorithm>
 #include <cmath>
@@ -9,9 +11,6 @@
 namespace quarn {
 
 namespace {
-
-/// How far out the farthest point comes, from the middle of the picture (0) to its border (1).
-constexpr double FILL = 0.95;
 
 /// The least distance of the camera from the nearest point, as a share of the objects' size: what
 /// is a line in the direction of view leaves the camera no other bound.
@@ -45,92 +44,6 @@ KM_BoundingBox visibleBox(const ObjectTable& objects) {
     return box;
 }
 
-/// Half the opening of the picture that may be filled: width and height, as tangents of the half
-/// angles in perspective.
-struct Opening {
-    double x;
-    double y;
-};
-
-Opening filledOpening(const KM_Viewport& viewport) {
-    double vertical = 0.0;
-    double horizontal = 0.0;
-    if (viewport.GetCameraHalfAngles(&vertical, &horizontal))
-        return {FILL * std::tan(horizontal), FILL * std::tan(vertical)};
-    return {FILL * viewport.FrustumAspect(), FILL};
-}
-
-/// How far points reach out as a camera sees them: sideways, up or down, toward it, and how far
-/// from the target it must stand for the picture to hold them.
-class Reach {
-public:
-    Reach(const KM_Viewport& camera, const KM_3dPoint& target)
-        : m_target(target), m_x(camera.CameraX()), m_y(camera.CameraY()), m_z(camera.CameraZ()),
-          m_opening(filledOpening(camera)),
-          m_cos_elevation(std::hypot(camera.CameraZ().x, camera.CameraZ().y)),
-          m_sin_elevation(camera.CameraZ().z) {}
-
-    /// A point that stands still.
-    void add(const KM_3dPoint& point) {
-        const KM_3dVector v = point - m_target;
-        const double x = std::abs(v * m_x);
-        const double y = std::abs(v * m_y);
-        const double z = v * m_z;
-        take(x, y, z, v.LengthSquared());
-        m_distance = std::max({m_distance, z + x / m_opening.x, z + y / m_opening.y});
-    }
-
-    /// A point that turns once about the vertical through the target. At the turning angle a it is
-    /// seen at x = r sin a, y = h cos e - r cos a sin e, z = h sin e + r cos a cos e, where r is
-    /// its distance from the vertical, h its height over the target and e the camera's elevation;
-    /// each bound below is the largest value over all a.
-    void addTurning(const KM_3dPoint& point) {
-        const KM_3dVector v = point - m_target;
-        const double r = std::hypot(v.x, v.y);
-        const double rise = v.z * m_cos_elevation;
-        const double toward = v.z * m_sin_elevation;
-        take(r, r * std::abs(m_sin_elevation) + std::abs(rise), r * m_cos_elevation + toward,
-             v.LengthSquared());
-        const double sideways = r * std::hypot(m_cos_elevation, 1.0 / m_opening.x) + toward;
-        const double slope = m_sin_elevation / m_opening.y;
-        const double up = r * std::abs(m_cos_elevation - slope) + toward + rise / m_opening.y;
-        const double down = r * std::abs(m_cos_elevation + slope) + toward - rise / m_opening.y;
-        m_distance = std::max({m_distance, sideways, up, down});
-    }
-
-    /// Distance of a perspective camera from the target at which the picture holds all points.
-    double distance(double clearance) const {
-        return std::max({m_distance, m_toward + clearance, clearance});
-    }
-    /// Half the height of a parallel picture that holds all points; 0 for a single one.
-    double parallelHalfHeight() const {
-        return std::max(m_sideways / m_opening.x, m_upright / m_opening.y);
-    }
-    /// Of the farthest point from the target.
-    double radius() const { return std::sqrt(m_radius_squared); }
-
-private:
-    void take(double sideways, double upright, double toward, double radius_squared) {
-        m_sideways = std::max(m_sideways, sideways);
-        m_upright = std::max(m_upright, upright);
-        m_toward = std::max(m_toward, toward);
-        m_radius_squared = std::max(m_radius_squared, radius_squared);
-    }
-
-    KM_3dPoint m_target;
-    KM_3dVector m_x;
-    KM_3dVector m_y;
-    KM_3dVector m_z;
-    Opening m_opening;
-    double m_cos_elevation;
-    double m_sin_elevation;
-    double m_sideways = 0.0;
-    double m_upright = 0.0;
-    double m_toward = -HUGE_VAL;
-    double m_distance = -HUGE_VAL;
-    double m_radius_squared = 0.0;
-};
-
 Reach measure(const KM_Viewport& camera, const KM_3dPoint& target, const ObjectTable& objects,
               bool turn) {
     Reach reach(camera, target);
@@ -139,6 +52,13 @@ Reach measure(const KM_Viewport& camera, const KM_3dPoint& target, const ObjectT
     else
         visitVisiblePoints(objects, [&](const KM_3dPoint& point) { reach.add(point); });
     return reach;
+}
+
+KM_3dPoint middleOfTurn(const KM_Viewport& camera, const KM_3dPoint& target,
+                        const ObjectTable& objects, const KM_BoundingBox& box) {
+    TurnProfile profile(target, box.m_min.z, box.m_max.z);
+    visitVisiblePoints(objects, [&](const KM_3dPoint& point) { profile.add(point); });
+    return profile.middle(camera);
 }
 
 /// Puts the camera at a distance from the target, along its present direction.
@@ -189,13 +109,17 @@ Result<KM_Viewport> fitViewport(const KM_Viewport& viewport, const ObjectTable& 
         return Error{"There is nothing visible to fit into the view. Import a model or show an "
                      "object first."};
     const bool keeps_target = fit.keep_target && viewport.TargetPoint().IsValid();
-    const KM_3dPoint target = keeps_target ? viewport.TargetPoint() : box.Center();
+    KM_3dPoint target = keeps_target ? viewport.TargetPoint() : box.Center();
     const double size = box.Diagonal().Length();
     // A single point has no size; any distance shows it.
     const double clearance = size > 0.0 ? CLEARANCE_OF_SIZE * size : 1.0;
 
     KM_Viewport fitted = viewport;
-    const bool is_placed = placeCamera(fitted, target, safeDistance(target, size));
+    bool is_placed = placeCamera(fitted, target, safeDistance(target, size));
+    if (fit.turn && !keeps_target && fitted.IsPerspectiveProjection()) {
+        target = middleOfTurn(fitted, target, objects, box);
+        is_placed = is_placed && placeCamera(fitted, target, safeDistance(target, size));
+    }
     const Reach reach = measure(fitted, target, objects, fit.turn);
     const auto fit_camera = fitted.IsPerspectiveProjection() ? fitPerspective : fitParallel;
     if (!is_placed || !fit_camera(fitted, reach, target, clearance, fit.distance))

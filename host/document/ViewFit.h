@@ -11,7 +11,8 @@ class ObjectTable;
 struct ViewFit {
     /// Fit for every direction of a full turn about the vertical through the target.
     bool turn = false;
-    /// Keep the viewport's target point; else the middle of the visible objects' box becomes it.
+    /// Keep the viewport's target point; else the middle of the visible objects' box becomes it,
+    /// for a turn in perspective raised or lowered so that the picture is filled evenly.
     bool keep_target = false;
     /// Distance of the camera from the target as a multiple of the fitted one, above 0; in a
     /// parallel projection the extent of the picture instead.

@@ -59,8 +59,11 @@ TEST_F(ViewCommandsTest, PointsAreReadWhateverTheLocale) {
 
 TEST_F(ViewCommandsTest, FitViewFitsTheActiveView) {
     addBox(document(), {0, 0, 0}, {10, 20, 30});
-    ASSERT_EQ(run(L"_-FitView _Turn=Yes _Enter"), CQuarnCommand::success);
+    ASSERT_EQ(run(L"_-FitView _Enter"), CQuarnCommand::success);
     EXPECT_EQ(viewport().TargetPoint(), KM_3dPoint(5, 10, 15));
+    ASSERT_EQ(run(L"_-FitView _Turn=Yes _Enter"), CQuarnCommand::success);
+    EXPECT_EQ(viewport().TargetPoint().x, 5.0);
+    EXPECT_EQ(viewport().TargetPoint().y, 10.0);
     const double once = viewport().TargetDistance();
     ASSERT_EQ(run(L"FitView Turn=Yes Distance 2 _Enter"), CQuarnCommand::success);
     EXPECT_NEAR(viewport().TargetDistance() / once, 2.0, 1e-9);

@@ -13,6 +13,8 @@ constexpr int HEIGHT = 720;
 /// How far out of the middle of the picture a document's corners are seen: 1 is its border.
 struct Extent {
     double farthest = 0.0;
+    double top = 1.0;     ///< highest place, -1 being the upper border
+    double bottom = -1.0; ///< lowest place, 1 being the lower border
     bool all_in_front = true;
 
     void add(const KM_Viewport& viewport, const Document& document) {
@@ -30,8 +32,10 @@ struct Extent {
         double depth = 0.0;
         const bool is_seen = viewport.WorldToScreen(point, &x, &y, &depth);
         all_in_front = all_in_front && is_seen && depth > 0.0;
-        farthest =
-            std::max({farthest, std::abs(2.0 * x / WIDTH - 1.0), std::abs(2.0 * y / HEIGHT - 1.0)});
+        const double down = 2.0 * y / HEIGHT - 1.0;
+        farthest = std::max({farthest, std::abs(2.0 * x / WIDTH - 1.0), std::abs(down)});
+        top = std::min(top, down);
+        bottom = std::max(bottom, down);
     }
 };
 
@@ -115,10 +119,31 @@ TEST_P(ViewFitTest, AParallelTurnStaysInTheFrameAndUsesIt) {
     EXPECT_GE(extent.farthest, 0.9);
 }
 
-TEST_P(ViewFitTest, KeepsTheDirectionAndTakesTheMiddleAsTarget) {
+TEST_P(ViewFitTest, ATurnFillsThePictureAsFarUpAsDown) {
+    for (const double elevation : {0.0, 20.0, 50.0}) {
+        look(-60.0, elevation);
+        const KM_Viewport fitted = fit({.turn = true});
+        Extent extent;
+        for (int frame = 0; frame < 360; ++frame)
+            extent.add(turned(fitted, frame * KM_PI / 180.0), document);
+        EXPECT_NEAR(extent.top, -extent.bottom, 0.002) << elevation;
+    }
+}
+
+TEST_P(ViewFitTest, ATurnGoesAboutTheVerticalThroughTheMiddle) {
     look(30.0, 25.0);
     const KM_3dVector before = view.viewport().CameraZ();
     const KM_Viewport fitted = fit({.turn = true});
+    EXPECT_NEAR((fitted.CameraZ() - before).Length(), 0.0, 1e-9);
+    const KM_3dPoint middle = document.objects().visibleBox().Center();
+    EXPECT_EQ(fitted.TargetPoint().x, middle.x);
+    EXPECT_EQ(fitted.TargetPoint().y, middle.y);
+}
+
+TEST_P(ViewFitTest, KeepsTheDirectionAndTakesTheMiddleAsTarget) {
+    look(30.0, 25.0);
+    const KM_3dVector before = view.viewport().CameraZ();
+    const KM_Viewport fitted = fit({});
     EXPECT_NEAR((fitted.CameraZ() - before).Length(), 0.0, 1e-9);
     const KM_3dPoint middle = document.objects().visibleBox().Center();
     EXPECT_EQ(fitted.TargetPoint(), middle);
