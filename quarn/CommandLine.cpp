@@ -86,6 +86,10 @@ CLI::App& addTurntable(CLI::App& program, TurntableOptions& options) {
     add("--distance", options.distance_factor, "FACTOR",
         "Camera distance times this: 0.01 to 1000, below 1 is nearer");
     add("--target", options.target, "X,Y,Z", "Point to turn about (default: the model's middle)");
+    command.add_option("--hide", options.hidden, "Leave out this object; may be given again")
+        ->type_name("NAME")
+        ->expected(1)
+        ->take_all();
     add("--name", options.name, "NAME", "Name of the animation (default: the model file's)");
     command.add_flag("--show-script", options.shows_script,
                      "Print the host commands that would be run, and run nothing");

@@ -5,6 +5,7 @@
 #include <filesystem>
 #include <string>
 #include <variant>
+#include <vector>
 
 namespace quarn::program {
 
@@ -26,6 +27,7 @@ struct TurntableOptions {
     std::string elevation_deg = "22";
     std::string distance_factor;
     std::string target;
+    std::vector<std::string> hidden; ///< names of objects
     std::string name;
     bool was_name_given = false;
     bool shows_script = false;

@@ -33,6 +33,7 @@ public:
         checkFormat();
         checkDirection();
         checkCamera();
+        checkHidden();
         if (m_mistake)
             return Outcome::misuse(*m_mistake);
         return m_request;
@@ -108,6 +109,12 @@ private:
         m_request.target = triple(m_typed.target);
         if (!m_typed.target.empty() && !m_request.target)
             refuse("--target must be three numbers X,Y,Z without blanks" + notBut(m_typed.target));
+    }
+
+    void checkHidden() {
+        m_request.hidden = m_typed.hidden;
+        for (const std::string& name : m_request.hidden)
+            refuse(whyPathIsRefused("the name of --hide", name));
     }
 
     const TurntableOptions& m_typed;

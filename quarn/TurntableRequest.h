@@ -7,6 +7,7 @@
 #include <optional>
 #include <string>
 #include <variant>
+#include <vector>
 
 namespace quarn::program {
 
@@ -23,6 +24,7 @@ struct TurntableRequest {
     double elevation_deg; ///< of the camera above the horizon through its target
     std::optional<double> distance_factor;
     std::optional<Triple> target;
+    std::vector<std::string> hidden; ///< names of objects; UTF-8
 };
 
 /// Checks what was typed, before anything runs.

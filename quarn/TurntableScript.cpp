@@ -52,15 +52,18 @@ std::string setTurntable(const TurntableRequest& request) {
 
 TurntableScript composeTurntable(const TurntableRequest& request) {
     TurntableScript script;
-    script.set_up = {
-        "_-Import " + quotedPath(request.model),
-        "_-ViewportSize " + std::to_string(request.size.width_px) + " " +
-            std::to_string(request.size.height_px),
-        camera(request),
-        fitView(request),
-        "_-AnimationName \"" + request.name + "\"",
-        setTurntable(request),
-    };
+    script.set_up = {"_-Import " + quotedPath(request.model)};
+    for (const std::string& name : request.hidden)
+        script.set_up.push_back("_-Hide \"" + name + "\"");
+    for (const std::string& line : {
+             "_-ViewportSize " + std::to_string(request.size.width_px) + " " +
+                 std::to_string(request.size.height_px),
+             camera(request),
+             fitView(request),
+             "_-AnimationName \"" + request.name + "\"",
+             setTurntable(request),
+         })
+        script.set_up.push_back(line);
     script.recording = "_-RecordAnimation _TargetFolder " + quotedPath(request.folder) + " _Enter";
     return script;
 }

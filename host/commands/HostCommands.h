@@ -28,10 +28,12 @@ CQuarnCommand::result runAnimationName(const CQuarnCommandContext& context);
 CQuarnCommand::result runCamera(const CQuarnCommandContext& context);
 CQuarnCommand::result runDisplayMode(const CQuarnCommandContext& context);
 CQuarnCommand::result runFitView(const CQuarnCommandContext& context);
+CQuarnCommand::result runHide(const CQuarnCommandContext& context);
 CQuarnCommand::result runImport(const CQuarnCommandContext& context);
 CQuarnCommand::result runList(const CQuarnCommandContext& context);
 CQuarnCommand::result runNew(const CQuarnCommandContext& context);
 CQuarnCommand::result runOpen(const CQuarnCommandContext& context);
+CQuarnCommand::result runShow(const CQuarnCommandContext& context);
 CQuarnCommand::result runStandardView(const CQuarnCommandContext& context);
 CQuarnCommand::result runViewportSize(const CQuarnCommandContext& context);
 

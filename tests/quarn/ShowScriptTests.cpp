@@ -65,6 +65,14 @@ TEST(ShowScript, IsTheWholeScriptOfTheDefaults) {
     EXPECT_EQ(lines[7], "_-RecordAnimation _TargetFolder \"out/house\" _Enter");
 }
 
+TEST(ShowScript, HidesObjectsBeforeTheModelIsFitted) {
+    const auto lines = scriptWith({"--hide", "Walk", "--hide", "North gate"});
+    ASSERT_THAT(lines, SizeIs(10));
+    EXPECT_EQ(lines[1], "_-Hide \"Walk\"");
+    EXPECT_EQ(lines[2], "_-Hide \"North gate\"");
+    EXPECT_EQ(lines[5], "_-FitView _Turn=Yes _Enter");
+}
+
 TEST(ShowScript, TakesEveryOption) {
     const auto lines =
         scriptOf({"house.obj", "--frames", "36", "--out", "my out", "--size", "640x480", "--mode",

@@ -1,0 +1,50 @@
+#include "tests/host/app/TestCommand.h"
+#include "tests/host/document/DocumentFixtures.h"
+
+#include <gmock/gmock.h>
+
+namespace quarn::test {
+namespace {
+
+using testing::HasSubstr;
+
+class VisibilityCommandsTest : public HostTest {
+protected:
+    VisibilityCommandsTest() { m_id = document().objects().addPoint(L"Tower", {0, 0, 0}).id; }
+
+    Document& document() { return Document::of(session.document()); }
+    bool isVisible() { return document().objects().find(m_id)->visible; }
+
+    KM_UUID m_id = KM_nil_uuid;
+};
+
+TEST_F(VisibilityCommandsTest, HideAndShowTakeAName) {
+    document().objects().addPoint(L"North gate", {1, 2, 3});
+    DocumentObject& gate = *document().objects().findByName(L"North gate");
+    ASSERT_EQ(run(L"_-Hide \"north GATE\""), CQuarnCommand::success);
+    EXPECT_FALSE(gate.visible);
+    EXPECT_TRUE(isVisible());
+    ASSERT_EQ(run(L"_-Show \"North gate\""), CQuarnCommand::success);
+    EXPECT_TRUE(gate.visible);
+}
+
+TEST_F(VisibilityCommandsTest, HideTakesAnId) {
+    ASSERT_EQ(run(L"_-Hide " + KM_UuidToString(m_id)), CQuarnCommand::success);
+    EXPECT_FALSE(isVisible());
+}
+
+TEST_F(VisibilityCommandsTest, HidingWhatIsHiddenSucceeds) {
+    const KM_wString id = KM_UuidToString(m_id);
+    ASSERT_EQ(run(L"_-Hide " + id), CQuarnCommand::success);
+    EXPECT_EQ(run(L"_-Hide " + id), CQuarnCommand::success);
+    EXPECT_FALSE(isVisible());
+}
+
+TEST_F(VisibilityCommandsTest, AnUnknownNameIsToldAndNothingChanges) {
+    EXPECT_EQ(run(L"_-Hide Nobody"), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("There is no object \"Nobody\". List shows the names."));
+    EXPECT_TRUE(isVisible());
+}
+
+} // namespace
+} // namespace quarn::test
