@@ -6,7 +6,6 @@
 #include <tbb/parallel_for.h>
 
 #include <algorithm>
-#include <cstdlib>
 #include <span>
 
 namespace quarn {
@@ -56,16 +55,22 @@ struct LinearSum {
     }
 };
 
-/// 1 where two pixels differ visibly. Written so that the compiler turns a row into vectors.
-std::uint8_t differs(std::uint32_t a, std::uint32_t b, std::uint32_t object_a,
-                     std::uint32_t object_b) {
-    const auto distance = [a, b](int shift) {
-        return std::abs(static_cast<int>(a >> shift & 255U) - static_cast<int>(b >> shift & 255U));
-    };
-    const bool color = (distance(0) > EdgePixels::color_threshold) |
-                       (distance(8) > EdgePixels::color_threshold) |
-                       (distance(16) > EdgePixels::color_threshold);
-    return static_cast<std::uint8_t>(color | (object_a != object_b));
+/// Marks the pixels of one row that differ visibly from those of another. Colours are compared
+/// byte by byte, which the compiler turns into vectors.
+void markSteps(const std::uint32_t* pixels, const std::uint32_t* other,
+               const std::uint32_t* objects, const std::uint32_t* other_objects, std::size_t count,
+               std::uint32_t* marks) {
+    const auto* const a = reinterpret_cast<const std::uint8_t*>(pixels);
+    const auto* const b = reinterpret_cast<const std::uint8_t*>(other);
+    auto* const mark = reinterpret_cast<std::uint8_t*>(marks);
+    for (std::size_t i = 0; i < 4 * count; ++i) {
+        const std::uint8_t larger = std::max(a[i], b[i]);
+        const std::uint8_t smaller = std::min(a[i], b[i]);
+        const auto step = static_cast<std::uint8_t>(larger - smaller);
+        mark[i] |= step > EdgePixels::color_threshold ? std::uint8_t{1} : std::uint8_t{0};
+    }
+    for (std::size_t i = 0; i < count; ++i)
+        marks[i] |= objects[i] ^ other_objects[i];
 }
 
 /// A single ray may slip through between two triangles. All others agreeing on another object,
@@ -134,23 +139,16 @@ void EdgePixels::findRow(const FrameSetup& frame, int row, Band& band) {
     const std::size_t start = static_cast<std::size_t>(row) * width;
     const std::uint32_t* const pixels = frame.pixels + start;
     const std::uint32_t* const objects = frame.objects + start;
-    std::vector<std::uint8_t>& edge = band.row_marks;
-    edge.assign(width, 0);
-    for (std::size_t x = 0; x + 1 < width; ++x) {
-        const std::uint8_t step = differs(pixels[x], pixels[x + 1], objects[x], objects[x + 1]);
-        edge[x] |= step;
-        edge[x + 1] |= step;
-    }
-    const auto compareRow = [&](const std::uint32_t* other, const std::uint32_t* other_objects) {
-        for (std::size_t x = 0; x < width; ++x)
-            edge[x] |= differs(pixels[x], other[x], objects[x], other_objects[x]);
-    };
+    band.marks.assign(width, 0);
+    std::uint32_t* const marks = band.marks.data();
+    markSteps(pixels, pixels + 1, objects, objects + 1, width - 1, marks);
+    markSteps(pixels + 1, pixels, objects + 1, objects, width - 1, marks + 1);
     if (row > 0)
-        compareRow(pixels - width, objects - width);
+        markSteps(pixels, pixels - width, objects, objects - width, width, marks);
     if (row + 1 < frame.height)
-        compareRow(pixels + width, objects + width);
+        markSteps(pixels, pixels + width, objects, objects + width, width, marks);
     for (std::size_t x = 0; x < width; ++x)
-        if (edge[x])
+        if (marks[x])
             band.pixels.push_back(static_cast<std::uint32_t>(start + x));
 }
 

@@ -27,8 +27,8 @@ public:
 private:
     /// Some rows of the picture; one list each, so that the order does not depend on threads.
     struct Band {
-        std::vector<std::uint32_t> pixels;   ///< offsets of the edge pixels
-        std::vector<std::uint8_t> row_marks; ///< 1 where the row at hand has an edge
+        std::vector<std::uint32_t> pixels; ///< offsets of the edge pixels
+        std::vector<std::uint32_t> marks;  ///< not 0 where the row at hand has an edge
     };
     static void findRow(const FrameSetup& frame, int row, Band& band);
 

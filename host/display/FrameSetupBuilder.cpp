@@ -69,8 +69,8 @@ void setLighting(FrameSetup& frame, const Lighting& lighting) {
     std::copy_n(lighting.sky.toward_sun, 3, frame.toward_sun);
 }
 
-/// The ground lies a little below the lowest point, so that it never flickers through a floor of
-/// the model's own.
+/// The ground lies under the lowest point. Rays look for it only where they met no surface, so it
+/// never flickers through a floor of the model's own.
 void setGround(FrameSetup& frame) {
     if (!frame.scene)
         return;
@@ -79,14 +79,14 @@ void setGround(FrameSetup& frame) {
     const float height = frame.scene_max[2] - frame.scene_min[2];
     const float reach = std::max({width, depth, height});
     frame.has_ground = true;
-    frame.ground_height = frame.scene_min[2] - 1e-3F * frame.scene_size;
+    frame.ground_height = frame.scene_min[2] - 1e-5F * frame.scene_size;
     frame.ground_center[0] = 0.5F * (frame.scene_min[0] + frame.scene_max[0]);
     frame.ground_center[1] = 0.5F * (frame.scene_min[1] + frame.scene_max[1]);
     frame.ground_fade_start = 0.5F * reach;
     frame.ground_fade_end = 5.0F * reach;
     // Far ground lies in the haze of the horizon, so that both meet without a line.
     std::copy_n(frame.sky_horizon, 3, frame.sky_nadir);
-    set(frame.ground_albedo, {0.56F, 0.55F, 0.53F});
+    set(frame.ground_albedo, {0.46F, 0.45F, 0.425F});
 }
 
 void setStyle(FrameSetup& frame, SurfaceStyle style) {

@@ -18,8 +18,8 @@ namespace {
 constexpr std::size_t lines_per_job = 8192;
 
 /// The smooth edges of a mesh fade out where they stand closer than this, in pixels.
-constexpr double sparse_px = 9.0;
-constexpr double dense_px = 2.0;
+constexpr double sparse_px = 10.0;
+constexpr double dense_px = 3.0;
 constexpr float smooth_edge_opacity = 0.42F;
 
 bool wantsEdges(const DisplayModeAttributes& mode) {
@@ -115,7 +115,7 @@ void LineDrawing::listMeshes(const DisplayScene& scene, const CameraRays& rays,
         const std::size_t smooth_count = object.mesh->edges().smooth().size();
         const LineStyle faint{mode.edge_color, smoothOpacity(*object.mesh, rays),
                               mode.edge_width_px};
-        if (mode.draws_smooth_edges && faint.opacity > 0.02F)
+        if (mode.draws_smooth_edges && faint.opacity > 0.03F)
             list(Source::smooth_edges, i, smooth_count, faint);
         if (mode.draws_edges)
             list(Source::features, i, object.mesh->edges().features().size(), clear);
