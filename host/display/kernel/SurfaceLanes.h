@@ -46,7 +46,7 @@ inline LaneVectors unpacked(const LaneInts& packed) {
 inline LaneVectors smoothNormals(const RaySurface& surface, const RayPacket& packet,
                                  const LaneMask& mask, const LaneVectors& face) {
     const RTCHit16& hit = packet.rays.hit;
-    const LaneInts first = select(mask, load(hit.primID) * LaneInts(3), LaneInts(0));
+    const LaneInts first = select(mask, load(hit.primID), LaneInts(0)) * LaneInts(3);
     const LaneVectors a = unpacked(gathered(surface.corner_normals, first));
     const LaneVectors b = unpacked(gathered(surface.corner_normals + 1, first));
     const LaneVectors c = unpacked(gathered(surface.corner_normals + 2, first));
