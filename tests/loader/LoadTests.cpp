@@ -1,4 +1,5 @@
 #include "tests/loader/LoaderTest.h"
+#include "tests/support/TempFolder.h"
 
 #include <fstream>
 
@@ -69,7 +70,8 @@ TEST_F(LoaderTest, AMissingFileIsTold) {
 }
 
 TEST_F(LoaderTest, ATextFileIsNoLibrary) {
-    const fs::path file = fs::path(testing::TempDir()) / "text.qnp";
+    const TempFolder folder;
+    const fs::path file = folder / "text.qnp";
     std::ofstream(file) << "I am a text.\n";
     const PlugInLoad loaded = session->loadPlugIn(file);
     EXPECT_EQ(loaded.outcome, Outcome::not_a_library);
@@ -159,7 +161,7 @@ TEST_F(LoaderTest, WhatAPlugInThrowsInItsCommandsAndAtItsEndStopsAtTheBorder) {
 // ---- Texts
 
 TEST_F(LoaderTest, APlugInsStringTableStandsBesideTheHosts) {
-    const fs::path tables = fs::path(testing::TempDir()) / "loader_locale";
+    const TempFolder tables;
     fs::create_directories(tables / "host");
     fs::create_directories(tables / "good");
     std::ofstream(tables / "good" / "de.json") << R"({"strings": {"7": "Ich gehöre "}})";
@@ -170,7 +172,7 @@ TEST_F(LoaderTest, APlugInsStringTableStandsBesideTheHosts) {
 }
 
 TEST_F(LoaderTest, AMalformedTableIsToldAndThePlugInLoads) {
-    const fs::path tables = fs::path(testing::TempDir()) / "loader_bad_locale";
+    const TempFolder tables;
     fs::create_directories(tables / "good");
     std::ofstream(tables / "good" / "de.json") << "{";
     start({{}, {tables / "host"}, "de", {}});

@@ -1,6 +1,6 @@
 #include "tests/quarn/Pictures.h"
 
-#include "tests/quarn/TempFolder.h"
+#include "tests/support/TempFolder.h"
 
 #include <algorithm>
 #include <cmath>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "tests/quarn/TempFolder.h"
+#include "tests/support/TempFolder.h"
 
 #include <functional>
 #include <map>

@@ -2,6 +2,7 @@
 #include "sdk/qncore/QnDoc.h"
 #include "sdk/qncore/QnGet.h"
 #include "tests/host/app/TestCommand.h"
+#include "tests/support/TempFolder.h"
 
 #include <gmock/gmock.h>
 
@@ -17,7 +18,8 @@ class CommandRunnerTest : public HostTest {
 protected:
     /// Writes a script and runs it.
     bool runScript(const std::string& bytes) {
-        const std::filesystem::path file = std::filesystem::path(testing::TempDir()) / "steps.txt";
+        const TempFolder folder;
+        const std::filesystem::path file = folder / "steps.txt";
         std::ofstream(file, std::ios::binary) << bytes;
         return session.runScriptFile(file);
     }

@@ -3,6 +3,7 @@
 #include "sdk/qncore/QnFileUtilities.h"
 #include "sdk/qncore/QnTextFile.h"
 #include "tests/host/app/TestCommand.h"
+#include "tests/support/TempFolder.h"
 
 #include <cstdlib>
 #include <fstream>
@@ -26,7 +27,6 @@ KM_wString wide(const fs::path& path) {
 class FilesAndFolders : public HostTest {
 protected:
     void SetUp() override {
-        fs::remove_all(home);
         fs::create_directories(home / ".config");
         setenv("HOME", home.c_str(), 1);
         unsetenv("XDG_CONFIG_HOME");
@@ -37,7 +37,8 @@ protected:
     }
 
     const std::string old_home = std::getenv("HOME") ? std::getenv("HOME") : "";
-    const fs::path home = fs::path(testing::TempDir()) / "quarn_home";
+    const TempFolder folder_of_home;
+    const fs::path home = folder_of_home.path();
 };
 
 // ---- The documents folder

@@ -2,6 +2,7 @@
 
 #include "sdk/qncore/QnLocalize.h"
 #include "tests/host/app/TestCommand.h"
+#include "tests/support/TempFolder.h"
 
 #include <gmock/gmock.h>
 
@@ -16,8 +17,8 @@ using testing::HasSubstr;
 using testing::IsEmpty;
 
 std::filesystem::path folder(const std::string& name) {
-    const std::filesystem::path path = std::filesystem::path(testing::TempDir()) / name;
-    std::filesystem::remove_all(path);
+    static const test::TempFolder folder_of_program;
+    const std::filesystem::path path = folder_of_program / name;
     std::filesystem::create_directories(path);
     return path;
 }

@@ -1,4 +1,5 @@
 #include "tests/host/app/TestCommand.h"
+#include "tests/support/TempFolder.h"
 
 #include <gmock/gmock.h>
 
@@ -46,11 +47,7 @@ TEST_F(HostTest, LoadPlugInTellsWhyAFileCannotBeLoaded) {
 /// Puts an opener of the test's own first in PATH.
 class RunTest : public HostTest {
 protected:
-    void SetUp() override {
-        fs::remove_all(folder);
-        fs::create_directories(folder);
-        std::ofstream(page) << "<html>";
-    }
+    void SetUp() override { std::ofstream(page) << "<html>"; }
     void TearDown() override { setenv("PATH", old_path.c_str(), 1); }
 
     void installOpener(const std::string& body) {
@@ -65,7 +62,8 @@ protected:
     }
 
     const std::string old_path = std::getenv("PATH");
-    const fs::path folder = fs::path(testing::TempDir()) / "quarn_run";
+    const TempFolder folder_of_test;
+    const fs::path folder = folder_of_test.path();
     const fs::path page = folder / "a page; touch pwned.html";
 };
 
