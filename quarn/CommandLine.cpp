@@ -73,6 +73,9 @@ CLI::App& addTurntable(CLI::App& program, TurntableOptions& options) {
     add("MODEL", options.model, "", "The model file: OBJ, glTF, GLB, PLY, STL, ...")->required();
     add("--frames", options.frames, "N", "Pictures of one whole turn, from 1")->required();
     add("--out", options.folder, "DIR", "Folder for the pictures and the page")->required();
+    add("--up", options.up_axis, "AXIS",
+        "Axis that points up in the file, y or z (default: y for glTF and such, z for OBJ, PLY, "
+        "STL)");
     add("--size", options.size, "WxH", "Size of a picture in pixels")->capture_default_str();
     add("--mode", options.mode, "NAME", "Display mode: " + captureModeNames())
         ->capture_default_str();

@@ -18,6 +18,7 @@ struct CommonOptions {
 /// `quarn turntable`, as typed; an option that was not given is empty where it has no default.
 struct TurntableOptions {
     std::string model;
+    std::string up_axis; ///< empty: by the format
     std::string folder;
     std::string frames;
     std::string size = "1280x720";

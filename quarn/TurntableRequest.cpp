@@ -26,6 +26,7 @@ public:
 
     std::variant<TurntableRequest, Outcome> run() {
         checkPaths();
+        checkUpAxis();
         checkName();
         checkFrames();
         checkSize();
@@ -50,6 +51,13 @@ private:
         m_request.folder = m_typed.folder;
         refuse(whyPathIsRefused("the model's path", m_request.model));
         refuse(whyPathIsRefused("the path of --out", m_request.folder));
+    }
+
+    void checkUpAxis() {
+        const std::string axis = lowerCase(m_typed.up_axis);
+        m_request.up_axis = axis == "y" ? "Y" : axis == "z" ? "Z" : "";
+        if (!axis.empty() && m_request.up_axis.empty())
+            refuse("--up must be y or z" + notBut(m_typed.up_axis));
     }
 
     void checkName() {

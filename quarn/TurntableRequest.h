@@ -14,6 +14,7 @@ namespace quarn::program {
 /// A turntable that can be recorded: every value is checked.
 struct TurntableRequest {
     std::filesystem::path model;
+    std::string up_axis; ///< "Y", "Z" or, by the format, empty
     std::filesystem::path folder;
     std::string name; ///< of the animation, its pictures and its page; UTF-8
     int frames;

@@ -27,6 +27,11 @@ Triple cameraLocation(const Triple& target, double elevation_deg) {
             target[2] + distance * std::sin(elevation)};
 }
 
+std::string import(const TurntableRequest& request) {
+    const std::string up = request.up_axis.empty() ? "" : "[Up] _" + request.up_axis + " ";
+    return "_-Import " + up + quotedPath(request.model);
+}
+
 std::string camera(const TurntableRequest& request) {
     const Triple target = request.target.value_or(Triple{0.0, 0.0, 0.0});
     return "_-Camera _Location " + tripleText(cameraLocation(target, request.elevation_deg)) +
@@ -52,7 +57,7 @@ std::string setTurntable(const TurntableRequest& request) {
 
 TurntableScript composeTurntable(const TurntableRequest& request) {
     TurntableScript script;
-    script.set_up = {"_-Import " + quotedPath(request.model)};
+    script.set_up = {import(request)};
     for (const std::string& name : request.hidden)
         script.set_up.push_back("_-Hide \"" + name + "\"");
     for (const std::string& line : {

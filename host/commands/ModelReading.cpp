@@ -40,23 +40,54 @@ bool isDocumentFile(const std::filesystem::path& file) {
     return textFromPath(file.extension()).CompareNoCase(L".quarn") == 0;
 }
 
+/// @param up  receives the answer
+CQuarnCommand::result askUpAxis(UpAxis& up) {
+    CQuarnGetOption get;
+    get.SetCommandPrompt(QnLocalizeString(L"Axis that points up in the file", 42051));
+    const int by_format = get.AddCommandOption(QnLocalizeCommandOptionName(L"ByFormat", 42050));
+    const int y = get.AddCommandOption(QnLocalizeCommandOptionName(L"Y", 0));
+    get.AddCommandOption(QnLocalizeCommandOptionName(L"Z", 0));
+    const CQuarnGet::result answer = get.GetOption();
+    if (answer == CQuarnGet::string)
+        return failForWord(get.String(), "ByFormat, Y or Z");
+    if (answer != CQuarnGet::option)
+        return get.CommandResult();
+    const int picked = get.Option()->m_option_index;
+    up = picked == by_format ? UpAxis::by_format : picked == y ? UpAxis::y : UpAxis::z;
+    return CQuarnCommand::success;
+}
+
+/// Asks for the file and, where the option is picked, for the axis that points up in it.
+CQuarnCommand::result askFile(std::filesystem::path& file, UpAxis& up) {
+    CQuarnGetString get;
+    get.SetCommandPrompt(QnLocalizeString(L"Model file", 42050));
+    get.AddCommandOption(QnLocalizeCommandOptionName(L"Up", 42051));
+    CQuarnGet::result answer = get.GetString();
+    while (answer == CQuarnGet::option) {
+        const CQuarnCommand::result asked = askUpAxis(up);
+        if (asked != CQuarnCommand::success)
+            return asked;
+        answer = get.GetString();
+    }
+    if (answer == CQuarnGet::string)
+        file = pathFromText(get.String());
+    return get.CommandResult();
+}
+
 } // namespace
 
 AskedModel askModel() {
-    CQuarnGetString get;
-    get.SetCommandPrompt(QnLocalizeString(L"Model file", 42050));
     AskedModel asked;
-    if (get.GetString() != CQuarnGet::string) {
-        asked.result = get.CommandResult();
+    UpAxis up = UpAxis::by_format;
+    asked.result = askFile(asked.file, up);
+    if (asked.result != CQuarnCommand::success)
         return asked;
-    }
-    asked.file = pathFromText(get.String());
     if (isDocumentFile(asked.file)) {
         asked.result = fail("Cannot read " + textFromPath(asked.file).ToUtf8() +
                             ": this version reads model files only, no documents.");
         return asked;
     }
-    auto model = readModelFile(asked.file);
+    auto model = readModelFile(asked.file, up);
     if (!model) {
         asked.result = fail(model.message());
         return asked;

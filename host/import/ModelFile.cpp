@@ -50,11 +50,17 @@ bool hasLinearColors(const aiScene& scene, const std::string& format) {
     return isOneOf(format, {"gltf", "glb"}) && !old;
 }
 
-ModelConventions conventionsOf(const aiScene& scene, const fs::path& path) {
+bool isYUp(const std::string& format, UpAxis up) {
+    if (up != UpAxis::by_format) {
+        return up == UpAxis::y;
+    }
+    return !isOneOf(format, {"obj", "ply", "stl", "off", "3mf", "amf", "dxf", "blend"});
+}
+
+ModelConventions conventionsOf(const aiScene& scene, const fs::path& path, UpAxis up) {
     const std::string format = modelFormat(path);
     ModelConventions conventions;
-    conventions.turn_y_up =
-        !isOneOf(format, {"obj", "ply", "stl", "off", "3mf", "amf", "dxf", "blend"});
+    conventions.turn_y_up = isYUp(format, up);
     conventions.keep_normals = format != "stl";
     conventions.gltf_cameras = isOneOf(format, {"gltf", "glb"});
     conventions.linear_colors = hasLinearColors(scene, format);
@@ -105,7 +111,7 @@ bool readScene(Assimp::Importer& importer, const fs::path& path) {
     return scene->mNumMeshes == 0 || importer.ApplyPostProcessing(steps) != nullptr;
 }
 
-Result<ImportedModel> readChecked(const fs::path& path) {
+Result<ImportedModel> readChecked(const fs::path& path, UpAxis up) {
     const ModelFolder folder(path);
     std::set<std::string> refused;
     Assimp::Importer importer;
@@ -121,7 +127,7 @@ Result<ImportedModel> readChecked(const fs::path& path) {
     }
     const std::unique_ptr<aiScene> scene(importer.GetOrphanedScene());
     importer.FreeScene();
-    Result<ImportedModel> model = takeScene(*scene, folder, conventionsOf(*scene, path));
+    Result<ImportedModel> model = takeScene(*scene, folder, conventionsOf(*scene, path, up));
     if (!model) {
         return cannotReadModel(path, model.message(), repair);
     }
@@ -129,9 +135,9 @@ Result<ImportedModel> readChecked(const fs::path& path) {
     return isEmpty(model.value()) ? nothingLeft(path, model.value()) : std::move(model);
 }
 
-Result<ImportedModel> readGuarded(const fs::path& path) {
+Result<ImportedModel> readGuarded(const fs::path& path, UpAxis up) {
     try {
-        return readChecked(path);
+        return readChecked(path, up);
     } catch (const std::bad_alloc&) {
         return cannotReadModel(path, "there is not enough memory", "Use a smaller model.");
     } catch (const std::exception& failure) {
@@ -149,13 +155,13 @@ std::size_t ImportedModel::triangleCount() const {
     return count;
 }
 
-Result<ImportedModel> readModelFile(const fs::path& path) {
+Result<ImportedModel> readModelFile(const fs::path& path, UpAxis up) {
     const Result<void> checked = checkModelFile(path);
     if (!checked) {
         return checked.error();
     }
     Result<ImportedModel> model = ImportedModel{};
-    runWithLargeStack([&path, &model] { model = readGuarded(path); });
+    runWithLargeStack([&path, up, &model] { model = readGuarded(path, up); });
     return model;
 }
 

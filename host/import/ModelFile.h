@@ -47,13 +47,20 @@ struct ImportedModel {
     std::size_t triangleCount() const;
 };
 
+/// Which axis of a model file points up.
+enum class UpAxis {
+    by_format, ///< Y where the format is Y-up, else Z
+    y,
+    z,
+};
+
 /// Reads a model file: OBJ, glTF, GLB, PLY, STL, and what else the Assimp library knows (FBX, DAE,
 /// 3DS, 3MF, OFF, ...).
 ///
 /// - Coordinates are in the file's own units. Z is up: formats that are Y-up by their definition
 ///   (glTF, GLB), or that Assimp hands out Y-up (FBX, DAE, 3DS and others), are turned, with Y to Z
 ///   and Z to -Y. OBJ, PLY, STL, OFF, 3MF, AMF, DXF and BLEND state no axis or are Z-up: they stay
-///   as they are.
+///   as they are. Files of these that were made Y-up are read with UpAxis::y.
 /// - The transforms of the file's nodes are applied, so a mesh that stands in a scene ten times
 ///   becomes ten meshes. Mirroring turns the triangles' winding, so that outside stays outside.
 /// - Vertex normals of the file are kept, except those of STL, which only repeat the facets. Where
@@ -67,9 +74,11 @@ struct ImportedModel {
 ///   with a warning.
 ///
 /// @param path  the model file; a relative path counts from the current folder
+/// @param up    the axis that points up in the file
 /// @return the model, with at least one triangle, curve or point; or an error that names the file:
 ///   missing, a folder, empty, not readable, larger than 4 GB, of an unknown kind, damaged, or with
 ///   nothing to show
-Result<ImportedModel> readModelFile(const std::filesystem::path& path);
+Result<ImportedModel> readModelFile(const std::filesystem::path& path,
+                                    UpAxis up = UpAxis::by_format);
 
 } // namespace quarn

@@ -55,10 +55,11 @@ TEST(Arguments, HelpNamesTheCommandsOnTheStandardOutput) {
 TEST(Arguments, HelpOfTurntableNamesEveryOptionItsDefaultAndTheModes) {
     const Ended ended = run({"turntable", "--help"});
     EXPECT_EQ(ended.exit_code, 0);
-    for (const char* word : {"--frames",  "--out",         "--size",     "1280x720",  "--mode",
-                             "Wireframe", "X-Ray",         "--format",   "jpg",       "--direction",
-                             "clockwise", "--elevation",   "--distance", "--target",  "--hide",
-                             "--name",    "--show-script", "--language", "--verbose", "Examples:"})
+    for (const char* word :
+         {"--frames",   "--out",     "--size",   "1280x720",    "--mode",    "Wireframe",
+          "X-Ray",      "--format",  "jpg",      "--direction", "clockwise", "--elevation",
+          "--distance", "--target",  "--hide",   "--up",        "--name",    "--show-script",
+          "--language", "--verbose", "Examples:"})
         EXPECT_THAT(ended.out, HasSubstr(word));
 }
 
@@ -147,6 +148,10 @@ TEST(Arguments, CameraValuesThatAreNoneAreRefused) {
     expectRefusal(wholeTurntable({"--distance", "1,5"}), {"--distance", "1,5"});
     for (const char* target : {"1,2", "1,2,3,4", "1,2,x", "1;2;3", "inf,0,0", "1, 2,3"})
         expectRefusal(wholeTurntable({"--target", target}), {"--target", target});
+}
+
+TEST(Arguments, UnknownUpAxisIsRefused) {
+    expectRefusal(wholeTurntable({"--up", "x"}), {"--up must be y or z", "x"});
 }
 
 TEST(Arguments, NameThatWouldEndItsCommandCannotBeHidden) {

@@ -65,6 +65,11 @@ TEST(ShowScript, IsTheWholeScriptOfTheDefaults) {
     EXPECT_EQ(lines[7], "_-RecordAnimation _TargetFolder \"out/house\" _Enter");
 }
 
+TEST(ShowScript, ReadsTheModelWithTheAxisThatPointsUp) {
+    EXPECT_EQ(scriptWith({"--up", "y"})[0], "_-Import [Up] _Y \"house.obj\"");
+    EXPECT_EQ(scriptWith({"--up", "Z"})[0], "_-Import [Up] _Z \"house.obj\"");
+}
+
 TEST(ShowScript, HidesObjectsBeforeTheModelIsFitted) {
     const auto lines = scriptWith({"--hide", "Walk", "--hide", "North gate"});
     ASSERT_THAT(lines, SizeIs(10));

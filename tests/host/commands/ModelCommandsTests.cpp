@@ -35,6 +35,22 @@ TEST_F(ModelCommandsTest, ImportAddsToTheOpenDocumentAndShowsTheModel) {
     EXPECT_GT(document().activeView().viewport().TargetDistance(), 1000.0);
 }
 
+TEST_F(ModelCommandsTest, TheAxisThatPointsUpInTheFileIsAnOption) {
+    ASSERT_EQ(runOn(L"_-Import [Up] _Y", triangle), CQuarnCommand::success);
+    const KM_BoundingBox turned = document().objects().visibleBox();
+    EXPECT_EQ(turned.m_max, KM_3dPoint(1000, 0, 1000)) << "y of the file is up";
+    ASSERT_EQ(runOn(L"_-Open [Up] _Z", triangle), CQuarnCommand::success);
+    EXPECT_EQ(document().objects().visibleBox().m_max, KM_3dPoint(1000, 1000, 0));
+    ASSERT_EQ(runOn(L"_-Open [Up] _Y [Up] _ByFormat", triangle), CQuarnCommand::success);
+    EXPECT_EQ(document().objects().visibleBox().m_max, KM_3dPoint(1000, 1000, 0));
+}
+
+TEST_F(ModelCommandsTest, AnUnknownAxisIsToldAndNothingIsRead) {
+    EXPECT_EQ(runOn(L"_-Import [Up] _X", triangle), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("Give ByFormat, Y or Z"));
+    EXPECT_TRUE(document().objects().empty());
+}
+
 TEST_F(ModelCommandsTest, ASecondImportLeavesTheCameraAlone) {
     runOn(L"Import", triangle);
     run(L"Camera Location 1,2,3 Target 0,0,0 _Enter");
