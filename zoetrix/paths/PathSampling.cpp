@@ -10,13 +10,17 @@ namespace {
 /// Equal steps over a curve's domain, and the range of them that is wanted.
 struct ParameterSteps {
     double min = 0.0;
+    double max = 0.0;
     double step = 0.0;
     // Wider than a frame count, which one step more must not overflow.
     std::int64_t count = 0; ///< steps including both ends; at least 2
     std::int64_t first = 0;
     std::int64_t last = 0; ///< behind the last one wanted
 
-    double ParameterAt(std::int64_t index) const { return min + static_cast<double>(index) * step; }
+    /// The end is met exactly: rounding could carry the last step beyond the domain.
+    double ParameterAt(std::int64_t index) const {
+        return index == count - 1 ? max : min + static_cast<double>(index) * step;
+    }
 };
 
 ParameterSteps DivideDomain(const KM_Curve& curve, int frame_count, bool look_ahead,
@@ -25,8 +29,9 @@ ParameterSteps DivideDomain(const KM_Curve& curve, int frame_count, bool look_ah
     const KM_Interval domain = curve.Domain();
     ParameterSteps steps;
     steps.min = domain.Min();
+    steps.max = domain.Max();
     steps.count = frame_count + extra;
-    steps.step = std::fabs(domain.Max() - steps.min) / static_cast<double>(steps.count - 1);
+    steps.step = std::fabs(steps.max - steps.min) / static_cast<double>(steps.count - 1);
     const bool leaves_out_the_end = look_ahead && is_camera;
     steps.first = leaves_out_the_end ? 0 : extra;
     steps.last = leaves_out_the_end ? steps.count - 1 : steps.count;
