@@ -38,28 +38,6 @@ quarn::SessionOptions optionsFor(const std::filesystem::path& folder, const std:
 
 } // namespace
 
-TemporaryFolder::TemporaryFolder() {
-    std::string pattern = (std::filesystem::temp_directory_path() / "zoetrix-XXXXXX").string();
-    m_path = mkdtemp(pattern.data()) ? pattern : std::string();
-    EXPECT_FALSE(m_path.empty());
-}
-
-TemporaryFolder::~TemporaryFolder() {
-    std::error_code error;
-    if (!m_path.empty())
-        std::filesystem::remove_all(m_path, error);
-}
-
-std::string readFile(const std::filesystem::path& file) {
-    std::ifstream stream(file, std::ios::binary);
-    EXPECT_TRUE(stream) << file;
-    return {std::istreambuf_iterator<char>(stream), {}};
-}
-
-void writeFile(const std::filesystem::path& file, const std::string& bytes) {
-    std::ofstream(file, std::ios::binary) << bytes;
-}
-
 PlugInFixture::PlugInFixture() : PlugInFixture("") {}
 
 PlugInFixture::PlugInFixture(const std::string& plug_ins, const std::string& language)

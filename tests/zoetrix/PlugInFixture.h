@@ -5,6 +5,7 @@
 #include "kelmar/KM_AnimationProperties.h"
 #include "kelmar/KM_wString.h"
 #include "sdk/qncore/qncore.h"
+#include "tests/support/TempFolder.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -15,22 +16,8 @@
 #include <optional>
 #include <string>
 
-/// A folder that is there as long as this object.
-class TemporaryFolder {
-public:
-    TemporaryFolder();
-    ~TemporaryFolder();
-    TemporaryFolder(const TemporaryFolder&) = delete;
-    TemporaryFolder& operator=(const TemporaryFolder&) = delete;
-
-    const std::filesystem::path& path() const { return m_path; }
-
-private:
-    std::filesystem::path m_path;
-};
-
-std::string readFile(const std::filesystem::path& file);
-void writeFile(const std::filesystem::path& file, const std::string& bytes);
+using quarn::test::readFile;
+using quarn::test::writeFile;
 
 /// A running host without a person, with the plug-in loaded, a fresh record and a new document.
 class PlugInFixture : public ::testing::Test {
@@ -65,7 +52,7 @@ protected:
 
     const std::wstring& printed() const { return front_end.printed(); }
 
-    TemporaryFolder folder;
+    quarn::test::TempFolder folder;
     quarn::ScriptedFrontEnd front_end;
     std::unique_ptr<quarn::Session> session;
 };

@@ -6,6 +6,7 @@
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 #include "sdk/vexui/VexUi.h"
 #include "tests/host/app/TestCommand.h"
+#include "tests/host/document/DocumentFixtures.h"
 
 #include <thread>
 
@@ -85,24 +86,6 @@ public:
     std::vector<std::string> told;
 };
 
-class FixedAccess : public IQnZoetrixDynamicAccess {
-public:
-    const KM_3dmAnimationProperties& AnimationProperties(const CQuarnDoc&) const override {
-        return record;
-    }
-    void SetAnimationProperties(const CQuarnDoc&, const KM_3dmAnimationProperties& r) override {
-        record = r;
-    }
-    bool AnimatedViewAtFrame(CQuarnDoc&, const KM_3dmAnimationProperties&, int,
-                             KM_Viewport&) override {
-        return false;
-    }
-    bool AnimatedSunAtFrame(CQuarnDoc&, const KM_3dmAnimationProperties&, int, KM_Light&) override {
-        return false;
-    }
-    KM_3dmAnimationProperties record;
-};
-
 TEST(Pictures, AreCountedForEachCommandAndToldWithTheFramesOfTheRecord) {
     CountingFrontEnd front_end;
     Session session(front_end, {{}, {}, "C", {}});
@@ -113,12 +96,12 @@ TEST(Pictures, AreCountedForEachCommandAndToldWithTheFramesOfTheRecord) {
     });
     ASSERT_TRUE(Application::current()->commands().add(record));
     session.runCommand(L"RecordTwo");
-    FixedAccess access;
-    access.record.SetFrameCount(2);
-    Zoetrix_SetQuarnDynamicAccess(&access);
-    EXPECT_EQ(Zoetrix_QuarnDynamicAccess(), &access);
-    session.runCommand(L"RecordTwo");
-    Zoetrix_SetQuarnDynamicAccess(nullptr);
+    {
+        RecordKeeper keeper;
+        keeper.record.SetFrameCount(2);
+        EXPECT_EQ(Zoetrix_QuarnDynamicAccess(), &keeper);
+        session.runCommand(L"RecordTwo");
+    }
     Application::current()->pictureWritten("outside.png");
     EXPECT_EQ(front_end.told,
               (std::vector<std::string>{"a0.png 1/0", "a1.png 2/0", "a0.png 1/2", "a1.png 2/2"}));
