@@ -18,6 +18,9 @@ namespace {
 
 constexpr double crease_angle_deg = 40.0;
 
+/// In a closed mesh six triangles meet at a vertex.
+constexpr std::size_t usual_sharing = 6;
+
 struct Vertex {
     KM_3fPoint place;
     KM_3fVector normal;
@@ -83,7 +86,8 @@ public:
                         source.mTextureCoords[reading.texture_coordinates] != nullptr),
           m_has_colors(source.mColors[0] != nullptr),
           m_in_place(reading.world_from_mesh.IsIdentity()),
-          m_weld(source.mNumVertices / 3 >= source.mNumFaces) {}
+          m_weld(source.mNumVertices / 3 >= source.mNumFaces),
+          m_table(m_weld ? source.mNumVertices / usual_sharing : 0) {}
 
     ConvertedMesh read() {
         m_index.assign(m_source.mNumVertices, IndexTable::none);
@@ -95,10 +99,6 @@ public:
         for (unsigned f = 0; f < m_source.mNumFaces; ++f) {
             dropped += readTriangle(m_source.mFaces[f]) ? 0 : 1;
         }
-        m_index = {};
-        m_table = {};
-        completeNormals();
-        releaseSpareRoom();
         return {m_mesh, dropped};
     }
 
@@ -209,23 +209,6 @@ private:
         }
     }
 
-    void releaseSpareRoom() {
-        m_mesh->m_V.shrink_to_fit();
-        m_mesh->m_N.shrink_to_fit();
-        m_mesh->m_T.shrink_to_fit();
-        m_mesh->m_C.shrink_to_fit();
-        m_mesh->m_F.shrink_to_fit();
-        m_mesh->PadForRayTracing();
-    }
-
-    void completeNormals() {
-        if (m_has_normals) {
-            fillMissingNormals(*m_mesh);
-        } else {
-            smoothVertexNormals(*m_mesh, crease_angle_deg);
-        }
-    }
-
     const aiMesh& m_source;
     const MeshReading& m_reading;
     NormalTransform m_normals;
@@ -243,6 +226,20 @@ private:
 
 ConvertedMesh convertTriangles(const aiMesh& mesh, const MeshReading& reading) {
     return TriangleReader(mesh, reading).read();
+}
+
+void completeMesh(KM_Mesh& mesh) {
+    if (mesh.m_N.empty()) {
+        smoothVertexNormals(mesh, crease_angle_deg);
+    } else {
+        fillMissingNormals(mesh);
+    }
+    mesh.m_V.shrink_to_fit();
+    mesh.m_N.shrink_to_fit();
+    mesh.m_T.shrink_to_fit();
+    mesh.m_C.shrink_to_fit();
+    mesh.m_F.shrink_to_fit();
+    mesh.PadForRayTracing();
 }
 
 bool isUsableCoordinate(double coordinate) {

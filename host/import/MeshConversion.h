@@ -24,9 +24,13 @@ struct ConvertedMesh {
         0; ///< index out of range, or a coordinate that is no usable number
 };
 
-/// The triangles of `mesh` in world coordinates, with a normal for each vertex. Only vertices that
-/// a triangle uses are kept; where no two triangles share a vertex, equal ones are made one.
+/// The triangles of `mesh` in world coordinates, with the normals of the file if it has any. Only
+/// vertices that a triangle uses are kept; where no two triangles share a vertex, equal ones are
+/// made one. The result wants completeMesh(), which no longer needs the source.
 ConvertedMesh convertTriangles(const aiMesh& mesh, const MeshReading& reading);
+
+/// Gives each vertex that has none its normal, and releases memory that was only kept in reserve.
+void completeMesh(KM_Mesh& mesh);
 
 /// True for a coordinate that can be drawn: a number, and small enough that distances between such
 /// numbers do not overflow.

@@ -7,6 +7,7 @@
 #include <assimp/camera.h>
 #include <assimp/mesh.h>
 #include <assimp/scene.h>
+#include <tbb/task_group.h>
 
 #include <algorithm>
 #include <cmath>
@@ -73,6 +74,23 @@ bool isUsablePoint(const KM_3dPoint& p) {
     return isUsableCoordinate(p.x) && isUsableCoordinate(p.y) && isUsableCoordinate(p.z);
 }
 
+/// Frees meshes of the scene beside other work: each of their triangles has memory of its own, so
+/// that a million take a while. All are gone when this ends.
+class MeshReleases {
+public:
+    MeshReleases() = default;
+    MeshReleases(const MeshReleases&) = delete;
+    MeshReleases& operator=(const MeshReleases&) = delete;
+    ~MeshReleases() { m_tasks.wait(); }
+
+    void release(aiMesh* mesh) {
+        m_tasks.run([mesh] { delete mesh; });
+    }
+
+private:
+    tbb::task_group m_tasks;
+};
+
 class SceneReader {
 public:
     SceneReader(aiScene& scene, const ModelFolder& folder, const ModelConventions& conventions)
@@ -124,7 +142,14 @@ private:
             readPoints(placed, mesh);
         }
         if (--m_uses[index] == 0) {
-            delete std::exchange(m_scene.mMeshes[index], new aiMesh);
+            m_releases.release(std::exchange(m_scene.mMeshes[index], new aiMesh));
+        }
+        completeNewMesh();
+    }
+
+    void completeNewMesh() {
+        if (m_completed < m_model.meshes.size()) {
+            completeMesh(*m_model.meshes[m_completed++].mesh);
         }
     }
 
@@ -300,6 +325,8 @@ private:
     MaterialReading m_materials;
     std::vector<PlacedNode> m_nodes;
     std::vector<std::uint64_t> m_uses; ///< how many more times each mesh is shown
+    MeshReleases m_releases;
+    std::size_t m_completed = 0; ///< meshes of the model
     KM_BoundingBox m_bounds;
     std::uint64_t m_triangles = 0;
     std::uint64_t m_dropped = 0;

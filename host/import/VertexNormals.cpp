@@ -2,6 +2,8 @@
 
 #include "host/import/IndexTable.h"
 
+#include <tbb/parallel_for.h>
+
 #include <array>
 #include <cmath>
 #include <cstdint>
@@ -116,9 +118,17 @@ public:
     void run() {
         collectStars();
         m_mesh.m_N.assign(m_mesh.m_V.size(), KM_3fVector(0.0F, 0.0F, 1.0F));
-        for (std::size_t place = 0; place + 1 < m_star_begin.size(); ++place) {
-            smoothStar({m_corners.data() + m_star_begin[place],
-                        m_corners.data() + m_star_begin[place + 1]});
+        const std::size_t place_count = m_star_begin.size() - 1;
+        std::vector<std::uint8_t> has_crease(place_count);
+        // A vertex belongs to one star, so the stars do not meet. New vertices come afterwards, in
+        // the order of their places.
+        tbb::parallel_for(std::size_t{0}, place_count, [&](std::size_t place) {
+            has_crease[place] = smoothStar(starAt(place)) ? 0 : 1;
+        });
+        for (std::size_t place = 0; place < place_count; ++place) {
+            if (has_crease[place] != 0) {
+                splitStar(starAt(place));
+            }
         }
     }
 
@@ -133,14 +143,20 @@ private:
         return static_cast<float>(std::cos(angle_deg * std::numbers::pi / 180.0));
     }
 
+    std::span<const std::uint32_t> starAt(std::size_t place) const {
+        return {m_corners.data() + m_star_begin[place], m_corners.data() + m_star_begin[place + 1]};
+    }
+
     /// Sorts the corners of all triangles by place. Corner 3 f + k is corner k of triangle f.
     void collectStars() {
         std::size_t place_count = 0;
         const std::vector<std::uint32_t> places = placesOf(m_mesh, place_count);
         m_star_begin.assign(place_count + 1, 0);
-        m_face_normals.reserve(m_mesh.m_F.size());
+        m_face_normals.resize(m_mesh.m_F.size());
+        tbb::parallel_for(std::size_t{0}, m_mesh.m_F.size(), [this](std::size_t f) {
+            m_face_normals[f] = faceNormal(m_mesh, m_mesh.m_F[f]);
+        });
         for (const KM_MeshTriangle& face : m_mesh.m_F) {
-            m_face_normals.push_back(faceNormal(m_mesh, face));
             for (const std::uint32_t v : face.vi) {
                 ++m_star_begin[places[v]];
             }
@@ -167,29 +183,33 @@ private:
         m_mesh.m_N[vertex] = KM_3fVector(n.x, n.y, n.z);
     }
 
-    void smoothStar(std::span<const std::uint32_t> star) {
+    Vector meanOf(std::span<const std::uint32_t> star) const {
         Vector sum;
         for (const std::uint32_t corner : star) {
             sum += weighted(corner);
         }
-        const Vector mean = unit(sum);
-        bool smooth = true;
+        return unit(sum);
+    }
+
+    /// @return false, with nothing done, where the star has a crease
+    bool smoothStar(std::span<const std::uint32_t> star) {
+        const Vector mean = meanOf(star);
         for (const std::uint32_t corner : star) {
             const Vector& n = m_face_normals[corner / 3];
-            smooth = smooth && (isZero(n) || dot(n, mean) >= m_cos_half_crease);
-        }
-        if (!smooth) {
-            splitStar(star, mean);
-            return;
+            if (!isZero(n) && !(dot(n, mean) >= m_cos_half_crease)) {
+                return false;
+            }
         }
         for (const std::uint32_t corner : star) {
             if (!isZero(mean)) {
                 setNormal(vertexOf(corner), mean);
             }
         }
+        return true;
     }
 
-    void splitStar(std::span<const std::uint32_t> star, const Vector& mean) {
+    void splitStar(std::span<const std::uint32_t> star) {
+        const Vector mean = meanOf(star);
         m_splits.clear();
         for (const std::uint32_t corner : star) {
             Vector normal = unit(sumWithinCrease(star, corner));
