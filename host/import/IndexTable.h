@@ -1,6 +1,7 @@
 #pragma once
 
 #include <algorithm>
+#include <array>
 #include <bit>
 #include <cstddef>
 #include <cstdint>
@@ -26,6 +27,24 @@ public:
     /// @return the index of the value; `next` when it is new
     template <class Equals>
     std::uint32_t findOrAdd(std::uint32_t hash, std::uint32_t next, Equals equals) {
+        Slot& recent = m_recent[hash % m_recent.size()];
+        if (recent.hash != hash || recent.index == none || !equals(recent.index)) {
+            recent = {findOrAddInTable(hash, next, equals), hash};
+        }
+        return recent.index;
+    }
+
+private:
+    static constexpr std::size_t least_slots = 1024;
+
+    /// Both numbers side by side, so that a look-up touches one line of the processor's cache.
+    struct Slot {
+        std::uint32_t index = none;
+        std::uint32_t hash = 0;
+    };
+
+    template <class Equals>
+    std::uint32_t findOrAddInTable(std::uint32_t hash, std::uint32_t next, Equals& equals) {
         if (2 * m_count >= m_slots.size()) {
             grow();
         }
@@ -40,15 +59,6 @@ public:
         ++m_count;
         return next;
     }
-
-private:
-    static constexpr std::size_t least_slots = 1024;
-
-    /// Both numbers side by side, so that a look-up touches one line of the processor's cache.
-    struct Slot {
-        std::uint32_t index = none;
-        std::uint32_t hash = 0;
-    };
 
     void grow() {
         std::vector<Slot> slots(2 * m_slots.size());
@@ -66,6 +76,9 @@ private:
     }
 
     std::vector<Slot> m_slots;
+    /// What was found last; neighbours in a mesh ask for the same vertices, and this part stays in
+    /// the processor's nearest cache.
+    std::array<Slot, 1024> m_recent;
     std::size_t m_count = 0;
 };
 
