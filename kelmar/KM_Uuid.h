@@ -17,7 +17,7 @@ struct KM_UUID {
 
     /// Equality and order field by field, which is the order of the upper-case texts.
     friend bool operator==(const KM_UUID&, const KM_UUID&) = default;
-    friend auto operator<=>(const KM_UUID&, const KM_UUID&) = default;
+    friend auto operator<=>(const KM_UUID&, const KM_UUID&) = default; // NOLINT: no null is there
 };
 
 /// The identifier whose bits are all zero: "no object".

@@ -3,7 +3,7 @@
 #include "sdk/qncore/QnExport.h"
 
 /// An opaque window of the front end; null where there is no window.
-using HWND = struct HWND__*;
+using HWND = struct QnFrontEndWindow*;
 
 /// A window that dialogs can be owned by.
 class QNCORE_API CWnd {
