@@ -7,6 +7,9 @@ if(QUARN_SANITIZERS)
     target_compile_options(quarn_compile_options INTERFACE
         -fsanitize=${QUARN_SANITIZERS} -fno-sanitize-recover=all -fno-omit-frame-pointer)
     target_link_options(quarn_compile_options INTERFACE -fsanitize=${QUARN_SANITIZERS})
+    # The checks that are built in hide from g++ what its standard library has set: it warns there.
+    target_compile_options(quarn_compile_options INTERFACE
+        $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>)
 endif()
 if(QUARN_FUZZ)
     target_compile_options(quarn_compile_options INTERFACE -fsanitize=fuzzer-no-link)
