@@ -15,9 +15,9 @@ enum class TextureWrap { repeat, mirror, clamp };
 /// A picture laid over a surface. Rows run from the top of the picture to its bottom; texture
 /// coordinate (0, 0) is the bottom left corner.
 struct Texture {
-    int width = 0;                     ///< pixels
-    int height = 0;                    ///< pixels
-    std::vector<std::uint8_t> rgba;    ///< 4 * width * height bytes, sRGB, alpha not multiplied in
+    int width = 0;                  ///< pixels
+    int height = 0;                 ///< pixels
+    std::vector<std::uint8_t> rgba; ///< 4 * width * height bytes, sRGB, alpha not multiplied in
     TextureWrap wrap_u = TextureWrap::repeat;
     TextureWrap wrap_v = TextureWrap::repeat;
 };
@@ -26,10 +26,10 @@ struct Texture {
 /// vertex colours, where there are any.
 struct Material {
     KM_wString name;
-    KM_Color base_color{204, 204, 204, 255};       ///< sRGB
+    KM_Color base_color{204, 204, 204, 255};           ///< sRGB
     std::shared_ptr<const Texture> base_color_texture; ///< null when there is none
-    bool alpha_cutout = false;                     ///< leave out what is less opaque than alpha_cutoff
-    float alpha_cutoff = 0.5F;                     ///< 0 to 1
+    bool alpha_cutout = false; ///< leave out what is less opaque than alpha_cutoff
+    float alpha_cutoff = 0.5F; ///< 0 to 1
 };
 
 } // namespace quarn
