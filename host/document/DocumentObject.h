@@ -21,6 +21,7 @@ struct DocumentObject {
     KM_UUID id = KM_nil_uuid; ///< never changes
     KM_wString name;          ///< empty when it has none
     bool visible = true;
+    bool selected = false; ///< by a person, for the commands that work on a selection
 
     std::shared_ptr<const KM_Mesh> mesh;      ///< shared with the ray scene, never changed
     std::shared_ptr<const Material> material; ///< of a mesh; null: the default material
