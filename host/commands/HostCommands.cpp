@@ -32,6 +32,8 @@ constexpr HostCommandEntry HOST_COMMANDS[] = {
     {L"New", "D6FDEF2D-A0DE-4A58-A3B0-015160EBE7B7", L"Opens an empty document", 41011, runNew},
     {L"Open", "9B677D57-1060-43B9-BD8C-42ADFA0DCDE1", L"Opens a model file as a new document",
      41012, runOpen},
+    {L"SaveFrame", "CB79D03F-C961-4980-B24A-7A514FB4DF9C",
+     L"Writes one frame of the animation as a picture", 41035, runSaveFrame},
     {L"Show", "91F4A7D2-0B63-4E58-8D3A-C7159E20FB16", L"Shows a hidden object", 41016, runShow},
     {L"StandardView", "5D6D6290-083C-42A4-BE01-B8AF4BFF8EB8",
      L"Turns the active view to Top, Front, Right, Perspective or a camera of the model", 41013,

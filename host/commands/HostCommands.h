@@ -33,6 +33,7 @@ CQuarnCommand::result runImport(const CQuarnCommandContext& context);
 CQuarnCommand::result runList(const CQuarnCommandContext& context);
 CQuarnCommand::result runNew(const CQuarnCommandContext& context);
 CQuarnCommand::result runOpen(const CQuarnCommandContext& context);
+CQuarnCommand::result runSaveFrame(const CQuarnCommandContext& context);
 CQuarnCommand::result runShow(const CQuarnCommandContext& context);
 CQuarnCommand::result runStandardView(const CQuarnCommandContext& context);
 CQuarnCommand::result runViewportSize(const CQuarnCommandContext& context);

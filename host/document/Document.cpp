@@ -3,6 +3,7 @@
 #include "host/display/DisplayMode.h"
 #include "host/document/DocumentList.h"
 #include "host/document/DocumentScene.h"
+#include "host/document/SceneChanges.h"
 #include "host/document/StandardViews.h"
 #include "host/front_end/FrontEnd.h"
 #include "host/import/ModelFile.h"
@@ -94,11 +95,27 @@ std::vector<KM_Light> Document::shiningLights() const {
     return lights;
 }
 
+std::vector<KM_Light> Document::shiningLights(const SceneChanges& changes) const {
+    if (!changes.sun)
+        return shiningLights();
+    std::vector<KM_Light> lights = m_lights.shiningLights(changes.sun->replaced_light);
+    if (LightStore::canShine(changes.sun->light))
+        lights.push_back(changes.sun->light);
+    return lights;
+}
+
 Result<void> Document::draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode,
                             int width_px, int height_px, Image& picture) {
+    return draw(viewport, mode, width_px, height_px, picture, SceneChanges());
+}
+
+Result<void> Document::draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode,
+                            int width_px, int height_px, Image& picture,
+                            const SceneChanges& changes) {
     if (!m_scene)
         m_scene = std::make_unique<DocumentScene>();
-    if (const auto updated = m_scene->update(m_objects, shiningLights()); !updated)
+    const auto updated = m_scene->update(m_objects, shiningLights(changes), changes.hidden);
+    if (!updated)
         return updated;
     return m_scene->draw(viewport, mode, width_px, height_px, picture);
 }

@@ -19,6 +19,7 @@ class FrontEnd;
 struct DisplayModeAttributes;
 struct Image;
 struct ImportedModel;
+struct SceneChanges;
 
 /// A camera that a model file brought along.
 struct NamedView {
@@ -76,12 +77,16 @@ public:
     /// @return an error, with the picture unchanged, when the scene cannot be built or drawn
     Result<void> draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode, int width_px,
                       int height_px, Image& picture);
+    /// Draws the same otherwise than it is; neither the document nor what its views show changes.
+    Result<void> draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode, int width_px,
+                      int height_px, Image& picture, const SceneChanges& changes);
     /// Brings the scene up to date where it was built before.
     void regenerate();
 
 private:
     void addStandardViews();
     void fitTolerance();
+    std::vector<KM_Light> shiningLights(const SceneChanges& changes) const;
 
     DocumentList& m_list;
     unsigned int m_serial_number;

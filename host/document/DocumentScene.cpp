@@ -2,6 +2,8 @@
 
 #include "host/document/ObjectTable.h"
 
+#include <algorithm>
+
 namespace quarn {
 
 namespace {
@@ -19,10 +21,11 @@ KM_3dPointArray displayPolyline(const KM_Curve& curve) {
 
 } // namespace
 
-Result<void> DocumentScene::update(const ObjectTable& objects, std::vector<KM_Light> lights) {
+Result<void> DocumentScene::update(const ObjectTable& objects, std::vector<KM_Light> lights,
+                                   std::span<const KM_UUID> hidden) {
     if (m_content.revision != objects.revision())
         takeObjects(objects);
-    takeVisibility(objects);
+    takeVisibility(objects, hidden);
     m_content.lights = std::move(lights);
     return m_display.update(m_content);
 }
@@ -45,17 +48,18 @@ void DocumentScene::takeObjects(const ObjectTable& objects) {
     }
 }
 
-void DocumentScene::takeVisibility(const ObjectTable& objects) {
+void DocumentScene::takeVisibility(const ObjectTable& objects, std::span<const KM_UUID> hidden) {
     auto mesh = m_content.meshes.begin();
     auto curve = m_content.curves.begin();
     auto point = m_content.points.begin();
     for (const auto& object : objects.objects()) {
+        const bool shown = object->visible && std::ranges::find(hidden, object->id) == hidden.end();
         if (object->mesh)
-            (mesh++)->visible = object->visible;
+            (mesh++)->visible = shown;
         else if (object->curve)
-            (curve++)->visible = object->visible;
+            (curve++)->visible = shown;
         else if (object->point)
-            (point++)->visible = object->visible;
+            (point++)->visible = shown;
     }
 }
 

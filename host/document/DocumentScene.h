@@ -4,6 +4,8 @@
 #include "host/display/DisplayScene.h"
 #include "host/display/SceneContent.h"
 
+#include <span>
+
 namespace quarn {
 
 class ObjectTable;
@@ -13,8 +15,10 @@ class DocumentScene {
 public:
     /// Takes over what changed since the last call: everything when an object was added, removed
     /// or changed, else the lights and what is shown or hidden.
+    /// @param hidden  objects that are not shown although they are visible
     /// @return an error when the scene cannot be built
-    Result<void> update(const ObjectTable& objects, std::vector<KM_Light> lights);
+    Result<void> update(const ObjectTable& objects, std::vector<KM_Light> lights,
+                        std::span<const KM_UUID> hidden = {});
 
     /// Draws the scene as the last update left it; as DisplayPipeline::draw.
     Result<void> draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode, int width_px,
@@ -22,7 +26,7 @@ public:
 
 private:
     void takeObjects(const ObjectTable& objects);
-    void takeVisibility(const ObjectTable& objects);
+    void takeVisibility(const ObjectTable& objects, std::span<const KM_UUID> hidden);
 
     SceneContent m_content;
     DisplayScene m_display;

@@ -12,14 +12,14 @@ bool needsDirection(KM_LightStyle style) {
            style != KM_LightStyle::ambient;
 }
 
-bool canShine(const KM_Light& light) {
+} // namespace
+
+bool LightStore::canShine(const KM_Light& light) {
     if (light.Style() == KM_LightStyle::unknown || !light.Location().IsValid())
         return false;
     const KM_3dVector& direction = light.Direction();
     return !needsDirection(light.Style()) || (direction.IsValid() && !direction.IsZero());
 }
-
-} // namespace
 
 CQuarnLight LightStore::deletedLight() {
     CQuarnLight light;
@@ -47,11 +47,11 @@ bool LightStore::remove(int index) {
     return true;
 }
 
-std::vector<KM_Light> LightStore::shiningLights() const {
+std::vector<KM_Light> LightStore::shiningLights(int but) const {
     std::vector<KM_Light> lights;
-    for (const CQuarnLight& slot : m_slots)
-        if (!slot.IsDeleted() && slot.Light().IsEnabled())
-            lights.push_back(slot.Light());
+    for (int index = 0; index < count(); ++index)
+        if (index != but && !at(index).IsDeleted() && at(index).Light().IsEnabled())
+            lights.push_back(at(index).Light());
     return lights;
 }
 

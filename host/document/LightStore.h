@@ -14,6 +14,9 @@ public:
     LightStore(const LightStore&) = delete;
     LightStore& operator=(const LightStore&) = delete;
 
+    /// Whether a light has a style, a valid place and a direction where it needs one.
+    static bool canShine(const KM_Light& light);
+
     int count() const { return static_cast<int>(m_slots.size()); }
     /// The light in a slot; one that counts as deleted for an index without a slot.
     const CQuarnLight& at(int index) const;
@@ -24,7 +27,8 @@ public:
     bool remove(int index);
 
     /// The lights that are there and switched on.
-    std::vector<KM_Light> shiningLights() const;
+    /// @param but  index of one that is left out; an index without a slot leaves out none
+    std::vector<KM_Light> shiningLights(int but = -1) const;
 
     /// What plug-ins see of the table.
     CQuarnLightTable& face() { return m_face; }

@@ -1,0 +1,230 @@
+#include "host/app/Application.h"
+#include "host/app/Border.h"
+#include "host/app/PathText.h"
+#include "host/commands/CommandEnd.h"
+#include "host/commands/HostCommands.h"
+#include "host/commands/PictureSizePrompt.h"
+#include "host/display/DisplayMode.h"
+#include "host/display/DisplayModeList.h"
+#include "host/display/ImageFile.h"
+#include "host/document/Document.h"
+#include "host/document/SceneChanges.h"
+#include "sdk/qncore/QnDib.h"
+#include "sdk/qncore/QnGet.h"
+#include "sdk/qncore/QnZoetrixDynamicAccess.h"
+
+namespace quarn {
+
+namespace {
+
+/// The animation that the frame belongs to. The record is not copied: its point lists may be long.
+struct Animation {
+    IQnZoetrixDynamicAccess* access = nullptr;
+    const KM_3dmAnimationProperties* record = nullptr; ///< valid while the command runs
+    ViewState* view = nullptr;
+};
+
+/// What the person wants to have written.
+struct FrameWish {
+    int frame = 0; ///< from 0, as in file names
+    int width_px = 0;
+    int height_px = 0;
+    std::filesystem::path file;
+};
+
+/// A frame made ready for drawing.
+struct FrameScene {
+    KM_Viewport viewport;
+    SceneChanges changes;
+};
+
+bool isSunStudy(const KM_3dmAnimationProperties& record) {
+    return record.CaptureType() == KM_3dmAnimationProperties::one_day_sun ||
+           record.CaptureType() == KM_3dmAnimationProperties::seasonal_sun;
+}
+
+bool hasFrames(const KM_3dmAnimationProperties& record) {
+    return record.FrameCount() >= 1 && record.CameraPoints().Count() == record.FrameCount() &&
+           record.TargetPoints().Count() == record.FrameCount();
+}
+
+Result<ViewState*> viewOf(const KM_3dmAnimationProperties& record, const Document& document) {
+    KM_wString name = record.ViewportName();
+    name.TrimLeftAndRight();
+    if (name.IsEmpty())
+        return Error{"The animation names no view. Set it up again."};
+    ViewState* view = document.findView(name.View());
+    if (!view)
+        return Error{"The animation was made for the view \"" + name.ToUtf8() +
+                     "\", which the document does not have. Set the animation up again."};
+    return view;
+}
+
+Result<Animation> storedAnimation(Document& document) {
+    Animation animation;
+    animation.access = Zoetrix_QuarnDynamicAccess();
+    if (!animation.access)
+        return Error{"No plug-in keeps an animation. Load one with LoadPlugIn first."};
+    const auto record =
+        acrossBorder([&] { return &animation.access->AnimationProperties(document.face()); });
+    if (!record)
+        return Error{"The animation cannot be read: " + record.message()};
+    animation.record = record.value();
+    if (!hasFrames(*animation.record))
+        return Error{"The document has no animation. Set one up, or open a document that has one."};
+    if (animation.record->RenderFull() || animation.record->RenderPreview())
+        return Error{"The animation's frames are rendered; SaveFrame cannot render yet, it draws "
+                     "display modes only. Set the animation up with a display mode."};
+    const auto view = viewOf(*animation.record, document);
+    if (!view)
+        return Error{view.message()};
+    animation.view = view.value();
+    return animation;
+}
+
+/// @param wish  receives frame and size; holds the size to begin with
+CQuarnCommand::result askFrame(const KM_3dmAnimationProperties& record, FrameWish& wish) {
+    const int last = record.FrameCount() - 1;
+    const int current = record.CurrentFrame();
+    CQuarnGetInteger get;
+    get.SetCommandPrompt(QnLocalizeString(L"Frame, from 0 as in file names", 42200));
+    get.SetDefaultInteger(current >= 0 && current <= last ? current : 0);
+    get.SetLowerLimit(0);
+    get.SetUpperLimit(last);
+    get.AddCommandOption(QnLocalizeCommandOptionName(L"Size", 42200));
+    CQuarnGet::result answer = get.GetNumber();
+    while (answer == CQuarnGet::option) {
+        const CQuarnCommand::result asked = askPictureSize(wish.width_px, wish.height_px);
+        if (asked != CQuarnCommand::success)
+            return asked;
+        answer = get.GetNumber();
+    }
+    wish.frame = get.Number();
+    return get.CommandResult();
+}
+
+/// Why no picture can be written there, as far as that is seen before one is drawn.
+Result<void> checkImageFile(const std::filesystem::path& file) {
+    const std::string name = textFromPath(file).ToUtf8();
+    if (!imageFormatFor(file.extension().string()))
+        return Error{"Cannot write " + name +
+                     ": no image format has this extension. Give a file that ends in .jpg, .jpeg, "
+                     ".png, .bmp or .tga."};
+    const std::filesystem::path folder = file.has_parent_path() ? file.parent_path() : ".";
+    std::error_code error;
+    if (!std::filesystem::is_directory(folder, error))
+        return Error{"Cannot write " + name + ": there is no folder " +
+                     textFromPath(folder).ToUtf8() + ". Make it first."};
+    return {};
+}
+
+CQuarnCommand::result askImageFile(FrameWish& wish) {
+    CQuarnGetString get;
+    get.SetCommandPrompt(QnLocalizeString(L"Image file", 42201));
+    if (get.GetString() != CQuarnGet::string)
+        return get.CommandResult();
+    wish.file = pathFromText(get.String());
+    const auto checked = checkImageFile(wish.file);
+    return checked ? CQuarnCommand::success : fail(checked.message());
+}
+
+CQuarnCommand::result askWish(const Animation& animation, FrameWish& wish) {
+    wish.width_px = animation.view->frameWidth();
+    wish.height_px = animation.view->frameHeight();
+    const CQuarnCommand::result asked = askFrame(*animation.record, wish);
+    return asked == CQuarnCommand::success ? askImageFile(wish) : asked;
+}
+
+Result<FrameScene> sunAtFrame(const Animation& animation, int frame) {
+    FrameScene scene;
+    scene.viewport = animation.view->viewport();
+    SceneChanges::Sun sun;
+    sun.replaced_light = animation.record->LightIndex();
+    const auto found = acrossBorder([&] {
+        return animation.access->AnimatedSunAtFrame(animation.view->document().face(),
+                                                    *animation.record, frame + 1, sun.light);
+    });
+    if (!found || !found.value())
+        return Error{"The sun of frame " + std::to_string(frame) +
+                     " cannot be placed. Set the sun study up again."};
+    scene.changes.sun = sun;
+    return scene;
+}
+
+/// The curves that a camera follows are not part of the picture.
+std::vector<KM_UUID> hiddenPaths(const KM_3dmAnimationProperties& record) {
+    const KM_UUID camera_path = record.CameraPathId();
+    const KM_UUID target_path = record.TargetPathId();
+    if (record.CaptureType() == KM_3dmAnimationProperties::flythrough)
+        return {camera_path};
+    const bool follows_both = record.CaptureType() == KM_3dmAnimationProperties::path &&
+                              !KM_UuidIsNil(camera_path) && !KM_UuidIsNil(target_path);
+    return follows_both ? std::vector{camera_path, target_path} : std::vector<KM_UUID>();
+}
+
+Result<FrameScene> cameraAtFrame(const Animation& animation, int frame) {
+    FrameScene scene;
+    const auto found = acrossBorder([&] {
+        return animation.access->AnimatedViewAtFrame(animation.view->document().face(),
+                                                     *animation.record, frame + 1, scene.viewport);
+    });
+    if (!found || !found.value())
+        return Error{"The camera of frame " + std::to_string(frame) +
+                     " cannot be placed: its point and its target must be two different points. "
+                     "Set the animation up again."};
+    scene.changes.hidden = hiddenPaths(*animation.record);
+    return scene;
+}
+
+/// A picture of the view's own size is seen as the view is, to the last bit.
+void fitToPicture(KM_Viewport& viewport, const ViewState& view, const FrameWish& wish) {
+    if (wish.width_px != view.frameWidth() || wish.height_px != view.frameHeight())
+        viewport.SetScreenPort(wish.width_px, wish.height_px);
+}
+
+/// What the animation is recorded with; the view's own mode where the record's is none of the
+/// host's; null when there is neither.
+const CDisplayPipelineAttributes* recordedMode(const Animation& animation) {
+    const KM_UUID id = isSunStudy(*animation.record) ? rendered_mode_id
+                       : KM_UuidIsNil(animation.record->DisplayMode())
+                           ? wireframe_mode_id
+                           : animation.record->DisplayMode();
+    const CDisplayPipelineAttributes* mode = DisplayModeList::instance().find(id);
+    return mode ? mode : animation.view->currentAttributes();
+}
+
+CQuarnCommand::result saveFrame(const Animation& animation, const FrameWish& wish) {
+    const CDisplayPipelineAttributes* mode = recordedMode(animation);
+    if (!mode)
+        return fail("Neither the animation nor its view has a display mode. Choose one with "
+                    "DisplayMode.");
+    auto scene = isSunStudy(*animation.record) ? sunAtFrame(animation, wish.frame)
+                                               : cameraAtFrame(animation, wish.frame);
+    if (!scene)
+        return fail(scene.message());
+    fitToPicture(scene.value().viewport, *animation.view, wish);
+
+    DisplayModeAttributes attributes = drawingAttributes(*mode);
+    attributes.antialiasing_level = static_cast<int>(AntialiasingLevel::capture);
+    CQuarnDib picture;
+    const auto drawn =
+        animation.view->document().draw(scene.value().viewport, attributes, wish.width_px,
+                                        wish.height_px, picture.Image(), scene.value().changes);
+    if (!drawn)
+        return fail(drawn.message());
+    return picture.WriteToFile(textFromPath(wish.file), 0) ? CQuarnCommand::success
+                                                           : CQuarnCommand::failure;
+}
+
+} // namespace
+
+CQuarnCommand::result runSaveFrame(const CQuarnCommandContext& context) {
+    const auto animation = storedAnimation(Document::of(context.Document()));
+    if (!animation)
+        return fail(animation.message());
+    FrameWish wish;
+    const CQuarnCommand::result asked = askWish(animation.value(), wish);
+    return asked == CQuarnCommand::success ? saveFrame(animation.value(), wish) : asked;
+}
+
+} // namespace quarn
