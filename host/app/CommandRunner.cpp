@@ -65,7 +65,7 @@ CQuarnCommand::result CommandRunner::start(std::wstring_view line, const Command
         return CQuarnCommand::failure;
     }
     RunningCommand running{found->command, found->english_name, origin.place,
-                           std::move(read.words)};
+                           std::move(read.words), origin.typed};
     const CQuarnCommand::result result =
         execute(running, origin, origin.interactive && !read.without_dialogs);
     if (result == CQuarnCommand::success)

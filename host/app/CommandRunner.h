@@ -21,6 +21,8 @@ struct CommandOrigin {
     bool interactive = false;
     /// The line of a script file, as in "turntable.txt, line 3"; empty for every other line.
     std::wstring place;
+    /// Whether a person typed it at a command line: words that do not answer are asked again.
+    bool typed = false;
 };
 
 /// A command that runs now.
@@ -29,6 +31,7 @@ struct RunningCommand {
     KM_wString name;               ///< its English name
     std::wstring place;            ///< as in CommandOrigin
     std::deque<CommandWord> words; ///< the answers that are left
+    bool typed = false;            ///< as in CommandOrigin
     int pictures_written = 0;
 
     /// What messages about its answers begin with: its place and its name.

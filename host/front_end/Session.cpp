@@ -24,7 +24,20 @@ PlugInLoad Session::adoptProgramPlugIn() {
 }
 
 CQuarnCommand::result Session::runCommand(std::wstring_view line, bool interactive) {
-    return m_state->application.runner().run(line, {&document(), interactive, {}});
+    return m_state->application.runner().run(line, {&document(), interactive, {}, false});
+}
+
+CQuarnCommand::result Session::runTypedCommand(std::wstring_view line) {
+    return m_state->application.runner().run(line, {&document(), false, {}, true});
+}
+
+std::vector<CommandName> Session::commandNames() const {
+    std::vector<CommandName> names;
+    for (const RegisteredCommand& entry : m_state->application.commands().sortedByName()) {
+        if (!entry.command->IsHidden())
+            names.push_back({entry.english_name, entry.local_name});
+    }
+    return names;
 }
 
 bool Session::runScriptFile(const std::filesystem::path& file) {

@@ -47,6 +47,12 @@ struct PlugInLoad {
     bool ok() const { return outcome <= Outcome::loaded_before; }
 };
 
+/// What a command is called.
+struct CommandName {
+    KM_wString english;
+    KM_wString local; ///< the same where the command has no name in the user's language
+};
+
 /// The running host: the application, its documents and its plug-ins, behind one front end. There
 /// is at most one session at a time; it belongs to the main thread.
 class QNCORE_API Session {
@@ -70,6 +76,14 @@ public:
     /// @param interactive  true when a person typed it into a window and may be shown dialogs
     /// @return how the command ended; failure, with a message, for an unknown command
     CQuarnCommand::result runCommand(std::wstring_view line, bool interactive = false);
+
+    /// Runs one command line that a person typed where there are no dialogs. As runCommand, but a
+    /// word that does not answer its question is told and the question asked of the person; the
+    /// words behind it are dropped.
+    CQuarnCommand::result runTypedCommand(std::wstring_view line);
+
+    /// The names of the commands that Help lists, in the order of their English names.
+    std::vector<CommandName> commandNames() const;
 
     /// Runs a script file: one command line per line; blank lines and lines that start with "#" are
     /// skipped. Stops at the first command that does not succeed, and tells its line.

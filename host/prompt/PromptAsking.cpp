@@ -101,8 +101,9 @@ CQuarnGet::result askQuestion(PromptState& prompt, const char* call) {
         if (!request)
             return prompt.result;
         tellRefusal(*application, *command, reply, prompt, *request);
-        if (reply.from_script)
+        if (reply.from_script && !command->typed)
             return cancel(prompt);
+        command->words.clear(); // the next word would answer a question it was not written for
     }
 }
 
