@@ -53,6 +53,10 @@ const KM_Curve* CQuarnObject::Curve() const {
     return m_object->curve.get();
 }
 
+const KM_3dPoint* CQuarnObject::Point() const {
+    return m_object->point ? &*m_object->point : nullptr;
+}
+
 CQuarnObjRef::CQuarnObjRef() = default;
 
 CQuarnObjRef::CQuarnObjRef(const KM_UUID& id) : m_id(id) {}
@@ -65,4 +69,9 @@ const CQuarnObject* CQuarnObjRef::Object() const {
 const KM_Curve* CQuarnObjRef::Curve() const {
     const CQuarnObject* object = Object();
     return object ? object->Curve() : nullptr;
+}
+
+const KM_3dPoint* CQuarnObjRef::Point() const {
+    const CQuarnObject* object = Object();
+    return object ? object->Point() : nullptr;
 }

@@ -15,28 +15,30 @@ KM_wString lowerCase(std::wstring_view text) {
 } // namespace
 
 DocumentObject& ObjectTable::addMesh(const KM_wString& name, std::shared_ptr<const KM_Mesh> mesh,
-                                     std::shared_ptr<const Material> material) {
-    DocumentObject& object = add(name);
+                                     std::shared_ptr<const Material> material, const KM_UUID& id) {
+    DocumentObject& object = add(name, id);
     object.mesh = std::move(mesh);
     object.material = std::move(material);
     return object;
 }
 
-DocumentObject& ObjectTable::addCurve(const KM_wString& name, std::unique_ptr<KM_Curve> curve) {
-    DocumentObject& object = add(name);
+DocumentObject& ObjectTable::addCurve(const KM_wString& name, std::unique_ptr<KM_Curve> curve,
+                                      const KM_UUID& id) {
+    DocumentObject& object = add(name, id);
     object.curve = std::move(curve);
     return object;
 }
 
-DocumentObject& ObjectTable::addPoint(const KM_wString& name, const KM_3dPoint& point) {
-    DocumentObject& object = add(name);
+DocumentObject& ObjectTable::addPoint(const KM_wString& name, const KM_3dPoint& point,
+                                      const KM_UUID& id) {
+    DocumentObject& object = add(name, id);
     object.point = point;
     return object;
 }
 
-DocumentObject& ObjectTable::add(const KM_wString& name) {
+DocumentObject& ObjectTable::add(const KM_wString& name, const KM_UUID& id) {
     DocumentObject& object = *m_objects.emplace_back(std::make_unique<DocumentObject>());
-    object.id = KM_CreateUuid();
+    object.id = KM_UuidIsNil(id) || find(id) ? KM_CreateUuid() : id;
     object.name = freeName(name);
     m_by_id[object.id] = &object;
     if (!object.name.IsEmpty())
@@ -58,14 +60,31 @@ KM_wString ObjectTable::freeName(const KM_wString& wish) {
 }
 
 bool ObjectTable::remove(const KM_UUID& id) {
-    const DocumentObject* object = find(id);
-    if (!object)
+    return remove(std::span(&id, 1)) == 1;
+}
+
+std::size_t ObjectTable::remove(std::span<const KM_UUID> ids) {
+    const auto removed = [&](const auto& object) { return !m_by_id.contains(object->id); };
+    for (const KM_UUID& id : ids) {
+        if (const DocumentObject* object = find(id); object && !object->name.IsEmpty())
+            m_by_name.erase(lowerCase(object->name.View()));
+        m_by_id.erase(id);
+    }
+    const std::size_t count = std::erase_if(m_objects, removed);
+    m_revision += count > 0 ? 1 : 0;
+    return count;
+}
+
+bool ObjectTable::rename(const KM_UUID& id, const KM_wString& name) {
+    DocumentObject* object = find(id);
+    const DocumentObject* owner = name.IsEmpty() ? nullptr : findByName(name.View());
+    if (!object || (owner && owner != object))
         return false;
     if (!object->name.IsEmpty())
         m_by_name.erase(lowerCase(object->name.View()));
-    m_by_id.erase(id);
-    std::erase_if(m_objects, [&](const auto& entry) { return entry.get() == object; });
-    ++m_revision;
+    object->name = name;
+    if (!name.IsEmpty())
+        m_by_name[lowerCase(name.View())] = object;
     return true;
 }
 
@@ -85,6 +104,28 @@ bool ObjectTable::setVisible(const KM_UUID& id, bool visible) {
         return false;
     object->visible = visible;
     return true;
+}
+
+bool ObjectTable::select(const KM_UUID& id, bool selected) {
+    DocumentObject* object = find(id);
+    if (object)
+        object->selected = selected;
+    return object != nullptr;
+}
+
+void ObjectTable::selectAll() {
+    for (const auto& object : m_objects)
+        object->selected = object->selected || object->visible;
+}
+
+void ObjectTable::selectNone() {
+    for (const auto& object : m_objects)
+        object->selected = false;
+}
+
+int ObjectTable::selectedCount() const {
+    return static_cast<int>(
+        std::ranges::count_if(m_objects, [](const auto& object) { return object->selected; }));
 }
 
 KM_BoundingBox ObjectTable::visibleBox() const {

@@ -20,12 +20,13 @@ struct QuestionOption {
 
 /// A question that a command asks a person.
 struct Question {
-    enum class Kind { option, string, integer, number };
+    enum class Kind { option, string, integer, number, object };
     Kind kind = Kind::option;
     KM_wString prompt;                   ///< without a colon
     std::vector<QuestionOption> options; ///< in the order they were added
     std::optional<KM_wString> default_answer;
-    bool accepts_nothing = false;
+    bool accepts_nothing = false;         ///< Enter without an answer ends the question
+    std::vector<KM_wString> object_names; ///< that answer a question for objects; else empty
 };
 
 /// What a person answered: a word, Enter, Escape, or nothing because nobody can be asked.

@@ -1,6 +1,7 @@
 #include "host/prompt/PromptAnswer.h"
 
 #include "host/prompt/NumberText.h"
+#include "host/prompt/ObjectAnswer.h"
 #include "host/prompt/OptionPick.h"
 
 #include <limits>
@@ -13,6 +14,8 @@ using Refusal = std::optional<KM_wString>;
 
 Refusal endWith(PromptState& prompt, CQuarnGet::result result) {
     prompt.result = result;
+    if (result == CQuarnGet::cancel)
+        prompt.objects.ids.clear();
     prompt.command_result =
         result == CQuarnGet::cancel ? CQuarnCommand::cancel : CQuarnCommand::success;
     return std::nullopt;
@@ -85,11 +88,31 @@ Refusal takeWholeNumber(PromptState& prompt, const KM_wString& text) {
     return endWith(prompt, CQuarnGet::number);
 }
 
+// ---- Objects
+
+/// Takes one object; the question ends with the last one that is wanted.
+Refusal takeNextObject(PromptState& prompt, const KM_wString& text) {
+    Refusal refusal = takeObject(prompt.objects, text);
+    if (!refusal && prompt.objects.isFull())
+        return endWith(prompt, CQuarnGet::object);
+    return refusal;
+}
+
+/// Enter after some objects were given.
+Refusal endObjects(PromptState& prompt) {
+    if (prompt.objects.isEnough())
+        return endWith(prompt, CQuarnGet::object);
+    return KM_wString::FormatToString(L"Pick at least %d objects",
+                                      static_cast<int>(prompt.objects.minimum));
+}
+
 // ---- Any kind
 
 OptionPick readPick(const PromptState& prompt, const KM_wString& text, bool literal) {
     if (prompt.kind == Question::Kind::string)
         return literal ? OptionPick{} : readOptionClick(prompt, text.View());
+    if (prompt.kind == Question::Kind::object && literal)
+        return {};
     return readOption(prompt, text.View());
 }
 
@@ -103,11 +126,15 @@ Refusal takeText(PromptState& prompt, const KM_wString& text, bool literal) {
         return takeNumber(prompt, text);
     if (prompt.kind == Question::Kind::integer)
         return takeWholeNumber(prompt, text);
+    if (prompt.kind == Question::Kind::object)
+        return takeNextObject(prompt, text);
     prompt.text = text;
     return endWith(prompt, CQuarnGet::string);
 }
 
 Refusal takeEnter(PromptState& prompt) {
+    if (!prompt.objects.ids.empty())
+        return endObjects(prompt);
     if (prompt.accepts_nothing) {
         prompt.text = prompt.default_answer.value_or(KM_wString());
         return endWith(prompt, CQuarnGet::nothing);
@@ -118,6 +145,8 @@ Refusal takeEnter(PromptState& prompt) {
     Refusal refusal = takeText(prompt, default_answer, true);
     if (!refusal)
         prompt.text = default_answer;
+    if (!refusal && prompt.kind == Question::Kind::object && prompt.result == CQuarnGet::no_result)
+        return endObjects(prompt);
     return refusal;
 }
 

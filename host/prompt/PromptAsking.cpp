@@ -1,6 +1,7 @@
 #include "host/prompt/PromptAsking.h"
 
 #include "host/app/Application.h"
+#include "host/prompt/ObjectAnswer.h"
 #include "host/prompt/PromptAnswer.h"
 
 namespace quarn {
@@ -32,9 +33,20 @@ Reply takeWord(RunningCommand& command) {
     return {answerOf(text), true, false};
 }
 
+/// Whether a person put a name of an object in quotes, as it stands in a command line.
+bool isQuotedName(const PromptState& prompt, const Answer& answer) {
+    const std::wstring_view text = answer.text.View();
+    return prompt.kind == Question::Kind::object && answer.kind == Answer::Kind::text &&
+           text.size() > 2 && text.front() == L'"' && text.back() == L'"';
+}
+
 /// What a person says; an empty text is Enter.
 Reply askPerson(Application& application, const PromptState& prompt) {
     Answer answer = application.frontEnd().ask(prompt.question());
+    if (isQuotedName(prompt, answer)) {
+        const std::wstring_view text = answer.text.View();
+        return {{Answer::Kind::text, text.substr(1, text.size() - 2)}, false, true};
+    }
     if (answer.kind == Answer::Kind::text)
         answer = answer.text.IsEmpty() ? Answer{Answer::Kind::enter, {}} : answerOf(answer.text);
     return {std::move(answer), false, false};
@@ -91,7 +103,12 @@ CQuarnGet::result askQuestion(PromptState& prompt, const char* call) {
         application->reportBreach(call, "questions may be asked while a command runs");
         return prompt.result;
     }
-    for (;;) {
+    if (takeSelection(prompt.objects)) {
+        prompt.result = CQuarnGet::object;
+        prompt.command_result = CQuarnCommand::success;
+        return prompt.result;
+    }
+    while (prompt.result == CQuarnGet::no_result) {
         const Reply reply = nextReply(*application, *command, prompt);
         if (reply.answer.kind == Answer::Kind::nobody) {
             tellMissingAnswer(*application, *command, prompt);
@@ -99,12 +116,13 @@ CQuarnGet::result askQuestion(PromptState& prompt, const char* call) {
         }
         const std::optional<KM_wString> request = takeAnswer(prompt, reply.answer, reply.literal);
         if (!request)
-            return prompt.result;
+            continue;
         tellRefusal(*application, *command, reply, prompt, *request);
         if (reply.from_script && !command->typed)
             return cancel(prompt);
         command->words.clear(); // the next word would answer a question it was not written for
     }
+    return prompt.result;
 }
 
 } // namespace quarn

@@ -1,5 +1,7 @@
 #include "host/prompt/PromptState.h"
 
+#include "host/prompt/ObjectAnswer.h"
+
 #include <algorithm>
 
 namespace quarn {
@@ -24,16 +26,22 @@ int PromptState::addOption(PromptOption option) {
 }
 
 Question PromptState::question() const {
-    Question question{kind, prompt, {}, default_answer, accepts_nothing};
+    Question question{kind, prompt, {}, default_answer, accepts_nothing, {}};
     for (const PromptOption& option : options) {
         const CQuarnCommandOptionValue* value = option.shownValue();
         question.options.push_back(
             {option.name.m_english, option.name.m_local, value ? value->m_local : KM_wString()});
     }
+    if (kind == Question::Kind::object) {
+        question.object_names = objectNames(objects);
+        question.accepts_nothing = objects.ids.empty() ? accepts_nothing : objects.isEnough();
+    }
     return question;
 }
 
 void PromptState::startAsking() {
+    if (result != CQuarnGet::option)
+        objects.ids.clear();
     result = CQuarnGet::no_result;
     command_result = CQuarnCommand::failure;
     picked = {};

@@ -26,6 +26,19 @@ struct PromptOption {
     const CQuarnCommandOptionValue* shownValue() const;
 };
 
+/// What a question for objects wants, and what was given.
+struct ObjectPick {
+    unsigned filter = CQuarnGetObject::any_object;
+    bool takes_selection = false;
+    bool ignores_unacceptable = false; ///< of the selection
+    std::size_t minimum = 1;
+    std::size_t maximum = 1;  ///< 0: none
+    std::vector<KM_UUID> ids; ///< what was given
+
+    bool isEnough() const { return ids.size() >= minimum; }
+    bool isFull() const { return maximum > 0 && ids.size() >= maximum; }
+};
+
 /// What a command has set up about a question, and how the question ended.
 struct PromptState {
     Question::Kind kind = Question::Kind::option;
@@ -35,6 +48,7 @@ struct PromptState {
     std::vector<PromptOption> options;
     double lower_limit = KM_UNSET_VALUE; ///< unset: none
     double upper_limit = KM_UNSET_VALUE; ///< unset: none
+    ObjectPick objects;
 
     CQuarnGet::result result = CQuarnGet::no_result;
     CQuarnCommand::result command_result = CQuarnCommand::success;
@@ -47,7 +61,8 @@ struct PromptState {
     int addOption(PromptOption option);
     /// The question as a front end shows it.
     Question question() const;
-    /// Forgets how the question ended last time.
+    /// Forgets how the question ended last time; the objects that were given before an option was
+    /// picked stay.
     void startAsking();
 };
 

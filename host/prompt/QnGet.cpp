@@ -4,6 +4,7 @@
 #include "host/prompt/PromptAsking.h"
 #include "host/prompt/PromptState.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace {
@@ -159,4 +160,38 @@ CQuarnGet::result CQuarnGetInteger::GetNumber() {
 
 int CQuarnGetInteger::Number() const {
     return m_state->whole_number;
+}
+
+// ---- CQuarnGetObject
+
+CQuarnGetObject::CQuarnGetObject() {
+    m_state->kind = Question::Kind::object;
+}
+
+CQuarnGetObject::~CQuarnGetObject() = default;
+
+void CQuarnGetObject::EnablePreSelect(bool enable, bool ignore_unacceptable) {
+    m_state->objects.takes_selection = enable;
+    m_state->objects.ignores_unacceptable = ignore_unacceptable;
+}
+
+void CQuarnGetObject::SetGeometryFilter(unsigned filter) {
+    m_state->objects.filter = filter;
+}
+
+CQuarnGet::result CQuarnGetObject::GetObjects(int minimum, int maximum) {
+    quarn::ObjectPick& pick = m_state->objects;
+    pick.minimum = static_cast<std::size_t>(std::max(minimum, 1));
+    pick.maximum = maximum <= 0 ? 0 : std::max(static_cast<std::size_t>(maximum), pick.minimum);
+    return quarn::askQuestion(*m_state, "CQuarnGetObject::GetObjects");
+}
+
+int CQuarnGetObject::ObjectCount() const {
+    return static_cast<int>(m_state->objects.ids.size());
+}
+
+CQuarnObjRef CQuarnGetObject::Object(int index) const {
+    if (index < 0 || index >= ObjectCount())
+        return {};
+    return CQuarnObjRef(m_state->objects.ids[static_cast<std::size_t>(index)]);
 }

@@ -4,6 +4,7 @@
 #include "sdk/qncore/QnCommand.h"
 #include "sdk/qncore/QnExport.h"
 #include "sdk/qncore/QnLocalize.h"
+#include "sdk/qncore/QnObject.h"
 
 #include <memory>
 
@@ -30,6 +31,7 @@ public:
         option = 3,    ///< an option was picked
         number = 4,    ///< a number was given, or Enter took the default
         string = 5,    ///< text was given, or Enter took the default
+        object = 6,    ///< objects were given
     };
 
     CQuarnGet();
@@ -126,4 +128,58 @@ public:
     result GetNumber();
     /// The number that was given; the default after Enter.
     int Number() const;
+};
+
+/// Asks for objects of the active document.
+///
+/// An object is named by its name, ignoring case, or by its id, with or without braces; where one
+/// object's name is another one's id, the name wins. In a command line a name with blanks stands in
+/// double quotes. A word that names an option picks it, with or without "_"; a quoted word is
+/// always an object, so `"All"` is the object of that name where `All` is an option. A name with a
+/// double quote in it cannot be written in a command line; the id can. Hidden objects can be given.
+///
+/// A word that means no object, or one that the filter does not admit, is told by name and is a bad
+/// answer as at every question: a person is asked again, a script is cancelled.
+class QNCORE_API CQuarnGetObject : public CQuarnGet {
+public:
+    /// The kinds of objects that a filter admits; they are combined by "or".
+    enum geometry : unsigned {
+        point_object = 1,
+        curve_object = 4,
+        mesh_object = 32,
+        any_object = point_object | curve_object | mesh_object,
+    };
+
+    CQuarnGetObject();
+    ~CQuarnGetObject() override;
+
+    /// Whether the objects that are selected in the document are taken without asking, where they
+    /// are as many as are wanted. Off in a new question.
+    ///
+    /// @param enable               true takes the selection
+    /// @param ignore_unacceptable  true leaves selected objects out that the filter does not admit;
+    ///                             false asks when there is one
+    void EnablePreSelect(bool enable, bool ignore_unacceptable);
+    /// The kinds of objects that are admitted, `any_object` in a new question. Bits that are no
+    /// kind are left out of account; a filter of no kind admits nothing.
+    void SetGeometryFilter(unsigned filter);
+
+    /// Asks until enough objects are there. An object that is given twice counts once.
+    ///
+    /// @param minimum  Enter ends the question once so many were given; below 1 counts as 1. Enter
+    ///                 with none given is `nothing`, with AcceptNothing(true)
+    /// @param maximum  the question ends by itself when so many were given, so 1 and 1 is one pick;
+    ///                 0 or less: only Enter ends it. Less than the minimum counts as the minimum
+    /// @return `object` when objects were given. Picking an option ends the question; asked again
+    /// it
+    ///         goes on with the objects that were given before. After `cancel` and `nothing` there
+    ///         are none
+    result GetObjects(int minimum = 1, int maximum = 1);
+
+    /// How many objects were given.
+    int ObjectCount() const;
+    /// An object that was given, in the order in which they were; those of the selection come in
+    /// the document's order.
+    /// @param index  from 0; a reference to nothing for one outside 0 to ObjectCount() - 1
+    CQuarnObjRef Object(int index) const;
 };

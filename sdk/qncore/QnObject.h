@@ -1,6 +1,7 @@
 #pragma once
 
 #include "kelmar/KM_Curve.h"
+#include "kelmar/KM_Point.h"
 #include "kelmar/KM_Uuid.h"
 #include "kelmar/KM_wString.h"
 #include "sdk/qncore/QnExport.h"
@@ -19,6 +20,8 @@ public:
     bool IsHidden() const;
     /// The object's curve, or null when it is none. Valid until the object changes.
     const KM_Curve* Curve() const;
+    /// Where the point object is, or null when it is none. Valid until the object changes.
+    const KM_3dPoint* Point() const;
 
 private:
     friend struct quarn::DocumentObject;
@@ -39,8 +42,12 @@ public:
     KM_UUID ObjectUuid() const { return m_id; }
     /// The object, or null when the id names none (any more). Valid until the document changes.
     const CQuarnObject* Object() const;
-    /// The object's curve, or null when there is no object or it is no curve.
+    /// The object's curve, or null when there is no object or it is no curve. Valid until the
+    /// document changes.
     const KM_Curve* Curve() const;
+    /// Where the point object is, or null when there is no object or it is no point. Valid until
+    /// the document changes.
+    const KM_3dPoint* Point() const;
 
 private:
     KM_UUID m_id = KM_nil_uuid;
