@@ -1,16 +1,12 @@
 #include "host/app/Application.h"
 #include "host/app/PathText.h"
 #include "host/commands/HostCommands.h"
+#include "host/commands/WordsLeft.h"
 #include "sdk/qncore/QnGet.h"
 
 namespace quarn {
 
 namespace {
-
-bool hasWordsLeft(Application& application) {
-    const RunningCommand* command = application.runner().current();
-    return command && !command->words.empty();
-}
 
 void printLine(Application& application, const RegisteredCommand& entry) {
     const KM_wString name = KM_wString::FormatToString(L"%-24s ", entry.local_name.Array());
@@ -34,7 +30,7 @@ CQuarnCommand::result runExit(const CQuarnCommandContext&) {
 
 CQuarnCommand::result runHelp(const CQuarnCommandContext&) {
     Application& application = *Application::current();
-    if (!hasWordsLeft(application))
+    if (!hasWordsLeft())
         return listCommands(application);
     CQuarnGetString get;
     get.SetCommandPrompt(QnLocalizeString(L"Command", 41101));

@@ -41,9 +41,39 @@ TEST_F(VisibilityCommandsTest, HidingWhatIsHiddenSucceeds) {
 }
 
 TEST_F(VisibilityCommandsTest, AnUnknownNameIsToldAndNothingChanges) {
-    EXPECT_EQ(run(L"_-Hide Nobody"), CQuarnCommand::failure);
-    EXPECT_THAT(printed(), HasSubstr("There is no object \"Nobody\". List shows the names."));
+    document().objects().addPoint(L"Mark", {1, 2, 3});
+    EXPECT_EQ(run(L"_-Hide Tower Nobody Mark"), CQuarnCommand::cancel);
+    EXPECT_THAT(printed(),
+                HasSubstr("There is no object called \"Nobody\"; List shows the names."));
+    EXPECT_TRUE(isVisible()) << "not even the one before";
+}
+
+TEST_F(VisibilityCommandsTest, SeveralObjectsAreNamedOneAfterTheOther) {
+    const DocumentObject& mark = document().objects().addPoint(L"Mark", {1, 2, 3});
+    ASSERT_EQ(run(L"_-Hide Tower Mark"), CQuarnCommand::success);
+    EXPECT_FALSE(isVisible());
+    EXPECT_FALSE(mark.visible);
+    ASSERT_EQ(run(L"_-Show Mark Tower _Enter"), CQuarnCommand::success);
     EXPECT_TRUE(isVisible());
+    EXPECT_TRUE(mark.visible);
+}
+
+TEST_F(VisibilityCommandsTest, ALineWithoutWordsMeansTheSelection) {
+    const DocumentObject& mark = document().objects().addPoint(L"Mark", {1, 2, 3});
+    document().objects().select(mark.id);
+    ASSERT_EQ(run(L"_-Hide"), CQuarnCommand::success);
+    EXPECT_FALSE(mark.visible);
+    EXPECT_TRUE(isVisible());
+    ASSERT_EQ(run(L"_-Hide Tower"), CQuarnCommand::success);
+    EXPECT_FALSE(isVisible()) << "a name counts before the selection";
+}
+
+TEST_F(VisibilityCommandsTest, APersonNamesObjectsUntilEnter) {
+    for (const wchar_t* answer : {L"Tower", L"_Enter"})
+        front_end.addAnswer(answer);
+    ASSERT_EQ(run(L"Hide"), CQuarnCommand::success);
+    EXPECT_FALSE(isVisible());
+    EXPECT_STREQ(front_end.questions()[0].prompt, L"Objects to hide");
 }
 
 } // namespace
