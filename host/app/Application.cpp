@@ -5,8 +5,6 @@
 #include "host/display/DisplayModeList.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
-#include <cstdio>
-
 namespace quarn {
 
 namespace {
@@ -22,6 +20,12 @@ int frameCount(Document* document) {
     return access->AnimationProperties(document->face()).FrameCount();
 }
 
+BreachReceiver receiverFor(const SessionOptions& options) {
+    if (!options.strict)
+        return breachReceiverOfEnvironment();
+    return *options.strict ? abortOnBreach : logBreach;
+}
+
 } // namespace
 
 Application* Application::current() {
@@ -29,17 +33,14 @@ Application* Application::current() {
 }
 
 Application* Application::forCall(const char* call) {
-    Application* application = running_application;
-    if (!application || std::this_thread::get_id() == application->m_main_thread)
-        return application;
-    std::fprintf(stderr, "Quarn: %s was called outside the main thread; the call was ignored.\n",
-                 call);
-    return nullptr;
+    return isOnMainThread(call) ? running_application : nullptr;
 }
 
 Application::Application(FrontEnd& front_end, SessionOptions options)
-    : m_front_end(front_end), m_options(std::move(options)), m_texts(m_options.language),
+    : m_front_end(front_end), m_options(std::move(options)),
+      m_former_receiver(setBreachReceiver(receiverFor(m_options))), m_texts(m_options.language),
       m_runner(*this) {
+    claimMainThread();
     running_application = this;
     if (Result<void> texts = m_texts.load("host", m_options.locale_folders); !texts)
         tell(texts.message());
@@ -51,12 +52,15 @@ Application::Application(FrontEnd& front_end, SessionOptions options)
 }
 
 Application::~Application() {
-    m_documents.reset();
+    m_documents->closeAll();
     m_plug_ins.reset();
+    m_documents.reset();
     for (const std::unique_ptr<CQuarnCommand>& command : m_host_commands)
         m_commands.remove(*command);
     m_host_commands.clear();
     running_application = nullptr;
+    releaseMainThread();
+    setBreachReceiver(m_former_receiver);
 }
 
 void Application::registerHostCommands() {
@@ -73,10 +77,6 @@ void Application::print(std::wstring_view text) {
 
 void Application::tell(std::string_view message) {
     print((KM_wString::FromUtf8(message) + L"\n").View());
-}
-
-void Application::reportBreach(std::string_view call, std::string_view rule) {
-    tell(std::string(call) + " was refused: " + std::string(rule) + ".");
 }
 
 void Application::pictureWritten(const std::filesystem::path& file) {

@@ -2,6 +2,7 @@
 
 #include "host/app/CommandRegistry.h"
 #include "host/app/CommandRunner.h"
+#include "host/app/Contract.h"
 #include "host/app/PlugInLoader.h"
 #include "host/app/StringTables.h"
 #include "host/document/DocumentList.h"
@@ -13,7 +14,6 @@
 #include <memory>
 #include <string>
 #include <string_view>
-#include <thread>
 #include <vector>
 
 namespace quarn {
@@ -24,15 +24,16 @@ class Application {
 public:
     /// Starts with one new document, the host's commands and the host's texts.
     Application(FrontEnd& front_end, SessionOptions options);
-    /// Closes the documents, then unloads the plug-ins, the last loaded first.
+    /// Closes the documents, then unloads the plug-ins, the last loaded first. What plug-ins have
+    /// seen of documents and views stays as in DocumentList until they are unloaded.
     ~Application();
     Application(const Application&) = delete;
     Application& operator=(const Application&) = delete;
 
     /// The application that runs now, or null.
     static Application* current();
-    /// The application, for a call that belongs on the main thread; null when none runs, and, with
-    /// a line on the error output that names the call, on every other thread.
+    /// The application, for a call that belongs on the main thread; null when none runs, and on
+    /// every other thread, which is reported as a breach.
     static Application* forCall(const char* call);
 
     FrontEnd& frontEnd() const { return m_front_end; }
@@ -47,10 +48,6 @@ public:
     void print(std::wstring_view text);
     /// Shows a message of the host (UTF-8) as a line of its own.
     void tell(std::string_view message);
-    /// Tells that a plug-in broke a rule of the interface.
-    /// @param call  the call that was wrong
-    /// @param rule  what it should have kept to
-    void reportBreach(std::string_view call, std::string_view rule);
 
     /// To be called after a picture was written to a file: counts it for the command that runs, and
     /// tells the front end. Without a running command nothing happens.
@@ -67,7 +64,7 @@ private:
 
     FrontEnd& m_front_end;
     SessionOptions m_options;
-    std::thread::id m_main_thread = std::this_thread::get_id();
+    BreachReceiver m_former_receiver;
     StringTables m_texts;
     CommandRegistry m_commands;
     std::vector<std::unique_ptr<CQuarnCommand>> m_host_commands;

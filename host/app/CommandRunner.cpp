@@ -43,8 +43,7 @@ CQuarnCommand::result CommandRunner::runNested(std::wstring_view line,
                                                const CommandOrigin& origin) {
     const RunningCommand* running = current();
     if (!running || !running->command->IsScriptCommand()) {
-        m_application.reportBreach("CQuarnApp::RunScript",
-                                   "only a running CQuarnScriptCommand may call it");
+        reportBreach("CQuarnApp::RunScript", "only a running CQuarnScriptCommand may call it");
         return CQuarnCommand::failure;
     }
     return start(line, origin);
@@ -78,6 +77,8 @@ CQuarnCommand::result CommandRunner::start(std::wstring_view line, const Command
 CQuarnCommand::result CommandRunner::execute(RunningCommand& running, const CommandOrigin& origin,
                                              bool interactive) {
     const CQuarnCommandContext context(*origin.document, interactive);
+    if (m_running.empty())
+        m_application.documents().commandStarted();
     m_running.push_back(&running);
     const Result<CQuarnCommand::result> ended =
         acrossBorder([&] { return running.command->RunCommand(context); });

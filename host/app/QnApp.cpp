@@ -39,7 +39,7 @@ bool CQuarnApp::RunScript(unsigned int document_serial_number, const wchar_t* sc
         return false;
     quarn::Document* document = application->documents().find(document_serial_number);
     if (!document) {
-        application->reportBreach("CQuarnApp::RunScript", "it names no open document");
+        quarn::reportBreach("CQuarnApp::RunScript", "it names no open document");
         return false;
     }
     if (echo)

@@ -4,8 +4,8 @@
 
 namespace {
 
-const wchar_t* localText(quarn::TextSpace space, const wchar_t* english, int id) {
-    quarn::Application* application = quarn::Application::current();
+const wchar_t* localText(const char* call, quarn::TextSpace space, const wchar_t* english, int id) {
+    quarn::Application* application = quarn::Application::forCall(call);
     const wchar_t* local = application && id != 0 ? application->texts().find(space, id) : nullptr;
     return local ? local : english;
 }
@@ -13,13 +13,15 @@ const wchar_t* localText(quarn::TextSpace space, const wchar_t* english, int id)
 } // namespace
 
 const wchar_t* QnLocalizeString(const wchar_t* english, int id) {
-    return localText(quarn::TextSpace::strings, english, id);
+    return localText("QnLocalizeString", quarn::TextSpace::strings, english, id);
 }
 
 CQuarnCommandOptionName QnLocalizeCommandOptionName(const wchar_t* english, int id) {
-    return {english, localText(quarn::TextSpace::option_names, english, id)};
+    return {english,
+            localText("QnLocalizeCommandOptionName", quarn::TextSpace::option_names, english, id)};
 }
 
 CQuarnCommandOptionValue QnLocalizeCommandOptionValue(const wchar_t* english, int id) {
-    return {english, localText(quarn::TextSpace::option_values, english, id)};
+    return {english, localText("QnLocalizeCommandOptionValue", quarn::TextSpace::option_values,
+                               english, id)};
 }

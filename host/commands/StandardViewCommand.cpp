@@ -10,15 +10,6 @@ namespace quarn {
 
 namespace {
 
-KM_Viewport turnedTo(const StandardView& standard, const ViewState& view) {
-    const KM_Viewport& viewport = view.viewport();
-    const bool has_target = viewport.TargetDistance() > 0.0;
-    const KM_3dPoint target = has_target ? viewport.TargetPoint() : KM_3dPoint::Origin;
-    const double distance =
-        has_target ? viewport.TargetDistance() : viewport.CameraDirection().Length();
-    return standardViewport(standard, target, distance, view.frameWidth(), view.frameHeight());
-}
-
 const NamedView* findNamedView(const Document& document, const wchar_t* name) {
     const auto& views = document.namedViews();
     const auto found = std::find_if(views.begin(), views.end(), [&](const NamedView& view) {
@@ -39,7 +30,7 @@ CQuarnCommand::result runStandardView(const CQuarnCommandContext& context) {
     const CQuarnGet::result answer = get.GetOption();
     if (answer == CQuarnGet::option) {
         const auto index = static_cast<std::size_t>(get.Option()->m_option_index - 1);
-        view.setViewport(turnedTo(standardViews()[index], view), true, true);
+        view.setViewport(turnedTo(standardViews()[index], view.viewport()), true, true);
         return CQuarnCommand::success;
     }
     if (answer != CQuarnGet::string)

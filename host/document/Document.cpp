@@ -11,6 +11,7 @@
 #include "sdk/qncore/QnLocalize.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace quarn {
 
@@ -44,11 +45,24 @@ void Document::addStandardViews() {
         const KM_Viewport viewport =
             standardViewport(standard, KM_3dPoint::Origin, START_DISTANCE,
                              ViewState::default_width_px, ViewState::default_height_px);
-        m_views.push_back(std::make_unique<ViewState>(*this, standard.name, viewport));
-        m_active_view = m_views.back().get();
-        m_active_view->setDisplayMode(viewport.IsPerspectiveProjection() ? shaded_mode_id
-                                                                         : wireframe_mode_id);
+        m_active_view = addView(standard.name, viewport).value();
     }
+}
+
+void Document::close() {
+    m_is_open = false;
+    m_due_views.clear();
+    m_active_view = nullptr;
+    for (std::unique_ptr<ViewState>& view : m_views) {
+        view->close();
+        m_closed_views.push_back(std::move(view));
+    }
+    m_views.clear();
+    m_lights.close();
+    m_sun.close();
+    m_scene.reset();
+    m_objects = ObjectTable();
+    m_named_views.clear();
 }
 
 ViewState* Document::findView(std::wstring_view name) const {
@@ -64,6 +78,55 @@ bool Document::activateView(std::wstring_view name) {
     if (view)
         m_active_view = view;
     return view != nullptr;
+}
+
+Result<void> Document::checkNewViewName(const KM_wString& name) const {
+    const auto is_control = [](wchar_t character) { return character < L' ' || character == 0x7F; };
+    if (name.IsEmpty() || std::ranges::any_of(name.View(), is_control))
+        return Error{"A view needs a name, of characters that can be seen."};
+    if (const ViewState* taken = findView(name.View()))
+        return Error{"There is a view \"" + taken->name().ToUtf8() +
+                     "\" already. Give the new one another name."};
+    return {};
+}
+
+Result<ViewState*> Document::addView(const KM_wString& name, const KM_Viewport& viewport) {
+    if (const auto checked = checkNewViewName(name); !checked)
+        return checked.error();
+    m_views.push_back(std::make_unique<ViewState>(*this, name, viewport));
+    ViewState* view = m_views.back().get();
+    view->setDisplayMode(viewport.IsPerspectiveProjection() ? shaded_mode_id : wireframe_mode_id);
+    return view;
+}
+
+Result<void> Document::closeView(std::wstring_view name) {
+    ViewState* view = findView(name);
+    if (!view)
+        return Error{"There is no view \"" + KM_wString(name).ToUtf8() + "\"."};
+    if (std::ranges::find(m_due_views, view) != m_due_views.end())
+        return {};
+    if (m_views.size() - m_due_views.size() < 2)
+        return Error{"\"" + view->name().ToUtf8() +
+                     "\" is the document's last view and stays. Add another one first."};
+    if (m_list.isCommandRunning())
+        m_due_views.push_back(view);
+    else
+        closeNow(*view);
+    return {};
+}
+
+void Document::closeDueViews() {
+    for (ViewState* view : std::exchange(m_due_views, {}))
+        closeNow(*view);
+}
+
+void Document::closeNow(ViewState& view) {
+    const auto place = std::ranges::find(m_views, &view, &std::unique_ptr<ViewState>::get);
+    view.close();
+    m_closed_views.push_back(std::move(*place));
+    const auto behind = m_views.erase(place);
+    if (m_active_view == &view)
+        m_active_view = (behind == m_views.end() ? m_views.back() : *behind).get();
 }
 
 void Document::addModel(const ImportedModel& model) {

@@ -27,7 +27,8 @@ struct NamedView {
     KM_Viewport viewport;
 };
 
-/// An open document: objects, lights, sun and views. Owned by the DocumentList.
+/// A document: objects, lights, sun and views. Owned by the DocumentList, also when it was closed:
+/// a plug-in may keep a pointer to what it sees of it.
 class Document {
 public:
     /// The tolerance of a document that no model was read into, in document units.
@@ -48,6 +49,11 @@ public:
     DocumentList& list() const { return m_list; }
     FrontEnd& frontEnd() const;
 
+    /// Called by the list when it closes the document: its views close and its objects go. From now
+    /// on every call on what plug-ins see of it is a breach.
+    void close();
+    bool isOpen() const { return m_is_open; }
+
     ObjectTable& objects() { return m_objects; }
     const ObjectTable& objects() const { return m_objects; }
     LightStore& lights() { return m_lights; }
@@ -55,11 +61,25 @@ public:
     CQuarnDocProperties& properties() { return m_properties; }
 
     const std::vector<std::unique_ptr<ViewState>>& views() const { return m_views; }
+    /// There is always one while the document is open.
     ViewState& activeView() const { return *m_active_view; }
     /// The view with this name, ignoring case, or null.
     ViewState* findView(std::wstring_view name) const;
     /// Makes the view with this name, ignoring case, the active one. @return false: there is none
     bool activateView(std::wstring_view name);
+    /// Whether a view may be added under this name.
+    /// @return an error for an empty name, one with control characters, and one that a view has
+    Result<void> checkNewViewName(const KM_wString& name) const;
+    /// Adds a view behind the others: 1280 by 720 pixels, drawn as wireframe in parallel projection
+    /// and shaded in perspective. The active view stays.
+    /// @return the view, or the error of checkNewViewName
+    Result<ViewState*> addView(const KM_wString& name, const KM_Viewport& viewport);
+    /// Closes the view with this name, ignoring case; while a command runs, when the outermost one
+    /// has ended. When it was the active one, the view behind it becomes active, or the last one.
+    /// @return an error when there is no such view and when no view would be left
+    Result<void> closeView(std::wstring_view name);
+    /// Called when the outermost command has ended: closes the views that closeView put off.
+    void closeDueViews();
     const std::vector<NamedView>& namedViews() const { return m_named_views; }
 
     double absoluteTolerance() const { return m_absolute_tolerance; }
@@ -87,6 +107,7 @@ private:
     void addStandardViews();
     void fitTolerance();
     std::vector<KM_Light> shiningLights(const SceneChanges& changes) const;
+    void closeNow(ViewState& view);
 
     DocumentList& m_list;
     unsigned int m_serial_number;
@@ -97,6 +118,9 @@ private:
     std::vector<NamedView> m_named_views;
     std::vector<std::unique_ptr<ViewState>> m_views;
     ViewState* m_active_view = nullptr;
+    std::vector<ViewState*> m_due_views; ///< to be closed when the command ends
+    std::vector<std::unique_ptr<ViewState>> m_closed_views;
+    bool m_is_open = true;
     std::unique_ptr<DocumentScene> m_scene; ///< null until something is drawn
     CQuarnDocProperties m_properties;
     CQuarnDoc m_face;

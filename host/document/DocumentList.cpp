@@ -25,8 +25,7 @@ DocumentList::DocumentList(FrontEnd& front_end)
 }
 
 DocumentList::~DocumentList() {
-    m_active = nullptr;
-    m_documents.clear();
+    closeAll();
     current_list = nullptr;
 }
 
@@ -42,7 +41,25 @@ Document& DocumentList::openNew() {
 }
 
 void DocumentList::commandEnded() {
-    std::erase_if(m_documents, [&](const auto& document) { return document.get() != m_active; });
+    m_is_command_running = false;
+    closeAllBut(m_active);
+    if (m_active)
+        m_active->closeDueViews();
+}
+
+void DocumentList::closeAll() {
+    m_active = nullptr;
+    closeAllBut(nullptr);
+}
+
+void DocumentList::closeAllBut(const Document* kept) {
+    for (std::unique_ptr<Document>& document : m_documents) {
+        if (document.get() == kept)
+            continue;
+        document->close();
+        m_closed_documents.push_back(std::move(document));
+    }
+    std::erase(m_documents, nullptr);
 }
 
 Document* DocumentList::find(unsigned int serial_number) const {

@@ -28,8 +28,17 @@ public:
     /// plug-in keeps is emptied first, so that nothing of the old document stays in it.
     Document& openNew();
 
-    /// Called when the outermost command has ended: closes every document but the active one.
+    /// Called when the outermost command starts: until it has ended no document and no view closes,
+    /// because the command may hold it.
+    void commandStarted() { m_is_command_running = true; }
+    /// Called when the outermost command has ended: closes every document but the active one, and
+    /// the views that were to close meanwhile.
     void commandEnded();
+    bool isCommandRunning() const { return m_is_command_running; }
+
+    /// Closes every document. What plug-ins have seen of them stays, as a shell that refuses every
+    /// call, until the list goes.
+    void closeAll();
 
     /// The active document, or null when none was opened.
     Document* active() const { return m_active; }
@@ -48,10 +57,13 @@ public:
 
 private:
     void emptyAnimationRecord(Document& document);
+    void closeAllBut(const Document* kept);
 
     FrontEnd& m_front_end;
     std::vector<std::unique_ptr<Document>> m_documents;
+    std::vector<std::unique_ptr<Document>> m_closed_documents;
     Document* m_active = nullptr;
+    bool m_is_command_running = false;
     std::unique_ptr<ImageEncoder> m_image_encoder;
     std::unique_ptr<KM_3dmAnimationProperties> m_fresh_record;
 };

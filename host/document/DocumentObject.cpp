@@ -1,5 +1,6 @@
 #include "host/document/DocumentObject.h"
 
+#include "host/app/Contract.h"
 #include "host/document/DocumentList.h"
 
 namespace quarn {
@@ -37,20 +38,22 @@ const DocumentObject* findInOpenDocuments(const KM_UUID& id) {
 
 } // namespace quarn
 
+using quarn::isOnMainThread;
+
 KM_UUID CQuarnObject::Id() const {
-    return m_object->id;
+    return isOnMainThread("CQuarnObject::Id") ? m_object->id : KM_nil_uuid;
 }
 
 const wchar_t* CQuarnObject::Name() const {
-    return m_object->name.Array();
+    return isOnMainThread("CQuarnObject::Name") ? m_object->name.Array() : L"";
 }
 
 bool CQuarnObject::IsHidden() const {
-    return !m_object->visible;
+    return isOnMainThread("CQuarnObject::IsHidden") && !m_object->visible;
 }
 
 const KM_Curve* CQuarnObject::Curve() const {
-    return m_object->curve.get();
+    return isOnMainThread("CQuarnObject::Curve") ? m_object->curve.get() : nullptr;
 }
 
 const KM_3dPoint* CQuarnObject::Point() const {
@@ -62,6 +65,8 @@ CQuarnObjRef::CQuarnObjRef() = default;
 CQuarnObjRef::CQuarnObjRef(const KM_UUID& id) : m_id(id) {}
 
 const CQuarnObject* CQuarnObjRef::Object() const {
+    if (!isOnMainThread("CQuarnObjRef::Object"))
+        return nullptr;
     const quarn::DocumentObject* object = quarn::findInOpenDocuments(m_id);
     return object ? &object->face : nullptr;
 }

@@ -1,5 +1,7 @@
 #include "host/document/DocumentSun.h"
 
+#include "host/app/Contract.h"
+
 namespace quarn {
 
 void DocumentSun::beginChange() {
@@ -37,22 +39,27 @@ std::optional<KM_Light> DocumentSun::light() const {
 
 } // namespace quarn
 
+using quarn::mayCallDocument;
+
 bool CQuarnSun::IsEnabled() const {
-    return m_sun->isEnabled();
+    return mayCallDocument(*m_sun, "CQuarnSun::IsEnabled") && m_sun->isEnabled();
 }
 
 void CQuarnSun::BeginChange(int) {
-    m_sun->beginChange();
+    if (mayCallDocument(*m_sun, "CQuarnSun::BeginChange"))
+        m_sun->beginChange();
 }
 
 void CQuarnSun::SetEnabled(bool enabled) {
-    m_sun->setEnabled(enabled);
+    if (mayCallDocument(*m_sun, "CQuarnSun::SetEnabled"))
+        m_sun->setEnabled(enabled);
 }
 
 bool CQuarnSun::EndChange() {
-    return m_sun->endChange();
+    return mayCallDocument(*m_sun, "CQuarnSun::EndChange") && m_sun->endChange();
 }
 
 KM_3dVector CQuarnSun::DirectionToSun() const {
-    return m_sun->directionToSun();
+    const bool allowed = mayCallDocument(*m_sun, "CQuarnSun::DirectionToSun");
+    return allowed ? m_sun->directionToSun() : KM_3dVector::ZAxis;
 }

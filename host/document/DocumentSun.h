@@ -30,8 +30,18 @@ public:
     /// @return true when the sun is another than when it was opened; false without an open change
     bool endChange();
 
+    /// Sets both as they were stored, to the last bit.
+    /// @param direction_to_sun  a unit vector
+    void restore(bool enabled, const KM_3dVector& direction_to_sun) {
+        m_state = {enabled, direction_to_sun};
+    }
+
     /// The light that the sun sheds; nothing while it is off.
     std::optional<KM_Light> light() const;
+
+    /// From now on every call of a plug-in is a breach.
+    void close() { m_is_open = false; }
+    bool isOpen() const { return m_is_open; }
 
     /// What plug-ins see of the sun.
     CQuarnSun& face() { return m_face; }
@@ -46,6 +56,7 @@ private:
     State m_state;
     std::vector<State> m_at_change_begin; ///< one for each open change
     CQuarnSun m_face;
+    bool m_is_open = true;
 };
 
 } // namespace quarn

@@ -1,5 +1,6 @@
 #include "host/document/LightStore.h"
 
+#include "host/app/Contract.h"
 #include "sdk/qncore/QnApp.h"
 #include "sdk/qncore/QnLocalize.h"
 
@@ -35,7 +36,7 @@ const CQuarnLight& LightStore::at(int index) const {
 
 int LightStore::add(const KM_Light& light) {
     if (!canShine(light))
-        return -1;
+        return no_index;
     m_slots.emplace_back().m_light = light;
     return count() - 1;
 }
@@ -57,19 +58,25 @@ std::vector<KM_Light> LightStore::shiningLights(int but) const {
 
 } // namespace quarn
 
+using quarn::mayCallDocument;
+
 int CQuarnLightTable::LightCount() const {
-    return m_lights->count();
+    return mayCallDocument(*m_lights, "CQuarnLightTable::LightCount") ? m_lights->count() : 0;
 }
 
 const CQuarnLight& CQuarnLightTable::operator[](int index) const {
-    return m_lights->at(index);
+    const bool allowed = mayCallDocument(*m_lights, "CQuarnLightTable::operator[]");
+    return m_lights->at(allowed ? index : quarn::LightStore::no_index);
 }
 
 int CQuarnLightTable::AddLight(const KM_Light& light, const KM_3dmObjectAttributes*) {
-    return m_lights->add(light);
+    const bool allowed = mayCallDocument(*m_lights, "CQuarnLightTable::AddLight");
+    return allowed ? m_lights->add(light) : quarn::LightStore::no_index;
 }
 
 bool CQuarnLightTable::DeleteLight(int index, bool quiet) {
+    if (!mayCallDocument(*m_lights, "CQuarnLightTable::DeleteLight"))
+        return false;
     const bool deleted = m_lights->remove(index);
     if (!deleted && !quiet)
         QuarnApp().Print(KM_wString::FormatToString(

@@ -10,6 +10,9 @@ namespace quarn {
 /// never means another light.
 class LightStore {
 public:
+    /// Names no slot of any table.
+    static constexpr int no_index = -1;
+
     LightStore() : m_face(*this) {}
     LightStore(const LightStore&) = delete;
     LightStore& operator=(const LightStore&) = delete;
@@ -20,7 +23,7 @@ public:
     int count() const { return static_cast<int>(m_slots.size()); }
     /// The light in a slot; one that counts as deleted for an index without a slot.
     const CQuarnLight& at(int index) const;
-    /// @return the index of the light's slot, or -1 when the light has no style, no valid place or
+    /// @return the index of the light's slot, or no_index when the light has no style, no valid place or
     ///         no direction where it needs one
     int add(const KM_Light& light);
     /// @return false, with nothing changed, when the index names no live light
@@ -30,6 +33,10 @@ public:
     /// @param but  index of one that is left out; an index without a slot leaves out none
     std::vector<KM_Light> shiningLights(int but = -1) const;
 
+    /// From now on every call of a plug-in is a breach.
+    void close() { m_is_open = false; }
+    bool isOpen() const { return m_is_open; }
+
     /// What plug-ins see of the table.
     CQuarnLightTable& face() { return m_face; }
 
@@ -37,6 +44,7 @@ private:
     std::vector<CQuarnLight> m_slots;
     CQuarnLight m_no_light = deletedLight();
     CQuarnLightTable m_face;
+    bool m_is_open = true;
 
     static CQuarnLight deletedLight();
 };

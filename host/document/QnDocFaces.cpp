@@ -1,60 +1,81 @@
 #include "host/app/Border.h"
+#include "host/app/Contract.h"
 #include "host/document/DocumentList.h"
 #include "host/front_end/FrontEnd.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
+using quarn::mayCallDocument;
+
+// ---- CQuarnDoc
+
 CQuarnDoc* CQuarnDoc::FromRuntimeSerialNumber(unsigned int serial_number) {
+    if (!quarn::isOnMainThread("CQuarnDoc::FromRuntimeSerialNumber"))
+        return nullptr;
     const quarn::DocumentList* list = quarn::DocumentList::current();
     quarn::Document* document = list ? list->find(serial_number) : nullptr;
     return document ? &document->face() : nullptr;
 }
 
 unsigned int CQuarnDoc::RuntimeSerialNumber() const {
+    mayCallDocument(*m_document, "CQuarnDoc::RuntimeSerialNumber");
     return m_document->serialNumber();
 }
 
 int CQuarnDoc::GetViewList(KM_SimpleArray<CQuarnView*>& views, bool model_views, bool) const {
     views.Empty();
-    if (model_views)
+    if (mayCallDocument(*m_document, "CQuarnDoc::GetViewList") && model_views)
         for (const auto& view : m_document->views())
             views.Append(&view->face());
     return views.Count();
 }
 
 double CQuarnDoc::AbsoluteTolerance() const {
-    return m_document->absoluteTolerance();
+    const bool allowed = mayCallDocument(*m_document, "CQuarnDoc::AbsoluteTolerance");
+    return allowed ? m_document->absoluteTolerance() : quarn::Document::default_absolute_tolerance;
 }
 
 CQuarnDocProperties& CQuarnDoc::Properties() {
+    mayCallDocument(*m_document, "CQuarnDoc::Properties");
     return m_document->properties();
 }
 
 CQuarnLightTable& CQuarnDoc::LightTable() {
+    mayCallDocument(*m_document, "CQuarnDoc::LightTable");
     return m_document->lights().face();
 }
 
 CQuarnSun& CQuarnDoc::Sun() {
+    mayCallDocument(*m_document, "CQuarnDoc::Sun");
     return m_document->sun().face();
 }
 
 const CQuarnObject* CQuarnDoc::FindObjectByName(const wchar_t* name) const {
-    const quarn::DocumentObject* object = name ? m_document->objects().findByName(name) : nullptr;
+    if (!mayCallDocument(*m_document, "CQuarnDoc::FindObjectByName") || !name)
+        return nullptr;
+    const quarn::DocumentObject* object = m_document->objects().findByName(name);
     return object ? &object->face : nullptr;
 }
 
 bool CQuarnDoc::HideObject(const CQuarnObjRef& object, bool) {
-    return m_document->objects().setVisible(object.ObjectUuid(), false);
+    return mayCallDocument(*m_document, "CQuarnDoc::HideObject") &&
+           m_document->objects().setVisible(object.ObjectUuid(), false);
 }
 
 bool CQuarnDoc::ShowObject(const CQuarnObjRef& object, bool) {
-    return m_document->objects().setVisible(object.ObjectUuid(), true);
+    return mayCallDocument(*m_document, "CQuarnDoc::ShowObject") &&
+           m_document->objects().setVisible(object.ObjectUuid(), true);
 }
 
 void CQuarnDoc::Regen() {
-    m_document->regenerate();
+    if (mayCallDocument(*m_document, "CQuarnDoc::Regen"))
+        m_document->regenerate();
 }
 
+// ---- CQuarnDocProperties
+
 KM_3dmAnimationProperties CQuarnDocProperties::AnimationProperties() const {
+    if (!mayCallDocument(*m_document, "CQuarnDocProperties::AnimationProperties"))
+        return {};
     const IQnZoetrixDynamicAccess* access = Zoetrix_QuarnDynamicAccess();
     if (!access)
         return {};
@@ -65,6 +86,8 @@ KM_3dmAnimationProperties CQuarnDocProperties::AnimationProperties() const {
 }
 
 void CQuarnDocProperties::SetAnimationProperties(const KM_3dmAnimationProperties& properties) {
+    if (!mayCallDocument(*m_document, "CQuarnDocProperties::SetAnimationProperties"))
+        return;
     IQnZoetrixDynamicAccess* access = Zoetrix_QuarnDynamicAccess();
     if (!access)
         return;

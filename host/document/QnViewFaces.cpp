@@ -1,79 +1,111 @@
+#include "host/app/Contract.h"
 #include "host/display/Image.h"
 #include "host/document/Document.h"
 
+using quarn::mayCallView;
+
+namespace {
+
+/// The camera of a view that is not there.
+const KM_Viewport& noCamera() {
+    static const KM_Viewport viewport;
+    return viewport;
+}
+
+} // namespace
+
+// ---- CQuarnViewport
+
 const wchar_t* CQuarnViewport::Name() const {
-    return m_view->name().Array();
+    return mayCallView(*m_view, "CQuarnViewport::Name") ? m_view->name().Array() : L"";
 }
 
 const KM_Viewport& CQuarnViewport::VP() const {
-    return m_view->viewport();
+    return mayCallView(*m_view, "CQuarnViewport::VP") ? m_view->viewport() : noCamera();
 }
 
 bool CQuarnViewport::SetVP(const KM_Viewport& viewport, bool update_target,
                            bool update_frame_size) {
-    return m_view->setViewport(viewport, update_target, update_frame_size);
+    return mayCallView(*m_view, "CQuarnViewport::SetVP") &&
+           m_view->setViewport(viewport, update_target, update_frame_size);
 }
 
 KM_3dPoint CQuarnViewport::Target() const {
-    return m_view->viewport().TargetPoint();
+    const bool allowed = mayCallView(*m_view, "CQuarnViewport::Target");
+    return allowed ? m_view->viewport().TargetPoint() : noCamera().TargetPoint();
 }
 
 bool CQuarnViewport::SetTargetAndCameraLocation(const KM_3dPoint& target, const KM_3dPoint& camera,
                                                 bool update_target, bool update_up) {
-    return m_view->setTargetAndCamera(target, camera, update_target, update_up);
+    return mayCallView(*m_view, "CQuarnViewport::SetTargetAndCameraLocation") &&
+           m_view->setTargetAndCamera(target, camera, update_target, update_up);
 }
 
 bool CQuarnViewport::SetDisplayMode(const KM_UUID& display_mode_id) {
-    return m_view->setDisplayMode(display_mode_id);
+    return mayCallView(*m_view, "CQuarnViewport::SetDisplayMode") &&
+           m_view->setDisplayMode(display_mode_id);
 }
 
 CQuarnDisplayPipeline* CQuarnViewport::DisplayPipeline() {
+    mayCallView(*m_view, "CQuarnViewport::DisplayPipeline");
     return &m_view->m_pipeline_face;
 }
+
+// ---- CQuarnView
 
 CQuarnView::~CQuarnView() = default;
 
 CQuarnViewport& CQuarnView::MainViewport() {
+    mayCallView(*m_view, "CQuarnView::MainViewport");
     return m_view->m_viewport_face;
 }
 
 const CQuarnViewport& CQuarnView::MainViewport() const {
+    mayCallView(*m_view, "CQuarnView::MainViewport");
     return m_view->m_viewport_face;
 }
 
 CQuarnViewport& CQuarnView::ActiveViewport() {
-    return MainViewport();
+    mayCallView(*m_view, "CQuarnView::ActiveViewport");
+    return m_view->m_viewport_face;
 }
 
 CQuarnDoc& CQuarnView::Document() const {
+    mayCallView(*m_view, "CQuarnView::Document");
     return m_view->document().face();
 }
 
 const CDisplayPipelineAttributes* CQuarnView::DisplayAttributes() const {
-    return m_view->displayMode();
+    return mayCallView(*m_view, "CQuarnView::DisplayAttributes") ? m_view->displayMode() : nullptr;
 }
 
 void CQuarnView::Redraw(unsigned int flags) {
-    m_view->redraw(flags);
+    if (mayCallView(*m_view, "CQuarnView::Redraw"))
+        m_view->redraw(flags);
 }
 
+// ---- CQuarnDisplayPipeline
+
 int CQuarnDisplayPipeline::FrameWidth() const {
-    return m_view->frameWidth();
+    return mayCallView(*m_view, "CQuarnDisplayPipeline::FrameWidth") ? m_view->frameWidth() : 0;
 }
 
 int CQuarnDisplayPipeline::FrameHeight() const {
-    return m_view->frameHeight();
+    return mayCallView(*m_view, "CQuarnDisplayPipeline::FrameHeight") ? m_view->frameHeight() : 0;
 }
 
 CDisplayPipelineAttributes* CQuarnDisplayPipeline::CurrentDisplayAttributes() {
-    return m_view->currentAttributes();
+    const bool allowed = mayCallView(*m_view, "CQuarnDisplayPipeline::CurrentDisplayAttributes");
+    return allowed ? m_view->currentAttributes() : nullptr;
 }
 
 bool CQuarnDisplayPipeline::DrawToDib(CQuarnDib& dib, int width, int height,
                                       const CDisplayPipelineAttributes& attributes) {
-    return m_view->draw(dib.Image(), width, height, attributes);
+    return mayCallView(*m_view, "CQuarnDisplayPipeline::DrawToDib") &&
+           m_view->draw(dib.Image(), width, height, attributes);
 }
 
 bool CQuarnDisplayPipeline::CopyToFrameBuffer(const CQuarnDib& dib) {
-    return m_view->copyToFrameBuffer(dib.Image());
+    return mayCallView(*m_view, "CQuarnDisplayPipeline::CopyToFrameBuffer") &&
+           m_view->copyToFrameBuffer(dib.Image());
 }

@@ -37,4 +37,15 @@ KM_Viewport standardViewport(const StandardView& view, const KM_3dPoint& target,
     return viewport;
 }
 
+KM_Viewport turnedTo(const StandardView& view, const KM_Viewport& viewport) {
+    const bool has_target = viewport.TargetDistance() > 0.0;
+    const KM_3dPoint target = has_target ? viewport.TargetPoint() : KM_3dPoint::Origin;
+    const double distance =
+        has_target ? viewport.TargetDistance() : viewport.CameraDirection().Length();
+    int width_px = 0;
+    int height_px = 0;
+    viewport.GetScreenPort(&width_px, &height_px);
+    return standardViewport(view, target, distance, width_px, height_px);
+}
+
 } // namespace quarn

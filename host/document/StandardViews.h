@@ -24,4 +24,8 @@ std::span<const StandardView> standardViews();
 KM_Viewport standardViewport(const StandardView& view, const KM_3dPoint& target, double distance,
                              int width_px, int height_px);
 
+/// A viewport turned to a standard direction: it looks at the target it had from the distance it
+/// had, in a picture of the same size. Without a target it looks at the origin.
+KM_Viewport turnedTo(const StandardView& view, const KM_Viewport& viewport);
+
 } // namespace quarn

@@ -35,6 +35,11 @@ ViewState& ViewState::of(const CQuarnView& view) {
     return *view.m_view;
 }
 
+void ViewState::close() {
+    m_is_open = false;
+    *m_frame_buffer = Image();
+}
+
 bool ViewState::setViewport(const KM_Viewport& viewport, bool update_target,
                             bool update_frame_size) {
     if (!viewport.IsValidCamera())

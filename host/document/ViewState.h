@@ -13,7 +13,8 @@ class Document;
 struct Image;
 
 /// A view: a named camera onto a document, its frame buffer and its display mode, with the three
-/// faces that plug-ins see of it. Owned by its document.
+/// faces that plug-ins see of it. Owned by its document, also when it was closed: a plug-in may
+/// keep a pointer to a face.
 class ViewState {
 public:
     static constexpr int default_width_px = 1280;
@@ -31,6 +32,11 @@ public:
     Document& document() const { return m_document; }
     const KM_wString& name() const { return m_name; }
     CQuarnView& face() { return m_view_face; }
+
+    /// Called by the document when it closes the view: its picture is freed, and from now on every
+    /// call on its faces is a breach.
+    void close();
+    bool isOpen() const { return m_is_open; }
 
     // ---- Camera
 
@@ -90,6 +96,7 @@ private:
     std::unique_ptr<Image> m_frame_buffer;
     std::uint64_t m_draw_count = 0;
     std::uint64_t m_show_count = 0;
+    bool m_is_open = true;
     CQuarnView m_view_face;
     CQuarnViewport m_viewport_face;
     CQuarnDisplayPipeline m_pipeline_face;

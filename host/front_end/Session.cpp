@@ -48,6 +48,14 @@ CQuarnDoc& Session::document() {
     return m_state->application.documents().active()->face();
 }
 
+bool Session::closeView(std::wstring_view name) {
+    Application& application = m_state->application;
+    const Result<void> closed = application.documents().active()->closeView(name);
+    if (!closed)
+        application.tell(closed.message());
+    return closed.ok();
+}
+
 bool Session::isExitRequested() const {
     return m_state->application.isExitRequested();
 }

@@ -7,6 +7,7 @@
 
 #include <filesystem>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -26,6 +27,10 @@ struct SessionOptions {
     /// The user's documents folder; empty takes it from the environment, and where that knows none
     /// there is none.
     std::filesystem::path documents_folder;
+    /// Whether the program ends where a plug-in breaks a rule of the interface; else a line on the
+    /// error output says so and the call does nothing. Nothing: strict where the environment
+    /// variable QUARN_STRICT is set to anything but 0.
+    std::optional<bool> strict = std::nullopt;
 };
 
 /// How a plug-in file was loaded, or why not.
@@ -92,6 +97,11 @@ public:
 
     /// The active document; there is always one. Valid until another one is opened.
     CQuarnDoc& document();
+
+    /// Closes the view with this name, ignoring case, of the active document. While a command runs,
+    /// also while it lets the front end work on events, the view stays until the command has ended.
+    /// @return false, with a message, when there is no such view and when no view would be left
+    bool closeView(std::wstring_view name);
 
     /// True once a command asked the program to end.
     bool isExitRequested() const;

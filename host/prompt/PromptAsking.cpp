@@ -100,7 +100,7 @@ CQuarnGet::result askQuestion(PromptState& prompt, const char* call) {
         return prompt.result;
     RunningCommand* command = application->runner().current();
     if (!command) {
-        application->reportBreach(call, "questions may be asked while a command runs");
+        reportBreach(call, "questions may be asked while a command runs");
         return prompt.result;
     }
     if (takeSelection(prompt.objects)) {

@@ -8,7 +8,10 @@ namespace quarn {
 class ViewState;
 }
 
-/// Draws a viewport. Owned by its viewport.
+/// Draws a viewport. Owned by its viewport. All calls belong on the main thread.
+///
+/// After its view was closed, or on another thread, every call is a breach of the interface: it is
+/// reported, changes nothing and returns 0, null or false.
 class QNCORE_API CQuarnDisplayPipeline {
 public:
     int FrameWidth() const;  ///< pixels of the view's frame buffer
@@ -16,7 +19,7 @@ public:
 
     /// The attributes that the view is drawn with: a copy of its display mode's, which the caller
     /// may change, made anew when the viewport's display mode is set. Null when the viewport has no
-    /// display mode. Valid as long as the viewport.
+    /// display mode. Valid until the view closes.
     CDisplayPipelineAttributes* CurrentDisplayAttributes();
 
     /// Draws the scene once into a picture.

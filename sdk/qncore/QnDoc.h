@@ -12,7 +12,14 @@ namespace quarn {
 class Document;
 }
 
-/// An open document. Owned by the host; stays open while a command runs.
+/// An open document. Owned by the host; stays open while a command runs. All calls belong on the
+/// main thread.
+///
+/// A plug-in that keeps a pointer longer keeps an object that stays until the session ends, but
+/// once the document was closed every call on it, on its properties, its lights and its sun is a
+/// breach of the interface: it is reported, as in "CQuarnDoc::Regen: the document was closed",
+/// changes nothing and returns its number, an empty list, the tolerance of a new document, the
+/// parts it had, null or false. So does a call on another thread.
 class QNCORE_API CQuarnDoc {
 public:
     CQuarnDoc(const CQuarnDoc&) = delete;

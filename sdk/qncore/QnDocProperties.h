@@ -8,10 +8,12 @@ class Document;
 }
 
 /// The settings of a document. The animation record is kept by the plug-in that registered its
-/// dynamic-access object; these calls reach it through that object.
+/// dynamic-access object; these calls reach it through that object. On a closed document and on
+/// another thread than the main one they are breaches of the interface, which are reported.
 class QNCORE_API CQuarnDocProperties {
 public:
-    /// A copy of the animation record; a fresh record while no plug-in keeps one.
+    /// A copy of the animation record; a fresh record while no plug-in keeps one, and
+    /// after a breach.
     KM_3dmAnimationProperties AnimationProperties() const;
 
     /// Hands the whole record to the plug-in that keeps it. Does nothing while there is none.

@@ -23,6 +23,10 @@ private:
 
 /// The lights of a document. Slots are never reused: an index stays good as long as its document,
 /// also when its light was deleted.
+///
+/// All calls belong on the main thread and to an open document. Any other is a breach of the
+/// interface: it is reported, changes nothing and behaves as for a table without lights that takes
+/// none.
 class QNCORE_API CQuarnLightTable {
 public:
     /// How many slots there are, deleted ones too.

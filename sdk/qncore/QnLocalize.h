@@ -21,7 +21,8 @@ struct CQuarnCommandOptionValue {
 /// @param english  the English text, which is also the fallback; not null
 /// @param id       the text's fixed number in the string tables; 0 is never looked up
 /// @return a text that stays valid until the program ends; for id 0, or an id that no table holds,
-///         `english` itself. Strings, option names and option values are separate tables.
+///         `english` itself, and so on another thread than the main one, which is a breach of the
+///         interface. Strings, option names and option values are separate tables.
 QNCORE_API const wchar_t* QnLocalizeString(const wchar_t* english, int id);
 
 /// An option name with its local form; as QnLocalizeString otherwise.

@@ -12,7 +12,9 @@ namespace quarn {
 struct DocumentObject;
 }
 
-/// Something in a document: a mesh, a curve or a point. Owned by its document.
+/// Something in a document: a mesh, a curve or a point. Owned by its document. A call on another
+/// thread than the main one is a breach of the interface: it is reported and returns nil, an empty
+/// name, false or null.
 class QNCORE_API CQuarnObject {
 public:
     KM_UUID Id() const;
@@ -30,7 +32,8 @@ private:
 };
 
 /// A reference to an object of an open document by its id. It names the object and keeps nothing
-/// alive: what it returns is null once the object is gone, and the object again when it is back.
+/// alive: what it returns is null once the object is gone, and the object again when it is back. On
+/// another thread than the main one Object and Curve are breaches of the interface, and null.
 class QNCORE_API CQuarnObjRef {
 public:
     /// Refers to nothing.

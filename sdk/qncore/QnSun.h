@@ -9,6 +9,9 @@ class DocumentSun;
 
 /// The sun that shines on a document in the modes that use its lights. Changes are made between
 /// BeginChange and EndChange, so that views are told once.
+///
+/// All calls belong on the main thread and to an open document. Any other is a breach of the
+/// interface: it is reported, changes nothing and returns false or the direction straight up.
 class QNCORE_API CQuarnSun {
 public:
     /// What a change is made by.

@@ -11,7 +11,11 @@ namespace quarn {
 class ViewState;
 }
 
-/// The camera and the name of a view. Owned by its view.
+/// The camera and the name of a view. Owned by its view. All calls belong on the main thread.
+///
+/// After its view was closed the object stays until the session ends, and every call on it is a
+/// breach of the interface: it is reported, changes nothing and returns false, an empty name, the
+/// camera of a new KM_Viewport or that one's target. So does a call on another thread.
 class QNCORE_API CQuarnViewport {
 public:
     const wchar_t* Name() const; ///< valid until the view is renamed
@@ -39,7 +43,7 @@ public:
     /// @return false, and nothing changes, for an id that is no display mode's
     bool SetDisplayMode(const KM_UUID& display_mode_id);
 
-    /// What draws the viewport; never null while the view is open.
+    /// What draws the viewport; never null. After the view was closed its calls are breaches too.
     CQuarnDisplayPipeline* DisplayPipeline();
 
 private:
@@ -48,7 +52,14 @@ private:
     quarn::ViewState* m_view;
 };
 
-/// A named window onto a document. Owned by the document.
+/// A named window onto a document. Owned by the document. All calls belong on the main thread.
+///
+/// A view never closes while a command runs. A plug-in that keeps a pointer longer keeps an object
+/// that stays until the session ends, but once the view was closed every call on it is a breach of
+/// the interface: it is reported, as in "CQuarnView::Redraw: the view was closed", and does
+/// nothing. The viewports and the document that it returns then are the ones it had;
+/// DisplayAttributes is null. So it is for a call on another thread. Look a view up by its name
+/// instead of keeping it.
 class QNCORE_API CQuarnView {
 public:
     virtual ~CQuarnView();

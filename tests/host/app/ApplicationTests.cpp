@@ -5,6 +5,7 @@
 #include "sdk/qncore/QnView.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 #include "sdk/vexui/VexUi.h"
+#include "tests/host/app/BreachList.h"
 #include "tests/host/app/TestCommand.h"
 #include "tests/host/document/DocumentFixtures.h"
 
@@ -51,16 +52,16 @@ TEST_F(HostTest, OneWindowObjectStandsForOneWindow) {
 
 TEST_F(HostTest, CallsFromAnotherThreadAreIgnoredAndTold) {
     CQuarnDoc* seen = &session.document();
-    testing::internal::CaptureStderr();
+    BreachList breaches;
     std::thread([&] {
         QuarnApp().Print(L"from a thread");
         seen = QuarnApp().ActiveDoc();
     }).join();
-    const std::string told = testing::internal::GetCapturedStderr();
     EXPECT_EQ(seen, nullptr);
     EXPECT_EQ(printed(), "");
-    EXPECT_NE(told.find("CQuarnApp::Print was called outside the main thread"), std::string::npos);
-    EXPECT_NE(told.find("CQuarnApp::ActiveDoc"), std::string::npos);
+    EXPECT_EQ(breaches.take(),
+              (std::vector<std::string>{"CQuarnApp::Print: only the main thread may call it",
+                                        "CQuarnApp::ActiveDoc: only the main thread may call it"}));
 }
 
 TEST(WithoutASession, CallsFindNothingAndDoNoHarm) {

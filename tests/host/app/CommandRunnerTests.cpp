@@ -1,6 +1,7 @@
 #include "sdk/qncore/QnApp.h"
 #include "sdk/qncore/QnDoc.h"
 #include "sdk/qncore/QnGet.h"
+#include "tests/host/app/BreachList.h"
 #include "tests/host/app/TestCommand.h"
 #include "tests/support/TempFolder.h"
 
@@ -12,6 +13,7 @@
 namespace quarn::test {
 namespace {
 
+using testing::ElementsAre;
 using testing::HasSubstr;
 
 class CommandRunnerTest : public HostTest {
@@ -147,15 +149,19 @@ TEST_F(CommandRunnerTest, AnOrdinaryCommandMayRunNoScript) {
         return CQuarnCommand::success;
     });
     add(ordinary);
+    BreachList breaches;
     run(L"Ordinary");
     EXPECT_FALSE(ran);
     EXPECT_EQ(good_runs, 0);
-    EXPECT_THAT(printed(), HasSubstr("CQuarnApp::RunScript was refused: only a running "
-                                     "CQuarnScriptCommand may call it."));
+    EXPECT_THAT(breaches.take(), ElementsAre("CQuarnApp::RunScript: only a running "
+                                             "CQuarnScriptCommand may call it"));
 }
 
 TEST_F(CommandRunnerTest, NoScriptRunsOutsideACommandOrInADocumentThatIsNotOpen) {
+    BreachList breaches;
     EXPECT_FALSE(QuarnApp().RunScript(session.document().RuntimeSerialNumber(), L"Good", 0));
+    EXPECT_THAT(breaches.take(), ElementsAre("CQuarnApp::RunScript: only a running "
+                                             "CQuarnScriptCommand may call it"));
     bool ran = true;
     TestScriptCommand outer(L"Outer", [&](const CQuarnCommandContext&) {
         ran = QuarnApp().RunScript(0, L"Good", 0);
@@ -165,6 +171,7 @@ TEST_F(CommandRunnerTest, NoScriptRunsOutsideACommandOrInADocumentThatIsNotOpen)
     run(L"Outer");
     EXPECT_FALSE(ran);
     EXPECT_EQ(good_runs, 0);
+    EXPECT_THAT(breaches.take(), ElementsAre("CQuarnApp::RunScript: it names no open document"));
 }
 
 // ---- Script files
