@@ -54,6 +54,18 @@ bool CQuarnPlugIn::OnLoadPlugIn() {
 
 void CQuarnPlugIn::OnUnloadPlugIn() {}
 
+bool CQuarnPlugIn::CallWriteDocument(const CQuarnFileWriteOptions&) {
+    return false;
+}
+
+bool CQuarnPlugIn::WriteDocument(CQuarnDoc&, KM_BinaryArchive&, const CQuarnFileWriteOptions&) {
+    return true;
+}
+
+bool CQuarnPlugIn::ReadDocument(CQuarnDoc&, KM_BinaryArchive&, const CQuarnFileReadOptions&) {
+    return true;
+}
+
 bool CQuarnPlugIn::PlugInIsLoaded(const KM_UUID& id) {
     quarn::Application* application = quarn::Application::forCall("CQuarnPlugIn::PlugInIsLoaded");
     return application && application->plugIns().isLoaded(id);

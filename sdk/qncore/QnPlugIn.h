@@ -3,6 +3,10 @@
 #include "kelmar/KM_Uuid.h"
 #include "kelmar/KM_wString.h"
 #include "sdk/qncore/QnExport.h"
+#include "sdk/qncore/QnFileOptions.h"
+
+class CQuarnDoc;
+class KM_BinaryArchive;
 
 /// The base of every plug-in. A plug-in file has exactly one such object, a global one. Its
 /// constructor only announces it: the host looks at it after the file's version exports were
@@ -46,6 +50,26 @@ public:
     virtual bool OnLoadPlugIn();
     /// Called once before the plug-in is unloaded. The base does nothing.
     virtual void OnUnloadPlugIn();
+
+    /// Whether the plug-in has something to keep in the document file that is about to be written.
+    /// The base returns false.
+    virtual bool CallWriteDocument(const CQuarnFileWriteOptions& options);
+    /// Writes the plug-in's chunk of a document file. Called after CallWriteDocument returned true.
+    /// What is written begins with KM_BinaryArchive::Write3dmChunkVersion; a plug-in that writes
+    /// nothing at all has no chunk.
+    /// @param archive  the plug-in's own, valid during the call
+    /// @return false when that failed: the document is not saved then. The base returns true.
+    virtual bool WriteDocument(CQuarnDoc& doc, KM_BinaryArchive& archive,
+                               const CQuarnFileWriteOptions& options);
+    /// Reads the plug-in's chunk of a document file. The host calls it when a file with such a
+    /// chunk was opened or imported, after its objects, views and lights are in the document, and
+    /// when the plug-in is loaded while a document with such a chunk is open.
+    /// @param archive  stands behind the chunk's version, which is archive.ChunkVersion(), and ends
+    ///                 where the chunk ends; valid during the call
+    /// @return false when the chunk cannot be read; the host tells that and keeps its bytes. The
+    ///         base returns true.
+    virtual bool ReadDocument(CQuarnDoc& doc, KM_BinaryArchive& archive,
+                              const CQuarnFileReadOptions& options);
 
     /// Whether the plug-in with this id is loaded now.
     static bool PlugInIsLoaded(const KM_UUID& id);

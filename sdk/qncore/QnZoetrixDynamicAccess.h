@@ -7,6 +7,10 @@
 
 class CQuarnDoc;
 
+/// The id of the plug-in that sets up animations: 3AA81848-5635-41BB-ABDB-0EC069BC5519.
+inline constexpr KM_UUID ZoetrixPlugInId = {
+    0x3AA81848, 0x5635, 0x41BB, {0xAB, 0xDB, 0x0E, 0xC0, 0x69, 0xBC, 0x55, 0x19}};
+
 /// Through this object the host, and whatever else is loaded, reaches the animation of a document:
 /// its record, and the camera or the sun of any frame. The animation plug-in implements it and
 /// registers one object; the order of the virtual operations is part of the interface.

@@ -11,6 +11,7 @@
 #include "sdk/qncore/QnDoc.h"
 #include "sdk/qncore/QnDocProperties.h"
 #include "sdk/qncore/QnExport.h"
+#include "sdk/qncore/QnFileOptions.h"
 #include "sdk/qncore/QnFileUtilities.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLightTable.h"

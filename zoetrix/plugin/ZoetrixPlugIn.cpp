@@ -24,8 +24,7 @@ const wchar_t* CZoetrixPlugIn::PlugInVersion() const {
 }
 
 KM_UUID CZoetrixPlugIn::PlugInID() const {
-    // 3AA81848-5635-41BB-ABDB-0EC069BC5519
-    return {0x3AA81848, 0x5635, 0x41BB, {0xAB, 0xDB, 0x0E, 0xC0, 0x69, 0xBC, 0x55, 0x19}};
+    return ZoetrixPlugInId;
 }
 
 CQuarnPlugIn::plugin_load_time CZoetrixPlugIn::PlugInLoadTime() const {

@@ -32,6 +32,21 @@ public:
     /// Takes the dynamic access away from the host. The record keeps its last value.
     void OnUnloadPlugIn() override;
 
+    /// True when there is an animation to keep: the whole document is saved, for a program that
+    /// knows animations (version 4 or above), the record has a kind and both point arrays hold
+    /// points.
+    bool CallWriteDocument(const CQuarnFileWriteOptions& options) override;
+    /// Writes the record behind the chunk version 5.0; nothing, with success, when only selected
+    /// objects are saved or the file is for a version below 4.
+    /// @return false when the archive or the record refuses
+    bool WriteDocument(CQuarnDoc& doc, KM_BinaryArchive& archive,
+                       const CQuarnFileWriteOptions& options) override;
+    /// Replaces the record by the one in the archive. A read into a document that exists already
+    /// first empties the record, so that a chunk which cannot be read leaves nothing to be played.
+    /// @return false when the archive holds no record
+    bool ReadDocument(CQuarnDoc& doc, KM_BinaryArchive& archive,
+                      const CQuarnFileReadOptions& options) override;
+
     /// The record. Commands copy it, change the copy, and hand the copy back through the document's
     /// properties. Valid as long as the plug-in.
     const KM_3dmAnimationProperties& AnimationProperties(const CQuarnDoc& doc) const;
