@@ -2,8 +2,12 @@
 
 #include "host/app/Application.h"
 #include "host/app/Border.h"
+#include "host/app/FileOptionsAccess.h"
+#include "host/app/PlugInChunks.h"
 #include "host/app/PlugInExports.h"
 #include "host/display/DisplayModeList.h"
+#include "host/document/file/FileRemainder.h"
+#include "sdk/qncore/QnZoetrixDynamicAccess.h"
 #include "sdk/vexui/VexUi.h"
 
 #include <algorithm>
@@ -38,6 +42,7 @@ struct PlugInLoader::Loaded {
 
 PlugInLoader::PlugInLoader(Application& application) : m_application(application) {
     m_catalogue[ZelVexUiPlugInId] = "ZEL_VexUI.qnp";
+    m_catalogue[ZoetrixPlugInId] = "Zoetrix.qnp";
 }
 
 PlugInLoader::~PlugInLoader() {
@@ -53,6 +58,18 @@ const PlugInLoader::Loaded* PlugInLoader::find(const KM_UUID& id) const {
     const auto found =
         std::ranges::find(m_loaded, id, [](const auto& loaded) { return loaded->id; });
     return found == m_loaded.end() ? nullptr : found->get();
+}
+
+CQuarnPlugIn* PlugInLoader::findPlugIn(const KM_UUID& id) const {
+    const Loaded* loaded = find(id);
+    return loaded ? loaded->plug_in : nullptr;
+}
+
+std::vector<LoadedPlugIn> PlugInLoader::loaded() const {
+    std::vector<LoadedPlugIn> plug_ins;
+    for (const auto& loaded : m_loaded)
+        plug_ins.push_back({loaded->id, loaded->plug_in});
+    return plug_ins;
 }
 
 void* PlugInLoader::findEntry(const KM_UUID& plug_in_id, const char* name) const {
@@ -145,7 +162,20 @@ PlugInLoad PlugInLoader::adopt(std::unique_ptr<Loaded> candidate, const PendingO
     m_catalogue[candidate->id] = candidate->file;
     m_loaded.push_back(std::move(candidate));
     m_application.documents().rememberFreshRecord();
+    readWhatWaited(m_loaded.back()->id);
     return started;
+}
+
+/// A document that was opened before the plug-in was loaded kept what the plug-in has in its file.
+void PlugInLoader::readWhatWaited(const KM_UUID& id) {
+    Document* document = m_application.documents().active();
+    if (!document)
+        return;
+    const std::vector<PlugInContent> waiting = document->fileRemainder().of(id);
+    const auto options = FileOptionsAccess::forReading(CQuarnFileReadOptions::open_mode);
+    for (const std::string& warning :
+         readPlugInContents(m_application, *document, waiting, options))
+        m_application.tell(warning);
 }
 
 PlugInLoad PlugInLoader::takeObjects(Loaded& candidate, const PendingObjects& objects) const {

@@ -14,6 +14,12 @@ namespace quarn {
 
 class Application;
 
+/// A plug-in that is loaded. The object lives until the plug-in is unloaded.
+struct LoadedPlugIn {
+    KM_UUID id = KM_nil_uuid;
+    CQuarnPlugIn* plug_in = nullptr;
+};
+
 /// Loads plug-ins and keeps them until the session ends.
 class PlugInLoader {
 public:
@@ -26,8 +32,8 @@ public:
     /// Loads a plug-in file.
     PlugInLoad load(const std::filesystem::path& file);
 
-    /// Loads a plug-in by its id: the host's dialog plug-in, or one that was loaded before in this
-    /// session, from the file it came from.
+    /// Loads a plug-in by its id: the animation plug-in, the host's dialog plug-in, or one that was
+    /// loaded before in this session, from the file it came from.
     /// @param ignore_disabled  also one that says it is never to be loaded
     PlugInLoad loadById(const KM_UUID& id, bool ignore_disabled);
 
@@ -35,6 +41,10 @@ public:
     PlugInLoad adoptProgram();
 
     bool isLoaded(const KM_UUID& id) const { return find(id) != nullptr; }
+    /// The loaded plug-in with this id, or null.
+    CQuarnPlugIn* findPlugIn(const KM_UUID& id) const;
+    /// The loaded plug-ins in the order in which they were loaded.
+    std::vector<LoadedPlugIn> loaded() const;
 
     /// The address of a name that a loaded plug-in exports; null when the plug-in is not loaded or
     /// exports no such name.
@@ -57,6 +67,7 @@ private:
     PlugInLoad registerCommands(Loaded& candidate);
     PlugInLoad startUp(Loaded& candidate);
     void loadTexts(const Loaded& candidate);
+    void readWhatWaited(const KM_UUID& id);
     void withdraw(Loaded& loaded);
     void unload(Loaded& loaded);
 

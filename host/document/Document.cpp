@@ -5,6 +5,7 @@
 #include "host/document/DocumentScene.h"
 #include "host/document/SceneChanges.h"
 #include "host/document/StandardViews.h"
+#include "host/document/file/FileRemainder.h"
 #include "host/front_end/FrontEnd.h"
 #include "host/import/ModelFile.h"
 #include "kelmar/KM_PolylineCurve.h"
@@ -25,8 +26,13 @@ constexpr double TOLERANCE_OF_SIZE = 1e-6;
 
 } // namespace
 
+const KM_UUID& Document::standardModeFor(const KM_Viewport& viewport) {
+    return viewport.IsPerspectiveProjection() ? shaded_mode_id : wireframe_mode_id;
+}
+
 Document::Document(DocumentList& list, unsigned int serial_number)
-    : m_list(list), m_serial_number(serial_number), m_properties(*this), m_face(*this) {
+    : m_list(list), m_serial_number(serial_number),
+      m_file_remainder(std::make_unique<FileRemainder>()), m_properties(*this), m_face(*this) {
     addStandardViews();
 }
 
@@ -51,6 +57,15 @@ void Document::addStandardViews() {
 
 void Document::close() {
     m_is_open = false;
+    closeAllViews();
+    m_lights.close();
+    m_sun.close();
+    m_scene.reset();
+    m_objects = ObjectTable();
+    m_named_views.clear();
+}
+
+void Document::closeAllViews() {
     m_due_views.clear();
     m_active_view = nullptr;
     for (std::unique_ptr<ViewState>& view : m_views) {
@@ -58,11 +73,6 @@ void Document::close() {
         m_closed_views.push_back(std::move(view));
     }
     m_views.clear();
-    m_lights.close();
-    m_sun.close();
-    m_scene.reset();
-    m_objects = ObjectTable();
-    m_named_views.clear();
 }
 
 ViewState* Document::findView(std::wstring_view name) const {
@@ -95,7 +105,7 @@ Result<ViewState*> Document::addView(const KM_wString& name, const KM_Viewport& 
         return checked.error();
     m_views.push_back(std::make_unique<ViewState>(*this, name, viewport));
     ViewState* view = m_views.back().get();
-    view->setDisplayMode(viewport.IsPerspectiveProjection() ? shaded_mode_id : wireframe_mode_id);
+    view->setDisplayMode(standardModeFor(viewport));
     return view;
 }
 

@@ -4,10 +4,13 @@
 #include "host/document/DocumentSun.h"
 #include "host/document/LightStore.h"
 #include "host/document/ObjectTable.h"
+#include "host/document/UnitSystem.h"
 #include "host/document/ViewState.h"
 #include "sdk/qncore/QnDoc.h"
 
+#include <filesystem>
 #include <memory>
+#include <string>
 #include <string_view>
 #include <vector>
 
@@ -17,6 +20,8 @@ class DocumentList;
 class DocumentScene;
 class FrontEnd;
 struct DisplayModeAttributes;
+struct DocumentContent;
+struct FileRemainder;
 struct Image;
 struct ImportedModel;
 struct SceneChanges;
@@ -74,6 +79,8 @@ public:
     /// and shaded in perspective. The active view stays.
     /// @return the view, or the error of checkNewViewName
     Result<ViewState*> addView(const KM_wString& name, const KM_Viewport& viewport);
+    /// The display mode that a new view gets: shaded in perspective, else wireframe.
+    static const KM_UUID& standardModeFor(const KM_Viewport& viewport);
     /// Closes the view with this name, ignoring case; while a command runs, when the outermost one
     /// has ended. When it was the active one, the view behind it becomes active, or the last one.
     /// @return an error when there is no such view and when no view would be left
@@ -83,11 +90,32 @@ public:
     const std::vector<NamedView>& namedViews() const { return m_named_views; }
 
     double absoluteTolerance() const { return m_absolute_tolerance; }
+    UnitSystem units() const { return m_units; }
+
+    /// The document file that the document was opened from or saved to last; empty when there is
+    /// none.
+    const std::filesystem::path& file() const { return m_file; }
+    void setFile(const std::filesystem::path& file) { m_file = file; }
+
+    /// What of the file it came from nobody here understands, to be written back.
+    FileRemainder& fileRemainder() { return *m_file_remainder; }
 
     /// Adds all that a model file holds. Meshes are shared, not copied. The tolerance becomes a
     /// millionth of the box of all objects where that is less than it was, so that a model of a
     /// millimetre in a document of metres is not smaller than what counts as one point.
     void addModel(const ImportedModel& model);
+
+    /// Takes over what a document file holds, in place of what the document has; for a document
+    /// that was opened for the file just now. What plug-ins keep is not looked at.
+    /// @return what could not be taken over, in sentences for the person
+    std::vector<std::string> openContent(const DocumentContent& content);
+    /// Adds the objects, cameras and lights of a document file.
+    /// @return for each slot of the file's light table the index of the light here; no_index for
+    ///         lights that were deleted
+    std::vector<int> addContent(const DocumentContent& content);
+    /// What a document file has to hold of the document; what plug-ins keep is left out.
+    /// @param only_selected  take the selected objects alone, without views, cameras and lights
+    DocumentContent content(bool only_selected) const;
 
     /// The lights that shine now: the sun, when it is on, and the lights of the table.
     std::vector<KM_Light> shiningLights() const;
@@ -105,6 +133,10 @@ public:
 
 private:
     void addStandardViews();
+    void closeAllViews();
+    void addObjects(const DocumentContent& content);
+    void addCameras(const DocumentContent& content);
+    std::vector<std::string> replaceViews(const DocumentContent& content);
     void fitTolerance();
     std::vector<KM_Light> shiningLights(const SceneChanges& changes) const;
     void closeNow(ViewState& view);
@@ -115,6 +147,9 @@ private:
     LightStore m_lights;
     DocumentSun m_sun;
     double m_absolute_tolerance = default_absolute_tolerance;
+    UnitSystem m_units = UnitSystem::none;
+    std::filesystem::path m_file;
+    std::unique_ptr<FileRemainder> m_file_remainder;
     std::vector<NamedView> m_named_views;
     std::vector<std::unique_ptr<ViewState>> m_views;
     ViewState* m_active_view = nullptr;

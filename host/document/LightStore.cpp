@@ -41,6 +41,12 @@ int LightStore::add(const KM_Light& light) {
     return count() - 1;
 }
 
+void LightStore::addDeleted(const KM_Light& light) {
+    CQuarnLight& slot = m_slots.emplace_back();
+    slot.m_light = light;
+    slot.m_deleted = true;
+}
+
 bool LightStore::remove(int index) {
     if (at(index).IsDeleted())
         return false;

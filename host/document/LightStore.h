@@ -23,11 +23,12 @@ public:
     int count() const { return static_cast<int>(m_slots.size()); }
     /// The light in a slot; one that counts as deleted for an index without a slot.
     const CQuarnLight& at(int index) const;
-    /// @return the index of the light's slot, or no_index when the light has no style, no valid place or
-    ///         no direction where it needs one
+    /// @return the index of the light's slot, or no_index when the light cannot shine
     int add(const KM_Light& light);
     /// @return false, with nothing changed, when the index names no live light
     bool remove(int index);
+    /// Adds the slot of a light that is gone, for the indices of a stored table to stay the same.
+    void addDeleted(const KM_Light& light);
 
     /// The lights that are there and switched on.
     /// @param but  index of one that is left out; an index without a slot leaves out none

@@ -1,0 +1,27 @@
+#pragma once
+
+#include <cstdint>
+
+namespace quarn::chunk {
+
+/// The id of a chunk whose first four bytes spell a name.
+constexpr std::uint32_t named(const char (&name)[5]) {
+    std::uint32_t id = 0;
+    for (int i = 3; i >= 0; --i)
+        id = id << 8 | static_cast<unsigned char>(name[i]);
+    return id;
+}
+
+inline constexpr std::uint32_t SETTINGS = named("DOCU");
+inline constexpr std::uint32_t TEXTURE = named("TEXR");
+inline constexpr std::uint32_t MATERIAL = named("MATL");
+inline constexpr std::uint32_t MESH = named("MESH");
+inline constexpr std::uint32_t OBJECT = named("OBJT");
+inline constexpr std::uint32_t VIEW = named("VIEW");
+inline constexpr std::uint32_t CAMERA = named("CAMR");
+inline constexpr std::uint32_t LIGHT = named("LITE");
+inline constexpr std::uint32_t PLUG_IN = named("PLUG");
+/// The last one: a file without it was cut off.
+inline constexpr std::uint32_t END = named("DEND");
+
+} // namespace quarn::chunk

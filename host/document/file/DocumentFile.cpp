@@ -1,0 +1,94 @@
+#include "host/document/file/DocumentFile.h"
+
+#include "host/app/Application.h"
+#include "host/app/AtomicFile.h"
+#include "host/app/FileOptionsAccess.h"
+#include "host/app/PathText.h"
+#include "host/app/PlugInChunks.h"
+#include "host/document/Document.h"
+#include "host/document/file/DocumentCoding.h"
+#include "host/document/file/FileBytes.h"
+#include "host/document/file/FileRemainder.h"
+#include "sdk/qncore/QnZoetrixDynamicAccess.h"
+
+#include <algorithm>
+
+namespace quarn {
+
+namespace {
+
+Error cannot(const char* verb, const std::filesystem::path& file, const std::string& why) {
+    return {std::string("Cannot ") + verb + " " + textFromPath(file).ToUtf8() + ": " + why + "."};
+}
+
+/// The record names the sun light of an animation by its place in the light table of the file; here
+/// it stands elsewhere, or is gone.
+void moveLightIndex(Document& document, const std::vector<int>& indices) {
+    KM_3dmAnimationProperties record = document.properties().AnimationProperties();
+    const int index = record.LightIndex();
+    const bool known = index >= 0 && static_cast<std::size_t>(index) < indices.size();
+    record.SetLightIndex(known ? indices[static_cast<std::size_t>(index)] : LightStore::no_index);
+    document.properties().SetAnimationProperties(record);
+}
+
+bool hasAnimation(const DocumentContent& content) {
+    return std::ranges::find(content.plug_ins, ZoetrixPlugInId, &PlugInContent::plug_in_id) !=
+           content.plug_ins.end();
+}
+
+} // namespace
+
+bool isDocumentFile(const std::filesystem::path& file) {
+    const KM_wString extension = textFromPath(file.extension());
+    return extension.CompareNoCase(KM_wString::FromUtf8(DOCUMENT_EXTENSION)) == 0;
+}
+
+Result<void> saveDocument(Document& document, const std::filesystem::path& file,
+                          const DocumentSaveOptions& options) {
+    DocumentContent content = document.content(options.only_selected);
+    content.version = options.version;
+    auto plug_ins =
+        plugInContents(*Application::current(), document,
+                       FileOptionsAccess::forWriting(options.only_selected, options.version,
+                                                     document.serialNumber()));
+    if (!plug_ins)
+        return cannot("save", file, plug_ins.message());
+    content.plug_ins = std::move(plug_ins.value());
+    if (!options.only_selected && options.version == KM_CURRENT_ARCHIVE_VERSION)
+        content.unknown = document.fileRemainder().unknown;
+    const auto bytes = encodeDocument(content);
+    if (!bytes)
+        return cannot("save", file, bytes.message());
+    return writeFileAtomically(file, std::as_bytes(std::span(bytes.value())), FileSync::yes);
+}
+
+Result<DocumentContent> readDocumentFile(const std::filesystem::path& file) {
+    const auto bytes = readFileBytes(file);
+    if (!bytes)
+        return cannot("read", file, bytes.message());
+    auto content = decodeDocument(bytes.value().bytes());
+    if (!content)
+        return cannot("read", file, content.message());
+    return content;
+}
+
+std::vector<std::string> openContent(Document& document, const DocumentContent& content) {
+    std::vector<std::string> warnings = document.openContent(content);
+    const auto options = FileOptionsAccess::forReading(CQuarnFileReadOptions::open_mode);
+    for (std::string& warning :
+         readPlugInContents(*Application::current(), document, content.plug_ins, options))
+        warnings.push_back(std::move(warning));
+    return warnings;
+}
+
+std::vector<std::string> importContent(Document& document, const DocumentContent& content) {
+    const std::vector<int> light_indices = document.addContent(content);
+    const auto options = FileOptionsAccess::forReading(CQuarnFileReadOptions::import_mode);
+    std::vector<std::string> warnings =
+        readPlugInContents(*Application::current(), document, content.plug_ins, options);
+    if (hasAnimation(content))
+        moveLightIndex(document, light_indices);
+    return warnings;
+}
+
+} // namespace quarn
