@@ -57,7 +57,8 @@ const KM_Curve* CQuarnObject::Curve() const {
 }
 
 const KM_3dPoint* CQuarnObject::Point() const {
-    return m_object->point ? &*m_object->point : nullptr;
+    const bool is_there = isOnMainThread("CQuarnObject::Point") && m_object->point;
+    return is_there ? &*m_object->point : nullptr;
 }
 
 CQuarnObjRef::CQuarnObjRef() = default;

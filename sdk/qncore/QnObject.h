@@ -33,7 +33,8 @@ private:
 
 /// A reference to an object of an open document by its id. It names the object and keeps nothing
 /// alive: what it returns is null once the object is gone, and the object again when it is back. On
-/// another thread than the main one Object and Curve are breaches of the interface, and null.
+/// another thread than the main one Object, Curve and Point are breaches of the interface, and
+/// null.
 class QNCORE_API CQuarnObjRef {
 public:
     /// Refers to nothing.
