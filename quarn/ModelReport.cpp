@@ -60,7 +60,7 @@ Outcome reportModel(const ModelOptions& options) {
         return *trouble;
     const auto read_time = std::chrono::steady_clock::now() - start;
     front_end.keepWords();
-    if (const auto trouble = host.run("_-List"))
+    if (const auto trouble = host.run("_-List _Objects"))
         return *trouble;
     return Outcome::success(fileReport(options.model, read_time) + front_end.keptWords());
 }

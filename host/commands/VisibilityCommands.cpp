@@ -9,8 +9,11 @@ namespace {
 CQuarnCommand::result setVisibility(CQuarnDoc& doc, const wchar_t* prompt, bool visible) {
     const PickedObjects picked = askObjects(prompt);
     ObjectTable& objects = Document::of(doc).objects();
-    for (const KM_UUID& id : picked.ids)
+    for (const KM_UUID& id : picked.ids) {
         objects.setVisible(id, visible);
+        if (!visible)
+            objects.select(id, false); // so that no later command works on what nobody sees
+    }
     return picked.result;
 }
 

@@ -31,7 +31,7 @@ TEST(ModelReport, TellsTheFileAndWhatIsInIt) {
                             MatchesRegex("read in: [0-9]+ ms"), StrEq("hall  mesh, 12 triangles"),
                             StrEq("tower  mesh, 12 triangles"),
                             MatchesRegex("2 meshes with 24 triangles and [0-9]+ vertices, .*, "
-                                         "0 curves, 0 points; 0 hidden"),
+                                         "0 curves, 0 points; 0 hidden, 0 selected"),
                             StrEq("from 0,0,0 to 4,2,4, size 4 x 2 x 4")));
 }
 

@@ -97,18 +97,5 @@ TEST_F(ModelCommandsTest, AMissingFileNameIsNamed) {
     EXPECT_THAT(printed(), HasSubstr("Model file"));
 }
 
-TEST_F(ModelCommandsTest, ListShowsObjectsWithTheirKindAndCounts) {
-    runOn(L"Import", triangle);
-    front_end.clearPrinted();
-    document().objects().addPoint(L"Mark", {0, 0, 0}).visible = false;
-    ASSERT_EQ(run(L"List"), CQuarnCommand::success);
-    EXPECT_EQ(printed(),
-              "Roof  mesh, 1 triangles\n"
-              "Mark  point, hidden\n"
-              "1 meshes with 1 triangles and 3 vertices, 0 materials, 0 curves, 1 points; "
-              "1 hidden\n"
-              "from 0,0,0 to 1000,1000,0, size 1000 x 1000 x 0\n");
-}
-
 } // namespace
 } // namespace quarn::test

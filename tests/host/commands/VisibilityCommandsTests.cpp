@@ -63,7 +63,9 @@ TEST_F(VisibilityCommandsTest, ALineWithoutWordsMeansTheSelection) {
     document().objects().select(mark.id);
     ASSERT_EQ(run(L"_-Hide"), CQuarnCommand::success);
     EXPECT_FALSE(mark.visible);
+    EXPECT_FALSE(mark.selected) << "what is hidden is in the selection no more";
     EXPECT_TRUE(isVisible());
+    document().objects().select(mark.id);
     ASSERT_EQ(run(L"_-Hide Tower"), CQuarnCommand::success);
     EXPECT_FALSE(isVisible()) << "a name counts before the selection";
 }
