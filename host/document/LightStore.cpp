@@ -4,6 +4,8 @@
 #include "sdk/qncore/QnApp.h"
 #include "sdk/qncore/QnLocalize.h"
 
+#include <algorithm>
+
 namespace quarn {
 
 namespace {
@@ -38,7 +40,7 @@ int LightStore::add(const KM_Light& light) {
     if (!canShine(light))
         return no_index;
     m_slots.emplace_back().m_light = light;
-    return count() - 1;
+    return m_live.emplace_back(count() - 1);
 }
 
 void LightStore::addDeleted(const KM_Light& light) {
@@ -51,13 +53,14 @@ bool LightStore::remove(int index) {
     if (at(index).IsDeleted())
         return false;
     m_slots[static_cast<std::size_t>(index)].m_deleted = true;
+    m_live.erase(std::ranges::lower_bound(m_live, index));
     return true;
 }
 
 std::vector<KM_Light> LightStore::shiningLights(int but) const {
     std::vector<KM_Light> lights;
-    for (int index = 0; index < count(); ++index)
-        if (index != but && !at(index).IsDeleted() && at(index).Light().IsEnabled())
+    for (const int index : m_live)
+        if (index != but && at(index).Light().IsEnabled())
             lights.push_back(at(index).Light());
     return lights;
 }

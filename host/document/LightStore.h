@@ -43,6 +43,9 @@ public:
 
 private:
     std::vector<CQuarnLight> m_slots;
+    /// The slots that are not deleted, ascending: a long sun study leaves a deleted one a frame,
+    /// which the next frames must not pay for.
+    std::vector<int> m_live;
     CQuarnLight m_no_light = deletedLight();
     CQuarnLightTable m_face;
     bool m_is_open = true;
