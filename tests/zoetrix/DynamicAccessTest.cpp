@@ -1,6 +1,8 @@
 #include "tests/zoetrix/PlugInFixture.h"
 #include "zoetrix/paths/ZoetrixDynamicAccess.h"
 
+#include <algorithm>
+#include <chrono>
 #include <limits>
 
 namespace {
@@ -50,9 +52,60 @@ TEST_F(FrameAccess, FramesOutsideTheShorterListFail) {
 
     setUpSunFrames(3);
     record().CameraPoints().SetCount(2);
-    for (const int frame : {0, -1, 3, std::numeric_limits<int>::max()})
+    for (const int frame :
+         {0, -1, 3, 4, std::numeric_limits<int>::min(), std::numeric_limits<int>::max()})
         EXPECT_FALSE(sunAt(frame)) << frame;
     EXPECT_TRUE(sunAt(2));
+}
+
+TEST_F(FrameAccess, AFrameCountUnlikeTheListsIsNotAsked) {
+    for (const int count : {0, -7, 1, 100, std::numeric_limits<int>::max()}) {
+        setUpCameraFrames(3);
+        record().SetFrameCount(count);
+        EXPECT_TRUE(viewAt(3)) << count;
+        EXPECT_FALSE(viewAt(4)) << count;
+        setUpSunFrames(3);
+        record().SetFrameCount(count);
+        EXPECT_TRUE(sunAt(3)) << count;
+        EXPECT_FALSE(sunAt(4)) << count;
+    }
+}
+
+TEST_F(FrameAccess, ACurveThatCannotBeDividedSoOftenLeavesTheStoredFrames) {
+    importObj("v 0 0 0\nv 10 0 0\no rail\nl 1 2\n");
+    setUpCameraFrames(2);
+    record().SetCaptureType(KM_3dmAnimationProperties::flythrough);
+    record().SetCameraPathId(objectId(L"rail"));
+    for (const int count : {0, -3, std::numeric_limits<int>::min()}) {
+        record().SetFrameCount(count);
+        ASSERT_TRUE(viewAt(2)) << count;
+        EXPECT_TRUE(near(camera.CameraLocation(), cameraOfFrame(1), 0.0)) << count;
+    }
+}
+
+TEST_F(FrameAccess, ACaptureTypeOutOfRangeIsACameraAnimation) {
+    setUpCameraFrames(2);
+    for (const int type : {-1, 6, 17, std::numeric_limits<int>::max()}) {
+        record().SetCaptureType(static_cast<KM_3dmAnimationProperties::CaptureTypes>(type));
+        ASSERT_TRUE(viewAt(2)) << type;
+        EXPECT_TRUE(near(camera.CameraLocation(), cameraOfFrame(1), 0.0));
+        EXPECT_FALSE(sunAt(2)) << type;
+    }
+}
+
+TEST_F(FrameAccess, AFrameOfALongTurntableTakesAsLongAsOneOfAShortOne) {
+    const auto fastest = [this](int frames) {
+        setUpCameraFrames(frames);
+        auto best = std::chrono::steady_clock::duration::max();
+        for (int round = 0; round < 50; ++round) {
+            const auto start = std::chrono::steady_clock::now();
+            EXPECT_TRUE(viewAt(frames - round));
+            best = std::min(best, std::chrono::steady_clock::now() - start);
+        }
+        return best;
+    };
+    // A copy of the record would take thousands of times as long.
+    EXPECT_LT(fastest(1'000'000), 100 * fastest(100));
 }
 
 TEST_F(FrameAccess, ViewNameIsTrimmedAndFoundInAnyCase) {
@@ -136,7 +189,11 @@ TEST_F(FrameAccess, PathIsRefreshedOnlyWhenBothOfItsCurvesAreNamed) {
     record().SetCameraPathId(objectId(L"rail"));
     ASSERT_TRUE(viewAt(2));
     EXPECT_TRUE(near(camera.CameraLocation(), cameraOfFrame(1), 0.0));
+    record().SetCameraPathId(KM_nil_uuid);
     record().SetTargetPathId(objectId(L"gaze"));
+    ASSERT_TRUE(viewAt(2));
+    EXPECT_TRUE(near(camera.TargetPoint(), targetOfFrame(1), 0.0));
+    record().SetCameraPathId(objectId(L"rail"));
     ASSERT_TRUE(viewAt(2));
     EXPECT_TRUE(near(camera.CameraLocation(), KM_3dPoint(10.0, 0.0, 0.0), 1e-6));
     EXPECT_TRUE(near(camera.TargetPoint(), KM_3dPoint(0.0, 4.0, 5.0), 1e-6));
@@ -168,12 +225,38 @@ TEST_F(FrameAccess, ReplacedLightsLeaveOneAndItsIndex) {
                      KM_3dVector(1.0, 0.0, -1.0), 0.0));
 }
 
-TEST_F(FrameAccess, StaleLightIndexOnlyAdds) {
-    for (const int stale : {-1, 9999}) {
+TEST_F(FrameAccess, TheFirstLightOfAnAnimationReplacesNone) {
+    KM_Light lamp = lightShining({1.0, 0.0, -1.0});
+    ASSERT_EQ(0, doc().LightTable().AddLight(lamp, nullptr));
+    record().SetLightIndex(-1);
+    ReplaceLight(doc(), record(), lamp);
+    EXPECT_EQ(1, record().LightIndex());
+    EXPECT_EQ(2, liveLights());
+}
+
+TEST_F(FrameAccess, StaleLightIndicesDeleteNoLight) {
+    KM_Light lamp = lightShining({1.0, 0.0, -1.0});
+    CQuarnLightTable& lights = doc().LightTable();
+    const int first = lights.AddLight(lamp, nullptr);
+    const int deleted = lights.AddLight(lamp, nullptr);
+    lights.DeleteLight(deleted, true);
+    for (const int stale : {-1, -2, std::numeric_limits<int>::min(), deleted, deleted + 1, 9999,
+                            std::numeric_limits<int>::max()}) {
         record().SetLightIndex(stale);
-        const int before = liveLights();
-        KM_Light light_to_add = lightShining({0.0, 0.0, -1.0});
-        ReplaceLight(doc(), record(), light_to_add);
-        EXPECT_EQ(before + 1, liveLights());
+        KM_Light sun = lightShining({0.0, 0.0, -1.0});
+        ReplaceLight(doc(), record(), sun);
+        EXPECT_FALSE(lights[first].IsDeleted()) << stale;
+        EXPECT_EQ(2, liveLights()) << stale;
+        EXPECT_EQ(lights.LightCount() - 1, record().LightIndex()) << stale;
+        lights.DeleteLight(record().LightIndex(), true);
     }
+}
+
+TEST_F(FrameAccess, ASunThatCannotShineTakesTheLastOneAway) {
+    KM_Light sun = lightShining({0.0, 0.0, -1.0});
+    ReplaceLight(doc(), record(), sun);
+    sun.SetDirection(KM_3dVector::ZeroVector);
+    ReplaceLight(doc(), record(), sun);
+    EXPECT_EQ(0, liveLights());
+    EXPECT_EQ(-1, record().LightIndex());
 }

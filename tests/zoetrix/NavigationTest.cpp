@@ -1,6 +1,7 @@
 #include "tests/zoetrix/PlugInFixture.h"
 
 #include <cmath>
+#include <limits>
 
 using testing::HasSubstr;
 
@@ -81,6 +82,57 @@ TEST_F(Navigation, StepFromANegativeFrameShowsAll) {
     ASSERT_EQ(CQuarnCommand::success, run(L"ViewPreviousFrame"));
     EXPECT_TRUE(near(view(L"Perspective").MainViewport().VP().CameraLocation(), before, 0.0));
     EXPECT_EQ(29, record().CurrentFrame());
+}
+
+TEST_F(Navigation, SteppingBeyondTheLargestAndTheSmallestNumberGoesNoFurther) {
+    constexpr int largest = std::numeric_limits<int>::max();
+    standAt(largest);
+    const KM_3dPoint before = view(L"Perspective").MainViewport().VP().CameraLocation();
+    ASSERT_EQ(CQuarnCommand::success, run(L"ViewNextFrame"));
+    EXPECT_EQ(largest, record().CurrentFrame());
+    ASSERT_EQ(CQuarnCommand::success, run(L"ViewPreviousFrame"));
+    EXPECT_EQ(largest - 1, record().CurrentFrame());
+    EXPECT_TRUE(near(view(L"Perspective").MainViewport().VP().CameraLocation(), before, 0.0));
+
+    // A negative frame is the whole animation.
+    standAt(std::numeric_limits<int>::min());
+    ASSERT_EQ(CQuarnCommand::success, run(L"ViewPreviousFrame"));
+    EXPECT_EQ(29, record().CurrentFrame());
+}
+
+TEST_F(Navigation, AStoredFrameOutOfRangeIsNoAnswer) {
+    for (const int stored :
+         {30, -1, std::numeric_limits<int>::max(), std::numeric_limits<int>::min()}) {
+        standAt(stored);
+        EXPECT_EQ(CQuarnCommand::cancel, run(L"ViewFrameNumber _Enter")) << stored;
+        EXPECT_EQ(stored, record().CurrentFrame());
+        EXPECT_EQ(CQuarnCommand::success, run(L"ViewFrameNumber 7")) << stored;
+        EXPECT_EQ(7, shownFrame());
+    }
+}
+
+TEST_F(Navigation, ARecordWhoseCountIsNotThatOfItsListsHasNoFrames) {
+    for (const int count : {29, 31, 0, -30, std::numeric_limits<int>::max()}) {
+        standAt(3);
+        record().SetFrameCount(count);
+        for (const wchar_t* command : {L"PlayAnimation", L"ViewFirstFrame", L"ViewLastFrame",
+                                       L"ViewPreviousFrame", L"ViewNextFrame", L"ViewFrameNumber"})
+            EXPECT_EQ(CQuarnCommand::failure, run(command)) << count;
+        EXPECT_EQ(3, record().CurrentFrame());
+    }
+    EXPECT_TRUE(front_end.questions().empty());
+}
+
+TEST_F(Navigation, WithoutItsViewNoCommandShowsAFrame) {
+    standAt(3);
+    record().SetViewportName(L"Back");
+    for (const wchar_t* command : {L"PlayAnimation", L"ViewFirstFrame", L"ViewLastFrame",
+                                   L"ViewPreviousFrame", L"ViewNextFrame", L"ViewFrameNumber 4"}) {
+        front_end.clearPrinted();
+        EXPECT_EQ(CQuarnCommand::failure, run(command));
+        EXPECT_THAT(printed(), HasSubstr(L"Unable to find viewport to play animation\n"));
+        EXPECT_EQ(3, record().CurrentFrame());
+    }
 }
 
 TEST_F(Navigation, PlayingReturnsTheViewAndStoresTheLastFrame) {

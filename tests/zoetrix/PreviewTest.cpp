@@ -65,6 +65,44 @@ TEST_F(Preview, RecordsWithoutAsManyPointsAsFramesAreRefused) {
     expect_refused();
 }
 
+TEST_F(Preview, FrameCountsUnlikeTheListsAreRefused) {
+    for (const int count :
+         {-1, 2, 4, std::numeric_limits<int>::max(), std::numeric_limits<int>::min()}) {
+        setUpCameraFrames(3);
+        record().SetFrameCount(count);
+        EXPECT_EQ(CQuarnCommand::failure, preview(-1)) << count;
+        EXPECT_EQ(CQuarnCommand::failure, preview(1)) << count;
+    }
+}
+
+TEST_F(Preview, ACaptureTypeOutOfRangeIsACameraAnimation) {
+    for (const int type : {-1, 5, 6, 17}) {
+        setUpCameraFrames(3);
+        record().SetCaptureType(static_cast<KM_3dmAnimationProperties::CaptureTypes>(type));
+        ASSERT_EQ(CQuarnCommand::success, preview(2)) << type;
+        EXPECT_TRUE(near(camera().CameraLocation(), cameraOfFrame(2), 1e-12)) << type;
+        EXPECT_EQ(0, doc().LightTable().LightCount()) << type;
+        ASSERT_EQ(CQuarnCommand::success, preview(0));
+    }
+}
+
+TEST_F(Preview, AnyNegativeFrameIsTheWholeAnimation) {
+    setUpCameraFrames(3);
+    ASSERT_EQ(CQuarnCommand::success, preview(std::numeric_limits<int>::min()));
+    EXPECT_EQ(2, record().CurrentFrame());
+    EXPECT_EQ(30U, front_end.waited_ms());
+}
+
+TEST_F(Preview, PlayingLeavesThePointListsWhereTheyAre) {
+    setUpCameraFrames(50);
+    front_end.setKeyDown(VK_ESCAPE, true);
+    const KM_3dPoint* camera_points = record().CameraPoints().Array();
+    const KM_3dPoint* target_points = record().TargetPoints().Array();
+    ASSERT_EQ(CQuarnCommand::success, preview(-1));
+    EXPECT_EQ(camera_points, record().CameraPoints().Array());
+    EXPECT_EQ(target_points, record().TargetPoints().Array());
+}
+
 TEST_F(Preview, SingleFrameMovesTheViewAndLeavesItThere) {
     setUpCameraFrames(10);
     ASSERT_EQ(CQuarnCommand::success, preview(4));
@@ -242,6 +280,26 @@ TEST_F(Preview, SingleSunFrameLeavesRenderedModeAndNoLight) {
     EXPECT_EQ(-1, record().LightIndex());
     EXPECT_EQ(2, record().CurrentFrame());
     EXPECT_EQ(CQuarnDisplayAttrsMgr::RenderedModeId(), modeOf(L"Perspective"));
+}
+
+TEST_F(Preview, SunStudyLeavesTheOtherLightsOfTheDocument) {
+    KM_Light lamp;
+    lamp.SetStyle(KM_LightStyle::world_directional);
+    lamp.SetDirection({1.0, 0.0, -1.0});
+    CQuarnLightTable& lights = doc().LightTable();
+    const int first = lights.AddLight(lamp, nullptr);
+    const int deleted = lights.AddLight(lamp, nullptr);
+    lights.DeleteLight(deleted, true);
+    for (const int stale :
+         {-5, deleted, 9999, std::numeric_limits<int>::max(), std::numeric_limits<int>::min()}) {
+        for (const int frame : {-1, 1, 1000}) {
+            setUpSunFrames(2);
+            record().SetLightIndex(stale);
+            ASSERT_EQ(CQuarnCommand::success, preview(frame));
+            EXPECT_FALSE(lights[first].IsDeleted()) << stale;
+            EXPECT_EQ(1, liveLights()) << stale;
+        }
+    }
 }
 
 TEST_F(Preview, EscapeShortensThePauseAndDoesNotStop) {

@@ -1,5 +1,7 @@
 #include "tests/host/document/DocumentFixtures.h"
 
+#include <limits>
+
 namespace quarn::test {
 namespace {
 
@@ -27,12 +29,33 @@ TEST_F(LightTableTest, SlotsOfDeletedLightsAreNeverUsedAgain) {
 TEST_F(LightTableTest, StaleAndForeignIndicesNameNoLiveLight) {
     CQuarnLightTable& table = document.face().LightTable();
     table.AddLight(sunFrom({0, 0, -1}), nullptr);
+    table.AddLight(sunFrom({1, 0, -1}), nullptr);
     EXPECT_TRUE(table.DeleteLight(0, true));
-    for (const int index : {0, -1, 1, 1000}) {
+    for (const int index :
+         {0, -1, 2, 1000, std::numeric_limits<int>::max(), std::numeric_limits<int>::min()}) {
         EXPECT_TRUE(table[index].IsDeleted()) << index;
         EXPECT_FALSE(table.DeleteLight(index, true)) << index;
+        EXPECT_FALSE(table[1].IsDeleted()) << index;
     }
-    EXPECT_EQ(table.LightCount(), 1);
+    EXPECT_EQ(table.LightCount(), 2);
+}
+
+TEST_F(LightTableTest, LightsShineInTheOrderOfTheirIndices) {
+    LightStore& lights = document.lights();
+    for (int x = 0; x < 5; ++x)
+        lights.add(sunFrom({static_cast<double>(x), 0, -1}));
+    lights.remove(3);
+    lights.remove(0);
+    const auto shining = [&](int but) {
+        std::vector<int> xs;
+        for (const KM_Light& light : lights.shiningLights(but))
+            xs.push_back(static_cast<int>(light.Direction().x));
+        return xs;
+    };
+    EXPECT_EQ(shining(-1), (std::vector{1, 2, 4}));
+    EXPECT_EQ(shining(2), (std::vector{1, 4}));
+    EXPECT_EQ(shining(3), (std::vector{1, 2, 4}));
+    EXPECT_EQ(shining(std::numeric_limits<int>::max()), (std::vector{1, 2, 4}));
 }
 
 TEST_F(LightTableTest, RefusesLightsThatCannotShine) {

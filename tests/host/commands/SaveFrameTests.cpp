@@ -1,0 +1,127 @@
+#include "tests/host/app/TestCommand.h"
+#include "tests/host/document/DocumentFixtures.h"
+#include "tests/support/TempFolder.h"
+
+#include <gmock/gmock.h>
+
+#include <stdexcept>
+
+namespace quarn::test {
+namespace {
+
+using testing::HasSubstr;
+
+/// Keeps a record and gives its frames as a plug-in does, or fails in the way it is told to.
+class FrameKeeper final : public IQnZoetrixDynamicAccess {
+public:
+    FrameKeeper() {
+        record.SetCaptureType(KM_3dmAnimationProperties::turntable);
+        record.SetViewportName(L"Perspective");
+        record.SetFrameCount(2);
+        for (const double x : {10.0, 12.0}) {
+            record.CameraPoints().Append(KM_3dPoint(x, -20.0, 8.0));
+            record.TargetPoints().Append(KM_3dPoint::Origin);
+        }
+        Zoetrix_SetQuarnDynamicAccess(this);
+    }
+    ~FrameKeeper() override { Zoetrix_SetQuarnDynamicAccess(nullptr); }
+
+    const KM_3dmAnimationProperties& AnimationProperties(const CQuarnDoc&) const override {
+        return record;
+    }
+    void SetAnimationProperties(const CQuarnDoc&, const KM_3dmAnimationProperties&) override {
+        ++stored;
+    }
+    bool AnimatedViewAtFrame(CQuarnDoc&, const KM_3dmAnimationProperties& rec, int frame,
+                             KM_Viewport& out) override {
+        if (throws)
+            throw std::runtime_error("no camera today");
+        asked_frame = frame;
+        return out.SetCameraLocation(rec.CameraPoints()[frame - 1]);
+    }
+    bool AnimatedSunAtFrame(CQuarnDoc&, const KM_3dmAnimationProperties&, int frame,
+                            KM_Light& light) override {
+        asked_frame = frame;
+        light.SetStyle(KM_LightStyle::world_directional);
+        light.SetDirection({0.0, 0.0, -1.0});
+        return true;
+    }
+
+    KM_3dmAnimationProperties record;
+    bool throws = false;
+    int asked_frame = 0;
+    int stored = 0;
+};
+
+class SaveFrameTest : public HostTest {
+protected:
+    ViewState& view() { return Document::of(session.document()).activeView(); }
+    CQuarnCommand::result save(const wchar_t* words) {
+        return run((KM_wString(L"SaveFrame ") + words + L" \"" +
+                    KM_wString::FromUtf8(file.string()) + L"\"")
+                       .Array());
+    }
+
+    TempFolder folder;
+    const std::filesystem::path file = folder.path() / "frame.bmp";
+};
+
+TEST_F(SaveFrameTest, WithoutAPlugInNothingIsAsked) {
+    ASSERT_EQ(Zoetrix_QuarnDynamicAccess(), nullptr);
+    EXPECT_EQ(save(L"0"), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("No plug-in keeps an animation. Load one with LoadPlugIn"));
+    EXPECT_TRUE(front_end.questions().empty());
+    EXPECT_FALSE(std::filesystem::exists(file));
+}
+
+TEST_F(SaveFrameTest, AsksTheObjectForTheFrameCountedFromOne) {
+    FrameKeeper keeper;
+    ASSERT_EQ(save(L"1"), CQuarnCommand::success);
+    EXPECT_EQ(keeper.asked_frame, 2);
+    EXPECT_EQ(keeper.stored, 0);
+    EXPECT_TRUE(std::filesystem::exists(file));
+}
+
+TEST_F(SaveFrameTest, WhatTheViewsShowStays) {
+    FrameKeeper keeper;
+    addBox(view().document(), {-5, -5, 0}, {5, 5, 5});
+    view().setFrameSize(32, 18);
+    view().redraw(CQuarnView::draw_scene);
+    const auto picture = view().frameBuffer().rgba;
+    const auto drawn = view().drawCount();
+    const auto shown = view().showCount();
+    for (const auto type :
+         {KM_3dmAnimationProperties::turntable, KM_3dmAnimationProperties::one_day_sun}) {
+        keeper.record.SetCaptureType(type);
+        ASSERT_EQ(save(L"Size 20 10 1"), CQuarnCommand::success);
+    }
+    EXPECT_TRUE(view().frameBuffer().rgba == picture);
+    EXPECT_EQ(view().drawCount(), drawn);
+    EXPECT_EQ(view().showCount(), shown);
+    EXPECT_EQ(view().frameWidth(), 32);
+    view().redraw(CQuarnView::draw_scene);
+    EXPECT_TRUE(view().frameBuffer().rgba == picture) << "the next redraw shows what it did";
+}
+
+TEST_F(SaveFrameTest, APlugInThatThrowsIsAFrameThatCannotBePlaced) {
+    FrameKeeper keeper;
+    keeper.throws = true;
+    EXPECT_EQ(save(L"0"), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("The camera of frame 0 cannot be placed"));
+    EXPECT_FALSE(std::filesystem::exists(file));
+}
+
+TEST_F(SaveFrameTest, ThePictureHasTheSizeThatIsAskedFor) {
+    FrameKeeper keeper;
+    // 24 bits a pixel, rows filled up to 4 bytes, behind 54 bytes of headers.
+    ASSERT_EQ(save(L"Size 20 10 0"), CQuarnCommand::success);
+    EXPECT_EQ(std::filesystem::file_size(file), 54U + 10U * 60U);
+    ASSERT_EQ(save(L"Size 20 10 Size 8 4 0"), CQuarnCommand::success);
+    EXPECT_EQ(std::filesystem::file_size(file), 54U + 4U * 24U);
+    view().setFrameSize(40, 30);
+    ASSERT_EQ(save(L"0"), CQuarnCommand::success);
+    EXPECT_EQ(std::filesystem::file_size(file), 54U + 30U * 120U);
+}
+
+} // namespace
+} // namespace quarn::test
