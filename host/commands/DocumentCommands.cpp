@@ -5,7 +5,7 @@
 namespace quarn {
 
 CQuarnCommand::result runImport(const CQuarnCommandContext& context) {
-    const AskedModel asked = askModel();
+    const AskedFile asked = askFileToRead();
     if (asked.result == CQuarnCommand::success)
         addToDocument(Document::of(context.Document()), asked);
     return asked.result;
@@ -18,9 +18,9 @@ CQuarnCommand::result runNew(const CQuarnCommandContext& context) {
 
 /// The file is read first: when it cannot be, the document at work stays.
 CQuarnCommand::result runOpen(const CQuarnCommandContext& context) {
-    const AskedModel asked = askModel();
+    const AskedFile asked = askFileToRead();
     if (asked.result == CQuarnCommand::success)
-        addToDocument(Document::of(context.Document()).list().openNew(), asked);
+        openAsDocument(Document::of(context.Document()).list(), asked);
     return asked.result;
 }
 

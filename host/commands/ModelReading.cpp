@@ -3,10 +3,14 @@
 #include "host/app/Application.h"
 #include "host/app/PathText.h"
 #include "host/commands/CommandEnd.h"
-#include "host/document/Document.h"
+#include "host/document/DocumentList.h"
 #include "host/document/ViewFit.h"
+#include "host/document/file/DocumentFile.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLocalize.h"
+
+#include <algorithm>
+#include <utility>
 
 namespace quarn {
 
@@ -16,16 +20,57 @@ std::string counted(std::size_t count, const std::string& noun) {
     return std::to_string(count) + " " + noun + (count == 1 ? "" : "s");
 }
 
-std::string contentText(const ImportedModel& model) {
-    std::string text = counted(model.meshes.size(), "object") + " with " +
-                       counted(model.triangleCount(), "triangle");
-    if (!model.curves.empty())
-        text += ", " + counted(model.curves.size(), "curve");
-    if (!model.points.IsEmpty())
-        text += ", " + counted(static_cast<std::size_t>(model.points.Count()), "point");
-    if (!model.cameras.empty())
-        text += ", " + counted(model.cameras.size(), "camera");
-    return text;
+/// What a file holds, to be told.
+struct ContentCounts {
+    std::size_t meshes = 0;
+    std::size_t triangles = 0;
+    std::size_t curves = 0;
+    std::size_t points = 0;
+    std::size_t cameras = 0;
+    std::size_t lights = 0;
+
+    std::string text() const {
+        std::string text = counted(meshes, "object") + " with " + counted(triangles, "triangle");
+        for (const auto& [count, noun] : {std::pair(curves, "curve"), std::pair(points, "point"),
+                                          std::pair(cameras, "camera"), std::pair(lights, "light")})
+            if (count > 0)
+                text += ", " + counted(count, noun);
+        return text;
+    }
+};
+
+ContentCounts countsOf(const ImportedModel& model) {
+    return {.meshes = model.meshes.size(),
+            .triangles = model.triangleCount(),
+            .curves = model.curves.size(),
+            .points = static_cast<std::size_t>(model.points.Count()),
+            .cameras = model.cameras.size(),
+            .lights = 0};
+}
+
+ContentCounts countsOf(const DocumentContent& content) {
+    ContentCounts counts;
+    for (const ObjectContent& object : content.objects) {
+        counts.meshes += object.mesh ? 1 : 0;
+        counts.triangles +=
+            object.mesh ? static_cast<std::size_t>(object.mesh->TriangleCount()) : 0;
+        counts.curves += object.curve ? 1 : 0;
+        counts.points += object.point ? 1 : 0;
+    }
+    counts.cameras = content.cameras.size();
+    counts.lights =
+        static_cast<std::size_t>(std::ranges::count(content.lights, false, &LightContent::deleted));
+    return counts;
+}
+
+/// Tells what may be wrong with what was read, then what it is.
+void tellContent(const AskedFile& asked, const std::vector<std::string>& warnings) {
+    Application& application = *Application::current();
+    for (const std::string& warning : warnings)
+        application.tell(warning);
+    const ContentCounts counts =
+        std::visit([](const auto& content) { return countsOf(content); }, asked.content);
+    application.tell(textFromPath(asked.file.filename()).ToUtf8() + ": " + counts.text());
 }
 
 void fitViews(Document& document) {
@@ -34,10 +79,6 @@ void fitViews(Document& document) {
         if (fitted)
             view->setViewport(fitted.value(), true, true);
     }
-}
-
-bool isDocumentFile(const std::filesystem::path& file) {
-    return textFromPath(file.extension()).CompareNoCase(L".quarn") == 0;
 }
 
 /// @param up  receives the answer
@@ -60,7 +101,7 @@ CQuarnCommand::result askUpAxis(UpAxis& up) {
 /// Asks for the file and, where the option is picked, for the axis that points up in it.
 CQuarnCommand::result askFile(std::filesystem::path& file, UpAxis& up) {
     CQuarnGetString get;
-    get.SetCommandPrompt(QnLocalizeString(L"Model file", 42050));
+    get.SetCommandPrompt(QnLocalizeString(L"Model or document file", 42050));
     get.AddCommandOption(QnLocalizeCommandOptionName(L"Up", 42051));
     CQuarnGet::result answer = get.GetString();
     while (answer == CQuarnGet::option) {
@@ -74,37 +115,59 @@ CQuarnCommand::result askFile(std::filesystem::path& file, UpAxis& up) {
     return get.CommandResult();
 }
 
+Result<void> readDocument(AskedFile& asked, UpAxis up) {
+    if (up != UpAxis::by_format)
+        return Error{"A document tells itself which axis points up; leave Up out."};
+    auto content = readDocumentFile(asked.file);
+    if (!content)
+        return content.error();
+    asked.content = std::move(content.value());
+    return {};
+}
+
+Result<void> readModel(AskedFile& asked, UpAxis up) {
+    auto model = readModelFile(asked.file, up);
+    if (!model)
+        return model.error();
+    asked.content = std::move(model.value());
+    return {};
+}
+
 } // namespace
 
-AskedModel askModel() {
-    AskedModel asked;
+AskedFile askFileToRead() {
+    AskedFile asked;
     UpAxis up = UpAxis::by_format;
     asked.result = askFile(asked.file, up);
     if (asked.result != CQuarnCommand::success)
         return asked;
-    if (isDocumentFile(asked.file)) {
-        asked.result = fail("Cannot read " + textFromPath(asked.file).ToUtf8() +
-                            ": this version reads model files only, no documents.");
-        return asked;
-    }
-    auto model = readModelFile(asked.file, up);
-    if (!model) {
-        asked.result = fail(model.message());
-        return asked;
-    }
-    asked.model = std::move(model.value());
+    const auto read = isDocumentFile(asked.file) ? readDocument(asked, up) : readModel(asked, up);
+    if (!read)
+        asked.result = fail(read.message());
     return asked;
 }
 
-void addToDocument(Document& document, const AskedModel& asked) {
-    Application& application = *Application::current();
+void addToDocument(Document& document, const AskedFile& asked) {
     const bool was_empty = document.objects().empty();
-    document.addModel(asked.model);
-    for (const std::string& warning : asked.model.warnings)
-        application.tell(warning);
-    application.tell(textFromPath(asked.file.filename()).ToUtf8() + ": " +
-                     contentText(asked.model));
+    if (const auto* model = std::get_if<ImportedModel>(&asked.content)) {
+        document.addModel(*model);
+        tellContent(asked, model->warnings);
+    } else {
+        tellContent(asked, importContent(document, std::get<DocumentContent>(asked.content)));
+    }
     if (was_empty)
+        fitViews(document);
+}
+
+void openAsDocument(DocumentList& list, const AskedFile& asked) {
+    Document& document = list.openNew();
+    const auto* content = std::get_if<DocumentContent>(&asked.content);
+    if (!content)
+        return addToDocument(document, asked);
+    tellContent(asked, openContent(document, *content));
+    std::error_code ignored;
+    document.setFile(std::filesystem::absolute(asked.file, ignored));
+    if (content->views.empty())
         fitViews(document);
 }
 

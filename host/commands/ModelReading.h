@@ -1,26 +1,34 @@
 #pragma once
 
+#include "host/document/file/DocumentContent.h"
 #include "host/import/ModelFile.h"
 #include "sdk/qncore/QnCommand.h"
 
-#include <optional>
+#include <filesystem>
+#include <variant>
 
 namespace quarn {
 
 class Document;
+class DocumentList;
 
-/// A model file that a command asked for, or how the command ends without one.
-struct AskedModel {
+/// A model or document file that a command asked for, or how the command ends without one.
+struct AskedFile {
     CQuarnCommand::result result = CQuarnCommand::success;
     std::filesystem::path file;
-    ImportedModel model; ///< only after success
+    std::variant<ImportedModel, DocumentContent> content; ///< only after success
 };
 
-/// Asks for a model file and reads it. What was wrong is told already.
-AskedModel askModel();
+/// Asks for a model or document file and reads and checks it whole; no open document is touched.
+/// What was wrong is told already.
+AskedFile askFileToRead();
 
-/// Adds a model to a document and tells what it holds. Where the document was empty, its views are
-/// fitted, so that the model is seen whatever its units.
-void addToDocument(Document& document, const AskedModel& asked);
+/// Adds what was read to a document and tells what it is. Where the document was empty, its views
+/// are fitted, so that the model is seen whatever its units.
+void addToDocument(Document& document, const AskedFile& asked);
+
+/// Opens a new document with what was read and tells what it is. A document file's views come as
+/// they were saved, and the new document remembers the file.
+void openAsDocument(DocumentList& list, const AskedFile& asked);
 
 } // namespace quarn

@@ -80,7 +80,9 @@ TEST_F(ModelCommandsTest, AFileThatCannotBeReadLeavesTheDocument) {
     EXPECT_EQ(runOn(L"Open", folder.write("bad.stl", "solid nothing\nendsolid\n")),
               CQuarnCommand::failure);
     EXPECT_EQ(runOn(L"Open", folder.path() / "house.quarn"), CQuarnCommand::failure);
-    EXPECT_THAT(printed(), HasSubstr("this version reads model files only"));
+    EXPECT_THAT(printed(), HasSubstr("house.quarn"));
+    EXPECT_EQ(runOn(L"Open", folder.write("bad.quarn", "no document")), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("bad.quarn"));
     EXPECT_EQ(document().serialNumber(), number);
     EXPECT_EQ(document().objects().objects().size(), 1U);
 }
@@ -94,7 +96,7 @@ TEST_F(ModelCommandsTest, NewOpensAnEmptyDocument) {
 
 TEST_F(ModelCommandsTest, AMissingFileNameIsNamed) {
     EXPECT_EQ(run(L"Import"), CQuarnCommand::cancel);
-    EXPECT_THAT(printed(), HasSubstr("Model file"));
+    EXPECT_THAT(printed(), HasSubstr("Model or document file"));
 }
 
 } // namespace
