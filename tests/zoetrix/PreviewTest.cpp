@@ -3,6 +3,8 @@
 
 #include <cmath>
 #include <limits>
+#include <string>
+#include <vector>
 
 using testing::HasSubstr;
 
@@ -251,6 +253,21 @@ TEST_F(Preview, SunStudyPlaysWithTheSunOffAndEndsWithItOn) {
     EXPECT_EQ(-1, record().LightIndex());
     EXPECT_EQ(CQuarnDisplayAttrsMgr::RenderedModeId(), record().DisplayMode());
     EXPECT_TRUE(before == camera());
+}
+
+TEST_F(Preview, TheDocumentsSunIsNotInTheFramesOfASunStudy) {
+    importObj("v -9 -9 0\nv 9 -9 0\nv 9 9 0\nv -9 9 0\nv 1 2 8\nv 4 2 0\n"
+              "f 1 2 3 4\nf 1 5 6\n");
+    std::vector<std::string> pictures;
+    for (const bool sun_is_on : {true, false}) {
+        setUpSunFrames(1);
+        record().SetFolderName(wide(folder.path()));
+        switchSun(sun_is_on);
+        ASSERT_EQ(CQuarnCommand::success, PreviewAnimation(doc(), record(), 0, true));
+        pictures.push_back(readFile(folder.path() / "Walk000.jpg"));
+    }
+    ASSERT_FALSE(pictures[0].empty());
+    EXPECT_TRUE(pictures[0] == pictures[1]);
 }
 
 TEST_F(Preview, SunThatWasOffStaysOff) {
