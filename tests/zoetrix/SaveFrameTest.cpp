@@ -1,6 +1,8 @@
 #include "tests/zoetrix/RecordingFixture.h"
 
 #include <limits>
+#include <string>
+#include <vector>
 
 using testing::HasSubstr;
 
@@ -281,4 +283,60 @@ TEST_F(SaveFrame, AFileThatIsAFolderIsToldAndStays) {
 TEST_F(SaveFrame, ACaptureTypeOutOfRangeIsACameraAnimation) {
     record().SetCaptureType(static_cast<KM_3dmAnimationProperties::CaptureTypes>(17));
     expectSameFiles("png");
+}
+
+TEST_F(SaveFrame, AReopenedDocumentGivesTheSameFilesAndPoints) {
+    followBothRails();
+    expectSameFiles("png");
+    const std::vector<std::string> recorded{readFile(frames / "Walk000.png"),
+                                            readFile(frames / "Walk001.png"),
+                                            readFile(frames / "Walk002.png")};
+    const KM_3dPointArray cameras = record().CameraPoints();
+    const KM_3dPointArray targets = record().TargetPoints();
+    const std::filesystem::path document = folder.path() / "walk.quarn";
+    ASSERT_EQ(CQuarnCommand::success, run(L"SaveAs \"" + wide(document) + L"\""));
+    ASSERT_EQ(CQuarnCommand::success, run(L"New"));
+    EXPECT_EQ(0, record().CameraPoints().Count());
+    ASSERT_EQ(CQuarnCommand::success, run(L"Open \"" + wide(document) + L"\""));
+
+    ASSERT_EQ(3, record().CameraPoints().Count());
+    ASSERT_EQ(3, record().TargetPoints().Count());
+    for (int k = 0; k < 3; ++k) {
+        EXPECT_TRUE(near(record().CameraPoints()[k], cameras[k], 0.0)) << k;
+        EXPECT_TRUE(near(record().TargetPoints()[k], targets[k], 0.0)) << k;
+        ASSERT_EQ(CQuarnCommand::success, save(KM_wString::FormatToString(L"%d", k), file()));
+        EXPECT_TRUE(readFile(file()) == recorded[static_cast<std::size_t>(k)]) << k;
+    }
+    recordAll(L"png");
+    EXPECT_TRUE(readFile(frames / "Walk001.png") == recorded[1]);
+}
+
+TEST_F(SaveFrame, AReopenedSunStudyGivesTheSameFiles) {
+    addLight({1.0, 1.0, -0.2});
+    setUpThreeSuns();
+    expectSameFiles("png");
+    const std::string recorded = readFile(frames / "Walk001.png");
+    const std::filesystem::path document = folder.path() / "suns.quarn";
+    ASSERT_EQ(CQuarnCommand::success, run(L"SaveAs \"" + wide(document) + L"\""));
+    ASSERT_EQ(CQuarnCommand::success, run(L"New"));
+    EXPECT_EQ(-1, record().LightIndex());
+    ASSERT_EQ(CQuarnCommand::success, run(L"Open \"" + wide(document) + L"\""));
+    ASSERT_EQ(CQuarnCommand::success, save(L"1", file()));
+    EXPECT_TRUE(readFile(file()) == recorded);
+    ASSERT_EQ(CQuarnCommand::success, run(L"PlayAnimation"));
+    EXPECT_FALSE(doc().LightTable()[0].IsDeleted());
+    EXPECT_EQ(-1, record().LightIndex());
+}
+
+TEST_F(SaveFrame, AStoredLightIndexIsNotCarriedIntoANewDocument) {
+    setUpThreeSuns();
+    record().SetLightIndex(0);
+    ASSERT_EQ(CQuarnCommand::success, run(L"New"));
+    const int lamp = addLight({1.0, 1.0, -0.2});
+    ASSERT_EQ(0, lamp);
+    const int no_light = record().LightIndex();
+    setUpThreeSuns();
+    EXPECT_EQ(-1, no_light);
+    ASSERT_EQ(CQuarnCommand::success, run(L"PlayAnimation"));
+    EXPECT_FALSE(doc().LightTable()[lamp].IsDeleted());
 }
