@@ -1,5 +1,7 @@
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
+#include "host/app/Contract.h"
+
 namespace {
 
 /// The object that a plug-in installed. Kept apart from the application, because a plug-in removes
@@ -11,9 +13,10 @@ IQnZoetrixDynamicAccess* installed_access = nullptr;
 IQnZoetrixDynamicAccess::~IQnZoetrixDynamicAccess() = default;
 
 void Zoetrix_SetQuarnDynamicAccess(IQnZoetrixDynamicAccess* access) {
-    installed_access = access;
+    if (quarn::isOnMainThread("Zoetrix_SetQuarnDynamicAccess"))
+        installed_access = access;
 }
 
 IQnZoetrixDynamicAccess* Zoetrix_QuarnDynamicAccess() {
-    return installed_access;
+    return quarn::isOnMainThread("Zoetrix_QuarnDynamicAccess") ? installed_access : nullptr;
 }

@@ -38,8 +38,10 @@ public:
 };
 
 /// Installs the object through which the host reaches the animation record, or, with null, removes
-/// it. The caller keeps the object and removes it before deleting it. Throws nothing.
+/// it. The caller keeps the object and removes it before deleting it. Throws nothing. On another
+/// thread than the main one it is a breach of the interface and does nothing.
 QNCORE_API void Zoetrix_SetQuarnDynamicAccess(IQnZoetrixDynamicAccess* access);
 
-/// The installed object, or null. Not owned by the caller.
+/// The installed object, or null, as after the breach of asking on another thread than the main
+/// one. Not owned by the caller.
 QNCORE_API IQnZoetrixDynamicAccess* Zoetrix_QuarnDynamicAccess();
