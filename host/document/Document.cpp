@@ -116,8 +116,8 @@ Result<void> Document::closeView(std::wstring_view name) {
     if (std::ranges::find(m_due_views, view) != m_due_views.end())
         return {};
     if (m_views.size() - m_due_views.size() < 2)
-        return Error{"\"" + view->name().ToUtf8() +
-                     "\" is the document's last view and stays. Add another one first."};
+        return Error{"The view \"" + view->name().ToUtf8() +
+                     "\" is the document's last one and stays. Add another one first."};
     if (m_list.isCommandRunning())
         m_due_views.push_back(view);
     else

@@ -1,5 +1,6 @@
 #include "host/app/Contract.h"
 
+#include "host/app/PendingObjects.h"
 #include "host/display/DisplayMode.h"
 #include "sdk/qncore/qncore.h"
 #include "sdk/vexui/VexUi.h"
@@ -11,6 +12,7 @@
 #include <functional>
 #include <optional>
 #include <thread>
+#include <utility>
 
 namespace quarn::test {
 namespace {
@@ -301,6 +303,7 @@ private:
 };
 
 TEST(SessionEnd, APlugInThatCallsAKeptViewWhileItIsUnloadedBreaksTheRuleAndNothingElse) {
+    const PendingObjects of_other_tests = std::exchange(PendingObjects::program(), {});
     CWinApp application;
     KeepingPlugIn plug_in;
     {
@@ -316,6 +319,7 @@ TEST(SessionEnd, APlugInThatCallsAKeptViewWhileItIsUnloadedBreaksTheRuleAndNothi
               "Quarn: CQuarnView::Redraw: the view was closed\n"
               "Quarn: CQuarnDoc::Regen: the document was closed\n");
     EXPECT_EQ(plug_in.found, nullptr);
+    PendingObjects::program() = of_other_tests;
 }
 
 } // namespace

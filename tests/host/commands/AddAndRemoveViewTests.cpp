@@ -66,7 +66,7 @@ TEST_F(AddAndRemoveViewTest, ViewsAreRemovedByNameUntilOneIsLeft) {
     ASSERT_EQ(run(L"RemoveView Right"), CQuarnCommand::success);
     ASSERT_EQ(run(L"RemoveView Top"), CQuarnCommand::success);
     EXPECT_EQ(run(L"RemoveView Front"), CQuarnCommand::failure);
-    EXPECT_THAT(printed(), HasSubstr("\"Front\" is the document's last view and stays."));
+    EXPECT_THAT(printed(), HasSubstr("The view \"Front\" is the document's last one and stays."));
     EXPECT_EQ(viewCount(), 1U);
     ASSERT_EQ(run(L"AddView Perspective Perspective"), CQuarnCommand::success);
     EXPECT_TRUE(view().viewport().IsPerspectiveProjection());

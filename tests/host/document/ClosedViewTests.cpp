@@ -51,7 +51,7 @@ TEST_F(DocumentTest, WhenTheActiveViewClosesTheOneBehindItBecomesActiveElseTheLa
     ASSERT_TRUE(document.closeView(L"Perspective"));
     EXPECT_STREQ(document.activeView().name().Array(), L"Right");
     EXPECT_EQ(document.closeView(L"Right").message(),
-              "\"Right\" is the document's last view and stays. Add another one first.");
+              "The view \"Right\" is the document's last one and stays. Add another one first.");
     EXPECT_EQ(document.closeView(L"Top").message(), "There is no view \"Top\".");
 }
 
