@@ -63,6 +63,7 @@ void Document::close() {
     m_scene.reset();
     m_objects = ObjectTable();
     m_named_views.clear();
+    *m_file_remainder = FileRemainder();
 }
 
 void Document::closeAllViews() {
