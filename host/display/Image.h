@@ -14,11 +14,12 @@ struct Image {
     std::vector<std::uint8_t> rgba; ///< 4 * width * height bytes
 
     /// Sets the size. The storage only grows, so that drawing frames of one size allocates once.
+    /// Nothing changes when memory lacks (std::bad_alloc).
     void resize(int new_width, int new_height) {
+        rgba.resize(std::size_t{4} * static_cast<std::size_t>(new_width) *
+                    static_cast<std::size_t>(new_height));
         width = new_width;
         height = new_height;
-        rgba.resize(std::size_t{4} * static_cast<std::size_t>(width) *
-                    static_cast<std::size_t>(height));
     }
 
     /// The four bytes of a pixel, counted from the upper left corner; it must lie in the picture.

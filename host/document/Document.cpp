@@ -12,6 +12,7 @@
 #include "sdk/qncore/QnLocalize.h"
 
 #include <algorithm>
+#include <new>
 #include <utility>
 
 namespace quarn {
@@ -188,10 +189,20 @@ Result<void> Document::draw(const KM_Viewport& viewport, const DisplayModeAttrib
                             const SceneChanges& changes) {
     if (!m_scene)
         m_scene = std::make_unique<DocumentScene>();
-    const auto updated = m_scene->update(m_objects, shiningLights(changes), changes.hidden);
-    if (!updated)
-        return updated;
-    return m_scene->draw(viewport, mode, width_px, height_px, picture);
+    try {
+        const auto updated = m_scene->update(m_objects, shiningLights(changes), changes.hidden);
+        if (!updated)
+            return updated;
+        return m_scene->draw(viewport, mode, width_px, height_px, picture);
+    } catch (const std::bad_alloc&) {
+        // Nothing that was half built is drawn the next time.
+        m_scene.reset();
+        picture = Image();
+        return Error{"A picture of " + std::to_string(width_px) + " by " +
+                     std::to_string(height_px) +
+                     " pixels cannot be drawn: there is too little memory. Close other programs, "
+                     "or draw a smaller picture."};
+    }
 }
 
 void Document::regenerate() {

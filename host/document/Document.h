@@ -122,7 +122,8 @@ public:
 
     /// Draws all that is visible. The scene is built once for each revision of the objects and
     /// shared by the views.
-    /// @return an error, with the picture unchanged, when the scene cannot be built or drawn
+    /// @return an error, with the picture unchanged, when the scene cannot be built or drawn; when
+    ///         memory lacks, the picture is empty
     Result<void> draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode, int width_px,
                       int height_px, Image& picture);
     /// Draws the same otherwise than it is; neither the document nor what its views show changes.
