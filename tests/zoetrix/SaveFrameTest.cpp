@@ -101,6 +101,30 @@ TEST_F(SaveFrame, IsTheRecordedFileInAParallelView) {
     expectSameFiles("png");
 }
 
+TEST_F(SaveFrame, IsTheRecordedFileOfACameraThatLooksStraightDown) {
+    for (const wchar_t* name : {L"Top", L"Perspective"}) {
+        record().SetViewportName(name);
+        for (int k = 0; k < 3; ++k) {
+            record().CameraPoints()[k] = KM_3dPoint(0.5 * k, 0.2, 9.0);
+            record().TargetPoints()[k] = KM_3dPoint(0.5 * k, 0.2, 0.0);
+        }
+        expectSameFiles("png");
+    }
+}
+
+TEST_F(SaveFrame, ARolledViewKeepsItsRollWhileARecordingLevelsIt) {
+    expectSameFiles("png");
+    const std::string level = readFile(frames / "Walk001.png");
+    CQuarnViewport& viewport = view(L"Perspective").MainViewport();
+    KM_Viewport rolled = viewport.VP();
+    ASSERT_TRUE(rolled.SetCameraUp(rolled.CameraY() + rolled.CameraX()));
+    ASSERT_TRUE(viewport.SetVP(rolled, true, true));
+    recordAll(L"png");
+    EXPECT_TRUE(readFile(frames / "Walk001.png") == level);
+    ASSERT_EQ(CQuarnCommand::success, save(L"1", file()));
+    EXPECT_FALSE(readFile(file()) == level);
+}
+
 TEST_F(SaveFrame, CurvesThatTheCameraFollowsAreNotInThePicture) {
     followBothRails();
     expectSameFiles("png");
