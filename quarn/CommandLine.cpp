@@ -14,6 +14,7 @@ constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
 
   quarn turntable MODEL --frames N --out DIR   record a turntable as pictures and a page
   quarn run SCRIPT [MODEL]                     run a script of host commands
+  quarn console [MODEL]                        type host commands
   quarn info MODEL                             tell what a model file holds
 
 quarn --help and quarn COMMAND --help tell more.
@@ -24,6 +25,7 @@ Examples:
   quarn turntable house.glb --frames 120 --out out/house
   quarn info house.glb
   quarn run steps.txt house.glb
+  quarn console house.glb
 
 Exit codes: 0 done, 1 failed, 2 arguments that make no sense, 130 stopped with Ctrl-C (143 by
 a request to terminate). Ctrl-C lets the picture that is being recorded be finished and writes the
@@ -50,6 +52,27 @@ Example (steps.txt):
   _-RecordAnimation _TargetFolder "out" _Enter
 
 The command Help lists every command.)";
+
+constexpr const char* CONSOLE_FOOTER = R"(
+A command asks for what it needs: "Number of frames <100>: ". What stands in < > is the answer of
+an empty line; what stands in ( ) are options, picked by typing their names (in a question for
+text as they stand there, with their brackets). Answers may also follow the command's name on its
+line; the command asks for those that are missing, and again for one that does not fit.
+
+  Tab        completes names of commands, options, objects and files
+  Up, Down   call back earlier lines; those of earlier runs are kept in
+             $XDG_STATE_HOME/quarn/history or else ~/.local/state/quarn/history
+  Ctrl-C     cancels the command that asks; ends a recording after the current picture (a second
+             one, while a command is at work, ends the program at once)
+  Ctrl-D     ends the program where a command is asked for, as Exit does; nothing is saved then
+
+An empty line where a command is asked for does nothing; Up and Enter repeat the last command. What
+is piped in is read as if it were typed; there lines that start with # are skipped.
+
+Example:
+  quarn console house.glb
+  Command: SetTurntableAnimation 36 Clockwise
+  File type <jpg> ( jpg png bmp tga ):)";
 
 constexpr const char* INFO_FOOTER = R"(
 Example:
@@ -118,6 +141,14 @@ CLI::App& addInfo(CLI::App& program, ModelOptions& options) {
     return command;
 }
 
+CLI::App& addConsole(CLI::App& program, ConsoleOptions& options) {
+    CLI::App& command = *program.add_subcommand("console", "Type host commands");
+    command.add_option("MODEL", options.model, "A model file to read first")->type_name("");
+    command.footer(CONSOLE_FOOTER);
+    addCommonOptions(command, options.common);
+    return command;
+}
+
 std::string hintOf(const CLI::App& command) {
     const bool is_program = command.get_parent() == nullptr;
     return " (quarn" + (is_program ? "" : " " + command.get_name()) + " --help tells more)";
@@ -128,8 +159,7 @@ Outcome refuseLeftOver(const CLI::App& command, const std::string& word) {
         return Outcome::misuse("unknown option " + word + hintOf(command));
     if (command.get_parent() == nullptr)
         return Outcome::misuse("unknown command " + word +
-                               "; the commands are turntable, run and "
-                               "info" +
+                               "; the commands are turntable, run, console and info" +
                                hintOf(command));
     return Outcome::misuse("unexpected argument " + word + hintOf(command));
 }
@@ -157,8 +187,10 @@ Request readCommandLine(int argument_count, const char* const* arguments) {
     TurntableOptions turntable;
     ScriptOptions script;
     ModelOptions model;
+    ConsoleOptions console;
     const CLI::App& turntable_command = addTurntable(program, turntable);
     const CLI::App& run_command = addRun(program, script);
+    const CLI::App& console_command = addConsole(program, console);
     addInfo(program, model);
 
     try {
@@ -183,6 +215,8 @@ Request readCommandLine(int argument_count, const char* const* arguments) {
     }
     if (&command == &run_command)
         return script;
+    if (&command == &console_command)
+        return console;
     return model;
 }
 

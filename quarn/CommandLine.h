@@ -48,8 +48,15 @@ struct ModelOptions {
     CommonOptions common;
 };
 
+/// `quarn console`
+struct ConsoleOptions {
+    std::string model; ///< empty: none is read first
+    CommonOptions common;
+};
+
 /// What the program was asked for; an Outcome when that ended it already (help, or a mistake).
-using Request = std::variant<Outcome, TurntableOptions, ScriptOptions, ModelOptions>;
+using Request =
+    std::variant<Outcome, TurntableOptions, ScriptOptions, ModelOptions, ConsoleOptions>;
 
 /// Reads the program's arguments. Values are not looked into here.
 Request readCommandLine(int argument_count, const char* const* arguments);

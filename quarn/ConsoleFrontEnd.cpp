@@ -65,6 +65,15 @@ void ConsoleFrontEnd::print(std::wstring_view text) {
         return;
     m_progress.clear();
     std::fwrite(bytes.data(), 1, bytes.size(), stdout);
+    m_is_inside_line = bytes.empty() ? m_is_inside_line : !bytes.ends_with('\n');
+}
+
+void ConsoleFrontEnd::endLine() {
+    m_progress.clear();
+    if (m_is_inside_line)
+        std::fputc('\n', stdout);
+    m_is_inside_line = false;
+    std::fflush(stdout);
 }
 
 Answer ConsoleFrontEnd::ask(const Question&) {

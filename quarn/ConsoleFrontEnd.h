@@ -9,7 +9,7 @@ namespace quarn::program {
 
 /// The front end of a program that nobody answers: it shows what it is told to show, keeps the last
 /// words of the host for error messages, and shows how far a recording is.
-class ConsoleFrontEnd final : public FrontEnd {
+class ConsoleFrontEnd : public FrontEnd {
 public:
     enum class Prints {
         hidden, ///< only remembered
@@ -20,6 +20,8 @@ public:
     /// Shows what the program is busy with, where a person can see it go away again.
     void showStep(std::string_view text) { m_progress.show(text); }
     void clearProgress() { m_progress.clear(); }
+    /// Makes what is shown next begin a line.
+    void endLine();
 
     /// A recording of this many pictures begins: counts from 0 again, and forgets the last words.
     void beginRecording(int frames);
@@ -30,6 +32,8 @@ public:
     std::string lastWords() const;
     void forgetLastWords();
 
+    /// From now on everything that is printed is shown.
+    void showWords() { m_prints = Prints::shown; }
     /// From now on everything that is printed is kept.
     void keepWords() { m_keeps_words = true; }
     const std::string& keptWords() const { return m_kept_words; }
@@ -57,6 +61,7 @@ private:
     std::string m_open_line; ///< printed so far without a line break
     bool m_keeps_words = false;
     std::string m_kept_words;
+    bool m_is_inside_line = false; ///< the last text shown did not end its line
     int m_frames_written = 0;
     int m_frames_expected = 0;
 };

@@ -16,6 +16,10 @@ SessionOptions sessionOptions(const CommonOptions& common) {
     return options;
 }
 
+std::string readingLine(const std::filesystem::path& model) {
+    return (isDocument(model) ? "_-Open " : "_-Import ") + quotedPath(model);
+}
+
 } // namespace
 
 HostSession::HostSession(ConsoleFrontEnd& front_end, const CommonOptions& common)
@@ -41,13 +45,17 @@ std::optional<Outcome> HostSession::run(const std::string& line) {
     return Outcome::failure(words.empty() ? "this command failed: " + line : words);
 }
 
-std::optional<Outcome> HostSession::importModel(const std::filesystem::path& model) {
+std::optional<Outcome> HostSession::readModel(const std::filesystem::path& model) {
     if (const auto refusal = whyPathIsRefused("the model's path", model))
         return Outcome::misuse(*refusal);
     m_front_end.showStep("reading " + model.filename().native());
-    std::optional<Outcome> trouble = run("_-Import " + quotedPath(model));
+    std::optional<Outcome> trouble = run(readingLine(model));
     m_front_end.clearProgress();
     return trouble;
+}
+
+ConsoleFrontEnd::Prints printsFor(const CommonOptions& common) {
+    return common.is_verbose ? ConsoleFrontEnd::Prints::shown : ConsoleFrontEnd::Prints::hidden;
 }
 
 Outcome stopped(const std::string& message) {

@@ -21,8 +21,9 @@ public:
     /// @return nothing when it succeeded, else how the program ends
     std::optional<Outcome> run(const std::string& line);
 
-    /// Reads a model file into the document. Result as of run().
-    std::optional<Outcome> importModel(const std::filesystem::path& model);
+    /// Opens a document file, or reads a model file into the document that is there. Result as of
+    /// run().
+    std::optional<Outcome> readModel(const std::filesystem::path& model);
 
     Session& session() { return m_session; }
     ConsoleFrontEnd& frontEnd() { return m_front_end; }
@@ -31,6 +32,9 @@ private:
     ConsoleFrontEnd& m_front_end;
     Session m_session;
 };
+
+/// Whether the host's words are shown: only to a person who wants to see all of them.
+ConsoleFrontEnd::Prints printsFor(const CommonOptions& common);
 
 /// How the program ends when it was asked to stop.
 Outcome stopped(const std::string& message);

@@ -1,25 +1,40 @@
 #include "quarn/Interruption.h"
 
+#include <cerrno>
 #include <csignal>
+#include <fcntl.h>
+#include <poll.h>
 #include <unistd.h>
 
 namespace quarn::program {
 
 namespace {
 
-/// The signal that asked the program to stop, 0 while none did. Global, because a signal handler
-/// reaches nothing else.
+/// The signal that asked the program to stop, 0 while none did, and a pipe that has a byte in it
+/// since then, for whoever waits for input. Global, because a signal handler reaches nothing else.
 volatile std::sig_atomic_t g_stop_signal = 0;
+int g_wake_pipe[2] = {-1, -1};
 
 extern "C" void noteStopSignal(int signal) {
     if (g_stop_signal != 0)
         _exit(128 + signal);
+    const int error = errno;
     g_stop_signal = signal;
+    [[maybe_unused]] const ssize_t written = write(g_wake_pipe[1], "", 1);
+    errno = error;
+}
+
+void emptyWakePipe() {
+    char byte;
+    while (read(g_wake_pipe[0], &byte, 1) == 1)
+        ;
 }
 
 } // namespace
 
 void watchForInterruption() {
+    if (g_wake_pipe[0] < 0 && pipe2(g_wake_pipe, O_CLOEXEC | O_NONBLOCK) != 0)
+        g_wake_pipe[0] = g_wake_pipe[1] = -1; // poll passes over it
     struct sigaction action = {};
     action.sa_handler = noteStopSignal;
     action.sa_flags = SA_RESTART;
@@ -33,8 +48,27 @@ bool isInterruptionRequested() {
     return g_stop_signal != 0;
 }
 
+bool forgetCtrlC() {
+    if (g_stop_signal == SIGTERM)
+        return false;
+    emptyWakePipe();
+    g_stop_signal = 0;
+    return true;
+}
+
 int interruptionExitCode() {
     return 128 + g_stop_signal;
+}
+
+InputByte readInputByte(int descriptor) {
+    pollfd waiting[] = {{descriptor, POLLIN, 0}, {g_wake_pipe[0], POLLIN, 0}};
+    const int ready = poll(waiting, 2, -1);
+    if (isInterruptionRequested())
+        return {InputByte::Kind::interrupted};
+    if (ready < 0)
+        return {errno == EINTR ? InputByte::Kind::woken : InputByte::Kind::end};
+    InputByte input{InputByte::Kind::byte};
+    return read(descriptor, &input.byte, 1) == 1 ? input : InputByte{};
 }
 
 } // namespace quarn::program

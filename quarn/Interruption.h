@@ -10,7 +10,28 @@ void watchForInterruption();
 /// Whether the program was asked to stop.
 bool isInterruptionRequested();
 
+/// Forgets a Ctrl-C that stopped what it was meant to stop, so that the program goes on and the
+/// next one is the first again.
+/// @return false when the program was asked to terminate; that is not forgotten
+bool forgetCtrlC();
+
 /// The exit code of a program that was asked to stop: 128 plus the signal's number.
 int interruptionExitCode();
+
+/// A byte of input, or why there is none.
+struct InputByte {
+    enum class Kind {
+        byte,
+        end,         ///< nothing more will come
+        interrupted, ///< the program was asked to stop
+        woken,       ///< another signal came while nothing was typed
+    };
+    Kind kind = Kind::end;
+    unsigned char byte = 0;
+};
+
+/// Waits for a byte of a file descriptor, or for a request to stop, whichever comes first. Needs
+/// watchForInterruption.
+InputByte readInputByte(int descriptor);
 
 } // namespace quarn::program

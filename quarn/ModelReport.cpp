@@ -52,11 +52,10 @@ std::string fileReport(const std::filesystem::path& model,
 
 Outcome reportModel(const ModelOptions& options) {
     watchForInterruption();
-    ConsoleFrontEnd front_end(options.common.is_verbose ? ConsoleFrontEnd::Prints::shown
-                                                        : ConsoleFrontEnd::Prints::hidden);
+    ConsoleFrontEnd front_end(printsFor(options.common));
     HostSession host(front_end, options.common);
     const auto start = std::chrono::steady_clock::now();
-    if (const auto trouble = host.importModel(options.model))
+    if (const auto trouble = host.readModel(options.model))
         return *trouble;
     const auto read_time = std::chrono::steady_clock::now() - start;
     front_end.keepWords();

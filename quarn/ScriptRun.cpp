@@ -12,7 +12,7 @@ Outcome runScript(const ScriptOptions& options) {
     if (const auto trouble = host.loadAnimationPlugIn())
         return *trouble;
     if (!options.model.empty())
-        if (const auto trouble = host.importModel(options.model))
+        if (const auto trouble = host.readModel(options.model))
             return *trouble;
     front_end.beginRecording(0);
     const bool is_done = host.session().runScriptFile(options.script);

@@ -86,8 +86,7 @@ Outcome record(const TurntableRequest& request, const std::string& line, HostSes
 Outcome runTurntable(const TurntableRequest& request, const CommonOptions& common) {
     const Clock::time_point start = Clock::now();
     watchForInterruption();
-    ConsoleFrontEnd front_end(common.is_verbose ? ConsoleFrontEnd::Prints::shown
-                                                : ConsoleFrontEnd::Prints::hidden);
+    ConsoleFrontEnd front_end(printsFor(common));
     HostSession host(front_end, common);
     if (const auto trouble = host.loadAnimationPlugIn())
         return *trouble;

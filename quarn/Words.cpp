@@ -103,6 +103,10 @@ std::optional<std::string> whyPathIsRefused(std::string_view subject,
     return std::nullopt;
 }
 
+bool isDocument(const std::filesystem::path& file) {
+    return lowerCase(file.extension().native()) == ".quarn";
+}
+
 std::string quotedPath(const std::filesystem::path& path) {
     return '"' + path.native() + '"';
 }

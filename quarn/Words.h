@@ -30,6 +30,7 @@ std::optional<PixelSize> pixelSize(std::string_view word);
 std::string numberText(double value);
 std::string tripleText(const Triple& point);
 
+/// In ASCII letters alone.
 std::string lowerCase(std::string_view ascii);
 
 /// The characters that a file name must not hold, because one system or another forbids them.
@@ -48,6 +49,9 @@ bool hasControlCharacter(std::string_view text);
 /// @return nothing when it can
 std::optional<std::string> whyPathIsRefused(std::string_view subject,
                                             const std::filesystem::path& path);
+
+/// Whether the file is a document of the host, by its extension.
+bool isDocument(const std::filesystem::path& file);
 
 /// The path as one word of a script, which no prompt takes for an option.
 std::string quotedPath(const std::filesystem::path& path);

@@ -1,4 +1,5 @@
 #include "quarn/CommandLine.h"
+#include "quarn/Console.h"
 #include "quarn/ModelReport.h"
 #include "quarn/ScriptRun.h"
 #include "quarn/Turntable.h"
@@ -21,6 +22,9 @@ Outcome answer(const ScriptOptions& options) {
 }
 Outcome answer(const ModelOptions& options) {
     return reportModel(options);
+}
+Outcome answer(const ConsoleOptions& options) {
+    return runConsole(options);
 }
 
 Outcome runProgram(int argument_count, char** arguments) {

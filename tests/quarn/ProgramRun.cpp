@@ -18,7 +18,20 @@ namespace {
 
 constexpr std::chrono::seconds LONGEST_WAIT{60};
 
-/// In the child, between fork and exec.
+void redirect(int descriptor, const std::filesystem::path& file) {
+    const int opened = open(file.c_str(), O_CREAT | O_TRUNC | O_WRONLY, 0600);
+    dup2(opened, descriptor);
+    close(opened);
+}
+
+void readFrom(const std::filesystem::path& file) {
+    const int opened = open(file.c_str(), O_RDONLY);
+    dup2(opened, STDIN_FILENO);
+    close(opened);
+}
+
+} // namespace
+
 void becomeProgram(const Start& start) {
     if (!start.folder.empty() && chdir(start.folder.c_str()) != 0)
         _exit(126);
@@ -36,21 +49,14 @@ void becomeProgram(const Start& start) {
     _exit(127);
 }
 
-void redirect(int descriptor, const std::filesystem::path& file) {
-    const int opened = open(file.c_str(), O_CREAT | O_TRUNC | O_WRONLY, 0600);
-    dup2(opened, descriptor);
-    close(opened);
-}
-
-} // namespace
-
 RunningProgram::RunningProgram(const Start& start) {
     int terminal = -1;
     if (start.has_terminal && openpty(&m_terminal, &terminal, nullptr, nullptr, nullptr) != 0)
         throw std::runtime_error("cannot open a terminal");
+    writeFile(m_output / "in", start.input);
     m_child = fork();
     if (m_child == 0) {
-        redirect(STDIN_FILENO, "/dev/null");
+        readFrom(m_output / "in");
         redirect(STDOUT_FILENO, m_output / "out");
         if (start.has_terminal)
             dup2(terminal, STDERR_FILENO);

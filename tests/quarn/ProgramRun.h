@@ -15,10 +15,14 @@ struct Start {
     std::vector<std::string> arguments;
     std::filesystem::path folder;                   ///< to run in; empty: the test's own
     std::map<std::string, std::string> environment; ///< on top of the test's own
+    std::string input;                              ///< what its standard input holds
     unsigned long largest_file = 0;                 ///< bytes; 0: no limit
     bool has_terminal = false;                      ///< its standard error is a terminal
     std::filesystem::path program = QUARN_PROGRAM;
 };
+
+/// Makes a process that was just forked the program. Never returns.
+[[noreturn]] void becomeProgram(const Start& start);
 
 /// How the program ended.
 struct Ended {

@@ -1,0 +1,47 @@
+#include "quarn/PlainLines.h"
+
+#include "kelmar/KM_wString.h"
+#include "quarn/Interruption.h"
+
+#include <cstdio>
+
+namespace quarn::program {
+
+namespace {
+
+void show(const std::string& text) {
+    std::fwrite(text.data(), 1, text.size(), stdout);
+    std::fflush(stdout);
+}
+
+LineRead lineOf(std::string bytes) {
+    if (bytes.ends_with('\r'))
+        bytes.pop_back();
+    show(bytes + "\n");
+    return {LineRead::Kind::line, std::wstring(KM_wString::FromUtf8(bytes).View())};
+}
+
+LineRead noLine(LineRead::Kind why) {
+    show("\n");
+    return {why, {}};
+}
+
+} // namespace
+
+LineRead PlainLines::read(const std::wstring& prompt, LineUse, const Completer&) {
+    show(KM_wString(std::wstring_view(prompt)).ToUtf8());
+    std::string bytes;
+    for (;;) {
+        const InputByte input = readInputByte(m_descriptor);
+        if (input.kind == InputByte::Kind::interrupted)
+            return noLine(LineRead::Kind::interrupted);
+        if (input.kind == InputByte::Kind::end && bytes.empty())
+            return noLine(LineRead::Kind::end);
+        if (input.kind == InputByte::Kind::end || input.byte == '\n')
+            return lineOf(std::move(bytes));
+        if (input.kind == InputByte::Kind::byte)
+            bytes += static_cast<char>(input.byte);
+    }
+}
+
+} // namespace quarn::program
