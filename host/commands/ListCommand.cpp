@@ -52,10 +52,11 @@ struct ObjectCounts {
     }
 };
 
-KM_wString sizeText(const KM_BoundingBox& box) {
+KM_wString sizeText(const KM_BoundingBox& box, UnitSystem units) {
     const KM_3dVector size = box.Diagonal();
     return L"from " + pointText(box.m_min) + L" to " + pointText(box.m_max) + L", size " +
-           numberText(size.x) + L" x " + numberText(size.y) + L" x " + numberText(size.z) + L"\n";
+           numberText(size.x) + L" x " + numberText(size.y) + L" x " + numberText(size.z) +
+           (units == UnitSystem::none ? L"\n" : KM_wString(L" ") + unitName(units) + L"\n");
 }
 
 KM_wString lineOf(const DocumentObject& object, bool with_id) {
@@ -158,7 +159,7 @@ CQuarnCommand::result runList(const CQuarnCommandContext& context) {
     application.print(counts.text().View());
     const KM_BoundingBox box = document.objects().visibleBox();
     if (box.IsValid())
-        application.print(sizeText(box).View());
+        application.print(sizeText(box, document.units()).View());
     return CQuarnCommand::success;
 }
 

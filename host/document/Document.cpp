@@ -142,6 +142,8 @@ void Document::closeNow(ViewState& view) {
 }
 
 void Document::addModel(const ImportedModel& model) {
+    if (m_objects.empty())
+        m_units = model.units;
     for (const ImportedMesh& mesh : model.meshes)
         m_objects.addMesh(mesh.name, mesh.mesh, mesh.material);
     for (const ImportedCurve& curve : model.curves)

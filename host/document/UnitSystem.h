@@ -17,4 +17,25 @@ enum class UnitSystem : std::int32_t {
 
 inline constexpr UnitSystem LAST_UNIT_SYSTEM = UnitSystem::feet;
 
+/// "metres", "inches" and so on, in English; empty for none.
+constexpr const wchar_t* unitName(UnitSystem units) {
+    switch (units) {
+    case UnitSystem::none:
+        break;
+    case UnitSystem::millimeters:
+        return L"millimetres";
+    case UnitSystem::centimeters:
+        return L"centimetres";
+    case UnitSystem::meters:
+        return L"metres";
+    case UnitSystem::kilometers:
+        return L"kilometres";
+    case UnitSystem::inches:
+        return L"inches";
+    case UnitSystem::feet:
+        return L"feet";
+    }
+    return L"";
+}
+
 } // namespace quarn

@@ -68,6 +68,10 @@ ModelConventions conventionsOf(const aiScene& scene, const fs::path& path, UpAxi
     return conventions;
 }
 
+UnitSystem unitsOf(const std::string& format) {
+    return isOneOf(format, {"gltf", "glb"}) ? UnitSystem::meters : UnitSystem::none;
+}
+
 void configure(Assimp::Importer& importer) {
     importer.SetPropertyBool(AI_CONFIG_IMPORT_FBX_PRESERVE_PIVOTS, false);
     importer.SetPropertyBool(AI_CONFIG_IMPORT_FBX_READ_ANIMATIONS, false);
@@ -131,6 +135,7 @@ Result<ImportedModel> readChecked(const fs::path& path, UpAxis up) {
     if (!model) {
         return cannotReadModel(path, model.message(), repair);
     }
+    model.value().units = unitsOf(modelFormat(path));
     warnOfRefused(refused, model.value());
     return isEmpty(model.value()) ? nothingLeft(path, model.value()) : std::move(model);
 }

@@ -2,6 +2,7 @@
 
 #include "host/app/Result.h"
 #include "host/document/Material.h"
+#include "host/document/UnitSystem.h"
 #include "kelmar/KM_3dPointArray.h"
 #include "kelmar/KM_Mesh.h"
 #include "kelmar/KM_Viewport.h"
@@ -41,6 +42,7 @@ struct ImportedModel {
     std::vector<ImportedCurve> curves;
     KM_3dPointArray points;
     std::vector<ImportedCamera> cameras;
+    UnitSystem units = UnitSystem::none; ///< of the coordinates, where the format defines them
     std::vector<std::string> warnings; ///< sentences for the person: what was left out and why
 
     /// All triangles of all meshes.
@@ -61,6 +63,8 @@ enum class UpAxis {
 ///   (glTF, GLB), or that Assimp hands out Y-up (FBX, DAE, 3DS and others), are turned, with Y to Z
 ///   and Z to -Y. OBJ, PLY, STL, OFF, 3MF, AMF, DXF and BLEND state no axis or are Z-up: they stay
 ///   as they are. Files of these that were made Y-up are read with UpAxis::y.
+/// - Lengths of glTF and GLB are metres (Khronos Group, glTF 2.0 Specification, section 3.4); other
+///   formats leave the units to whoever made the file.
 /// - The transforms of the file's nodes are applied, so a mesh that stands in a scene ten times
 ///   becomes ten meshes. Mirroring turns the triangles' winding, so that outside stays outside.
 /// - Vertex normals of the file are kept, except those of STL, which only repeat the facets. Where

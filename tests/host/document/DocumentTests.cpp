@@ -143,6 +143,15 @@ TEST_F(DocumentTest, TheToleranceSuitsTinyModels) {
     EXPECT_NEAR(tiny.face().AbsoluteTolerance(), 1e-6 * 0.001 * std::sqrt(3.0), 1e-15);
 }
 
+TEST_F(DocumentTest, TheFirstModelBringsItsUnits) {
+    ImportedModel in_meters = boxModel(1.0);
+    in_meters.units = UnitSystem::meters;
+    document.addModel(in_meters);
+    EXPECT_EQ(document.units(), UnitSystem::meters);
+    document.addModel(boxModel(2.0));
+    EXPECT_EQ(document.units(), UnitSystem::meters);
+}
+
 TEST_F(DocumentTest, AModelIsSharedAndNotCopied) {
     ImportedModel model = boxModel(1.0);
     const KM_3dPoint path[] = {{0, 0, 0}, {1, 0, 0}, {1, 1, 0}};

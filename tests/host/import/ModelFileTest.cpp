@@ -101,6 +101,14 @@ TEST(ModelFile, GltfIsTurnedFromYUpToZUp) {
     expectNear(boundsOf(model).m_max, {1, 0, 1}, 1e-7);
 }
 
+TEST(ModelFile, LengthsOfGltfAreMetresAndThoseOfOtherFormatsAreNotStated) {
+    const TemporaryFolder folder;
+    const std::string gltf = folder.write("a.gltf", gltfTriangle(R"([{"mesh":0}])", gray_half));
+    EXPECT_EQ(readOrFail(gltf).units, UnitSystem::meters);
+    const std::string obj = folder.write("a.obj", "v 0 0 0\nv 1 0 0\nv 0 1 0\nf 1 2 3\n");
+    EXPECT_EQ(readOrFail(obj).units, UnitSystem::none);
+}
+
 TEST(ModelFile, LinearBaseColourOfGltfBecomesSrgb) {
     const TemporaryFolder folder;
     const ImportedModel model =
