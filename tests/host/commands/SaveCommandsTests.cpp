@@ -197,6 +197,8 @@ TEST_F(SaveCommandsTest, SaveSelectedWritesTheSelectionAndTheDocumentKeepsItsFil
     runOn(L"_-Open", "part.quarn");
     EXPECT_THAT(names(), ElementsAre("Walk", "Mark"));
     EXPECT_EQ(document().views().size(), 4U);
+    EXPECT_EQ(document().activeView().viewport().TargetPoint(), KM_3dPoint(2.5, 1, 1.5))
+        << "the file has no views, so what is read is fitted";
 }
 
 TEST_F(SaveCommandsTest, SaveSelectedRefusesAnEmptySelectionAndTheDocumentsOwnFile) {

@@ -261,6 +261,21 @@ TEST_F(PreselectionTest, LeavesOutWhatTheFilterRefusesOnlyWhereThatIsWished) {
     EXPECT_THAT(names, ElementsAre("North gate"));
 }
 
+TEST_F(PreselectionTest, DoesNotReplaceObjectsThatWereGiven) {
+    TestCommand command(L"Pick", [&](const CQuarnCommandContext&) {
+        CQuarnGetObject get;
+        get.AddCommandOption({L"Deeper", L"Deeper"});
+        EXPECT_EQ(get.GetObjects(1, 0), CQuarnGet::option);
+        get.EnablePreSelect(true, true);
+        EXPECT_EQ(get.GetObjects(1, 0), CQuarnGet::object);
+        EXPECT_EQ(get.ObjectCount(), 1);
+        EXPECT_EQ(get.Object(0).ObjectUuid(), idOf(L"Roof"));
+        return get.CommandResult();
+    });
+    add(command);
+    EXPECT_EQ(run(L"Pick Roof Deeper _Enter"), CQuarnCommand::success);
+}
+
 // ---- What a reference tells
 
 TEST_F(ObjectPromptTest, AReferenceGivesThePointOfAPointObjectOnly) {
