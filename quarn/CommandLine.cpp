@@ -13,16 +13,18 @@ namespace {
 constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
 
   quarn turntable MODEL --frames N --out DIR   record a turntable as pictures and a page
+  quarn frame DOC --number K --out FILE        write one frame of a saved animation
   quarn run SCRIPT [MODEL]                     run a script of host commands
   quarn console [MODEL]                        type host commands
   quarn info MODEL                             tell what a model file holds
 
-quarn --help and quarn COMMAND --help tell more.
+A MODEL may be a .quarn document too. quarn --help and quarn COMMAND --help tell more.
 )";
 
 constexpr const char* PROGRAM_FOOTER = R"(
 Examples:
-  quarn turntable house.glb --frames 120 --out out/house
+  quarn turntable house.glb --frames 120 --out out/house --save house.quarn
+  quarn frame house.quarn --number 60 --out middle.png
   quarn info house.glb
   quarn run steps.txt house.glb
   quarn console house.glb
@@ -40,6 +42,13 @@ Examples:
   quarn turntable part.stl --frames 36 --out out --mode Shaded --format png --size 640x480
   quarn turntable town.obj --frames 240 --out out --elevation 35 --distance 0.8 --name Town
   quarn turntable town.obj --frames 240 --out out --show-script > town.txt)";
+
+constexpr const char* FRAME_FOOTER = R"(
+The frame is drawn as the recording draws it; at the view's own size it is the same file.
+
+Examples:
+  quarn frame house.quarn --number 0 --out first.jpg
+  quarn frame house.quarn --number 60 --size 3840x2160 --out middle.png)";
 
 constexpr const char* RUN_FOOTER = R"(
 A script holds one host command a line; the words after a command's name answer its questions.
@@ -86,6 +95,11 @@ void addCommonOptions(CLI::App& command, CommonOptions& common) {
     command.allow_extras();
 }
 
+void addShowScript(CLI::App& command, bool& shows_script) {
+    command.add_flag("--show-script", shows_script,
+                     "Print the host commands that would be run, and run nothing");
+}
+
 CLI::App& addTurntable(CLI::App& program, TurntableOptions& options) {
     CLI::App& command =
         *program.add_subcommand("turntable", "Record a turntable as pictures and a page");
@@ -93,7 +107,8 @@ CLI::App& addTurntable(CLI::App& program, TurntableOptions& options) {
                          const std::string& description) {
         return command.add_option(name, value, description)->type_name(value_name);
     };
-    add("MODEL", options.model, "", "The model file: OBJ, glTF, GLB, PLY, STL, ...")->required();
+    add("MODEL", options.model, "", "The model file: OBJ, glTF, GLB, PLY, STL, ...; or a document")
+        ->required();
     add("--frames", options.frames, "N", "Pictures of one whole turn, from 1")->required();
     add("--out", options.folder, "DIR", "Folder for the pictures and the page")->required();
     add("--up", options.up_axis, "AXIS",
@@ -117,9 +132,27 @@ CLI::App& addTurntable(CLI::App& program, TurntableOptions& options) {
         ->expected(1)
         ->take_all();
     add("--name", options.name, "NAME", "Name of the animation (default: the model file's)");
-    command.add_flag("--show-script", options.shows_script,
-                     "Print the host commands that would be run, and run nothing");
+    add("--save", options.document, "DOC",
+        "Keep the document with its animation in this .quarn file, before recording");
+    addShowScript(command, options.shows_script);
     command.footer(TURNTABLE_FOOTER);
+    addCommonOptions(command, options.common);
+    return command;
+}
+
+CLI::App& addFrame(CLI::App& program, FrameOptions& options) {
+    CLI::App& command =
+        *program.add_subcommand("frame", "Write one frame of a document's animation");
+    const auto add = [&](const char* name, std::string& value, const char* value_name,
+                         const char* description) {
+        return command.add_option(name, value, description)->type_name(value_name);
+    };
+    add("DOC", options.document, "", "The document, a .quarn file")->required();
+    add("--number", options.number, "K", "The frame, from 0 as in file names")->required();
+    add("--size", options.size, "WxH", "Size of the picture in pixels (default: the view's)");
+    add("--out", options.file, "FILE", "The picture: .jpg, .png, .bmp or .tga")->required();
+    addShowScript(command, options.shows_script);
+    command.footer(FRAME_FOOTER);
     addCommonOptions(command, options.common);
     return command;
 }
@@ -127,7 +160,8 @@ CLI::App& addTurntable(CLI::App& program, TurntableOptions& options) {
 CLI::App& addRun(CLI::App& program, ScriptOptions& options) {
     CLI::App& command = *program.add_subcommand("run", "Run a script of host commands");
     command.add_option("SCRIPT", options.script, "The script file")->type_name("")->required();
-    command.add_option("MODEL", options.model, "A model file to read first")->type_name("");
+    command.add_option("MODEL", options.model, "A model file or document to read first")
+        ->type_name("");
     command.footer(RUN_FOOTER);
     addCommonOptions(command, options.common);
     return command;
@@ -135,7 +169,9 @@ CLI::App& addRun(CLI::App& program, ScriptOptions& options) {
 
 CLI::App& addInfo(CLI::App& program, ModelOptions& options) {
     CLI::App& command = *program.add_subcommand("info", "Tell what a model file holds");
-    command.add_option("MODEL", options.model, "The model file")->type_name("")->required();
+    command.add_option("MODEL", options.model, "The model file or document")
+        ->type_name("")
+        ->required();
     command.footer(INFO_FOOTER);
     addCommonOptions(command, options.common);
     return command;
@@ -143,7 +179,8 @@ CLI::App& addInfo(CLI::App& program, ModelOptions& options) {
 
 CLI::App& addConsole(CLI::App& program, ConsoleOptions& options) {
     CLI::App& command = *program.add_subcommand("console", "Type host commands");
-    command.add_option("MODEL", options.model, "A model file to read first")->type_name("");
+    command.add_option("MODEL", options.model, "A model file or document to read first")
+        ->type_name("");
     command.footer(CONSOLE_FOOTER);
     addCommonOptions(command, options.common);
     return command;
@@ -159,7 +196,7 @@ Outcome refuseLeftOver(const CLI::App& command, const std::string& word) {
         return Outcome::misuse("unknown option " + word + hintOf(command));
     if (command.get_parent() == nullptr)
         return Outcome::misuse("unknown command " + word +
-                               "; the commands are turntable, run, console and info" +
+                               "; the commands are turntable, frame, run, console and info" +
                                hintOf(command));
     return Outcome::misuse("unexpected argument " + word + hintOf(command));
 }
@@ -185,10 +222,12 @@ Request readCommandLine(int argument_count, const char* const* arguments) {
     program.allow_extras();
     program.require_subcommand(0, 1); // further words may be files that are named like a command
     TurntableOptions turntable;
+    FrameOptions frame;
     ScriptOptions script;
     ModelOptions model;
     ConsoleOptions console;
     const CLI::App& turntable_command = addTurntable(program, turntable);
+    const CLI::App& frame_command = addFrame(program, frame);
     const CLI::App& run_command = addRun(program, script);
     const CLI::App& console_command = addConsole(program, console);
     addInfo(program, model);
@@ -211,8 +250,11 @@ Request readCommandLine(int argument_count, const char* const* arguments) {
         return Outcome{Outcome::misused, SHORT_HELP};
     if (&command == &turntable_command) {
         turntable.was_name_given = command.count("--name") > 0;
+        turntable.was_document_given = command.count("--save") > 0;
         return turntable;
     }
+    if (&command == &frame_command)
+        return frame;
     if (&command == &run_command)
         return script;
     if (&command == &console_command)

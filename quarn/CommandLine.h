@@ -31,6 +31,18 @@ struct TurntableOptions {
     std::vector<std::string> hidden; ///< names of objects
     std::string name;
     bool was_name_given = false;
+    std::string document; ///< to save
+    bool was_document_given = false;
+    bool shows_script = false;
+    CommonOptions common;
+};
+
+/// `quarn frame`
+struct FrameOptions {
+    std::string document;
+    std::string number;
+    std::string size; ///< empty: the view's
+    std::string file;
     bool shows_script = false;
     CommonOptions common;
 };
@@ -55,8 +67,8 @@ struct ConsoleOptions {
 };
 
 /// What the program was asked for; an Outcome when that ended it already (help, or a mistake).
-using Request =
-    std::variant<Outcome, TurntableOptions, ScriptOptions, ModelOptions, ConsoleOptions>;
+using Request = std::variant<Outcome, TurntableOptions, ScriptOptions, ModelOptions, ConsoleOptions,
+                             FrameOptions>;
 
 /// Reads the program's arguments. Values are not looked into here.
 Request readCommandLine(int argument_count, const char* const* arguments);

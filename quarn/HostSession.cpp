@@ -16,10 +16,6 @@ SessionOptions sessionOptions(const CommonOptions& common) {
     return options;
 }
 
-std::string readingLine(const std::filesystem::path& model) {
-    return (isDocument(model) ? "_-Open " : "_-Import ") + quotedPath(model);
-}
-
 } // namespace
 
 HostSession::HostSession(ConsoleFrontEnd& front_end, const CommonOptions& common)

@@ -18,6 +18,8 @@ std::string scriptText(const TurntableRequest& request) {
     for (const std::string& line : script.set_up)
         text += line + "\n";
     text += "# The folder must be there before the recording starts.\n";
+    if (script.saving)
+        text += *script.saving + "\n";
     return text + script.recording;
 }
 
@@ -70,15 +72,18 @@ private:
     std::string m_reason;
 };
 
-Outcome record(const TurntableRequest& request, const std::string& line, HostSession& host,
+Outcome record(const TurntableRequest& request, const TurntableScript& script, HostSession& host,
                Clock::time_point start) {
     if (const auto refusal = whyFolderCannotBeUsed(request.folder))
         return Outcome::failure(*refusal);
+    if (script.saving)
+        if (const auto trouble = host.run(*script.saving))
+            return *trouble;
     if (isInterruptionRequested())
         return stopped("Stopped before anything was recorded.");
     ConsoleFrontEnd& front_end = host.frontEnd();
     front_end.beginRecording(request.frames);
-    const auto trouble = host.run(line);
+    const auto trouble = host.run(script.recording);
     front_end.clearProgress();
     return RecordingEnd(request, front_end).outcome(!trouble, Clock::now() - start);
 }
@@ -95,7 +100,7 @@ Outcome runTurntable(const TurntableRequest& request, const CommonOptions& commo
     for (const std::string& line : script.set_up)
         if (const auto trouble = host.run(line))
             return *trouble;
-    return record(request, script.recording, host, start);
+    return record(request, script, host, start);
 }
 
 } // namespace

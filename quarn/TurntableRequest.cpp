@@ -10,7 +10,6 @@ namespace quarn::program {
 
 namespace {
 
-constexpr int LARGEST_SIZE_PX = 16384;
 constexpr double STEEPEST_ELEVATION_DEG = 89.0;
 constexpr double NEAREST_DISTANCE = 0.01; // as the command FitView takes them
 constexpr double FARTHEST_DISTANCE = 1000.0;
@@ -35,6 +34,7 @@ public:
         checkDirection();
         checkCamera();
         checkHidden();
+        checkDocument();
         if (m_mistake)
             return Outcome::misuse(*m_mistake);
         return m_request;
@@ -58,6 +58,8 @@ private:
         m_request.up_axis = axis == "y" ? "Y" : axis == "z" ? "Z" : "";
         if (!axis.empty() && m_request.up_axis.empty())
             refuse("--up must be y or z" + notBut(m_typed.up_axis));
+        if (!axis.empty() && isDocument(m_request.model))
+            refuse("--up is for model files; a document knows its axes.");
     }
 
     void checkName() {
@@ -73,11 +75,9 @@ private:
     }
 
     void checkSize() {
-        const auto is_good = [](int size_px) { return size_px >= 1 && size_px <= LARGEST_SIZE_PX; };
-        m_request.size = pixelSize(m_typed.size).value_or(PixelSize{0, 0});
-        if (!is_good(m_request.size.width_px) || !is_good(m_request.size.height_px))
-            refuse("--size must be WIDTHxHEIGHT such as 1280x720, each from 1 to " +
-                   std::to_string(LARGEST_SIZE_PX) + notBut(m_typed.size));
+        m_request.size = pictureSize(m_typed.size).value_or(PixelSize{0, 0});
+        if (m_request.size.width_px == 0)
+            refuse(sizeMistake(m_typed.size));
     }
 
     void checkMode() {
@@ -123,6 +123,19 @@ private:
         m_request.hidden = m_typed.hidden;
         for (const std::string& name : m_request.hidden)
             refuse(whyPathIsRefused("the name of --hide", name));
+    }
+
+    void checkDocument() {
+        if (!m_typed.was_document_given)
+            return;
+        m_request.document = m_typed.document;
+        refuse(whyPathIsRefused("the path of --save", m_request.document));
+        if (!m_request.document.has_filename())
+            refuse("--save must name a file" + notBut(m_typed.document));
+        if (!m_request.document.has_extension())
+            m_request.document += ".quarn";
+        if (!isDocument(m_request.document))
+            refuse("--save must name a file that ends in .quarn" + notBut(m_typed.document));
     }
 
     const TurntableOptions& m_typed;

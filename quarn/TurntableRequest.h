@@ -26,6 +26,7 @@ struct TurntableRequest {
     std::optional<double> distance_factor;
     std::optional<Triple> target;
     std::vector<std::string> hidden; ///< names of objects; UTF-8
+    std::filesystem::path document;  ///< to save, a .quarn file; empty: none
 };
 
 /// Checks what was typed, before anything runs.

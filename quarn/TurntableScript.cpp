@@ -27,11 +27,6 @@ Triple cameraLocation(const Triple& target, double elevation_deg) {
             target[2] + distance * std::sin(elevation)};
 }
 
-std::string import(const TurntableRequest& request) {
-    const std::string up = request.up_axis.empty() ? "" : "[Up] _" + request.up_axis + " ";
-    return "_-Import " + up + quotedPath(request.model);
-}
-
 std::string camera(const TurntableRequest& request) {
     const Triple target = request.target.value_or(Triple{0.0, 0.0, 0.0});
     return "_-Camera _Location " + tripleText(cameraLocation(target, request.elevation_deg)) +
@@ -57,7 +52,7 @@ std::string setTurntable(const TurntableRequest& request) {
 
 TurntableScript composeTurntable(const TurntableRequest& request) {
     TurntableScript script;
-    script.set_up = {import(request)};
+    script.set_up = {readingLine(request.model, request.up_axis)};
     for (const std::string& name : request.hidden)
         script.set_up.push_back("_-Hide \"" + name + "\"");
     for (const std::string& line : {
@@ -69,6 +64,8 @@ TurntableScript composeTurntable(const TurntableRequest& request) {
              setTurntable(request),
          })
         script.set_up.push_back(line);
+    if (!request.document.empty())
+        script.saving = "_-SaveAs " + quotedPath(request.document);
     script.recording = "_-RecordAnimation _TargetFolder " + quotedPath(request.folder) + " _Enter";
     return script;
 }

@@ -2,6 +2,7 @@
 
 #include "quarn/TurntableRequest.h"
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -10,7 +11,9 @@ namespace quarn::program {
 /// The host commands that record a turntable: one line each, in UTF-8.
 struct TurntableScript {
     std::vector<std::string> set_up; ///< from the model file to the animation
-    std::string recording;           ///< needs the folder to be there
+    /// Keeps the document before the recording begins, so that one which is stopped keeps it too.
+    std::optional<std::string> saving;
+    std::string recording; ///< this and `saving` need the folder to be there
 };
 
 TurntableScript composeTurntable(const TurntableRequest& request);

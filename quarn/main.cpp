@@ -2,6 +2,7 @@
 #include "quarn/Console.h"
 #include "quarn/ModelReport.h"
 #include "quarn/ScriptRun.h"
+#include "quarn/SingleFrame.h"
 #include "quarn/Turntable.h"
 
 #include <cstdio>
@@ -25,6 +26,10 @@ Outcome answer(const ModelOptions& options) {
 }
 Outcome answer(const ConsoleOptions& options) {
     return runConsole(options);
+}
+
+Outcome answer(const FrameOptions& options) {
+    return writeSingleFrame(options);
 }
 
 Outcome runProgram(int argument_count, char** arguments) {

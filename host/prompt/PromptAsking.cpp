@@ -33,17 +33,18 @@ Reply takeWord(RunningCommand& command) {
     return {answerOf(text), true, false};
 }
 
-/// Whether a person put a name of an object in quotes, as it stands in a command line.
-bool isQuotedName(const PromptState& prompt, const Answer& answer) {
+/// Whether a person put all of an answer in quotes: an object's name or a path, as it stands in a
+/// command line.
+bool isQuoted(const Answer& answer) {
     const std::wstring_view text = answer.text.View();
-    return prompt.kind == Question::Kind::object && answer.kind == Answer::Kind::text &&
-           text.size() > 2 && text.front() == L'"' && text.back() == L'"';
+    return answer.kind == Answer::Kind::text && text.size() > 2 && text.front() == L'"' &&
+           text.find(L'"', 1) == text.size() - 1;
 }
 
 /// What a person says; an empty text is Enter.
 Reply askPerson(Application& application, const PromptState& prompt) {
     Answer answer = application.frontEnd().ask(prompt.question());
-    if (isQuotedName(prompt, answer)) {
+    if (isQuoted(answer)) {
         const std::wstring_view text = answer.text.View();
         return {{Answer::Kind::text, text.substr(1, text.size() - 2)}, false, true};
     }

@@ -61,7 +61,7 @@ TEST_F(Console, ListsTheNamesThatACompletionLeavesOpen) {
     ASSERT_TRUE(terminal.shows("ViewPreviousFrame"));
     ASSERT_TRUE(terminal.shows("Command: View"));
     terminal.type("L\t\r");
-    ASSERT_TRUE(terminal.shows("ViewLastFrame"));
+    ASSERT_TRUE(terminal.shows("LastFrame \n")) << terminal.screen();
     ASSERT_TRUE(terminal.shows(IDLE));
     EXPECT_THAT(terminal.between(), Not(HasSubstr("Unknown command")));
 }
@@ -229,14 +229,14 @@ TEST_F(Console, CtrlCEndsARecordingWithWholePicturesAndGoesOn) {
 // ---- Without a terminal
 
 TEST_F(Console, ReadsAPipeAndShowsItAsIfItWereTyped) {
-    const Ended ended = feed("List\n# a note\n\nSetTurntableAnimation 8 Clockwise\nnone\n"
+    const Ended ended = feed("Help List\n# a note\n\nSetTurntableAnimation 8 Clockwise\nnone\n"
                              "_Cancel\nExit\nList\n");
     EXPECT_EQ(ended.exit_code, 0);
     EXPECT_THAT(ended.err, IsEmpty());
     const std::vector<std::string> lines = linesOf(ended.out);
     ASSERT_THAT(lines, SizeIs(testing::Gt(5u))) << ended.out;
-    EXPECT_EQ(lines[0], "Command: List");
-    EXPECT_THAT(lines[1], StartsWith("0 meshes"));
+    EXPECT_EQ(lines[0], "Command: Help List");
+    EXPECT_THAT(lines[1], StartsWith("List  "));
     EXPECT_EQ(lines[2], "Command: # a note");
     EXPECT_EQ(lines[3], "Command: ");
     EXPECT_EQ(lines[4], "Command: SetTurntableAnimation 8 Clockwise");

@@ -58,6 +58,23 @@ TEST_F(TypedCommandTest, EndsWhereNobodyCanBeAskedAgain) {
     EXPECT_EQ(m_numbers[0], 0);
 }
 
+TEST_F(TypedCommandTest, QuotesAroundAWholeAnswerAreNoPartOfIt) {
+    std::vector<std::string> answers;
+    TestCommand name(L"Name", [&answers](const CQuarnCommandContext&) {
+        CQuarnGetString get;
+        get.SetCommandPrompt(L"Name");
+        get.GetString();
+        answers.push_back(KM_wString(get.String()).ToUtf8());
+        return get.CommandResult();
+    });
+    add(name);
+    for (const wchar_t* typed : {L"\"North gate\"", L"\"_Enter\"", L"\"a\" or \"b\"", L"\""}) {
+        front_end.addAnswer(typed);
+        session.runTypedCommand(L"Name");
+    }
+    EXPECT_THAT(answers, testing::ElementsAre("North gate", "_Enter", "\"a\" or \"b\"", "\""));
+}
+
 TEST_F(TypedCommandTest, ScriptsOfACommandAreNotTyped) {
     CQuarnCommand::result nested = CQuarnCommand::success;
     bool succeeded = true;
