@@ -120,6 +120,8 @@ LineRead LineEditor::read(const std::wstring& prompt, LineUse use, const Complet
     el_wset(editor, EL_HIST, history_w, historyOf(use));
     el_resize(editor);
     std::fflush(stdout);
+    // Else the prompt is seen a moment before the terminal is ready: a Ctrl-D then would be lost.
+    el_set(editor, EL_PREP_TERM, 1);
 
     int length = 0;
     const wchar_t* const line = el_wgets(editor, &length);

@@ -70,7 +70,8 @@ TEST(Arguments, VersionIsPrinted) {
 }
 
 TEST(Arguments, UnknownCommandIsNamed) {
-    expectRefusal(run({"turnip"}), {"unknown command turnip", "turntable, run and info"});
+    expectRefusal(run({"turnip"}),
+                  {"unknown command turnip", "turntable, frame, run, console and info"});
 }
 
 TEST(Arguments, UnknownOptionIsNamed) {
