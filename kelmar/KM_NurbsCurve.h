@@ -41,6 +41,17 @@ public:
     ///         max(3, order - 1) points
     bool CreatePeriodicUniformNurbs(std::span<const KM_3dPoint> points, int order);
 
+    /// The cubic curve through the points in turn, with continuous second derivatives. Parameters
+    /// are chord lengths: at point k the parameter is the length of the polyline through the points
+    /// up to it, in model units, so the curve is run through at nearly unit speed.
+    ///
+    /// An open curve has no curvature at its ends (the natural spline); two points give a straight
+    /// one. A closed curve passes the first point again at its end and is as smooth there as
+    /// elsewhere; the first point is not to be repeated.
+    /// @return false, with the curve unchanged, for less than 2 points (3 when closed), when
+    ///         neighbours coincide or a point is not valid
+    bool CreateCubicThroughPoints(std::span<const KM_3dPoint> points, bool closed);
+
     int Order() const { return m_order; }
     /// Order() - 1, and 0 for a curve that was not created.
     int Degree() const { return m_order > 0 ? m_order - 1 : 0; }
