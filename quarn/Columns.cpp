@@ -1,6 +1,6 @@
 #include "quarn/Columns.h"
 
-#include "kelmar/KM_wString.h"
+#include "quarn/Words.h"
 
 #include <algorithm>
 
@@ -27,7 +27,7 @@ std::string inColumns(const std::vector<std::wstring>& names, std::size_t width)
                 names[i] + (is_last ? L"\n" : std::wstring(longest + GAP - names[i].size(), L' '));
         }
     }
-    return KM_wString(std::wstring_view(text)).ToUtf8();
+    return utf8Text(text);
 }
 
 } // namespace quarn::program

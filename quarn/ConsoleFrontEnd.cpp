@@ -1,6 +1,7 @@
 #include "quarn/ConsoleFrontEnd.h"
 
 #include "quarn/Interruption.h"
+#include "quarn/Words.h"
 
 #include <thread>
 
@@ -9,10 +10,6 @@ namespace quarn::program {
 namespace {
 
 constexpr std::chrono::milliseconds PROGRESS_STEP{50};
-
-std::string utf8(std::wstring_view text) {
-    return KM_wString(text).ToUtf8();
-}
 
 std::string trimmed(const std::string& line) {
     constexpr const char* BLANKS = " \t\r\n";
@@ -57,7 +54,7 @@ void ConsoleFrontEnd::rememberWords(std::string_view text) {
 }
 
 void ConsoleFrontEnd::print(std::wstring_view text) {
-    const std::string bytes = utf8(text);
+    const std::string bytes = utf8Text(text);
     rememberWords(bytes);
     if (m_keeps_words)
         m_kept_words += bytes;
@@ -83,7 +80,7 @@ Answer ConsoleFrontEnd::ask(const Question&) {
 int ConsoleFrontEnd::showMessage(std::wstring_view text, std::wstring_view title, unsigned) {
     m_progress.clear();
     std::fflush(stdout);
-    std::fprintf(stderr, "%s: %s\n", utf8(title).c_str(), trimmed(utf8(text)).c_str());
+    std::fprintf(stderr, "%s: %s\n", utf8Text(title).c_str(), trimmed(utf8Text(text)).c_str());
     return 1;
 }
 

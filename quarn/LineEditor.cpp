@@ -1,9 +1,9 @@
 #include "quarn/LineEditor.h"
 
-#include "kelmar/KM_wString.h"
 #include "quarn/Columns.h"
 #include "quarn/Interruption.h"
 #include "quarn/PromptText.h"
+#include "quarn/Words.h"
 
 #include <clocale>
 #include <csignal>
@@ -74,7 +74,7 @@ std::size_t terminalWidth() {
 /// @return the last line of the prompt
 std::wstring showAllButLastLine(const std::wstring& prompt) {
     const std::size_t last_begin = prompt.rfind(L'\n') + 1; // 0 where there is one line
-    std::fputs(KM_wString(prompt.substr(0, last_begin).c_str()).ToUtf8().c_str(), stdout);
+    std::fputs(utf8Text(prompt.substr(0, last_begin)).c_str(), stdout);
     return prompt.substr(last_begin);
 }
 
@@ -176,7 +176,7 @@ bool LineEditor::readTail(unsigned char first, wchar_t& character) {
             return false;
         bytes += static_cast<char>(byte);
     }
-    character = *KM_wString::FromUtf8(bytes).Array();
+    character = *wideText(bytes).c_str();
     return true;
 }
 

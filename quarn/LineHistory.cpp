@@ -1,6 +1,6 @@
 #include "quarn/LineHistory.h"
 
-#include "kelmar/KM_wString.h"
+#include "quarn/Words.h"
 
 #include <cstdlib>
 #include <fcntl.h>
@@ -66,7 +66,7 @@ std::vector<std::wstring> LineHistory::load() const {
     }
     std::vector<std::wstring> texts;
     for (const std::string& line : lines)
-        texts.emplace_back(KM_wString::FromUtf8(line).View());
+        texts.push_back(wideText(line));
     return texts;
 }
 
@@ -77,7 +77,7 @@ void LineHistory::append(std::wstring_view line) const {
     const int descriptor = open(m_file.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0600);
     if (descriptor < 0)
         return;
-    const std::string bytes = KM_wString(line).ToUtf8() + "\n";
+    const std::string bytes = utf8Text(line) + "\n";
     [[maybe_unused]] const ssize_t written = write(descriptor, bytes.data(), bytes.size());
     close(descriptor);
 }

@@ -1,7 +1,7 @@
 #include "quarn/PlainLines.h"
 
-#include "kelmar/KM_wString.h"
 #include "quarn/Interruption.h"
+#include "quarn/Words.h"
 
 #include <cstdio>
 
@@ -18,7 +18,7 @@ LineRead lineOf(std::string bytes) {
     if (bytes.ends_with('\r'))
         bytes.pop_back();
     show(bytes + "\n");
-    return {LineRead::Kind::line, std::wstring(KM_wString::FromUtf8(bytes).View())};
+    return {LineRead::Kind::line, wideText(bytes)};
 }
 
 LineRead noLine(LineRead::Kind why) {
@@ -29,7 +29,7 @@ LineRead noLine(LineRead::Kind why) {
 } // namespace
 
 LineRead PlainLines::read(const std::wstring& prompt, LineUse, const Completer&) {
-    show(KM_wString(std::wstring_view(prompt)).ToUtf8());
+    show(utf8Text(prompt));
     std::string bytes;
     for (;;) {
         const InputByte input = readInputByte(m_descriptor);

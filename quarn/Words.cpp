@@ -90,8 +90,16 @@ std::string lowerCase(std::string_view ascii) {
     return lower;
 }
 
+std::string utf8Text(std::wstring_view text) {
+    return KM_wString(text).ToUtf8();
+}
+
+std::wstring wideText(std::string_view utf8) {
+    return std::wstring(KM_wString::FromUtf8(utf8).View());
+}
+
 bool isUtf8(std::string_view bytes) {
-    return KM_wString::FromUtf8(bytes).ToUtf8() == bytes;
+    return utf8Text(wideText(bytes)) == bytes;
 }
 
 bool hasControlCharacter(std::string_view text) {

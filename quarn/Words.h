@@ -45,6 +45,10 @@ inline constexpr std::string_view FORBIDDEN_IN_NAMES = "\\|/:*?\"<>";
 /// The longest name of a file, in bytes, that common file systems take.
 inline constexpr std::size_t LONGEST_FILE_NAME = 255;
 
+std::string utf8Text(std::wstring_view text);
+/// The text that stands in UTF-8; the replacement character for what is no text.
+std::wstring wideText(std::string_view utf8);
+
 /// Whether the bytes are text in UTF-8.
 bool isUtf8(std::string_view bytes);
 /// Whether a line break or another control character is in there.
