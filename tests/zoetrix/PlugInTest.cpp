@@ -111,8 +111,7 @@ TEST_F(PlugIn, OnlyRecordingRunsScripts) {
 }
 
 TEST_F(PlugIn, CommandsOfLaterVersionsSayThatTheyDoNothing) {
-    for (const wchar_t* name : {L"SetPathAnimation", L"SetFlythroughAnimation",
-                                L"SetOneDaySunAnimation", L"SetSeasonalSunAnimation"}) {
+    for (const wchar_t* name : {L"SetOneDaySunAnimation", L"SetSeasonalSunAnimation"}) {
         front_end.clearPrinted();
         EXPECT_EQ(CQuarnCommand::failure, run(name));
         EXPECT_THAT(printed(), HasSubstr(std::wstring(name) + L" is not available in this "

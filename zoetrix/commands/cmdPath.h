@@ -2,8 +2,10 @@
 
 #include "sdk/qncore/QnCommand.h"
 
-/// Sets up an animation in which camera and target each follow a curve or stay at a point. This
-/// version of the plug-in cannot do it yet: the command says so and fails.
+/// Sets up an animation in which camera and target each follow a curve or stay at a point. Enter
+/// at the question for either takes the object of the last set-up, whose ids are kept in the
+/// document's record. The rest is asked in a dialog when a person started the command, else at the
+/// command line; a run that does not succeed leaves the document's record as it was.
 class CCommandPathAnimation : public CQuarnCommand {
 public:
     CCommandPathAnimation();

@@ -8,13 +8,14 @@
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLocalize.h"
 #include "sdk/qncore/QnView.h"
+#include "zoetrix/commands/CameraDialog.h"
+#include "zoetrix/commands/CameraSetUp.h"
+#include "zoetrix/commands/CommandEnd.h"
 #include "zoetrix/commands/CommandGuard.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 #include "zoetrix/plugin/ZoetrixPlugIn.h"
 #include "zoetrix/plugin/ZoetrixUtilities.h"
-#include "zoetrix/ui/ZoetrixDataUI.h"
 
-#include <cstdlib>
 #include <memory>
 
 namespace {
@@ -26,15 +27,6 @@ enum Direction : int { turns_clockwise = 0, turns_anticlockwise = 1 };
 bool& RemembersClockwise() {
     static bool clockwise = true;
     return clockwise;
-}
-
-int EndWith(const wchar_t* text, int id, int ended) {
-    QuarnApp().Print(QnLocalizeString(text, id));
-    return ended;
-}
-
-void ShowNameMessage(const wchar_t* text) {
-    QuarnMessageBox(text, QnLocalizeString(L"Animation", 40002), 0);
 }
 
 // ---- The circle
@@ -91,18 +83,6 @@ bool GetActiveEye(Eye& eye) {
 
 // ---- At the command line
 
-int AskFrameCount(int& frame_count) {
-    CQuarnGetInteger prompt;
-    prompt.SetCommandPrompt(QnLocalizeString(L"Number of frames", 40005));
-    prompt.SetDefaultInteger(frame_count);
-    prompt.SetLowerLimit(1.0, true);
-    prompt.GetNumber();
-    if (prompt.CommandResult() != CQuarnCommand::success)
-        return EndWith(L"Invalid number of frames. Nothing done\n", 40006, prompt.CommandResult());
-    frame_count = std::abs(prompt.Number());
-    return CQuarnCommand::success;
-}
-
 /// Asks for the direction. Only "AntiClockwise" changes what is remembered: "Clockwise" keeps it,
 /// as Enter does, and stored scripts rely on it.
 int AskDirection() {
@@ -133,106 +113,19 @@ int AskAtCommandLine(CQuarnDoc& doc, KM_3dmAnimationProperties& props, int& fram
 
 // ---- In the dialog
 
-/// What the dialog offers, besides the record that it edits.
-struct DialogChoices {
-    CZoetrixDataUI lists;
-    KM_SimpleArray<KM_UUID> display_mode_ids; ///< of the capture list's third entry on
-};
-
-/// The render methods stand before the display modes in the capture list.
-constexpr int render_method_count = 2;
-
-void FillChoices(KM_3dmAnimationProperties& props, DialogChoices& choices) {
+int AskInTurntableDialog(KM_3dmAnimationProperties& props, int& frame_count) {
     KM_ClassArray<KM_wString> directions;
     directions.Append(QnLocalizeString(L"Clockwise", 40008));
     directions.Append(QnLocalizeString(L"AntiClockwise", 40009));
+    CZoetrixDataUI lists;
+    lists.SetDirectionList(directions);
+    lists.SetDirectionListSelection(RemembersClockwise() ? turns_clockwise : turns_anticlockwise);
 
-    KM_ClassArray<KM_wString> file_types;
-    KM_ClassArray<KM_wString> capture_methods;
-    KM_ClassArray<KM_wString> viewports;
-    int file_type = 0;
-    int capture_method = 0;
-    int viewport = 0;
-    GetDailogAnimationOptions(props, file_types, file_type, capture_methods, capture_method,
-                              viewports, viewport, choices.display_mode_ids, false);
-    choices.lists.SetFileList(file_types);
-    choices.lists.SetFileListSelection(file_type);
-    choices.lists.SetCaptureList(capture_methods);
-    choices.lists.SetCaptureListSelection(capture_method);
-    choices.lists.SetViewportList(viewports);
-    choices.lists.SetViewportListSelection(viewport);
-    choices.lists.SetDirectionList(directions);
-    choices.lists.SetDirectionListSelection(RemembersClockwise() ? turns_clockwise
-                                                                 : turns_anticlockwise);
-}
-
-/// Repairs a sequence name that cannot be a file's name, and tells so.
-/// @return false, after a message, when it cannot be repaired
-bool MakeNameValid(KM_wString& name) {
-    if (IsValidFileName(name))
-        return true;
-    const KM_wString old_name = name;
-    if (ReplaceInvalidFileChar(name) == 0) {
-        ShowNameMessage(QnLocalizeString(L"Failed. Invalid animation name\n", 40011));
-        return false;
-    }
-    const wchar_t* message = QnLocalizeString(
-        L"The following characters cannot be used in the animation name: \\ / : * ? \" < > | . "
-        L"The name was changed from (%s) to (%s). ",
-        40012);
-    ShowNameMessage(KM_wString::FormatToString(message, old_name.Array(), name.Array()));
-    return true;
-}
-
-/// Sets render flags and display mode for the record's capture method.
-void FollowCaptureMethod(KM_3dmAnimationProperties& props, const DialogChoices& choices) {
-    const KM_wString& method = props.CaptureMethod();
-    const bool full = method.CompareNoCase(QnLocalizeString(L"RenderFull", 19750)) == 0;
-    const bool preview =
-        !full && method.CompareNoCase(QnLocalizeString(L"RenderPreview", 19751)) == 0;
-    const int selection = choices.lists.CaptureListSelection();
-    const KM_UUID* mode = selection < render_method_count
-                              ? nullptr
-                              : choices.display_mode_ids.At(selection - render_method_count);
-    if (!full && !preview && mode)
-        props.SetDisplayMode(*mode);
-    props.SetRenderFull(full);
-    props.SetRenderPreview(preview);
-}
-
-/// Takes over what was selected. A selection outside its list changes nothing.
-void TakeSelections(const DialogChoices& choices, KM_3dmAnimationProperties& props) {
-    const CZoetrixDataUI& lists = choices.lists;
-    RemembersClockwise() = lists.DirectionListSelection() == turns_clockwise;
-    if (const KM_wString* type = lists.FileList().At(lists.FileListSelection()))
-        props.SetFileExtension(*type);
-    if (const KM_wString* method = lists.CaptureList().At(lists.CaptureListSelection()))
-        props.SetCaptureMethod(*method);
-    FollowCaptureMethod(props, choices);
-    if (const KM_wString* viewport = lists.ViewportList().At(lists.ViewportListSelection()))
-        props.SetViewportName(*viewport);
-}
-
-int AskInDialog(KM_3dmAnimationProperties& props, int& frame_count) {
-    DialogChoices choices;
-    FillChoices(props, choices);
-    if (!LoadVexUi(true))
-        return CQuarnCommand::failure;
-    const QnZoetrixVexUiDialog run_dialog = QnZoetrixVexUiTurnTable();
-    if (!run_dialog)
-        return CQuarnCommand::failure;
-
-    KM_3dmAnimationProperties edited = props;
-    if (!run_dialog(choices.lists, edited))
-        return CQuarnCommand::cancel;
-    KM_wString name = edited.HtmlFilename();
-    if (!MakeNameValid(name))
-        return CQuarnCommand::cancel;
-    // Nothing else of the edited copy counts: the rest was chosen in the lists.
-    frame_count = edited.FrameCount();
-    props.SetHtmlFilename(name);
-    TakeSelections(choices, props);
-    return CQuarnCommand::success;
+    const int asked =
+        AskInDialog({QnZoetrixVexUiTurnTable, PreviewRenders::preview}, lists, props, frame_count);
+    if (asked == CQuarnCommand::success)
+        RemembersClockwise() = lists.DirectionListSelection() == turns_clockwise;
+    return asked;
 }
 
 // ---- The record
@@ -269,18 +162,13 @@ int SetUpTurntable(CQuarnDoc& doc, bool interactive) {
                        CQuarnCommand::failure);
 
     int frame_count = props.FrameCount();
-    const int asked =
-        interactive ? AskInDialog(props, frame_count) : AskAtCommandLine(doc, props, frame_count);
+    const int asked = interactive ? AskInTurntableDialog(props, frame_count)
+                                  : AskAtCommandLine(doc, props, frame_count);
     if (asked != CQuarnCommand::success)
         return asked;
     if (!SetFramePoints(props, *circle, eye, frame_count))
-        return EndWith(L"Failed to divide camera path. Nothing done\n", 40014,
-                       CQuarnCommand::failure);
-
-    props.SetCaptureType(KM_3dmAnimationProperties::turntable);
-    props.SetCurrentFrame(0);
-    props.SetFrameCount(frame_count);
-    doc.Properties().SetAnimationProperties(props);
+        return EndWithoutCameraPoints();
+    StoreAnimation(doc, props, KM_3dmAnimationProperties::turntable, frame_count);
     return CQuarnCommand::success;
 }
 

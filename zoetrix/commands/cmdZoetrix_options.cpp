@@ -2,6 +2,7 @@
 #include "sdk/qncore/QnDoc.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnView.h"
+#include "zoetrix/commands/CommandEnd.h"
 #include "zoetrix/commands/DisplayModeChoices.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 #include "zoetrix/plugin/ZoetrixUtilities.h"
@@ -19,12 +20,6 @@ struct FileType {
 
 constexpr FileType file_types[] = {
     {L"jpg", 18433}, {L"bmp", 18434}, {L"png", 18435}, {L"tga", 18436}};
-
-/// Shows a message of the command line. @return `ended`
-int EndWith(const wchar_t* text, int id, int ended) {
-    QuarnApp().Print(QnLocalizeString(text, id));
-    return ended;
-}
 
 int AskFileType(KM_3dmAnimationProperties& props) {
     KM_wString extension = props.FileExtension();

@@ -3,6 +3,7 @@
 #include "sdk/qncore/QnFileUtilities.h"
 #include "sdk/qncore/QnLocalize.h"
 #include "sdk/qncore/QnObject.h"
+#include "zoetrix/paths/FlythroughPoints.h"
 
 namespace {
 
@@ -12,16 +13,10 @@ bool ResetFlythrough(KM_3dmAnimationProperties& props) {
     if (!curve)
         return true;
 
-    const int frame_count = props.FrameCount();
     KM_3dPointArray camera_points;
     KM_3dPointArray target_points;
-    if (frame_count == 1) {
-        camera_points.Append(curve->PointAtStart());
-        target_points.Append(curve->PointAtEnd());
-    } else if (!CZoetrixUtilities::GetPathPoints(curve, frame_count, camera_points, true, true) ||
-               !CZoetrixUtilities::GetPathPoints(curve, frame_count, target_points, true, false)) {
+    if (!GetFlythroughPoints(curve, props.FrameCount(), camera_points, target_points))
         return false;
-    }
     props.CameraPoints() = camera_points;
     props.TargetPoints() = target_points;
     return true;
