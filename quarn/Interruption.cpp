@@ -1,5 +1,6 @@
 #include "quarn/Interruption.h"
 
+#include <atomic>
 #include <cerrno>
 #include <csignal>
 #include <fcntl.h>
@@ -11,15 +12,17 @@ namespace quarn::program {
 namespace {
 
 /// The signal that asked the program to stop, 0 while none did, and a pipe that has a byte in it
-/// since then, for whoever waits for input. Global, because a signal handler reaches nothing else.
-volatile std::sig_atomic_t g_stop_signal = 0;
+/// since then, for whoever waits for input. Global, because a signal handler reaches nothing else;
+/// atomic, because two signals may reach two threads at once.
+std::atomic<int> g_stop_signal = 0;
+static_assert(std::atomic<int>::is_always_lock_free);
 int g_wake_pipe[2] = {-1, -1};
 
 extern "C" void noteStopSignal(int signal) {
-    if (g_stop_signal != 0)
+    int none = 0;
+    if (!g_stop_signal.compare_exchange_strong(none, signal))
         _exit(128 + signal);
     const int error = errno;
-    g_stop_signal = signal;
     [[maybe_unused]] const ssize_t written = write(g_wake_pipe[1], "", 1);
     errno = error;
 }

@@ -16,6 +16,7 @@ namespace quarn::program {
 namespace {
 
 constexpr int LINES_KEPT = 1000;
+constexpr std::size_t MOST_SHOWN = 100; ///< of the completions that are left
 constexpr int NARROWEST_TERMINAL = 20;
 
 /// Whether the terminal was resized, or the program stopped and continued, so that what it shows is
@@ -212,9 +213,13 @@ unsigned char LineEditor::complete() {
 
 void LineEditor::showCandidates(const Completion& completion) const {
     std::vector<std::wstring> names;
-    for (const Completion::Candidate& candidate : completion.candidates)
-        names.push_back(candidate.shown);
-    const std::string text = inColumns(names, terminalWidth());
+    for (const Completion::Candidate& candidate : completion.candidates) {
+        if (names.size() < MOST_SHOWN)
+            names.push_back(candidate.shown);
+    }
+    std::string text = inColumns(names, terminalWidth());
+    if (const std::size_t more = completion.candidates.size() - names.size())
+        text += "and " + std::to_string(more) + " more\n";
     std::fputs("\n", stdout);
     std::fwrite(text.data(), 1, text.size(), stdout);
     std::fflush(stdout);

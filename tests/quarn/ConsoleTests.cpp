@@ -93,6 +93,19 @@ TEST_F(Console, CompletesFilesBehindACommandAndAtATextQuestion) {
     EXPECT_TRUE(terminal.shows("4 meshes")) << terminal.screen();
 }
 
+TEST_F(Console, ListsAHundredOfManyFiles) {
+    for (int i = 1000; i < 1120; ++i)
+        writeFile(m_folder / ("part" + std::to_string(i) + ".stl"), "");
+    Terminal terminal(start());
+    ASSERT_TRUE(terminal.shows(IDLE));
+    terminal.type("Import part\t");
+    ASSERT_TRUE(terminal.shows("part1")) << terminal.screen();
+    terminal.type("\t");
+    ASSERT_TRUE(terminal.shows("part1099.stl")) << terminal.screen();
+    EXPECT_TRUE(terminal.shows("and 20 more\nCommand: Import part1"));
+    EXPECT_THAT(terminal.screen(), Not(HasSubstr("part1100.stl")));
+}
+
 TEST_F(Console, AsksAgainAfterABadAnswer) {
     Terminal terminal(start());
     ASSERT_TRUE(terminal.shows(IDLE));
