@@ -97,26 +97,33 @@ Result<std::vector<PlugInContent>> plugInContents(Application& application, Docu
     return contents;
 }
 
-std::vector<std::string> readPlugInContents(Application& application, Document& document,
-                                            const std::vector<PlugInContent>& contents,
-                                            const CQuarnFileReadOptions& options) {
-    std::vector<std::string> warnings;
+PlugInReading readPlugInContents(Application& application, Document& document,
+                                 const std::vector<PlugInContent>& contents,
+                                 const CQuarnFileReadOptions& options) {
+    const bool is_own_file = options.Mode(CQuarnFileReadOptions::open_mode);
+    FileRemainder& remainder = document.fileRemainder();
+    PlugInReading reading;
     for (const PlugInContent& content : contents) {
-        CQuarnPlugIn* plug_in = plugInFor(application, content.plug_in_id);
+        const KM_UUID& id = content.plug_in_id;
+        CQuarnPlugIn* plug_in = plugInFor(application, id);
         if (!plug_in) {
-            document.fileRemainder().keep(content);
+            if (is_own_file || !remainder.find(id))
+                remainder.keep(content);
             continue;
         }
         const auto done = read(*plug_in, document, content, options);
+        remainder.forget(id);
         if (done) {
-            document.fileRemainder().forget(content.plug_in_id);
+            reading.read_by.push_back(id);
             continue;
         }
-        document.fileRemainder().keep(content);
-        warnings.push_back("What " + nameOf(*plug_in) + " keeps in the file cannot be read: " +
-                           done.message() + ". The rest of the file is there.");
+        if (is_own_file)
+            remainder.keep(content);
+        reading.warnings.push_back("What " + nameOf(*plug_in) +
+                                   " keeps in the file cannot be read: " + done.message() +
+                                   ". The rest of the file is there.");
     }
-    return warnings;
+    return reading;
 }
 
 } // namespace quarn

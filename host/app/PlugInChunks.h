@@ -3,6 +3,7 @@
 #include "host/app/Result.h"
 #include "host/document/file/DocumentContent.h"
 
+#include <algorithm>
 #include <string>
 #include <vector>
 
@@ -22,11 +23,21 @@ class Document;
 Result<std::vector<PlugInContent>> plugInContents(Application& application, Document& document,
                                                   const CQuarnFileWriteOptions& options);
 
+/// How plug-ins took what they keep in a file.
+struct PlugInReading {
+    std::vector<KM_UUID> read_by;      ///< the plug-ins that read theirs
+    std::vector<std::string> warnings; ///< what could not be read, in sentences for the person
+
+    bool hasRead(const KM_UUID& plug_in_id) const {
+        return std::ranges::find(read_by, plug_in_id) != read_by.end();
+    }
+};
+
 /// Hands each plug-in what it keeps in a file. A plug-in that is not loaded is loaded, where it can
-/// be found; where it cannot, and where the plug-in cannot read it, the document keeps it.
-/// @return what could not be read, in sentences for the person
-std::vector<std::string> readPlugInContents(Application& application, Document& document,
-                                            const std::vector<PlugInContent>& contents,
-                                            const CQuarnFileReadOptions& options);
+/// be found. Of a file that was opened the document keeps what a plug-in cannot read; it keeps what
+/// nobody is there to read of every file, but for an imported one not in place of its own.
+PlugInReading readPlugInContents(Application& application, Document& document,
+                                 const std::vector<PlugInContent>& contents,
+                                 const CQuarnFileReadOptions& options);
 
 } // namespace quarn

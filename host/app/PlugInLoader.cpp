@@ -171,10 +171,12 @@ void PlugInLoader::readWhatWaited(const KM_UUID& id) {
     Document* document = m_application.documents().active();
     if (!document)
         return;
-    const std::vector<PlugInContent> waiting = document->fileRemainder().of(id);
+    const PlugInContent* waiting = document->fileRemainder().find(id);
+    if (!waiting)
+        return;
     const auto options = FileOptionsAccess::forReading(CQuarnFileReadOptions::open_mode);
     for (const std::string& warning :
-         readPlugInContents(m_application, *document, waiting, options))
+         readPlugInContents(m_application, *document, {*waiting}, options).warnings)
         m_application.tell(warning);
 }
 

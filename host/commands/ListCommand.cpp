@@ -139,9 +139,8 @@ ObjectCounts listObjects(Application& application, const Document& document, boo
 void listViewsAndLights(Application& application, Document& document) {
     for (const auto& view : document.views())
         application.print(lineOf(*view, view.get() == &document.activeView()).View());
-    for (int index = 0; index < document.lights().count(); ++index)
-        if (const CQuarnLight& light = document.lights().at(index); !light.IsDeleted())
-            application.print(lineOf(light.Light(), index).View());
+    for (const auto& [index, light] : document.lights().live())
+        application.print(lineOf(light.Light(), index).View());
 }
 
 } // namespace

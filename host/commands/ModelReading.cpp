@@ -58,8 +58,7 @@ ContentCounts countsOf(const DocumentContent& content) {
         counts.points += object.point ? 1 : 0;
     }
     counts.cameras = content.cameras.size();
-    counts.lights =
-        static_cast<std::size_t>(std::ranges::count(content.lights, false, &LightContent::deleted));
+    counts.lights = content.lights.size();
     return counts;
 }
 

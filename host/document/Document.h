@@ -9,6 +9,7 @@
 #include "sdk/qncore/QnDoc.h"
 
 #include <filesystem>
+#include <map>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -111,9 +112,8 @@ public:
     /// @return what could not be taken over, in sentences for the person
     std::vector<std::string> openContent(const DocumentContent& content);
     /// Adds the objects, cameras and lights of a document file.
-    /// @return for each slot of the file's light table the index of the light here; no_index for
-    ///         lights that were deleted
-    std::vector<int> addContent(const DocumentContent& content);
+    /// @return the index here of each light, by its index in the file
+    std::map<int, int> addContent(const DocumentContent& content);
     /// What a document file has to hold of the document; what plug-ins keep is left out.
     /// @param only_selected  take the selected objects alone, without views, cameras and lights
     DocumentContent content(bool only_selected) const;

@@ -57,8 +57,9 @@ DocumentContent Document::content(bool only_selected) const {
         content.views.push_back(contentOf(*view, view.get() == m_active_view));
     for (const NamedView& camera : m_named_views)
         content.cameras.push_back({camera.name, camera.viewport});
-    for (int index = 0; index < m_lights.count(); ++index)
-        content.lights.push_back({m_lights.at(index).IsDeleted(), m_lights.at(index).Light()});
+    content.settings.light_slots = m_lights.count();
+    for (const auto& [index, slot] : m_lights.live())
+        content.lights.push_back({index, slot.Light()});
     return content;
 }
 
@@ -69,21 +70,20 @@ std::vector<std::string> Document::openContent(const DocumentContent& content) {
     addObjects(content);
     addCameras(content);
     for (const LightContent& light : content.lights) {
-        if (light.deleted)
-            m_lights.addDeleted(light.light);
-        else
-            m_lights.add(light.light);
+        m_lights.addDeletedUpTo(light.index);
+        m_lights.add(light.light);
     }
+    m_lights.addDeletedUpTo(content.settings.light_slots);
     m_file_remainder->unknown = content.unknown;
     return replaceViews(content);
 }
 
-std::vector<int> Document::addContent(const DocumentContent& content) {
+std::map<int, int> Document::addContent(const DocumentContent& content) {
     addObjects(content);
     addCameras(content);
-    std::vector<int> indices;
+    std::map<int, int> indices;
     for (const LightContent& light : content.lights)
-        indices.push_back(light.deleted ? LightStore::no_index : m_lights.add(light.light));
+        indices[light.index] = m_lights.add(light.light);
     fitTolerance();
     return indices;
 }

@@ -31,37 +31,30 @@ CQuarnLight LightStore::deletedLight() {
 }
 
 const CQuarnLight& LightStore::at(int index) const {
-    if (index < 0 || index >= count())
-        return m_no_light;
-    return m_slots[static_cast<std::size_t>(index)];
+    const auto found = m_live.find(index);
+    return found == m_live.end() ? m_no_light : found->second;
 }
 
 int LightStore::add(const KM_Light& light) {
-    if (!canShine(light))
+    if (!canShine(light) || m_slot_count >= most_slots)
         return no_index;
-    m_slots.emplace_back().m_light = light;
-    return m_live.emplace_back(count() - 1);
+    m_live[m_slot_count].m_light = light;
+    return m_slot_count++;
 }
 
-void LightStore::addDeleted(const KM_Light& light) {
-    CQuarnLight& slot = m_slots.emplace_back();
-    slot.m_light = light;
-    slot.m_deleted = true;
+void LightStore::addDeletedUpTo(int count) {
+    m_slot_count = std::max(m_slot_count, std::min(count, most_slots));
 }
 
 bool LightStore::remove(int index) {
-    if (at(index).IsDeleted())
-        return false;
-    m_slots[static_cast<std::size_t>(index)].m_deleted = true;
-    m_live.erase(std::ranges::lower_bound(m_live, index));
-    return true;
+    return m_live.erase(index) > 0;
 }
 
 std::vector<KM_Light> LightStore::shiningLights(int but) const {
     std::vector<KM_Light> lights;
-    for (const int index : m_live)
-        if (index != but && at(index).Light().IsEnabled())
-            lights.push_back(at(index).Light());
+    for (const auto& [index, slot] : m_live)
+        if (index != but && slot.Light().IsEnabled())
+            lights.push_back(slot.Light());
     return lights;
 }
 

@@ -2,16 +2,19 @@
 
 #include "sdk/qncore/QnLightTable.h"
 
+#include <map>
 #include <vector>
 
 namespace quarn {
 
 /// The lights of a document. Slots of deleted lights stay, so that an index that was handed out
-/// never means another light.
+/// never means another light; they take no memory and no time, as a sun study leaves one a frame.
 class LightStore {
 public:
     /// Names no slot of any table.
     static constexpr int no_index = -1;
+    /// The most slots that a table can have.
+    static constexpr int most_slots = 1 << 24;
 
     LightStore() : m_face(*this) {}
     LightStore(const LightStore&) = delete;
@@ -20,15 +23,21 @@ public:
     /// Whether a light has a style, a valid place and a direction where it needs one.
     static bool canShine(const KM_Light& light);
 
-    int count() const { return static_cast<int>(m_slots.size()); }
+    /// How many slots there are, deleted ones too.
+    int count() const { return m_slot_count; }
     /// The light in a slot; one that counts as deleted for an index without a slot.
     const CQuarnLight& at(int index) const;
-    /// @return the index of the light's slot, or no_index when the light cannot shine
+    /// @return the index of the light's slot, or no_index when the light cannot shine or the table
+    ///         is full
     int add(const KM_Light& light);
     /// @return false, with nothing changed, when the index names no live light
     bool remove(int index);
-    /// Adds the slot of a light that is gone, for the indices of a stored table to stay the same.
-    void addDeleted(const KM_Light& light);
+    /// Adds slots of deleted lights until there are `count`, for the indices of a stored table to
+    /// stay the same. Above most_slots there are that many; a table is never made shorter.
+    void addDeletedUpTo(int count);
+
+    /// The lights that are not deleted, by their indices.
+    const std::map<int, CQuarnLight>& live() const { return m_live; }
 
     /// The lights that are there and switched on.
     /// @param but  index of one that is left out; an index without a slot leaves out none
@@ -42,10 +51,8 @@ public:
     CQuarnLightTable& face() { return m_face; }
 
 private:
-    std::vector<CQuarnLight> m_slots;
-    /// The slots that are not deleted, ascending: a long sun study leaves a deleted one a frame,
-    /// which the next frames must not pay for.
-    std::vector<int> m_live;
+    std::map<int, CQuarnLight> m_live;
+    int m_slot_count = 0;
     CQuarnLight m_no_light = deletedLight();
     CQuarnLightTable m_face;
     bool m_is_open = true;

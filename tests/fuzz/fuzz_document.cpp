@@ -45,6 +45,7 @@ Bytes soundSettings() {
         archive.WriteDouble(0.001);
         archive.WriteBool(true);
         archive.WriteVector(KM_3dVector::ZAxis);
+        archive.WriteInt(10);
     });
 }
 

@@ -3,6 +3,7 @@
 
 #include <cmath>
 #include <limits>
+#include <map>
 #include <string>
 #include <vector>
 
@@ -45,6 +46,45 @@ protected:
         record().SetCameraPathId(objectId(L"rail"));
         record().SetTargetPathId(objectId(L"gaze"));
     }
+};
+
+/// Looks at the lights of the document whenever the animation looks whether to go on.
+class WatchingFrontEnd final : public quarn::ScriptedFrontEnd {
+public:
+    bool isKeyDown(int virtual_key) override {
+        look();
+        return ScriptedFrontEnd::isKeyDown(virtual_key);
+    }
+    void pumpEvents(unsigned) override { look(); }
+
+    quarn::Session* session = nullptr;
+    std::map<int, KM_Light> lights; ///< all that ever shone, by their indices
+
+private:
+    void look() {
+        if (!session)
+            return;
+        const CQuarnLightTable& table = session->document().LightTable();
+        for (int i = 0; i < table.LightCount(); ++i)
+            if (!table[i].IsDeleted())
+                lights[i] = table[i].Light();
+    }
+};
+
+class WatchedPreview : public Preview {
+protected:
+    void SetUp() override {
+        session.reset();
+        quarn::SessionOptions options;
+        options.language = "C";
+        session = std::make_unique<quarn::Session>(watching, options);
+        ASSERT_TRUE(session->adoptProgramPlugIn().ok());
+        Preview::SetUp();
+        watching.session = session.get();
+    }
+    void TearDown() override { session.reset(); }
+
+    WatchingFrontEnd watching;
 };
 
 } // namespace
@@ -277,11 +317,12 @@ TEST_F(Preview, SunThatWasOffStaysOff) {
     EXPECT_FALSE(doc().Sun().IsEnabled());
 }
 
-TEST_F(Preview, EachSunFrameShinesFromItsOwnPoint) {
+TEST_F(WatchedPreview, EachSunFrameShinesFromItsOwnPoint) {
     setUpSunFrames(3);
     ASSERT_EQ(CQuarnCommand::success, preview(-1));
+    ASSERT_EQ(3U, watching.lights.size());
     for (int k = 0; k < 3; ++k) {
-        const KM_Light& light = doc().LightTable()[k].Light();
+        const KM_Light& light = watching.lights.at(k);
         EXPECT_EQ(KM_LightStyle::world_directional, light.Style());
         EXPECT_TRUE(near(light.Location(), sunOfFrame(k), 0.0));
         EXPECT_TRUE(near(light.Direction(), KM_3dPoint::Origin - sunOfFrame(k), 0.0));

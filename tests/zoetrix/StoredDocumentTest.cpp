@@ -244,6 +244,15 @@ TEST_F(StoredDocument, AnImportedSunStudyNeverDeletesALightOfTheDocument) {
         EXPECT_FALSE(doc().LightTable()[own].IsDeleted());
 }
 
+TEST_F(StoredDocument, ALightIndexIsNotMovedByAnImportThatBroughtNoRecord) {
+    setUpSunFrames(3);
+    save();
+    changeSavedRecord(withInt(CAPTURE_TYPE, 17));
+    record().SetLightIndex(2);
+    ASSERT_EQ(CQuarnCommand::success, import());
+    EXPECT_EQ(2, record().LightIndex());
+}
+
 TEST_F(StoredDocument, AnImportedIndexWithoutALightNamesNoneHere) {
     setUpSunFrames(3);
     record().SetLightIndex(7);

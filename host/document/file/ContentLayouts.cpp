@@ -45,7 +45,8 @@ bool isWhole(const Texture& texture) {
 
 bool makeSense(const SettingsContent& settings) {
     return KM_IsValid(settings.absolute_tolerance) && settings.absolute_tolerance > 0.0 &&
-           isUnitVector(settings.direction_to_sun);
+           isUnitVector(settings.direction_to_sun) && settings.light_slots >= 0 &&
+           settings.light_slots <= LightStore::most_slots;
 }
 
 bool makesSense(const ViewContent& view) {
@@ -55,7 +56,8 @@ bool makesSense(const ViewContent& view) {
 template <class Step, class AnySettings> bool settingsFields(Step step, AnySettings& settings) {
     return step(settings.units, UnitSystem::none, LAST_UNIT_SYSTEM) &&
            step(settings.absolute_tolerance) && step(settings.sun_enabled) &&
-           step(settings.direction_to_sun) && step.check(makeSense(settings));
+           step(settings.direction_to_sun) && step(settings.light_slots) &&
+           step.check(makeSense(settings));
 }
 
 template <class Step, class AnyTexture> bool textureFields(Step step, AnyTexture& texture) {
@@ -224,15 +226,15 @@ bool readCamera(KM_BinaryArchive& archive, CameraContent& camera) {
 
 bool writeLight(KM_BinaryArchive& archive, const LightContent& light) {
     const LightFields fields(light.light);
-    return archive.WriteBool(light.deleted) && lightFields(FieldWriter(archive), fields);
+    return archive.WriteInt(light.index) && lightFields(FieldWriter(archive), fields);
 }
 
 bool readLight(KM_BinaryArchive& archive, LightContent& light) {
     LightFields fields;
-    if (!archive.ReadBool(light.deleted) || !lightFields(FieldReader(archive), fields))
+    if (!archive.ReadInt(light.index) || !lightFields(FieldReader(archive), fields))
         return false;
     light.light = fields.light();
-    return light.deleted || LightStore::canShine(light.light) || archive.Fail();
+    return LightStore::canShine(light.light) || archive.Fail();
 }
 
 bool writePlugIn(KM_BinaryArchive& archive, const PlugInContent& plug_in) {

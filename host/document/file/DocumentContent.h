@@ -49,10 +49,9 @@ struct CameraContent {
     KM_Viewport viewport;
 };
 
-/// A slot of the light table. Slots of deleted lights are kept, so that the index of a light stays
-/// the same.
+/// A light, with its index in the light table. The slots between hold no lights any more.
 struct LightContent {
-    bool deleted = false;
+    std::int32_t index = 0;
     KM_Light light;
 };
 
@@ -62,6 +61,7 @@ struct SettingsContent {
     double absolute_tolerance = 0.001; ///< in document units, above 0
     bool sun_enabled = true;
     KM_3dVector direction_to_sun{0.0, 0.0, 1.0}; ///< a unit vector
+    std::int32_t light_slots = 0; ///< of the light table, those of deleted lights too
 };
 
 /// What a plug-in keeps in a document, as it wrote it: its version
@@ -85,7 +85,7 @@ struct DocumentContent {
     std::vector<ObjectContent> objects;
     std::vector<ViewContent> views;
     std::vector<CameraContent> cameras;
-    std::vector<LightContent> lights;
+    std::vector<LightContent> lights; ///< by ascending index, each below settings.light_slots
     std::vector<PlugInContent> plug_ins;
     std::vector<UnknownContent> unknown;
 };

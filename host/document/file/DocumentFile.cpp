@@ -11,7 +11,7 @@
 #include "host/document/file/FileRemainder.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
-#include <algorithm>
+#include <map>
 
 namespace quarn {
 
@@ -23,17 +23,11 @@ Error cannot(const char* verb, const std::filesystem::path& file, const std::str
 
 /// The record names the sun light of an animation by its place in the light table of the file; here
 /// it stands elsewhere, or is gone.
-void moveLightIndex(Document& document, const std::vector<int>& indices) {
+void moveLightIndex(Document& document, const std::map<int, int>& indices) {
     KM_3dmAnimationProperties record = document.properties().AnimationProperties();
-    const int index = record.LightIndex();
-    const bool known = index >= 0 && static_cast<std::size_t>(index) < indices.size();
-    record.SetLightIndex(known ? indices[static_cast<std::size_t>(index)] : LightStore::no_index);
+    const auto moved = indices.find(record.LightIndex());
+    record.SetLightIndex(moved == indices.end() ? LightStore::no_index : moved->second);
     document.properties().SetAnimationProperties(record);
-}
-
-bool hasAnimation(const DocumentContent& content) {
-    return std::ranges::find(content.plug_ins, ZoetrixPlugInId, &PlugInContent::plug_in_id) !=
-           content.plug_ins.end();
 }
 
 } // namespace
@@ -75,20 +69,20 @@ Result<DocumentContent> readDocumentFile(const std::filesystem::path& file) {
 std::vector<std::string> openContent(Document& document, const DocumentContent& content) {
     std::vector<std::string> warnings = document.openContent(content);
     const auto options = FileOptionsAccess::forReading(CQuarnFileReadOptions::open_mode);
-    for (std::string& warning :
-         readPlugInContents(*Application::current(), document, content.plug_ins, options))
-        warnings.push_back(std::move(warning));
+    const PlugInReading reading =
+        readPlugInContents(*Application::current(), document, content.plug_ins, options);
+    warnings.insert(warnings.end(), reading.warnings.begin(), reading.warnings.end());
     return warnings;
 }
 
 std::vector<std::string> importContent(Document& document, const DocumentContent& content) {
-    const std::vector<int> light_indices = document.addContent(content);
+    const std::map<int, int> light_indices = document.addContent(content);
     const auto options = FileOptionsAccess::forReading(CQuarnFileReadOptions::import_mode);
-    std::vector<std::string> warnings =
+    const PlugInReading reading =
         readPlugInContents(*Application::current(), document, content.plug_ins, options);
-    if (hasAnimation(content))
+    if (reading.hasRead(ZoetrixPlugInId))
         moveLightIndex(document, light_indices);
-    return warnings;
+    return reading.warnings;
 }
 
 } // namespace quarn

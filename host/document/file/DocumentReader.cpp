@@ -26,7 +26,7 @@ public:
             if (!readChunk())
                 return Error{DAMAGED};
         }
-        if (m_archive.BytesLeft() > 0 || !m_has_settings || !namesAreUnique())
+        if (m_archive.BytesLeft() > 0 || !m_has_settings || !lightsHaveSlots() || !namesAreUnique())
             return Error{DAMAGED};
         return std::move(m_content);
     }
@@ -104,6 +104,16 @@ private:
             return false;
         m_content.unknown.push_back({id, {payload.begin(), payload.end()}});
         return true;
+    }
+
+    bool lightsHaveSlots() const {
+        int first_free = 0;
+        for (const LightContent& light : m_content.lights) {
+            if (light.index < first_free)
+                return false;
+            first_free = light.index + 1;
+        }
+        return first_free <= m_content.settings.light_slots;
     }
 
     /// Objects and plug-ins are found by their ids, views by their names, ignoring case.

@@ -2,6 +2,8 @@
 
 #include "host/document/file/DocumentContent.h"
 
+#include <algorithm>
+
 namespace quarn {
 
 /// What of a document file nobody here understands. It is kept as it came, and written back.
@@ -15,13 +17,10 @@ struct FileRemainder {
         forget(plug_in.plug_in_id);
         plug_ins.push_back(plug_in);
     }
-    /// What is kept for a plug-in: nothing, or one content.
-    std::vector<PlugInContent> of(const KM_UUID& plug_in_id) const {
-        std::vector<PlugInContent> found;
-        for (const PlugInContent& kept : plug_ins)
-            if (kept.plug_in_id == plug_in_id)
-                found.push_back(kept);
-        return found;
+    /// What is kept for a plug-in; null when nothing is.
+    const PlugInContent* find(const KM_UUID& plug_in_id) const {
+        const auto found = std::ranges::find(plug_ins, plug_in_id, &PlugInContent::plug_in_id);
+        return found == plug_ins.end() ? nullptr : &*found;
     }
     void forget(const KM_UUID& plug_in_id) {
         std::erase_if(plug_ins,

@@ -1,3 +1,4 @@
+#include "host/document/LightStore.h"
 #include "host/document/file/ChunkIds.h"
 #include "host/document/file/DocumentCoding.h"
 #include "host/document/file/DocumentHeader.h"
@@ -58,6 +59,7 @@ public:
             archive.WriteDouble(tolerance);
             archive.WriteBool(true);
             archive.WriteVector({0.0, 0.0, sun_length});
+            archive.WriteInt(0);
         });
     }
     Bytes ended() {
@@ -194,13 +196,29 @@ TEST(DocumentCoding, ViewsAndCamerasComeBackToTheLastBit) {
     EXPECT_EQ(sample.cameras[0].viewport, content.cameras[0].viewport);
 }
 
-TEST(DocumentCoding, LightSlotsComeBackTheDeletedOnesToo) {
+TEST(DocumentCoding, LightsComeBackWithTheirIndices) {
     const DocumentContent sample = sampleContent();
     const DocumentContent content = roundTrip(sample);
-    ASSERT_EQ(2U, content.lights.size());
-    EXPECT_TRUE(content.lights[0].deleted);
-    EXPECT_FALSE(content.lights[1].deleted);
-    EXPECT_EQ(sample.lights[1].light, content.lights[1].light);
+    EXPECT_EQ(5, content.settings.light_slots);
+    ASSERT_EQ(1U, content.lights.size());
+    EXPECT_EQ(1, content.lights[0].index);
+    EXPECT_EQ(sample.lights[0].light, content.lights[0].light);
+}
+
+TEST(DocumentCoding, LightsStandInSlotsThatAreThere) {
+    DocumentContent content = sampleContent();
+    content.lights[0].index = 5;
+    expectRefused(encoded(content));
+    content.lights[0].index = -1;
+    expectRefused(encoded(content));
+    content.lights[0].index = 1;
+    content.lights.push_back(content.lights[0]);
+    expectRefused(encoded(content));
+    content = sampleContent();
+    for (const int slots : {-1, LightStore::most_slots + 1, std::numeric_limits<int>::max()}) {
+        content.settings.light_slots = slots;
+        EXPECT_FALSE(encodeDocument(content));
+    }
 }
 
 TEST(DocumentCoding, WhatOthersWroteComesBackByteForByte) {

@@ -179,9 +179,11 @@ TEST_F(DocumentFile, OpeningBringsItsViewsInPlaceOfTheStandardOnes) {
 TEST_F(DocumentFile, LightsKeepTheirIndices) {
     writeSample(folder / "a.quarn");
     open(folder / "a.quarn");
-    ASSERT_EQ(2, document().lights().count());
-    EXPECT_TRUE(document().lights().at(0).IsDeleted());
-    EXPECT_EQ(sampleContent().lights[1].light, document().lights().at(1).Light());
+    ASSERT_EQ(5, document().lights().count());
+    for (const int deleted : {0, 2, 3, 4})
+        EXPECT_TRUE(document().lights().at(deleted).IsDeleted());
+    EXPECT_EQ(sampleContent().lights[0].light, document().lights().at(1).Light());
+    EXPECT_EQ(5, document().lights().add(sampleContent().lights[0].light));
 }
 
 TEST_F(DocumentFile, WhatIsOpenedIsSavedAsTheSameFile) {
@@ -218,7 +220,7 @@ TEST_F(DocumentFile, ImportingAddsObjectsCamerasAndLightsAndLeavesTheRest) {
     EXPECT_EQ(1U, document().namedViews().size());
     EXPECT_TRUE(document().sun().isEnabled());
     EXPECT_EQ(sun, document().sun().directionToSun());
-    ASSERT_EQ(1, document().lights().count()) << "the slot of the deleted light is left out";
+    ASSERT_EQ(1, document().lights().count()) << "slots of deleted lights are left out";
     EXPECT_EQ(L"Lampe", document().lights().at(0).Light().LightName().View());
 }
 

@@ -114,10 +114,8 @@ void addViews(DocumentContent& content) {
 }
 
 void addLights(std::vector<LightContent>& lights) {
-    LightContent gone;
-    gone.deleted = true;
-    lights.push_back(gone);
     LightContent lamp;
+    lamp.index = 1;
     lamp.light.SetStyle(KM_LightStyle::world_directional);
     lamp.light.SetLocation({1, 2, 3});
     lamp.light.SetDirection({-1, -2, -3});
@@ -142,6 +140,7 @@ DocumentContent sampleContent() {
     content.settings.absolute_tolerance = 0.0125;
     content.settings.sun_enabled = false;
     content.settings.direction_to_sun = KM_3dVector(0.6, 0.0, 0.8);
+    content.settings.light_slots = 5; // of which only that of index 1 holds a light
     addObjects(content.objects);
     addViews(content);
     addLights(content.lights);
