@@ -170,6 +170,8 @@ TEST_F(ThreadRule, HoldsForTheApplicationAndItsQuestions) {
          [] { EXPECT_EQ(CQuarnGetNumber().GetNumber(), CQuarnGet::no_result); }},
         {"CQuarnGetInteger::GetNumber",
          [] { EXPECT_EQ(CQuarnGetInteger().GetNumber(), CQuarnGet::no_result); }},
+        {"CQuarnGetObject::GetObjects",
+         [] { EXPECT_EQ(CQuarnGetObject().GetObjects(), CQuarnGet::no_result); }},
         {"QnLocalizeString", [] { EXPECT_STREQ(QnLocalizeString(L"text", 41001), L"text"); }},
         {"QnLocalizeCommandOptionName",
          [] { EXPECT_EQ(QnLocalizeCommandOptionName(L"Top", 43101).m_local, L"Top"); }},
