@@ -39,8 +39,13 @@ std::optional<int> readWholeNumber(std::wstring_view text) {
 }
 
 KM_wString numberText(double number) {
+    const double size = std::abs(number);
+    const bool is_plain = size == 0.0 || (size >= 1e-5 && size < 1e15);
     char text[64];
-    const auto [end, error] = std::to_chars(text, text + sizeof text, number);
+    char* const limit = text + sizeof text;
+    const auto [end, error] = is_plain
+                                  ? std::to_chars(text, limit, number, std::chars_format::fixed)
+                                  : std::to_chars(text, limit, number);
     return KM_wString::FromUtf8({text, static_cast<std::size_t>(end - text)});
 }
 

@@ -37,6 +37,16 @@ class DecimalComma : public std::numpunct<char> {
     char do_decimal_point() const override { return ','; }
 };
 
+TEST(NumberText, NumbersOfCommonSizesAreWrittenWithoutAnExponent) {
+    EXPECT_STREQ(numberText(400000.0), L"400000");
+    EXPECT_STREQ(numberText(-250000.5), L"-250000.5");
+    EXPECT_STREQ(numberText(0.00001), L"0.00001");
+    EXPECT_STREQ(numberText(999999999999999.0), L"999999999999999");
+    EXPECT_STREQ(numberText(1e15), L"1e+15");
+    EXPECT_STREQ(numberText(2e-6), L"2e-06");
+    EXPECT_STREQ(numberText(-0.0), L"-0");
+}
+
 TEST(NumberText, ALocaleWithADecimalCommaChangesNothing) {
     const std::locale before = std::locale::global(std::locale(std::locale(), new DecimalComma));
     const std::optional<double> number = readNumber(L"3.5");
