@@ -194,7 +194,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t siz
         checkWord(word.text, word.quoted);
 
     std::uint64_t bits = 0;
-    std::memcpy(&bits, bytes, std::min(size, sizeof bits));
+    if (size > 0) // an empty input has no bytes to point to
+        std::memcpy(&bits, bytes, std::min(size, sizeof bits));
     checkNumberOfBits(bits);
     return 0;
 }
