@@ -63,8 +63,8 @@ CQuarnCommand::result CommandRunner::start(std::wstring_view line, const Command
         m_application.tell("Unknown command: " + utf8(read.name) + ". Type Help for the list.");
         return CQuarnCommand::failure;
     }
-    RunningCommand running{found->command, found->english_name, origin.place,
-                           std::move(read.words), origin.typed};
+    RunningCommand running{found->command, found->english_name, origin.place, std::move(read.words),
+                           origin.typed};
     const CQuarnCommand::result result =
         execute(running, origin, origin.interactive && !read.without_dialogs);
     if (result == CQuarnCommand::success)

@@ -43,7 +43,7 @@ struct ImportedModel {
     KM_3dPointArray points;
     std::vector<ImportedCamera> cameras;
     UnitSystem units = UnitSystem::none; ///< of the coordinates, where the format defines them
-    std::vector<std::string> warnings; ///< sentences for the person: what was left out and why
+    std::vector<std::string> warnings;   ///< sentences for the person: what was left out and why
 
     /// All triangles of all meshes.
     std::size_t triangleCount() const;

@@ -17,8 +17,9 @@ std::optional<double> readNumber(std::wstring_view text);
 /// @return nothing for any other text, also "3.0", and for a number that an int cannot hold
 std::optional<int> readWholeNumber(std::wstring_view text);
 
-/// A text that reads back as the same number, whatever the locale, with as few digits as that takes.
-/// It has no exponent from 0.00001 up to below 1e15, so that whole numbers read back as such.
+/// A text that reads back as the same number, whatever the locale, with as few digits as that
+/// takes. It has no exponent from 0.00001 up to below 1e15, so that whole numbers read back as
+/// such.
 KM_wString numberText(double number);
 
 } // namespace quarn
