@@ -48,12 +48,13 @@ Completion completeFile(std::wstring_view typed, bool is_word) {
         entriesOf(folder.empty() ? "." : folder_bytes, path.substr(name_begin));
     const bool is_quoted = was_quoted || (is_word && std::ranges::any_of(entries, hasBlank));
     const std::wstring quote = is_quoted ? L"\"" : L"";
+    const std::wstring begin = quote + folder;
+    const std::wstring end_of_file = is_word ? quote + L" " : quote;
     Completion completion;
     for (const Entry& entry : entries) {
-        const std::wstring slash_after = entry.is_folder ? L"/" : L"";
-        const std::wstring ending = entry.is_folder ? L"" : quote + (is_word ? L" " : L"");
-        completion.candidates.push_back(
-            {quote + folder + entry.name + slash_after, entry.name + slash_after, ending});
+        const std::wstring shown = entry.is_folder ? entry.name + L"/" : entry.name;
+        const std::wstring ending = entry.is_folder ? L"" : end_of_file;
+        completion.candidates.push_back({begin + shown, shown, ending});
     }
     return completion;
 }

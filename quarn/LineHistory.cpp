@@ -65,6 +65,7 @@ std::vector<std::wstring> LineHistory::load() const {
         replaceLines(m_file, lines);
     }
     std::vector<std::wstring> texts;
+    texts.reserve(lines.size());
     for (const std::string& line : lines)
         texts.push_back(wideText(line));
     return texts;

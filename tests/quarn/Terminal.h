@@ -24,7 +24,8 @@ public:
     /// Presses keys.
     void type(std::string_view keys) const;
     void sendSignal(int signal) const;
-    /// Waits, at most half a minute, until the terminal shows the text behind what was waited for last.
+    /// Waits, at most half a minute, until the terminal shows the text behind the one waited for
+    /// last.
     /// @return false when the program ended, or the time passed, before it did
     bool shows(std::string_view text);
     /// What the terminal shows between the last two texts that were waited for.
