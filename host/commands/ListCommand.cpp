@@ -1,4 +1,5 @@
 #include "host/app/Application.h"
+#include "host/commands/AnimationText.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/PointText.h"
@@ -159,6 +160,7 @@ CQuarnCommand::result runList(const CQuarnCommandContext& context) {
     const KM_BoundingBox box = document.objects().visibleBox();
     if (box.IsValid())
         application.print(sizeText(box, document.units()).View());
+    application.print(animationText(document).View());
     return CQuarnCommand::success;
 }
 

@@ -88,6 +88,12 @@ TEST_F(StoredAnimation, IsWrittenFrameByFrameByOtherProcessesAsTheSameFiles) {
     }
 }
 
+TEST_F(StoredAnimation, IsToldOfByInfo) {
+    const Ended ended = run({"info", (m_studio / "tower.quarn").string()});
+    EXPECT_EQ(ended.exit_code, 0) << ended.err;
+    EXPECT_THAT(ended.out, HasSubstr("animation: turntable, 5 frames in Perspective\n"));
+}
+
 TEST_F(StoredAnimation, IsStillThereAfterAnotherSave) {
     ASSERT_EQ(runScript("_-SaveAs \"again.quarn\"\n", "tower.quarn").exit_code, 0);
     EXPECT_EQ(readFile(m_studio / "tower.quarn"), readFile(m_studio / "again.quarn"));

@@ -72,6 +72,20 @@ TEST_F(ListCommandTest, ShowsLightsUnderTheirIndexButNotDeletedOnes) {
                                      "Evening  light 1, directional, off\n1 mesh"));
 }
 
+TEST_F(ListCommandTest, EndsWithTheAnimationWhereThereIsOne) {
+    RecordKeeper keeper;
+    ASSERT_EQ(run(L"_-List _Objects"), CQuarnCommand::success);
+    EXPECT_EQ(printed(), std::string(OBJECTS) + TOTALS);
+
+    front_end.clearPrinted();
+    keeper.record.SetCaptureType(KM_3dmAnimationProperties::one_day_sun);
+    keeper.record.SetFrameCount(25);
+    keeper.record.SetViewportName(L"Perspective");
+    ASSERT_EQ(run(L"_-List _Objects"), CQuarnCommand::success);
+    EXPECT_EQ(printed(), std::string(OBJECTS) + TOTALS +
+                             "animation: one-day sun study, 25 frames in Perspective\n");
+}
+
 TEST_F(ListCommandTest, AWordThatIsNoOptionIsToldAndNothingIsListed) {
     EXPECT_EQ(run(L"_-List Roof"), CQuarnCommand::failure);
     EXPECT_EQ(printed(), "\"Roof\" is no option here. Give Objects or Ids.\n");

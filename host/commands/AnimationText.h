@@ -1,0 +1,13 @@
+#pragma once
+
+#include "kelmar/KM_wString.h"
+
+namespace quarn {
+
+class Document;
+
+/// One line on the animation that is set up in a document: "animation: turntable, 120 frames in
+/// Perspective". Empty when there is none.
+KM_wString animationText(Document& document);
+
+} // namespace quarn
