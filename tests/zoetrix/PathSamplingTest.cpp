@@ -1,10 +1,13 @@
 #include "kelmar/KM_Circle.h"
 #include "kelmar/KM_LineCurve.h"
 #include "kelmar/KM_NurbsCurve.h"
+#include "kelmar/KM_PolylineCurve.h"
+#include "zoetrix/paths/FlythroughPoints.h"
 #include "zoetrix/plugin/ZoetrixUtilities.h"
 
 #include <gtest/gtest.h>
 
+#include <array>
 #include <limits>
 #include <vector>
 
@@ -175,4 +178,78 @@ TEST(PathSampling, EmptiedListKeepsItsStorage) {
     const KM_3dPoint* storage = points.Array();
     ASSERT_TRUE(CZoetrixUtilities::GetPathPoints(&line, 64, points, false, true));
     EXPECT_EQ(storage, points.Array());
+}
+
+TEST(PathSampling, ControlPointThatIsNoNumberTakesItsSpansAwayOnly) {
+    // Places 0 to 5 along x; the spans from 1 to 2 and from 2 to 3 need the third one.
+    KM_NurbsCurve curve;
+    ASSERT_TRUE(curve.CreateClampedUniformNurbs(
+        std::array<KM_3dPoint, 6>{
+            {{0, 0, 0}, {1, 0, 0}, {2, 0, 0}, {3, 0, 0}, {4, 0, 0}, {5, 0, 0}}},
+        2));
+    ASSERT_TRUE(curve.SetCV(2, {std::numeric_limits<double>::quiet_NaN(), 0.0, 0.0}));
+    EXPECT_EQ(Parameters({0.0, 3.0, 4.0, 5.0}), divide(curve, 6, false, true).parameters);
+    EXPECT_EQ(Parameters({0.0, 3.0, 4.0}), divide(curve, 5, true, true).parameters);
+    EXPECT_EQ(Parameters({3.0, 4.0, 5.0}), divide(curve, 5, true, false).parameters);
+}
+
+TEST(PathSampling, CurveOfNothingButNoNumbersFails) {
+    constexpr double no_number = std::numeric_limits<double>::quiet_NaN();
+    const KM_LineCurve line({no_number, 0.0, 0.0}, {no_number, 1.0, 0.0});
+    EXPECT_FALSE(divide(line, 5, false, true).ok);
+    EXPECT_FALSE(divide(line, 5, true, false).ok);
+}
+
+TEST(PathSampling, CurveWithoutLengthIsOpenAndGivesItsPlaceForEveryFrame) {
+    const KM_LineCurve line({7.0, 0.0, 0.0}, {7.0, 0.0, 0.0});
+    EXPECT_EQ(Parameters({7.0, 7.0, 7.0}), divide(line, 3, false, true).parameters);
+    EXPECT_EQ(Parameters({7.0, 7.0, 7.0}), divide(line, 3, true, false).parameters);
+}
+
+TEST(PathSampling, CurveOfOneCornerIsNoCurveToDivide) {
+    const KM_PolylineCurve corner(std::array<KM_3dPoint, 1>{{{7.0, 0.0, 0.0}}});
+    EXPECT_FALSE(divide(corner, 3, false, true).ok);
+    EXPECT_FALSE(divide(corner, 3, true, true).ok);
+}
+
+TEST(FlythroughPoints, AreTheTwoDivisionsOfTheCurve) {
+    const ParameterCurve line(0.0, 10.0, true);
+    KM_3dPointArray camera;
+    KM_3dPointArray target;
+    ASSERT_TRUE(GetFlythroughPoints(&line, 2, camera, target));
+    EXPECT_EQ(KM_3dPointArray({{0.0, 0.0, 0.0}, {5.0, 0.0, 0.0}}), camera);
+    EXPECT_EQ(KM_3dPointArray({{5.0, 0.0, 0.0}, {10.0, 0.0, 0.0}}), target);
+}
+
+TEST(FlythroughPoints, OfOneFrameAreStartAndEnd) {
+    const ParameterCurve line(3.0, 10.0, true);
+    KM_3dPointArray camera = {{1.0, 1.0, 1.0}, {2.0, 2.0, 2.0}};
+    KM_3dPointArray target;
+    ASSERT_TRUE(GetFlythroughPoints(&line, 1, camera, target));
+    EXPECT_EQ(KM_3dPointArray({{3.0, 0.0, 0.0}}), camera);
+    EXPECT_EQ(KM_3dPointArray({{10.0, 0.0, 0.0}}), target);
+}
+
+TEST(FlythroughPoints, AreNoneWithoutCurveOrFrames) {
+    const ParameterCurve line(0.0, 10.0, false);
+    KM_3dPointArray camera;
+    KM_3dPointArray target;
+    EXPECT_FALSE(GetFlythroughPoints(nullptr, 1, camera, target));
+    EXPECT_FALSE(GetFlythroughPoints(nullptr, 5, camera, target));
+    EXPECT_FALSE(GetFlythroughPoints(&line, 0, camera, target));
+    EXPECT_FALSE(GetFlythroughPoints(&line, -5, camera, target));
+}
+
+TEST(FlythroughPoints, AreNoneWhereOnlyOneListHasAny) {
+    // Of the places 0, 5 and 10 only the last can be evaluated: the camera has none.
+    ParameterCurve line(0.0, 10.0, false);
+    line.gap_from = 0.0;
+    line.gap_to = 7.0;
+    KM_3dPointArray camera;
+    KM_3dPointArray target;
+    EXPECT_FALSE(GetFlythroughPoints(&line, 2, camera, target));
+    // And of these only the first: the target has none.
+    line.gap_from = 3.0;
+    line.gap_to = 10.0;
+    EXPECT_FALSE(GetFlythroughPoints(&line, 2, camera, target));
 }

@@ -19,6 +19,20 @@
 using quarn::test::readFile;
 using quarn::test::writeFile;
 
+/// A front end without a person that lets a test look at the document meanwhile.
+class WatchedFrontEnd final : public quarn::ScriptedFrontEnd {
+public:
+    void pumpEvents(unsigned milliseconds) override {
+        if (while_waiting)
+            while_waiting();
+        ScriptedFrontEnd::pumpEvents(milliseconds);
+    }
+
+    /// Called whenever the host waits: once before the first frame that is shown or recorded, and
+    /// at least once for every frame.
+    std::function<void()> while_waiting;
+};
+
 /// A running host without a person, with the plug-in loaded, a fresh record and a new document.
 class PlugInFixture : public ::testing::Test {
 protected:
@@ -53,7 +67,7 @@ protected:
     const std::wstring& printed() const { return front_end.printed(); }
 
     quarn::test::TempFolder folder;
-    quarn::ScriptedFrontEnd front_end;
+    WatchedFrontEnd front_end;
     std::unique_ptr<quarn::Session> session;
 };
 

@@ -40,6 +40,7 @@ TEST_F(TurntableDialog, ShowsTheChoicesAndTheRecord) {
               "XRay,Drawing,Clay@6;viewports=Top,Front,Right,Perspective@2;"
               "directions=Clockwise,AntiClockwise@0",
               shownInDialog());
+    EXPECT_EQ("turntable", shownDialog());
     EXPECT_TRUE(front_end.questions().empty());
 }
 

@@ -1,28 +1,6 @@
 #include "tests/zoetrix/TurntableFixture.h"
 
 #include <cmath>
-#include <cstdlib>
-
-namespace {
-
-void setWish(const char* name, const std::optional<std::string>& wish) {
-    const std::string variable = std::string("QUARN_DIALOG_") + name;
-    if (wish)
-        setenv(variable.c_str(), wish->c_str(), 1);
-    else
-        unsetenv(variable.c_str());
-}
-
-void setWish(const char* name, const std::optional<int>& wish) {
-    setWish(name, wish ? std::optional(std::to_string(*wish)) : std::nullopt);
-}
-
-} // namespace
-
-std::string shownInDialog() {
-    const char* shown = std::getenv("QUARN_DIALOG_SHOWN");
-    return shown ? shown : "";
-}
 
 TurntableFixture::TurntableFixture(const std::string& plug_ins) : PlugInFixture(plug_ins) {}
 
@@ -37,13 +15,7 @@ void TurntableFixture::SetUp() {
 }
 
 CQuarnCommand::result TurntableFixture::runInDialog(const Entered& entered) {
-    setWish("CONFIRM", entered.confirmed ? "1" : "0");
-    setWish("FILE_TYPE", entered.file_type);
-    setWish("CAPTURE", entered.method);
-    setWish("VIEWPORT", entered.viewport);
-    setWish("DIRECTION", entered.direction);
-    setWish("FRAMES", entered.frames);
-    setWish("NAME", entered.name);
+    enterIntoDialog(entered);
     return session->runCommand(L"SetTurntableAnimation", true);
 }
 

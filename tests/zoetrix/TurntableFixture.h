@@ -1,20 +1,7 @@
 #pragma once
 
+#include "tests/zoetrix/DialogEntries.h"
 #include "tests/zoetrix/PlugInFixture.h"
-
-/// What a person enters into the turntable dialog. What is not set is left as it was shown.
-struct Entered {
-    std::optional<int> file_type = std::nullopt;
-    std::optional<int> method = std::nullopt;
-    std::optional<int> viewport = std::nullopt;
-    std::optional<int> direction = std::nullopt;
-    std::optional<int> frames = 12;
-    std::string name = "Walk";
-    bool confirmed = true;
-};
-
-/// What the dialog showed when it opened, in the words of the test's dialog plug-in.
-std::string shownInDialog();
 
 /// A view whose camera stands at (5, 4, 3) and looks at (2, 0, 1): the circle has radius 5 about
 /// (2, 0, 3). Commands are answered at the command line or in a dialog; every test begins with the

@@ -10,7 +10,8 @@
 //   QUARN_DIALOG_NAME       the animation name to enter (UTF-8)
 //   QUARN_DIALOG_FILE_TYPE, QUARN_DIALOG_CAPTURE, QUARN_DIALOG_VIEWPORT, QUARN_DIALOG_DIRECTION
 //                           the index to choose
-// What is not set stays as it was shown. Afterwards QUARN_DIALOG_SHOWN holds
+// What is not set stays as it was shown. Afterwards QUARN_DIALOG_KIND holds "turntable" or "path",
+// and QUARN_DIALOG_SHOWN
 //   frames=<n>;name=<name>;files=<a,b>@<selected>;captures=...;viewports=...;directions=...
 
 namespace {
@@ -70,13 +71,23 @@ void Choose(IZoetrixDataUI& lists) {
         lists.SetDirectionListSelection(std::atoi(index->c_str()));
 }
 
-} // namespace
-
-QN_PLUGIN_ENTRY bool ZelVexUiTurnTable(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) {
+bool RunDialog(const char* kind, IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) {
+    setenv("QUARN_DIALOG_KIND", kind, 1);
     TellShown(lists, record);
     EnterIntoRecord(record);
     Choose(lists);
     return Wish("CONFIRM") == "1";
+}
+
+} // namespace
+
+QN_PLUGIN_ENTRY bool ZelVexUiTurnTable(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) {
+    return RunDialog("turntable", lists, record);
+}
+
+QN_PLUGIN_ENTRY bool ZelVexUiPathAnimation(IZoetrixDataUI& lists,
+                                           KM_3dmAnimationProperties& record) {
+    return RunDialog("path", lists, record);
 }
 
 TEST_PLUGIN_EXPORTS

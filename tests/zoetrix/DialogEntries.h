@@ -1,0 +1,26 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+/// What a person enters into a dialog of the test's dialog plug-in. What is not set is left as it
+/// was shown.
+struct Entered {
+    std::optional<int> file_type = std::nullopt;
+    std::optional<int> method = std::nullopt;
+    std::optional<int> viewport = std::nullopt;
+    std::optional<int> direction = std::nullopt;
+    std::optional<int> frames = 12;
+    std::optional<std::string> name = "Walk";
+    bool confirmed = true;
+};
+
+/// Has it entered into the next dialogs.
+void enterIntoDialog(const Entered& entered);
+
+/// What the last dialog showed when it opened, in the words of the test's dialog plug-in.
+std::string shownInDialog();
+
+/// Which dialog was the last: "turntable" or "path"; empty for none since forgetDialog.
+std::string shownDialog();
+void forgetDialog();
