@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <bit>
+#include <cstring>
 #include <exception>
 #include <utility>
 
@@ -164,7 +165,7 @@ bool KM_BinaryArchive::ReadUuid(KM_UUID& id) {
     id.Data1 = fromLittleEndian<std::uint32_t>(bytes.data());
     id.Data2 = fromLittleEndian<std::uint16_t>(bytes.data() + 4);
     id.Data3 = fromLittleEndian<std::uint16_t>(bytes.data() + 6);
-    std::ranges::copy(bytes.subspan(8), id.Data4);
+    std::memcpy(id.Data4, bytes.data() + 8, sizeof id.Data4);
     return true;
 }
 
