@@ -33,7 +33,11 @@ struct Estimate {
 Estimate estimateLength(const KM_Curve& curve, double t0, double t1) {
     const double middle = 0.5 * (t0 + t1);
     const double half = 0.5 * (t1 - t0);
-    const auto speed = [&](double t) { return curve.DerivativeAt(t).Length(); };
+    const auto speed = [&](double t) {
+        const KM_3dVector derivative = curve.DerivativeAt(t);
+        return derivative.IsValid() ? derivative.Length()
+                                    : std::numeric_limits<double>::quiet_NaN();
+    };
     double kronrod = 0.0;
     double gauss = 0.0;
     for (std::size_t i = 0; i < nodes.size(); ++i) {
@@ -49,7 +53,8 @@ Estimate estimateLength(const KM_Curve& curve, double t0, double t1) {
 
 double adaptiveLength(const KM_Curve& curve, double t0, double t1, double allowed, int depth) {
     const Estimate whole = estimateLength(curve, t0, t1);
-    if (whole.error <= allowed || depth == 0)
+    // What is no number comes from a curve that cannot be evaluated, and would not get better.
+    if (!(whole.error > allowed) || depth == 0)
         return whole.length;
     const double middle = 0.5 * (t0 + t1);
     return adaptiveLength(curve, t0, middle, 0.5 * allowed, depth - 1) +
@@ -123,6 +128,10 @@ KM_3dPoint KM_Curve::PointAtEnd() const {
     return PointAt(Domain().Max());
 }
 
+void KM_Curve::PointsAt(std::span<const double> parameters, KM_3dPoint* points) const {
+    std::ranges::transform(parameters, points, [this](double t) { return PointAt(t); });
+}
+
 bool KM_Curve::IsClosed() const {
     const KM_3dPoint start = PointAtStart();
     const KM_3dPoint end = PointAtEnd();
@@ -148,9 +157,16 @@ bool KM_Curve::GetLength(double* length, double fractional_tolerance) const {
     double total = 0.0;
     for (std::size_t i = 0; i + 1 < spans.size(); ++i)
         total += adaptiveLength(*this, spans[i], spans[i + 1], allowed, 20);
+    if (!KM_IsValid(total))
+        return false;
     if (length)
         *length = total;
     return true;
+}
+
+double KM_Curve::LengthBetween(double t0, double t1, double fractional_tolerance) const {
+    const double rough = estimateLength(*this, t0, t1).length;
+    return adaptiveLength(*this, t0, t1, std::max(fractional_tolerance, 1e-12) * rough, 20);
 }
 
 void KM_Curve::GetDisplayPolyline(double chord_tolerance, KM_3dPointArray& points) const {

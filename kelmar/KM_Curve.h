@@ -6,6 +6,7 @@
 #include "kelmar/KM_Interval.h"
 #include "kelmar/KM_Point.h"
 
+#include <span>
 #include <vector>
 
 class KM_Xform;
@@ -43,6 +44,10 @@ public:
 
     /// The point at the parameter; KM_3dPoint::UnsetPoint where the curve cannot be evaluated.
     virtual KM_3dPoint PointAt(double t) const = 0;
+    /// The points at many parameters, each the one that PointAt gives. Parameters that ascend cost
+    /// a NURBS curve less than so many calls of PointAt.
+    /// @param points  receives as many points as there are parameters
+    virtual void PointsAt(std::span<const double> parameters, KM_3dPoint* points) const;
     /// The derivative by the parameter, in model units per unit of parameter. At a kink it is that
     /// of the piece that begins there. KM_3dVector::UnsetVector where the curve cannot be
     /// evaluated.
@@ -77,8 +82,14 @@ public:
     /// QUADPACK, Springer 1983) of the derivative's length over every piece.
     /// @param length                receives the length; may be null
     /// @param fractional_tolerance  wished relative error, at least 1e-12
-    /// @return false, with `length` untouched, when the curve is not valid
+    /// @return false, with `length` untouched, when the curve is invalid or cannot be evaluated
     virtual bool GetLength(double* length, double fractional_tolerance = 1e-8) const;
+
+    /// Arc length of a part of a valid curve, by the same quadrature. Meant for parts without a
+    /// kink inside. It does not check that the curve is valid, so that many parts are quick.
+    /// @param t0, t1  the ends of the part, t0 <= t1, in the domain
+    /// @return a value that is not finite when the curve cannot be evaluated there
+    double LengthBetween(double t0, double t1, double fractional_tolerance = 1e-8) const;
 
     /// Writes corners of a polyline that stays near the curve, for drawing: its first and last
     /// corner and all its kinks are points of the curve exactly.

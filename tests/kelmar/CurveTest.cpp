@@ -317,6 +317,40 @@ TEST(PolylineCurve, WithFewerThanTwoCornersNothingCanBeEvaluated) {
     EXPECT_FALSE(empty.SetDomain(0, 1));
 }
 
+TEST(Curve, LengthsOfPartsAddUpToTheLength) {
+    for (const auto& curve : oneOfEach()) {
+        const std::vector<double> spans = curve->SpanParameters();
+        double sum = 0.0;
+        for (std::size_t i = 0; i + 1 < spans.size(); ++i) {
+            const double middle = std::lerp(spans[i], spans[i + 1], 0.3);
+            sum += curve->LengthBetween(spans[i], middle);
+            sum += curve->LengthBetween(middle, spans[i + 1]);
+        }
+        double length = 0.0;
+        ASSERT_TRUE(curve->GetLength(&length));
+        EXPECT_NEAR(sum, length, 1e-7 * length);
+        EXPECT_EQ(curve->LengthBetween(spans[0], spans[0]), 0.0);
+    }
+}
+
+TEST(Curve, APartOfACircleIsAsLongAsItsArc) {
+    KM_NurbsCurve circle;
+    ASSERT_EQ(KM_Circle(KM_xy_plane, 3.0).GetNurbForm(circle), 2);
+    EXPECT_NEAR(circle.LengthBetween(0.0, 0.5 * KM_PI), 1.5 * KM_PI, 1e-9);
+    EXPECT_NEAR(circle.LengthBetween(0.5 * KM_PI, 0.75 * KM_PI), 0.75 * KM_PI, 1e-9);
+}
+
+TEST(Curve, WhatCannotBeEvaluatedHasNoLength) {
+    KM_NurbsCurve curve;
+    const KM_3dPoint points[] = {{-1e308, 0, 0}, {1e308, 1, 0}, {1e308, 2, 0}, {0, 0, 1e308}};
+    ASSERT_TRUE(curve.CreateClampedUniformNurbs(points, 4));
+    ASSERT_FALSE(curve.DerivativeAt(0.0).IsValid());
+    double length = -1.0;
+    EXPECT_FALSE(curve.GetLength(&length));
+    EXPECT_EQ(length, -1.0);
+    EXPECT_FALSE(KM_IsValid(curve.LengthBetween(0.0, 1.0)));
+}
+
 TEST(PolylineCurve, AnInvalidCornerSpoilsItsSegmentsOnly) {
     KM_3dPointArray corners;
     corners.Append(5, square_corners);
