@@ -1,34 +1,14 @@
 #include "host/app/Application.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/HostCommands.h"
+#include "host/commands/ObjectNaming.h"
 #include "host/commands/ObjectPicking.h"
 #include "host/commands/WordsLeft.h"
 #include "host/document/Document.h"
 
-#include <algorithm>
-
 namespace quarn {
 
 namespace {
-
-bool isControl(wchar_t character) {
-    return character < 32 || (character >= 127 && character < 160);
-}
-
-/// Why an object cannot be called so; empty when it can.
-std::string whyRefused(const ObjectTable& objects, const DocumentObject& object,
-                       const KM_wString& name) {
-    if (name.IsEmpty())
-        return "The name of an object cannot be empty.";
-    if (std::ranges::any_of(name.View(), isControl))
-        return "The name of an object cannot hold control characters.";
-    if (!KM_UuidIsNil(KM_UuidFromString(name.ToUtf8())))
-        return "The name of an object cannot look like an id.";
-    const DocumentObject* owner = objects.findByName(name.View());
-    if (owner && owner != &object)
-        return "Another object is called \"" + owner->name.ToUtf8() + "\"; give a free name.";
-    return {};
-}
 
 CQuarnCommand::result askObject(KM_UUID& id) {
     CQuarnGetObject get;
@@ -72,7 +52,7 @@ CQuarnCommand::result runRename(const CQuarnCommandContext& context) {
     asked = askName(*object, name);
     if (asked != CQuarnCommand::success)
         return asked;
-    if (const std::string reason = whyRefused(objects, *object, name); !reason.empty())
+    if (const std::string reason = whyNameRefused(objects, object, name); !reason.empty())
         return fail(reason);
     objects.rename(id, name);
     return CQuarnCommand::success;

@@ -9,4 +9,14 @@ bool hasWordsLeft() {
     return command && !command->words.empty();
 }
 
+bool mayAskAgain(bool from_line) {
+    RunningCommand* command = Application::current()->runner().current();
+    if (!from_line)
+        return true;
+    if (!command || !command->typed)
+        return false;
+    command->words.clear();
+    return true;
+}
+
 } // namespace quarn

@@ -88,6 +88,24 @@ bool ObjectTable::rename(const KM_UUID& id, const KM_wString& name) {
     return true;
 }
 
+bool ObjectTable::replaceCurve(const KM_UUID& id, std::unique_ptr<KM_Curve> curve) {
+    DocumentObject* object = find(id);
+    if (!object || !object->curve || !curve)
+        return false;
+    object->curve = std::move(curve);
+    ++m_revision;
+    return true;
+}
+
+bool ObjectTable::movePoint(const KM_UUID& id, const KM_3dPoint& point) {
+    DocumentObject* object = find(id);
+    if (!object || !object->point)
+        return false;
+    object->point = point;
+    ++m_revision;
+    return true;
+}
+
 DocumentObject* ObjectTable::find(const KM_UUID& id) const {
     const auto found = m_by_id.find(id);
     return found == m_by_id.end() ? nullptr : found->second;

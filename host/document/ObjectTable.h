@@ -38,6 +38,13 @@ public:
     ///         has the name, ignoring case
     bool rename(const KM_UUID& id, const KM_wString& name);
 
+    /// Gives a curve object another curve; it keeps its id, name and all else.
+    /// @return false, with nothing changed, when there is no curve object with this id or no curve
+    bool replaceCurve(const KM_UUID& id, std::unique_ptr<KM_Curve> curve);
+    /// Moves a point object.
+    /// @return false, with nothing changed, when there is no point object with this id
+    bool movePoint(const KM_UUID& id, const KM_3dPoint& point);
+
     /// The object with this id, or null.
     DocumentObject* find(const KM_UUID& id) const;
     /// The object with this name, ignoring case, or null.
