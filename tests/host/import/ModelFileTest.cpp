@@ -82,6 +82,31 @@ TEST(ModelFile, LineElementsBecomeOneNamedCurve) {
     EXPECT_THAT(model.meshes, IsEmpty());
 }
 
+TEST(ModelFile, EveryLineObjectOfAFileIsACurveOfItsName) {
+    const TemporaryFolder folder;
+    const ImportedModel model = readOrFail(
+        folder.write("ways.obj", "v 0 0 1\nv 1 0 1\nv 2 1 1\nv 3 3 1\nv 4 4 4\nv 5 4 4\n"
+                                 "o In\nl 1 2 3\no Out\nl 4 3\no Apart\nl 5 6\nl 1 4\n"));
+    ASSERT_EQ(model.curves.size(), 4U);
+    const wchar_t* names[] = {L"In", L"Out", L"Apart", L"Apart"};
+    const int counts[] = {3, 2, 2, 2};
+    for (std::size_t i = 0; i < 4; ++i) {
+        EXPECT_EQ(model.curves[i].name, names[i]) << i;
+        EXPECT_EQ(model.curves[i].points.Count(), counts[i]) << i;
+    }
+}
+
+TEST(ModelFile, ALineLoopIsAClosedCurve) {
+    const TemporaryFolder folder;
+    const ImportedModel model = readOrFail(
+        folder.write("yard.obj", "v 0 0 0\nv 4 0 0\nv 4 4 0\nv 0 4 0\no Yard\nl 1 2 3 4 1\n"));
+    ASSERT_EQ(model.curves.size(), 1U);
+    const KM_3dPointArray& points = model.curves[0].points;
+    ASSERT_EQ(points.Count(), 5);
+    EXPECT_EQ(points[0], points[4]);
+    EXPECT_EQ(points[2], KM_3dPoint(4, 4, 0));
+}
+
 TEST(ModelFile, VerticesWithoutFacesBecomePoints) {
     const TemporaryFolder folder;
     const ImportedModel model = readOrFail(folder.write(
