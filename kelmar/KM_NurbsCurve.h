@@ -93,6 +93,7 @@ public:
     bool SetDomain(double t0, double t1) override;
     std::vector<double> SpanParameters() const override;
     KM_3dPoint PointAt(double t) const override;
+    void PointsAt(std::span<const double> parameters, KM_3dPoint* points) const override;
     KM_3dVector DerivativeAt(double t) const override;
     bool Reverse() override;
     /// A matrix with perspective changes the weights too, so the result is exact.
@@ -100,14 +101,9 @@ public:
     KM_BoundingBox BoundingBox() const override;
 
 private:
-    struct Evaluation {
-        KM_3dPoint point;
-        KM_3dVector derivative;
-        bool valid = false;
-    };
+    class Span;
 
     int SpanAt(double t) const;
-    Evaluation Evaluate(double t) const;
 
     int m_order = 0;
     bool m_rational = false;
