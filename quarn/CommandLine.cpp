@@ -1,6 +1,7 @@
 #include "quarn/CommandLine.h"
 
 #include "quarn/CaptureMode.h"
+#include "quarn/HelpTexts.h"
 
 #include <CLI/CLI.hpp>
 #include <algorithm>
@@ -9,83 +10,6 @@
 namespace quarn::program {
 
 namespace {
-
-constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
-
-  quarn turntable MODEL --frames N --out DIR   record a turntable as pictures and a page
-  quarn frame DOC --number K --out FILE        write one frame of a saved animation
-  quarn run SCRIPT [MODEL]                     run a script of host commands
-  quarn console [MODEL]                        type host commands
-  quarn info MODEL                             tell what a model file holds
-
-A MODEL may be a .quarn document too. quarn --help and quarn COMMAND --help tell more.
-)";
-
-constexpr const char* PROGRAM_FOOTER = R"(
-Examples:
-  quarn turntable house.glb --frames 120 --out out/house --save house.quarn
-  quarn frame house.quarn --number 60 --out middle.png
-  quarn info house.glb
-  quarn run steps.txt house.glb
-  quarn console house.glb
-
-Exit codes: 0 done, 1 failed, 2 arguments that make no sense, 130 stopped with Ctrl-C (143 by
-a request to terminate). Ctrl-C lets the picture that is being recorded be finished and writes the
-page; a second Ctrl-C ends the program at once.)";
-
-constexpr const char* TURNTABLE_FOOTER = R"(
-The model is framed so that it fills the pictures well during the whole turn. The pictures are
-named NAME000, NAME001, ... and NAME.html plays them in a browser.
-
-Examples:
-  quarn turntable house.glb --frames 120 --out out/house
-  quarn turntable part.stl --frames 36 --out out --mode Shaded --format png --size 640x480
-  quarn turntable town.obj --frames 240 --out out --elevation 35 --distance 0.8 --name Town
-  quarn turntable town.obj --frames 240 --out out --show-script > town.txt)";
-
-constexpr const char* FRAME_FOOTER = R"(
-The frame is drawn as the recording draws it; at the view's own size it is the same file.
-
-Examples:
-  quarn frame house.quarn --number 0 --out first.jpg
-  quarn frame house.quarn --number 60 --size 3840x2160 --out middle.png)";
-
-constexpr const char* RUN_FOOTER = R"(
-A script holds one host command a line; the words after a command's name answer its questions.
-Blank lines and lines that start with # are skipped. The first command that fails ends the run.
-
-Example (steps.txt):
-  _-StandardView _Top
-  _-FitView _Enter
-  _-SetTurntableAnimation 36 _Clockwise _png _Shaded _Enter _Enter
-  _-RecordAnimation _TargetFolder "out" _Enter
-
-The command Help lists every command.)";
-
-constexpr const char* CONSOLE_FOOTER = R"(
-A command asks for what it needs: "Number of frames <100>: ". What stands in < > is the answer of
-an empty line; what stands in ( ) are options, picked by typing their names (in a question for
-text as they stand there, with their brackets). Answers may also follow the command's name on its
-line; the command asks for those that are missing, and again for one that does not fit.
-
-  Tab        completes names of commands, options, objects and files
-  Up, Down   call back earlier lines; those of earlier runs are kept in
-             $XDG_STATE_HOME/quarn/history or else ~/.local/state/quarn/history
-  Ctrl-C     cancels the command that asks; ends a recording after the current picture (a second
-             one, while a command is at work, ends the program at once)
-  Ctrl-D     ends the program where a command is asked for, as Exit does; nothing is saved then
-
-An empty line where a command is asked for does nothing; Up and Enter repeat the last command. What
-is piped in is read as if it were typed; there lines that start with # are skipped.
-
-Example:
-  quarn console house.glb
-  Command: SetTurntableAnimation 36 Clockwise
-  File type <jpg> ( jpg png bmp tga ):)";
-
-constexpr const char* INFO_FOOTER = R"(
-Example:
-  quarn info house.glb)";
 
 void addCommonOptions(CLI::App& command, CommonOptions& common) {
     command.add_flag("--verbose", common.is_verbose, "Show what the host's commands print");
@@ -100,24 +24,56 @@ void addShowScript(CLI::App& command, bool& shows_script) {
                      "Print the host commands that would be run, and run nothing");
 }
 
-CLI::App& addTurntable(CLI::App& program, TurntableOptions& options) {
-    CLI::App& command =
-        *program.add_subcommand("turntable", "Record a turntable as pictures and a page");
-    const auto add = [&](const char* name, std::string& value, const char* value_name,
-                         const std::string& description) {
-        return command.add_option(name, value, description)->type_name(value_name);
-    };
+/// Adds options that take one word.
+class OptionAdder {
+public:
+    explicit OptionAdder(CLI::App& command) : m_command(command) {}
+
+    template <class Value>
+    CLI::Option* operator()(const char* name, Value& value, const char* value_name,
+                            const std::string& description) const {
+        return m_command.add_option(name, value, description)->type_name(value_name);
+    }
+
+private:
+    CLI::App& m_command;
+};
+
+/// What goes in and out, which a person looks for first.
+void addModelAndFolder(CLI::App& command, RecordingOptions& options) {
+    const OptionAdder add(command);
     add("MODEL", options.model, "", "The model file: OBJ, glTF, GLB, PLY, STL, ...; or a document")
         ->required();
-    add("--frames", options.frames, "N", "Pictures of one whole turn, from 1")->required();
     add("--out", options.folder, "DIR", "Folder for the pictures and the page")->required();
     add("--up", options.up_axis, "AXIS",
         "Axis that points up in the file, y or z (default: y for glTF and such, z for OBJ, PLY, "
         "STL)");
+}
+
+/// The rest of what every recording takes.
+void addRecordingOptions(CLI::App& command, RecordingOptions& options) {
+    const OptionAdder add(command);
     add("--size", options.size, "WxH", "Size of a picture in pixels")->capture_default_str();
     add("--mode", options.mode, "NAME", "Display mode: " + captureModeNames())
         ->capture_default_str();
     add("--format", options.format, "NAME", "jpg, png, bmp or tga")->capture_default_str();
+    command.add_option("--hide", options.hidden, "Leave out this object; may be given again")
+        ->type_name("NAME")
+        ->expected(1)
+        ->take_all();
+    add("--name", options.name, "NAME", "Name of the animation (default: the model file's)");
+    add("--save", options.document, "DOC",
+        "Keep the document with its animation in this .quarn file, before recording");
+    addShowScript(command, options.shows_script);
+    addCommonOptions(command, options.common);
+}
+
+CLI::App& addTurntable(CLI::App& program, TurntableOptions& options) {
+    CLI::App& command =
+        *program.add_subcommand("turntable", "Record a turntable as pictures and a page");
+    const OptionAdder add(command);
+    addModelAndFolder(command, options.recording);
+    add("--frames", options.frames, "N", "Pictures of one whole turn, from 1")->required();
     add("--direction", options.direction, "NAME",
         "Way round seen from above, clockwise or anticlockwise")
         ->capture_default_str();
@@ -127,15 +83,59 @@ CLI::App& addTurntable(CLI::App& program, TurntableOptions& options) {
     add("--distance", options.distance_factor, "FACTOR",
         "Camera distance times this: 0.01 to 1000, below 1 is nearer");
     add("--target", options.target, "X,Y,Z", "Point to turn about (default: the model's middle)");
-    command.add_option("--hide", options.hidden, "Leave out this object; may be given again")
-        ->type_name("NAME")
-        ->expected(1)
-        ->take_all();
-    add("--name", options.name, "NAME", "Name of the animation (default: the model file's)");
-    add("--save", options.document, "DOC",
-        "Keep the document with its animation in this .quarn file, before recording");
-    addShowScript(command, options.shows_script);
+    addRecordingOptions(command, options.recording);
     command.footer(TURNTABLE_FOOTER);
+    return command;
+}
+
+/// What the cameras that follow something have in common.
+template <class Options> void addTravelOptions(CLI::App& command, Options& options) {
+    const OptionAdder add(command);
+    command.add_flag("--even-speed", options.has_even_speed,
+                     "Run through the camera's curve at even speed, whatever its parameters");
+    add("--frames", options.frames, "N", "Pictures from the start to the end, from 1")->required();
+    add("--lens", options.lens_mm, "MM",
+        "Lens length, as of a camera for 35 mm film (default: 24, which suits a walk; a "
+        "document's own)");
+    addRecordingOptions(command, options.recording);
+}
+
+CLI::App& addFlythrough(CLI::App& program, FlythroughOptions& options) {
+    CLI::App& command =
+        *program.add_subcommand("flythrough", "Record a walk along a curve, looking ahead");
+    const OptionAdder add(command);
+    addModelAndFolder(command, options.recording);
+    add("--path", options.path.object, "NAME", "Curve to follow, by its name or id");
+    add("--camera-curve", options.path.curve_file, "FILE", "Follow the curve in this file instead");
+    addTravelOptions(command, options);
+    command.footer(FLYTHROUGH_FOOTER);
+    return command;
+}
+
+CLI::App& addPath(CLI::App& program, PathOptions& options) {
+    CLI::App& command = *program.add_subcommand(
+        "path", "Record a camera that follows one curve and looks along another");
+    const OptionAdder add(command);
+    addModelAndFolder(command, options.recording);
+    add("--camera", options.camera.object, "NAME",
+        "Curve or point that the camera follows, by its name or id");
+    add("--camera-curve", options.camera.curve_file, "FILE", "Or: the curve in this file");
+    add("--camera-point", options.camera.point, "X,Y,Z", "Or: the place where the camera stays");
+    add("--target", options.target.object, "NAME",
+        "Curve or point that the camera looks at, by its name or id");
+    add("--target-curve", options.target.curve_file, "FILE", "Or: the curve in this file");
+    add("--target-point", options.target.point, "X,Y,Z", "Or: the place that it looks at");
+    addTravelOptions(command, options);
+    command.footer(PATH_FOOTER);
+    return command;
+}
+
+CLI::App& addCurves(CLI::App& program, CurvesOptions& options) {
+    CLI::App& command = *program.add_subcommand("curves", "List what a camera can follow");
+    command.add_option("MODEL", options.model, "The model file or document")
+        ->type_name("")
+        ->required();
+    command.footer(CURVES_FOOTER);
     addCommonOptions(command, options.common);
     return command;
 }
@@ -195,9 +195,11 @@ Outcome refuseLeftOver(const CLI::App& command, const std::string& word) {
     if (word.starts_with('-'))
         return Outcome::misuse("unknown option " + word + hintOf(command));
     if (command.get_parent() == nullptr)
-        return Outcome::misuse("unknown command " + word +
-                               "; the commands are turntable, frame, run, console and info" +
-                               hintOf(command));
+        return Outcome::misuse(
+            "unknown command " + word +
+            "; the commands are turntable, flythrough, path, curves, frame, run, "
+            "console and info" +
+            hintOf(command));
     return Outcome::misuse("unexpected argument " + word + hintOf(command));
 }
 
@@ -213,6 +215,66 @@ Outcome refuseMistake(const CLI::App& program, const CLI::ParseError& mistake) {
     return Outcome::misuse(message + hintOf(typedCommand(program)));
 }
 
+void noteGiven(const CLI::App& command, RecordingOptions& options) {
+    options.was_name_given = command.count("--name") > 0;
+    options.was_document_given = command.count("--save") > 0;
+}
+
+/// The commands of the program, each with the options that it fills.
+class Commands {
+public:
+    explicit Commands(CLI::App& program)
+        : m_turntable_command(addTurntable(program, m_turntable)),
+          m_flythrough_command(addFlythrough(program, m_flythrough)),
+          m_path_command(addPath(program, m_path)), m_curves_command(addCurves(program, m_curves)),
+          m_frame_command(addFrame(program, m_frame)), m_run_command(addRun(program, m_script)),
+          m_console_command(addConsole(program, m_console)) {
+        addInfo(program, m_model);
+    }
+
+    /// @param command  the one that was typed
+    Request request(const CLI::App& command) {
+        if (&command == &m_turntable_command)
+            return recordingRequest(command, m_turntable);
+        if (&command == &m_flythrough_command)
+            return recordingRequest(command, m_flythrough);
+        if (&command == &m_path_command)
+            return recordingRequest(command, m_path);
+        if (&command == &m_curves_command)
+            return m_curves;
+        if (&command == &m_frame_command)
+            return m_frame;
+        if (&command == &m_run_command)
+            return m_script;
+        if (&command == &m_console_command)
+            return m_console;
+        return m_model;
+    }
+
+private:
+    template <class Options>
+    static Request recordingRequest(const CLI::App& command, Options& options) {
+        noteGiven(command, options.recording);
+        return options;
+    }
+
+    TurntableOptions m_turntable;
+    FlythroughOptions m_flythrough;
+    PathOptions m_path;
+    CurvesOptions m_curves;
+    FrameOptions m_frame;
+    ScriptOptions m_script;
+    ModelOptions m_model;
+    ConsoleOptions m_console;
+    const CLI::App& m_turntable_command;
+    const CLI::App& m_flythrough_command;
+    const CLI::App& m_path_command;
+    const CLI::App& m_curves_command;
+    const CLI::App& m_frame_command;
+    const CLI::App& m_run_command;
+    const CLI::App& m_console_command;
+};
+
 } // namespace
 
 Request readCommandLine(int argument_count, const char* const* arguments) {
@@ -221,16 +283,7 @@ Request readCommandLine(int argument_count, const char* const* arguments) {
     program.footer(PROGRAM_FOOTER);
     program.allow_extras();
     program.require_subcommand(0, 1); // further words may be files that are named like a command
-    TurntableOptions turntable;
-    FrameOptions frame;
-    ScriptOptions script;
-    ModelOptions model;
-    ConsoleOptions console;
-    const CLI::App& turntable_command = addTurntable(program, turntable);
-    const CLI::App& frame_command = addFrame(program, frame);
-    const CLI::App& run_command = addRun(program, script);
-    const CLI::App& console_command = addConsole(program, console);
-    addInfo(program, model);
+    Commands commands(program);
 
     try {
         program.parse(argument_count, arguments);
@@ -248,18 +301,7 @@ Request readCommandLine(int argument_count, const char* const* arguments) {
             return refuseLeftOver(*reader, reader->remaining().front());
     if (&command == &program)
         return Outcome{Outcome::misused, SHORT_HELP};
-    if (&command == &turntable_command) {
-        turntable.was_name_given = command.count("--name") > 0;
-        turntable.was_document_given = command.count("--save") > 0;
-        return turntable;
-    }
-    if (&command == &frame_command)
-        return frame;
-    if (&command == &run_command)
-        return script;
-    if (&command == &console_command)
-        return console;
-    return model;
+    return commands.request(command);
 }
 
 } // namespace quarn::program

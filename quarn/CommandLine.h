@@ -2,7 +2,7 @@
 
 #include "quarn/Outcome.h"
 
-#include <filesystem>
+#include <optional>
 #include <string>
 #include <variant>
 #include <vector>
@@ -15,19 +15,15 @@ struct CommonOptions {
     std::string language; ///< empty: the environment's
 };
 
-/// `quarn turntable`, as typed; an option that was not given is empty where it has no default.
-struct TurntableOptions {
+/// What every recording takes, as typed; an option that was not given is empty where it has no
+/// default.
+struct RecordingOptions {
     std::string model;
     std::string up_axis; ///< empty: by the format
     std::string folder;
-    std::string frames;
     std::string size = "1280x720";
     std::string mode = "Rendered";
     std::string format = "jpg";
-    std::string direction = "clockwise";
-    std::string elevation_deg = "22";
-    std::string distance_factor;
-    std::string target;
     std::vector<std::string> hidden; ///< names of objects
     std::string name;
     bool was_name_given = false;
@@ -35,6 +31,42 @@ struct TurntableOptions {
     bool was_document_given = false;
     bool shows_script = false;
     CommonOptions common;
+};
+
+/// `quarn turntable`
+struct TurntableOptions {
+    RecordingOptions recording;
+    std::string frames;
+    std::string direction = "clockwise";
+    std::string elevation_deg = "22";
+    std::string distance_factor;
+    std::string target;
+};
+
+/// The ways to say what a camera, or its target, follows.
+struct FollowedOptions {
+    std::optional<std::string> object;     ///< name or id of a curve or a point
+    std::optional<std::string> curve_file; ///< a file that holds a curve
+    std::optional<std::string> point;      ///< a place where it stays
+};
+
+/// `quarn flythrough`
+struct FlythroughOptions {
+    RecordingOptions recording;
+    std::string frames;
+    FollowedOptions path;
+    bool has_even_speed = false;
+    std::string lens_mm;
+};
+
+/// `quarn path`
+struct PathOptions {
+    RecordingOptions recording;
+    std::string frames;
+    FollowedOptions camera;
+    FollowedOptions target;
+    bool has_even_speed = false;
+    std::string lens_mm;
 };
 
 /// `quarn frame`
@@ -60,6 +92,12 @@ struct ModelOptions {
     CommonOptions common;
 };
 
+/// `quarn curves`
+struct CurvesOptions {
+    std::string model;
+    CommonOptions common;
+};
+
 /// `quarn console`
 struct ConsoleOptions {
     std::string model; ///< empty: none is read first
@@ -68,7 +106,7 @@ struct ConsoleOptions {
 
 /// What the program was asked for; an Outcome when that ended it already (help, or a mistake).
 using Request = std::variant<Outcome, TurntableOptions, ScriptOptions, ModelOptions, ConsoleOptions,
-                             FrameOptions>;
+                             FrameOptions, FlythroughOptions, PathOptions, CurvesOptions>;
 
 /// Reads the program's arguments. Values are not looked into here.
 Request readCommandLine(int argument_count, const char* const* arguments);

@@ -1,118 +1,17 @@
 #include "quarn/Turntable.h"
 
-#include "quarn/HostSession.h"
-#include "quarn/Interruption.h"
-#include "quarn/OutputFolder.h"
+#include "quarn/Recording.h"
 #include "quarn/TurntableRequest.h"
 #include "quarn/TurntableScript.h"
 
 namespace quarn::program {
-
-namespace {
-
-using Clock = std::chrono::steady_clock;
-
-std::string scriptText(const TurntableRequest& request) {
-    const TurntableScript script = composeTurntable(request);
-    std::string text;
-    for (const std::string& line : script.set_up)
-        text += line + "\n";
-    text += "# The folder must be there before the recording starts.\n";
-    if (script.saving)
-        text += *script.saving + "\n";
-    return text + script.recording;
-}
-
-std::string frameCountText(int frames) {
-    return std::to_string(frames) + (frames == 1 ? " frame" : " frames");
-}
-
-/// What became of the recording, once the command that records has ended.
-class RecordingEnd {
-public:
-    RecordingEnd(const TurntableRequest& request, ConsoleFrontEnd& front_end)
-        : m_request(request), m_written(front_end.framesWritten()),
-          m_reason(front_end.lastWords()) {}
-
-    Outcome outcome(bool command_succeeded, Clock::duration taken) const {
-        const bool is_complete = m_written == m_request.frames;
-        if (!is_complete && isInterruptionRequested())
-            return stopped(interruptedText(command_succeeded));
-        if (!is_complete)
-            return Outcome::failure(incompleteText());
-        if (!command_succeeded)
-            return Outcome::failure("all frames were written, but the page " + page() +
-                                    " could not be" + reasonText() + ".");
-        const double seconds = std::chrono::duration<double>(taken).count();
-        return Outcome::success(frameCountText(m_written) + " and " + page() + " in " +
-                                timeText(seconds));
-    }
-
-private:
-    std::string page() const { return pagePath(m_request).native(); }
-    std::string reasonText() const { return m_reason.empty() ? "" : ": " + m_reason; }
-
-    std::string countText() const {
-        return std::to_string(m_written) + " of " + frameCountText(m_request.frames);
-    }
-
-    std::string interruptedText(bool is_page_there) const {
-        const std::string text = "Stopped after " + countText();
-        return text + (is_page_there ? "; " + page() + " plays what is there."
-                                     : "; the page " + page() + " could not be written.");
-    }
-
-    std::string incompleteText() const {
-        return "only " + countText() + " were written to " + m_request.folder.native() +
-               (m_reason.empty() ? ". Is there space left?" : reasonText());
-    }
-
-    const TurntableRequest& m_request;
-    int m_written;
-    std::string m_reason;
-};
-
-Outcome record(const TurntableRequest& request, const TurntableScript& script, HostSession& host,
-               Clock::time_point start) {
-    if (const auto refusal = whyFolderCannotBeUsed(request.folder))
-        return Outcome::failure(*refusal);
-    if (script.saving)
-        if (const auto trouble = host.run(*script.saving))
-            return *trouble;
-    if (isInterruptionRequested())
-        return stopped("Stopped before anything was recorded.");
-    ConsoleFrontEnd& front_end = host.frontEnd();
-    front_end.beginRecording(request.frames);
-    const auto trouble = host.run(script.recording);
-    front_end.clearProgress();
-    return RecordingEnd(request, front_end).outcome(!trouble, Clock::now() - start);
-}
-
-Outcome runTurntable(const TurntableRequest& request, const CommonOptions& common) {
-    const Clock::time_point start = Clock::now();
-    watchForInterruption();
-    ConsoleFrontEnd front_end(printsFor(common));
-    HostSession host(front_end, common);
-    if (const auto trouble = host.loadAnimationPlugIn())
-        return *trouble;
-    const TurntableScript script = composeTurntable(request);
-    front_end.showStep("reading " + request.model.filename().native());
-    for (const std::string& line : script.set_up)
-        if (const auto trouble = host.run(line))
-            return *trouble;
-    return record(request, script, host, start);
-}
-
-} // namespace
 
 Outcome recordTurntable(const TurntableOptions& options) {
     const auto checked = checkTurntable(options);
     if (const Outcome* const refusal = std::get_if<Outcome>(&checked))
         return *refusal;
     const TurntableRequest& request = std::get<TurntableRequest>(checked);
-    if (options.shows_script)
-        return Outcome::success(scriptText(request));
-    return runTurntable(request, options.common);
+    return recordOrShow(request.recording, turntableLines(request), options.recording);
 }
 
 } // namespace quarn::program

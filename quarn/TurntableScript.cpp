@@ -42,32 +42,13 @@ std::string fitView(const TurntableRequest& request) {
     return line + " _Enter";
 }
 
-std::string setTurntable(const TurntableRequest& request) {
-    return "_-SetTurntableAnimation " + std::to_string(request.frames) +
-           (request.is_clockwise ? " _Clockwise" : " _AntiClockwise") + " _" + request.format +
-           " " + request.capture_option + " _Enter _Enter";
-}
-
 } // namespace
 
-TurntableScript composeTurntable(const TurntableRequest& request) {
-    TurntableScript script;
-    script.set_up = {readingLine(request.model, request.up_axis)};
-    for (const std::string& name : request.hidden)
-        script.set_up.push_back("_-Hide \"" + name + "\"");
-    for (const std::string& line : {
-             "_-ViewportSize " + std::to_string(request.size.width_px) + " " +
-                 std::to_string(request.size.height_px),
-             camera(request),
-             fitView(request),
-             "_-AnimationName \"" + request.name + "\"",
-             setTurntable(request),
-         })
-        script.set_up.push_back(line);
-    if (!request.document.empty())
-        script.saving = "_-SaveAs " + quotedPath(request.document);
-    script.recording = "_-RecordAnimation _TargetFolder " + quotedPath(request.folder) + " _Enter";
-    return script;
+AnimationLines turntableLines(const TurntableRequest& request) {
+    const std::string answers = std::to_string(request.recording.frames) +
+                                (request.is_clockwise ? " _Clockwise " : " _AntiClockwise ") +
+                                sharedAnswers(request.recording);
+    return {{camera(request), fitView(request)}, "_-SetTurntableAnimation " + answers};
 }
 
 } // namespace quarn::program

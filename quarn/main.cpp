@@ -1,5 +1,7 @@
+#include "quarn/CameraPath.h"
 #include "quarn/CommandLine.h"
 #include "quarn/Console.h"
+#include "quarn/CurveReport.h"
 #include "quarn/ModelReport.h"
 #include "quarn/ScriptRun.h"
 #include "quarn/SingleFrame.h"
@@ -18,6 +20,15 @@ Outcome answer(const Outcome& outcome) {
 Outcome answer(const TurntableOptions& options) {
     return recordTurntable(options);
 }
+Outcome answer(const FlythroughOptions& options) {
+    return recordFlythrough(options);
+}
+Outcome answer(const PathOptions& options) {
+    return recordPath(options);
+}
+Outcome answer(const CurvesOptions& options) {
+    return reportCurves(options);
+}
 Outcome answer(const ScriptOptions& options) {
     return runScript(options);
 }
@@ -27,7 +38,6 @@ Outcome answer(const ModelOptions& options) {
 Outcome answer(const ConsoleOptions& options) {
     return runConsole(options);
 }
-
 Outcome answer(const FrameOptions& options) {
     return writeSingleFrame(options);
 }

@@ -71,7 +71,7 @@ TEST(Arguments, VersionIsPrinted) {
 
 TEST(Arguments, UnknownCommandIsNamed) {
     expectRefusal(run({"turnip"}),
-                  {"unknown command turnip", "turntable, frame, run, console and info"});
+                  {"unknown command turnip", "turntable, flythrough, path, curves, frame, run, "});
 }
 
 TEST(Arguments, UnknownOptionIsNamed) {

@@ -1,0 +1,120 @@
+#pragma once
+
+namespace quarn::program {
+
+inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
+
+  quarn turntable MODEL --frames N --out DIR   record a turntable as pictures and a page
+  quarn flythrough MODEL --path NAME --frames N --out DIR
+                                               record a walk along a curve, looking ahead
+  quarn path MODEL --camera NAME --target NAME --frames N --out DIR
+                                               record a camera that follows one curve and looks
+                                               along another, or at a point
+  quarn curves MODEL                           list what a camera can follow
+  quarn frame DOC --number K --out FILE        write one frame of a saved animation
+  quarn run SCRIPT [MODEL]                     run a script of host commands
+  quarn console [MODEL]                        type host commands
+  quarn info MODEL                             tell what a model file holds
+
+A MODEL may be a .quarn document too. quarn --help and quarn COMMAND --help tell more.
+)";
+
+inline constexpr const char* PROGRAM_FOOTER = R"(
+Examples:
+  quarn turntable house.glb --frames 120 --out out/house --save house.quarn
+  quarn flythrough house.glb --camera-curve walk.txt --even-speed --frames 240 --out out/walk
+  quarn frame house.quarn --number 60 --out middle.png
+  quarn info house.glb
+  quarn run steps.txt house.glb
+  quarn console house.glb
+
+Exit codes: 0 done, 1 failed, 2 arguments that make no sense, 130 stopped with Ctrl-C (143 by
+a request to terminate). Ctrl-C lets the picture that is being recorded be finished and writes the
+page; a second Ctrl-C ends the program at once.)";
+
+inline constexpr const char* TURNTABLE_FOOTER = R"(
+The model is framed so that it fills the pictures well during the whole turn. The pictures are
+named NAME000, NAME001, ... and NAME.html plays them in a browser.
+
+Examples:
+  quarn turntable house.glb --frames 120 --out out/house
+  quarn turntable part.stl --frames 36 --out out --mode Shaded --format png --size 640x480
+  quarn turntable town.obj --frames 240 --out out --elevation 35 --distance 0.8 --name Town
+  quarn turntable town.obj --frames 240 --out out --show-script > town.txt)";
+
+inline constexpr const char* FLYTHROUGH_FOOTER = R"(
+The camera runs along the curve from its start and looks in every picture at the place where the
+next one is taken; the horizon stays level. The curve itself is not in the pictures.
+
+A curve file holds a point a line, as X Y Z or X,Y,Z, in the model's units with Z up; a camera at
+eye height stands 1.6 above the floor of a model in metres. A line "degree 3" before the first
+point makes a smooth curve of them, which passes near the points; a line "closed" a round tour.
+
+Examples:
+  quarn curves town.obj
+  quarn flythrough town.obj --path "Main street" --even-speed --frames 300 --out out/street
+  quarn flythrough house.glb --camera-curve walk.txt --even-speed --frames 240 --out out/walk
+  quarn flythrough house.glb --camera-curve walk.txt --frames 240 --out out --save walk.quarn)";
+
+inline constexpr const char* PATH_FOOTER = R"(
+Camera and target run through their curves in the same number of pictures; either may be a point,
+where it stays. The curves are not in the pictures; the horizon stays level. quarn flythrough
+--help tells what a curve file holds.
+
+Examples:
+  quarn path town.obj --camera "Roof line" --target Fountain --frames 240 --out out/roofs
+  quarn path part.stl --camera-curve arc.txt --target-point 0,0,12 --frames 120 --out out/part
+  quarn path hall.glb --camera-point 2,-4,1.6 --target-curve frieze.json --frames 90 --out out)";
+
+inline constexpr const char* CURVES_FOOTER = R"(
+A line tells the name (the id, where there is none), the kind, the length in the model's units,
+whether it is closed, and the number of points that define it.
+
+Example:
+  quarn curves town.obj)";
+
+inline constexpr const char* FRAME_FOOTER = R"(
+The frame is drawn as the recording draws it; at the view's own size it is the same file.
+
+Examples:
+  quarn frame house.quarn --number 0 --out first.jpg
+  quarn frame house.quarn --number 60 --size 3840x2160 --out middle.png)";
+
+inline constexpr const char* RUN_FOOTER = R"(
+A script holds one host command a line; the words after a command's name answer its questions.
+Blank lines and lines that start with # are skipped. The first command that fails ends the run.
+
+Example (steps.txt):
+  _-StandardView _Top
+  _-FitView _Enter
+  _-SetTurntableAnimation 36 _Clockwise _png _Shaded _Enter _Enter
+  _-RecordAnimation _TargetFolder "out" _Enter
+
+The command Help lists every command.)";
+
+inline constexpr const char* CONSOLE_FOOTER = R"(
+A command asks for what it needs: "Number of frames <100>: ". What stands in < > is the answer of
+an empty line; what stands in ( ) are options, picked by typing their names (in a question for
+text as they stand there, with their brackets). Answers may also follow the command's name on its
+line; the command asks for those that are missing, and again for one that does not fit.
+
+  Tab        completes names of commands, options, objects and files
+  Up, Down   call back earlier lines; those of earlier runs are kept in
+             $XDG_STATE_HOME/quarn/history or else ~/.local/state/quarn/history
+  Ctrl-C     cancels the command that asks; ends a recording after the current picture (a second
+             one, while a command is at work, ends the program at once)
+  Ctrl-D     ends the program where a command is asked for, as Exit does; nothing is saved then
+
+An empty line where a command is asked for does nothing; Up and Enter repeat the last command. What
+is piped in is read as if it were typed; there lines that start with # are skipped.
+
+Example:
+  quarn console house.glb
+  Command: SetTurntableAnimation 36 Clockwise
+  File type <jpg> ( jpg png bmp tga ):)";
+
+inline constexpr const char* INFO_FOOTER = R"(
+Example:
+  quarn info house.glb)";
+
+} // namespace quarn::program

@@ -1,0 +1,36 @@
+#include "quarn/RecordingScript.h"
+
+namespace quarn::program {
+
+RecordingScript composeRecording(const RecordingRequest& request, const AnimationLines& lines) {
+    RecordingScript script;
+    std::vector<std::string>& set_up = script.set_up;
+    set_up.push_back(readingLine(request.model, request.up_axis));
+    for (const std::string& name : request.hidden)
+        set_up.push_back("_-Hide \"" + name + "\"");
+    set_up.push_back("_-ViewportSize " + std::to_string(request.size.width_px) + " " +
+                     std::to_string(request.size.height_px));
+    set_up.insert(set_up.end(), lines.preparing.begin(), lines.preparing.end());
+    set_up.push_back("_-AnimationName \"" + request.name + "\"");
+    set_up.push_back(lines.setting_up);
+    if (!request.document.empty())
+        script.saving = "_-SaveAs " + quotedPath(request.document);
+    script.recording = "_-RecordAnimation _TargetFolder " + quotedPath(request.folder) + " _Enter";
+    return script;
+}
+
+std::string sharedAnswers(const RecordingRequest& request) {
+    return "_" + request.format + " " + request.capture_option + " _Enter _Enter";
+}
+
+std::string scriptText(const RecordingScript& script) {
+    std::string text;
+    for (const std::string& line : script.set_up)
+        text += line + "\n";
+    text += "# The folder must be there before the recording starts.\n";
+    if (script.saving)
+        text += *script.saving + "\n";
+    return text + script.recording;
+}
+
+} // namespace quarn::program
