@@ -7,19 +7,41 @@
 namespace walk {
 
 /// Control points of a uniform cubic B-spline (C. de Boor, "A Practical Guide to Splines", chapter
-/// IX), which starts at the first and ends at the last.
+/// IX), which starts at the first and ends at the last. The eye rises and sinks over a longer way
+/// than the steps do, so that a camera that looks along the way hardly nods.
 inline std::vector<Vec> controlPoints() {
     constexpr double street = 1.70;
-    constexpr double hall = 1.70 + temple::floor_height;
-    return {
-        {0.0, -15.6, street}, {-0.4, -13.4, street}, {-2.4, -12.2, street}, {-3.7, -9.8, street},
-        {-3.9, -7.4, street}, {-2.4, -5.2, street},  {-0.2, -3.9, street},  {0.0, -2.2, street},
-        {0.0, -0.9, hall},    {0.5, 0.1, hall},      {2.2, 0.3, hall},      {3.7, 0.3, hall},
-        {4.6, 0.8, hall},     {4.6, 2.4, hall},      {4.6, 4.6, hall},      {4.0, 5.7, hall},
-        {2.0, 5.75, hall},    {-1.0, 5.75, hall},    {-3.4, 5.75, hall},    {-4.5, 5.3, hall},
-        {-4.6, 4.0, hall},    {-5.0, 3.1, hall},     {-6.1, 3.0, hall},     {-7.4, 2.8, street},
-        {-8.5, 1.6, street},  {-8.6, -0.6, street},  {-7.6, -2.8, street},  {-5.4, -4.4, street},
-        {-3.0, -5.2, street}, {-1.0, -5.0, street}};
+    constexpr double hall = street + temple::floor_height;
+    return {{0.0, -15.6, street},
+            {-0.4, -13.4, street},
+            {-2.4, -12.2, street},
+            {-3.7, -9.8, street},
+            {-3.9, -7.4, street},
+            {-3.0, -5.4, street + 0.04},
+            {-1.8, -3.7, street + 0.16},
+            {-0.6, -2.1, street + 0.34},
+            {0.3, -0.7, street + 0.47},
+            {1.3, 0.2, street + 0.53},
+            {2.6, 0.4, hall},
+            {3.7, 0.5, hall},
+            {4.5, 1.1, hall},
+            {4.6, 2.6, hall},
+            {4.6, 4.4, hall},
+            {3.9, 5.6, hall},
+            {2.0, 5.75, hall},
+            {-1.0, 5.75, hall},
+            {-3.2, 5.7, hall},
+            {-4.3, 5.1, hall},
+            {-4.7, 4.0, hall},
+            {-5.2, 3.2, street + 0.51},
+            {-6.1, 2.9, street + 0.40},
+            {-7.3, 2.5, street + 0.22},
+            {-8.3, 1.5, street + 0.07},
+            {-8.6, -0.6, street},
+            {-7.6, -2.8, street},
+            {-5.4, -4.4, street},
+            {-3.0, -5.2, street},
+            {-1.0, -5.0, street}};
 }
 
 inline std::vector<Vec> points() {
