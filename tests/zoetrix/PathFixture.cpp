@@ -87,12 +87,6 @@ Bytes withObject(const Bytes& file, const std::function<void(KM_BinaryArchive&)>
     return to.TakeBytes();
 }
 
-KM_NurbsCurve polygonOfQuarters(const std::vector<KM_3dPoint>& points) {
-    KM_NurbsCurve curve;
-    EXPECT_TRUE(curve.CreateClampedUniformNurbs(points, 2) && curve.SetDomain(0.0, 1.0));
-    return curve;
-}
-
 } // namespace
 
 PathFixture::PathFixture(const std::string& plug_ins) : PlugInFixture(plug_ins) {}
@@ -202,15 +196,30 @@ KM_NurbsCurve unevenCurve() {
     return curve;
 }
 
-KM_NurbsCurve curveWithHoleAt(int far) {
-    KM_NurbsCurve curve = polygonOfQuarters(
-        {{0.0, 0.0, 0.0}, {10.0, 0.0, 0.0}, {20.0, 0.0, 0.0}, {30.0, 0.0, 0.0}, {40.0, 0.0, 0.0}});
-    EXPECT_TRUE(curve.SetCV(far, {FAR_OUT, 0.0, 0.0}));
+KM_NurbsCurve curveWithHoleAt(int place) {
+    // Four cubic pieces between triple knots; control point 3 k is the point at k / 4.
+    KM_NurbsCurve curve;
+    EXPECT_TRUE(curve.Create(3, false, 4, 13));
+    for (int i = 0; i < curve.CVCount(); ++i)
+        curve.SetCV(i, {10.0 * i / 3.0, 0.0, 0.0});
+    for (int i = 0; i < curve.KnotCount(); ++i)
+        curve.SetKnot(i, 0.25 * (i / 3));
+    curve.SetCV(3 * place + 1, {FAR_OUT, 0.0, 0.0});
+    curve.SetCV(3 * place + 2, {-FAR_OUT, 0.0, 0.0});
+    EXPECT_TRUE(curve.IsValid());
     return curve;
 }
 
 KM_NurbsCurve curveWithoutPoints() {
-    return polygonOfQuarters({{FAR_OUT, 0.0, 0.0}, {-FAR_OUT, 0.0, 0.0}, {FAR_OUT, 1.0, 0.0}});
+    // One piece between single knots: no control point is a point of the curve.
+    KM_NurbsCurve curve;
+    EXPECT_TRUE(curve.Create(3, false, 3, 3));
+    for (int i = 0; i < curve.CVCount(); ++i)
+        curve.SetCV(i, {i == 1 ? -FAR_OUT : FAR_OUT, 1.0 * i, 0.0});
+    for (int i = 0; i < curve.KnotCount(); ++i)
+        curve.SetKnot(i, i);
+    EXPECT_TRUE(curve.IsValid());
+    return curve;
 }
 
 testing::AssertionResult near(const KM_3dPointArray& a, const KM_3dPointArray& b,

@@ -64,11 +64,10 @@ KM_NurbsCurve unevenCurve();
 inline const KM_3dPointArray uneven_points = {
     {0.0, 0.0, 0.0}, {4.0, 3.0, 0.0}, {5.0, 8.0, 0.0}, {8.0, 11.0, 0.0}, {13.0, 12.0, 0.0}};
 
-/// A curve of degree 1 whose point at k / 4 is (10 k, 0, 0), k = 0..4, but for a control point so
-/// far out that the spans at both its sides cannot be evaluated: 1e308 is a number that documents
-/// hold, and its change by a quarter of the parameter is none any more. A parameter k / 4 belongs
-/// to the span that begins there, so the places `far` - 1 and `far` are missing.
-KM_NurbsCurve curveWithHoleAt(int far);
+/// A curve whose point at k / 4 is (10 k, 0, 0), k = 0..4, but for the piece that begins at
+/// `place`, which cannot be evaluated, so that this one place is missing: its inner control points
+/// are numbers that documents hold, and the way from one to the other is none any more.
+KM_NurbsCurve curveWithHoleAt(int place);
 /// A curve that documents hold and that cannot be evaluated anywhere.
 KM_NurbsCurve curveWithoutPoints();
 

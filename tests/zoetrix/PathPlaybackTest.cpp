@@ -184,10 +184,11 @@ TEST_F(PathPlayback, CurveThatCanBeEvaluatedNoMoreKeepsThePoints) {
 }
 
 TEST_F(PathPlayback, FramesWithoutAPlaceLeaveTheViewWhereItIs) {
-    ASSERT_EQ(CQuarnCommand::success, setUpPath(L"rail", L"gaze", L"4"));
+    ASSERT_EQ(CQuarnCommand::success, setUpPath(L"rail", L"gaze", L"5"));
     editCurve(L"rail", curveWithHoleAt(2));
-    // Of the four places two are missing now, so that the last two frames have no camera.
+    // Of the five places one is missing now, so that the last frame has no camera.
     const std::vector<KM_3dPoint> cameras = camerasPlayed();
+    EXPECT_TRUE(passes(cameras, {10.0, 0.0, 0.0}));
     EXPECT_TRUE(passes(cameras, {30.0, 0.0, 0.0}));
     ASSERT_FALSE(cameras.empty());
     EXPECT_TRUE(near(cameras.back(), KM_3dPoint(40.0, 0.0, 0.0), 1e-9));
