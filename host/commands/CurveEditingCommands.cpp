@@ -3,7 +3,6 @@
 #include "host/commands/HostCommands.h"
 #include "host/commands/ObjectNaming.h"
 #include "host/commands/PointPrompt.h"
-#include "host/commands/PointText.h"
 #include "host/commands/WordsLeft.h"
 #include "host/document/CurveEditing.h"
 #include "host/document/Document.h"

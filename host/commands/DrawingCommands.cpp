@@ -1,7 +1,6 @@
 #include "host/app/Application.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/PointPrompt.h"
-#include "host/commands/PointText.h"
 #include "host/commands/WordsLeft.h"
 #include "host/document/Document.h"
 
