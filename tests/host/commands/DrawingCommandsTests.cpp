@@ -155,6 +155,15 @@ TEST_F(DrawingCommandsTest, APersonMendsWhatIsNoPolylineYet) {
     EXPECT_EQ(curve<KM_PolylineCurve>(L"Curve").PointCount(), 4);
 }
 
+TEST_F(DrawingCommandsTest, ABadWordOfATypedLineIsAskedAgainAndThePointsBeforeItStay) {
+    for (const wchar_t* answer : {L"3,0,0", L"3,4,0", L"_Enter"})
+        front_end.addAnswer(answer);
+    ASSERT_EQ(session.runTypedCommand(L"Polyline 0,0,0 here 9,9,9"), CQuarnCommand::success);
+    EXPECT_EQ(curve<KM_PolylineCurve>(L"Curve").Points(),
+              (KM_3dPointArray{{0, 0, 0}, {3, 0, 0}, {3, 4, 0}}));
+    EXPECT_THAT(printed(), HasSubstr("\"here\" is no point"));
+}
+
 // ---- Spline
 
 TEST_F(DrawingCommandsTest, SplineIsDrawnTowardItsControlPoints) {

@@ -176,6 +176,27 @@ TEST(CurveFile, NestingAsDeepAsTheFileIsRefusedAtItsThirdLevel) {
     expectRefused(objects, "line 1: \"points\" is a list");
 }
 
+// ---- The page about curve files
+
+/// What stands between the fences of the page's block that begins with `start`.
+std::string blockOfPage(const std::string& start) {
+    const std::string page =
+        readFile(std::filesystem::path(QUARN_SOURCE_DIR) / "docs/curve-files.md");
+    const std::size_t begin = page.find(start);
+    return begin == page.npos ? "" : page.substr(begin, page.find("```", begin) - begin);
+}
+
+TEST(CurveFile, BothExamplesOfThePageAreTheSameCurve) {
+    const auto text = as<KM_NurbsCurve>(blockOfPage("# past the columns"));
+    const auto json = as<KM_NurbsCurve>(blockOfPage("{\n    \"degree\""));
+    ASSERT_EQ(text.CVCount(), 4);
+    ASSERT_EQ(json.CVCount(), 4);
+    EXPECT_EQ(text.Degree(), 3);
+    EXPECT_EQ(json.Degree(), 3);
+    for (int i = 0; i < 4; ++i)
+        EXPECT_EQ(cv(text, i), cv(json, i)) << i;
+}
+
 // ---- The command
 
 class ImportCurveTest : public HostTest {
