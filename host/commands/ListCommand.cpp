@@ -1,6 +1,7 @@
 #include "host/app/Application.h"
 #include "host/commands/AnimationText.h"
 #include "host/commands/CommandEnd.h"
+#include "host/commands/FollowableText.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/PointText.h"
 #include "host/commands/WordsLeft.h"
@@ -62,7 +63,7 @@ KM_wString sizeText(const KM_BoundingBox& box, UnitSystem units) {
 
 KM_wString lineOf(const DocumentObject& object, bool with_id) {
     const KM_wString id = KM_UuidToString(object.id);
-    KM_wString line = (object.name.IsEmpty() ? id : object.name) + L"  ";
+    KM_wString line = nameOrId(object) + L"  ";
     line += object.curve ? object.curve->TypeName() : object.kind();
     if (object.mesh)
         line += L", " + counted(object.mesh->TriangleCount(), L"triangle", L"triangles");
@@ -107,6 +108,7 @@ KM_wString lineOf(const KM_Light& light, int index) {
 struct ListWish {
     bool ids = false;
     bool objects_only = false;
+    bool curves_only = false;
 };
 
 CQuarnCommand::result askWish(ListWish& wish) {
@@ -115,14 +117,17 @@ CQuarnCommand::result askWish(ListWish& wish) {
     CQuarnGetOption get;
     get.SetCommandPrompt(QnLocalizeString(L"What to list", 42106));
     const int objects = get.AddCommandOption(QnLocalizeCommandOptionName(L"Objects", 42104));
-    get.AddCommandOption(QnLocalizeCommandOptionName(L"Ids", 42105));
+    const int ids = get.AddCommandOption(QnLocalizeCommandOptionName(L"Ids", 42105));
+    const int curves = get.AddCommandOption(QnLocalizeCommandOptionName(L"Curves", 42106));
     const CQuarnGet::result answer = get.GetOption();
     if (answer == CQuarnGet::string)
-        return failForWord(get.String(), "Objects or Ids");
+        return failForWord(get.String(), "Objects, Ids or Curves");
     if (answer != CQuarnGet::option)
         return get.CommandResult();
-    wish.objects_only = get.Option()->m_option_index == objects;
-    wish.ids = !wish.objects_only;
+    const int picked = get.Option()->m_option_index;
+    wish.objects_only = picked == objects;
+    wish.ids = picked == ids;
+    wish.curves_only = picked == curves;
     return CQuarnCommand::success;
 }
 
@@ -153,6 +158,10 @@ CQuarnCommand::result runList(const CQuarnCommandContext& context) {
         return asked;
     Document& document = Document::of(context.Document());
     Application& application = *Application::current();
+    if (wish.curves_only) {
+        application.print(followableText(document).View());
+        return CQuarnCommand::success;
+    }
     const ObjectCounts counts = listObjects(application, document, wish.ids);
     if (!wish.objects_only)
         listViewsAndLights(application, document);

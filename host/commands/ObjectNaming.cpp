@@ -14,15 +14,14 @@ bool isControl(wchar_t character) {
     return character < 32 || (character >= 127 && character < 160);
 }
 
-/// Six digits, which is what a person reads.
+} // namespace
+
 std::string shortNumber(double number) {
     std::array<char, 32> text{};
     const auto end = std::to_chars(text.data(), text.data() + text.size(), number,
                                    std::chars_format::general, 6);
     return {text.data(), end.ptr};
 }
-
-} // namespace
 
 std::string whyNameRefused(const ObjectTable& objects, const DocumentObject* object,
                            const KM_wString& name) {

@@ -13,6 +13,9 @@ namespace quarn {
 std::string whyNameRefused(const ObjectTable& objects, const DocumentObject* object,
                            const KM_wString& name);
 
+/// Six digits of a number, which is what a person reads.
+std::string shortNumber(double number);
+
 /// What a new object is, to be told: its name, kind, and length or place.
 std::string newObjectText(const DocumentObject& object);
 

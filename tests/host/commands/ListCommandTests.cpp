@@ -56,6 +56,36 @@ TEST_F(ListCommandTest, ShowsIdsWhereThatIsWishedAndForObjectsWithoutAName) {
     EXPECT_THAT(printed(), HasSubstr("\n" + KM_UuidToString(nameless).ToUtf8() + "  point\n"));
 }
 
+TEST_F(ListCommandTest, ShowsWhatACameraCanFollow) {
+    ObjectTable& objects = document().objects();
+    const KM_3dPoint square[] = {{0, 0, 0}, {2, 0, 0}, {2, 2, 0}, {0, 2, 0}, {0, 0, 0}};
+    const KM_UUID nameless = objects.addCurve(L"", std::make_unique<KM_PolylineCurve>(square)).id;
+    const std::string id = KM_UuidToString(nameless).ToUtf8();
+    ASSERT_EQ(run(L"_-List _Curves"), CQuarnCommand::success);
+    EXPECT_EQ(printed(), "Walk  polyline, length 5, open, 2 points\n"
+                         "Mark  point at 9,9,9, hidden\n" +
+                             id + "  polyline, length 8, closed, 4 points\n");
+}
+
+TEST_F(ListCommandTest, LengthsOfCurvesAreInTheUnitsOfTheModel) {
+    for (const wchar_t* name : {L"Roof", L"Walk", L"Mark"})
+        document().objects().remove(document().objects().findByName(name)->id);
+    ImportedModel model;
+    model.units = UnitSystem::meters;
+    document().addModel(model);
+    const KM_3dPoint corners[] = {{0, 0, 0}, {3, 4, 0}};
+    document().objects().addCurve(L"Ramp", std::make_unique<KM_PolylineCurve>(corners));
+    ASSERT_EQ(run(L"_-List _Curves"), CQuarnCommand::success);
+    EXPECT_EQ(printed(), "Ramp  polyline, length 5 metres, open, 2 points\n");
+}
+
+TEST_F(ListCommandTest, SaysWhenACameraCanFollowNothing) {
+    for (const wchar_t* name : {L"Walk", L"Mark"})
+        document().objects().remove(document().objects().findByName(name)->id);
+    ASSERT_EQ(run(L"_-List _Curves"), CQuarnCommand::success);
+    EXPECT_EQ(printed(), "There is no curve and no point.\n");
+}
+
 TEST_F(ListCommandTest, ShowsLightsUnderTheirIndexButNotDeletedOnes) {
     KM_Light light;
     light.SetStyle(static_cast<int>(KM_LightStyle::world_directional));
@@ -88,7 +118,7 @@ TEST_F(ListCommandTest, EndsWithTheAnimationWhereThereIsOne) {
 
 TEST_F(ListCommandTest, AWordThatIsNoOptionIsToldAndNothingIsListed) {
     EXPECT_EQ(run(L"_-List Roof"), CQuarnCommand::failure);
-    EXPECT_EQ(printed(), "\"Roof\" is no option here. Give Objects or Ids.\n");
+    EXPECT_EQ(printed(), "\"Roof\" is no option here. Give Objects, Ids or Curves.\n");
 }
 
 } // namespace
