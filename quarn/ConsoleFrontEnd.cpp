@@ -4,6 +4,7 @@
 #include "quarn/Words.h"
 
 #include <thread>
+#include <utility>
 
 namespace quarn::program {
 
@@ -36,7 +37,14 @@ std::string ConsoleFrontEnd::lastWords() const {
     return open_line.empty() ? m_last_line : open_line;
 }
 
+std::string ConsoleFrontEnd::closingWords() const {
+    const std::string open_line = trimmed(m_open_line);
+    const std::string& before = open_line.empty() ? m_line_before : m_last_line;
+    return before.empty() ? lastWords() : before + " " + lastWords();
+}
+
 void ConsoleFrontEnd::forgetLastWords() {
+    m_line_before.clear();
     m_last_line.clear();
     m_open_line.clear();
 }
@@ -48,7 +56,7 @@ void ConsoleFrontEnd::rememberWords(std::string_view text) {
             continue;
         }
         if (std::string line = trimmed(m_open_line); !line.empty())
-            m_last_line = std::move(line);
+            m_line_before = std::exchange(m_last_line, std::move(line));
         m_open_line.clear();
     }
 }

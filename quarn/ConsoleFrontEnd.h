@@ -30,6 +30,9 @@ public:
     /// The last line that the host printed since forgetLastWords; UTF-8, empty when there is none.
     /// During a recording: since the last picture.
     std::string lastWords() const;
+    /// The last two lines, as one: the host tells why an answer cannot be taken, and then the
+    /// command how it ends.
+    std::string closingWords() const;
     void forgetLastWords();
 
     /// From now on everything that is printed is shown.
@@ -58,7 +61,8 @@ private:
     RecordingPace m_pace;
     RecordingPace::Clock::time_point m_next_progress;
     std::string m_last_line;
-    std::string m_open_line; ///< printed so far without a line break
+    std::string m_line_before; ///< the last one
+    std::string m_open_line;   ///< printed so far without a line break
     bool m_keeps_words = false;
     std::string m_kept_words;
     bool m_is_inside_line = false; ///< the last text shown did not end its line

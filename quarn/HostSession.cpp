@@ -37,7 +37,7 @@ std::optional<Outcome> HostSession::run(const std::string& line) {
     const CQuarnCommand::result result = m_session.runCommand(KM_wString::FromUtf8(line).View());
     if (result == CQuarnCommand::success)
         return std::nullopt;
-    const std::string words = m_front_end.lastWords();
+    const std::string words = m_front_end.closingWords();
     return Outcome::failure(words.empty() ? "this command failed: " + line : words);
 }
 
