@@ -191,7 +191,8 @@ TEST_F(LoaderTest, TheDialogPlugInIsFoundByItsIdInThePlugInFolders) {
     EXPECT_EQ(CQuarnPlugIn::LoadPlugIn(ZelVexUiPlugInId, true, true), 1);
     EXPECT_TRUE(CQuarnPlugIn::PlugInIsLoaded(ZelVexUiPlugInId));
     EXPECT_NE(QnZoetrixVexUiTurnTable(), nullptr);
-    EXPECT_EQ(QnZoetrixVexUiPathAnimation(), nullptr) << "it has no such dialog";
+    EXPECT_NE(QnZoetrixVexUiPathAnimation(), nullptr);
+    EXPECT_EQ(QnZoetrixVexUiDay(), nullptr) << "it has no such dialog";
 }
 
 TEST_F(LoaderTest, ADialogPlugInWithoutDialogsHasNoEntryPoints) {
