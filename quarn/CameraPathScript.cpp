@@ -16,12 +16,13 @@ std::string quotedName(const Followed& followed, const std::string& role) {
     return '"' + objectName(followed, role) + '"';
 }
 
+/// A document may hold what an earlier run made; the new takes its place.
 void addMaking(const Followed& followed, const std::string& role, std::vector<std::string>& lines) {
     const std::string name = quotedName(followed, role);
     if (!followed.curve_file.empty())
-        lines.push_back("_-ImportCurve [Name] " + name + " " + quotedPath(followed.curve_file));
+        lines.push_back("_-ImportCurve [Replace] " + name + " " + quotedPath(followed.curve_file));
     if (followed.point)
-        lines.push_back("_-Point _Name " + name + " " + tripleText(*followed.point));
+        lines.push_back("_-Point _Replace " + name + " " + tripleText(*followed.point));
 }
 
 std::string lens(const CameraPathRequest& request) {

@@ -1,6 +1,8 @@
 #include "host/app/Application.h"
 #include "host/commands/HostCommands.h"
+#include "host/commands/ObjectNaming.h"
 #include "host/commands/PointPrompt.h"
+#include "host/commands/ReplacedObject.h"
 #include "host/commands/WordsLeft.h"
 #include "host/document/Document.h"
 
@@ -89,10 +91,29 @@ CQuarnCommand::result runCircle(const CQuarnCommandContext& context) {
 }
 
 CQuarnCommand::result runPoint(const CQuarnCommandContext& context) {
-    DrawingPrompt prompt(Document::of(context.Document()).objects(),
-                         QnLocalizeString(L"Place of the point", 42309));
-    const PointAnswer place = prompt.ask();
-    return place.kind == PointAnswer::Kind::point ? prompt.add(place.point) : place.result;
+    ObjectTable& objects = Document::of(context.Document()).objects();
+    DrawingPrompt prompt(objects, QnLocalizeString(L"Place of the point", 42309));
+    prompt.points().addOption(QnLocalizeCommandOptionName(L"Replace", 42305));
+    KM_wString replaced;
+    PointAnswer place = prompt.ask();
+    while (place.kind == PointAnswer::Kind::option) {
+        const CQuarnCommand::result asked = askReplacedPoint(objects, replaced);
+        if (asked != CQuarnCommand::success)
+            return asked;
+        place = prompt.ask();
+    }
+    if (place.kind != PointAnswer::Kind::point)
+        return place.result;
+    const DocumentObject* present =
+        replaced.IsEmpty() ? nullptr : objects.findByName(replaced.View());
+    if (present) {
+        objects.movePoint(present->id, place.point);
+        Application::current()->tell(newObjectText(*present));
+        return CQuarnCommand::success;
+    }
+    if (!replaced.IsEmpty())
+        prompt.setName(replaced);
+    return prompt.add(place.point);
 }
 
 } // namespace quarn

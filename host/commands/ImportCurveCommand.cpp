@@ -3,6 +3,7 @@
 #include "host/commands/CommandEnd.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/ObjectNaming.h"
+#include "host/commands/ReplacedObject.h"
 #include "host/document/Document.h"
 #include "host/import/CurveFile.h"
 #include "sdk/qncore/QnGet.h"
@@ -13,7 +14,8 @@ namespace {
 
 struct CurveFileWish {
     std::filesystem::path file;
-    KM_wString name; ///< empty: that of the file
+    KM_wString name;       ///< empty: that of the file
+    bool replaces = false; ///< a curve that has the name already
 };
 
 CQuarnCommand::result askName(const ObjectTable& objects, KM_wString& name) {
@@ -31,9 +33,12 @@ CQuarnCommand::result askFile(const ObjectTable& objects, CurveFileWish& wish) {
     CQuarnGetString get;
     get.SetCommandPrompt(QnLocalizeString(L"Curve file", 42314));
     get.AddCommandOption(QnLocalizeCommandOptionName(L"Name", 42300));
+    const int replace = get.AddCommandOption(QnLocalizeCommandOptionName(L"Replace", 42305));
     CQuarnGet::result answer = get.GetString();
     while (answer == CQuarnGet::option) {
-        const CQuarnCommand::result asked = askName(objects, wish.name);
+        wish.replaces = get.Option()->m_option_index == replace;
+        const CQuarnCommand::result asked =
+            wish.replaces ? askReplacedCurve(objects, wish.name) : askName(objects, wish.name);
         if (asked != CQuarnCommand::success)
             return asked;
         answer = get.GetString();
@@ -49,6 +54,17 @@ KM_wString nameOf(const ObjectTable& objects, const std::filesystem::path& file)
     return is_taken || whyNameRefused(objects, nullptr, name).empty() ? name : L"Curve";
 }
 
+const DocumentObject& put(ObjectTable& objects, const CurveFileWish& wish,
+                          std::unique_ptr<KM_Curve> curve) {
+    const DocumentObject* replaced = wish.replaces ? objects.findByName(wish.name.View()) : nullptr;
+    if (replaced) {
+        objects.replaceCurve(replaced->id, std::move(curve));
+        return *replaced;
+    }
+    const KM_wString name = wish.name.IsEmpty() ? nameOf(objects, wish.file) : wish.name;
+    return objects.addCurve(name, std::move(curve));
+}
+
 } // namespace
 
 CQuarnCommand::result runImportCurve(const CQuarnCommandContext& context) {
@@ -60,8 +76,7 @@ CQuarnCommand::result runImportCurve(const CQuarnCommandContext& context) {
     CurveResult curve = readCurveFile(wish.file);
     if (!curve)
         return fail(curve.message());
-    const KM_wString name = wish.name.IsEmpty() ? nameOf(objects, wish.file) : wish.name;
-    const DocumentObject& object = objects.addCurve(name, std::move(curve.value()));
+    const DocumentObject& object = put(objects, wish, std::move(curve.value()));
     Application::current()->tell(newObjectText(object));
     return CQuarnCommand::success;
 }

@@ -53,6 +53,8 @@ public:
     DrawingPrompt(ObjectTable& objects, const wchar_t* question);
 
     PointPrompt& points() { return m_points; }
+    /// @param name  one that no object has
+    void setName(const KM_wString& name) { m_name = name; }
     /// As PointPrompt::ask; names are taken on the way.
     PointAnswer ask();
 

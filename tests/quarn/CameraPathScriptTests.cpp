@@ -63,7 +63,7 @@ TEST(FlythroughScript, ReadsACurveFileAndEvensItBeforeTheSetUp) {
     EXPECT_THAT(
         lines,
         ElementsAre("_-Import [Up] _Z \"town.obj\"", "_-Hide \"Trees\"", "_-ViewportSize 640 360",
-                    "_-ImportCurve [Name] \"Camera curve\" \"my walk.txt\"",
+                    "_-ImportCurve [Replace] \"Camera curve\" \"my walk.txt\"",
                     "_-EvenSpeed \"Camera curve\"", "_-Camera _Parallel=No _Lens 35.5 _Enter",
                     "_-AnimationName \"Tour\"",
                     "_-SetFlythroughAnimation \"Camera curve\" 8 _png _Clay _Enter _Enter",
@@ -89,13 +89,13 @@ TEST(PathScript, FollowsTwoNamedObjects) {
 
 TEST(PathScript, MakesCurvesAndPointsOfFilesAndPlaces) {
     const auto both = scriptOf(path({"--camera-curve", "a.txt", "--target-curve", "b.json"}));
-    EXPECT_THAT(both, Contains("_-ImportCurve [Name] \"Camera curve\" \"a.txt\""));
-    EXPECT_THAT(both, Contains("_-ImportCurve [Name] \"Target curve\" \"b.json\""));
+    EXPECT_THAT(both, Contains("_-ImportCurve [Replace] \"Camera curve\" \"a.txt\""));
+    EXPECT_THAT(both, Contains("_-ImportCurve [Replace] \"Target curve\" \"b.json\""));
     EXPECT_THAT(both,
                 Contains(StartsWith("_-SetPathAnimation \"Camera curve\" \"Target curve\" ")));
     const auto places = scriptOf(path({"--camera-point", "-2,4.5,1e3", "--target-point", "0,0,1"}));
-    EXPECT_THAT(places, Contains("_-Point _Name \"Camera point\" -2,4.5,1000"));
-    EXPECT_THAT(places, Contains("_-Point _Name \"Target point\" 0,0,1"));
+    EXPECT_THAT(places, Contains("_-Point _Replace \"Camera point\" -2,4.5,1000"));
+    EXPECT_THAT(places, Contains("_-Point _Replace \"Target point\" 0,0,1"));
     EXPECT_THAT(places,
                 Contains(StartsWith("_-SetPathAnimation \"Camera point\" \"Target point\" ")));
 }

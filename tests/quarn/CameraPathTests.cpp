@@ -154,6 +154,23 @@ TEST(CameraPath, FromOnePlaceLooksAlongACurve) {
     EXPECT_EQ(street.picture("again.bmp").width_px, 96);
 }
 
+TEST(CameraPath, OfASavedDocumentIsSetUpAnewWithOtherFiles) {
+    const Street street;
+    writeFile(street / "near.txt", "0 -5 1\n4 -5 1\n");
+    writeFile(street / "far.txt", "0 -9 1\n8 -9 1\n8 -3 1\n");
+    const auto record = [&](const char* model, const char* file, const char* target) {
+        return street.run({"path", model, "--camera-curve", file, "--target-point", target,
+                           "--frames", "2", "--out", "out", "--size", "64x48", "--save", "way"});
+    };
+    ASSERT_EQ(record("street.obj", "near.txt", "2,1,1").exit_code, 0);
+    const Ended again = record("way.quarn", "far.txt", "1,1,3");
+    ASSERT_EQ(again.exit_code, 0) << again.err;
+    const std::string curves = street.run({"curves", "way.quarn"}).out;
+    EXPECT_THAT(curves, HasSubstr("Camera curve  polyline, length 14, open, 3 points\n"));
+    EXPECT_THAT(curves, HasSubstr("Target point  point at 1,1,3\n"));
+    EXPECT_THAT(linesOf(curves), SizeIs(4));
+}
+
 TEST(CameraPath, FollowsNamesWithBlanks) {
     const Street street;
     writeFile(street / "rename.txt", "_-Rename Ring \"The long ring\"\n"

@@ -96,6 +96,20 @@ TEST_F(DrawingCommandsTest, LineRefusesWhatIsNoLine) {
     expectCancel(L"_-Line 0,0,0 _Cancel", "");
 }
 
+TEST_F(DrawingCommandsTest, ReplacedPointKeepsItsIdAndAFreeNameMakesANewPoint) {
+    ASSERT_EQ(run(L"_-Point _Replace Mark 1,2,3"), CQuarnCommand::success);
+    const KM_UUID id = objects().findByName(L"Mark")->id;
+    ASSERT_EQ(run(L"_-Point _Replace mark 4,5,6"), CQuarnCommand::success);
+    EXPECT_EQ(printed(), "Mark: point at 1,2,3.\nMark: point at 4,5,6.\n");
+    EXPECT_EQ(objects().objects().size(), 1U);
+    EXPECT_EQ(*objects().find(id)->point, KM_3dPoint(4, 5, 6));
+}
+
+TEST_F(DrawingCommandsTest, APointReplacesNoCurve) {
+    run(L"_-Line _Name Way 0,0,0 1,0,0");
+    expectFailure(L"_-Point _Replace Way 4,5,6", "Another object is called \"Way\"");
+}
+
 TEST_F(DrawingCommandsTest, APersonIsAskedAgainForABadPoint) {
     for (const wchar_t* answer : {L"here", L"0,0,0", L"0,0,0", L"0,0", L"0,3,0"})
         front_end.addAnswer(answer);
@@ -284,7 +298,7 @@ TEST_F(DrawingCommandsTest, PointStandsAtItsPlace) {
     EXPECT_EQ(*object(L"Point").point, KM_3dPoint(0.1, -2000, 3));
     expectFailure(L"_-Point 1,2,3,4", "is no point");
     expectFailure(L"_-Point \"\"", "is no point");
-    expectCancel(L"_-Point", "needs an answer to \"Place of the point\" (Name)");
+    expectCancel(L"_-Point", "needs an answer to \"Place of the point\" (Name, Replace)");
 }
 
 } // namespace

@@ -228,6 +228,25 @@ TEST_F(ImportCurveTest, AnotherNameCanBeGiven) {
     EXPECT_EQ(objects().objects().size(), 1U);
 }
 
+TEST_F(ImportCurveTest, ReplacedCurveKeepsItsIdAndAFreeNameMakesANewObject) {
+    writeFile(folder / "a.txt", "0 0 0\n3 4 0\n");
+    writeFile(folder / "b.txt", "0 0 0\n6 8 0\n");
+    ASSERT_EQ(import("a.txt", L"[Replace] \"Way in\""), CQuarnCommand::success);
+    const KM_UUID id = objects().findByName(L"Way in")->id;
+    ASSERT_EQ(import("b.txt", L"[Replace] \"way in\""), CQuarnCommand::success);
+    EXPECT_EQ(printed(), "Way in: polyline, length 5.\nWay in: polyline, length 10.\n");
+    ASSERT_EQ(objects().objects().size(), 1U);
+    EXPECT_EQ(objects().find(id)->curve->PointAtEnd(), KM_3dPoint(6, 8, 0));
+}
+
+TEST_F(ImportCurveTest, OnlyCurvesAreReplaced) {
+    writeFile(folder / "a.txt", "0 0 0\n3 4 0\n");
+    objects().addPoint(L"Gate", {1, 2, 3});
+    EXPECT_EQ(import("a.txt", L"[Replace] Gate"), CQuarnCommand::failure);
+    EXPECT_EQ(printed(), "Another object is called \"Gate\"; give a free name.\n");
+    EXPECT_EQ(objects().objects().size(), 1U);
+}
+
 TEST_F(ImportCurveTest, AFileNameThatNoObjectCanHaveIsNotTaken) {
     writeFile(folder / "154FA333-917E-4961-8B52-1FFF3A62DF1B.txt", "0 0 0\n3 4 0\n");
     ASSERT_EQ(import("154FA333-917E-4961-8B52-1FFF3A62DF1B.txt"), CQuarnCommand::success);
@@ -246,7 +265,7 @@ TEST_F(ImportCurveTest, WhatCannotBeReadAddsNothingAndIsToldWithFileAndLine) {
     EXPECT_THAT(printed(), HasSubstr("nowhere.txt': there is no such file."));
     EXPECT_EQ(import("."), CQuarnCommand::failure);
     EXPECT_EQ(run(L"_-ImportCurve"), CQuarnCommand::cancel);
-    EXPECT_THAT(printed(), HasSubstr("needs an answer to \"Curve file\" (Name)"));
+    EXPECT_THAT(printed(), HasSubstr("needs an answer to \"Curve file\" (Name, Replace)"));
     EXPECT_TRUE(objects().empty());
 }
 
