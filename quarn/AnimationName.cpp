@@ -52,7 +52,7 @@ std::string animationNameFor(const std::filesystem::path& model) {
     std::string name = model.stem().native();
     std::replace_if(name.begin(), name.end(), isForbidden, '_');
     cutTo(LONGEST_NAME, name);
-    return name.find_first_not_of(" \t") == std::string::npos ? "Turntable" : name;
+    return name.find_first_not_of(" \t") == std::string::npos ? "Animation" : name;
 }
 
 } // namespace quarn::program
