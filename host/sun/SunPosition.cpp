@@ -1,0 +1,83 @@
+#include "host/sun/SunPosition.h"
+
+#include <erfa.h>
+#include <erfam.h>
+
+namespace quarn {
+namespace {
+
+/// A moment of terrestrial time, in two parts so that no digits are lost.
+struct Moment {
+    double day;
+    double fraction;
+};
+
+/// The place and the motion of the earth, in astronomical units and days.
+struct Earth {
+    double from_sun[2][3];
+    double from_barycentre[2][3];
+
+    explicit Earth(const Moment& moment) {
+        // Its only warning is of years outside 1900 to 2100, where the error grows from some ten
+        // kilometres to a few tens: nothing at the distance of the sun.
+        eraEpv00(moment.day, moment.fraction, from_sun, from_barycentre);
+    }
+};
+
+/// What the sky of the site looks like at the moment: where the observer is and how the local
+/// horizon lies among the stars.
+eraASTROM skyOf(const SunSite& site, const Moment& moment, Earth& earth, double rotation) {
+    // The short series of the nutation is good to 0.001 arc-seconds, and quick.
+    double celestial[3][3];
+    eraPnm00b(moment.day, moment.fraction, celestial);
+    double x = 0;
+    double y = 0;
+    eraBpn2xy(celestial, &x, &y);
+    eraASTROM sky;
+    eraApco(moment.day, moment.fraction, earth.from_barycentre, earth.from_sun[0], x, y,
+            eraS00(moment.day, moment.fraction, x, y), rotation, site.longitude_deg * ERFA_DD2R,
+            site.latitude_deg * ERFA_DD2R, 0, 0, 0, eraSp00(moment.day, moment.fraction), 0, 0,
+            &sky);
+    return sky;
+}
+
+/// The direction in which the light of the sun arrives, among the stars as they stand still.
+void naturalDirection(const Earth& earth, const eraASTROM& sky, double (&direction)[3]) {
+    // The light left the sun some 500 seconds ago. Since then the sun has gone a few kilometres
+    // about the barycentre, on a line as good as straight.
+    const double light_days = sky.em * ERFA_AULT / ERFA_DAYSEC;
+    for (int axis = 0; axis < 3; ++axis) {
+        const double sun_now = earth.from_barycentre[0][axis] - earth.from_sun[0][axis];
+        const double sun_speed = earth.from_barycentre[1][axis] - earth.from_sun[1][axis];
+        direction[axis] = sun_now - light_days * sun_speed - sky.eb[axis];
+    }
+    double distance = 0;
+    eraPn(direction, &distance, direction);
+}
+
+} // namespace
+
+SunPosition sunPosition(const SunSite& site, double ut_day, double ut_fraction, double delay_s) {
+    const Moment moment{ut_day, ut_fraction + delay_s / ERFA_DAYSEC};
+    Earth earth(moment);
+    eraASTROM sky = skyOf(site, moment, earth, eraEra00(ut_day, ut_fraction));
+
+    double natural[3];
+    naturalDirection(earth, sky, natural);
+    double proper[3];
+    eraAb(natural, sky.v, sky.em, sky.bm1, proper);
+    double of_date[3];
+    eraRxp(sky.bpn, proper, of_date);
+    double right_ascension = 0;
+    double declination = 0;
+    eraC2s(of_date, &right_ascension, &declination);
+
+    double azimuth = 0;
+    double zenith_distance = 0;
+    double unused[3];
+    eraAtioq(right_ascension, declination, &sky, &azimuth, &zenith_distance, &unused[0], &unused[1],
+             &unused[2]);
+    return {azimuth * ERFA_DR2D, 90 - zenith_distance * ERFA_DR2D};
+}
+
+} // namespace quarn

@@ -1,0 +1,25 @@
+#pragma once
+
+namespace quarn {
+
+/// Where the sun's centre stands in the sky.
+struct SunPosition {
+    double azimuth_deg;  ///< clockwise from north, 0 up to but not including 360
+    double altitude_deg; ///< above the horizon
+};
+
+/// A place on the ellipsoid of the earth, at sea level.
+struct SunSite {
+    double latitude_deg;  ///< geodetic, north positive, -90 to 90
+    double longitude_deg; ///< east positive
+};
+
+/// Computes the apparent topocentric position of the sun without refraction: light time,
+/// aberration, precession, nutation and parallax are in it.
+///
+/// @param ut_day       Julian day number of the midnight that `ut_fraction` counts from, UT1
+/// @param ut_fraction  days since then; may lie outside 0 to 1
+/// @param delay_s      terrestrial time minus universal time, seconds
+SunPosition sunPosition(const SunSite& site, double ut_day, double ut_fraction, double delay_s);
+
+} // namespace quarn
