@@ -1,12 +1,11 @@
 #include "sdk/zel/QnZelSun.h"
 
+#include "host/app/CalendarDay.h"
 #include "host/sun/EarthRotationDelay.h"
 #include "host/sun/SunPosition.h"
 
-#include <chrono>
 #include <cmath>
 #include <limits>
-#include <optional>
 
 namespace {
 
@@ -18,20 +17,6 @@ constexpr double EPOCH_JULIAN_DAY = 2440587.5;
 /// Also refuses what is not a number.
 bool isWithin(double value, double limit) {
     return std::abs(value) <= limit;
-}
-
-/// The days since 1 January 1970, or nothing for a date that is not in the calendar.
-std::optional<int> dayNumber(int year, int month, int day) {
-    using namespace std::chrono;
-    // The calendar's types wrap numbers that they cannot hold, and so could make them valid.
-    if (year < 1800 || year > 2199 || month < 1 || month > 12 || day < 1 || day > 31)
-        return std::nullopt;
-    const year_month_day date{std::chrono::year(year),
-                              std::chrono::month(static_cast<unsigned>(month)),
-                              std::chrono::day(static_cast<unsigned>(day))};
-    if (!date.ok())
-        return std::nullopt;
-    return static_cast<int>(sys_days(date).time_since_epoch().count());
 }
 
 /// With its fraction; 1 January 2000 is 2000.
@@ -80,13 +65,14 @@ void CQnZelSun::Find() const {
     m_is_found = true;
     m_azimuth_deg = NOT_A_NUMBER;
     m_altitude_deg = NOT_A_NUMBER;
-    const std::optional<int> day = dayNumber(m_year, m_month, m_day);
+    const auto day = quarn::calendarDay(m_year, m_month, m_day);
+    const bool is_year = m_year >= 1800 && m_year <= 2199;
     const bool is_place = isWithin(m_latitude_deg, 90) && isWithin(m_longitude_deg, 360);
     const bool is_time = isWithin(m_zone_hours, 24) && isWithin(m_hours - 12, 12);
-    if (!day || !is_place || !is_time)
+    if (!day || !is_year || !is_place || !is_time)
         return;
 
-    const double julian_day = EPOCH_JULIAN_DAY + *day;
+    const double julian_day = EPOCH_JULIAN_DAY + day->time_since_epoch().count();
     const double fraction = (m_hours - m_zone_hours) / 24;
     const quarn::SunPosition position =
         quarn::sunPosition({m_latitude_deg, m_longitude_deg}, julian_day, fraction,

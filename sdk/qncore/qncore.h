@@ -4,6 +4,7 @@
 
 #include "sdk/qncore/QnApp.h"
 #include "sdk/qncore/QnCommand.h"
+#include "sdk/qncore/QnDateTime.h"
 #include "sdk/qncore/QnDib.h"
 #include "sdk/qncore/QnDirDialog.h"
 #include "sdk/qncore/QnDisplayAttributes.h"
