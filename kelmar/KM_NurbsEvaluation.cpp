@@ -23,8 +23,8 @@ struct Homogeneous {
     double w;
 };
 
-// Exact at s = 0 and for equal numbers. std::lerp is exact at s = 1 too and never leaves the bounds,
-// by comparisons that take several times as long as all the rest.
+// Exact at s = 0 and for equal numbers. std::lerp is exact at s = 1 too and never leaves the
+// bounds, by comparisons that take several times as long as all the rest.
 Homogeneous between(const Homogeneous& a, const Homogeneous& b, double s) {
     return {a.x + s * (b.x - a.x), a.y + s * (b.y - a.y), a.z + s * (b.z - a.z),
             a.w + s * (b.w - a.w)};
