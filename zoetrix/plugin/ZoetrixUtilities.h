@@ -52,4 +52,54 @@ public:
     /// document; valid until the view is closed, which never happens while a command runs.
     static CQuarnView* FindQuarnViewByName(CQuarnDoc& doc, const KM_wString& name,
                                            bool ignore_case);
+
+    // The sun by the day of the year: the formulas of the sheet "General Solar Position
+    // Calculations" (NOAA Global Monitoring Division), whose series are those of J. W. Spencer,
+    // Fourier series representation of the position of the sun, Search 2 (1971), p. 172. They
+    // return radians, have no state and may be called from any thread. Nothing else calls them.
+
+    /// The fraction of the year as an angle.
+    ///
+    /// @param day   of the year, 1 for 1 January; the year has 365 days
+    /// @param hour  0 to 23 make no difference: unlike in the sheet only whole days from noon
+    /// count.
+    ///              Other results rely on it
+    static double Gamma(int day, int hour);
+
+    /// The sun's declination, north positive. The first cosine has the coefficient 0.39912 where
+    /// the sheet has 0.399912, a difference of up to 0.0008; other results rely on it.
+    ///
+    /// @param day, hour  as for Gamma
+    static double Declination(int day, int hour);
+
+    /// The angle from 0 to pi that has this cosine, by way of the arctangent.
+    /// @return not a number for a cosine below -1 or above 1
+    static double Arccos(double x);
+
+    /// The angle that the sun has turned since it stood highest; negative before. Longitude and
+    /// time zone have the signs of an earlier edition of the sheet: positive to the west.
+    ///
+    /// @param day        of the year, as for Gamma
+    /// @param hour, minute, second  what the clock shows. Seconds count in whole minutes, so those
+    ///                              below 60 do not count
+    /// @param longitude  degrees, west positive
+    /// @param timeZone   hours that the clock is behind universal time
+    static double HourAngle(int day, int hour, int minute, int second, double longitude,
+                            double timeZone);
+
+    /// The sun's angle from straight up.
+    ///
+    /// @param latitude  degrees, north positive; the others are as for HourAngle
+    static double Zenith(int day, int hour, int minute, int second, double longitude,
+                         double latitude, double timeZone);
+
+    /// The sun's direction seen from above, counterclockwise from north: pi / 2 is west. (The sheet
+    /// counts clockwise.) Before and after noon are told apart by the clock and not by the hour
+    /// angle, so near noon east and west can be mistaken.
+    ///
+    /// @param latitude  degrees, north positive; the others are as for HourAngle
+    /// @return 0 to 2 pi; not a number, or meaningless, at a pole and where the sun stands straight
+    ///         up or down
+    static double Azimuth(int day, int hour, int minute, int second, double longitude,
+                          double latitude, double timeZone);
 };
