@@ -53,6 +53,20 @@ public:
     static CQuarnView* FindQuarnViewByName(CQuarnDoc& doc, const KM_wString& name,
                                            bool ignore_case);
 
+    /// Where the sun stands, by the host's sun. Local time is that of the whole-hour zone that the
+    /// longitude lies in, counted from Greenwich toward it: longitude / 15 without its fraction.
+    ///
+    /// @param hour, minute      local time, from 0:00 to 24:00
+    /// @param year, month, day  of the Gregorian calendar, 1800 to 2199
+    /// @param northAngle        degrees from the world Y axis to north, clockwise seen from above
+    /// @param latitude          degrees, north positive, -90 to 90
+    /// @param longitude         degrees, east positive, -360 to 360
+    /// @return the tip of the unit vector from the world origin toward the sun, below the XY plane
+    ///         at night; the unset point for a place, date or time out of range or that does not
+    ///         exist (31 April)
+    static KM_3dPoint GetSunPoint(int hour, int minute, int year, int month, int day,
+                                  double northAngle, double latitude, double longitude);
+
     // The sun by the day of the year: the formulas of the sheet "General Solar Position
     // Calculations" (NOAA Global Monitoring Division), whose series are those of J. W. Spencer,
     // Fourier series representation of the position of the sun, Search 2 (1971), p. 172. They
