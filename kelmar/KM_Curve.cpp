@@ -51,14 +51,31 @@ Estimate estimateLength(const KM_Curve& curve, double t0, double t1) {
     return {half * kronrod, half * std::abs(kronrod - gauss)};
 }
 
+// Halves a piece of a curve until the estimates are good enough. A curve whose derivatives are
+// mostly rounding, as with a weight of 1e16 beside others of 1, would be halved a million times for
+// nothing: so the estimates are counted, and the best that there is counts when they are used up.
+class LengthDivision {
+public:
+    explicit LengthDivision(const KM_Curve& curve) : m_curve(curve) {}
+
+    double Length(double t0, double t1, double allowed, int depth) {
+        const Estimate whole = estimateLength(m_curve, t0, t1);
+        --m_estimates_left;
+        // What is no number comes from a curve that cannot be evaluated, and would not get better.
+        if (!(whole.error > allowed) || depth == 0 || m_estimates_left <= 0)
+            return whole.length;
+        const double middle = 0.5 * (t0 + t1);
+        return Length(t0, middle, 0.5 * allowed, depth - 1) +
+               Length(middle, t1, 0.5 * allowed, depth - 1);
+    }
+
+private:
+    const KM_Curve& m_curve;
+    int m_estimates_left = 1000; // a kink takes some forty
+};
+
 double adaptiveLength(const KM_Curve& curve, double t0, double t1, double allowed, int depth) {
-    const Estimate whole = estimateLength(curve, t0, t1);
-    // What is no number comes from a curve that cannot be evaluated, and would not get better.
-    if (!(whole.error > allowed) || depth == 0)
-        return whole.length;
-    const double middle = 0.5 * (t0 + t1);
-    return adaptiveLength(curve, t0, middle, 0.5 * allowed, depth - 1) +
-           adaptiveLength(curve, middle, t1, 0.5 * allowed, depth - 1);
+    return LengthDivision(curve).Length(t0, t1, allowed, depth);
 }
 
 double distanceToChord(const KM_3dPoint& point, const KM_Line& chord) {
