@@ -48,9 +48,8 @@ public:
 
     /// Gives the local date and time as a Gregorian date and hours.
     ///
-    /// @param hours  from 0; 1e-8 more than the stored time, so that a whole hour never reads back
-    /// a
-    ///               hair below it. Like the stored Julian day it is good to some 0.00005 seconds
+    /// @param hours  from 0; 1e-8 more than the stored time, so that a whole hour never reads as a
+    ///               hair less. Like the stored Julian day it is good to some 0.00005 seconds
     void LocalDateTime(int& year, int& month, int& day, double& hours) const;
 
     double LocalJulianDay() const;
