@@ -1,0 +1,44 @@
+#pragma once
+
+#include "sdk/qncore/QnExport.h"
+
+#include <span>
+#include <string_view>
+#include <vector>
+
+namespace quarn {
+
+/// A city of the world, to choose a place for the sun by its name. Names are English where English
+/// has one of its own ("Munich"), else the city's own with its accents ("São Paulo"), in UTF-8.
+struct City {
+    std::string_view name;
+    std::string_view country; ///< in English
+    double latitude_deg;      ///< of the city's middle, north positive, WGS 84, to 0.01 degrees
+    double longitude_deg;     ///< east positive, -180 to 180, to 0.01 degrees
+};
+
+/// All cities that are known by name, some 350 on every inhabited continent: the capitals, large
+/// cities, and places near the ends of the inhabited earth. Sorted by name, as if the accents,
+/// blanks and marks were not there; cities of one name by country. Valid for ever.
+QNCORE_API std::span<const City> cities();
+
+/// Finds a city by its name. Case, accents, blanks, hyphens and other marks make no difference:
+/// "sao paulo" is São Paulo. A local name finds many of them too ("München", "東京"). A country may
+/// follow a comma ("Birmingham, United States", "Birmingham, USA"), and must where several cities
+/// have the name.
+///
+/// @param name  UTF-8
+/// @return valid for ever; null when no city has the name, or several have it: `citiesLike` then
+///         gives the choice
+QNCORE_API const City* findCity(std::string_view name);
+
+/// Cities that somebody may have meant by a name that `findCity` does not take.
+///
+/// First those of exactly this name, then those whose name begins like it, then those whose name
+/// differs from it by a few letters, the nearest first ("Lodnon" gives London).
+///
+/// @param name  UTF-8; what follows a comma is not looked at
+/// @return at most five, valid for ever; none where nothing is like it
+QNCORE_API std::vector<const City*> citiesLike(std::string_view name);
+
+} // namespace quarn
