@@ -26,3 +26,11 @@ QnZoetrixVexUiDialog QnZoetrixVexUiTurnTable() {
 QnZoetrixVexUiDialog QnZoetrixVexUiPathAnimation() {
     return findDialog("QnZoetrixVexUiPathAnimation", "ZelVexUiPathAnimation");
 }
+
+QnZoetrixVexUiDialog QnZoetrixVexUiDay() {
+    return findDialog("QnZoetrixVexUiDay", "ZelVexUiDay");
+}
+
+QnZoetrixVexUiDialog QnZoetrixVexUiSeason() {
+    return findDialog("QnZoetrixVexUiSeason", "ZelVexUiSeason");
+}

@@ -39,7 +39,7 @@ public:
 /// The id of the dialog plug-in, whose file is `ZEL_VexUI.qnp`.
 QNCORE_API extern const KM_UUID ZelVexUiPlugInId;
 
-/// Runs a camera-animation dialog: shows the lists and the record, and changes both as the person
+/// Runs an animation dialog: shows the lists and the record, and changes both as the person
 /// does. @return true when the person confirmed
 using QnZoetrixVexUiDialog = bool (*)(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record);
 
@@ -49,3 +49,11 @@ QNCORE_API QnZoetrixVexUiDialog QnZoetrixVexUiTurnTable();
 
 /// The path dialog, exported as `ZelVexUiPathAnimation`; as above.
 QNCORE_API QnZoetrixVexUiDialog QnZoetrixVexUiPathAnimation();
+
+/// The dialog of sun studies of one day, exported as `ZelVexUiDay`; as above. It edits the record's
+/// place, start and end (date and time) and minutes between frames beside the lists and the name.
+QNCORE_API QnZoetrixVexUiDialog QnZoetrixVexUiDay();
+
+/// The dialog of seasonal sun studies, exported as `ZelVexUiSeason`; as above. It edits days
+/// between frames instead of minutes.
+QNCORE_API QnZoetrixVexUiDialog QnZoetrixVexUiSeason();

@@ -192,6 +192,8 @@ TEST_F(LoaderTest, TheDialogPlugInIsFoundByItsIdInThePlugInFolders) {
     EXPECT_TRUE(CQuarnPlugIn::PlugInIsLoaded(ZelVexUiPlugInId));
     EXPECT_NE(QnZoetrixVexUiTurnTable(), nullptr);
     EXPECT_NE(QnZoetrixVexUiPathAnimation(), nullptr);
+    EXPECT_NE(QnZoetrixVexUiDay(), nullptr);
+    EXPECT_NE(QnZoetrixVexUiSeason(), nullptr);
 }
 
 TEST_F(LoaderTest, ADialogPlugInWithoutDialogsHasNoEntryPoints) {
@@ -199,6 +201,8 @@ TEST_F(LoaderTest, ADialogPlugInWithoutDialogsHasNoEntryPoints) {
     EXPECT_EQ(CQuarnPlugIn::LoadPlugIn(ZelVexUiPlugInId, true, true), 0);
     EXPECT_EQ(QnZoetrixVexUiTurnTable(), nullptr);
     EXPECT_EQ(QnZoetrixVexUiPathAnimation(), nullptr);
+    EXPECT_EQ(QnZoetrixVexUiDay(), nullptr);
+    EXPECT_EQ(QnZoetrixVexUiSeason(), nullptr);
 }
 
 TEST_F(LoaderTest, AMissingDialogPlugInIsToldUnlessQuiet) {

@@ -31,10 +31,19 @@ void enterIntoDialog(const Entered& entered) {
     setWish("DIRECTION", entered.direction);
     setWish("FRAMES", entered.frames);
     setWish("NAME", entered.name);
+    setWish("PLACE", entered.place);
+    setWish("START", entered.start);
+    setWish("END", entered.end);
+    setWish("MINUTES", entered.minutes);
+    setWish("DAYS", entered.days);
 }
 
 std::string shownInDialog() {
     return told("QUARN_DIALOG_SHOWN");
+}
+
+std::string sunShownInDialog() {
+    return told("QUARN_DIALOG_SUN");
 }
 
 std::string shownDialog() {
@@ -44,4 +53,5 @@ std::string shownDialog() {
 void forgetDialog() {
     unsetenv("QUARN_DIALOG_KIND");
     unsetenv("QUARN_DIALOG_SHOWN");
+    unsetenv("QUARN_DIALOG_SUN");
 }

@@ -12,6 +12,13 @@ struct Entered {
     std::optional<int> direction = std::nullopt;
     std::optional<int> frames = 12;
     std::optional<std::string> name = "Walk";
+    /// In the dialogs of sun studies: latitude, longitude and north angle, with blanks between.
+    std::optional<std::string> place = std::nullopt;
+    /// Year, month, day, hour, minute and second, with blanks between.
+    std::optional<std::string> start = std::nullopt;
+    std::optional<std::string> end = std::nullopt;
+    std::optional<int> minutes = std::nullopt;
+    std::optional<int> days = std::nullopt;
     bool confirmed = true;
 };
 
@@ -21,6 +28,10 @@ void enterIntoDialog(const Entered& entered);
 /// What the last dialog showed when it opened, in the words of the test's dialog plug-in.
 std::string shownInDialog();
 
-/// Which dialog was the last: "turntable" or "path"; empty for none since forgetDialog.
+/// What the last dialog of a sun study showed besides.
+std::string sunShownInDialog();
+
+/// Which dialog was the last: "turntable", "path", "day" or "season"; empty for none since
+/// forgetDialog.
 std::string shownDialog();
 void forgetDialog();

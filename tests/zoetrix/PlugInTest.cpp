@@ -110,15 +110,6 @@ TEST_F(PlugIn, OnlyRecordingRunsScripts) {
     EXPECT_TRUE((std::is_base_of_v<CQuarnScriptCommand, CCommandRecordAnimation>));
 }
 
-TEST_F(PlugIn, CommandsOfLaterVersionsSayThatTheyDoNothing) {
-    for (const wchar_t* name : {L"SetOneDaySunAnimation", L"SetSeasonalSunAnimation"}) {
-        front_end.clearPrinted();
-        EXPECT_EQ(CQuarnCommand::failure, run(name));
-        EXPECT_THAT(printed(), HasSubstr(std::wstring(name) + L" is not available in this "
-                                                              L"version. Nothing done\n"));
-    }
-}
-
 TEST_F(PlugIn, RegistersItsDynamicAccessWhileLoaded) {
     const IQnZoetrixDynamicAccess* access = Zoetrix_QuarnDynamicAccess();
     ASSERT_TRUE(access);

@@ -1,19 +1,12 @@
 #pragma once
 
 #include "kelmar/KM_AnimationProperties.h"
-#include "sdk/vexui/VexUi.h"
+#include "zoetrix/commands/DialogChoices.h"
 #include "zoetrix/ui/ZoetrixDataUI.h"
-
-/// Which renderer "RenderPreview" stands for when it is chosen in a dialog.
-enum class PreviewRenders {
-    preview,
-    full, ///< as "RenderFull" does; stored animations of paths rely on it
-};
 
 /// A camera dialog of the dialog plug-in.
 struct CameraDialog {
-    /// Finds its entry point, once the plug-in is loaded.
-    QnZoetrixVexUiDialog (*find)();
+    FindDialog find;
     PreviewRenders preview_renders;
 };
 

@@ -2,8 +2,11 @@
 
 #include "sdk/qncore/QnCommand.h"
 
-/// Sets up an animation in which the sun moves through one day. This version of the plug-in cannot
-/// do it yet: the command says so and fails.
+/// Sets up an animation in which the sun moves through one day: a frame for every so many minutes
+/// from one time of day to another, both included, also at night. Place, date and times are asked
+/// for in a dialog when a person started the command, else at the command line, where the answers
+/// of the last sun study are offered; a run that does not succeed leaves the document's record as
+/// it was. A day that its month does not have makes an animation without frames.
 class CCommandOneDaySun : public CQuarnCommand {
 public:
     CCommandOneDaySun();

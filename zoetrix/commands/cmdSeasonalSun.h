@@ -2,8 +2,9 @@
 
 #include "sdk/qncore/QnCommand.h"
 
-/// Sets up an animation in which the sun moves through a season. This version of the plug-in cannot
-/// do it yet: the command says so and fails.
+/// Sets up an animation of the sun at one time of day through a season: a frame for every so many
+/// days from one date to another, both included. The longitude is asked for from 0 to 360 degrees.
+/// All else is as with the study of one day.
 class CCommandSeasonalSun : public CQuarnCommand {
 public:
     CCommandSeasonalSun();

@@ -162,6 +162,8 @@ TEST_F(ThreadRule, HoldsForTheApplicationAndItsQuestions) {
          [&] { EXPECT_LT(CQuarnPlugIn::LoadPlugIn(nobody, true, true), 0); }},
         {"QnZoetrixVexUiTurnTable", [] { EXPECT_EQ(QnZoetrixVexUiTurnTable(), nullptr); }},
         {"QnZoetrixVexUiPathAnimation", [] { EXPECT_EQ(QnZoetrixVexUiPathAnimation(), nullptr); }},
+        {"QnZoetrixVexUiDay", [] { EXPECT_EQ(QnZoetrixVexUiDay(), nullptr); }},
+        {"QnZoetrixVexUiSeason", [] { EXPECT_EQ(QnZoetrixVexUiSeason(), nullptr); }},
         {"CQuarnGetOption::GetOption",
          [] { EXPECT_EQ(CQuarnGetOption().GetOption(), CQuarnGet::no_result); }},
         {"CQuarnGetString::GetString",

@@ -1,7 +1,9 @@
 #include "sdk/vexui/VexUi.h"
 #include "tests/plug-ins/TestPlugIn.h"
 
+#include <array>
 #include <optional>
+#include <sstream>
 
 // Stands in for the dialog plug-in. The test says in the environment what the person does, and
 // reads there what the person was shown:
@@ -10,9 +12,16 @@
 //   QUARN_DIALOG_NAME       the animation name to enter (UTF-8)
 //   QUARN_DIALOG_FILE_TYPE, QUARN_DIALOG_CAPTURE, QUARN_DIALOG_VIEWPORT, QUARN_DIALOG_DIRECTION
 //                           the index to choose
-// What is not set stays as it was shown. Afterwards QUARN_DIALOG_KIND holds "turntable" or "path",
-// and QUARN_DIALOG_SHOWN
+//   QUARN_DIALOG_PLACE      latitude, longitude and north angle to enter
+//   QUARN_DIALOG_START, QUARN_DIALOG_END
+//                           year, month, day, hour, minute and second to enter
+//   QUARN_DIALOG_MINUTES, QUARN_DIALOG_DAYS
+//                           what to enter as the time between frames
+// What is not set stays as it was shown. Afterwards QUARN_DIALOG_KIND holds "turntable", "path",
+// "day" or "season", and QUARN_DIALOG_SHOWN
 //   frames=<n>;name=<name>;files=<a,b>@<selected>;captures=...;viewports=...;directions=...
+// and, for the two of the sun, QUARN_DIALOG_SUN
+//   place=<latitude,longitude,north>;start=<y-m-d h:m:s>;end=...;minutes=<n>;days=<n>
 
 namespace {
 
@@ -48,12 +57,65 @@ void TellShown(const IZoetrixDataUI& lists, const KM_3dmAnimationProperties& rec
     setenv("QUARN_DIALOG_SHOWN", shown.c_str(), 1);
 }
 
+void TellSunShown(const KM_3dmAnimationProperties& record) {
+    std::ostringstream shown;
+    shown << "place=" << record.Latitude() << "," << record.Longitude() << ","
+          << record.NorthAngle() << ";start=" << record.StartYear() << "-" << record.StartMonth()
+          << "-" << record.StartDay() << " " << record.StartHour() << ":" << record.StartMinutes()
+          << ":" << record.StartSeconds() << ";end=" << record.EndYear() << "-" << record.EndMonth()
+          << "-" << record.EndDay() << " " << record.EndHour() << ":" << record.EndMinutes() << ":"
+          << record.EndSeconds() << ";minutes=" << record.MinutesBetweenFrames()
+          << ";days=" << record.DaysBetweenFrames();
+    setenv("QUARN_DIALOG_SUN", shown.str().c_str(), 1);
+}
+
+/// The numbers of a wish, which stand there with blanks between them.
+template <class Number, std::size_t count>
+std::optional<std::array<Number, count>> WishedNumbers(const std::string& name) {
+    const std::optional<std::string> text = Wish(name);
+    if (!text)
+        return std::nullopt;
+    std::array<Number, count> numbers = {};
+    std::istringstream words(*text);
+    for (Number& number : numbers)
+        words >> number;
+    return numbers;
+}
+
+void EnterSun(KM_3dmAnimationProperties& record) {
+    if (const auto place = WishedNumbers<double, 3>("PLACE")) {
+        record.SetLatitude((*place)[0]);
+        record.SetLongitude((*place)[1]);
+        record.SetNorthAngle((*place)[2]);
+    }
+    if (const auto start = WishedNumbers<int, 6>("START")) {
+        record.SetStartYear((*start)[0]);
+        record.SetStartMonth((*start)[1]);
+        record.SetStartDay((*start)[2]);
+        record.SetStartHour((*start)[3]);
+        record.SetStartMinutes((*start)[4]);
+        record.SetStartSeconds((*start)[5]);
+    }
+    if (const auto end = WishedNumbers<int, 6>("END")) {
+        record.SetEndYear((*end)[0]);
+        record.SetEndMonth((*end)[1]);
+        record.SetEndDay((*end)[2]);
+        record.SetEndHour((*end)[3]);
+        record.SetEndMinutes((*end)[4]);
+        record.SetEndSeconds((*end)[5]);
+    }
+    if (const auto minutes = Wish("MINUTES"))
+        record.SetMinutesBetweenFrames(std::atoi(minutes->c_str()));
+    if (const auto days = Wish("DAYS"))
+        record.SetDaysBetweenFrames(std::atoi(days->c_str()));
+}
+
 void EnterIntoRecord(KM_3dmAnimationProperties& record) {
     if (const auto frames = Wish("FRAMES"))
         record.SetFrameCount(std::atoi(frames->c_str()));
     if (const auto name = Wish("NAME"))
         record.SetHtmlFilename(KM_wString::FromUtf8(*name));
-    // A command that takes more of the edited record than these two finds nonsense there.
+    // A command that takes more of the edited record than its dialog shows finds nonsense there.
     record.SetFileExtension(L"gif");
     record.SetViewportName(L"Nowhere");
     record.SetCaptureMethod(L"Nothing");
@@ -79,6 +141,12 @@ bool RunDialog(const char* kind, IZoetrixDataUI& lists, KM_3dmAnimationPropertie
     return Wish("CONFIRM") == "1";
 }
 
+bool RunSunDialog(const char* kind, IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) {
+    TellSunShown(record);
+    EnterSun(record);
+    return RunDialog(kind, lists, record);
+}
+
 } // namespace
 
 QN_PLUGIN_ENTRY bool ZelVexUiTurnTable(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) {
@@ -88,6 +156,14 @@ QN_PLUGIN_ENTRY bool ZelVexUiTurnTable(IZoetrixDataUI& lists, KM_3dmAnimationPro
 QN_PLUGIN_ENTRY bool ZelVexUiPathAnimation(IZoetrixDataUI& lists,
                                            KM_3dmAnimationProperties& record) {
     return RunDialog("path", lists, record);
+}
+
+QN_PLUGIN_ENTRY bool ZelVexUiDay(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) {
+    return RunSunDialog("day", lists, record);
+}
+
+QN_PLUGIN_ENTRY bool ZelVexUiSeason(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) {
+    return RunSunDialog("season", lists, record);
 }
 
 TEST_PLUGIN_EXPORTS
