@@ -67,6 +67,8 @@ constexpr HostCommandEntry HOST_COMMANDS[] = {
     {L"StandardView", "5D6D6290-083C-42A4-BE01-B8AF4BFF8EB8",
      L"Turns the active view to Top, Front, Right, Perspective or a camera of the model", 41013,
      runStandardView},
+    {L"Sun", "8F2D6E0B-35C1-4A97-B0D8-E41C7A95F362",
+     L"Turns the sun on or off, or sets where it stands", 41050, runSun},
     {L"ViewportSize", "CA2AFA6F-6197-4144-A9F6-B47A393E4D08",
      L"Sets the size of the active view in pixels", 41014, runViewportSize},
 };

@@ -53,6 +53,7 @@ CQuarnCommand::result runShow(const CQuarnCommandContext& context);
 CQuarnCommand::result runSpline(const CQuarnCommandContext& context);
 CQuarnCommand::result runSplineThrough(const CQuarnCommandContext& context);
 CQuarnCommand::result runStandardView(const CQuarnCommandContext& context);
+CQuarnCommand::result runSun(const CQuarnCommandContext& context);
 CQuarnCommand::result runViewportSize(const CQuarnCommandContext& context);
 
 } // namespace quarn
