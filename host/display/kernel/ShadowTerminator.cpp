@@ -7,7 +7,8 @@
 
 namespace quarn {
 
-void liftToSmoothSurface(const RaySurface& surface, const RTCHit16& hit, int lane, RTCRay16& ray) {
+void liftToSmoothSurface(const RaySurface& surface, const RTCHit16& hit, int lane,
+                         const float (&face)[3], RTCRay16& ray) {
     if (!surface.corner_normals)
         return;
     const std::size_t triangle = hit.primID[lane];
@@ -25,9 +26,10 @@ void liftToSmoothSurface(const RaySurface& surface, const RTCHit16& hit, int lan
         float n[3];
         unpackNormal(surface.corner_normals[3 * triangle + corner], n);
         const float square = n[0] * n[0] + n[1] * n[1] + n[2] * n[2];
+        const float turn = n[0] * face[0] + n[1] * face[1] + n[2] * face[2] < 0.0F ? -1.0F : 1.0F;
         const float height =
-            (place[0] - at.x) * n[0] + (place[1] - at.y) * n[1] + (place[2] - at.z) * n[2];
-        const float lift = -weight[corner] * std::min(0.0F, height) / square;
+            turn * ((place[0] - at.x) * n[0] + (place[1] - at.y) * n[1] + (place[2] - at.z) * n[2]);
+        const float lift = -turn * weight[corner] * std::min(0.0F, height) / square;
         ray.org_x[lane] += lift * n[0];
         ray.org_y[lane] += lift * n[1];
         ray.org_z[lane] += lift * n[2];

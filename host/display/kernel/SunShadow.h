@@ -37,9 +37,15 @@ inline void liftTurnedAway(const FrameSetup& frame, const RayPacket& packet,
                            const SurfaceLanes& surfaces, unsigned turned_away, RTCRay16& ray) {
     alignas(64) std::uint32_t surface[lane_count];
     store(surface, surfaces.surface);
-    for (int i = 0; i < lane_count; ++i)
-        if (turned_away >> i & 1U)
-            liftToSmoothSurface(frame.surfaces[surface[i]], packet.rays.hit, i, ray);
+    alignas(64) float faces[3][lane_count];
+    store(faces[0], surfaces.face.x);
+    store(faces[1], surfaces.face.y);
+    store(faces[2], surfaces.face.z);
+    for (; turned_away != 0; turned_away &= turned_away - 1) {
+        const int i = __builtin_ctz(turned_away);
+        const float face[3] = {faces[0][i], faces[1][i], faces[2][i]};
+        liftToSmoothSurface(frame.surfaces[surface[i]], packet.rays.hit, i, face, ray);
+    }
 }
 
 /// Looks from the lit lanes toward the sun.
