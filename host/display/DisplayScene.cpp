@@ -3,6 +3,8 @@
 #include "host/display/ColorSpace.h"
 #include "host/display/MipTexture.h"
 
+#include <utility>
+
 namespace quarn {
 
 namespace {
@@ -16,6 +18,15 @@ KM_BoundingBox boxOf(const KM_3dPointArray& points) {
     return box;
 }
 
+/// @return true when an object was shown or hidden
+template <class Object>
+bool takeVisibility(const std::vector<Object>& from, std::vector<Object>& to) {
+    bool changed = false;
+    for (std::size_t i = 0; i < to.size(); ++i)
+        changed |= std::exchange(to[i].visible, from[i].visible) != from[i].visible;
+    return changed;
+}
+
 } // namespace
 
 DisplayScene::DisplayScene() = default;
@@ -27,7 +38,6 @@ Result<void> DisplayScene::update(const SceneContent& content) {
     else
         rebuild(content);
     m_lights = content.lights;
-    updateBoxes();
     const std::string error = m_rays.takeError();
     if (error.empty())
         return {};
@@ -73,6 +83,7 @@ void DisplayScene::rebuild(const SceneContent& content) {
     m_points = content.points;
     m_revision = content.revision;
     m_built = true;
+    updateBoxes();
 }
 
 RaySurface DisplayScene::surfaceOf(const SceneMesh& object, const RayMesh& mesh,
@@ -111,21 +122,21 @@ const MipTexture* DisplayScene::textureOf(const Material& material, TextureCache
 }
 
 void DisplayScene::updateVisibility(const SceneContent& content) {
-    bool changed = false;
+    bool rays_changed = false;
     for (std::size_t i = 0; i < m_meshes.size(); ++i) {
         if (m_meshes[i].visible == content.meshes[i].visible)
             continue;
         m_meshes[i].visible = content.meshes[i].visible;
         if (m_member_of_mesh[i] != no_member)
             m_rays.setVisible(m_member_of_mesh[i], m_meshes[i].visible);
-        changed = true;
+        rays_changed = true;
     }
-    if (changed)
+    if (rays_changed)
         m_rays.commit();
-    for (std::size_t i = 0; i < m_curves.size(); ++i)
-        m_curves[i].visible = content.curves[i].visible;
-    for (std::size_t i = 0; i < m_points.size(); ++i)
-        m_points[i].visible = content.points[i].visible;
+    const bool curves_changed = takeVisibility(content.curves, m_curves);
+    const bool points_changed = takeVisibility(content.points, m_points);
+    if (rays_changed || curves_changed || points_changed)
+        updateBoxes();
 }
 
 void DisplayScene::updateBoxes() {

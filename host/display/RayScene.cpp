@@ -229,6 +229,7 @@ void RayScene::commit() {
         const bool wanted = instance.visible_members > 0;
         if (instance.group->changed && wanted) {
             rtcCommitScene(instance.group->scene.get());
+            ++m_build_count;
             rtcCommitGeometry(instance.geometry.get());
             instance.group->changed = false;
         }
@@ -253,6 +254,7 @@ void RayScene::chooseRoot() {
             m_first_surfaces[static_cast<std::size_t>(sole - m_instances.begin())];
     } else if (count > 1) {
         rtcCommitScene(m_top.get());
+        ++m_build_count;
         m_root = m_top.get();
     }
 }

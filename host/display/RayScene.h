@@ -41,6 +41,9 @@ public:
     /// In the order of surface indices, which is not that of the members.
     std::span<const RaySurface> surfaces() const { return m_surfaces; }
 
+    /// How often a search structure, of a group or of all, was built.
+    std::size_t buildCount() const { return m_build_count; }
+
     /// What the library complained of since the last call; empty when it did not.
     std::string takeError();
 
@@ -82,6 +85,7 @@ private:
     std::vector<Instance> m_instances;
     std::vector<std::uint32_t> m_first_surfaces;
     std::vector<RaySurface> m_surfaces;
+    std::size_t m_build_count = 0;
 };
 
 } // namespace quarn

@@ -24,6 +24,9 @@ public:
     Result<void> draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode, int width_px,
                       int height_px, Image& picture);
 
+    /// What the last update left.
+    const DisplayScene& display() const { return m_display; }
+
 private:
     void takeObjects(const ObjectTable& objects);
     void takeVisibility(const ObjectTable& objects, std::span<const KM_UUID> hidden);
