@@ -62,10 +62,13 @@ void setLighting(FrameSetup& frame, const Lighting& lighting) {
     frame.fixed_count = setLights(lighting.fixed, frame.fixed);
     frame.sun_count = setLights(lighting.suns, frame.suns);
     set(frame.sky_horizon, lighting.sky.horizon);
+    set(frame.sky_side, lighting.sky.side);
     set(frame.sky_zenith, lighting.sky.zenith);
     set(frame.sky_nadir, lighting.sky.nadir);
     set(frame.sky_glow, lighting.sky.glow);
-    set(frame.sky_disc, lighting.sky.disc);
+    // In a parallel view all rays look the same way: the disc would fill the picture.
+    if (!frame.rays.parallel)
+        set(frame.sky_disc, lighting.sky.disc);
     std::copy_n(lighting.sky.toward_sun, 3, frame.toward_sun);
 }
 
@@ -82,8 +85,8 @@ void setGround(FrameSetup& frame) {
     frame.ground_height = frame.scene_min[2] - 1e-5F * frame.scene_size;
     frame.ground_center[0] = 0.5F * (frame.scene_min[0] + frame.scene_max[0]);
     frame.ground_center[1] = 0.5F * (frame.scene_min[1] + frame.scene_max[1]);
-    frame.ground_fade_start = 0.5F * reach;
-    frame.ground_fade_end = 5.0F * reach;
+    frame.ground_fade_start = 1.5F * reach; // far enough for the long shadows of a low sun
+    frame.ground_fade_end = 12.0F * reach;
     // Far ground lies in the haze of the horizon, so that both meet without a line.
     std::copy_n(frame.sky_horizon, 3, frame.sky_nadir);
     set(frame.ground_albedo, {0.46F, 0.45F, 0.425F});

@@ -73,19 +73,32 @@ Sky daySky() {
     return sky;
 }
 
+/// Around sunrise and sunset: warm where the sun stands, bluish across from it.
 Sky duskSky() {
     Sky sky;
-    sky.horizon = {0.72F, 0.46F, 0.34F};
-    sky.zenith = {0.10F, 0.17F, 0.36F};
+    sky.horizon = {0.62F, 0.45F, 0.40F};
+    sky.side = {0.28F, 0.10F, -0.06F};
+    sky.zenith = {0.12F, 0.20F, 0.40F};
     sky.nadir = {0.22F, 0.19F, 0.18F};
     sky.glow = {0.75F, 0.34F, 0.10F};
     sky.disc = {3.0F, 1.8F, 0.8F};
     return sky;
 }
 
+/// When the sun stands some six degrees below the horizon: blue, with a last band of warm light.
+Sky twilightSky() {
+    Sky sky;
+    sky.horizon = {0.25F, 0.25F, 0.335F};
+    sky.side = {0.20F, 0.08F, -0.02F};
+    sky.zenith = {0.045F, 0.075F, 0.185F};
+    sky.nadir = {0.085F, 0.085F, 0.105F};
+    sky.glow = {0.30F, 0.13F, 0.03F};
+    return sky;
+}
+
 Sky nightSky() {
     Sky sky;
-    sky.horizon = {0.070F, 0.095F, 0.165F};
+    sky.horizon = {0.050F, 0.070F, 0.125F};
     sky.zenith = {0.010F, 0.016F, 0.045F};
     sky.nadir = {0.020F, 0.024F, 0.035F};
     return sky;
@@ -94,6 +107,7 @@ Sky nightSky() {
 Sky blended(const Sky& a, const Sky& b, float t) {
     Sky sky;
     sky.horizon = mix(a.horizon, b.horizon, t);
+    sky.side = mix(a.side, b.side, t);
     sky.zenith = mix(a.zenith, b.zenith, t);
     sky.nadir = mix(a.nadir, b.nadir, t);
     sky.glow = mix(a.glow, b.glow, t);
@@ -101,27 +115,45 @@ Sky blended(const Sky& a, const Sky& b, float t) {
     return sky;
 }
 
-/// How much of day, dusk and night there is. `height` is the sine of the sun's altitude.
+/// A value at each time of the day.
+template <class T> struct Times {
+    T day;
+    T dusk;
+    T twilight;
+    T night;
+};
+
+/// How much of day, dusk, twilight and night there is. `height` is the sine of the sun's altitude.
 struct TimeOfDay {
     float day;
+    float twilight;
     float night;
     explicit TimeOfDay(float height)
-        : day(smoothStep(0.02F, 0.36F, height)), night(1.0F - smoothStep(-0.16F, 0.02F, height)) {}
+        : day(smoothStep(0.02F, 0.36F, height)), twilight(1.0F - smoothStep(-0.11F, 0.03F, height)),
+          night(1.0F - smoothStep(-0.26F, -0.08F, height)) {}
 
-    LinearColor among(const LinearColor& d, const LinearColor& dusk, const LinearColor& n) const {
-        return mix(mix(dusk, d, day), n, night);
+    LinearColor among(const Times<LinearColor>& at) const {
+        return mix(mix(mix(at.dusk, at.day, day), at.twilight, twilight), at.night, night);
     }
-    Sky sky() const { return blended(blended(duskSky(), daySky(), day), nightSky(), night); }
+    Sky sky() const {
+        const Sky above_horizon = blended(duskSky(), daySky(), day);
+        return blended(blended(above_horizon, twilightSky(), twilight), nightSky(), night);
+    }
 };
 
 AmbientLight skyLight(const TimeOfDay& time, const float* toward_sun) {
-    const LinearColor above =
-        time.among({0.36F, 0.43F, 0.54F}, {0.31F, 0.32F, 0.41F}, {0.082F, 0.102F, 0.160F});
-    const LinearColor below =
-        time.among({0.19F, 0.175F, 0.155F}, {0.15F, 0.13F, 0.12F}, {0.028F, 0.033F, 0.052F});
+    const LinearColor above = time.among({{0.36F, 0.43F, 0.54F},
+                                          {0.31F, 0.32F, 0.41F},
+                                          {0.170F, 0.185F, 0.265F},
+                                          {0.072F, 0.090F, 0.142F}});
+    const LinearColor below = time.among({{0.19F, 0.175F, 0.155F},
+                                          {0.15F, 0.13F, 0.12F},
+                                          {0.075F, 0.070F, 0.080F},
+                                          {0.028F, 0.033F, 0.052F}});
+    const LinearColor sunward =
+        time.among({{0.05F, 0.05F, 0.045F}, {0.10F, 0.06F, 0.03F}, {0.045F, 0.025F, 0.010F}, {}});
     AmbientLight light = hemisphere(above, below, world_up);
-    brightenToward(light, toward_sun,
-                   time.among({0.05F, 0.05F, 0.045F}, {0.10F, 0.06F, 0.03F}, {0, 0, 0}));
+    brightenToward(light, toward_sun, sunward);
     return light;
 }
 
@@ -193,8 +225,10 @@ Lighting skyLighting(std::span<const KM_Light> lights, bool casts_shadows,
     lighting.sky = time.sky();
     std::copy_n(toward, 3, lighting.sky.toward_sun);
     lighting.ambient = skyLight(time, toward);
-    lighting.fixed.push_back(headLight(
-        camera, time.among({0.04F, 0.04F, 0.04F}, {0.06F, 0.06F, 0.06F}, {0.07F, 0.082F, 0.11F})));
+    lighting.fixed.push_back(headLight(camera, time.among({{0.04F, 0.04F, 0.04F},
+                                                           {0.06F, 0.06F, 0.06F},
+                                                           {0.085F, 0.088F, 0.100F},
+                                                           {0.105F, 0.118F, 0.150F}})));
     std::copy_if(suns.begin(), suns.end(), std::back_inserter(lighting.suns), isLit);
     return lighting;
 }

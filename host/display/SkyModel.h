@@ -25,7 +25,8 @@ struct AmbientLight {
 
 /// The sky's colours in scene light.
 struct Sky {
-    LinearColor horizon;
+    LinearColor horizon; ///< sideways of the sun
+    LinearColor side;    ///< added to the horizon below the sun and taken away opposite
     LinearColor zenith;
     LinearColor nadir; ///< straight down, where no ground is seen
     LinearColor glow;  ///< added around the sun

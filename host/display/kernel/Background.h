@@ -27,7 +27,8 @@ inline LaneColors gradientColors(const FrameSetup& frame, const Lanes& y) {
 }
 
 /// Zenith and horizon blend with the fourth power of what is missing to straight up, so that the
-/// sky is pale over a narrow band; around the sun there is a glow, and its disc. In a parallel view
+/// sky is pale over a narrow band, which is of another colour below the sun than across from it.
+/// Around the sun there is a glow, and its disc, which sets behind the horizon. In a parallel view
 /// all rays look the same way; there the place in the picture adds to their elevation.
 inline LaneColors skyColors(const FrameSetup& frame, const RayPacket& packet) {
     const Lanes scale = Lanes(1.0F) / squareRoot(dot(packet.direction, packet.direction));
@@ -40,11 +41,16 @@ inline LaneColors skyColors(const FrameSetup& frame, const RayPacket& packet) {
     const Lanes near_sun = power8(clamped(toward));
     const Lanes above = Lanes(1.0F) - down;
     const Lanes glow = (near_sun * 0.35F + power8(near_sun) * 0.65F) * above;
-    // The disc is drawn a little larger than the sun's half degree, with a soft border.
-    const Lanes disc = clamped((toward - 0.99984F) * (1.0F / 0.00006F)) * above;
+    // The disc is drawn with a soft border from 0.6 to 0.4 degrees from the sun's middle, a little
+    // larger than it is: cameras see it so.
+    const Lanes risen = clamped(elevation * 1000.0F);
+    const Lanes disc = clamped((toward - 0.999945F) * (1.0F / 0.000031F)) * risen;
+    const LaneVectors& d = packet.direction;
+    const Lanes sunward = d.x * frame.toward_sun[0] + d.y * frame.toward_sun[1];
+    const Lanes side = sunward * scale * (Lanes(1.0F) - up);
     const auto blend = [&](int c) {
         const float horizon = frame.sky_horizon[c];
-        return Lanes(horizon) + up * (frame.sky_zenith[c] - horizon) +
+        return Lanes(horizon) + up * (frame.sky_zenith[c] - horizon) + side * frame.sky_side[c] +
                down * (frame.sky_nadir[c] - horizon) + glow * frame.sky_glow[c] +
                disc * frame.sky_disc[c];
     };

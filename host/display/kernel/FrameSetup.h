@@ -69,6 +69,7 @@ struct FrameSetup {
     float background_top[3] = {1, 1, 1}; ///< without a sky
     float background_bottom[3] = {1, 1, 1};
     float sky_horizon[3] = {1, 1, 1};
+    float sky_side[3] = {0, 0, 0}; ///< see Sky
     float sky_zenith[3] = {1, 1, 1};
     float sky_nadir[3] = {1, 1, 1};
     float sky_glow[3] = {0, 0, 0};
