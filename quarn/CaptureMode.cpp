@@ -20,16 +20,19 @@ std::string comparable(std::string_view name) {
 struct CaptureMode {
     std::string name;   ///< as a person reads it
     std::string option; ///< as the prompt knows it
+    bool shows_sun;
 };
 
 CaptureMode displayMode(const CDisplayPipelineAttributes& mode) {
     const std::string name = mode.EnglishName().ToUtf8();
+    const bool shows_sun = mode.m_mode_kind == CDisplayPipelineAttributes::shaded &&
+                           (mode.m_uses_document_lights || mode.m_casts_shadows);
     // The prompt calls these two by names of its own.
     if (comparable(name) == "rendered")
-        return {name, "_RenderedViewport"};
+        return {name, "_RenderedViewport", shows_sun};
     if (comparable(name) == "xray")
-        return {name, "_XRay"};
-    return {name, "_" + name};
+        return {name, "_XRay", shows_sun};
+    return {name, "_" + name, shows_sun};
 }
 
 std::vector<CaptureMode> captureModes() {
@@ -38,8 +41,8 @@ std::vector<CaptureMode> captureModes() {
     std::vector<CaptureMode> modes;
     for (int i = 0; i < display_modes.Count(); ++i)
         modes.push_back(displayMode(*display_modes[i]));
-    modes.push_back({"RenderFull", "_RenderFull"});
-    modes.push_back({"RenderPreview", "_RenderPreview"});
+    modes.push_back({"RenderFull", "_RenderFull", true});
+    modes.push_back({"RenderPreview", "_RenderPreview", true});
     return modes;
 }
 
@@ -53,10 +56,18 @@ std::optional<std::string> captureOption(std::string_view name) {
     return std::nullopt;
 }
 
-std::string captureModeNames() {
+bool showsSun(std::string_view option) {
+    for (const CaptureMode& mode : captureModes())
+        if (mode.option == option)
+            return mode.shows_sun;
+    return false;
+}
+
+std::string captureModeNames(CaptureSubject subject) {
     std::string names;
     for (const CaptureMode& mode : captureModes())
-        names += (names.empty() ? "" : ", ") + mode.name;
+        if (subject != CaptureSubject::moving_sun || mode.shows_sun)
+            names += (names.empty() ? "" : ", ") + mode.name;
     return names;
 }
 

@@ -6,6 +6,9 @@
 
 namespace quarn::program {
 
+/// What is to be captured: some display modes do not show where the sun stands.
+enum class CaptureSubject { moving_camera, moving_sun };
+
 /// The option that picks a capture mode at the prompt of the set-up commands.
 ///
 /// @param name  a display mode's name, with or without its blanks and hyphens and in any case,
@@ -14,7 +17,10 @@ namespace quarn::program {
 ///         that is no mode's
 std::optional<std::string> captureOption(std::string_view name);
 
+/// Whether the sun commands take this option of captureOption().
+bool showsSun(std::string_view option);
+
 /// The names that captureOption understands, as a person reads them: "Wireframe, Shaded, ...".
-std::string captureModeNames();
+std::string captureModeNames(CaptureSubject subject);
 
 } // namespace quarn::program

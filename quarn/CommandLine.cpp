@@ -51,10 +51,11 @@ void addModelAndFolder(CLI::App& command, RecordingOptions& options) {
 }
 
 /// The rest of what every recording takes.
-void addRecordingOptions(CLI::App& command, RecordingOptions& options) {
+void addRecordingOptions(CLI::App& command, RecordingOptions& options,
+                         CaptureSubject subject = CaptureSubject::moving_camera) {
     const OptionAdder add(command);
     add("--size", options.size, "WxH", "Size of a picture in pixels")->capture_default_str();
-    add("--mode", options.mode, "NAME", "Display mode: " + captureModeNames())
+    add("--mode", options.mode, "NAME", "Display mode: " + captureModeNames(subject))
         ->capture_default_str();
     add("--format", options.format, "NAME", "jpg, png, bmp or tga")->capture_default_str();
     command.add_option("--hide", options.hidden, "Leave out this object; may be given again")
@@ -130,6 +131,75 @@ CLI::App& addPath(CLI::App& program, PathOptions& options) {
     return command;
 }
 
+void addSiteOptions(CLI::App& command, SiteOptions& options) {
+    const OptionAdder add(command);
+    add("--place", options.place, "NAME", "City where the model stands; quarn places lists them");
+    add("--latitude", options.latitude_deg, "DEG", "Or: degrees north, -90 to 90");
+    add("--longitude", options.longitude_deg, "DEG",
+        "and degrees east, -180 to 180; west is negative");
+    add("--north", options.north_deg, "DEG",
+        "Where north is in the model, in degrees clockwise from its Y axis")
+        ->capture_default_str();
+}
+
+void addStudyViewOptions(CLI::App& command, StudyViewOptions& options) {
+    const OptionAdder add(command);
+    add("--view", options.view, "NAME",
+        "Top, Front, Right, Perspective or a camera of the model, in place of the next options");
+    add("--azimuth", options.azimuth_deg, "DEG",
+        "Where the camera stands, clockwise from the Y axis (default: 150, in front and to the "
+        "right)");
+    add("--elevation", options.elevation_deg, "DEG",
+        "Angle of the camera above the model, 0 to 89 (default: 30)");
+    add("--target", options.target, "X,Y,Z", "Point to look at (default: the model's middle)");
+    add("--distance", options.distance_factor, "FACTOR",
+        "Distance of the camera, 1 where the model just fits into the picture (default: 1.1)");
+}
+
+CLI::App& addDay(CLI::App& program, DayOptions& options) {
+    CLI::App& command =
+        *program.add_subcommand("day", "Record the sun and the shadows through one day");
+    const OptionAdder add(command);
+    addModelAndFolder(command, options.recording);
+    addSiteOptions(command, options.site);
+    add("--date", options.date, "DATE", "The day, such as 2026-06-21")->required();
+    add("--from", options.from, "HH:MM", "Time of the first picture")->capture_default_str();
+    add("--to", options.to, "HH:MM", "Time that no picture is later than")->capture_default_str();
+    add("--every", options.every, "MINUTES", "Minutes between pictures, 1 to 1440")
+        ->capture_default_str();
+    addStudyViewOptions(command, options.view);
+    addRecordingOptions(command, options.recording, CaptureSubject::moving_sun);
+    command.footer(std::string(DAY_FOOTER) + SITE_FOOTER);
+    return command;
+}
+
+CLI::App& addSeason(CLI::App& program, SeasonOptions& options) {
+    CLI::App& command = *program.add_subcommand(
+        "season", "Record the sun and the shadows of one time of day through the seasons");
+    const OptionAdder add(command);
+    addModelAndFolder(command, options.recording);
+    addSiteOptions(command, options.site);
+    add("--from", options.from, "DATE", "Date of the first picture, such as 2026-03-21")
+        ->required();
+    add("--to", options.to, "DATE", "Date that no picture is later than")->required();
+    add("--every", options.every, "DAYS", "Days between pictures, from 1")->capture_default_str();
+    add("--at", options.at, "HH:MM", "Time of day of every picture")->capture_default_str();
+    addStudyViewOptions(command, options.view);
+    addRecordingOptions(command, options.recording, CaptureSubject::moving_sun);
+    command.footer(std::string(SEASON_FOOTER) + SITE_FOOTER);
+    return command;
+}
+
+CLI::App& addPlaces(CLI::App& program, PlacesOptions& options) {
+    CLI::App& command =
+        *program.add_subcommand("places", "List the cities that a sun study knows by name");
+    command.add_option("TEXT", options.text, "Only those with this in their name or country")
+        ->type_name("");
+    command.footer(PLACES_FOOTER);
+    command.allow_extras();
+    return command;
+}
+
 CLI::App& addCurves(CLI::App& program, CurvesOptions& options) {
     CLI::App& command = *program.add_subcommand("curves", "List what a camera can follow");
     command.add_option("MODEL", options.model, "The model file or document")
@@ -197,8 +267,8 @@ Outcome refuseLeftOver(const CLI::App& command, const std::string& word) {
     if (command.get_parent() == nullptr)
         return Outcome::misuse(
             "unknown command " + word +
-            "; the commands are turntable, flythrough, path, curves, frame, run, "
-            "console and info" +
+            "; the commands are turntable, flythrough, path, day, season, places, curves, "
+            "frame, run, console and info" +
             hintOf(command));
     return Outcome::misuse("unexpected argument " + word + hintOf(command));
 }
@@ -226,7 +296,10 @@ public:
     explicit Commands(CLI::App& program)
         : m_turntable_command(addTurntable(program, m_turntable)),
           m_flythrough_command(addFlythrough(program, m_flythrough)),
-          m_path_command(addPath(program, m_path)), m_curves_command(addCurves(program, m_curves)),
+          m_path_command(addPath(program, m_path)), m_day_command(addDay(program, m_day)),
+          m_season_command(addSeason(program, m_season)),
+          m_places_command(addPlaces(program, m_places)),
+          m_curves_command(addCurves(program, m_curves)),
           m_frame_command(addFrame(program, m_frame)), m_run_command(addRun(program, m_script)),
           m_console_command(addConsole(program, m_console)) {
         addInfo(program, m_model);
@@ -240,6 +313,12 @@ public:
             return recordingRequest(command, m_flythrough);
         if (&command == &m_path_command)
             return recordingRequest(command, m_path);
+        if (&command == &m_day_command)
+            return recordingRequest(command, m_day);
+        if (&command == &m_season_command)
+            return recordingRequest(command, m_season);
+        if (&command == &m_places_command)
+            return m_places;
         if (&command == &m_curves_command)
             return m_curves;
         if (&command == &m_frame_command)
@@ -261,6 +340,9 @@ private:
     TurntableOptions m_turntable;
     FlythroughOptions m_flythrough;
     PathOptions m_path;
+    DayOptions m_day;
+    SeasonOptions m_season;
+    PlacesOptions m_places;
     CurvesOptions m_curves;
     FrameOptions m_frame;
     ScriptOptions m_script;
@@ -269,6 +351,9 @@ private:
     const CLI::App& m_turntable_command;
     const CLI::App& m_flythrough_command;
     const CLI::App& m_path_command;
+    const CLI::App& m_day_command;
+    const CLI::App& m_season_command;
+    const CLI::App& m_places_command;
     const CLI::App& m_curves_command;
     const CLI::App& m_frame_command;
     const CLI::App& m_run_command;

@@ -69,6 +69,50 @@ struct PathOptions {
     std::string lens_mm;
 };
 
+/// Where on the earth a model stands.
+struct SiteOptions {
+    std::optional<std::string> place;
+    std::optional<std::string> latitude_deg;
+    std::optional<std::string> longitude_deg;
+    std::string north_deg = "0";
+};
+
+/// From where a sun study is seen.
+struct StudyViewOptions {
+    std::optional<std::string> view; ///< a standard view or a camera of the model
+    std::optional<std::string> azimuth_deg;
+    std::optional<std::string> elevation_deg;
+    std::optional<std::string> distance_factor;
+    std::optional<std::string> target;
+};
+
+/// `quarn day`
+struct DayOptions {
+    RecordingOptions recording;
+    SiteOptions site;
+    StudyViewOptions view;
+    std::string date;
+    std::string from = "06:00";
+    std::string to = "20:00";
+    std::string every = "15"; ///< minutes
+};
+
+/// `quarn season`
+struct SeasonOptions {
+    RecordingOptions recording;
+    SiteOptions site;
+    StudyViewOptions view;
+    std::string from; ///< dates
+    std::string to;
+    std::string every = "7"; ///< days
+    std::string at = "12:00";
+};
+
+/// `quarn places`
+struct PlacesOptions {
+    std::string text; ///< empty: all
+};
+
 /// `quarn frame`
 struct FrameOptions {
     std::string document;
@@ -106,7 +150,8 @@ struct ConsoleOptions {
 
 /// What the program was asked for; an Outcome when that ended it already (help, or a mistake).
 using Request = std::variant<Outcome, TurntableOptions, ScriptOptions, ModelOptions, ConsoleOptions,
-                             FrameOptions, FlythroughOptions, PathOptions, CurvesOptions>;
+                             FrameOptions, FlythroughOptions, PathOptions, CurvesOptions,
+                             DayOptions, SeasonOptions, PlacesOptions>;
 
 /// Reads the program's arguments. Values are not looked into here.
 Request readCommandLine(int argument_count, const char* const* arguments);

@@ -10,6 +10,11 @@ inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
   quarn path MODEL --camera NAME --target NAME --frames N --out DIR
                                                record a camera that follows one curve and looks
                                                along another, or at a point
+  quarn day MODEL --place NAME --date DATE --out DIR
+                                               record the sun and the shadows through one day
+  quarn season MODEL --place NAME --from DATE --to DATE --out DIR
+                                               record those of one time of day through the seasons
+  quarn places [TEXT]                          list the cities that a sun study knows by name
   quarn curves MODEL                           list what a camera can follow
   quarn frame DOC --number K --out FILE        write one frame of a saved animation
   quarn run SCRIPT [MODEL]                     run a script of host commands
@@ -23,6 +28,7 @@ inline constexpr const char* PROGRAM_FOOTER = R"(
 Examples:
   quarn turntable house.glb --frames 120 --out out/house --save house.quarn
   quarn flythrough house.glb --camera-curve walk.txt --even-speed --frames 240 --out out/walk
+  quarn day house.glb --place Athens --date 2026-06-21 --every 10 --out out/sun
   quarn frame house.quarn --number 60 --out middle.png
   quarn info house.glb
   quarn run steps.txt house.glb
@@ -65,6 +71,52 @@ Examples:
   quarn path town.obj --camera "Roof line" --target Fountain --frames 240 --out out/roofs
   quarn path part.stl --camera-curve arc.txt --target-point 0,0,12 --frames 120 --out out/part
   quarn path hall.glb --camera-point 2,-4,1.6 --target-curve frieze.json --frames 90 --out out)";
+
+inline constexpr const char* DAY_FOOTER = R"(
+A picture is taken at --from, and every so many minutes later until --to; both may be in the night.
+Every picture of the page shows its date and time.
+
+Examples:
+  quarn day house.glb --place Athens --date 2026-06-21 --from 04:00 --to 19:00 --out out/sun
+  quarn day house.obj --latitude 51.5 --longitude -0.12 --north 12 --date 2026-12-21 --out out/dec
+  quarn day site.quarn --place "Mexico City" --date 2026-03-20 --view Top --out out/plan
+)";
+
+inline constexpr const char* SEASON_FOOTER = R"(
+A picture is taken on the date of --from, and every so many days later until that of --to, always
+at the same time by the clock. Every picture of the page shows its date and time.
+
+Examples:
+  quarn season house.glb --place Athens --from 2026-01-01 --to 2026-12-31 --at 11:00 --out out/year
+  quarn season yard.obj --place Sydney --from 2026-06-21 --to 2026-12-21 --every 1 --out out/spring
+
+In the west: a seasonal study counts longitudes eastward from 0 to 360, and its clock with them.
+105.18 W is 254.82 E, on UTC+16, where 12:00 on 22 March is 20:00 UTC on the 21st: that is the hour
+of UTC-8 with the next day's date, while quarn day has UTC-7 there. For the sun that quarn day shows
+at 12:00 give --at 11:00 (on the multiples of 15 degrees, such as 105 W, both show the same hour).
+)";
+
+/// Follows the footers of the two sun studies.
+inline constexpr const char* SITE_FOOTER = R"(
+North: the sun stands as if the model's Y axis pointed north. --north 30 says that north lies 30
+degrees clockwise from the Y axis, as seen from above.
+
+Clock: the zone is the longitude divided by 15, cut to whole hours toward zero. Borders and daylight
+saving do not count, so clocks on the wall differ, most of all in summer:
+  Athens, 23.73 E   here UTC+1, on the wall UTC+3: for 14:30 give 12:30
+  Berlin, 13.41 E   here UTC,   on the wall UTC+2: for 14:30 give 12:30
+  Madrid,  3.7 W    here UTC,   on the wall UTC+2: for 14:30 give 12:30
+  London,  0.13 W   here UTC,   on the wall UTC+1: for 14:30 give 13:30
+The zone and the universal time of the first picture are told before the recording begins. Seconds
+are always 0.)";
+
+inline constexpr const char* PLACES_FOOTER = R"(
+The last two columns tell the zone of the clock in quarn day and in quarn season; quarn season
+--help explains why they differ in the west.
+
+Examples:
+  quarn places
+  quarn places spain)";
 
 inline constexpr const char* CURVES_FOOTER = R"(
 A line tells the name (the id, where there is none), the kind, the length in the model's units,

@@ -4,6 +4,8 @@
 #include "quarn/Interruption.h"
 #include "quarn/OutputFolder.h"
 
+#include <cstdio>
+
 namespace quarn::program {
 
 namespace {
@@ -75,10 +77,18 @@ Outcome record(const RecordingRequest& request, const RecordingScript& script, H
     return RecordingEnd(request, front_end).outcome(!trouble, Clock::now() - start);
 }
 
+/// At once, so that they can be read while the recording runs.
+void tellNotes(const RecordingScript& script) {
+    for (const std::string& note : script.notes)
+        std::puts(note.c_str());
+    std::fflush(stdout);
+}
+
 Outcome runRecording(const RecordingRequest& request, const RecordingScript& script,
                      const CommonOptions& common) {
     const Clock::time_point start = Clock::now();
     watchForInterruption();
+    tellNotes(script);
     ConsoleFrontEnd front_end(printsFor(common));
     HostSession host(front_end, common);
     if (const auto trouble = host.loadAnimationPlugIn())

@@ -1,7 +1,6 @@
 #include "quarn/RecordingRequest.h"
 
 #include "quarn/AnimationName.h"
-#include "quarn/CaptureMode.h"
 
 #include <algorithm>
 #include <array>
@@ -13,8 +12,8 @@ namespace {
 /// Reads one option after the other.
 class RecordingCheck {
 public:
-    RecordingCheck(const RecordingOptions& options, FirstMistake& mistake)
-        : m_typed(options), m_mistake(mistake) {}
+    RecordingCheck(const RecordingOptions& options, FirstMistake& mistake, CaptureSubject subject)
+        : m_typed(options), m_mistake(mistake), m_subject(subject) {}
 
     RecordingRequest run() {
         checkPaths();
@@ -61,7 +60,11 @@ private:
         const std::optional<std::string> option = captureOption(m_typed.mode);
         if (!option)
             m_mistake.note("unknown display mode \"" + m_typed.mode + "\"; --mode takes " +
-                           captureModeNames() + ".");
+                           captureModeNames(m_subject) + ".");
+        else if (m_subject == CaptureSubject::moving_sun && !showsSun(*option))
+            m_mistake.note("the display mode \"" + m_typed.mode +
+                           "\" does not show the sun; --mode takes " + captureModeNames(m_subject) +
+                           ".");
         m_request.capture_option = option.value_or("");
     }
 
@@ -94,13 +97,15 @@ private:
 
     const RecordingOptions& m_typed;
     FirstMistake& m_mistake;
+    const CaptureSubject m_subject;
     RecordingRequest m_request{};
 };
 
 } // namespace
 
-RecordingRequest checkRecording(const RecordingOptions& options, FirstMistake& mistake) {
-    return RecordingCheck(options, mistake).run();
+RecordingRequest checkRecording(const RecordingOptions& options, FirstMistake& mistake,
+                                CaptureSubject subject) {
+    return RecordingCheck(options, mistake, subject).run();
 }
 
 int checkFrames(const std::string& frames, FirstMistake& mistake) {

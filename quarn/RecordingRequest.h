@@ -1,5 +1,6 @@
 #pragma once
 
+#include "quarn/CaptureMode.h"
 #include "quarn/CommandLine.h"
 #include "quarn/FirstMistake.h"
 #include "quarn/Words.h"
@@ -25,7 +26,8 @@ struct RecordingRequest {
 };
 
 /// Checks what was typed, but for the number of frames.
-RecordingRequest checkRecording(const RecordingOptions& options, FirstMistake& mistake);
+RecordingRequest checkRecording(const RecordingOptions& options, FirstMistake& mistake,
+                                CaptureSubject subject = CaptureSubject::moving_camera);
 
 /// Reads a number of frames that was typed.
 int checkFrames(const std::string& frames, FirstMistake& mistake);

@@ -4,6 +4,7 @@ namespace quarn::program {
 
 RecordingScript composeRecording(const RecordingRequest& request, const AnimationLines& lines) {
     RecordingScript script;
+    script.notes = lines.notes;
     std::vector<std::string>& set_up = script.set_up;
     set_up.push_back(readingLine(request.model, request.up_axis));
     for (const std::string& name : request.hidden)
@@ -25,6 +26,8 @@ std::string sharedAnswers(const RecordingRequest& request) {
 
 std::string scriptText(const RecordingScript& script) {
     std::string text;
+    for (const std::string& note : script.notes)
+        text += "# " + note + "\n";
     for (const std::string& line : script.set_up)
         text += line + "\n";
     text += "# The folder must be there before the recording starts.\n";

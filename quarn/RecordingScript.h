@@ -12,10 +12,12 @@ namespace quarn::program {
 struct AnimationLines {
     std::vector<std::string> preparing; ///< what is needed before: the camera, curves
     std::string setting_up;             ///< the command that sets the animation up
+    std::vector<std::string> notes{};   ///< what a person is told before it is recorded
 };
 
 /// The host commands of a whole recording.
 struct RecordingScript {
+    std::vector<std::string> notes;  ///< for a person
     std::vector<std::string> set_up; ///< from the model file to the animation
     /// Keeps the document before the recording begins, so that one which is stopped keeps it too.
     std::optional<std::string> saving;

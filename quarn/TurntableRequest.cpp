@@ -1,5 +1,7 @@
 #include "quarn/TurntableRequest.h"
 
+#include "quarn/CameraPlacement.h"
+
 #include <cmath>
 
 namespace quarn::program {
@@ -7,8 +9,6 @@ namespace quarn::program {
 namespace {
 
 constexpr double STEEPEST_ELEVATION_DEG = 89.0;
-constexpr double NEAREST_DISTANCE = 0.01; // as the command FitView takes them
-constexpr double FARTHEST_DISTANCE = 1000.0;
 
 bool isClockwise(const std::string& typed, FirstMistake& mistake) {
     const std::string direction = lowerCase(typed);
@@ -25,9 +25,8 @@ double checkElevation(const std::string& typed, FirstMistake& mistake) {
 }
 
 std::optional<double> checkDistance(const std::string& typed, FirstMistake& mistake) {
-    const std::optional<double> factor = realNumber(typed);
-    const bool is_good = factor && *factor >= NEAREST_DISTANCE && *factor <= FARTHEST_DISTANCE;
-    if (!typed.empty() && !is_good)
+    const std::optional<double> factor = distanceFactor(typed);
+    if (!typed.empty() && !factor)
         mistake.note("--distance must be a number from 0.01 to 1000" + notBut(typed));
     return factor;
 }

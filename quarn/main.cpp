@@ -3,8 +3,10 @@
 #include "quarn/Console.h"
 #include "quarn/CurveReport.h"
 #include "quarn/ModelReport.h"
+#include "quarn/PlaceList.h"
 #include "quarn/ScriptRun.h"
 #include "quarn/SingleFrame.h"
+#include "quarn/SunStudy.h"
 #include "quarn/Turntable.h"
 
 #include <cstdio>
@@ -25,6 +27,15 @@ Outcome answer(const FlythroughOptions& options) {
 }
 Outcome answer(const PathOptions& options) {
     return recordPath(options);
+}
+Outcome answer(const DayOptions& options) {
+    return recordDay(options);
+}
+Outcome answer(const SeasonOptions& options) {
+    return recordSeason(options);
+}
+Outcome answer(const PlacesOptions& options) {
+    return listPlaces(options);
 }
 Outcome answer(const CurvesOptions& options) {
     return reportCurves(options);

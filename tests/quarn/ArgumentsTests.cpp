@@ -48,7 +48,8 @@ TEST(Arguments, HelpNamesTheCommandsOnTheStandardOutput) {
     const Ended ended = run({"--help"});
     EXPECT_EQ(ended.exit_code, 0);
     EXPECT_THAT(ended.err, IsEmpty());
-    for (const char* word : {"turntable", "run", "info", "Examples:", "Exit codes:"})
+    for (const char* word :
+         {"turntable", "day", "season", "places", "run", "info", "Examples:", "Exit codes:"})
         EXPECT_THAT(ended.out, HasSubstr(word));
 }
 
@@ -70,8 +71,8 @@ TEST(Arguments, VersionIsPrinted) {
 }
 
 TEST(Arguments, UnknownCommandIsNamed) {
-    expectRefusal(run({"turnip"}),
-                  {"unknown command turnip", "turntable, flythrough, path, curves, frame, run, "});
+    expectRefusal(run({"turnip"}), {"unknown command turnip",
+                                    "turntable, flythrough, path, day, season, places, curves, "});
 }
 
 TEST(Arguments, UnknownOptionIsNamed) {
