@@ -1,4 +1,4 @@
-// Records small turntables with the built program, and opens their pages in the browser.
+// Records small animations with the built program, and opens their pages in the browser.
 import { spawnSync } from 'node:child_process';
 import { mkdtempSync, rmSync, writeFileSync } from 'node:fs';
 import { tmpdir } from 'node:os';
@@ -32,14 +32,14 @@ function house() {
     return lines.join('\n') + '\n';
 }
 
-// Records a turntable into a folder of its own.
-// Returns the address of its page, and what takes the folder away again.
-export function recordTurntable({ frames, name, width = 320, height = 180 }) {
+// Records into a folder of its own.
+// Returns the address of the page, and what takes the folder away again.
+function record(command, options, { name, width = 320, height = 180 }) {
     const folder = mkdtempSync(join(tmpdir(), 'quarn-page-'));
     writeFileSync(join(folder, 'house.obj'), house());
     const out = join(folder, 'out');
     const run = spawnSync(process.env.QUARN_PROGRAM, [
-        'turntable', join(folder, 'house.obj'), '--frames', String(frames), '--out', out,
+        command, join(folder, 'house.obj'), ...options, '--out', out,
         '--size', `${width}x${height}`, '--name', name, '--language', 'en',
     ], { encoding: 'utf8' });
     if (run.status !== 0) throw new Error(`quarn ended with ${run.status}: ${run.stderr}`);
@@ -47,6 +47,16 @@ export function recordTurntable({ frames, name, width = 320, height = 180 }) {
         address: pathToFileURL(join(out, `${name}.html`)).href,
         remove: () => rmSync(folder, { recursive: true, force: true }),
     };
+}
+
+export function recordTurntable({ frames, ...common }) {
+    return record('turntable', ['--frames', String(frames)], common);
+}
+
+// The sun over Athens, from one time to another, every so many minutes.
+export function recordDay({ date, from, to, every, ...common }) {
+    return record('day', ['--place', 'Athens', '--date', date, '--from', from, '--to', to,
+                          '--every', String(every)], common);
 }
 
 export function startBrowser() {
