@@ -3,11 +3,15 @@
 #include "quarn/Words.h"
 #include "sdk/qncore/QnDisplayAttributes.h"
 
+#include <algorithm>
+#include <array>
 #include <vector>
 
 namespace quarn::program {
 
 namespace {
+
+const std::array<std::string, 2> RENDER_METHODS{"RenderFull", "RenderPreview"};
 
 /// The name without the characters that an option cannot hold, in lower case.
 std::string comparable(std::string_view name) {
@@ -41,8 +45,8 @@ std::vector<CaptureMode> captureModes() {
     std::vector<CaptureMode> modes;
     for (int i = 0; i < display_modes.Count(); ++i)
         modes.push_back(displayMode(*display_modes[i]));
-    modes.push_back({"RenderFull", "_RenderFull", true});
-    modes.push_back({"RenderPreview", "_RenderPreview", true});
+    for (const std::string& method : RENDER_METHODS)
+        modes.push_back({method, "_" + method, true});
     return modes;
 }
 
@@ -54,6 +58,11 @@ std::optional<std::string> captureOption(std::string_view name) {
         if (wanted == comparable(mode.name) || wanted == comparable(mode.option))
             return mode.option;
     return std::nullopt;
+}
+
+bool isRendered(std::string_view option) {
+    return std::any_of(RENDER_METHODS.begin(), RENDER_METHODS.end(),
+                       [&](const std::string& method) { return option == "_" + method; });
 }
 
 bool showsSun(std::string_view option) {

@@ -20,6 +20,10 @@ std::optional<std::string> captureOption(std::string_view name);
 /// Whether the sun commands take this option of captureOption().
 bool showsSun(std::string_view option);
 
+/// Whether a capture mode is a render method, whose pictures have a size of their own.
+/// @param option  as captureOption gives it
+bool isRendered(std::string_view option);
+
 /// The names that captureOption understands, as a person reads them: "Wireframe, Shaded, ...".
 std::string captureModeNames(CaptureSubject subject);
 

@@ -3,6 +3,7 @@
 #include "quarn/Interruption.h"
 #include "quarn/Words.h"
 
+#include <cmath>
 #include <thread>
 #include <utility>
 
@@ -119,10 +120,25 @@ void ConsoleFrontEnd::frameWritten(const std::filesystem::path&, int written, in
     forgetLastWords();
     const int expected = m_frames_expected > 0 ? m_frames_expected : total;
     m_pace.noteFrame(written, expected, now);
-    if (now < m_next_progress && written != expected)
-        return;
+    if (isProgressDue() || written == expected)
+        m_progress.show(m_pace.text());
+}
+
+bool ConsoleFrontEnd::isProgressDue() {
+    const auto now = RecordingPace::Clock::now();
+    if (now < m_next_progress)
+        return false;
     m_next_progress = now + PROGRESS_STEP;
-    m_progress.show(m_pace.text());
+    return true;
+}
+
+/// The line is taken away at the end, but for the pace of a recording.
+void ConsoleFrontEnd::pictureRendered(double share) {
+    const std::string pace = m_frames_written > 0 ? m_pace.text() + ", " : "";
+    if (share >= 1.0 && pace.empty())
+        m_progress.clear();
+    else if (share < 1.0 && isProgressDue())
+        m_progress.show(pace + "rendering " + std::to_string(std::lround(100.0 * share)) + " %");
 }
 
 } // namespace quarn::program

@@ -52,9 +52,11 @@ public:
     bool isInterrupted() const override;
     HWND mainWindow() override;
     void frameWritten(const std::filesystem::path& file, int written, int total) override;
+    void pictureRendered(double share) override;
 
 private:
     void rememberWords(std::string_view text);
+    bool isProgressDue();
 
     Prints m_prints;
     ProgressLine m_progress;

@@ -1,5 +1,7 @@
 #include "quarn/RecordingScript.h"
 
+#include "quarn/CaptureMode.h"
+
 namespace quarn::program {
 
 RecordingScript composeRecording(const RecordingRequest& request, const AnimationLines& lines) {
@@ -9,11 +11,14 @@ RecordingScript composeRecording(const RecordingRequest& request, const Animatio
     set_up.push_back(readingLine(request.model, request.up_axis));
     for (const std::string& name : request.hidden)
         set_up.push_back("_-Hide \"" + name + "\"");
-    set_up.push_back("_-ViewportSize " + std::to_string(request.size.width_px) + " " +
-                     std::to_string(request.size.height_px));
+    const std::string size =
+        std::to_string(request.size.width_px) + " " + std::to_string(request.size.height_px);
+    set_up.push_back("_-ViewportSize " + size);
     set_up.insert(set_up.end(), lines.preparing.begin(), lines.preparing.end());
     set_up.push_back("_-AnimationName \"" + request.name + "\"");
     set_up.push_back(lines.setting_up);
+    if (isRendered(request.capture_option))
+        set_up.push_back("_-RenderSettings _Size " + size + " _Enter");
     if (!request.document.empty())
         script.saving = "_-SaveAs " + quotedPath(request.document);
     script.recording = "_-RecordAnimation _TargetFolder " + quotedPath(request.folder) + " _Enter";

@@ -8,6 +8,7 @@
 #include "host/document/file/FileRemainder.h"
 #include "host/front_end/FrontEnd.h"
 #include "host/import/ModelFile.h"
+#include "host/render/Renderer.h"
 #include "kelmar/KM_PolylineCurve.h"
 #include "sdk/qncore/QnLocalize.h"
 
@@ -62,6 +63,7 @@ void Document::close() {
     m_lights.close();
     m_sun.close();
     m_scene.reset();
+    m_render_window.close();
     m_objects = ObjectTable();
     m_named_views.clear();
     *m_file_remainder = FileRemainder();
@@ -186,24 +188,44 @@ Result<void> Document::draw(const KM_Viewport& viewport, const DisplayModeAttrib
     return draw(viewport, mode, width_px, height_px, picture, SceneChanges());
 }
 
+Result<void> Document::updateScene(const SceneChanges& changes) {
+    if (!m_scene)
+        m_scene = std::make_unique<DocumentScene>();
+    return m_scene->update(m_objects, shiningLights(changes), changes.hidden);
+}
+
+/// Nothing that was half built is drawn the next time.
+Error Document::memoryLacks(const char* how, int width_px, int height_px) {
+    m_scene.reset();
+    return Error{"A picture of " + std::to_string(width_px) + " by " + std::to_string(height_px) +
+                 " pixels cannot be " + how +
+                 ": there is too little memory. Close other programs, or choose a smaller size."};
+}
+
 Result<void> Document::draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode,
                             int width_px, int height_px, Image& picture,
                             const SceneChanges& changes) {
-    if (!m_scene)
-        m_scene = std::make_unique<DocumentScene>();
     try {
-        const auto updated = m_scene->update(m_objects, shiningLights(changes), changes.hidden);
+        const auto updated = updateScene(changes);
         if (!updated)
             return updated;
         return m_scene->draw(viewport, mode, width_px, height_px, picture);
     } catch (const std::bad_alloc&) {
-        // Nothing that was half built is drawn the next time.
-        m_scene.reset();
         picture = Image();
-        return Error{"A picture of " + std::to_string(width_px) + " by " +
-                     std::to_string(height_px) +
-                     " pixels cannot be drawn: there is too little memory. Close other programs, "
-                     "or draw a smaller picture."};
+        return memoryLacks("drawn", width_px, height_px);
+    }
+}
+
+Result<RenderEnd> Document::render(const KM_Viewport& viewport, const RenderRequest& request,
+                                   const std::function<bool(double share)>& watch, Image& picture,
+                                   const SceneChanges& changes) {
+    try {
+        const auto updated = updateScene(changes);
+        if (!updated)
+            return updated.error();
+        return Renderer().render(m_scene->display(), viewport, request, watch, picture);
+    } catch (const std::bad_alloc&) {
+        return memoryLacks("rendered", request.width_px, request.height_px);
     }
 }
 

@@ -6,9 +6,11 @@
 #include "host/document/ObjectTable.h"
 #include "host/document/UnitSystem.h"
 #include "host/document/ViewState.h"
+#include "host/render/RenderWindow.h"
 #include "sdk/qncore/QnDoc.h"
 
 #include <filesystem>
+#include <functional>
 #include <map>
 #include <memory>
 #include <string>
@@ -25,7 +27,9 @@ struct DocumentContent;
 struct FileRemainder;
 struct Image;
 struct ImportedModel;
+struct RenderRequest;
 struct SceneChanges;
+enum class RenderEnd;
 
 /// A camera that a model file brought along.
 struct NamedView {
@@ -130,6 +134,12 @@ public:
     /// Draws the same otherwise than it is; neither the document nor what its views show changes.
     Result<void> draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode, int width_px,
                       int height_px, Image& picture, const SceneChanges& changes);
+    /// Renders the surfaces that are visible, otherwise than they are where `changes` says so; as
+    /// Renderer::render.
+    Result<RenderEnd> render(const KM_Viewport& viewport, const RenderRequest& request,
+                             const std::function<bool(double share)>& watch, Image& picture,
+                             const SceneChanges& changes);
+    RenderWindow& renderWindow() { return m_render_window; }
     /// Brings the scene up to date where it was built before.
     void regenerate();
 
@@ -142,6 +152,8 @@ private:
     void fitTolerance();
     std::vector<KM_Light> shiningLights(const SceneChanges& changes) const;
     void closeNow(ViewState& view);
+    Result<void> updateScene(const SceneChanges& changes);
+    Error memoryLacks(const char* how, int width_px, int height_px);
 
     DocumentList& m_list;
     unsigned int m_serial_number;
@@ -159,6 +171,7 @@ private:
     std::vector<std::unique_ptr<ViewState>> m_closed_views;
     bool m_is_open = true;
     std::unique_ptr<DocumentScene> m_scene; ///< null until something is drawn
+    RenderWindow m_render_window;
     CQuarnDocProperties m_properties;
     CQuarnDoc m_face;
 

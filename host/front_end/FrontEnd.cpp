@@ -4,4 +4,6 @@ namespace quarn {
 
 FrontEnd::~FrontEnd() = default;
 
+void FrontEnd::pictureRendered(double) {}
+
 } // namespace quarn

@@ -64,6 +64,9 @@ public:
     /// @param written  pictures of this recording so far, from 1
     /// @param total    frames of the animation; 0 when that is not known
     virtual void frameWritten(const std::filesystem::path& file, int written, int total) = 0;
+    /// Told some times a second while a picture is rendered. Shows nothing unless it is overridden.
+    /// @param share  how much of the picture is done, from 0 to 1; 1 comes last, however it ended
+    virtual void pictureRendered(double share);
 };
 
 } // namespace quarn

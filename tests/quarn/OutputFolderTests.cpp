@@ -166,16 +166,28 @@ TEST(FullDisk, FormerPicturesOfTheSameNameStayWhole) {
     EXPECT_EQ(readFile(studio / "out/house000.bmp"), before);
 }
 
-TEST(RenderMethod, WithoutARendererTellsThatNoFrameWasWritten) {
+TEST(RenderMethod, RecordsPicturesOfTheSizeThatIsAskedFor) {
     for (const std::string mode : {"RenderFull", "RenderPreview"}) {
         const Studio studio;
-        const Ended ended = run(studio.turntable(2, {"--mode", mode}));
-        EXPECT_EQ(ended.exit_code, 1);
-        EXPECT_THAT(linesOf(ended.err), SizeIs(1)) << ended.err;
-        EXPECT_EQ(framesTold(ended.err, 2), 0);
-        EXPECT_THAT(ended.err, HasSubstr("Unknown command: Render"));
-        EXPECT_EQ(picturesIn(studio / "out"), 0);
+        const Ended ended =
+            run(studio.turntable(2, {"--mode", mode, "--size", "40x24", "--format", "bmp"}));
+        EXPECT_EQ(ended.exit_code, 0) << ended.err;
+        EXPECT_EQ(picturesIn(studio / "out"), 2);
+        // 24 bits a pixel behind 54 bytes of headers.
+        EXPECT_EQ(std::filesystem::file_size(studio / "out/house000.bmp"), 54U + 40U * 24U * 3U);
     }
+}
+
+TEST(RenderMethod, SizeThatNoMemoryHoldsTellsThatNoFrameWasWritten) {
+    const Studio studio;
+    Start start = studio.turntable(2, {"--mode", "RenderFull", "--size", "5000x5000"});
+    start.largest_memory = 3000000000;
+    const Ended ended = run(start);
+    EXPECT_EQ(ended.exit_code, 1);
+    EXPECT_THAT(linesOf(ended.err), SizeIs(1)) << ended.err;
+    EXPECT_EQ(framesTold(ended.err, 2), 0);
+    EXPECT_THAT(ended.err, HasSubstr("A picture of 5000 by 5000 pixels takes"));
+    EXPECT_EQ(picturesIn(studio / "out"), 0);
 }
 
 } // namespace

@@ -35,6 +35,10 @@ void readFrom(const std::filesystem::path& file) {
 void becomeProgram(const Start& start) {
     if (!start.folder.empty() && chdir(start.folder.c_str()) != 0)
         _exit(126);
+    if (start.largest_memory > 0) {
+        const rlimit limit = {start.largest_memory, start.largest_memory};
+        setrlimit(RLIMIT_AS, &limit);
+    }
     if (start.largest_file > 0) {
         const rlimit limit = {start.largest_file, start.largest_file};
         setrlimit(RLIMIT_FSIZE, &limit);

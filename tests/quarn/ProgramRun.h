@@ -17,6 +17,7 @@ struct Start {
     std::map<std::string, std::string> environment; ///< on top of the test's own
     std::string input;                              ///< what its standard input holds
     unsigned long largest_file = 0;                 ///< bytes; 0: no limit
+    unsigned long largest_memory = 0;               ///< bytes of addresses; 0: no limit
     bool has_terminal = false;                      ///< its standard error is a terminal
     std::filesystem::path program = QUARN_PROGRAM;
 };

@@ -132,6 +132,13 @@ TEST(ShowScript, ModeIsTheOptionThatTheCapturePromptKnows) {
             << mode;
 }
 
+TEST(ShowScript, RenderedPicturesGetTheSizeToo) {
+    for (const char* mode : {"RenderFull", "RenderPreview"})
+        EXPECT_EQ(scriptWith({"--mode", mode, "--size", "640x480"})[6],
+                  "_-RenderSettings _Size 640 480 _Enter");
+    EXPECT_THAT(scriptWith({"--mode", "Rendered"})[6], testing::StartsWith("#"));
+}
+
 TEST(ShowScript, NameComesFromTheModelWithoutForbiddenCharacters) {
     const auto name_of = [](const std::string& model) {
         return scriptOf({model, "--frames", "8", "--out", "out"})[4];

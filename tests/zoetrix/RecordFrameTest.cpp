@@ -110,43 +110,56 @@ TEST_F(RecordFrames, UnknownExtensionIsNotWritten) {
 TEST_F(RecordFrames, WithoutAViewOnlyTheRendererCanWrite) {
     EXPECT_FALSE(recordFrame(nullptr));
     EXPECT_THAT(files(), IsEmpty());
-    loadRenderer();
+    renderSmall();
     record().SetRenderFull(true);
     EXPECT_TRUE(recordFrame(nullptr));
     EXPECT_THAT(files(), ElementsAre("Walk001.jpg"));
 }
 
 TEST_F(RecordFrames, FullRenderIsSavedAndItsWindowClosed) {
-    loadRenderer();
+    renderSmall();
     record().SetRenderFull(true);
     record().SetRenderPreview(true);
     record().SetHtmlFilename(L"a walk");
     ASSERT_TRUE(recordFrame());
-    EXPECT_EQ("Render SaveRenderWindowAs run ", journal());
-    EXPECT_EQ("Render", readFile(frames / "a walk001.jpg"));
+    EXPECT_EQ(L"Command: _Render\nCommand: _-SaveRenderWindowAs \"" +
+                  std::wstring(wide(frames).View()) +
+                  L"/a walk001.jpg\"\nCommand: _CloseRenderWindow\n",
+              printed());
+    EXPECT_TRUE(isJpeg(frames / "a walk001.jpg"));
     EXPECT_THAT(images(), ElementsAre(L"a walk001.jpg"));
-    EXPECT_THAT(printed(), HasSubstr(L"_-SaveRenderWindowAs \"" +
-                                     std::wstring(wide(frames).View()) + L"/a walk001.jpg\""));
+    EXPECT_EQ(CQuarnCommand::failure, run(L"SaveRenderWindowAs x.jpg")) << "the window is closed";
 }
 
 TEST_F(RecordFrames, PreviewRenderIsSavedAndItsWindowClosed) {
-    loadRenderer();
+    renderSmall();
     record().SetRenderPreview(true);
     ASSERT_TRUE(recordFrame());
-    EXPECT_EQ("RenderPreview SaveRenderWindowAs run ", journal());
-    EXPECT_EQ("RenderPreview", readFile(frames / "Walk001.jpg"));
+    EXPECT_EQ(L"Command: _RenderPreview\nCommand: _-SaveRenderWindowAs \"" +
+                  std::wstring(wide(frames).View()) +
+                  L"/Walk001.jpg\"\nCommand: _CloseRenderWindow\n",
+              printed());
+    EXPECT_TRUE(isJpeg(frames / "Walk001.jpg"));
+}
+
+TEST_F(RecordFrames, RenderedPictureHasTheRenderSize) {
+    renderSmall();
+    record().SetRenderPreview(true);
+    record().SetFileExtension(L"bmp");
+    ASSERT_TRUE(recordFrame());
+    // 24 bits a pixel behind 54 bytes of headers; the view is 64 by 48 pixels large.
+    EXPECT_EQ(54U + 32U * 24U * 3U, readFile(frames / "Walk001.bmp").size());
 }
 
 TEST_F(RecordFrames, PathWithAQuoteNeverReachesAScript) {
-    loadRenderer();
     record().SetRenderFull(true);
     record().SetHtmlFilename(L"a\" _Exit \"");
     EXPECT_FALSE(recordFrame());
-    EXPECT_EQ("", journal());
+    EXPECT_EQ(L"", printed());
     record().SetHtmlFilename(L"Walk");
     record().SetFolderName(wide(frames) + L"\n_Exit");
     EXPECT_FALSE(recordFrame());
-    EXPECT_EQ("", journal());
+    EXPECT_EQ(L"", printed());
     EXPECT_FALSE(session->isExitRequested());
 }
 
@@ -156,11 +169,15 @@ TEST_F(RecordFrames, QuoteInTheNameIsWrittenByTheDisplay) {
     EXPECT_THAT(files(), ElementsAre("a\"b001.jpg"));
 }
 
-TEST_F(RecordFrames, UnknownRendererWritesNothing) {
+TEST_F(RecordFrames, RenderThatIsCancelledWritesNothing) {
+    renderSmall();
+    front_end.setKeyDown(VK_ESCAPE, true);
     for (const bool full : {true, false}) {
         record().SetRenderFull(full);
         record().SetRenderPreview(!full);
+        front_end.clearPrinted();
         EXPECT_FALSE(recordFrame());
+        EXPECT_EQ(full ? L"Command: _Render\n" : L"Command: _RenderPreview\n", printed());
     }
     EXPECT_THAT(files(), IsEmpty());
     EXPECT_THAT(images(), IsEmpty());

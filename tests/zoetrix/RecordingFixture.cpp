@@ -1,7 +1,6 @@
 #include "tests/zoetrix/RecordingFixture.h"
 
 #include <algorithm>
-#include <cstdlib>
 
 void RecordingFixture::SetUp() {
     importObj("v -1 -1 0\nv 1 -1 0\nv 1 1 0\nv -1 1 0\nv 0 0 2\no roof\n"
@@ -13,17 +12,10 @@ void RecordingFixture::SetUp() {
     front_end.clearPrinted();
 }
 
-void RecordingFixture::loadRenderer() {
-    const std::filesystem::path file =
-        std::filesystem::path(TEST_PLUGIN_DIR) / "render_commands.qnp";
-    const quarn::PlugInLoad load = session->loadPlugIn(file);
-    ASSERT_TRUE(load.ok()) << load.message;
-    unsetenv("QUARN_TEST_JOURNAL");
-}
-
-std::string RecordingFixture::journal() {
-    const char* words = std::getenv("QUARN_TEST_JOURNAL");
-    return words ? words : "";
+void RecordingFixture::renderSmall() {
+    ASSERT_EQ(CQuarnCommand::success,
+              run(L"RenderSettings Size 32 24 Samples 8 PreviewSamples 1 _Enter"));
+    front_end.clearPrinted();
 }
 
 std::vector<std::string> RecordingFixture::files() const {

@@ -7,9 +7,8 @@ class RecordingFixture : public PlugInFixture {
 protected:
     void SetUp() override;
 
-    /// Loads commands that stand in for a renderer, and empties their journal.
-    void loadRenderer();
-    static std::string journal();
+    /// Small rendered pictures, by few samples: 32 by 24 pixels.
+    void renderSmall();
 
     /// The names of the files in the folder, in order.
     std::vector<std::string> files() const;

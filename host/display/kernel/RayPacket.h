@@ -58,7 +58,9 @@ inline void aim(const FrameSetup& frame, RayPacket& packet) {
 }
 
 /// Finds the nearest surface of each ray.
-inline void intersect(const FrameSetup& frame, RayPacket& packet) {
+/// @param flags  whether the rays run nearly side by side
+inline void intersect(const FrameSetup& frame, RayPacket& packet,
+                      RTCIntersectContextFlags flags = RTC_INTERSECT_CONTEXT_FLAG_COHERENT) {
     RTCRayHit16& rays = packet.rays;
     constexpr auto nothing = static_cast<std::int32_t>(RTC_INVALID_GEOMETRY_ID);
     store(rays.ray.tfar, select(packet.active, unlimited, no_distance));
@@ -67,7 +69,7 @@ inline void intersect(const FrameSetup& frame, RayPacket& packet) {
     if (frame.scene) {
         RTCIntersectContext context;
         rtcInitIntersectContext(&context);
-        context.flags = RTC_INTERSECT_CONTEXT_FLAG_COHERENT;
+        context.flags = flags;
         rtcIntersect16(packet.active.data(), frame.scene, &context, &rays);
     }
     packet.hit = load(rays.hit.geomID) != nothing;

@@ -1,0 +1,66 @@
+#include "host/app/Application.h"
+#include "host/app/PathText.h"
+#include "host/commands/CommandEnd.h"
+#include "host/commands/HostCommands.h"
+#include "host/commands/Rendering.h"
+#include "host/display/ImageFile.h"
+#include "host/document/Document.h"
+#include "host/document/SceneChanges.h"
+#include "sdk/qncore/QnGet.h"
+
+#include <utility>
+
+namespace quarn {
+
+namespace {
+
+/// Renders the active view into the render window. One that is cancelled or fails leaves the
+/// picture that was there.
+CQuarnCommand::result renderActiveView(Document& document, int samples) {
+    RenderWindow& window = document.renderWindow();
+    const RenderRequest request{window.settings.width_px, window.settings.height_px, samples};
+    const KM_Viewport viewport = document.activeView().viewport();
+    Image picture;
+    const auto end = renderWatched(document, viewport, request, picture, SceneChanges());
+    if (!end)
+        return fail(end.message());
+    if (end.value() == RenderEnd::cancelled)
+        return CQuarnCommand::cancel;
+    window.picture = std::move(picture);
+    return CQuarnCommand::success;
+}
+
+} // namespace
+
+CQuarnCommand::result runRender(const CQuarnCommandContext& context) {
+    Document& document = Document::of(context.Document());
+    return renderActiveView(document, document.renderWindow().settings.samples);
+}
+
+CQuarnCommand::result runRenderPreview(const CQuarnCommandContext& context) {
+    Document& document = Document::of(context.Document());
+    return renderActiveView(document, document.renderWindow().settings.preview_samples);
+}
+
+CQuarnCommand::result runSaveRenderWindowAs(const CQuarnCommandContext& context) {
+    const RenderWindow& window = Document::of(context.Document()).renderWindow();
+    if (!window.isOpen())
+        return fail("There is no rendered picture. Make one with Render or RenderPreview first.");
+    CQuarnGetString get;
+    get.SetCommandPrompt(QnLocalizeString(L"Image file", 42201));
+    if (get.GetString() != CQuarnGet::string)
+        return get.CommandResult();
+    const std::filesystem::path file = pathFromText(get.String());
+    const auto written = writeImageFile(file, window.picture);
+    if (!written)
+        return fail(written.message());
+    Application::current()->pictureWritten(file);
+    return CQuarnCommand::success;
+}
+
+CQuarnCommand::result runCloseRenderWindow(const CQuarnCommandContext& context) {
+    Document::of(context.Document()).renderWindow().close();
+    return CQuarnCommand::success;
+}
+
+} // namespace quarn

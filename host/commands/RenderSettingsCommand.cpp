@@ -1,0 +1,87 @@
+#include "host/commands/CommandEnd.h"
+#include "host/commands/HostCommands.h"
+#include "host/commands/PictureSizePrompt.h"
+#include "host/document/Document.h"
+#include "sdk/qncore/QnGet.h"
+
+namespace quarn {
+
+namespace {
+
+/// Asks for the settings until Enter; nothing changes before.
+class SettingsQuestion {
+public:
+    explicit SettingsQuestion(const RenderSettings& present) : m_wish(present) {}
+
+    CQuarnCommand::result run() {
+        for (;;) {
+            const CQuarnGet::result answer = ask();
+            if (answer == CQuarnGet::nothing)
+                return CQuarnCommand::success;
+            if (answer == CQuarnGet::string)
+                return failForWord(m_get.String(), "Size, Samples or PreviewSamples");
+            if (answer != CQuarnGet::option)
+                return m_get.CommandResult();
+            const CQuarnCommand::result asked = askPart(m_get.Option()->m_option_index);
+            if (asked != CQuarnCommand::success)
+                return asked;
+        }
+    }
+
+    const RenderSettings& wish() const { return m_wish; }
+
+private:
+    CQuarnGet::result ask() {
+        const auto number = [](int value) { return KM_wString::FormatToString(L"%d", value); };
+        m_get.SetCommandPrompt(QnLocalizeString(L"Render settings, Enter to keep them", 42360));
+        m_get.AcceptNothing(true);
+        m_get.ClearCommandOptions();
+        m_size = addOption(QnLocalizeCommandOptionName(L"Size", 42350),
+                           number(m_wish.width_px) + L"x" + number(m_wish.height_px));
+        m_samples =
+            addOption(QnLocalizeCommandOptionName(L"Samples", 42351), number(m_wish.samples));
+        m_preview_samples = addOption(QnLocalizeCommandOptionName(L"PreviewSamples", 42352),
+                                      number(m_wish.preview_samples));
+        return m_get.GetOption();
+    }
+
+    int addOption(const CQuarnCommandOptionName& name, const KM_wString& value) {
+        return m_get.AddCommandOption(name, QnLocalizeCommandOptionValue(value, 0));
+    }
+
+    CQuarnCommand::result askPart(int option) {
+        if (option == m_size)
+            return askPictureSize(m_wish.width_px, m_wish.height_px);
+        return askSamples(option == m_samples ? m_wish.samples : m_wish.preview_samples);
+    }
+
+    static CQuarnCommand::result askSamples(int& samples) {
+        CQuarnGetInteger get;
+        get.SetCommandPrompt(QnLocalizeString(L"Samples of each pixel", 42361));
+        get.SetDefaultInteger(samples);
+        get.SetLowerLimit(1);
+        get.SetUpperLimit(RenderSettings::most_samples);
+        if (get.GetNumber() == CQuarnGet::number)
+            samples = get.Number();
+        return get.CommandResult();
+    }
+
+    RenderSettings m_wish;
+    CQuarnGetOption m_get;
+    int m_size = 0;
+    int m_samples = 0;
+    int m_preview_samples = 0;
+};
+
+} // namespace
+
+CQuarnCommand::result runRenderSettings(const CQuarnCommandContext& context) {
+    RenderSettings& settings = Document::of(context.Document()).renderWindow().settings;
+    SettingsQuestion question(settings);
+    const CQuarnCommand::result asked = question.run();
+    if (asked == CQuarnCommand::success)
+        settings = question.wish();
+    return asked;
+}
+
+} // namespace quarn

@@ -1,0 +1,21 @@
+#pragma once
+
+#include "host/app/Result.h"
+#include "host/render/Renderer.h"
+
+class KM_Viewport;
+
+namespace quarn {
+
+class Document;
+struct Image;
+struct SceneChanges;
+
+/// Renders a picture of a document while the front end works on its events and shows how far it
+/// is. The person ends it with Escape or by asking the program to stop.
+/// @return as Renderer::render
+Result<RenderEnd> renderWatched(Document& document, const KM_Viewport& viewport,
+                                const RenderRequest& request, Image& picture,
+                                const SceneChanges& changes);
+
+} // namespace quarn

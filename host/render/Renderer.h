@@ -1,0 +1,57 @@
+#pragma once
+
+#include "host/app/Result.h"
+#include "host/display/Image.h"
+#include "host/render/kernel/RenderSetup.h"
+
+#include <cstdint>
+#include <functional>
+
+class KM_Viewport;
+
+namespace quarn {
+
+class DisplayScene;
+class RenderLayers;
+
+/// The size of a picture and how often each of its pixels is looked at.
+struct RenderRequest {
+    int width_px = 0;  ///< 1 to DisplayPipeline::max_size_px
+    int height_px = 0; ///< the same
+    int samples = 1;   ///< 1 to RenderSettings::most_samples
+};
+
+enum class RenderEnd { done, cancelled };
+
+/// Renders pictures: what Rendered mode draws, with the sun as a disc, and with light that comes
+/// from the whole sky and from the surfaces around. Curves and points are not rendered. The same
+/// picture comes out every time and for any number of threads, which have ended their work when a
+/// call returns.
+class Renderer {
+public:
+    Renderer();
+    /// Renders with the loops of a certain kind of processor.
+    explicit Renderer(const RenderKernel& kernel) : m_kernel(&kernel) {}
+
+    /// Called between parts of the work, some times a second.
+    /// @param share  how much is done, 0 to 1
+    /// @return false to end the work here
+    using Watch = std::function<bool(double share)>;
+
+    /// Renders the scene as `viewport` sees it. The camera's opening is fitted to the picture's
+    /// aspect, the smaller half angle stays.
+    /// @param image  takes the picture; unchanged unless done
+    /// @return an error for a size or number of samples out of range, an invalid camera, and a
+    ///         size that there is no memory for
+    Result<RenderEnd> render(const DisplayScene& scene, const KM_Viewport& viewport,
+                             const RenderRequest& request, const Watch& watch, Image& image) const;
+
+    /// Whether a picture of this size can be rendered in so much memory.
+    /// @param available  bytes
+    static Result<void> checkMemory(const RenderRequest& request, std::uint64_t available);
+
+private:
+    const RenderKernel* m_kernel;
+};
+
+} // namespace quarn
