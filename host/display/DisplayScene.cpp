@@ -2,6 +2,7 @@
 
 #include "host/display/ColorSpace.h"
 #include "host/display/MipTexture.h"
+#include "host/document/PlacedMesh.h"
 
 #include <utility>
 
@@ -62,21 +63,19 @@ void DisplayScene::clear() {
 void DisplayScene::rebuild(const SceneContent& content) {
     const MeshCache earlier_meshes = std::exchange(m_mesh_cache, {});
     TextureCache earlier_textures = std::exchange(m_texture_cache, {});
-    std::vector<RayScene::Member> members;
     m_meshes.clear();
+    for (const SceneMesh& object : content.meshes)
+        addMesh(object, earlier_meshes);
+    choosePlaces(content);
+    std::vector<RayScene::Member> members;
     m_member_of_mesh.clear();
-    for (const SceneMesh& object : content.meshes) {
-        auto& mesh = m_mesh_cache[object.mesh.get()];
-        if (!mesh) {
-            const auto found = earlier_meshes.find(object.mesh.get());
-            mesh = found != earlier_meshes.end() ? found->second
-                                                 : std::make_shared<const RayMesh>(object.mesh);
-        }
-        const bool drawable = mesh->isDrawable();
-        m_meshes.push_back({drawable ? mesh : nullptr, object.visible});
-        m_member_of_mesh.push_back(drawable ? members.size() : no_member);
-        if (drawable)
-            members.push_back({mesh, surfaceOf(object, *mesh, earlier_textures), object.visible});
+    for (std::size_t i = 0; i < m_meshes.size(); ++i) {
+        const MeshObject& object = m_meshes[i];
+        m_member_of_mesh.push_back(object.mesh ? members.size() : no_member);
+        if (object.mesh)
+            members.push_back({object.mesh,
+                               surfaceOf(content.meshes[i], *object.mesh, earlier_textures),
+                               object.visible, object.frame_from_mesh});
     }
     m_rays.build(std::move(members));
     m_curves = content.curves;
@@ -84,6 +83,43 @@ void DisplayScene::rebuild(const SceneContent& content) {
     m_revision = content.revision;
     m_built = true;
     updateBoxes();
+}
+
+void DisplayScene::addMesh(const SceneMesh& object, const MeshCache& earlier) {
+    auto& mesh = m_mesh_cache[object.mesh.get()];
+    if (!mesh) {
+        const auto found = earlier.find(object.mesh.get());
+        mesh =
+            found != earlier.end() ? found->second : std::make_shared<const RayMesh>(object.mesh);
+    }
+    const bool drawable = mesh->isDrawable();
+    const bool stands = object.world_from_mesh.IsIdentity();
+    const KM_BoundingBox box = !drawable ? KM_BoundingBox()
+                               : stands  ? mesh->box()
+                                         : boxOfPlaced(*object.mesh, object.world_from_mesh);
+    m_meshes.push_back({drawable ? mesh : nullptr, object.visible, KM_Xform(), box});
+}
+
+/// The origin is one of the objects' own where that is near enough: such objects then need no
+/// transform.
+void DisplayScene::choosePlaces(const SceneContent& content) {
+    KM_BoundingBox box;
+    for (const MeshObject& object : m_meshes)
+        box.Union(object.box);
+    m_origin = nearbyOrigin(box);
+    const double reach = 100.0 * box.Diagonal().Length();
+    for (const SceneMesh& object : content.meshes) {
+        const KM_3dPoint own = object.world_from_mesh * KM_3dPoint::Origin;
+        if (m_origin == KM_3dPoint::Origin || own == m_origin)
+            break;
+        if (own != KM_3dPoint::Origin && own.DistanceTo(box.Center()) < reach) {
+            m_origin = own;
+            break;
+        }
+    }
+    const KM_Xform frame_from_world = KM_Xform::Translation(KM_3dPoint::Origin - m_origin);
+    for (std::size_t i = 0; i < m_meshes.size(); ++i)
+        m_meshes[i].frame_from_mesh = frame_from_world * content.meshes[i].world_from_mesh;
 }
 
 RaySurface DisplayScene::surfaceOf(const SceneMesh& object, const RayMesh& mesh,
@@ -143,7 +179,7 @@ void DisplayScene::updateBoxes() {
     m_surface_box = KM_BoundingBox();
     for (const MeshObject& object : m_meshes)
         if (object.visible && object.mesh)
-            m_surface_box.Union(object.mesh->box());
+            m_surface_box.Union(object.box);
     m_box = m_surface_box;
     for (const SceneCurve& curve : m_curves)
         if (curve.visible)

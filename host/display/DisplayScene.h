@@ -34,10 +34,16 @@ public:
     /// The box of the meshes that are shown.
     const KM_BoundingBox& surfaceBox() const { return m_surface_box; }
 
+    /// Where the coordinates of the ray scene and of `MeshObject` begin: they are those of the
+    /// world, less this point, so that models far from the origin keep their digits.
+    const KM_3dPoint& origin() const { return m_origin; }
+
     /// A mesh object for drawing its lines; `mesh` is null when it cannot be drawn.
     struct MeshObject {
         std::shared_ptr<const RayMesh> mesh;
         bool visible = true;
+        KM_Xform frame_from_mesh;
+        KM_BoundingBox box; ///< in the world
     };
 
     const RayScene& rays() const { return m_rays; }
@@ -58,6 +64,8 @@ private:
     void rebuild(const SceneContent& content);
     void updateVisibility(const SceneContent& content);
     void updateBoxes();
+    void addMesh(const SceneMesh& object, const MeshCache& earlier);
+    void choosePlaces(const SceneContent& content);
     void clear();
     RaySurface surfaceOf(const SceneMesh& object, const RayMesh& mesh, TextureCache& earlier);
     const MipTexture* textureOf(const Material& material, TextureCache& earlier);
@@ -72,6 +80,7 @@ private:
     std::vector<SceneCurve> m_curves;
     std::vector<ScenePoint> m_points;
     std::vector<KM_Light> m_lights;
+    KM_3dPoint m_origin;
     KM_BoundingBox m_box;
     KM_BoundingBox m_surface_box;
 };

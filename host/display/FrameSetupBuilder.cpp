@@ -34,9 +34,23 @@ void setScene(FrameSetup& frame, const DisplayScene& scene) {
     const KM_BoundingBox& box = scene.surfaceBox();
     if (!box.IsValid())
         return;
-    setPoint(frame.scene_min, box.m_min);
-    setPoint(frame.scene_max, box.m_max);
+    const KM_3dVector from_world = KM_3dPoint::Origin - scene.origin();
+    setPoint(frame.scene_min, box.m_min + from_world);
+    setPoint(frame.scene_max, box.m_max + from_world);
     frame.scene_size = static_cast<float>(box.Diagonal().Length());
+}
+
+/// The camera's rays in the coordinates of the scene.
+CameraRays raysIn(const DisplayScene& scene, const KM_Viewport& viewport, int width, int height) {
+    if (scene.origin() == KM_3dPoint::Origin)
+        return cameraRays(viewport, width, height, scene.boundingBox());
+    const KM_3dVector from_world = KM_3dPoint::Origin - scene.origin();
+    KM_Viewport moved = viewport;
+    moved.SetCameraLocation(viewport.CameraLocation() + from_world);
+    KM_BoundingBox box;
+    for (int i = 0; i < 8 && scene.boundingBox().IsValid(); ++i)
+        box.Set(scene.boundingBox().Corner(i) + from_world);
+    return cameraRays(moved, width, height, box);
 }
 
 FrameLight frameLight(const DirectionalLight& light) {
@@ -132,7 +146,7 @@ FrameSetup makeFrameSetup(const DisplayScene& scene, const KM_Viewport& viewport
     FrameSetup frame;
     frame.width = width;
     frame.height = height;
-    frame.rays = cameraRays(viewport, width, height, scene.boundingBox());
+    frame.rays = raysIn(scene, viewport, width, height);
     if (mode.surface_style != SurfaceStyle::none)
         setScene(frame, scene);
     setStyle(frame, mode.surface_style);

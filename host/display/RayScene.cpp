@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <array>
 #include <numeric>
+#include <set>
 #include <string>
 
 namespace quarn {
@@ -15,7 +16,27 @@ namespace {
 /// many, whose rebuild takes about 2 ms.
 constexpr std::size_t large_mesh_triangles = 8192;
 
-constexpr std::array<float, 12> identity{1, 0, 0, 0, 1, 0, 0, 0, 1, 0, 0, 0};
+/// The first three rows, column by column.
+std::array<float, 12> columnsOf(const KM_Xform& x) {
+    std::array<float, 12> columns{};
+    for (std::size_t j = 0; j < 4; ++j)
+        for (std::size_t i = 0; i < 3; ++i)
+            columns[3 * j + i] = static_cast<float>(x.m_xform[i][j]);
+    return columns;
+}
+
+SurfacePlace placeOf(const KM_Xform& x) {
+    SurfacePlace place{};
+    for (int i = 0; i < 3; ++i)
+        for (int j = 0; j < 3; ++j) {
+            const auto at = [&](int row, int column) {
+                return x.m_xform[(i + row) % 3][(j + column) % 3];
+            };
+            place.linear[i][j] = static_cast<float>(x.m_xform[i][j]);
+            place.cofactors[i][j] = static_cast<float>(at(1, 1) * at(2, 2) - at(1, 2) * at(2, 1));
+        }
+    return place;
+}
 
 void noteError(void* note, RTCError, const char* message) {
     auto& text = *static_cast<std::string*>(note);
@@ -70,30 +91,57 @@ std::string RayScene::takeError() {
     return error;
 }
 
-std::vector<std::shared_ptr<RayScene::Group>> RayScene::largeGroups() const {
-    std::vector<std::shared_ptr<Group>> groups;
+bool RayScene::standsAlone(const Member& member) const {
+    return member.mesh->mesh().m_F.size() >= large_mesh_triangles ||
+           m_placed_meshes.contains(member.mesh.get());
+}
+
+RayScene::GroupKey RayScene::keyOf(const Member& member) const {
+    const RaySurface& surface = member.surface;
+    if (!surface.has_cutout)
+        return {member.mesh.get(), nullptr, 0.0F, 0.0F};
+    return {member.mesh.get(), surface.texture, surface.alpha_cutoff, surface.opacity};
+}
+
+RayScene::SoleGroups RayScene::soleGroups() const {
+    SoleGroups groups;
     for (const Instance& instance : m_instances)
-        if (instance.group->sole_mesh)
-            groups.push_back(instance.group);
+        if (const RayMesh* const mesh = instance.group->sole_mesh)
+            groups.emplace(GroupKey{mesh, nullptr, 0.0F, 0.0F}, instance.group);
     return groups;
+}
+
+std::size_t RayScene::geometryCount() const {
+    std::set<const Group*> groups;
+    std::size_t count = 0;
+    for (const Instance& instance : m_instances)
+        if (groups.insert(instance.group.get()).second)
+            count += instance.group->geometries.size();
+    return count;
 }
 
 void RayScene::build(std::vector<Member> members) {
     if (!m_device)
         return;
-    auto groups = largeGroups();
+    SoleGroups groups = soleGroups();
     // The meshes of the taken-over groups must outlive the search for them.
     const std::vector<Member> earlier_members = std::exchange(m_members, std::move(members));
     m_instances.clear();
     m_first_surfaces.clear();
     m_surfaces.clear();
     m_surfaces.reserve(m_members.size()); // geometries point into it
+    m_surface_places.clear();
+    m_surface_places.reserve(m_members.size()); // and these into that
     m_places.assign(m_members.size(), {});
     m_top = RaySceneHandle(rtcNewScene(m_device.get()));
+    m_placed_meshes.clear();
+    for (const Member& member : m_members)
+        if (!member.frame_from_mesh.IsIdentity())
+            m_placed_meshes.insert(member.mesh.get());
 
     for (std::size_t i = 0; i < m_members.size(); ++i)
-        if (m_members[i].mesh->mesh().m_F.size() >= large_mesh_triangles)
-            addLarge(i, groups);
+        if (standsAlone(m_members[i]))
+            addSole(i, groups);
     const std::vector<std::size_t> small = smallMembersBySpace();
     std::size_t first = 0;
     while (first < small.size()) {
@@ -116,7 +164,7 @@ std::vector<std::size_t> RayScene::smallMembersBySpace() const {
     KM_BoundingBox box;
     std::vector<std::size_t> order;
     for (std::size_t i = 0; i < m_members.size(); ++i) {
-        if (m_members[i].mesh->mesh().m_F.size() >= large_mesh_triangles)
+        if (standsAlone(m_members[i]))
             continue;
         order.push_back(i);
         box.Union(m_members[i].mesh->box());
@@ -153,30 +201,35 @@ void RayScene::place(std::size_t member, unsigned geometry) {
     m_places[member] = {m_instances.size() - 1, geometry};
     ++m_instances.back().visible_members;
     m_surfaces.push_back(m_members[member].surface);
+    if (m_instances.back().placed) {
+        m_surface_places.push_back(placeOf(m_members[member].frame_from_mesh));
+        m_surfaces.back().place = &m_surface_places.back();
+    }
 }
 
-void RayScene::addInstance(std::shared_ptr<Group> group) {
+void RayScene::addInstance(std::shared_ptr<Group> group, const KM_Xform& frame_from_mesh) {
     RayGeometry instance(rtcNewGeometry(m_device.get(), RTC_GEOMETRY_TYPE_INSTANCE));
     rtcSetGeometryInstancedScene(instance.get(), group->scene.get());
-    rtcSetGeometryTransform(instance.get(), 0, RTC_FORMAT_FLOAT3X4_COLUMN_MAJOR, identity.data());
+    rtcSetGeometryTransform(instance.get(), 0, RTC_FORMAT_FLOAT3X4_COLUMN_MAJOR,
+                            columnsOf(frame_from_mesh).data());
     rtcCommitGeometry(instance.get());
     rtcAttachGeometryByID(m_top.get(), instance.get(), static_cast<unsigned>(m_instances.size()));
     m_first_surfaces.push_back(static_cast<std::uint32_t>(m_surfaces.size()));
-    m_instances.push_back({std::move(group), std::move(instance), 0, true});
+    m_instances.push_back(
+        {std::move(group), std::move(instance), !frame_from_mesh.IsIdentity(), 0, true});
 }
 
-void RayScene::addLarge(std::size_t member, std::vector<std::shared_ptr<Group>>& earlier) {
-    const RayMesh* mesh = m_members[member].mesh.get();
+void RayScene::addSole(std::size_t member, SoleGroups& groups) {
+    const KM_Xform& frame_from_mesh = m_members[member].frame_from_mesh;
     const bool cutout = m_members[member].surface.has_cutout;
-    const auto same = [mesh](const auto& group) { return group->sole_mesh == mesh; };
-    const auto found = std::find_if(earlier.begin(), earlier.end(), same);
-    if (found != earlier.end() && !cutout) {
-        addInstance(*found);
+    std::shared_ptr<Group>& group = groups[keyOf(m_members[member])];
+    if (group) {
+        addInstance(group, frame_from_mesh);
         place(member, 0);
         return;
     }
-    auto group = makeGroup();
-    addInstance(group);
+    group = makeGroup();
+    addInstance(group, frame_from_mesh);
     place(member, 0);
     group->geometries.push_back(makeTriangles(member));
     RTCGeometry geometry = group->geometries.back().get();
@@ -184,8 +237,7 @@ void RayScene::addLarge(std::size_t member, std::vector<std::shared_ptr<Group>>&
         rtcSetGeometryUserData(geometry, &m_surfaces.back());
         setAlphaCutout(geometry);
     } else {
-        group->sole_mesh = mesh;
-        earlier.push_back(group);
+        group->sole_mesh = m_members[member].mesh.get();
     }
     rtcCommitGeometry(geometry);
     rtcAttachGeometryByID(group->scene.get(), geometry, 0);
@@ -193,7 +245,7 @@ void RayScene::addLarge(std::size_t member, std::vector<std::shared_ptr<Group>>&
 
 void RayScene::addSmall(std::span<const std::size_t> members) {
     auto group = makeGroup();
-    addInstance(group);
+    addInstance(group, KM_Xform());
     for (const std::size_t member : members) {
         const auto id = static_cast<unsigned>(group->geometries.size());
         place(member, id);
@@ -240,19 +292,19 @@ void RayScene::commit() {
     chooseRoot();
 }
 
-/// One group needs no instance above it: rays reach it directly, which saves about an eighth of
-/// their time.
+/// One group that stands where its vertices say needs no instance above it: rays reach it
+/// directly, which saves about an eighth of their time.
 void RayScene::chooseRoot() {
     const auto shown = [](const Instance& instance) { return instance.enabled; };
     const auto count = std::count_if(m_instances.begin(), m_instances.end(), shown);
+    const auto sole = std::find_if(m_instances.begin(), m_instances.end(), shown);
     m_root = nullptr;
     m_sole_first_surface = 0;
-    if (count == 1) {
-        const auto sole = std::find_if(m_instances.begin(), m_instances.end(), shown);
+    if (count == 1 && !sole->placed) {
         m_root = sole->group->scene.get();
         m_sole_first_surface =
             m_first_surfaces[static_cast<std::size_t>(sole - m_instances.begin())];
-    } else if (count > 1) {
+    } else if (count > 0) {
         rtcCommitScene(m_top.get());
         ++m_build_count;
         m_root = m_top.get();

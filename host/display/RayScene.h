@@ -3,24 +3,31 @@
 #include "host/display/RayHandle.h"
 #include "host/display/RayMesh.h"
 #include "host/display/RaySurface.h"
+#include "host/display/SurfacePlace.h"
+#include "kelmar/KM_Xform.h"
 
+#include <compare>
 #include <cstdint>
+#include <map>
 #include <memory>
 #include <span>
+#include <unordered_set>
 #include <vector>
 
 namespace quarn {
 
-/// The surfaces that rays meet. Meshes of many triangles get a scene of their own under an
-/// instance, small ones share one, so that showing or hiding an object rebuilds little: nothing
-/// for a large one, some thousand triangles for a small one.
+/// The surfaces that rays meet. Meshes of many triangles, and those that a transform puts into
+/// their place, get a scene of their own under an instance; the small others share one, so that
+/// showing or hiding an object rebuilds little: nothing for a large one, some thousand triangles
+/// for a small one.
 class RayScene {
 public:
-    /// One mesh object; `mesh` is drawable and `surface` describes it.
+    /// One mesh object; `mesh` is drawable and `surface` describes it, without its place.
     struct Member {
         std::shared_ptr<const RayMesh> mesh;
         RaySurface surface;
         bool visible = true;
+        KM_Xform frame_from_mesh; ///< affine; members that share a mesh share its search structure
     };
 
     RayScene();
@@ -43,6 +50,8 @@ public:
 
     /// How often a search structure, of a group or of all, was built.
     std::size_t buildCount() const { return m_build_count; }
+    /// How many meshes have search structures, however often they are shown.
+    std::size_t geometryCount() const;
 
     /// What the library complained of since the last call; empty when it did not.
     std::string takeError();
@@ -51,12 +60,13 @@ private:
     struct Group {
         RaySceneHandle scene;
         std::vector<RayGeometry> geometries;
-        const RayMesh* sole_mesh = nullptr; ///< of a large mesh: to find the group again
+        const RayMesh* sole_mesh = nullptr; ///< of a mesh that stands alone: to find it again
         bool changed = false;
     };
     struct Instance {
         std::shared_ptr<Group> group;
         RayGeometry geometry;
+        bool placed = false; ///< by a transform
         std::size_t visible_members = 0;
         bool enabled = true;
     };
@@ -65,13 +75,25 @@ private:
         unsigned geometry = 0;
     };
 
-    void addLarge(std::size_t member, std::vector<std::shared_ptr<Group>>& earlier);
+    /// What meshes must have in common to share a scene of their own.
+    struct GroupKey {
+        const RayMesh* mesh;
+        const MipTexture* cutout_texture;
+        float cutoff;
+        float opacity;
+        auto operator<=>(const GroupKey&) const = default;
+    };
+    using SoleGroups = std::map<GroupKey, std::shared_ptr<Group>>;
+
+    bool standsAlone(const Member& member) const;
+    GroupKey keyOf(const Member& member) const;
+    void addSole(std::size_t member, SoleGroups& groups);
     void addSmall(std::span<const std::size_t> members);
-    void addInstance(std::shared_ptr<Group> group);
+    void addInstance(std::shared_ptr<Group> group, const KM_Xform& frame_from_mesh);
     void place(std::size_t member, unsigned geometry);
     RayGeometry makeTriangles(std::size_t member) const;
     std::shared_ptr<Group> makeGroup() const;
-    std::vector<std::shared_ptr<Group>> largeGroups() const;
+    SoleGroups soleGroups() const;
     std::vector<std::size_t> smallMembersBySpace() const;
     void chooseRoot();
 
@@ -81,10 +103,12 @@ private:
     RTCScene m_root = nullptr;
     std::uint32_t m_sole_first_surface = 0;
     std::vector<Member> m_members;
-    std::vector<Place> m_places; ///< by member
+    std::vector<Place> m_places;                        ///< by member
+    std::unordered_set<const RayMesh*> m_placed_meshes; ///< some member puts them elsewhere
     std::vector<Instance> m_instances;
     std::vector<std::uint32_t> m_first_surfaces;
     std::vector<RaySurface> m_surfaces;
+    std::vector<SurfacePlace> m_surface_places;
     std::size_t m_build_count = 0;
 };
 

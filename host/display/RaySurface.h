@@ -10,6 +10,7 @@ struct KM_MeshTriangle;
 namespace quarn {
 
 class MipTexture;
+struct SurfacePlace;
 
 /// What the ray loops need to know of one mesh object. Pointers live as long as the scene is not
 /// updated.
@@ -20,6 +21,7 @@ struct RaySurface {
     const KM_2fPoint* texture_coordinates = nullptr; ///< null unless there is a texture
     const KM_Color* colors = nullptr;                ///< null when vertices have no colours
     const MipTexture* texture = nullptr;
+    const SurfacePlace* place = nullptr; ///< null: the vertices are in the frame's coordinates
     float albedo[3] = {0.6F, 0.6F, 0.6F}; ///< linear base colour
     float opacity = 1.0F;                 ///< of the base colour
     bool has_cutout = false;

@@ -6,6 +6,7 @@
 #include "kelmar/KM_Light.h"
 #include "kelmar/KM_Mesh.h"
 #include "kelmar/KM_Uuid.h"
+#include "kelmar/KM_Xform.h"
 
 #include <cstdint>
 #include <memory>
@@ -20,6 +21,7 @@ struct SceneMesh {
     std::shared_ptr<const KM_Mesh> mesh;
     std::shared_ptr<const Material> material; ///< null: the default material
     bool visible = true;
+    KM_Xform world_from_mesh; ///< affine; objects may share a mesh
 };
 
 /// A curve object, already flattened to a polyline in world coordinates.

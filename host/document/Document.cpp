@@ -147,7 +147,7 @@ void Document::addModel(const ImportedModel& model) {
     if (m_objects.empty())
         m_units = model.units;
     for (const ImportedMesh& mesh : model.meshes)
-        m_objects.addMesh(mesh.name, mesh.mesh, mesh.material);
+        m_objects.addMesh(mesh.name, mesh.mesh, mesh.material, KM_nil_uuid, mesh.world_from_mesh);
     for (const ImportedCurve& curve : model.curves)
         m_objects.addCurve(curve.name, std::make_unique<KM_PolylineCurve>(
                                            std::span(curve.points.Array(), curve.points.Count())));

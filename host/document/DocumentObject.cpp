@@ -2,6 +2,7 @@
 
 #include "host/app/Contract.h"
 #include "host/document/DocumentList.h"
+#include "host/document/PlacedMesh.h"
 
 namespace quarn {
 
@@ -12,8 +13,11 @@ const wchar_t* DocumentObject::kind() const {
 }
 
 KM_BoundingBox DocumentObject::boundingBox() const {
-    if (mesh)
-        return mesh->BoundingBox();
+    if (mesh) {
+        if (!m_mesh_box)
+            m_mesh_box = boxOfPlaced(*mesh, world_from_mesh);
+        return *m_mesh_box;
+    }
     if (curve)
         return curve->BoundingBox();
     return point ? KM_BoundingBox(*point, *point) : KM_BoundingBox::EmptyBoundingBox;

@@ -4,6 +4,7 @@
 #include "kelmar/KM_BoundingBox.h"
 #include "kelmar/KM_Curve.h"
 #include "kelmar/KM_Mesh.h"
+#include "kelmar/KM_Xform.h"
 #include "sdk/qncore/QnObject.h"
 
 #include <memory>
@@ -25,6 +26,9 @@ struct DocumentObject {
 
     std::shared_ptr<const KM_Mesh> mesh;      ///< shared with the ray scene, never changed
     std::shared_ptr<const Material> material; ///< of a mesh; null: the default material
+    /// Where the mesh stands: objects may share one, and one that lies far from the origin keeps
+    /// its digits by coordinates of its own. Affine and not flattening; set before the first use.
+    KM_Xform world_from_mesh;
     std::unique_ptr<KM_Curve> curve;
     std::optional<KM_3dPoint> point;
 
@@ -34,6 +38,9 @@ struct DocumentObject {
     KM_BoundingBox boundingBox() const;
 
     CQuarnObject face; ///< what plug-ins see of it
+
+private:
+    mutable std::optional<KM_BoundingBox> m_mesh_box; ///< found when it is first asked for
 };
 
 } // namespace quarn

@@ -40,7 +40,8 @@ void DocumentScene::takeObjects(const ObjectTable& objects) {
     m_content.revision = objects.revision();
     for (const auto& object : objects.objects()) {
         if (object->mesh)
-            m_content.meshes.push_back({object->id, object->mesh, object->material, true});
+            m_content.meshes.push_back(
+                {object->id, object->mesh, object->material, true, object->world_from_mesh});
         else if (object->curve)
             m_content.curves.push_back({object->id, displayPolyline(*object->curve)});
         else if (object->point)

@@ -13,6 +13,7 @@ ObjectContent contentOf(const DocumentObject& object) {
     content.visible = object.visible;
     content.mesh = object.mesh;
     content.material = object.material;
+    content.world_from_mesh = object.world_from_mesh;
     if (object.curve)
         content.curve.reset(object.curve->Duplicate());
     content.point = object.point;
@@ -33,7 +34,8 @@ ViewContent contentOf(const ViewState& view, bool is_active) {
 
 DocumentObject& add(ObjectTable& objects, const ObjectContent& content) {
     if (content.mesh)
-        return objects.addMesh(content.name, content.mesh, content.material, content.id);
+        return objects.addMesh(content.name, content.mesh, content.material, content.id,
+                               content.world_from_mesh);
     if (content.curve)
         return objects.addCurve(content.name, std::unique_ptr<KM_Curve>(content.curve->Duplicate()),
                                 content.id);
@@ -57,6 +59,8 @@ DocumentContent Document::content(bool only_selected) const {
         content.views.push_back(contentOf(*view, view.get() == m_active_view));
     for (const NamedView& camera : m_named_views)
         content.cameras.push_back({camera.name, camera.viewport});
+    for (const auto& [display_mode, choice] : m_edges)
+        content.edges.push_back({display_mode, choice});
     content.settings.light_slots = m_lights.count();
     for (const auto& [index, slot] : m_lights.live())
         content.lights.push_back({index, slot.Light()});
@@ -69,6 +73,8 @@ std::vector<std::string> Document::openContent(const DocumentContent& content) {
     m_sun.restore(content.settings.sun_enabled, content.settings.direction_to_sun);
     addObjects(content);
     addCameras(content);
+    for (const EdgesContent& edges : content.edges)
+        setEdgesOf(edges.display_mode, edges.choice);
     for (const LightContent& light : content.lights) {
         m_lights.addDeletedUpTo(light.index);
         m_lights.add(light.light);

@@ -21,7 +21,8 @@ public:
     /// @return the object; valid until it is removed
     DocumentObject& addMesh(const KM_wString& name, std::shared_ptr<const KM_Mesh> mesh,
                             std::shared_ptr<const Material> material,
-                            const KM_UUID& id = KM_nil_uuid);
+                            const KM_UUID& id = KM_nil_uuid,
+                            const KM_Xform& world_from_mesh = KM_Xform());
     DocumentObject& addCurve(const KM_wString& name, std::unique_ptr<KM_Curve> curve,
                              const KM_UUID& id = KM_nil_uuid);
     DocumentObject& addPoint(const KM_wString& name, const KM_3dPoint& point,

@@ -18,10 +18,20 @@ constexpr double CLEARANCE_OF_SIZE = 0.005;
 
 constexpr double CHORD_TOLERANCE_OF_SIZE = 1e-4;
 
+template <class Visit>
+void visitVertices(const KM_Mesh& mesh, const KM_Xform& world_from_mesh, Visit&& visit) {
+    if (world_from_mesh.IsIdentity()) {
+        for (const KM_3fPoint& vertex : mesh.m_V)
+            visit(vertex.ToDouble());
+        return;
+    }
+    for (const KM_3fPoint& vertex : mesh.m_V)
+        visit(world_from_mesh * vertex.ToDouble());
+}
+
 template <class Visit> void visitPoints(const DocumentObject& object, Visit&& visit) {
     if (object.mesh) {
-        for (const KM_3fPoint& vertex : object.mesh->m_V)
-            visit(vertex.ToDouble());
+        visitVertices(*object.mesh, object.world_from_mesh, visit);
     } else if (object.curve) {
         KM_3dPointArray points;
         const double size = object.curve->BoundingBox().Diagonal().Length();

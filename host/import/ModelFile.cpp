@@ -1,5 +1,6 @@
 #include "host/import/ModelFile.h"
 
+#include "host/import/CoordinateShift.h"
 #include "host/import/LargeStack.h"
 #include "host/import/ModelFileAccess.h"
 #include "host/import/ModelFileCheck.h"
@@ -15,6 +16,7 @@
 #include <algorithm>
 #include <array>
 #include <exception>
+#include <optional>
 #include <set>
 #include <string_view>
 
@@ -118,8 +120,13 @@ bool readScene(Assimp::Importer& importer, const fs::path& path) {
 Result<ImportedModel> readChecked(const fs::path& path, UpAxis up) {
     const ModelFolder folder(path);
     std::set<std::string> refused;
+    const std::optional<ShiftedFile> shifted = shiftFarCoordinates(path);
     Assimp::Importer importer;
-    importer.SetIOHandler(new ModelFileAccess(folder, refused)); // the importer owns it
+    auto* const access = new ModelFileAccess(folder, refused);
+    importer.SetIOHandler(access); // which owns it
+    if (shifted) {
+        access->replace(path, shifted->bytes);
+    }
     configure(importer);
     const std::string extension = path.extension().string();
     if (extension.empty() || !importer.IsExtensionSupported(extension)) {
@@ -131,7 +138,11 @@ Result<ImportedModel> readChecked(const fs::path& path, UpAxis up) {
     }
     const std::unique_ptr<aiScene> scene(importer.GetOrphanedScene());
     importer.FreeScene();
-    Result<ImportedModel> model = takeScene(*scene, folder, conventionsOf(*scene, path, up));
+    ModelConventions conventions = conventionsOf(*scene, path, up);
+    if (shifted) {
+        conventions.origin = shifted->origin;
+    }
+    Result<ImportedModel> model = takeScene(*scene, folder, conventions);
     if (!model) {
         return cannotReadModel(path, model.message(), repair);
     }

@@ -6,6 +6,7 @@
 #include "kelmar/KM_3dPointArray.h"
 #include "kelmar/KM_Mesh.h"
 #include "kelmar/KM_Viewport.h"
+#include "kelmar/KM_Xform.h"
 #include "kelmar/KM_wString.h"
 
 #include <filesystem>
@@ -15,11 +16,15 @@
 
 namespace quarn {
 
-/// A mesh of a model file, in world coordinates.
+/// A mesh object of a model file.
 struct ImportedMesh {
-    KM_wString name;                    ///< as the file has it, or the file's own name; never empty
-    std::shared_ptr<KM_Mesh> mesh;      ///< valid, with at least one triangle and vertex normals
+    KM_wString name; ///< as the file has it, or the file's own name; never empty
+    /// Valid, with at least one triangle and vertex normals. Objects that repeat a mesh share it.
+    std::shared_ptr<KM_Mesh> mesh;
     std::shared_ptr<Material> material; ///< shared between meshes; null: the file gives none
+    /// Where the mesh stands; not the identity for repeated meshes and for models far from the
+    /// origin.
+    KM_Xform world_from_mesh;
 };
 
 /// Line primitives of a model file that hang together, as one polyline in world coordinates. The
@@ -65,8 +70,12 @@ enum class UpAxis {
 ///   as they are. Files of these that were made Y-up are read with UpAxis::y.
 /// - Lengths of glTF and GLB are metres (Khronos Group, glTF 2.0 Specification, section 3.4); other
 ///   formats leave the units to whoever made the file.
-/// - The transforms of the file's nodes are applied, so a mesh that stands in a scene ten times
-///   becomes ten meshes. Mirroring turns the triangles' winding, so that outside stays outside.
+/// - The transforms of the file's nodes are applied. A mesh that stands in a scene ten times
+///   becomes ten objects that share it, each with its transform; where a mesh stands once, its
+///   vertices are in world coordinates, and mirroring turns the triangles' winding, so that outside
+///   stays outside.
+/// - A model that lies far from the origin has its vertices near a place of its own, to which the
+///   objects' transforms lead, because they have single precision.
 /// - Vertex normals of the file are kept, except those of STL, which only repeat the facets. Where
 ///   they are missing, vertices are smoothed over edges flatter than 40 degrees and sharp edges
 ///   stay sharp.

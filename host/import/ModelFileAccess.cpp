@@ -1,5 +1,7 @@
 #include "host/import/ModelFileAccess.h"
 
+#include <assimp/MemoryIOWrapper.h>
+
 namespace quarn {
 
 ModelFileAccess::ModelFileAccess(const ModelFolder& folder, std::set<std::string>& refused)
@@ -14,13 +16,25 @@ bool ModelFileAccess::mayRead(const char* path) const {
     return std::filesystem::is_regular_file(path, failure);
 }
 
+void ModelFileAccess::replace(const std::filesystem::path& path, std::string_view bytes) {
+    m_replaced = path;
+    m_bytes = bytes;
+}
+
 bool ModelFileAccess::Exists(const char* path) const {
     return mayRead(path);
 }
 
 Assimp::IOStream* ModelFileAccess::Open(const char* path, const char* mode) {
     const bool reading = mode != nullptr && mode[0] == 'r';
-    return reading && mayRead(path) ? DefaultIOSystem::Open(path, mode) : nullptr;
+    if (!reading || !mayRead(path)) {
+        return nullptr;
+    }
+    if (!m_replaced.empty() && m_replaced == path) {
+        return new Assimp::MemoryIOStream(reinterpret_cast<const std::uint8_t*>(m_bytes.data()),
+                                          m_bytes.size()); // the caller owns it
+    }
+    return DefaultIOSystem::Open(path, mode);
 }
 
 } // namespace quarn

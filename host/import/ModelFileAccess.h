@@ -6,6 +6,7 @@
 
 #include <set>
 #include <string>
+#include <string_view>
 
 namespace quarn {
 
@@ -17,6 +18,10 @@ public:
     /// @param refused  receives each refused name once; outlives this object
     ModelFileAccess(const ModelFolder& folder, std::set<std::string>& refused);
 
+    /// Hands out other bytes for one file than those on the disk.
+    /// @param bytes  outlive this object
+    void replace(const std::filesystem::path& path, std::string_view bytes);
+
     bool Exists(const char* path) const override;
     Assimp::IOStream* Open(const char* path, const char* mode) override;
 
@@ -25,6 +30,8 @@ private:
 
     const ModelFolder& m_folder;
     std::set<std::string>& m_refused;
+    std::filesystem::path m_replaced; ///< empty: none
+    std::string_view m_bytes;
 };
 
 } // namespace quarn

@@ -1,5 +1,6 @@
 #include "host/import/SceneReading.h"
 
+#include "host/document/PlacedMesh.h"
 #include "host/import/MaterialReading.h"
 #include "host/import/MeshConversion.h"
 #include "host/import/PolylineChains.h"
@@ -12,7 +13,9 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdint>
+#include <locale>
 #include <map>
+#include <sstream>
 #include <string_view>
 #include <utility>
 
@@ -98,11 +101,15 @@ public:
           m_materials(scene, folder, conventions.linear_colors, m_model.warnings) {}
 
     Result<ImportedModel> read() {
-        m_nodes = placedNodes(m_scene.mRootNode,
-                              m_conventions.turn_y_up ? zUpFromYUp() : KM_Xform::Identity());
+        const KM_Xform turn = m_conventions.turn_y_up ? zUpFromYUp() : KM_Xform::Identity();
+        const KM_3dVector from_file = m_conventions.origin - KM_3dPoint::Origin;
+        m_nodes = placedNodes(m_scene.mRootNode, turn * KM_Xform::Translation(from_file));
         if (countUses() > most_triangles) {
-            return Error{"its nodes show more than 100 million triangles in all"};
+            return Error{"its meshes have more than 100 million triangles in all"};
         }
+        const KM_BoundingBox box = placedBox();
+        m_origin = nearbyOrigin(box);
+        warnOfRounding(box);
         for (const PlacedNode& placed : m_nodes) {
             for (unsigned i = 0; i < placed.node->mNumMeshes; ++i) {
                 readMesh(placed, placed.node->mMeshes[i]);
@@ -114,6 +121,12 @@ public:
     }
 
 private:
+    /// A mesh that several nodes show is converted once.
+    struct SharedMesh {
+        bool repeated = false;
+        std::shared_ptr<KM_Mesh> mesh; ///< null until a node has shown it
+    };
+
     std::uint64_t countUses() {
         m_uses.assign(m_scene.mNumMeshes, 0);
         std::uint64_t triangles = 0;
@@ -122,11 +135,83 @@ private:
                 const unsigned mesh = placed.node->mMeshes[i];
                 if (mesh < m_scene.mNumMeshes) {
                     ++m_uses[mesh];
-                    triangles += m_scene.mMeshes[mesh]->mNumFaces;
+                    const bool copied = m_uses[mesh] == 1 || isFlattened(placed.world_from_node);
+                    triangles += copied ? m_scene.mMeshes[mesh]->mNumFaces : 0;
                 }
             }
         }
+        m_shared.resize(m_scene.mNumMeshes);
+        for (unsigned mesh = 0; mesh < m_scene.mNumMeshes; ++mesh) {
+            m_shared[mesh].repeated = m_uses[mesh] > 1;
+        }
         return triangles;
+    }
+
+    /// A transform without an inverse: what it makes cannot be shared.
+    static bool isFlattened(const KM_Xform& world_from_node) {
+        KM_Xform inverse = world_from_node;
+        return !world_from_node.IsValid() || !inverse.Invert() || !inverse.IsValid();
+    }
+
+    /// The box of the boxes of all triangle meshes where they stand.
+    KM_BoundingBox placedBox() {
+        m_boxes.resize(m_scene.mNumMeshes);
+        for (unsigned i = 0; i < m_scene.mNumMeshes; ++i) {
+            m_boxes[i] = boxOf(*m_scene.mMeshes[i]);
+        }
+        KM_BoundingBox all;
+        for (const PlacedNode& placed : m_nodes) {
+            for (unsigned i = 0; i < placed.node->mNumMeshes; ++i) {
+                addPlaced(placed, placed.node->mMeshes[i], all);
+            }
+        }
+        return all;
+    }
+
+    /// The reading library keeps coordinates in single precision, with 24 binary digits.
+    void warnOfRounding(const KM_BoundingBox& box) {
+        constexpr double visible_share = 1e-5;
+        double largest = 0.0;
+        for (unsigned i = 0; i < m_scene.mNumMeshes; ++i) {
+            const KM_BoundingBox& own = m_boxes[i];
+            for (int corner = 0; corner < 8 && own.IsValid() && m_uses[i] > 0; ++corner) {
+                const KM_3dPoint p = own.Corner(corner);
+                largest = std::max({largest, std::abs(p.x), std::abs(p.y), std::abs(p.z)});
+            }
+        }
+        const double step = std::ldexp(1.0, std::ilogb(std::max(largest, 1e-30)) - 23);
+        if (step > visible_share * box.Diagonal().Length() && box.Diagonal().Length() > 0.0) {
+            std::ostringstream text;
+            text.imbue(std::locale::classic());
+            text << "The model lies so far from the origin that its coordinates are rounded to "
+                    "multiples of "
+                 << step << ". Move it nearer, or export it as OBJ.";
+            m_model.warnings.push_back(text.str());
+        }
+    }
+
+    static KM_BoundingBox boxOf(const aiMesh& mesh) {
+        KM_BoundingBox box;
+        for (unsigned v = 0; v < mesh.mNumVertices; ++v) {
+            const aiVector3D& p = mesh.mVertices[v];
+            const KM_3dPoint point(p.x, p.y, p.z);
+            if (isUsablePoint(point)) {
+                box.Set(point);
+            }
+        }
+        return box;
+    }
+
+    void addPlaced(const PlacedNode& placed, unsigned mesh, KM_BoundingBox& all) const {
+        if (mesh >= m_boxes.size() || !m_boxes[mesh].IsValid()) {
+            return;
+        }
+        for (int corner = 0; corner < 8; ++corner) {
+            const KM_3dPoint point = placed.world_from_node * m_boxes[mesh].Corner(corner);
+            if (isUsablePoint(point)) {
+                all.Set(point);
+            }
+        }
     }
 
     void readMesh(const PlacedNode& placed, unsigned index) {
@@ -135,7 +220,7 @@ private:
         }
         const aiMesh& mesh = *m_scene.mMeshes[index];
         if (mesh.mPrimitiveTypes & aiPrimitiveType_TRIANGLE) {
-            readTriangles(placed, mesh);
+            readTriangles(placed, index);
         } else if (mesh.mPrimitiveTypes & aiPrimitiveType_LINE) {
             readLines(placed, mesh);
         } else if (mesh.mPrimitiveTypes & aiPrimitiveType_POINT) {
@@ -148,25 +233,57 @@ private:
     }
 
     void completeNewMesh() {
-        if (m_completed < m_model.meshes.size()) {
-            completeMesh(*m_model.meshes[m_completed++].mesh);
+        for (const std::shared_ptr<KM_Mesh>& mesh : m_incomplete) {
+            completeMesh(*mesh);
         }
+        m_incomplete.clear();
     }
 
-    void readTriangles(const PlacedNode& placed, const aiMesh& mesh) {
+    void readTriangles(const PlacedNode& placed, unsigned index) {
+        const aiMesh& mesh = *m_scene.mMeshes[index];
+        const bool shares = m_shared[index].repeated && !isFlattened(placed.world_from_node);
         const ReadMaterial& material = m_materials.at(mesh.mMaterialIndex);
+        std::shared_ptr<KM_Mesh> converted;
+        if (shares) {
+            converted = sharedMesh(index, material);
+        } else {
+            converted = convert(mesh, originFromWorld() * placed.world_from_node, material);
+        }
+        if (converted->m_F.empty()) {
+            return;
+        }
+        const KM_Xform world_from_mesh = shares ? placed.world_from_node : worldFromOrigin();
+        m_model.meshes.push_back(
+            {nameOf(placed, mesh), std::move(converted), material.material, world_from_mesh});
+    }
+
+    std::shared_ptr<KM_Mesh> sharedMesh(unsigned index, const ReadMaterial& material) {
+        std::shared_ptr<KM_Mesh>& mesh = m_shared[index].mesh;
+        if (mesh == nullptr) {
+            mesh = convert(*m_scene.mMeshes[index], KM_Xform(), material);
+        }
+        return mesh;
+    }
+
+    std::shared_ptr<KM_Mesh> convert(const aiMesh& mesh, const KM_Xform& place,
+                                     const ReadMaterial& material) {
         MeshReading reading;
-        reading.world_from_mesh = placed.world_from_node;
+        reading.world_from_mesh = place;
         reading.keep_normals = m_conventions.keep_normals;
         reading.linear_colors = m_conventions.linear_colors;
         reading.texture_coordinates = material.texture_coordinates;
         ConvertedMesh converted = convertTriangles(mesh, reading);
         m_triangles += mesh.mNumFaces;
         m_dropped += converted.triangles_dropped;
-        if (!converted.mesh->m_F.empty()) {
-            m_model.meshes.push_back(
-                {nameOf(placed, mesh), std::move(converted.mesh), material.material});
-        }
+        m_incomplete.push_back(converted.mesh);
+        return std::move(converted.mesh);
+    }
+
+    KM_Xform originFromWorld() const {
+        return KM_Xform::Translation(KM_3dPoint::Origin - m_origin);
+    }
+    KM_Xform worldFromOrigin() const {
+        return KM_Xform::Translation(m_origin - KM_3dPoint::Origin);
     }
 
     void readLines(const PlacedNode& placed, const aiMesh& mesh) {
@@ -267,7 +384,7 @@ private:
     double targetDistance(const KM_3dPoint& location, const KM_3dVector& direction) {
         if (!m_bounds.IsValid()) {
             for (const ImportedMesh& mesh : m_model.meshes) {
-                m_bounds.Union(mesh.mesh->BoundingBox());
+                m_bounds.Union(boxOfPlaced(*mesh.mesh, mesh.world_from_mesh));
             }
         }
         const double distance =
@@ -326,7 +443,10 @@ private:
     std::vector<PlacedNode> m_nodes;
     std::vector<std::uint64_t> m_uses; ///< how many more times each mesh is shown
     MeshReleases m_releases;
-    std::size_t m_completed = 0; ///< meshes of the model
+    std::vector<SharedMesh> m_shared;    ///< by mesh of the scene
+    std::vector<KM_BoundingBox> m_boxes; ///< likewise, in the mesh's own coordinates
+    std::vector<std::shared_ptr<KM_Mesh>> m_incomplete;
+    KM_3dPoint m_origin; ///< where the coordinates of meshes that stand once begin
     KM_BoundingBox m_bounds;
     std::uint64_t m_triangles = 0;
     std::uint64_t m_dropped = 0;

@@ -18,6 +18,7 @@ struct ModelConventions {
     /// The loader of glTF repeats a camera's place, which its node states already, and gives the
     /// vertical angle times the aspect for the horizontal one.
     bool gltf_cameras = false;
+    KM_3dPoint origin;    ///< where the scene's coordinates begin, in those of the file
     KM_wString file_name; ///< names what has no name of its own
 };
 

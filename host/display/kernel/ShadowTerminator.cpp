@@ -1,11 +1,30 @@
 #include "host/display/kernel/ShadowTerminator.h"
 
 #include "host/display/PackedNormal.h"
+#include "host/display/SurfacePlace.h"
 #include "kelmar/KM_Mesh.h"
 
 #include <algorithm>
 
 namespace quarn {
+
+namespace {
+
+/// A packed normal and an offset of a mesh in the coordinates of the frame.
+void standing(const RaySurface& surface, std::uint32_t packed_normal, const float (&offset)[3],
+              float (&normal_there)[3], float (&offset_there)[3]) {
+    float normal[3];
+    unpackNormal(packed_normal, normal);
+    if (surface.place) {
+        turn(surface.place->cofactors, normal, normal_there);
+        turn(surface.place->linear, offset, offset_there);
+        return;
+    }
+    std::copy_n(normal, 3, normal_there);
+    std::copy_n(offset, 3, offset_there);
+}
+
+} // namespace
 
 void liftToSmoothSurface(const RaySurface& surface, const RTCHit16& hit, int lane,
                          const float (&face)[3], RTCRay16& ray) {
@@ -24,12 +43,14 @@ void liftToSmoothSurface(const RaySurface& surface, const RTCHit16& hit, int lan
     for (std::size_t corner = 0; corner < 3; ++corner) {
         const KM_3fPoint& at = surface.vertices[vertex[corner]];
         float n[3];
-        unpackNormal(surface.corner_normals[3 * triangle + corner], n);
+        float from_vertex[3];
+        standing(surface, surface.corner_normals[3 * triangle + corner],
+                 {place[0] - at.x, place[1] - at.y, place[2] - at.z}, n, from_vertex);
         const float square = n[0] * n[0] + n[1] * n[1] + n[2] * n[2];
-        const float turn = n[0] * face[0] + n[1] * face[1] + n[2] * face[2] < 0.0F ? -1.0F : 1.0F;
+        const float side = n[0] * face[0] + n[1] * face[1] + n[2] * face[2] < 0.0F ? -1.0F : 1.0F;
         const float height =
-            turn * ((place[0] - at.x) * n[0] + (place[1] - at.y) * n[1] + (place[2] - at.z) * n[2]);
-        const float lift = -turn * weight[corner] * std::min(0.0F, height) / square;
+            side * (from_vertex[0] * n[0] + from_vertex[1] * n[1] + from_vertex[2] * n[2]);
+        const float lift = -side * weight[corner] * std::min(0.0F, height) / square;
         ray.org_x[lane] += lift * n[0];
         ray.org_y[lane] += lift * n[1];
         ray.org_z[lane] += lift * n[2];

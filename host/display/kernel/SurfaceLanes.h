@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/display/SurfacePlace.h"
 #include "host/display/kernel/RayPacket.h"
 #include "host/display/kernel/SurfacePaint.h"
 
@@ -22,12 +23,22 @@ inline LaneInts surfacesMet(const FrameSetup& frame, const RayPacket& packet) {
     return select(packet.hit, geometry + gathered(frame.first_surfaces, instance), LaneInts(0));
 }
 
-/// Turns the geometric normals toward the observer and gives them unit length.
-inline LaneVectors faceNormals(const RayPacket& packet) {
+inline LaneVectors turned(const float (&m)[3][3], const LaneVectors& v) {
+    return {v.x * m[0][0] + v.y * m[0][1] + v.z * m[0][2],
+            v.x * m[1][0] + v.y * m[1][1] + v.z * m[1][2],
+            v.x * m[2][0] + v.y * m[2][1] + v.z * m[2][2]};
+}
+
+/// The geometric normals in the coordinates of the meshes; upright where nothing was met.
+inline LaneVectors geometricNormals(const RayPacket& packet) {
     const RTCHit16& hit = packet.rays.hit;
     const LaneVectors straight_up{0.0F, 0.0F, 1.0F};
-    const LaneVectors normal = select(
-        packet.hit, LaneVectors{load(hit.Ng_x), load(hit.Ng_y), load(hit.Ng_z)}, straight_up);
+    return select(packet.hit, LaneVectors{load(hit.Ng_x), load(hit.Ng_y), load(hit.Ng_z)},
+                  straight_up);
+}
+
+/// Turns normals toward the observer and gives them unit length.
+inline LaneVectors faceNormals(const RayPacket& packet, const LaneVectors& normal) {
     const Lanes length = greatest(squareRoot(dot(normal, normal)), 1e-30F);
     const Lanes turn = select(dot(normal, packet.direction) > 0.0F, -1.0F, 1.0F);
     return normal * (turn / length);
@@ -53,8 +64,10 @@ inline LaneVectors smoothNormals(const RaySurface& surface, const RayPacket& pac
     const Lanes u = load(hit.u);
     const Lanes v = load(hit.v);
     const Lanes w = Lanes(1.0F) - u - v;
-    const LaneVectors sum{w * a.x + u * b.x + v * c.x, w * a.y + u * b.y + v * c.y,
-                          w * a.z + u * b.z + v * c.z};
+    LaneVectors sum{w * a.x + u * b.x + v * c.x, w * a.y + u * b.y + v * c.y,
+                    w * a.z + u * b.z + v * c.z};
+    if (surface.place)
+        sum = turned(surface.place->cofactors, sum);
     const Lanes length = greatest(squareRoot(dot(sum, sum)), 1e-30F);
     const Lanes turn = select(dot(sum, face) < 0.0F, -1.0F, 1.0F);
     return sum * (turn / length);
@@ -80,6 +93,11 @@ inline void paintLanes(const FrameSetup& frame, const RaySurface& surface, const
 
 inline void readSurface(const FrameSetup& frame, const RaySurface& surface, const RayPacket& packet,
                         const LaneMask& mask, SurfaceLanes& lanes) {
+    if (surface.place) {
+        const LaneVectors normal = turned(surface.place->cofactors, geometricNormals(packet));
+        lanes.face = select(mask, faceNormals(packet, normal), lanes.face);
+        lanes.normal = select(mask, lanes.face, lanes.normal);
+    }
     if (surface.corner_normals)
         lanes.normal = select(mask, smoothNormals(surface, packet, mask, lanes.face), lanes.normal);
     if (!frame.base_colors)
@@ -92,7 +110,7 @@ inline void readSurface(const FrameSetup& frame, const RaySurface& surface, cons
 /// Fills `lanes` for all rays that hit something. Most packets meet one surface only.
 inline void readSurfaces(const FrameSetup& frame, const RayPacket& packet, SurfaceLanes& lanes) {
     lanes.surface = surfacesMet(frame, packet);
-    lanes.face = faceNormals(packet);
+    lanes.face = faceNormals(packet, geometricNormals(packet));
     lanes.normal = lanes.face;
     lanes.albedo = uniformColor(frame.plain_albedo);
     alignas(64) std::uint32_t surfaces[lane_count];

@@ -1,6 +1,7 @@
 #include "host/display/kernel/SurfacePaint.h"
 
 #include "host/display/MipTexture.h"
+#include "host/display/SurfacePlace.h"
 #include "kelmar/KM_Mesh.h"
 
 #include <algorithm>
@@ -27,11 +28,14 @@ float textureLevel(const FrameSetup& frame, const RaySurface& surface, const RTC
     const float texels = std::fabs((b.x - a.x) * (c.y - a.y) - (c.x - a.x) * (b.y - a.y)) *
                          static_cast<float>(surface.texture->width()) *
                          static_cast<float>(surface.texture->height());
-    const float world = length(hit.Ng_x[lane], hit.Ng_y[lane], hit.Ng_z[lane]);
+    float normal[3] = {hit.Ng_x[lane], hit.Ng_y[lane], hit.Ng_z[lane]};
+    if (surface.place)
+        turn(surface.place->cofactors, {normal[0], normal[1], normal[2]}, normal);
+    const float world = length(normal[0], normal[1], normal[2]);
     const float side = frame.rays.pixel_size * (frame.rays.parallel ? 1.0F : distance);
     const float facing =
-        std::fabs(hit.Ng_x[lane] * ray.dir_x[lane] + hit.Ng_y[lane] * ray.dir_y[lane] +
-                  hit.Ng_z[lane] * ray.dir_z[lane]) /
+        std::fabs(normal[0] * ray.dir_x[lane] + normal[1] * ray.dir_y[lane] +
+                  normal[2] * ray.dir_z[lane]) /
         std::max(world * length(ray.dir_x[lane], ray.dir_y[lane], ray.dir_z[lane]), 1e-30F);
     const float covered = side * side / std::max(facing, 0.1F);
     const float ratio = texels * covered / std::max(world, 1e-30F);

@@ -14,7 +14,7 @@ namespace quarn {
 namespace {
 
 /// What an object consists of.
-enum class ObjectKind : std::int32_t { mesh = 1, curve = 2, point = 3 };
+enum class ObjectKind : std::int32_t { mesh = 1, curve = 2, point = 3, placed_mesh = 4 };
 
 /// How the pixels of a texture stand in the file.
 enum class PixelEncoding : std::int32_t { raw = 0 };
@@ -23,7 +23,7 @@ constexpr double UNIT_LENGTH_TOLERANCE = 1e-6;
 
 ObjectKind kindOf(const ObjectContent& object) {
     if (object.mesh)
-        return ObjectKind::mesh;
+        return object.world_from_mesh.IsIdentity() ? ObjectKind::mesh : ObjectKind::placed_mesh;
     return object.curve ? ObjectKind::curve : ObjectKind::point;
 }
 
@@ -82,6 +82,15 @@ template <class Step, class AnyMesh> bool meshFields(Step step, AnyMesh& mesh) {
 template <class Step, class AnyObject> bool attributeFields(Step step, AnyObject& object) {
     return step(object.id) && step(object.name) && step(object.visible) &&
            step.check(!KM_UuidIsNil(object.id));
+}
+
+/// An affine transform: three rows of four numbers.
+template <class Step, class AnyXform> bool placeFields(Step step, AnyXform& place) {
+    for (int i = 0; i < 3; ++i)
+        for (int j = 0; j < 4; ++j)
+            if (!step(place.m_xform[i][j]))
+                return false;
+    return step.check(place.IsValid() && place.Determinant() != 0.0);
 }
 
 template <class Step, class AnyView> bool viewFields(Step step, AnyView& view) {
@@ -181,6 +190,9 @@ bool writeObject(KM_BinaryArchive& archive, const ObjectContent& object, std::in
     switch (kind) {
     case ObjectKind::mesh:
         return archive.WriteInt(mesh) && archive.WriteInt(material);
+    case ObjectKind::placed_mesh:
+        return archive.WriteInt(mesh) && archive.WriteInt(material) &&
+               placeFields(FieldWriter(archive), object.world_from_mesh);
     case ObjectKind::curve:
         return writeCurve(archive, *object.curve);
     case ObjectKind::point:
@@ -193,12 +205,16 @@ bool writeObject(KM_BinaryArchive& archive, const ObjectContent& object, std::in
 bool readObject(KM_BinaryArchive& archive, const SharedContent& shared, ObjectContent& object) {
     ObjectKind kind = ObjectKind::mesh;
     FieldReader step(archive);
-    if (!attributeFields(step, object) || !step(kind, ObjectKind::mesh, ObjectKind::point))
+    if (!attributeFields(step, object) || !step(kind, ObjectKind::mesh, ObjectKind::placed_mesh))
         return false;
     switch (kind) {
     case ObjectKind::mesh:
         return readShared(archive, shared.meshes, false, object.mesh) &&
                readShared(archive, shared.materials, true, object.material);
+    case ObjectKind::placed_mesh:
+        return readShared(archive, shared.meshes, false, object.mesh) &&
+               readShared(archive, shared.materials, true, object.material) &&
+               placeFields(FieldReader(archive), object.world_from_mesh);
     case ObjectKind::curve:
         object.curve = readCurve(archive);
         return object.curve != nullptr;
@@ -222,6 +238,16 @@ bool writeCamera(KM_BinaryArchive& archive, const CameraContent& camera) {
 
 bool readCamera(KM_BinaryArchive& archive, CameraContent& camera) {
     return archive.ReadString(camera.name) && readViewport(archive, camera.viewport);
+}
+
+bool writeEdges(KM_BinaryArchive& archive, const EdgesContent& edges) {
+    return archive.WriteUuid(edges.display_mode) &&
+           FieldWriter(archive)(edges.choice, MeshEdgeChoice::none, MeshEdgeChoice::all);
+}
+
+bool readEdges(KM_BinaryArchive& archive, EdgesContent& edges) {
+    return archive.ReadUuid(edges.display_mode) &&
+           FieldReader(archive)(edges.choice, MeshEdgeChoice::none, MeshEdgeChoice::all);
 }
 
 bool writeLight(KM_BinaryArchive& archive, const LightContent& light) {

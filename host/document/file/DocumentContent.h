@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/display/DisplayMode.h"
 #include "host/document/Material.h"
 #include "host/document/UnitSystem.h"
 #include "kelmar/KM_BinaryArchive.h"
@@ -8,6 +9,7 @@
 #include "kelmar/KM_Mesh.h"
 #include "kelmar/KM_Uuid.h"
 #include "kelmar/KM_Viewport.h"
+#include "kelmar/KM_Xform.h"
 #include "kelmar/KM_wString.h"
 
 #include <cstdint>
@@ -29,6 +31,7 @@ struct ObjectContent {
     bool visible = true;
     std::shared_ptr<const KM_Mesh> mesh;
     std::shared_ptr<const Material> material; ///< of a mesh; null: the default material
+    KM_Xform world_from_mesh;                 ///< affine and not flattening
     std::shared_ptr<const KM_Curve> curve;
     std::optional<KM_3dPoint> point;
 };
@@ -64,6 +67,12 @@ struct SettingsContent {
     std::int32_t light_slots = 0; ///< of the light table, those of deleted lights too
 };
 
+/// Which edges of meshes a display mode draws, where that is not the mode's own choice.
+struct EdgesContent {
+    KM_UUID display_mode = KM_nil_uuid;
+    MeshEdgeChoice choice = MeshEdgeChoice::standard;
+};
+
 /// What a plug-in keeps in a document, as it wrote it: its version
 /// (KM_BinaryArchive::Write3dmChunkVersion), then what only the plug-in understands.
 struct PlugInContent {
@@ -85,6 +94,7 @@ struct DocumentContent {
     std::vector<ObjectContent> objects;
     std::vector<ViewContent> views;
     std::vector<CameraContent> cameras;
+    std::vector<EdgesContent> edges; ///< each display mode once
     std::vector<LightContent> lights; ///< by ascending index, each below settings.light_slots
     std::vector<PlugInContent> plug_ins;
     std::vector<UnknownContent> unknown;

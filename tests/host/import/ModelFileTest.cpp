@@ -158,15 +158,19 @@ TEST(ModelFile, BaseColourOfObjIsSrgbAlready) {
     EXPECT_EQ(model.meshes[0].material->base_color, (KM_Color{128, 255, 0, 255}));
 }
 
-TEST(ModelFile, MeshThatStandsTwiceBecomesTwoMeshesInTheirPlaces) {
+TEST(ModelFile, MeshThatStandsTwiceIsSharedByTwoObjectsInTheirPlaces) {
     const TemporaryFolder folder;
     const ImportedModel model = readOrFail(folder.write(
         "a.gltf", gltfTriangle(R"([{"children":[1,2]},{"mesh":0,"translation":[10,0,0]},)"
                                R"({"mesh":0,"scale":[2,2,2],"translation":[0,5,0]}])",
                                gray_half)));
     ASSERT_EQ(model.meshes.size(), 2U);
-    expectNear(model.meshes[0].mesh->BoundingBox().m_max, {11, 0, 1}, 1e-6);
-    expectNear(model.meshes[1].mesh->BoundingBox().m_max, {2, 0, 7}, 1e-6);
+    const auto box = [&](std::size_t i) {
+        return boxOfPlaced(*model.meshes[i].mesh, model.meshes[i].world_from_mesh);
+    };
+    EXPECT_EQ(model.meshes[0].mesh, model.meshes[1].mesh);
+    expectNear(box(0).m_max, {11, 0, 1}, 1e-6);
+    expectNear(box(1).m_max, {2, 0, 7}, 1e-6);
     EXPECT_EQ(model.meshes[0].material, model.meshes[1].material);
 }
 

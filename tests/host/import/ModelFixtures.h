@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/document/PlacedMesh.h"
 #include "host/import/ModelFile.h"
 #include "kelmar/KM_BoundingBox.h"
 #include "tests/support/TempFolder.h"
@@ -34,7 +35,7 @@ inline ImportedModel readOrFail(const std::filesystem::path& path) {
 inline KM_BoundingBox boundsOf(const ImportedModel& model) {
     KM_BoundingBox bounds = KM_BoundingBox::EmptyBoundingBox;
     for (const ImportedMesh& mesh : model.meshes) {
-        bounds.Union(mesh.mesh->BoundingBox());
+        bounds.Union(boxOfPlaced(*mesh.mesh, mesh.world_from_mesh));
     }
     return bounds;
 }
