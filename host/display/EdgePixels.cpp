@@ -101,8 +101,7 @@ bool differs(const EdgeRow& row, const EdgeRow& other, std::size_t at) {
 void markSteps(const EdgeRow& row, const EdgeRow& other, std::size_t count, std::uint8_t* marks,
                std::uint8_t* other_marks) {
     const auto mark = [&](std::size_t at) {
-        if (marks)
-            marks[at] = 1;
+        marks[at] = 1;
         if (other_marks)
             other_marks[at] = 1;
     };
