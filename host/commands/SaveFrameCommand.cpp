@@ -4,6 +4,7 @@
 #include "host/commands/CommandEnd.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/PictureSizePrompt.h"
+#include "host/commands/Rendering.h"
 #include "host/display/DisplayMode.h"
 #include "host/display/DisplayModeList.h"
 #include "host/display/ImageFile.h"
@@ -72,9 +73,6 @@ Result<Animation> storedAnimation(Document& document) {
     animation.record = record.value();
     if (!hasFrames(*animation.record))
         return Error{"The document has no animation. Set one up, or open a document that has one."};
-    if (animation.record->RenderFull() || animation.record->RenderPreview())
-        return Error{"The animation's frames are rendered; SaveFrame cannot render yet, it draws "
-                     "display modes only. Set the animation up with a display mode."};
     const auto view = viewOf(*animation.record, document);
     if (!view)
         return Error{view.message()};
@@ -128,9 +126,15 @@ CQuarnCommand::result askImageFile(FrameWish& wish) {
     return checked ? CQuarnCommand::success : fail(checked.message());
 }
 
+bool isRendered(const KM_3dmAnimationProperties& record) {
+    return record.RenderFull() || record.RenderPreview();
+}
+
 CQuarnCommand::result askWish(const Animation& animation, FrameWish& wish) {
-    wish.width_px = animation.view->frameWidth();
-    wish.height_px = animation.view->frameHeight();
+    const RenderSettings& settings = animation.view->document().renderWindow().settings;
+    const bool rendered = isRendered(*animation.record);
+    wish.width_px = rendered ? settings.width_px : animation.view->frameWidth();
+    wish.height_px = rendered ? settings.height_px : animation.view->frameHeight();
     const CQuarnCommand::result asked = askFrame(*animation.record, wish);
     return asked == CQuarnCommand::success ? askImageFile(wish) : asked;
 }
@@ -193,25 +197,44 @@ const CDisplayPipelineAttributes* recordedMode(const Animation& animation) {
     return mode ? mode : animation.view->currentAttributes();
 }
 
-CQuarnCommand::result saveFrame(const Animation& animation, const FrameWish& wish) {
+CQuarnCommand::result drawFrame(const Animation& animation, const FrameWish& wish,
+                                const FrameScene& scene, Image& picture) {
     const CDisplayPipelineAttributes* mode = recordedMode(animation);
     if (!mode)
         return fail("Neither the animation nor its view has a display mode. Choose one with "
                     "DisplayMode.");
+    DisplayModeAttributes attributes = drawingAttributes(*mode);
+    attributes.antialiasing_level = static_cast<int>(AntialiasingLevel::capture);
+    const auto drawn = animation.view->document().draw(scene.viewport, attributes, wish.width_px,
+                                                       wish.height_px, picture, scene.changes);
+    return drawn ? CQuarnCommand::success : fail(drawn.message());
+}
+
+CQuarnCommand::result renderFrame(const Animation& animation, const FrameWish& wish,
+                                  const FrameScene& scene, Image& picture) {
+    Document& document = animation.view->document();
+    const RenderSettings& settings = document.renderWindow().settings;
+    const int samples =
+        animation.record->RenderFull() ? settings.samples : settings.preview_samples;
+    const auto end = renderWatched(
+        document, scene.viewport, {wish.width_px, wish.height_px, samples}, picture, scene.changes);
+    if (!end)
+        return fail(end.message());
+    return end.value() == RenderEnd::done ? CQuarnCommand::success : CQuarnCommand::cancel;
+}
+
+CQuarnCommand::result saveFrame(const Animation& animation, const FrameWish& wish) {
     auto scene = isSunStudy(*animation.record) ? sunAtFrame(animation, wish.frame)
                                                : cameraAtFrame(animation, wish.frame);
     if (!scene)
         return fail(scene.message());
     fitToPicture(scene.value().viewport, *animation.view, wish);
-
-    DisplayModeAttributes attributes = drawingAttributes(*mode);
-    attributes.antialiasing_level = static_cast<int>(AntialiasingLevel::capture);
     CQuarnDib picture;
-    const auto drawn =
-        animation.view->document().draw(scene.value().viewport, attributes, wish.width_px,
-                                        wish.height_px, picture.Image(), scene.value().changes);
-    if (!drawn)
-        return fail(drawn.message());
+    const CQuarnCommand::result made =
+        isRendered(*animation.record) ? renderFrame(animation, wish, scene.value(), picture.Image())
+                                      : drawFrame(animation, wish, scene.value(), picture.Image());
+    if (made != CQuarnCommand::success)
+        return made;
     return picture.WriteToFile(textFromPath(wish.file), 0) ? CQuarnCommand::success
                                                            : CQuarnCommand::failure;
 }

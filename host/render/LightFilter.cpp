@@ -19,6 +19,12 @@ constexpr float least_albedo = 0.02F;
 /// The variance of a few samples says little; then it is taken to be as large as the light.
 constexpr int few_samples = 4;
 
+/// From so many on a pixel's own variance is sure enough.
+constexpr int many_samples = 32;
+
+/// Differences of up to so many standard deviations, squared, are taken for noise.
+constexpr float noise_spread = 9.0F;
+
 std::size_t pixelCount(const RenderLayers& layers) {
     return static_cast<std::size_t>(layers.width()) * static_cast<std::size_t>(layers.height());
 }
@@ -122,20 +128,26 @@ void LightFilter::readLight(int first, int square) {
     });
 }
 
-/// Neighbours know better than a pixel alone how far its samples scatter.
+/// Neighbours know better than a pixel alone how far its samples scatter, all the more the fewer
+/// these are.
 void LightFilter::smoothVariance() {
     const auto stride = static_cast<std::ptrdiff_t>(m_layers.width());
+    const int reach = m_samples < many_samples ? 3 : 1;
     forPixels(m_layers, [&](std::size_t pixel, int x, int y) {
         float sum = 0.0F;
         float weights = 0.0F;
-        for (int dy = y > 0 ? -1 : 0; dy <= (y + 1 < m_layers.height() ? 1 : 0); ++dy)
-            for (int dx = x > 0 ? -1 : 0; dx <= (x + 1 < m_layers.width() ? 1 : 0); ++dx) {
-                const float weight = static_cast<float>((2 - std::abs(dx)) * (2 - std::abs(dy)));
+        for (int dy = -std::min(reach, y); dy <= std::min(reach, m_layers.height() - 1 - y); ++dy)
+            for (int dx = -std::min(reach, x); dx <= std::min(reach, m_layers.width() - 1 - x);
+                 ++dx) {
                 const auto at = static_cast<std::ptrdiff_t>(pixel) + dy * stride + dx;
-                sum += weight * m_other.variance[static_cast<std::size_t>(at)];
+                const auto other = static_cast<std::size_t>(at);
+                const float weight =
+                    static_cast<float>((reach + 1 - std::abs(dx)) * (reach + 1 - std::abs(dy))) *
+                    m_cover[other];
+                sum += weight * m_other.variance[other];
                 weights += weight;
             }
-        m_light.variance[pixel] = sum / weights;
+        m_light.variance[pixel] = weights > 0.0F ? sum / weights : 0.0F;
     });
 }
 
@@ -159,7 +171,7 @@ void LightFilter::pass(int step) {
         row.cover = m_cover.data();
         row.nearness_share = m_nearness_share;
         row.nearness_tolerance = m_nearness_tolerance;
-        row.spread = 4.0F;
+        row.spread = noise_spread;
         row.weight = m_weight.data();
         m_kernel.filter_row(row);
     });

@@ -271,12 +271,16 @@ TEST_F(SaveFrame, AViewThatIsGoneIsNamed) {
     expectRefused(L"0", L"The animation names no view.");
 }
 
-TEST_F(SaveFrame, RenderedAnimationsAreRefused) {
+TEST_F(SaveFrame, RenderedAnimationsAreRendered) {
+    ASSERT_EQ(CQuarnCommand::success,
+              run(L"RenderSettings Size 32 24 Samples 4 PreviewSamples 1 _Enter"));
     record().SetRenderFull(true);
-    expectRefused(L"0", L"SaveFrame cannot render yet");
+    ASSERT_EQ(CQuarnCommand::success, save(L"0", file()));
+    const std::string full = readFile(file());
     record().SetRenderFull(false);
     record().SetRenderPreview(true);
-    expectRefused(L"0", L"SaveFrame cannot render yet");
+    ASSERT_EQ(CQuarnCommand::success, save(L"0", file()));
+    EXPECT_NE(full, readFile(file())) << "of fewer samples";
 }
 
 TEST_F(SaveFrame, ACameraInItsTargetIsTold) {

@@ -1,3 +1,4 @@
+#include "sdk/qncore/QnPlatform.h"
 #include "tests/host/app/TestCommand.h"
 #include "tests/host/document/DocumentFixtures.h"
 #include "tests/support/TempFolder.h"
@@ -121,6 +122,29 @@ TEST_F(SaveFrameTest, ThePictureHasTheSizeThatIsAskedFor) {
     view().setFrameSize(40, 30);
     ASSERT_EQ(save(L"0"), CQuarnCommand::success);
     EXPECT_EQ(std::filesystem::file_size(file), 54U + 30U * 120U);
+}
+
+TEST_F(SaveFrameTest, RenderedFrameHasTheRenderSizeAndShowsTheView) {
+    FrameKeeper keeper;
+    addBox(view().document(), {-5, -5, 0}, {5, 5, 5});
+    ASSERT_EQ(run(L"RenderSettings Size 24 16 Samples 4 PreviewSamples 2 _Enter"),
+              CQuarnCommand::success);
+    keeper.record.SetRenderFull(true);
+    ASSERT_EQ(save(L"1"), CQuarnCommand::success) << printed();
+    EXPECT_EQ(std::filesystem::file_size(file), 54U + 16U * 72U);
+    EXPECT_FALSE(view().document().renderWindow().isOpen()) << "the window is not used";
+    keeper.record.SetRenderFull(false);
+    keeper.record.SetRenderPreview(true);
+    ASSERT_EQ(save(L"Size 20 10 0"), CQuarnCommand::success) << printed();
+    EXPECT_EQ(std::filesystem::file_size(file), 54U + 10U * 60U);
+}
+
+TEST_F(SaveFrameTest, RenderingThatIsCancelledWritesNoFile) {
+    FrameKeeper keeper;
+    keeper.record.SetRenderFull(true);
+    front_end.setKeyDown(VK_ESCAPE, true);
+    EXPECT_EQ(save(L"Size 20 10 0"), CQuarnCommand::cancel);
+    EXPECT_FALSE(std::filesystem::exists(file));
 }
 
 } // namespace
