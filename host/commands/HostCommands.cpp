@@ -26,6 +26,8 @@ constexpr HostCommandEntry HOST_COMMANDS[] = {
     {L"CloseRenderWindow", "30A17DBD-DD67-4B3D-A394-BE3117B47643",
      L"Closes the render window and frees its picture", 41060, runCloseRenderWindow},
     {L"Delete", "A00A9CBC-19EA-489E-BD98-9FAB91F329FB", L"Deletes objects", 41018, runDelete},
+    {L"DisplayEdges", "6F0C52E8-93B4-4E1D-A7D6-58C1F09B3E24",
+     L"Chooses which edges of meshes the active view's display mode draws", 41070, runDisplayEdges},
     {L"DisplayMode", "5C41F5A0-CFFE-4818-98EF-F4CBFB9B9441",
      L"Chooses what the active view is drawn like", 41007, runDisplayMode},
     {L"EvenSpeed", "2B6A98EB-1420-47A0-9B52-7FC66AA3C316",

@@ -30,6 +30,7 @@ CQuarnCommand::result runCamera(const CQuarnCommandContext& context);
 CQuarnCommand::result runCircle(const CQuarnCommandContext& context);
 CQuarnCommand::result runCloseRenderWindow(const CQuarnCommandContext& context);
 CQuarnCommand::result runDelete(const CQuarnCommandContext& context);
+CQuarnCommand::result runDisplayEdges(const CQuarnCommandContext& context);
 CQuarnCommand::result runDisplayMode(const CQuarnCommandContext& context);
 CQuarnCommand::result runEvenSpeed(const CQuarnCommandContext& context);
 CQuarnCommand::result runFitView(const CQuarnCommandContext& context);

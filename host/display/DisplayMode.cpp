@@ -39,9 +39,13 @@ DisplayModeAttributes wireframe() {
     attributes.background_top = {240, 241, 243, 255};
     attributes.background_bottom = {240, 241, 243, 255};
     attributes.draws_edges = true;
-    attributes.draws_smooth_edges = true;
-    attributes.draws_silhouettes = true;
+    attributes.draws_outlines = true;
     attributes.shows_hidden_lines = true;
+    attributes.edge_width_px = 0.9F;
+    attributes.outline_width_px = 1.1F;
+    attributes.edge_strength = 0.72F;
+    attributes.far_strength = 0.45F;
+    attributes.crowded_strength = 1.0F;
     return attributes;
 }
 
@@ -65,9 +69,12 @@ DisplayModeAttributes translucent() {
 DisplayModeAttributes xRay() {
     auto attributes = mode(x_ray_mode_id, L"X-Ray", SurfaceStyle::x_ray);
     attributes.draws_edges = true;
-    attributes.draws_silhouettes = true;
+    attributes.draws_outlines = true;
     attributes.shows_hidden_lines = true;
-    attributes.edge_color = {46, 60, 84, 255};
+    attributes.edge_color = {24, 44, 78, 255};
+    attributes.edge_strength = 0.85F;
+    attributes.covered_strength = 0.55F;
+    attributes.crowded_strength = 1.0F;
     return attributes;
 }
 
@@ -76,9 +83,11 @@ DisplayModeAttributes drawing() {
     attributes.background_top = white;
     attributes.background_bottom = white;
     attributes.draws_edges = true;
-    attributes.draws_silhouettes = true;
+    attributes.draws_outlines = true;
     attributes.edge_color = {20, 20, 24, 255};
-    attributes.edge_width_px = 1.3F;
+    attributes.edge_width_px = 0.9F;
+    attributes.outline_width_px = 2.1F;
+    attributes.edge_strength = 0.85F;
     return attributes;
 }
 
@@ -87,6 +96,15 @@ DisplayModeAttributes clay() {
 }
 
 } // namespace
+
+DisplayModeAttributes withEdges(DisplayModeAttributes mode, MeshEdgeChoice choice) {
+    if (choice == MeshEdgeChoice::standard)
+        return mode;
+    mode.draws_edges = choice != MeshEdgeChoice::none;
+    mode.draws_all_edges = choice == MeshEdgeChoice::all;
+    mode.draws_outlines = mode.draws_outlines || mode.draws_edges;
+    return mode;
+}
 
 std::span<const DisplayModeAttributes> standardDisplayModes() {
     static const std::vector<DisplayModeAttributes> modes{

@@ -48,17 +48,34 @@ struct DisplayModeAttributes {
     KM_Color background_bottom{248, 248, 247, 255};
 
     bool draws_edges = false;        ///< borders and creases of meshes
-    bool draws_smooth_edges = false; ///< the other edges too, lighter
-    bool draws_silhouettes = false;  ///< where a smooth surface turns away from the camera
+    bool draws_all_edges = false;    ///< the other edges too, lighter
+    bool draws_outlines = false;     ///< where a surface turns away from the camera
     bool shows_hidden_lines = false; ///< lines behind surfaces are drawn too
     KM_Color edge_color{40, 44, 52, 255};
     float edge_width_px = 1.0F;
+    float outline_width_px = 1.4F;
+    float edge_strength = 1.0F;     ///< of creases and borders, 0 to 1; outlines have 1
+    float far_strength = 1.0F;      ///< of the farthest edges beside the nearest
+    float covered_strength = 1.0F;  ///< what each surface before an edge leaves of it, where the
+                                    ///< surfaces are see-through
+    float crowded_strength = 0.75F; ///< 1: edges fade fully where they crowd; 0: not at all
     float curve_width_px = 1.6F;
     float point_size_px = 5.0F;
 
     int antialiasing_level =
         1; ///< see AntialiasingLevel; a value beyond its range is moved into it
 };
+
+/// Which edges of meshes are drawn.
+enum class MeshEdgeChoice : int {
+    standard = 0, ///< as the display mode has it
+    none = 1,     ///< outlines alone, where the mode has them
+    features = 2, ///< borders and creases, and outlines
+    all = 3,      ///< every edge of every triangle
+};
+
+/// The mode with other edges than its own.
+DisplayModeAttributes withEdges(DisplayModeAttributes mode, MeshEdgeChoice choice);
 
 /// The display modes in the host's order, with English local names:
 /// Wireframe, Shaded, Rendered, Translucent, X-Ray, Drawing, Clay.

@@ -62,10 +62,17 @@ Result<void> DisplayPipeline::draw(const DisplayScene& scene, const KM_Viewport&
         depth_used->reference_depth = frame.rays.far_depth - frame.rays.setback;
         frame.nearness = depth_used->nearness.data();
     }
+    if (has_lines && frame.layers.count > 1) {
+        m_layers.assign(
+            static_cast<std::size_t>(width) * static_cast<std::size_t>(height) * layers_kept, 0.0F);
+        frame.layer_nearness = m_layers.data();
+    }
+    const float* const layers = frame.layer_nearness;
     drawSurfaces(frame, mode);
     if (has_lines)
         m_lines.draw(scene, frame.rays, mode,
-                     {frame.pixels, width, height, hides_lines ? depth_used : nullptr});
+                     {frame.pixels, width, height, hides_lines ? depth_used : nullptr,
+                      frame.rays.pixel_size, layers});
     return {};
 }
 
@@ -77,7 +84,10 @@ void DisplayPipeline::drawSurfaces(FrameSetup& frame, const DisplayModeAttribute
                          static_cast<std::size_t>(frame.height));
         frame.objects = m_objects.data();
     }
+    if (frame.scene && frame.sky_reach > 0.0F)
+        m_free_sky.find(frame, *m_kernel);
     traceAll(frame, *m_kernel);
+    frame.layer_nearness = nullptr; // the rays that smooth edges look beside the pixels' middles
     m_smoothed = 0;
     if (!smooths)
         return;

@@ -3,6 +3,7 @@
 #include "host/app/Result.h"
 #include "host/display/DisplayMode.h"
 #include "host/display/EdgePixels.h"
+#include "host/display/FreeSky.h"
 #include "host/display/Image.h"
 #include "host/display/LineDrawing.h"
 
@@ -48,7 +49,9 @@ private:
     const RayKernel* m_kernel;
     std::vector<std::uint32_t> m_objects;
     DepthImage m_depth;
+    std::vector<float> m_layers;
     EdgePixels m_edges;
+    FreeSky m_free_sky;
     LineDrawing m_lines;
     std::size_t m_smoothed = 0;
 };

@@ -13,6 +13,9 @@ namespace quarn {
 
 namespace {
 
+/// How far surfaces of clay hide the sky from each other.
+constexpr float sky_reach_of_scene = 0.09F;
+
 void set(float (&to)[3], const LinearColor& color) {
     to[0] = color.r;
     to[1] = color.g;
@@ -109,15 +112,41 @@ void setGround(FrameSetup& frame) {
 void setStyle(FrameSetup& frame, SurfaceStyle style) {
     frame.textures = style == SurfaceStyle::lit;
     if (style == SurfaceStyle::translucent)
-        frame.layers = {12, 0.42F, 0.85F};
+        frame.layers = {12, 0.36F, 0.85F, 0.55F};
     if (style == SurfaceStyle::x_ray)
-        frame.layers = {24, 0.10F, 0.75F};
+        frame.layers = {16, 0.10F, 0.75F, 0.12F};
     if (style == SurfaceStyle::clay || style == SurfaceStyle::x_ray || style == SurfaceStyle::paper)
         frame.base_colors = false;
     if (style == SurfaceStyle::clay)
-        set(frame.plain_albedo, {0.60F, 0.53F, 0.46F});
+        set(frame.plain_albedo, {0.86F, 0.86F, 0.86F});
     if (style == SurfaceStyle::x_ray)
         set(frame.plain_albedo, {0.42F, 0.58F, 0.76F});
+}
+
+/// Light without colour, more of it from the sky and less from the suns, so that shadows are soft:
+/// a model of plaster in a room with large windows.
+Lighting clayLighting(Lighting lighting) {
+    const auto grey = [](float r, float g, float b) {
+        return 0.2126F * r + 0.7152F * g + 0.0722F * b; // luminance by ITU-R BT.709
+    };
+    constexpr float sky = 1.5F;
+    constexpr float sun = 0.55F;
+    AmbientLight& ambient = lighting.ambient;
+    const float base = grey(ambient.base[0], ambient.base[1], ambient.base[2]);
+    float slope[3];
+    for (int i = 0; i < 3; ++i)
+        slope[i] = grey(ambient.slope[0][i], ambient.slope[1][i], ambient.slope[2][i]);
+    for (int c = 0; c < 3; ++c) {
+        ambient.base[c] = sky * base;
+        for (int i = 0; i < 3; ++i)
+            ambient.slope[c][i] = sky * slope[i];
+    }
+    for (auto* const lights : {&lighting.fixed, &lighting.suns})
+        for (DirectionalLight& light : *lights) {
+            const float white = sun * grey(light.color.r, light.color.g, light.color.b);
+            light.color = {white, white, white};
+        }
+    return lighting;
 }
 
 /// Paper gives back the background's colour from everywhere.
@@ -134,6 +163,8 @@ Lighting lightingOf(const DisplayScene& scene, const DisplayModeAttributes& mode
                     const CameraFrame& camera) {
     if (mode.surface_style == SurfaceStyle::paper)
         return paperLighting(mode.background_top);
+    if (mode.uses_document_lights && mode.surface_style == SurfaceStyle::clay)
+        return clayLighting(skyLighting(scene.lights(), mode.casts_shadows, camera));
     if (mode.uses_document_lights)
         return skyLighting(scene.lights(), mode.casts_shadows, camera);
     return studioLighting(camera);
@@ -154,6 +185,10 @@ FrameSetup makeFrameSetup(const DisplayScene& scene, const KM_Viewport& viewport
     setLighting(frame, lightingOf(scene, mode, camera));
     if (mode.has_ground_plane)
         setGround(frame);
+    if (mode.surface_style == SurfaceStyle::clay) {
+        frame.sky_reach = sky_reach_of_scene * frame.scene_size;
+        set(frame.ground_albedo, {0.84F, 0.84F, 0.84F});
+    }
     frame.has_sky = mode.has_sky;
     set(frame.background_top, sceneLightShownAs(mode.background_top));
     set(frame.background_bottom, sceneLightShownAs(mode.background_bottom));

@@ -3,8 +3,8 @@
 #include "host/display/CameraRays.h"
 #include "host/display/DisplayMode.h"
 #include "host/display/DisplayScene.h"
-#include "host/display/MeshEdges.h"
-#include "host/display/PackedNormal.h"
+#include "host/display/MeshLines.h"
+#include "host/display/VisibleParts.h"
 
 #include <tbb/parallel_for.h>
 
@@ -17,13 +17,14 @@ namespace {
 
 constexpr std::size_t lines_per_job = 8192;
 
-/// The smooth edges of a mesh fade out where they stand closer than this, in pixels.
+/// The inner edges of a mesh fade out where they stand closer than this, in pixels.
 constexpr double sparse_px = 10.0;
-constexpr double dense_px = 3.0;
-constexpr float smooth_edge_opacity = 0.42F;
+constexpr double dense_px = 1.5;
+constexpr float inner_edge_strength = 0.45F;
+constexpr float weakest_drawn = 0.03F;
 
 bool wantsEdges(const DisplayModeAttributes& mode) {
-    return mode.draws_edges || mode.draws_smooth_edges || mode.draws_silhouettes;
+    return mode.draws_edges || mode.draws_all_edges || mode.draws_outlines;
 }
 
 double depthOf(const CameraRays& rays, const KM_3dPoint& p) {
@@ -31,20 +32,22 @@ double depthOf(const CameraRays& rays, const KM_3dPoint& p) {
            (rays.eye[2] - p.z) * rays.camera_z[2];
 }
 
-/// How visible the smooth edges of a mesh are: a dense net would be a black spot.
-float smoothOpacity(const RayMesh& mesh, const CameraRays& rays) {
+/// How visible the inner edges of a mesh are: of a dense net nothing could be made out.
+float innerStrength(const DisplayScene::MeshObject& object, const KM_3dPoint& origin,
+                    const CameraRays& rays) {
     double pixel = rays.pixel_size;
+    const KM_3dPoint center = object.box.Center() + (KM_3dPoint::Origin - origin);
     if (!rays.parallel)
-        pixel *=
-            std::max(depthOf(rays, mesh.box().Center()), 1e-3 * mesh.box().Diagonal().Length());
-    const double spacing_px = mesh.edges().meanSmoothLength() / std::max(pixel, 1e-300);
+        pixel *= std::max(depthOf(rays, center), 1e-3 * object.box.Diagonal().Length());
+    const double length = object.mesh->edges().meanInnerLength() *
+                          std::cbrt(std::abs(object.frame_from_mesh.Determinant()));
+    const double spacing_px = length / std::max(pixel, 1e-300);
     const double t = std::clamp((spacing_px - dense_px) / (sparse_px - dense_px), 0.0, 1.0);
-    return smooth_edge_opacity * static_cast<float>(t);
+    return inner_edge_strength * static_cast<float>(t);
 }
 
 struct Point3 {
     double at[3];
-    explicit Point3(const KM_3fPoint& p) : at{p.x, p.y, p.z} {}
     explicit Point3(const KM_3dPoint& p) : at{p.x, p.y, p.z} {}
 };
 
@@ -55,36 +58,31 @@ void addLine(const ScreenProjection& projection, const Point3& from, const Point
         batch.add(segment);
 }
 
-/// True when one of the two triangles faces the observer and the other does not.
-bool isSilhouette(const MeshEdges::SmoothEdge& edge, const KM_3fPoint& place,
-                  const CameraRays& rays) {
-    const float view[3] = {
-        rays.parallel ? rays.camera_z[0] : static_cast<float>(rays.eye[0]) - place.x,
-        rays.parallel ? rays.camera_z[1] : static_cast<float>(rays.eye[1]) - place.y,
-        rays.parallel ? rays.camera_z[2] : static_cast<float>(rays.eye[2]) - place.z};
-    float a[3];
-    float b[3];
-    unpackNormal(edge.normal_a, a);
-    unpackNormal(edge.normal_b, b);
-    const float toward_a = a[0] * view[0] + a[1] * view[1] + a[2] * view[2];
-    const float toward_b = b[0] * view[0] + b[1] * view[1] + b[2] * view[2];
-    return (toward_a > 0.0F) != (toward_b > 0.0F);
-}
+/// The styles of a mode's mesh lines.
+struct MeshLineStyles {
+    LineStyle inner;
+    LineStyle creases;
+    LineStyle outlines;
 
-template <class Edges>
-void addEdges(const RayMesh& mesh, const Edges& edges, const ScreenProjection& projection,
-              LineBatch& batch) {
-    const auto& vertices = mesh.mesh().m_V;
-    for (const auto& edge : edges)
-        addLine(projection, Point3(vertices[edge.from]), Point3(vertices[edge.to]), batch);
-}
+    explicit MeshLineStyles(const DisplayModeAttributes& mode)
+        : inner{mode.edge_color, 1.0F, std::min(1.0F, mode.edge_width_px)},
+          creases{mode.edge_color, mode.edge_strength, mode.edge_width_px},
+          outlines{mode.edge_color, 1.0F, mode.edge_width_px, mode.outline_width_px} {
+        inner.crowded = mode.crowded_strength;
+        creases.crowded = mode.crowded_strength;
+        outlines.crowded = 0.75F * mode.crowded_strength;
+        for (LineStyle* const style : {&inner, &creases, &outlines})
+            style->covered_strength = mode.covered_strength;
+        creases.hidden_by_pixel = false;
+        outlines.hidden_by_pixel = false;
+    }
+};
 
-void addSilhouettes(const RayMesh& mesh, std::span<const MeshEdges::SmoothEdge> edges,
-                    const CameraRays& rays, const ScreenProjection& projection, LineBatch& batch) {
-    const auto& vertices = mesh.mesh().m_V;
-    for (const auto& edge : edges)
-        if (isSilhouette(edge, vertices[edge.from], rays))
-            addLine(projection, Point3(vertices[edge.from]), Point3(vertices[edge.to]), batch);
+void keepVisibleParts(const LineTarget& target, LineBatch& batch) {
+    const std::vector<ScreenSegment> all = batch.takeSegments();
+    VisibleParts parts(target);
+    for (const ScreenSegment& segment : all)
+        parts.add(segment, batch);
 }
 
 } // namespace
@@ -97,31 +95,45 @@ bool LineDrawing::hasLines(const DisplayScene& scene, const DisplayModeAttribute
            std::any_of(scene.points().begin(), scene.points().end(), shown);
 }
 
-void LineDrawing::list(Source source, std::size_t object, std::size_t count,
-                       const LineStyle& style) {
+void LineDrawing::list(Source source, std::size_t object, std::size_t count, const LineStyle& style,
+                       float strength) {
     for (std::size_t begin = 0; begin < count; begin += lines_per_job)
-        m_jobs.push_back({source, object, begin, std::min(count, begin + lines_per_job), style});
+        m_jobs.push_back(
+            {source, object, begin, std::min(count, begin + lines_per_job), style, strength});
 }
 
+/// Style by style, so that lines of one style cover a pixel once, whichever objects they are of.
 void LineDrawing::listMeshes(const DisplayScene& scene, const CameraRays& rays,
                              const DisplayModeAttributes& mode) {
     if (!wantsEdges(mode))
         return;
-    const LineStyle clear{mode.edge_color, 1.0F, mode.edge_width_px};
-    for (std::size_t i = 0; i < scene.meshes().size(); ++i) {
-        const auto& object = scene.meshes()[i];
-        if (!object.visible || !object.mesh)
-            continue;
-        const std::size_t smooth_count = object.mesh->edges().smooth().size();
-        const LineStyle faint{mode.edge_color, smoothOpacity(*object.mesh, rays),
-                              mode.edge_width_px};
-        if (mode.draws_smooth_edges && faint.opacity > 0.03F)
-            list(Source::smooth_edges, i, smooth_count, faint);
-        if (mode.draws_edges)
-            list(Source::features, i, object.mesh->edges().features().size(), clear);
-        if (mode.draws_silhouettes)
-            list(Source::silhouettes, i, smooth_count, clear);
-    }
+    const MeshLineStyles styles(mode);
+    const auto forEachMesh = [&](const auto& function) {
+        for (std::size_t i = 0; i < scene.meshes().size(); ++i)
+            if (scene.meshes()[i].visible && scene.meshes()[i].mesh)
+                function(i, scene.meshes()[i]);
+    };
+    if (mode.draws_all_edges)
+        forEachMesh([&](std::size_t i, const DisplayScene::MeshObject& object) {
+            const float strength = innerStrength(object, scene.origin(), rays);
+            if (strength <= weakest_drawn)
+                return;
+            const MeshEdges& edges = object.mesh->edges();
+            list(Source::flat, i, edges.flat().size(), styles.inner, strength);
+            list(Source::smooth, i, edges.smooth().size(), styles.inner, strength);
+        });
+    if (mode.draws_edges)
+        forEachMesh([&](std::size_t i, const DisplayScene::MeshObject& object) {
+            list(Source::creases, i, object.mesh->edges().features().size(), styles.creases);
+        });
+    if (mode.draws_edges || mode.draws_outlines)
+        forEachMesh([&](std::size_t i, const DisplayScene::MeshObject& object) {
+            list(Source::feature_outlines, i, object.mesh->edges().features().size(),
+                 styles.outlines);
+            if (mode.draws_outlines)
+                list(Source::smooth_outlines, i, object.mesh->edges().smooth().size(),
+                     styles.outlines);
+        });
 }
 
 void LineDrawing::listCurvesAndPoints(const DisplayScene& scene,
@@ -137,6 +149,27 @@ void LineDrawing::listCurvesAndPoints(const DisplayScene& scene,
             list(Source::point, i, 1, {scene.points()[i].color, 1.0F, mode.point_size_px});
 }
 
+void LineDrawing::addMeshLines(const Job& job, const MeshLines& lines, const MeshEdges& edges,
+                               LineBatch& batch) {
+    const std::size_t count = job.end - job.begin;
+    switch (job.source) {
+    case Source::flat:
+        lines.addAll(edges.flat().subspan(job.begin, count), batch);
+        break;
+    case Source::smooth:
+        lines.addAll(edges.smooth().subspan(job.begin, count), batch);
+        break;
+    case Source::creases:
+        lines.addInner(edges.features().subspan(job.begin, count), batch);
+        break;
+    case Source::feature_outlines:
+        lines.addOutlines(edges.features().subspan(job.begin, count), batch);
+        break;
+    default:
+        lines.addOutlines(edges.smooth().subspan(job.begin, count), batch);
+    }
+}
+
 void LineDrawing::draw(const DisplayScene& scene, const CameraRays& rays,
                        const DisplayModeAttributes& mode, const LineTarget& target) {
     m_jobs.clear();
@@ -144,31 +177,33 @@ void LineDrawing::draw(const DisplayScene& scene, const CameraRays& rays,
     listCurvesAndPoints(scene, mode);
     if (m_batches.size() < m_jobs.size())
         m_batches.resize(m_jobs.size());
-    const float margin =
-        std::max({mode.edge_width_px, mode.curve_width_px, mode.point_size_px}) + 1.0F;
+    const float margin = std::max({mode.edge_width_px, mode.outline_width_px, mode.curve_width_px,
+                                   mode.point_size_px}) +
+                         1.0F;
+    const KM_3dVector from_world = KM_3dPoint::Origin - scene.origin();
+    KM_BoundingBox box = scene.boundingBox();
+    if (box.IsValid())
+        box = {box.m_min + from_world, box.m_max + from_world};
     const ScreenProjection projection(rays, target.width, target.height, margin);
     tbb::parallel_for(std::size_t{0}, m_jobs.size(), [&](std::size_t index) {
         const Job& job = m_jobs[index];
         LineBatch& batch = m_batches[index];
         batch.reset(job.style);
-        const std::size_t count = job.end - job.begin;
         if (job.source == Source::curve) {
             const KM_3dPoint* const points = scene.curves()[job.object].polyline.Array();
             for (std::size_t i = job.begin; i < job.end; ++i)
-                addLine(projection, Point3(points[i]), Point3(points[i + 1]), batch);
+                addLine(projection, Point3(points[i] + from_world),
+                        Point3(points[i + 1] + from_world), batch);
         } else if (job.source == Source::point) {
-            const Point3 place(scene.points()[job.object].location);
+            const Point3 place(scene.points()[job.object].location + from_world);
             addLine(projection, place, place, batch);
         } else {
-            const RayMesh& mesh = *scene.meshes()[job.object].mesh;
-            const MeshEdges& edges = mesh.edges();
-            if (job.source == Source::features)
-                addEdges(mesh, edges.features().subspan(job.begin, count), projection, batch);
-            else if (job.source == Source::smooth_edges)
-                addEdges(mesh, edges.smooth().subspan(job.begin, count), projection, batch);
-            else
-                addSilhouettes(mesh, edges.smooth().subspan(job.begin, count), rays, projection,
-                               batch);
+            const DisplayScene::MeshObject& object = scene.meshes()[job.object];
+            const DepthFade fade(job.strength, mode.far_strength, rays, box);
+            const MeshLines lines(object, rays, projection, fade);
+            addMeshLines(job, lines, object.mesh->edges(), batch);
+            if (target.depth && !job.style.hidden_by_pixel)
+                keepVisibleParts(target, batch);
         }
         batch.sortIntoBands(target.height);
     });

@@ -8,6 +8,8 @@
 namespace quarn {
 
 class DisplayScene;
+class MeshEdges;
+class MeshLines;
 struct CameraRays;
 struct DisplayModeAttributes;
 
@@ -22,7 +24,7 @@ public:
               const LineTarget& target);
 
 private:
-    enum class Source { features, smooth_edges, silhouettes, curve, point };
+    enum class Source { flat, smooth, creases, feature_outlines, smooth_outlines, curve, point };
     /// A part of one object's lines, small enough for one task.
     struct Job {
         Source source;
@@ -30,12 +32,16 @@ private:
         std::size_t begin;
         std::size_t end;
         LineStyle style;
+        float strength;
     };
 
     void listMeshes(const DisplayScene& scene, const CameraRays& rays,
                     const DisplayModeAttributes& mode);
     void listCurvesAndPoints(const DisplayScene& scene, const DisplayModeAttributes& mode);
-    void list(Source source, std::size_t object, std::size_t count, const LineStyle& style);
+    void list(Source source, std::size_t object, std::size_t count, const LineStyle& style,
+              float strength = 1.0F);
+    static void addMeshLines(const Job& job, const MeshLines& lines, const MeshEdges& edges,
+                             LineBatch& batch);
 
     std::vector<Job> m_jobs;
     std::vector<LineBatch> m_batches;

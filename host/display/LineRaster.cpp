@@ -1,6 +1,9 @@
 #include "host/display/LineRaster.h"
 
 #include "host/display/Image.h"
+#include "host/display/LineCrowding.h"
+#include "host/display/VisibleParts.h"
+#include "host/display/kernel/FrameSetup.h"
 
 #include <tbb/parallel_for.h>
 
@@ -9,13 +12,21 @@
 
 namespace quarn {
 
+namespace {
+
+float widest(const LineStyle& style) {
+    return std::max(style.width_px, style.outline_width_px);
+}
+
+} // namespace
+
 void LineBatch::reset(const LineStyle& style) {
     m_style = style;
     m_segments.clear();
 }
 
 LineBatch::BandRange LineBatch::bandsOf(const ScreenSegment& s, int band_count) const {
-    const float reach = 0.5F * m_style.width_px + 0.5F;
+    const float reach = 0.5F * widest(m_style) + 0.5F;
     const auto band = [band_count](float y) {
         const float index = std::floor(y / static_cast<float>(band_height));
         return static_cast<int>(std::clamp(index, 0.0F, static_cast<float>(band_count - 1)));
@@ -55,12 +66,12 @@ namespace {
 /// One band of the picture, and how much of each pixel the lines of the present style cover.
 class Band {
 public:
-    Band(const LineTarget& target, int index)
-        : m_target(target), m_top(index * LineBatch::band_height),
+    Band(const LineTarget& target, const LineCrowding& crowding, int index)
+        : m_target(target), m_crowding(crowding), m_top(index * LineBatch::band_height),
           m_bottom(std::min(target.height, m_top + LineBatch::band_height)),
           m_cover(static_cast<std::size_t>(target.width) *
                   static_cast<std::size_t>(m_bottom - m_top)),
-          m_rows(static_cast<std::size_t>(m_bottom - m_top)) {}
+          m_rows(static_cast<std::size_t>(m_bottom - m_top)), m_surfaces(target) {}
 
     void setStyle(const LineStyle& style) {
         if (style == m_style)
@@ -77,25 +88,27 @@ private:
         int begin = 0;
         int end = 0;
     };
-
     void addSteep(const ScreenSegment& s, float reach);
     void addFlat(const ScreenSegment& s, float reach);
     void cover(int x, int y, const ScreenSegment& s);
-    bool isHidden(int x, int y, float nearness) const;
-    float surfaceNearness(int x, int y) const;
+    float leftByLayers(int x, int y, float nearness) const;
     void blendPixel(std::uint32_t& pixel, float amount) const;
 
     const LineTarget& m_target;
+    const LineCrowding& m_crowding;
     int m_top;
     int m_bottom;
     LineStyle m_style;
     std::vector<float> m_cover;
     std::vector<RowRange> m_rows; ///< where the cover is not 0
+    SurfaceView m_surfaces;
 };
 
 void Band::add(const ScreenSegment& s) {
-    const float reach = 0.5F * m_style.width_px + 0.5F;
-    if (std::fabs(s.to.x - s.from.x) >= std::fabs(s.to.y - s.from.y))
+    const float reach = 0.5F * widest(m_style) + 0.5F;
+    const float dx = s.to.x - s.from.x;
+    const float dy = s.to.y - s.from.y;
+    if (std::fabs(dx) >= std::fabs(dy))
         addFlat(s, reach);
     else
         addSteep(s, reach);
@@ -152,13 +165,20 @@ void Band::cover(int x, int y, const ScreenSegment& s) {
     const float ex = px - t * dx;
     const float ey = py - t * dy;
     const float distance = std::sqrt(ex * ex + ey * ey);
-    const float half = 0.5F * m_style.width_px;
-    const float amount = std::min(half + 0.5F - distance, std::min(1.0F, m_style.width_px));
     const auto row = static_cast<std::size_t>(y - m_top);
     float& covered =
         m_cover[row * static_cast<std::size_t>(m_target.width) + static_cast<std::size_t>(x)];
-    if (amount <= covered ||
-        isHidden(x, y, s.from.nearness + t * (s.to.nearness - s.from.nearness)))
+    const float strength = s.from.strength + t * (s.to.strength - s.from.strength);
+    const float growth = s.from.growth + t * (s.to.growth - s.from.growth);
+    const float width = m_style.width_px + growth * (widest(m_style) - m_style.width_px);
+    float amount = strength * std::min(0.5F * width + 0.5F - distance, std::min(1.0F, width));
+    if (amount <= covered)
+        return;
+    const float nearness = s.from.nearness + t * (s.to.nearness - s.from.nearness);
+    if (m_style.hidden_by_pixel && m_surfaces.hides(x, y, nearness))
+        return;
+    amount *= leftByLayers(x, y, nearness);
+    if (amount <= covered)
         return;
     covered = amount;
     RowRange& range = m_rows[row];
@@ -166,23 +186,32 @@ void Band::cover(int x, int y, const ScreenSegment& s) {
                            : RowRange{std::min(range.begin, x), std::max(range.end, x + 1)};
 }
 
-float Band::surfaceNearness(int x, int y) const {
-    const int column = std::clamp(x, 0, m_target.width - 1);
-    const int row = std::clamp(y, 0, m_target.height - 1);
-    return m_target.depth
-        ->nearness[static_cast<std::size_t>(row) * static_cast<std::size_t>(m_target.width) +
-                   static_cast<std::size_t>(column)];
-}
-
-/// A line on a surface is not hidden by it, nor is one that runs along its outline: the nearest
-/// point of the line may lie in the next pixel, so the farthest of the surfaces seen there counts.
-bool Band::isHidden(int x, int y, float nearness) const {
-    if (!m_target.depth)
-        return false;
-    const auto hides = [&](int column, int row) {
-        return nearness < (1.0F - 3e-4F) * surfaceNearness(column, row);
+/// See-through surfaces let lines behind them through, each a part.
+float Band::leftByLayers(int x, int y, float nearness) const {
+    if (!m_target.layers || m_style.covered_strength >= 1.0F)
+        return 1.0F;
+    int fewest = layers_kept;
+    const auto look = [&](int column, int row) {
+        const float* const layers =
+            m_target.layers +
+            (static_cast<std::size_t>(std::clamp(row, 0, m_target.height - 1)) *
+                 static_cast<std::size_t>(m_target.width) +
+             static_cast<std::size_t>(std::clamp(column, 0, m_target.width - 1))) *
+                layers_kept;
+        int before = 0;
+        while (before < fewest && nearness < (1.0F - 3e-4F) * layers[before])
+            ++before;
+        fewest = before;
     };
-    return hides(x, y) && hides(x - 1, y) && hides(x + 1, y) && hides(x, y - 1) && hides(x, y + 1);
+    look(x, y);
+    look(x - 1, y);
+    look(x + 1, y);
+    look(x, y - 1);
+    look(x, y + 1);
+    float left = 1.0F;
+    for (int i = 0; i < fewest; ++i)
+        left *= m_style.covered_strength;
+    return left;
 }
 
 void Band::blendPixel(std::uint32_t& pixel, float amount) const {
@@ -197,6 +226,11 @@ void Band::blendPixel(std::uint32_t& pixel, float amount) const {
 }
 
 void Band::blend() {
+    const auto freedom = [this](int x, int y) {
+        if (m_style.crowded <= 0.0F)
+            return 1.0F;
+        return 1.0F - m_style.crowded * (1.0F - m_crowding.strength(x, y));
+    };
     for (int y = m_top; y < m_bottom; ++y) {
         RowRange& range = m_rows[static_cast<std::size_t>(y - m_top)];
         float* const cover = m_cover.data() + static_cast<std::size_t>(y - m_top) *
@@ -205,19 +239,68 @@ void Band::blend() {
                                                          static_cast<std::size_t>(m_target.width);
         for (int x = range.begin; x < range.end; ++x) {
             if (cover[x] > 0.0F)
-                blendPixel(row[x], cover[x] * m_style.opacity);
+                blendPixel(row[x], cover[x] * m_style.opacity * freedom(x, y));
             cover[x] = 0.0F;
         }
         range = {};
     }
 }
 
+/// Adds the part of a segment that lies in a band, piece by piece.
+void addToCrowding(const ScreenSegment& s, float width, int top, int bottom,
+                   LineCrowding& crowding) {
+    constexpr float piece_px = 6.0F;
+    const float dx = s.to.x - s.from.x;
+    const float dy = s.to.y - s.from.y;
+    float enter = 0.0F;
+    float leave = 1.0F;
+    if (dy != 0.0F) {
+        const float a = (static_cast<float>(top) - s.from.y) / dy;
+        const float b = (static_cast<float>(bottom) - s.from.y) / dy;
+        enter = std::max(enter, std::min(a, b));
+        leave = std::min(leave, std::max(a, b));
+    } else if (s.from.y < static_cast<float>(top) || s.from.y >= static_cast<float>(bottom)) {
+        return;
+    }
+    if (leave <= enter)
+        return;
+    const float length = (leave - enter) * std::sqrt(dx * dx + dy * dy);
+    const int pieces = 1 + static_cast<int>(length / piece_px);
+    const float step = (leave - enter) / static_cast<float>(pieces);
+    const float area = width * length / static_cast<float>(pieces);
+    const auto inBand = [&](float y) {
+        return std::clamp(y, static_cast<float>(top), static_cast<float>(bottom) - 0.5F);
+    };
+    for (int i = 0; i < pieces; ++i) {
+        const float t = enter + (static_cast<float>(i) + 0.5F) * step;
+        crowding.add(s.from.x + t * dx, inBand(s.from.y + t * dy), area);
+    }
+}
+
+void findCrowding(std::span<const LineBatch> batches, int band, LineCrowding& crowding) {
+    const int top = band * LineBatch::band_height;
+    for (const LineBatch& batch : batches) {
+        if (batch.style().crowded <= 0.0F)
+            continue;
+        const float width = batch.style().width_px;
+        for (const std::uint32_t segment : batch.inBand(band))
+            addToCrowding(batch.segment(segment), width, top, top + LineBatch::band_height,
+                          crowding);
+    }
+}
+
 } // namespace
 
 void drawLines(std::span<const LineBatch> batches, const LineTarget& target) {
+    static_assert(LineCrowding::cell_size == LineBatch::band_height,
+                  "each band fills a row of cells of its own");
     const int band_count = (target.height + LineBatch::band_height - 1) / LineBatch::band_height;
+    LineCrowding crowding;
+    crowding.reset(target.width, target.height);
+    tbb::parallel_for(0, band_count, [&](int index) { findCrowding(batches, index, crowding); });
+    crowding.finish();
     tbb::parallel_for(0, band_count, [&](int index) {
-        Band band(target, index);
+        Band band(target, crowding, index);
         for (const LineBatch& batch : batches) {
             band.setStyle(batch.style());
             for (const std::uint32_t segment : batch.inBand(index))

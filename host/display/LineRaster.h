@@ -5,6 +5,7 @@
 
 #include <cstdint>
 #include <span>
+#include <utility>
 #include <vector>
 
 namespace quarn {
@@ -16,6 +17,11 @@ struct LineStyle {
     KM_Color color;
     float opacity = 1.0F;
     float width_px = 1.0F;
+    float outline_width_px = 0.0F; ///< what lines grow to, by their points' `growth`
+    /// Surfaces hide the line pixel by pixel; else the segments are seen as they are.
+    bool hidden_by_pixel = true;
+    float crowded = 0.0F;          ///< 1: the line fades fully where lines crowd; 0: not at all
+    float covered_strength = 1.0F; ///< what each see-through surface before the line leaves of it
     friend bool operator==(const LineStyle&, const LineStyle&) = default;
 };
 
@@ -28,6 +34,8 @@ public:
     /// Starts anew; keeps the storage.
     void reset(const LineStyle& style);
     void add(const ScreenSegment& segment) { m_segments.push_back(segment); }
+    /// Hands out the segments and has none then.
+    std::vector<ScreenSegment> takeSegments() { return std::exchange(m_segments, {}); }
     /// Sorts the segments into bands; call it once, after the last `add`.
     void sortIntoBands(int picture_height);
 
@@ -55,14 +63,18 @@ struct LineTarget {
     int width = 0;
     int height = 0;
     const DepthImage* depth = nullptr; ///< null: surfaces hide no lines
+    float pixel_size = 1.0F;           ///< see CameraRays; to tell how sharply surfaces bend
+    /// For each pixel how near its see-through surfaces are, `layers_kept` of them from the nearest
+    /// on, 0 where there are fewer; null: none cover lines.
+    const float* layers = nullptr;
 };
 
 /// Draws the batches over the picture, one band a task.
 ///
 /// A pixel is covered by half the width plus 0.5 minus the distance of its middle from the segment,
-/// between 0 and 1. Lines of one style that follow each other cover a pixel as much as the one of
-/// them that covers it most, so that joints are no darker than the lines. Covers are blended in
-/// sRGB, in which thin dark lines look evenly dark.
+/// between 0 and 1, times the line's strength there. Lines of one style that follow each other
+/// cover a pixel as much as the one of them that covers it most, so that joints are no darker than
+/// the lines. Covers are blended in sRGB, in which thin dark lines look evenly dark.
 void drawLines(std::span<const LineBatch> batches, const LineTarget& target);
 
 } // namespace quarn

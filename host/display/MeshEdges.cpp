@@ -6,6 +6,7 @@
 #include <algorithm>
 #include <bit>
 #include <cmath>
+#include <numeric>
 
 namespace quarn {
 
@@ -136,8 +137,8 @@ struct HalfEdgeTable {
     std::vector<HalfEdge> edges;
 };
 
-HalfEdgeTable halfEdges(const KM_Mesh& mesh, const std::vector<FaceNormal>& normals) {
-    const std::vector<std::uint32_t> welded = weldedVertices(mesh.m_V);
+HalfEdgeTable halfEdges(const KM_Mesh& mesh, const std::vector<std::uint32_t>& welded,
+                        const std::vector<FaceNormal>& normals) {
     HalfEdgeTable table;
     table.starts.assign(mesh.m_V.size() + 1, 0);
     forEachSide(mesh, welded, normals,
@@ -156,11 +157,89 @@ double length(const KM_3fPoint& a, const KM_3fPoint& b) {
     return a.ToDouble().DistanceTo(b.ToDouble());
 }
 
+std::uint32_t packed(const FaceNormal& n) {
+    return packNormal(n.x, n.y, n.z);
+}
+
+std::uint32_t triangleOf(const HalfEdge& edge) {
+    return edge.triangle & ~backward;
+}
+
+/// Vertices that hang together by edges: each points to another of its set, the root to itself (R.
+/// E. Tarjan, "Efficiency of a Good But Not Linear Set Union Algorithm", 1975).
+class VertexSets {
+public:
+    explicit VertexSets(std::size_t count) : m_parent(count) {
+        std::iota(m_parent.begin(), m_parent.end(), 0U);
+    }
+    std::uint32_t root(std::uint32_t v) {
+        while (m_parent[v] != v)
+            v = m_parent[v] = m_parent[m_parent[v]];
+        return v;
+    }
+    /// @return false when both were in one set already: the edge closes a loop
+    bool join(std::uint32_t a, std::uint32_t b) {
+        a = root(a);
+        b = root(b);
+        m_parent[std::max(a, b)] = std::min(a, b);
+        return a != b;
+    }
+
+private:
+    std::vector<std::uint32_t> m_parent;
+};
+
 } // namespace
 
+/// What the triangles at an edge are like.
+class EdgeFinder {
+public:
+    explicit EdgeFinder(const KM_Mesh& mesh)
+        : m_mesh(mesh), m_welded(weldedVertices(mesh.m_V)), m_normals(faceNormals(mesh)) {}
+
+    HalfEdgeTable table() const { return halfEdges(m_mesh, m_welded, m_normals); }
+    const FaceNormal& normal(const HalfEdge& edge) const { return m_normals[triangleOf(edge)]; }
+
+    /// @param cosine_between  of the normals of the two triangles
+    bool isCrease(const HalfEdge& a, const HalfEdge& b, std::uint32_t from,
+                  float cosine_between) const {
+        static const float unknown = cosine(MeshEdges::crease_angle_deg);
+        static const float broken = cosine(MeshEdges::broken_crease_deg);
+        static const float smooth = cosine(MeshEdges::smooth_crease_deg);
+        if (cosine_between >= broken)
+            return false;
+        if (m_mesh.m_N.size() != m_mesh.m_V.size())
+            return cosine_between < unknown;
+        if (cosine_between < smooth)
+            return true;
+        return !normalsRunOn(a, b, from) || !normalsRunOn(a, b, a.other);
+    }
+
+private:
+    std::uint32_t cornerAt(const HalfEdge& edge, std::uint32_t vertex) const {
+        const std::uint32_t* const corners = m_mesh.m_F[triangleOf(edge)].vi;
+        return *std::find_if(corners, corners + 2,
+                             [&](std::uint32_t v) { return m_welded[v] == vertex; });
+    }
+
+    /// True when both triangles have the same vertex normal here, give or take 8 degrees.
+    bool normalsRunOn(const HalfEdge& a, const HalfEdge& b, std::uint32_t vertex) const {
+        const auto& p = m_mesh.m_N[cornerAt(a, vertex)];
+        const auto& q = m_mesh.m_N[cornerAt(b, vertex)];
+        const float product = p.x * q.x + p.y * q.y + p.z * q.z;
+        const float squares =
+            (p.x * p.x + p.y * p.y + p.z * p.z) * (q.x * q.x + q.y * q.y + q.z * q.z);
+        return product > 0.99F * std::sqrt(squares);
+    }
+
+    const KM_Mesh& m_mesh;
+    std::vector<std::uint32_t> m_welded;
+    std::vector<FaceNormal> m_normals;
+};
+
 MeshEdges::MeshEdges(const KM_Mesh& mesh) {
-    const std::vector<FaceNormal> normals = faceNormals(mesh);
-    HalfEdgeTable table = halfEdges(mesh, normals);
+    const EdgeFinder finder(mesh);
+    HalfEdgeTable table = finder.table();
     for (std::uint32_t v = 0; v + 1 < table.starts.size(); ++v) {
         const auto begin = table.edges.begin() + table.starts[v];
         const auto end = table.edges.begin() + table.starts[v + 1];
@@ -169,34 +248,74 @@ MeshEdges::MeshEdges(const KM_Mesh& mesh) {
         for (auto first = begin; first != end;) {
             const auto last = std::find_if(
                 first, end, [first](const HalfEdge& e) { return e.other != first->other; });
-            classify(mesh, {first, last}, v, normals);
+            classify(finder, {first, last}, v);
             first = last;
         }
     }
-    if (!m_smooth.empty())
-        m_mean_smooth_length /= static_cast<double>(m_smooth.size());
+    dropAccidentalCreases(mesh);
+    measureInner(mesh);
 }
 
-void MeshEdges::classify(const KM_Mesh& mesh, std::span<const HalfEdge> alike, std::uint32_t from,
-                         std::span<const FaceNormal> normals) {
-    static const float crease_cosine = cosine(crease_angle_deg);
+void MeshEdges::classify(const EdgeFinder& finder, std::span<const HalfEdge> alike,
+                         std::uint32_t from) {
     static const float flat_cosine = cosine(flat_angle_deg);
     const std::uint32_t to = alike.front().other;
+    const FaceNormal& a = finder.normal(alike[0]);
     if (alike.size() != 2) {
-        m_features.push_back({from, to});
+        m_features.push_back({from, to, packed(a), packed({-a.x, -a.y, -a.z})});
         return;
     }
-    const FaceNormal& a = normals[alike[0].triangle & ~backward];
-    FaceNormal b = normals[alike[1].triangle & ~backward];
+    FaceNormal b = finder.normal(alike[1]);
     if ((alike[0].triangle & backward) == (alike[1].triangle & backward))
         b = {-b.x, -b.y, -b.z}; // wound the other way round
     const float c = dot(a, b);
-    if (c < crease_cosine)
-        m_features.push_back({from, to});
-    if (c < crease_cosine || c > flat_cosine)
+    if (c > flat_cosine)
+        m_flat.push_back({from, to});
+    else if (finder.isCrease(alike[0], alike[1], from, c))
+        m_features.push_back({from, to, packed(a), packed(b)});
+    else
+        m_smooth.push_back({from, to, packed(a), packed(b)});
+}
+
+void MeshEdges::dropAccidentalCreases(const KM_Mesh& mesh) {
+    if (m_features.empty() || m_smooth.empty())
         return;
-    m_smooth.push_back({from, to, packNormal(a.x, a.y, a.z), packNormal(b.x, b.y, b.z)});
-    m_mean_smooth_length += length(mesh.m_V[from], mesh.m_V[to]);
+    const auto isBorderOrBlade = [](const Edge& edge) {
+        float a[3];
+        float b[3];
+        unpackNormal(edge.normal_a, a);
+        unpackNormal(edge.normal_b, b);
+        return a[0] * b[0] + a[1] * b[1] + a[2] * b[2] < 0.0F;
+    };
+    VertexSets sets(mesh.m_V.size());
+    std::vector<std::uint32_t> looped;
+    for (const Edge& edge : m_features)
+        if (!sets.join(edge.from, edge.to) || isBorderOrBlade(edge))
+            looped.push_back(edge.from);
+    std::vector<float> worth(mesh.m_V.size(), 0.0F); // by root
+    for (const Edge& edge : m_features)
+        worth[sets.root(edge.from)] +=
+            static_cast<float>(length(mesh.m_V[edge.from], mesh.m_V[edge.to]));
+    const double size = mesh.BoundingBox().Diagonal().Length();
+    const auto enough = static_cast<float>(shortest_crease * size);
+    for (const std::uint32_t vertex : looped)
+        worth[sets.root(vertex)] = enough;
+    const auto accidental = [&](const Edge& edge) { return worth[sets.root(edge.from)] < enough; };
+    std::copy_if(m_features.begin(), m_features.end(), std::back_inserter(m_smooth), accidental);
+    std::erase_if(m_features, accidental);
+}
+
+void MeshEdges::measureInner(const KM_Mesh& mesh) {
+    const std::size_t count = m_smooth.size() + m_flat.size();
+    if (count == 0)
+        return;
+    double sum = 0.0;
+    const auto add = [&](const auto& edge) {
+        sum += length(mesh.m_V[edge.from], mesh.m_V[edge.to]);
+    };
+    std::for_each(m_smooth.begin(), m_smooth.end(), add);
+    std::for_each(m_flat.begin(), m_flat.end(), add);
+    m_mean_inner_length = sum / static_cast<double>(count);
 }
 
 } // namespace quarn

@@ -15,7 +15,8 @@ double dot(const double (&a)[3], const double (&b)[3]) {
 
 ScreenPoint between(const ScreenPoint& a, const ScreenPoint& b, float t) {
     return {a.x + t * (b.x - a.x), a.y + t * (b.y - a.y),
-            a.nearness + t * (b.nearness - a.nearness)};
+            a.nearness + t * (b.nearness - a.nearness), a.strength + t * (b.strength - a.strength),
+            a.growth + t * (b.growth - a.growth)};
 }
 
 } // namespace
@@ -40,7 +41,7 @@ ScreenPoint ScreenProjection::screenPoint(const CameraPoint& p) const {
     const double scale = m_parallel ? 1.0 : 1.0 / p.depth;
     return {static_cast<float>((p.x * scale - m_left) * m_pixels_per_x),
             static_cast<float>((m_top - p.y * scale) * m_pixels_per_y),
-            static_cast<float>(m_parallel ? m_far - p.depth : scale)};
+            static_cast<float>(m_parallel ? m_far - p.depth : scale), 1.0F, 1.0F};
 }
 
 bool ScreenProjection::project(const double (&from)[3], const double (&to)[3],

@@ -9,6 +9,8 @@ struct ScreenPoint {
     float x = 0.0F; ///< continuous pixels
     float y = 0.0F;
     float nearness = 0.0F;
+    float strength = 1.0F; ///< how clearly a line is drawn here, 0 to 1
+    float growth = 1.0F;   ///< how far it grows to an outline's width, 0 to 1
 };
 
 /// A straight piece of a line on the screen.

@@ -66,6 +66,7 @@ void Document::close() {
     m_render_window.close();
     m_objects = ObjectTable();
     m_named_views.clear();
+    m_edges.clear();
     *m_file_remainder = FileRemainder();
 }
 
@@ -188,6 +189,18 @@ Result<void> Document::draw(const KM_Viewport& viewport, const DisplayModeAttrib
     return draw(viewport, mode, width_px, height_px, picture, SceneChanges());
 }
 
+MeshEdgeChoice Document::edgesOf(const KM_UUID& display_mode) const {
+    const auto found = m_edges.find(display_mode);
+    return found == m_edges.end() ? MeshEdgeChoice::standard : found->second;
+}
+
+void Document::setEdgesOf(const KM_UUID& display_mode, MeshEdgeChoice choice) {
+    if (choice == MeshEdgeChoice::standard)
+        m_edges.erase(display_mode);
+    else
+        m_edges[display_mode] = choice;
+}
+
 Result<void> Document::updateScene(const SceneChanges& changes) {
     if (!m_scene)
         m_scene = std::make_unique<DocumentScene>();
@@ -209,7 +222,8 @@ Result<void> Document::draw(const KM_Viewport& viewport, const DisplayModeAttrib
         const auto updated = updateScene(changes);
         if (!updated)
             return updated;
-        return m_scene->draw(viewport, mode, width_px, height_px, picture);
+        return m_scene->draw(viewport, withEdges(mode, edgesOf(mode.id)), width_px, height_px,
+                             picture);
     } catch (const std::bad_alloc&) {
         picture = Image();
         return memoryLacks("drawn", width_px, height_px);

@@ -22,6 +22,7 @@ namespace quarn {
 class DocumentList;
 class DocumentScene;
 class FrontEnd;
+enum class MeshEdgeChoice : int;
 struct DisplayModeAttributes;
 struct DocumentContent;
 struct FileRemainder;
@@ -68,6 +69,9 @@ public:
     const ObjectTable& objects() const { return m_objects; }
     LightStore& lights() { return m_lights; }
     DocumentSun& sun() { return m_sun; }
+    /// Which edges of meshes a display mode draws in this document.
+    MeshEdgeChoice edgesOf(const KM_UUID& display_mode) const;
+    void setEdgesOf(const KM_UUID& display_mode, MeshEdgeChoice choice);
     CQuarnDocProperties& properties() { return m_properties; }
 
     const std::vector<std::unique_ptr<ViewState>>& views() const { return m_views; }
@@ -160,6 +164,7 @@ private:
     ObjectTable m_objects;
     LightStore m_lights;
     DocumentSun m_sun;
+    std::map<KM_UUID, MeshEdgeChoice> m_edges; ///< by display mode; none: as the mode has it
     double m_absolute_tolerance = default_absolute_tolerance;
     UnitSystem m_units = UnitSystem::none;
     std::filesystem::path m_file;

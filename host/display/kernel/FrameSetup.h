@@ -28,6 +28,28 @@ struct FrameLayers {
     int count = 1;             ///< how many surfaces a ray passes at most; 1: they are opaque
     float facing_opacity = 1;  ///< of a surface that faces the observer
     float edge_on_opacity = 1; ///< of one that is seen along its face
+    float stain = 0;           ///< 1: what comes through takes the surface's colour; 0: none of it
+};
+
+/// How many see-through surfaces of a pixel are kept, to tell what lies before a line.
+inline constexpr int layers_kept = 4;
+
+/// How many rays each pixel sends toward the sky to find how much of it is free.
+inline constexpr int sky_rays = 8;
+
+/// One direction for each pixel of a tile, about (0, 0, 1), the density of all being as the cosine
+/// of their angle to it; and how far each looks, as a part of `FrameSetup::sky_reach`.
+struct SkyDirections {
+    alignas(64) float x[lane_count];
+    alignas(64) float y[lane_count];
+    alignas(64) float z[lane_count];
+    alignas(64) float reach[lane_count];
+};
+
+/// What a pixel's middle shows, to compare neighbours.
+struct SkyPlace {
+    float normal[3];
+    float distance; ///< along the ray; negative: nothing
 };
 
 /// Everything that the ray loops need for one picture; plain numbers and pointers, because the
@@ -76,10 +98,18 @@ struct FrameSetup {
     float sky_disc[3] = {0, 0, 0};
     float toward_sun[3] = {0, 0, 1};
 
+    float sky_reach = 0.0F; ///< how far surfaces hide the sky from others; 0: not at all
+    const SkyDirections* sky_directions = nullptr; ///< sky_rays of them
+    SkyPlace* sky_places = nullptr;                ///< by pixel
+    float* free_sky = nullptr;                     ///< by pixel, 0 to 1
+
     const std::uint32_t* display_table = nullptr; ///< DisplayTable::entries()
 
-    std::uint32_t* pixels = nullptr;  ///< width * height, bytes r, g, b, a in memory
-    float* nearness = nullptr;        ///< see DepthImage; null when nobody asks
+    std::uint32_t* pixels = nullptr; ///< width * height, bytes r, g, b, a in memory
+    float* nearness = nullptr;       ///< see DepthImage; null when nobody asks
+    /// For each pixel how near its first layers are, `layers_kept` of them, 0 where there are
+    /// fewer; null when nobody asks.
+    float* layer_nearness = nullptr;
     std::uint32_t* objects = nullptr; ///< surface index + 1, or 0; null when nobody asks
 };
 
@@ -105,6 +135,9 @@ struct RayKernel {
     const char* name;
     void (*trace_block)(const FrameSetup& frame, const PixelBlock& block);
     void (*trace_samples)(const FrameSetup& frame, SamplePacket& samples);
+    /// Fills `sky_places` and `free_sky` of a block. What a pixel finds is rough; the pixels of a
+    /// tile together are right.
+    void (*find_free_sky)(const FrameSetup& frame, const PixelBlock& block);
 };
 
 /// The loops for the best processor that this one can stand in for.

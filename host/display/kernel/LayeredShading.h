@@ -17,17 +17,50 @@ inline Lanes layerOpacity(const FrameSetup& frame, const RayPacket& packet,
            layers.facing_opacity;
 }
 
+/// Stained glass: what comes through takes the colour of the surface.
+inline LaneColors passed(const FrameLayers& layers, const LaneColors& left, const Lanes& opacity,
+                         const LaneColors& albedo) {
+    const auto channel = [&](const Lanes& before, const Lanes& color) {
+        const Lanes stained = Lanes(1.0F) - (Lanes(1.0F) - color) * layers.stain;
+        return before * (Lanes(1.0F) - opacity) * stained;
+    };
+    return {channel(left.r, albedo.r), channel(left.g, albedo.g), channel(left.b, albedo.b)};
+}
+
+/// Keeps how near the layer is, for the lines behind it.
+inline void keepLayer(const FrameSetup& frame, const RayPacket& packet, int layer) {
+    alignas(64) float x[lane_count];
+    alignas(64) float y[lane_count];
+    alignas(64) float nearness[lane_count];
+    store(x, packet.x);
+    store(y, packet.y);
+    store(nearness, nearnessOf(frame, packet));
+    const unsigned active = bits(packet.active);
+    for (int i = 0; i < lane_count; ++i) {
+        if (!(active >> i & 1U))
+            continue;
+        const auto pixel = static_cast<std::size_t>(y[i]) * static_cast<std::size_t>(frame.width) +
+                           static_cast<std::size_t>(x[i]);
+        frame.layer_nearness[pixel * layers_kept + static_cast<std::size_t>(layer)] = nearness[i];
+    }
+}
+
 /// Lays one surface after the other under what was seen so far. `packet` holds the first hits.
 inline LaneColors shadeLayers(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfaces) {
     const LaneMask active = packet.active;
-    Lanes left = 1.0F; // what still comes through
+    LaneColors left{1.0F, 1.0F, 1.0F}; // what still comes through
     LaneColors sum{0.0F, 0.0F, 0.0F};
     for (int layer = 0; layer < frame.layers.count && any(packet.hit); ++layer) {
+        if (frame.layer_nearness && layer < layers_kept)
+            keepLayer(frame, packet, layer);
         const LaneColors shaded = shadeSurfaces(frame, packet, surfaces, packet.hit);
-        const Lanes part = select(packet.hit, left * layerOpacity(frame, packet, surfaces), 0.0F);
-        sum = {sum.r + part * shaded.r, sum.g + part * shaded.g, sum.b + part * shaded.b};
-        left = left - part;
-        packet.active = packet.hit & (left > 0.02F);
+        const Lanes part = select(packet.hit, layerOpacity(frame, packet, surfaces), 0.0F);
+        sum = {sum.r + left.r * part * shaded.r, sum.g + left.g * part * shaded.g,
+               sum.b + left.b * part * shaded.b};
+        left = select(packet.hit, passed(frame.layers, left, part, surfaces.albedo), left);
+        const LaneMask seen =
+            (left.r > Lanes(0.02F)) | (left.g > Lanes(0.02F)) | (left.b > Lanes(0.02F));
+        packet.active = packet.hit & seen;
         // Faces that lie on each other count as one layer everywhere, not now one and now two.
         const Lanes beyond = packet.distance * 1.00002F + 1e-5F * frame.scene_size;
         store(packet.rays.ray.tnear, select(packet.active, beyond, 0.0F));
@@ -37,7 +70,7 @@ inline LaneColors shadeLayers(const FrameSetup& frame, RayPacket& packet, Surfac
     store(packet.rays.ray.tnear, 0.0F);
     packet.active = active;
     const LaneColors behind = backgroundColors(frame, packet);
-    return {sum.r + left * behind.r, sum.g + left * behind.g, sum.b + left * behind.b};
+    return {sum.r + left.r * behind.r, sum.g + left.g * behind.g, sum.b + left.b * behind.b};
 }
 
 } // namespace

@@ -108,7 +108,9 @@ inline int smaller(int a, int b) {
     return a < b ? a : b;
 }
 
-void traceBlock(const FrameSetup& frame, const PixelBlock& block) {
+/// Calls function(packet, place) for each tile of a block, with the packet's places set.
+template <class Function>
+inline void forEachTile(const PixelBlock& block, const Function& function) {
     alignas(64) constexpr float columns[lane_count] = {0.5F, 1.5F, 2.5F, 3.5F, 0.5F, 1.5F,
                                                        2.5F, 3.5F, 0.5F, 1.5F, 2.5F, 3.5F,
                                                        0.5F, 1.5F, 2.5F, 3.5F};
@@ -126,14 +128,33 @@ void traceBlock(const FrameSetup& frame, const PixelBlock& block) {
             packet.y = row + static_cast<float>(y);
             packet.active = (column < static_cast<float>(place.columns)) &
                             (row < static_cast<float>(place.rows));
-            const TracedPacket traced = trace(frame, packet);
-            storeTile(traced.pixels, frame.pixels, frame.width, place);
-            if (frame.nearness)
-                storeTile(traced.nearness, frame.nearness, frame.width, place);
-            if (frame.objects)
-                storeTile(traced.objects, frame.objects, frame.width, place);
+            function(packet, place);
         }
     }
+}
+
+void traceBlock(const FrameSetup& frame, const PixelBlock& block) {
+    forEachTile(block, [&](RayPacket& packet, const TilePlace& place) {
+        const TracedPacket traced = trace(frame, packet);
+        storeTile(traced.pixels, frame.pixels, frame.width, place);
+        if (frame.nearness)
+            storeTile(traced.nearness, frame.nearness, frame.width, place);
+        if (frame.objects)
+            storeTile(traced.objects, frame.objects, frame.width, place);
+    });
+}
+
+void findFreeSky(const FrameSetup& frame, const PixelBlock& block) {
+    forEachTile(block, [&](RayPacket& packet, const TilePlace&) {
+        aim(frame, packet);
+        intersect(frame, packet);
+        SurfaceLanes surfaces;
+        readSurfaces(frame, packet, surfaces);
+        LaneMask seen = packet.hit;
+        if (frame.has_ground)
+            seen = seen | meetGround(frame, packet, surfaces).seen;
+        keepFreeSky(frame, packet, surfaces, seen, freeSky(frame, packet, surfaces, seen));
+    });
 }
 
 void traceSamples(const FrameSetup& frame, SamplePacket& samples) {
@@ -153,6 +174,6 @@ void traceSamples(const FrameSetup& frame, SamplePacket& samples) {
 } // namespace
 
 extern const RayKernel QUARN_RAY_KERNEL;
-const RayKernel QUARN_RAY_KERNEL{QUARN_RAY_KERNEL_NAME, traceBlock, traceSamples};
+const RayKernel QUARN_RAY_KERNEL{QUARN_RAY_KERNEL_NAME, traceBlock, traceSamples, findFreeSky};
 
 } // namespace quarn

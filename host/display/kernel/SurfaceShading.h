@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/display/kernel/SunShadow.h"
+#include "host/display/kernel/OpenSky.h"
 
 namespace quarn {
 namespace {
@@ -22,6 +22,10 @@ inline void addLight(const float (&color)[3], const Lanes& amount, LaneColors& l
 inline LaneColors shadeSurfaces(const FrameSetup& frame, const RayPacket& packet,
                                 const SurfaceLanes& surfaces, const LaneMask& lit) {
     LaneColors light = ambientLight(frame, surfaces.normal);
+    if (frame.free_sky) {
+        const Lanes arriving = skyArriving(frame, packet, surfaces, lit);
+        light = {light.r * arriving, light.g * arriving, light.b * arriving};
+    }
     for (int k = 0; k < frame.fixed_count; ++k) {
         const FrameLight& fixed = frame.fixed[k];
         addLight(fixed.color, greatest(dot(surfaces.normal, fixed.toward), 0.0F), light);

@@ -45,6 +45,8 @@ bool readView(KM_BinaryArchive& archive, ViewContent& view);
 
 bool writeCamera(KM_BinaryArchive& archive, const CameraContent& camera);
 bool readCamera(KM_BinaryArchive& archive, CameraContent& camera);
+bool writeEdges(KM_BinaryArchive& archive, const EdgesContent& edges);
+bool readEdges(KM_BinaryArchive& archive, EdgesContent& edges);
 
 bool writeLight(KM_BinaryArchive& archive, const LightContent& light);
 bool readLight(KM_BinaryArchive& archive, LightContent& light);

@@ -73,6 +73,8 @@ private:
             return readView(m_archive, m_content.views.emplace_back());
         case chunk::CAMERA:
             return readCamera(m_archive, m_content.cameras.emplace_back());
+        case chunk::EDGES:
+            return readEdges(m_archive, m_content.edges.emplace_back());
         case chunk::LIGHT:
             return readLight(m_archive, m_content.lights.emplace_back());
         case chunk::PLUG_IN:
@@ -116,7 +118,8 @@ private:
         return first_free <= m_content.settings.light_slots;
     }
 
-    /// Objects and plug-ins are found by their ids, views by their names, ignoring case.
+    /// Objects, plug-ins and display modes are found by their ids, views by their names, ignoring
+    /// case.
     bool namesAreUnique() const {
         std::set<KM_UUID> ids;
         for (const ObjectContent& object : m_content.objects)
@@ -125,6 +128,10 @@ private:
         std::set<KM_UUID> plug_in_ids;
         for (const PlugInContent& plug_in : m_content.plug_ins)
             if (!plug_in_ids.insert(plug_in.plug_in_id).second)
+                return false;
+        std::set<KM_UUID> modes;
+        for (const EdgesContent& edges : m_content.edges)
+            if (!modes.insert(edges.display_mode).second)
                 return false;
         std::set<KM_wString> names;
         for (const ViewContent& view : m_content.views) {

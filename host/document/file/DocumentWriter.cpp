@@ -136,6 +136,7 @@ private:
         };
         if (!writeEach(chunk::VIEW, "a view", m_content.views, writeView) ||
             !writeEach(chunk::CAMERA, "a camera", m_content.cameras, writeCamera) ||
+            !writeEach(chunk::EDGES, "the edges of a display mode", m_content.edges, writeEdges) ||
             !writeEach(chunk::LIGHT, "a light", m_content.lights, writeLight) ||
             !writeEach(chunk::PLUG_IN, "what a plug-in keeps", m_content.plug_ins, writePlugIn))
             return false;

@@ -138,7 +138,7 @@ TEST(MeshEdges, SphereHasSmoothEdgesOnly) {
     const MeshEdges edges(sphereMesh({0.0, 0.0, 0.0}, 1.0F, 16));
     EXPECT_TRUE(edges.features().empty());
     EXPECT_GT(edges.smooth().size(), 32U * 15U);
-    EXPECT_GT(edges.meanSmoothLength(), 0.05);
+    EXPECT_GT(edges.meanInnerLength(), 0.05);
 }
 
 TEST(MeshEdges, ThreeTrianglesAtOneEdgeMakeItAFeature) {

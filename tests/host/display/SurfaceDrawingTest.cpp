@@ -204,7 +204,7 @@ TEST(SurfaceDrawing, SmoothedEdgeThroughAPixelsMiddleIsHalfCovered) {
     SceneContent content;
     DisplayModeAttributes mode = modeNamed(L"Drawing", 2);
     mode.draws_edges = false;
-    mode.draws_silhouettes = false;
+    mode.draws_outlines = false;
     mode.surface_style = SurfaceStyle::clay;
     mode.background_top = {0, 0, 0, 255};
     mode.background_bottom = {0, 0, 0, 255};

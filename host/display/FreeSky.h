@@ -1,0 +1,28 @@
+#pragma once
+
+#include "host/display/kernel/FrameSetup.h"
+
+#include <vector>
+
+namespace quarn {
+
+/// How much of the sky each pixel of a picture is open to: dark corners, and soft shadows where
+/// things stand on each other.
+///
+/// Each pixel looks in a few directions, other ones than its neighbours, and the mean over four by
+/// four pixels of one surface has looked in all: so there is no noise, and the same picture comes
+/// out for any number of threads. It keeps its buffers from picture to picture.
+class FreeSky {
+public:
+    /// Looks at all pixels as far as `frame.sky_reach` and lets the ray loops use what was found.
+    void find(FrameSetup& frame, const RayKernel& kernel);
+
+private:
+    void smooth(const FrameSetup& frame, int dx, int dy, int before);
+
+    std::vector<SkyPlace> m_places;
+    std::vector<float> m_free;
+    std::vector<float> m_smoothed;
+};
+
+} // namespace quarn

@@ -1,0 +1,63 @@
+#pragma once
+
+#include "host/display/DisplayScene.h"
+#include "host/display/LineRaster.h"
+#include "host/display/MeshEdges.h"
+
+#include <span>
+
+namespace quarn {
+
+struct CameraRays;
+
+/// How clearly lines are drawn by their depth: far ones are lighter, so that near ones stand out.
+class DepthFade {
+public:
+    /// No fading: every line has this strength.
+    explicit DepthFade(float strength = 1.0F) : m_strength(strength) {}
+    /// @param far_strength  of the farthest lines of the box, beside the nearest
+    /// @param box           in the coordinates of the frame
+    DepthFade(float strength, float far_strength, const CameraRays& rays,
+              const KM_BoundingBox& box);
+
+    /// @param nearness  in the measure of DepthImage
+    float at(float nearness) const;
+
+private:
+    float m_strength;
+    float m_loss = 0.0F;
+    float m_near = 0.0F;
+    float m_depth_range = 1.0F;
+    float m_far_depth = 0.0F; ///< of a parallel view
+    bool m_parallel = false;
+};
+
+/// Projects the edges of one mesh object onto the picture.
+class MeshLines {
+public:
+    MeshLines(const DisplayScene::MeshObject& object, const CameraRays& rays,
+              const ScreenProjection& projection, const DepthFade& fade);
+
+    /// All of the edges.
+    void addAll(std::span<const MeshEdges::Edge> edges, LineBatch& batch) const;
+    void addAll(std::span<const MeshEdges::FlatEdge> edges, LineBatch& batch) const;
+    /// Those where the surface turns away from the observer, or ends.
+    void addOutlines(std::span<const MeshEdges::Edge> edges, LineBatch& batch) const;
+    /// The others.
+    void addInner(std::span<const MeshEdges::Edge> edges, LineBatch& batch) const;
+
+private:
+    bool isOutline(const MeshEdges::Edge& edge) const;
+    void add(std::uint32_t from, std::uint32_t to, LineBatch& batch) const;
+
+    std::span<const KM_3fPoint> m_vertices;
+    const KM_Xform& m_frame_from_mesh;
+    bool m_stands; ///< the mesh is in the frame's coordinates already
+    bool m_parallel;
+    KM_3dPoint m_eye;       ///< in the coordinates of the mesh, as are the normals of its edges
+    KM_3dVector m_backward; ///< against the direction of view
+    const ScreenProjection& m_projection;
+    const DepthFade& m_fade;
+};
+
+} // namespace quarn
