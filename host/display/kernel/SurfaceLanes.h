@@ -29,12 +29,18 @@ inline LaneVectors turned(const float (&m)[3][3], const LaneVectors& v) {
             v.x * m[2][0] + v.y * m[2][1] + v.z * m[2][2]};
 }
 
-/// The geometric normals in the coordinates of the meshes; upright where nothing was met.
-inline LaneVectors geometricNormals(const RayPacket& packet) {
+/// The geometric normals in the coordinates of the meshes; upright where nothing was met. They are
+/// as long as areas, so they are measured by the scene's size: the squares of their lengths must
+/// neither overflow for a planet nor vanish for a grain.
+inline LaneVectors geometricNormals(const FrameSetup& frame, const RayPacket& packet) {
     const RTCHit16& hit = packet.rays.hit;
+    const float size = frame.scene_size > 1e-15F ? frame.scene_size : 1e-15F;
+    const Lanes scale = 1.0F / (size * size);
     const LaneVectors straight_up{0.0F, 0.0F, 1.0F};
-    return select(packet.hit, LaneVectors{load(hit.Ng_x), load(hit.Ng_y), load(hit.Ng_z)},
-                  straight_up);
+    return select(
+        packet.hit,
+        LaneVectors{load(hit.Ng_x) * scale, load(hit.Ng_y) * scale, load(hit.Ng_z) * scale},
+        straight_up);
 }
 
 /// Turns normals toward the observer and gives them unit length.
@@ -94,7 +100,8 @@ inline void paintLanes(const FrameSetup& frame, const RaySurface& surface, const
 inline void readSurface(const FrameSetup& frame, const RaySurface& surface, const RayPacket& packet,
                         const LaneMask& mask, SurfaceLanes& lanes) {
     if (surface.place) {
-        const LaneVectors normal = turned(surface.place->cofactors, geometricNormals(packet));
+        const LaneVectors normal =
+            turned(surface.place->cofactors, geometricNormals(frame, packet));
         lanes.face = select(mask, faceNormals(packet, normal), lanes.face);
         lanes.normal = select(mask, lanes.face, lanes.normal);
     }
@@ -110,7 +117,7 @@ inline void readSurface(const FrameSetup& frame, const RaySurface& surface, cons
 /// Fills `lanes` for all rays that hit something. Most packets meet one surface only.
 inline void readSurfaces(const FrameSetup& frame, const RayPacket& packet, SurfaceLanes& lanes) {
     lanes.surface = surfacesMet(frame, packet);
-    lanes.face = faceNormals(packet, geometricNormals(packet));
+    lanes.face = faceNormals(packet, geometricNormals(frame, packet));
     lanes.normal = lanes.face;
     lanes.albedo = uniformColor(frame.plain_albedo);
     alignas(64) std::uint32_t surfaces[lane_count];

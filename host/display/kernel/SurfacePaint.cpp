@@ -28,7 +28,10 @@ float textureLevel(const FrameSetup& frame, const RaySurface& surface, const RTC
     const float texels = std::fabs((b.x - a.x) * (c.y - a.y) - (c.x - a.x) * (b.y - a.y)) *
                          static_cast<float>(surface.texture->width()) *
                          static_cast<float>(surface.texture->height());
-    float normal[3] = {hit.Ng_x[lane], hit.Ng_y[lane], hit.Ng_z[lane]};
+    // As areas of the scene's own size, whose squares are no trouble to compute.
+    const float size = std::max(frame.scene_size, 1e-15F);
+    const float scale = 1.0F / (size * size);
+    float normal[3] = {hit.Ng_x[lane] * scale, hit.Ng_y[lane] * scale, hit.Ng_z[lane] * scale};
     if (surface.place)
         turn(surface.place->cofactors, {normal[0], normal[1], normal[2]}, normal);
     const float world = length(normal[0], normal[1], normal[2]);
@@ -37,7 +40,7 @@ float textureLevel(const FrameSetup& frame, const RaySurface& surface, const RTC
         std::fabs(normal[0] * ray.dir_x[lane] + normal[1] * ray.dir_y[lane] +
                   normal[2] * ray.dir_z[lane]) /
         std::max(world * length(ray.dir_x[lane], ray.dir_y[lane], ray.dir_z[lane]), 1e-30F);
-    const float covered = side * side / std::max(facing, 0.1F);
+    const float covered = side / size * (side / size) / std::max(facing, 0.02F);
     const float ratio = texels * covered / std::max(world, 1e-30F);
     return ratio > 1.0F ? 0.5F * std::log2(ratio) : 0.0F;
 }
