@@ -1,6 +1,7 @@
 #include "host/import/MaterialReading.h"
 
 #include "host/import/ColorSpace.h"
+#include "host/import/OpacityMap.h"
 #include "host/import/TextureDecoding.h"
 
 #include <assimp/GltfMaterial.h>
@@ -10,6 +11,7 @@
 #include <algorithm>
 #include <array>
 #include <cmath>
+#include <initializer_list>
 #include <span>
 
 namespace quarn {
@@ -21,8 +23,9 @@ struct TextureReference {
     std::array<aiTextureMapMode, 2> modes{aiTextureMapMode_Wrap, aiTextureMapMode_Wrap};
 };
 
-bool findTexture(const aiMaterial& source, TextureReference& reference) {
-    for (const aiTextureType type : {aiTextureType_BASE_COLOR, aiTextureType_DIFFUSE}) {
+bool findTexture(const aiMaterial& source, std::initializer_list<aiTextureType> types,
+                 TextureReference& reference) {
+    for (const aiTextureType type : types) {
         aiString path;
         if (source.GetTexture(type, 0, &path, nullptr, &reference.coordinates, nullptr, nullptr,
                               reference.modes.data()) == aiReturn_SUCCESS &&
@@ -131,13 +134,14 @@ ReadMaterial MaterialReading::read(const aiMaterial& source) {
     result.material->base_color =
         m_linear_colors ? colorFromLinear(c.r, c.g, c.b, c.a) : colorFromSrgb(c.r, c.g, c.b, c.a);
     readTexture(source, result);
+    readOpacityMap(source, result);
     readCutout(source, *result.material);
     return result;
 }
 
 void MaterialReading::readTexture(const aiMaterial& source, ReadMaterial& result) {
     TextureReference reference;
-    if (!findTexture(source, reference)) {
+    if (!findTexture(source, {aiTextureType_BASE_COLOR, aiTextureType_DIFFUSE}, reference)) {
         return;
     }
     Material& material = *result.material;
@@ -149,6 +153,28 @@ void MaterialReading::readTexture(const aiMaterial& source, ReadMaterial& result
         // Many programs write black where the texture alone gives the colour.
         color = {255, 255, 255, color.a};
     }
+}
+
+/// Material files of OBJ give the opacity in a picture of its own.
+void MaterialReading::readOpacityMap(const aiMaterial& source, ReadMaterial& result) {
+    TextureReference reference;
+    if (!findTexture(source, {aiTextureType_OPACITY}, reference)) {
+        return;
+    }
+    const auto opacity =
+        texture({reference.name, wrapOf(reference.modes[0]), wrapOf(reference.modes[1])});
+    std::shared_ptr<const Texture>& colors = result.material->base_color_texture;
+    if (opacity == nullptr) {
+        return;
+    }
+    if (colors == nullptr) {
+        result.texture_coordinates = reference.coordinates;
+    }
+    std::shared_ptr<const Texture>& both = m_with_opacity[{colors, opacity}];
+    if (both == nullptr) {
+        both = withOpacity(colors.get(), *opacity);
+    }
+    colors = both;
 }
 
 std::shared_ptr<const Texture> MaterialReading::texture(const TextureKey& key) {
@@ -199,6 +225,9 @@ std::shared_ptr<Texture> MaterialReading::loadFile(const std::string& reference)
 }
 
 void MaterialReading::warnLeftOut(const std::string& reference, const std::string& why) {
+    if (!m_told.insert(reference).second) {
+        return; // other materials use it otherwise
+    }
     m_warnings.push_back("The texture '" + reference + "' was left out: " + why + ".");
 }
 

@@ -5,8 +5,10 @@
 
 #include <map>
 #include <memory>
+#include <set>
 #include <string>
 #include <tuple>
+#include <utility>
 #include <vector>
 
 struct aiMaterial;
@@ -38,6 +40,7 @@ private:
 
     ReadMaterial read(const aiMaterial& source);
     void readTexture(const aiMaterial& source, ReadMaterial& result);
+    void readOpacityMap(const aiMaterial& source, ReadMaterial& result);
     std::shared_ptr<const Texture> texture(const TextureKey& key);
     std::shared_ptr<Texture> load(const std::string& reference);
     std::shared_ptr<Texture> loadFile(const std::string& reference);
@@ -49,6 +52,10 @@ private:
     std::vector<std::string>& m_warnings;
     std::map<unsigned, ReadMaterial> m_materials;
     std::map<TextureKey, std::shared_ptr<const Texture>> m_textures;
+    using TexturePair = std::pair<std::shared_ptr<const Texture>, std::shared_ptr<const Texture>>;
+    std::map<TexturePair, std::shared_ptr<const Texture>>
+        m_with_opacity;           ///< by colours and opacity
+    std::set<std::string> m_told; ///< textures that were left out
 };
 
 } // namespace quarn
