@@ -44,6 +44,18 @@ std::optional<std::string_view> readVertex(std::string_view line, Coordinates& p
     return std::string_view(at, static_cast<std::size_t>(end - at));
 }
 
+/// A fourth number divides the three; more than one are a colour.
+bool hasWeight(std::string_view rest) {
+    constexpr std::string_view blanks = " \t\r\n";
+    const std::size_t begin = rest.find_first_not_of(blanks);
+    if (begin == std::string_view::npos) {
+        return false;
+    }
+    const std::size_t end = rest.find_first_of(blanks, begin);
+    return end == std::string_view::npos ||
+           rest.find_first_not_of(blanks, end) == std::string_view::npos;
+}
+
 /// The next line, with its line break; `text` loses it.
 std::string_view takeLine(std::string_view& text) {
     const std::size_t line_break = text.find('\n');
@@ -78,7 +90,7 @@ std::optional<Coordinates> originFor(std::ifstream& file) {
 bool appendShifted(std::string_view line, const Coordinates& origin, std::string& bytes) {
     Coordinates place{};
     const auto rest = readVertex(line, place);
-    if (!rest) {
+    if (!rest || hasWeight(*rest)) {
         return false;
     }
     bytes += 'v';

@@ -9,9 +9,10 @@ using ::testing::HasSubstr;
 using ::testing::IsEmpty;
 
 /// A roof of two triangles over points that only a double can tell apart.
-constexpr const char* surveyed = "v 4500012.125 5200034.25 100.5\nv 4500013.125 5200034.25 100.5\n"
-                                 "v 4500012.125 5200035.25 101.0 0.5\nv 4500013.125 5200035.5 101\n"
-                                 "f 1 2 3\nf 2 4 3\nl 1 2\n";
+constexpr const char* surveyed =
+    "v 4500012.125 5200034.25 100.5\nv 4500013.125 5200034.25 100.5\n"
+    "v 4500012.125 5200035.25 101.0 1 0 0.5\nv 4500013.125 5200035.5 101\n"
+    "f 1 2 3\nf 2 4 3\nl 1 2\n";
 
 TEST(PlacedModel, SurveyedCoordinatesKeepAllTheirDigits) {
     const TemporaryFolder folder;
@@ -44,11 +45,14 @@ TEST(PlacedModel, SurveyedModelThatIsYUpIsTurnedAsAWhole) {
 }
 
 TEST(PlacedModel, VertexThatCannotBeUnderstoodLeavesTheFileAsItIs) {
-    const TemporaryFolder folder;
-    const ImportedModel model = readOrFail(
-        folder.write("a.obj", "v 4500000 0 0\nv 4500001 0 0\nv 4500000 1 0\nf 1 2 3\nv one 2 3\n"));
-    ASSERT_EQ(model.meshes.size(), 1U);
-    EXPECT_NEAR(boundsOf(model).m_min.x, 4500000.0, 0.5);
+    // No number, and three numbers that a fourth divides.
+    for (const std::string last : {"v one 2 3\n", "v 9000000 0 0 2\n"}) {
+        const TemporaryFolder folder;
+        const ImportedModel model = readOrFail(
+            folder.write("a.obj", "v 4500000 0 0\nv 4500001 0 0\nv 4500000 1 0\nf 1 2 3\n" + last));
+        ASSERT_EQ(model.meshes.size(), 1U);
+        EXPECT_NEAR(boundsOf(model).m_min.x, 4500000.0, 0.5);
+    }
 }
 
 TEST(PlacedModel, CoordinatesThatTheFormatRoundsAreTold) {
