@@ -129,8 +129,8 @@ Lighting clayLighting(Lighting lighting) {
     const auto grey = [](float r, float g, float b) {
         return 0.2126F * r + 0.7152F * g + 0.0722F * b; // luminance by ITU-R BT.709
     };
-    constexpr float sky = 1.5F;
-    constexpr float sun = 0.55F;
+    constexpr float sky = 1.62F;
+    constexpr float sun = 0.45F;
     AmbientLight& ambient = lighting.ambient;
     const float base = grey(ambient.base[0], ambient.base[1], ambient.base[2]);
     float slope[3];

@@ -194,6 +194,9 @@ TEST(DocumentCoding, ViewsAndCamerasComeBackToTheLastBit) {
     ASSERT_EQ(1U, content.cameras.size());
     EXPECT_EQ(L"Kamera 1", content.cameras[0].name.View());
     EXPECT_EQ(sample.cameras[0].viewport, content.cameras[0].viewport);
+    ASSERT_EQ(1U, content.edges.size());
+    EXPECT_EQ(wireframe_mode_id, content.edges[0].display_mode);
+    EXPECT_EQ(MeshEdgeChoice::all, content.edges[0].choice);
 }
 
 TEST(DocumentCoding, LightsComeBackWithTheirIndices) {

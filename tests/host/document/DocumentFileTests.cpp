@@ -160,6 +160,7 @@ TEST_F(DocumentFile, ADocumentIsSavedAndOpened) {
     EXPECT_EQ(KM_3dVector(0.6, 0.0, 0.8), document().sun().directionToSun());
     ASSERT_EQ(1U, document().namedViews().size());
     EXPECT_EQ(sample.cameras[0].viewport, document().namedViews()[0].viewport);
+    EXPECT_EQ(document().edgesOf(wireframe_mode_id), MeshEdgeChoice::all);
 }
 
 TEST_F(DocumentFile, OpeningBringsItsViewsInPlaceOfTheStandardOnes) {

@@ -111,6 +111,7 @@ void addViews(DocumentContent& content) {
     plan.active = true;
     content.views.push_back(plan);
     content.cameras.push_back({L"Kamera 1", view.viewport});
+    content.edges.push_back({wireframe_mode_id, MeshEdgeChoice::all});
 }
 
 void addLights(std::vector<LightContent>& lights) {
