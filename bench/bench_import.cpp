@@ -225,7 +225,7 @@ Cost costHere(const fs::path& path) {
     quarn::SceneContent content;
     content.revision = 1;
     for (const auto& mesh : meshes)
-        content.meshes.push_back({KM_CreateUuid(), mesh, nullptr, true});
+        content.meshes.push_back({KM_CreateUuid(), mesh, nullptr, true, {}});
     quarn::DisplayScene scene;
     if (!scene.update(content))
         fail("the scene was not built");
@@ -262,7 +262,7 @@ void measure(const char* name, const char* extension, const std::string& bytes) 
         best.sum_ms = std::min(best.sum_ms, cost.sum_ms);
         best.peak_mb = std::max(best.peak_mb, cost.peak_mb);
     }
-    std::printf("%-6s %9.1f %10.0f %9.0f %9.0f %12.0f %10.0f\n", name,
+    std::printf("| %s | %.1f | %.0f | %.0f | %.0f | %.0f | %.0f |\n", name,
                 static_cast<double>(bytes.size()) / 1e6, best.bytes_ms, best.load_ms, best.build_ms,
                 best.sum_ms, best.peak_mb);
 }
@@ -276,12 +276,13 @@ int main(int count, char** arguments) {
                     cost.peak_mb);
         return 0;
     }
-    std::printf("%d triangles, milliseconds and megabytes\n", 2 * squares_a_side * squares_a_side);
-    std::printf("%-6s %9s %10s %9s %9s %12s %10s\n", "format", "file (MB)", "bytes alone", "load",
-                "scene", "load + scene", "peak (MB)");
+    std::printf("%d triangles, milliseconds and megabytes\n\n"
+                "| format | file (MB) | bytes alone | load | scene | load + scene | peak (MB) |\n"
+                "|---|---|---|---|---|---|---|\n",
+                2 * squares_a_side * squares_a_side);
     measure("PLY", ".ply", plyBytes());
     measure("STL", ".stl", stlBytes());
     measure("OBJ", ".obj", objBytes());
-    measure("quarn", ".quarn", documentBytes(BenchFile(".ply", plyBytes()).path()));
+    measure("saved document", ".quarn", documentBytes(BenchFile(".ply", plyBytes()).path()));
     return 0;
 }
