@@ -1,5 +1,7 @@
+#include "host/commands/CommandEnd.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/PictureSizePrompt.h"
+#include "host/display/PictureMemory.h"
 #include "host/document/Document.h"
 
 namespace quarn {
@@ -9,9 +11,13 @@ CQuarnCommand::result runViewportSize(const CQuarnCommandContext& context) {
     int width_px = view.frameWidth();
     int height_px = view.frameHeight();
     const CQuarnCommand::result asked = askPictureSize(width_px, height_px);
-    if (asked == CQuarnCommand::success)
-        view.setFrameSize(width_px, height_px);
-    return asked;
+    if (asked != CQuarnCommand::success)
+        return asked;
+    const Result<void> fits = checkPictureMemory(width_px, height_px);
+    if (!fits)
+        return fail(fits.message());
+    view.setFrameSize(width_px, height_px);
+    return CQuarnCommand::success;
 }
 
 } // namespace quarn

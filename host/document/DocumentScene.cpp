@@ -1,5 +1,6 @@
 #include "host/document/DocumentScene.h"
 
+#include "host/display/PictureMemory.h"
 #include "host/document/ObjectTable.h"
 
 #include <algorithm>
@@ -32,7 +33,14 @@ Result<void> DocumentScene::update(const ObjectTable& objects, std::vector<KM_Li
 
 Result<void> DocumentScene::draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode,
                                  int width_px, int height_px, Image& picture) {
-    return m_pipeline.draw(m_display, viewport, mode, width_px, height_px, picture);
+    const Result<void> fits = checkPictureMemory(width_px, height_px, m_largest_px);
+    if (!fits)
+        return fits;
+    const Result<void> drawn =
+        m_pipeline.draw(m_display, viewport, mode, width_px, height_px, picture);
+    if (drawn)
+        m_largest_px = std::max(m_largest_px, std::int64_t{width_px} * height_px);
+    return drawn;
 }
 
 void DocumentScene::takeObjects(const ObjectTable& objects) {

@@ -4,6 +4,7 @@
 #include "host/display/DisplayScene.h"
 #include "host/display/SceneContent.h"
 
+#include <cstdint>
 #include <span>
 
 namespace quarn {
@@ -20,7 +21,8 @@ public:
     Result<void> update(const ObjectTable& objects, std::vector<KM_Light> lights,
                         std::span<const KM_UUID> hidden = {});
 
-    /// Draws the scene as the last update left it; as DisplayPipeline::draw.
+    /// Draws the scene as the last update left it; as DisplayPipeline::draw. A picture that does
+    /// not fit into memory is refused before any work begins.
     Result<void> draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode, int width_px,
                       int height_px, Image& picture);
 
@@ -33,7 +35,8 @@ private:
 
     SceneContent m_content;
     DisplayScene m_display;
-    DisplayPipeline m_pipeline; ///< keeps its buffers from picture to picture
+    DisplayPipeline m_pipeline;    ///< keeps its buffers from picture to picture
+    std::int64_t m_largest_px = 0; ///< pixels of the largest picture so far
 };
 
 } // namespace quarn

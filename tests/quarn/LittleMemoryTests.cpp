@@ -35,6 +35,21 @@ TEST(LittleMemory, APictureThatDoesNotFitIsTold) {
     EXPECT_FALSE(std::filesystem::exists(folder / "large.png"));
 }
 
+TEST(LittleMemory, ASizeThatDoesNotFitIsRefusedBeforeAnythingIsDrawn) {
+    const Studio studio;
+    // 16384 * 16384 pixels of 18 bytes are 4.5 GB.
+    const Ended ended =
+        runWithin(900, studio.path(),
+                  "_-Import house.obj\n_-ViewportSize 16384 16384\n"
+                  "_-SetTurntableAnimation 3 _Clockwise _png _Shaded _Enter _Enter\n"
+                  "_-RecordAnimation out\n");
+    EXPECT_EQ(ended.exit_code, 1);
+    EXPECT_THAT(ended.out + ended.err,
+                HasSubstr("A picture of 16384 by 16384 pixels cannot be drawn: there is too little "
+                          "memory. It needs 4.5 GB, and 0."));
+    EXPECT_FALSE(std::filesystem::exists(studio / "out"));
+}
+
 } // namespace
 } // namespace quarn::test
 
