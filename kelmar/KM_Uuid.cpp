@@ -35,7 +35,8 @@ int hexDigit(char character) {
 
 std::uint32_t randomBits() {
     try {
-        std::random_device device;
+        // Kept, because opening the source takes much longer than reading it.
+        thread_local std::random_device device;
         return device();
     } catch (const std::exception&) {
         // No entropy source. Time and a counter still make identifiers of one program differ.
