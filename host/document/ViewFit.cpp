@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <map>
 
 namespace quarn {
 
@@ -18,56 +19,94 @@ constexpr double CLEARANCE_OF_SIZE = 0.005;
 
 constexpr double CHORD_TOLERANCE_OF_SIZE = 1e-4;
 
-template <class Visit>
-void visitVertices(const KM_Mesh& mesh, const KM_Xform& world_from_mesh, Visit&& visit) {
-    if (world_from_mesh.IsIdentity()) {
-        for (const KM_3fPoint& vertex : mesh.m_V)
-            visit(vertex.ToDouble());
-        return;
+/// A repeated mesh smaller than this share of all that is visible is taken for its box.
+constexpr double SMALL_SHARE = 0.02;
+
+/// The points of all visible objects. Meshes that are repeated a thousand times, as bolts and
+/// leaves are, are represented by the corners of their boxes, so that they are fitted at once.
+class VisiblePoints {
+public:
+    explicit VisiblePoints(const ObjectTable& objects) : m_objects(objects) {
+        for (const auto& object : objects.objects()) {
+            if (!object->visible)
+                continue;
+            if (object->mesh)
+                m_box.Union(object->boundingBox());
+            else
+                visitCurveOrPoint(*object, [&](const KM_3dPoint& point) { m_box.Set(point); });
+        }
     }
-    for (const KM_3fPoint& vertex : mesh.m_V)
-        visit(world_from_mesh * vertex.ToDouble());
-}
 
-template <class Visit> void visitPoints(const DocumentObject& object, Visit&& visit) {
-    if (object.mesh) {
-        visitVertices(*object.mesh, object.world_from_mesh, visit);
-    } else if (object.curve) {
-        KM_3dPointArray points;
-        const double size = object.curve->BoundingBox().Diagonal().Length();
-        object.curve->GetDisplayPolyline(CHORD_TOLERANCE_OF_SIZE * size, points);
-        std::for_each(points.begin(), points.end(), visit);
-    } else if (object.point) {
-        visit(*object.point);
+    const KM_BoundingBox& box() const { return m_box; }
+
+    template <class Visit> void visit(Visit&& visit) const {
+        for (const auto& object : m_objects.objects()) {
+            if (!object->visible)
+                continue;
+            if (!object->mesh)
+                visitCurveOrPoint(*object, visit);
+            else if (isSmallCopy(*object))
+                visitCorners(*object, visit);
+            else
+                visitVertices(*object, visit);
+        }
     }
-}
 
-template <class Visit> void visitVisiblePoints(const ObjectTable& objects, Visit&& visit) {
-    for (const auto& object : objects.objects())
-        if (object->visible)
-            visitPoints(*object, visit);
-}
+private:
+    bool isSmallCopy(const DocumentObject& object) const {
+        return !object.world_from_mesh.IsIdentity() && object.mesh.use_count() > 2 &&
+               object.boundingBox().Diagonal().Length() < SMALL_SHARE * m_box.Diagonal().Length();
+    }
 
-KM_BoundingBox visibleBox(const ObjectTable& objects) {
-    KM_BoundingBox box;
-    visitVisiblePoints(objects, [&](const KM_3dPoint& point) { box.Set(point); });
-    return box;
-}
+    template <class Visit> void visitCorners(const DocumentObject& object, Visit& visit) const {
+        const auto [found, is_new] = m_mesh_boxes.try_emplace(object.mesh.get());
+        if (is_new)
+            found->second = object.mesh->BoundingBox();
+        for (int corner = 0; corner < 8; ++corner)
+            visit(object.world_from_mesh * found->second.Corner(corner));
+    }
 
-Reach measure(const KM_Viewport& camera, const KM_3dPoint& target, const ObjectTable& objects,
+    template <class Visit> static void visitVertices(const DocumentObject& object, Visit& visit) {
+        if (object.world_from_mesh.IsIdentity()) {
+            for (const KM_3fPoint& vertex : object.mesh->m_V)
+                visit(vertex.ToDouble());
+            return;
+        }
+        for (const KM_3fPoint& vertex : object.mesh->m_V)
+            visit(object.world_from_mesh * vertex.ToDouble());
+    }
+
+    template <class Visit>
+    static void visitCurveOrPoint(const DocumentObject& object, Visit&& visit) {
+        if (object.curve) {
+            KM_3dPointArray points;
+            const double size = object.curve->BoundingBox().Diagonal().Length();
+            object.curve->GetDisplayPolyline(CHORD_TOLERANCE_OF_SIZE * size, points);
+            std::for_each(points.begin(), points.end(), visit);
+        } else if (object.point) {
+            visit(*object.point);
+        }
+    }
+
+    const ObjectTable& m_objects;
+    KM_BoundingBox m_box;
+    mutable std::map<const KM_Mesh*, KM_BoundingBox> m_mesh_boxes;
+};
+
+Reach measure(const KM_Viewport& camera, const KM_3dPoint& target, const VisiblePoints& points,
               bool turn) {
     Reach reach(camera, target);
     if (turn)
-        visitVisiblePoints(objects, [&](const KM_3dPoint& point) { reach.addTurning(point); });
+        points.visit([&](const KM_3dPoint& point) { reach.addTurning(point); });
     else
-        visitVisiblePoints(objects, [&](const KM_3dPoint& point) { reach.add(point); });
+        points.visit([&](const KM_3dPoint& point) { reach.add(point); });
     return reach;
 }
 
 KM_3dPoint middleOfTurn(const KM_Viewport& camera, const KM_3dPoint& target,
-                        const ObjectTable& objects, const KM_BoundingBox& box) {
-    TurnProfile profile(target, box.m_min.z, box.m_max.z);
-    visitVisiblePoints(objects, [&](const KM_3dPoint& point) { profile.add(point); });
+                        const VisiblePoints& points) {
+    TurnProfile profile(target, points.box().m_min.z, points.box().m_max.z);
+    points.visit([&](const KM_3dPoint& point) { profile.add(point); });
     return profile.middle(camera);
 }
 
@@ -114,7 +153,8 @@ bool fitParallel(KM_Viewport& viewport, const Reach& reach, const KM_3dPoint& ta
 
 Result<KM_Viewport> fitViewport(const KM_Viewport& viewport, const ObjectTable& objects,
                                 const ViewFit& fit) {
-    const KM_BoundingBox box = visibleBox(objects);
+    const VisiblePoints points(objects);
+    const KM_BoundingBox& box = points.box();
     if (!box.IsValid())
         return Error{"There is nothing visible to fit into the view. Import a model or show an "
                      "object first."};
@@ -127,10 +167,10 @@ Result<KM_Viewport> fitViewport(const KM_Viewport& viewport, const ObjectTable& 
     KM_Viewport fitted = viewport;
     bool is_placed = placeCamera(fitted, target, safeDistance(target, size));
     if (fit.turn && !keeps_target && fitted.IsPerspectiveProjection()) {
-        target = middleOfTurn(fitted, target, objects, box);
+        target = middleOfTurn(fitted, target, points);
         is_placed = is_placed && placeCamera(fitted, target, safeDistance(target, size));
     }
-    const Reach reach = measure(fitted, target, objects, fit.turn);
+    const Reach reach = measure(fitted, target, points, fit.turn);
     const auto fit_camera = fitted.IsPerspectiveProjection() ? fitPerspective : fitParallel;
     if (!is_placed || !fit_camera(fitted, reach, target, clearance, fit.distance))
         return Error{"The view cannot be fitted: the objects are too small, or too far from the "
