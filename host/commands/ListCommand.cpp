@@ -4,6 +4,7 @@
 #include "host/commands/FollowableText.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/PointText.h"
+#include "host/commands/SunText.h"
 #include "host/commands/WordsLeft.h"
 #include "host/document/Document.h"
 #include "host/prompt/NumberText.h"
@@ -147,6 +148,7 @@ void listViewsAndLights(Application& application, Document& document) {
         application.print(lineOf(*view, view.get() == &document.activeView()).View());
     for (const auto& [index, light] : document.lights().live())
         application.print(lineOf(light.Light(), index).View());
+    application.print(sunText(document.sun()).View());
 }
 
 } // namespace

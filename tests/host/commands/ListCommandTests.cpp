@@ -36,7 +36,8 @@ TEST_F(ListCommandTest, ShowsObjectsViewsAndCounts) {
                              "Top  view, Wireframe, 1280 x 720\n"
                              "Front  view, Wireframe, 1280 x 720\n"
                              "Right  view, Wireframe, 1280 x 720\n"
-                             "Perspective  view, Shaded, 96 x 64, active\n" +
+                             "Perspective  view, Shaded, 96 x 64, active\n"
+                             "sun: on, azimuth 135, altitude 45\n" +
                              TOTALS);
 }
 
@@ -100,7 +101,8 @@ TEST_F(ListCommandTest, ShowsLightsUnderTheirIndexButNotDeletedOnes) {
     document().lights().remove(2);
     ASSERT_EQ(run(L"_-List"), CQuarnCommand::success);
     EXPECT_THAT(printed(), HasSubstr("\nlight 0, directional\n"
-                                     "Evening  light 1, directional, off\n1 mesh"));
+                                     "Evening  light 1, directional, off\n"
+                                     "sun: on, azimuth 135, altitude 45\n1 mesh"));
 }
 
 TEST_F(ListCommandTest, EndsWithTheAnimationWhereThereIsOne) {
