@@ -36,7 +36,7 @@ struct PictureSize {
 };
 constexpr PictureSize picture_sizes[] = {{"1280x720", 1280, 720}, {"1920x1080", 1920, 1080}};
 
-constexpr double budget_of_row_ms = 2000.0;
+constexpr double budget_of_row_ms = 1500.0;
 
 std::string nameOf(const quarn::DisplayModeAttributes& mode) {
     const std::wstring_view name = mode.english_name.View();

@@ -57,7 +57,10 @@ def choose_engine(scene, name):
 
 def main(mesh, folder, frames, engine):
     empty_scene()
-    bpy.ops.import_mesh.ply(filepath=mesh)
+    if bpy.app.version >= (4, 0):
+        bpy.ops.wm.ply_import(filepath=mesh)
+    else:
+        bpy.ops.import_mesh.ply(filepath=mesh)
     scene = bpy.context.scene
     camera = add_camera()
     choose_engine(scene, engine)

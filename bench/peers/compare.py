@@ -113,7 +113,7 @@ class Display:
             return self
         reading, writing = os.pipe()
         self.server = subprocess.Popen(
-            ["Xvfb", "-displayfd", str(writing), "-nolisten", "tcp",
+            ["Xvfb", "-displayfd", str(writing), "-nolisten", "tcp", "-noreset",
              "-screen", "0", f"{orbit.WIDTH}x{orbit.HEIGHT}x24"],
             pass_fds=[writing], stderr=subprocess.DEVNULL)  # fmt: skip
         os.close(writing)
