@@ -26,8 +26,8 @@ float reversed(int bits, int count) {
     return static_cast<float>(result);
 }
 
-/// The eight rays of a pixel lie in eight sectors around the normal; the sixteen pixels of a tile
-/// divide each sector among themselves, in angle and in elevation.
+/// The rays of a pixel lie in equal sectors around the normal, one in each; the sixteen pixels of a
+/// tile divide each sector among themselves, in angle and in elevation.
 std::array<SkyDirections, sky_rays> makeDirections() {
     std::array<SkyDirections, sky_rays> all{};
     for (int k = 0; k < sky_rays; ++k)
@@ -37,14 +37,15 @@ std::array<SkyDirections, sky_rays> makeDirections() {
             const int mixed = (column + 2 * row) % tile_size + tile_size * row;
             const float sector = static_cast<float>(k) + (static_cast<float>(column) + 0.5F) / 4.0F;
             const float turn = two_pi * sector / static_cast<float>(sky_rays);
-            const float ring = reversed(mixed, 4) + (static_cast<float>(k * 5 % 8) + 0.5F) / 8.0F;
+            const float ring =
+                reversed(mixed, 4) + (static_cast<float>(k * 3 % sky_rays) + 0.5F) / sky_rays;
             const float u = ring / static_cast<float>(lane_count);
             const float sine = std::sqrt(u);
             SkyDirections& d = all[static_cast<std::size_t>(k)];
             d.x[lane] = sine * std::cos(turn);
             d.y[lane] = sine * std::sin(turn);
             d.z[lane] = std::sqrt(1.0F - u);
-            const int step = (k * 3 + mixed * 7) % lane_count;
+            const int step = (k * 5 + mixed * 7) % lane_count;
             d.reach[lane] = 0.06F + 0.94F * (static_cast<float>(step) + 0.5F) / 16.0F;
         }
     return all;
@@ -145,21 +146,31 @@ void FreeSky::smooth(const FrameSetup& frame, int dx, int dy, int before) {
     const PixelPlaces places(frame);
     forEachRow(frame.height, [&](int y) {
         for (int x = 0; x < frame.width; ++x) {
-            float sum = 0.0F;
-            float weights = 0.0F;
-            for (int i = -before; i < tile_size - before; ++i) {
-                const int qx = x + i * dx;
-                const int qy = y + i * dy;
-                if (qx < 0 || qy < 0 || qx >= frame.width || qy >= frame.height)
+            const auto offset = [&](int i) {
+                return static_cast<std::size_t>(y + i * dy) *
+                           static_cast<std::size_t>(frame.width) +
+                       static_cast<std::size_t>(x + i * dx);
+            };
+            const int at = dx != 0 ? x : y;
+            const int first = std::max(-before, -at);
+            const int last =
+                std::min(tile_size - before, (dx != 0 ? frame.width : frame.height) - at);
+            const float own = m_free[offset(0)];
+            float sum = own;
+            float weights = 1.0F;
+            for (int i = first; i < last; ++i) {
+                const float other = m_free[offset(i)];
+                // What is equal changes no mean, so it need not be compared: open ground is quick.
+                if (i == 0 || other == own) {
+                    sum += i == 0 ? 0.0F : own;
+                    weights += i == 0 ? 0.0F : 1.0F;
                     continue;
-                const float weight = i == 0 ? 1.0F : places.likeness(x, y, qx, qy);
-                sum += weight *
-                       m_free[static_cast<std::size_t>(qy) * static_cast<std::size_t>(frame.width) +
-                              static_cast<std::size_t>(qx)];
+                }
+                const float weight = places.likeness(x, y, x + i * dx, y + i * dy);
+                sum += weight * other;
                 weights += weight;
             }
-            m_smoothed[static_cast<std::size_t>(y) * static_cast<std::size_t>(frame.width) +
-                       static_cast<std::size_t>(x)] = sum / weights;
+            m_smoothed[offset(0)] = sum / weights;
         }
     });
     m_free.swap(m_smoothed);

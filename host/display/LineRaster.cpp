@@ -296,9 +296,13 @@ void drawLines(std::span<const LineBatch> batches, const LineTarget& target) {
                   "each band fills a row of cells of its own");
     const int band_count = (target.height + LineBatch::band_height - 1) / LineBatch::band_height;
     LineCrowding crowding;
-    crowding.reset(target.width, target.height);
-    tbb::parallel_for(0, band_count, [&](int index) { findCrowding(batches, index, crowding); });
-    crowding.finish();
+    if (std::any_of(batches.begin(), batches.end(),
+                    [](const LineBatch& batch) { return batch.style().crowded > 0.0F; })) {
+        crowding.reset(target.width, target.height);
+        tbb::parallel_for(0, band_count,
+                          [&](int index) { findCrowding(batches, index, crowding); });
+        crowding.finish();
+    }
     tbb::parallel_for(0, band_count, [&](int index) {
         Band band(target, crowding, index);
         for (const LineBatch& batch : batches) {

@@ -35,7 +35,7 @@ struct FrameLayers {
 inline constexpr int layers_kept = 4;
 
 /// How many rays each pixel sends toward the sky to find how much of it is free.
-inline constexpr int sky_rays = 8;
+inline constexpr int sky_rays = 4;
 
 /// One direction for each pixel of a tile, about (0, 0, 1), the density of all being as the cosine
 /// of their angle to it; and how far each looks, as a part of `FrameSetup::sky_reach`.
