@@ -103,10 +103,18 @@ bool KM_Mesh::IsValid(KM_wString* why) const {
 }
 
 KM_BoundingBox KM_Mesh::BoundingBox() const {
-    KM_BoundingBox box;
-    for (const KM_3fPoint& vertex : m_V)
-        box.Set(vertex.ToDouble());
-    return box;
+    constexpr float largest = std::numeric_limits<float>::max();
+    KM_3fPoint min(largest, largest, largest);
+    KM_3fPoint max(-largest, -largest, -largest);
+    bool is_empty = true;
+    for (const KM_3fPoint& vertex : m_V) {
+        if (!vertex.IsValid())
+            continue;
+        is_empty = false;
+        min = {std::min(min.x, vertex.x), std::min(min.y, vertex.y), std::min(min.z, vertex.z)};
+        max = {std::max(max.x, vertex.x), std::max(max.y, vertex.y), std::max(max.z, vertex.z)};
+    }
+    return is_empty ? KM_BoundingBox() : KM_BoundingBox(min.ToDouble(), max.ToDouble());
 }
 
 void KM_Mesh::ComputeVertexNormals() {
