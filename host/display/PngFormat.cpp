@@ -66,6 +66,9 @@ Result<void> encodePng(const ImageView& image, std::vector<std::byte>& bytes) {
     if (context == nullptr) {
         return Error{"there is not enough memory"};
     }
+    // As much as the pixels at once: what a picture compresses to differs from frame to frame.
+    bytes.reserve(3 * static_cast<std::size_t>(image.width) *
+                  static_cast<std::size_t>(image.height));
     int failure = begin(context.get(), image, bytes);
     failure = failure ? failure : encodeRows(context.get(), image);
     return failure ? Result<void>(Error{spng_strerror(failure)}) : Result<void>();

@@ -1,11 +1,16 @@
 #include "sdk/qncore/QnDib.h"
 
 #include "host/app/Application.h"
+#include "host/app/Contract.h"
 #include "host/app/PathText.h"
 #include "host/display/ImageFile.h"
 
 CQuarnDib::CQuarnDib() : m_image(std::make_unique<quarn::Image>()) {}
-CQuarnDib::~CQuarnDib() = default;
+CQuarnDib::~CQuarnDib() {
+    quarn::Application* const application = quarn::Application::current();
+    if (application && m_image && quarn::isMainThread())
+        application->documents().keepStorageOf(*m_image);
+}
 CQuarnDib::CQuarnDib(CQuarnDib&& other) noexcept = default;
 CQuarnDib& CQuarnDib::operator=(CQuarnDib&& other) noexcept = default;
 

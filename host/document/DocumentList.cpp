@@ -1,5 +1,6 @@
 #include "host/document/DocumentList.h"
 
+#include "host/display/Image.h"
 #include "host/display/ImageFile.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
@@ -31,6 +32,18 @@ DocumentList::~DocumentList() {
 
 DocumentList* DocumentList::current() {
     return current_list;
+}
+
+void DocumentList::keepStorageOf(Image& picture) {
+    constexpr std::size_t most_bytes = std::size_t{64} << 20;
+    const std::size_t bytes = picture.rgba.capacity();
+    if (bytes > m_picture_storage.capacity() && bytes <= most_bytes)
+        m_picture_storage.swap(picture.rgba);
+}
+
+void DocumentList::giveStorageTo(Image& picture) {
+    if (picture.rgba.capacity() == 0)
+        picture.rgba.swap(m_picture_storage);
 }
 
 Document& DocumentList::openNew() {

@@ -2,6 +2,7 @@
 
 #include "host/document/Document.h"
 
+#include <cstdint>
 #include <memory>
 #include <vector>
 
@@ -9,6 +10,7 @@ namespace quarn {
 
 class FrontEnd;
 class ImageEncoder;
+struct Image;
 
 /// The open documents. There is at most one list at a time: the interface finds documents by
 /// number and objects by id with no list given, so the list is known to all.
@@ -51,6 +53,13 @@ public:
     /// Writes picture files; kept here so that its buffers serve every frame.
     ImageEncoder& imageEncoder() { return *m_image_encoder; }
 
+    /// Takes the storage of a picture that is no longer needed, for the next one: recording a frame
+    /// then asks for no memory. Storage of very large pictures is freed.
+    void keepStorageOf(Image& picture);
+    /// Gives a picture that has none the storage that was kept, if there is any, with whatever is
+    /// in it.
+    void giveStorageTo(Image& picture);
+
     /// Keeps a copy of the animation record as it is now: the one that a new document starts with.
     /// Called once after a plug-in that keeps a record was loaded.
     void rememberFreshRecord();
@@ -65,6 +74,7 @@ private:
     Document* m_active = nullptr;
     bool m_is_command_running = false;
     std::unique_ptr<ImageEncoder> m_image_encoder;
+    std::vector<std::uint8_t> m_picture_storage;
     std::unique_ptr<KM_3dmAnimationProperties> m_fresh_record;
 };
 

@@ -1,6 +1,7 @@
 #include "host/app/Contract.h"
 #include "host/display/Image.h"
 #include "host/document/Document.h"
+#include "host/document/DocumentList.h"
 
 using quarn::mayCallView;
 
@@ -101,8 +102,11 @@ CDisplayPipelineAttributes* CQuarnDisplayPipeline::CurrentDisplayAttributes() {
 
 bool CQuarnDisplayPipeline::DrawToDib(CQuarnDib& dib, int width, int height,
                                       const CDisplayPipelineAttributes& attributes) {
-    return mayCallView(*m_view, "CQuarnDisplayPipeline::DrawToDib") &&
-           m_view->draw(dib.Image(), width, height, attributes);
+    if (!mayCallView(*m_view, "CQuarnDisplayPipeline::DrawToDib"))
+        return false;
+    if (quarn::DocumentList* const list = quarn::DocumentList::current())
+        list->giveStorageTo(dib.Image());
+    return m_view->draw(dib.Image(), width, height, attributes);
 }
 
 bool CQuarnDisplayPipeline::CopyToFrameBuffer(const CQuarnDib& dib) {
