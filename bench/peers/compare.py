@@ -3,6 +3,7 @@
 take instead, where they are installed, and prints how they compare.
 
 usage: compare.py QUARN [--sizes 100k,1M,5M] [--frames 60] [--only NAME,...] [--limit SECONDS]
+                  [--repeat 1]
 
 Every figure is of a whole run, from the start of the process to its last file: reading the mesh,
 building what the program builds, and writing each frame as a jpg of 1280x720. Memory is the most
@@ -33,6 +34,7 @@ class Peer:
     has_shadows: bool
     needs: list  # programs that must be there; all of them
     commands: object  # (mesh, folder, frames) to a list of command lines
+    is_ours: bool = False
 
 
 @dataclasses.dataclass
@@ -47,7 +49,7 @@ def quarn_peer(quarn, mode, has_shadows):
         return [[quarn, "turntable", mesh, "--frames", str(frames), "--out", folder,
                  "--mode", mode, "--size", f"{orbit.WIDTH}x{orbit.HEIGHT}"]]  # fmt: skip
 
-    return Peer(f"quarn, {mode}", has_shadows, [quarn], commands)
+    return Peer(f"quarn, {mode}", has_shadows, [quarn], commands, is_ours=True)
 
 
 def script(program, name, *rest):
@@ -166,25 +168,36 @@ def measure(peer, mesh, frames, limit):
         return Run(seconds, megabytes, frames)
 
 
-def print_row(size, peer, run, own):
-    ratio = f"{run.seconds / own.seconds:.1f}" if own else ""
-    print(f"| {size} | {peer.name} | {run.seconds:.2f} | {1000 * run.seconds / run.frames:.0f} "
-          f"| {run.megabytes:.0f} | {ratio} |", flush=True)  # fmt: skip
+COLUMNS = ["triangles", "program", "seconds", "ms a frame", "peak MB"]
 
 
-def compare(size, peers, options):
+def print_cells(cells):
+    print("| " + " | ".join(cells) + " |", flush=True)
+
+
+def cells_of(size, peer, run):
+    return [size, peer.name, f"{run.seconds:.2f}", f"{1000 * run.seconds / run.frames:.0f}",
+            f"{run.megabytes:.0f}"]  # fmt: skip
+
+
+def compare(size, peers, columns, options):
     with tempfile.TemporaryDirectory() as folder:
         mesh = os.path.join(folder, "hills.ply")
         hills.write(mesh, hills.CELLS[size])
         own = {}
         for peer in peers:
             try:
-                run = measure(peer, mesh, options.frames, options.limit)
+                runs = [measure(peer, mesh, options.frames, options.limit)
+                        for _ in range(options.repeat)]  # fmt: skip
             except Failed as why:
-                print(f"| {size} | {peer.name} | {why} | | | |", flush=True)
+                print_cells([size, peer.name, str(why)] + (len(columns) - 3) * [""])
                 continue
-            own.setdefault(peer.has_shadows, run if peer.name.startswith("quarn") else None)
-            print_row(size, peer, run, own[peer.has_shadows])
+            run = min(runs, key=lambda each: each.seconds)
+            if peer.is_ours:
+                own[peer.has_shadows] = run.seconds
+            base = own.get(peer.has_shadows)
+            ratio = f"{run.seconds / base:.1f}" if base else ""
+            print_cells((cells_of(size, peer, run) + [ratio])[: len(columns)])
 
 
 def wanted(options):
@@ -205,26 +218,32 @@ def read_options():
     parser.add_argument("--frames", type=int, default=60)
     parser.add_argument("--only", help="names of programs, or parts of them")
     parser.add_argument("--limit", type=float, default=900.0, help="seconds that a run may take")
+    parser.add_argument("--repeat", type=int, default=1, help="runs, the fastest of which counts")
     options = parser.parse_args()
     options.sizes = options.sizes.split(",")
     for size in options.sizes:
         if size not in hills.CELLS:
             parser.error(f"no size {size}; there are {', '.join(hills.CELLS)}")
-    if options.frames < 1:
-        parser.error("--frames must be at least 1")
+    if options.frames < 1 or options.repeat < 1:
+        parser.error("--frames and --repeat must be at least 1")
     return options
 
 
 def main():
     options = read_options()
     peers = wanted(options)
+    columns = list(COLUMNS)
     print(f"{options.frames} frames of {orbit.WIDTH}x{orbit.HEIGHT}, from process start to the "
-          "last file; the ratio is to quarn's own row with, or without, shadows\n")  # fmt: skip
-    print("| triangles | program | seconds | ms a frame | peak MB | ratio |")
-    print("|---|---|---|---|---|---|")
+          "last file", end="")  # fmt: skip
+    if not all(peer.is_ours for peer in peers):
+        columns.append("ratio")
+        print("; the ratio is to quarn's own row with, or without, shadows", end="")
+    print("\n")
+    print_cells(columns)
+    print("|" + len(columns) * "---|")
     with Display():
         for size in options.sizes:
-            compare(size, peers, options)
+            compare(size, peers, columns, options)
 
 
 if __name__ == "__main__":
