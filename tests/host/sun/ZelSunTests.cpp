@@ -69,6 +69,44 @@ TEST(ZelSun, HasThePublishedDeclinationOfOctober1992) {
                 0.001);
 }
 
+/// Where spherical astronomy puts a body of the given declination and local hour angle (west
+/// positive), all in degrees.
+struct HorizontalPlace {
+    double azimuth;
+    double altitude;
+};
+
+HorizontalPlace placeOf(double latitude, double declination, double hour_angle) {
+    const double phi = latitude * PI / 180;
+    const double delta = declination * PI / 180;
+    const double h = hour_angle * PI / 180;
+    const double altitude =
+        std::asin(std::sin(phi) * std::sin(delta) + std::cos(phi) * std::cos(delta) * std::cos(h));
+    const double from_south =
+        std::atan2(std::sin(h), std::cos(h) * std::sin(phi) - std::tan(delta) * std::cos(phi));
+    return {from_south * 180 / PI + 180, altitude * 180 / PI};
+}
+
+// Jean Meeus, Astronomical Algorithms, 2nd edition, examples 25.b and 28.a: at that moment the sun
+// stood at the declination -7 deg 47' 01.74", and a sundial was 3.427351 degrees ahead of the
+// clock.
+TEST(ZelSun, StandsWhereThePublishedEquationOfTimePutsItAtEveryLatitudeAndHour) {
+    const double published_declination = -(7 + 47 / 60.0 + 1.74 / 3600);
+    const double published_equation = 3.427351;
+    const double greenwich = 15 * (24 - 59 / 3600.0) - 180 + published_equation;
+    for (const double latitude : {-66.0, -34.0, 1.0, 23.0, 52.0, 70.0})
+        for (const double longitude : {-150.0, -105.0, -60.0, 0.0, 45.0, 120.0, 165.0}) {
+            const CQnZelSun sun = sunAt(latitude, longitude, 0, {1992, 10, 12}, hoursOf(23, 59, 1));
+            const HorizontalPlace place =
+                placeOf(latitude, published_declination, greenwich + longitude);
+            const double cosine = std::cos(place.altitude * PI / 180);
+            EXPECT_NEAR(sun.Altitude(), place.altitude - PARALLAX_DEG * cosine, 0.001)
+                << latitude << " " << longitude;
+            EXPECT_NEAR(std::remainder(sun.Azimuth() - place.azimuth, 360) * cosine, 0, 0.001)
+                << latitude << " " << longitude;
+        }
+}
+
 // "Earth's Seasons", U.S. Naval Observatory: universal time to the minute, in which the declination
 // changes by 0.0003 degrees.
 TEST(ZelSun, CrossesTheEquatorAtThePublishedEquinoxes) {
