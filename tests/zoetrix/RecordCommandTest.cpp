@@ -206,13 +206,23 @@ TEST_F(RecordCommand, FolderThatCannotBeMadeGivesNeitherFrameNorPage) {
     EXPECT_EQ("kept", readFile(folder.path() / "file"));
 }
 
-TEST_F(RecordCommand, UnknownRendererStopsWithAPageOfNoFrames) {
+TEST_F(RecordCommand, RenderThatIsCancelledStopsWithAPageOfNoFrames) {
+    renderSmall();
     record().SetRenderFull(true);
+    front_end.setKeyDown(VK_ESCAPE, true);
     ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
     EXPECT_THAT(files(), ElementsAre("Walk.html"));
     EXPECT_THAT(readFile(frames / "Walk.html"), HasSubstr("var ImageCount = 0;"));
     EXPECT_THAT(images(), IsEmpty());
     EXPECT_EQ(0, record().CurrentFrame());
+}
+
+TEST_F(RecordCommand, RendererWritesEveryFrameAndThePage) {
+    renderSmall();
+    record().SetRenderFull(true);
+    ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
+    expectThreeFramesAndThePageIn(frames);
+    EXPECT_EQ(3, record().Images().Count());
 }
 
 TEST_F(RecordCommand, NamesThatLeaveTheFolderGiveNeitherFrameNorPage) {

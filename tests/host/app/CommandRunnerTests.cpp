@@ -59,8 +59,8 @@ TEST_F(CommandRunnerTest, ALocalNameIsNoEnglishName) {
 }
 
 TEST_F(CommandRunnerTest, AnUnknownCommandIsToldAndFails) {
-    EXPECT_EQ(run(L"_-Render x"), CQuarnCommand::failure);
-    EXPECT_EQ(printed(), "Unknown command: Render. Type Help for the list.\n");
+    EXPECT_EQ(run(L"_-Rendre x"), CQuarnCommand::failure);
+    EXPECT_EQ(printed(), "Unknown command: Rendre. Type Help for the list.\n");
 }
 
 TEST_F(CommandRunnerTest, ABlankLineSucceeds) {
