@@ -167,14 +167,16 @@ TEST(SurfaceDrawing, LoopsForEveryProcessorDrawTheSamePicture) {
     const KM_Viewport viewport = perspectiveView({-30.0, -60.0, 30.0}, {0.0, 0.0, 0.0});
     DisplayScene scene;
     ASSERT_TRUE(scene.update(content).ok());
-    Image best;
-    ASSERT_TRUE(
-        DisplayPipeline().draw(scene, viewport, modeNamed(L"Rendered", 2), 317, 203, best).ok());
-    Image plain;
-    ASSERT_TRUE(DisplayPipeline(baseline_ray_kernel)
-                    .draw(scene, viewport, modeNamed(L"Rendered", 2), 317, 203, plain)
-                    .ok());
-    EXPECT_EQ(best.rgba, plain.rgba);
+    for (const DisplayModeAttributes& standard : standardDisplayModes()) {
+        DisplayModeAttributes mode = standard;
+        mode.antialiasing_level = 2;
+        Image best;
+        ASSERT_TRUE(DisplayPipeline().draw(scene, viewport, mode, 317, 203, best).ok());
+        Image plain;
+        ASSERT_TRUE(
+            DisplayPipeline(baseline_ray_kernel).draw(scene, viewport, mode, 317, 203, plain).ok());
+        EXPECT_EQ(best.rgba, plain.rgba) << standard.english_name.ToUtf8();
+    }
 }
 
 TEST(SurfaceDrawing, SmoothingChangesOnlyPixelsAtEdges) {
