@@ -86,7 +86,7 @@ private:
         work();
         const std::chrono::duration<double> taken = std::chrono::steady_clock::now() - start;
         if (taken.count() < 0.5 * batch_seconds)
-            m_batch *= 2;
+            m_batch = std::min(2 * m_batch, m_blocks); // small pictures never last that long
         else if (taken.count() > 2.0 * batch_seconds && m_batch > 4)
             m_batch /= 2;
     }

@@ -106,6 +106,18 @@ TEST(Renderer, CancelInTheMiddleLeavesThePicture) {
     EXPECT_EQ(image.width, 2);
 }
 
+TEST(Renderer, ManySamplesOfASmallPictureComeToAnEnd) {
+    DisplayScene scene;
+    ASSERT_TRUE(scene.update(village()).ok());
+    Image image;
+    int asked = 0;
+    const auto watch = [&](double) { return ++asked < 1000; };
+    const auto end = Renderer().render(scene, fromTheStreet(), {12, 8, 2048}, watch, image);
+    ASSERT_TRUE(end.ok()) << end.message();
+    EXPECT_EQ(end.value(), RenderEnd::done);
+    EXPECT_EQ(asked, 2048 / 32) << "samples are taken 32 at a time";
+}
+
 TEST(Renderer, RefusesWhatItCannotRender) {
     const DisplayScene scene;
     const auto why = [&](const RenderRequest& request) {
