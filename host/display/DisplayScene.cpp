@@ -138,6 +138,7 @@ RaySurface DisplayScene::surfaceOf(const SceneMesh& object, const RayMesh& mesh,
     surface.opacity = static_cast<float>(material.base_color.a) / 255.0F;
     surface.has_cutout = material.alpha_cutout;
     surface.alpha_cutoff = material.alpha_cutoff;
+    surface.see_through = material.see_through && !material.alpha_cutout;
     if (!mesh.mesh().m_T.empty() && material.base_color_texture) {
         surface.texture_coordinates = mesh.mesh().m_T.data();
         surface.texture = textureOf(material, earlier);

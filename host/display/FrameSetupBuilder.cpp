@@ -109,8 +109,10 @@ void setGround(FrameSetup& frame) {
     set(frame.ground_albedo, {0.46F, 0.45F, 0.425F});
 }
 
-void setStyle(FrameSetup& frame, SurfaceStyle style) {
+void setStyle(FrameSetup& frame, SurfaceStyle style, bool shows_panes) {
     frame.textures = style == SurfaceStyle::lit;
+    if (style == SurfaceStyle::lit || style == SurfaceStyle::studio)
+        frame.has_see_through = shows_panes;
     if (style == SurfaceStyle::translucent)
         frame.layers = {12, 0.36F, 0.85F, 0.55F};
     if (style == SurfaceStyle::x_ray)
@@ -180,7 +182,7 @@ FrameSetup makeFrameSetup(const DisplayScene& scene, const KM_Viewport& viewport
     frame.rays = raysIn(scene, viewport, width, height);
     if (mode.surface_style != SurfaceStyle::none)
         setScene(frame, scene);
-    setStyle(frame, mode.surface_style);
+    setStyle(frame, mode.surface_style, scene.rays().hasSeeThrough());
     const CameraFrame camera{frame.rays.camera_x, frame.rays.camera_y, frame.rays.camera_z};
     setLighting(frame, lightingOf(scene, mode, camera));
     if (mode.has_ground_plane)

@@ -1,6 +1,6 @@
 #include "host/display/RayScene.h"
 
-#include "host/display/AlphaCutout.h"
+#include "host/display/OpacityFilter.h"
 
 #include <algorithm>
 #include <array>
@@ -98,16 +98,17 @@ bool RayScene::standsAlone(const Member& member) const {
 
 RayScene::GroupKey RayScene::keyOf(const Member& member) const {
     const RaySurface& surface = member.surface;
-    if (!surface.has_cutout)
-        return {member.mesh.get(), nullptr, 0.0F, 0.0F};
-    return {member.mesh.get(), surface.texture, surface.alpha_cutoff, surface.opacity};
+    if (!surface.has_cutout && !surface.see_through)
+        return {member.mesh.get(), nullptr, 0.0F, 0.0F, false};
+    return {member.mesh.get(), surface.texture, surface.alpha_cutoff, surface.opacity,
+            surface.see_through};
 }
 
 RayScene::SoleGroups RayScene::soleGroups() const {
     SoleGroups groups;
     for (const Instance& instance : m_instances)
         if (const RayMesh* const mesh = instance.group->sole_mesh)
-            groups.emplace(GroupKey{mesh, nullptr, 0.0F, 0.0F}, instance.group);
+            groups.emplace(GroupKey{mesh, nullptr, 0.0F, 0.0F, false}, instance.group);
     return groups;
 }
 
@@ -221,7 +222,6 @@ void RayScene::addInstance(std::shared_ptr<Group> group, const KM_Xform& frame_f
 
 void RayScene::addSole(std::size_t member, SoleGroups& groups) {
     const KM_Xform& frame_from_mesh = m_members[member].frame_from_mesh;
-    const bool cutout = m_members[member].surface.has_cutout;
     std::shared_ptr<Group>& group = groups[keyOf(m_members[member])];
     if (group) {
         addInstance(group, frame_from_mesh);
@@ -233,12 +233,8 @@ void RayScene::addSole(std::size_t member, SoleGroups& groups) {
     place(member, 0);
     group->geometries.push_back(makeTriangles(member));
     RTCGeometry geometry = group->geometries.back().get();
-    if (cutout) {
-        rtcSetGeometryUserData(geometry, &m_surfaces.back());
-        setAlphaCutout(geometry);
-    } else {
+    if (!setOpacityFilter(geometry, m_surfaces.back()))
         group->sole_mesh = m_members[member].mesh.get();
-    }
     rtcCommitGeometry(geometry);
     rtcAttachGeometryByID(group->scene.get(), geometry, 0);
 }
@@ -251,10 +247,7 @@ void RayScene::addSmall(std::span<const std::size_t> members) {
         place(member, id);
         group->geometries.push_back(makeTriangles(member));
         RTCGeometry geometry = group->geometries.back().get();
-        if (m_members[member].surface.has_cutout) {
-            rtcSetGeometryUserData(geometry, &m_surfaces.back());
-            setAlphaCutout(geometry);
-        }
+        setOpacityFilter(geometry, m_surfaces.back());
         rtcCommitGeometry(geometry);
         rtcAttachGeometryByID(group->scene.get(), geometry, id);
     }
@@ -289,6 +282,9 @@ void RayScene::commit() {
             setEnabled(instance.geometry.get(), wanted);
         instance.enabled = wanted;
     }
+    m_has_see_through = std::any_of(m_members.begin(), m_members.end(), [](const Member& member) {
+        return member.visible && member.surface.see_through;
+    });
     chooseRoot();
 }
 

@@ -48,6 +48,9 @@ public:
     /// In the order of surface indices, which is not that of the members.
     std::span<const RaySurface> surfaces() const { return m_surfaces; }
 
+    /// Whether some visible surface is see-through.
+    bool hasSeeThrough() const { return m_has_see_through; }
+
     /// How often a search structure, of a group or of all, was built.
     std::size_t buildCount() const { return m_build_count; }
     /// How many meshes have search structures, however often they are shown.
@@ -78,9 +81,10 @@ private:
     /// What meshes must have in common to share a scene of their own.
     struct GroupKey {
         const RayMesh* mesh;
-        const MipTexture* cutout_texture;
+        const MipTexture* texture; ///< whose opacity counts
         float cutoff;
         float opacity;
+        bool see_through;
         auto operator<=>(const GroupKey&) const = default;
     };
     using SoleGroups = std::map<GroupKey, std::shared_ptr<Group>>;
@@ -110,6 +114,7 @@ private:
     std::vector<RaySurface> m_surfaces;
     std::vector<SurfacePlace> m_surface_places;
     std::size_t m_build_count = 0;
+    bool m_has_see_through = false;
 };
 
 } // namespace quarn

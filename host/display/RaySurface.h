@@ -24,6 +24,7 @@ struct RaySurface {
     const SurfacePlace* place = nullptr; ///< null: the vertices are in the frame's coordinates
     float albedo[3] = {0.6F, 0.6F, 0.6F}; ///< linear base colour
     float opacity = 1.0F;                 ///< of the base colour
+    bool see_through = false;             ///< what lies behind shines through
     bool has_cutout = false;
     float alpha_cutoff = 0.5F;
 };

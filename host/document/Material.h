@@ -30,6 +30,9 @@ struct Material {
     std::shared_ptr<const Texture> base_color_texture; ///< null when there is none
     bool alpha_cutout = false; ///< leave out what is less opaque than alpha_cutoff
     float alpha_cutoff = 0.5F; ///< 0 to 1
+    /// What lies behind shines through, as much as base colour, texture and vertex colours together
+    /// are not opaque; does not go with alpha_cutout.
+    bool see_through = false;
 };
 
 } // namespace quarn

@@ -72,6 +72,7 @@ struct FrameSetup {
     bool textures = false;   ///< textures and vertex colours
     float plain_albedo[3] = {1, 1, 1};
     FrameLayers layers;
+    bool has_see_through = false; ///< surfaces of see-through materials are drawn so
 
     float ambient_base[3] = {0, 0, 0};
     float ambient_slope[3][3] = {};

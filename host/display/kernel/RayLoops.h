@@ -1,8 +1,8 @@
 // The ray loops. Each RayKernel_*.cpp includes this once, with its own processor's flags.
 
 #include "host/display/DisplayTable.h"
-#include "host/display/kernel/GroundPlane.h"
 #include "host/display/kernel/LayeredShading.h"
+#include "host/display/kernel/SeeThroughShading.h"
 
 namespace quarn {
 namespace {
@@ -22,31 +22,6 @@ inline LaneInts encoded(const FrameSetup& frame, const LaneColors& color) {
            LaneInts(static_cast<std::int32_t>(0xFF000000U));
 }
 
-inline LaneColors blended(const LaneColors& under, const LaneColors& over, const Lanes& weight) {
-    return {under.r + weight * (over.r - under.r), under.g + weight * (over.g - under.g),
-            under.b + weight * (over.b - under.b)};
-}
-
-/// Opaque surfaces and the ground, shaded together so that they share one packet of shadow rays.
-inline LaneColors shadeOpaque(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfaces) {
-    const LaneMask missed = packet.active & ~packet.hit;
-    if (!any(missed))
-        return shadeSurfaces(frame, packet, surfaces, packet.hit);
-    LaneColors color = backgroundColors(frame, packet);
-    if (!frame.has_ground) {
-        if (!any(packet.hit))
-            return color;
-        return select(packet.hit, shadeSurfaces(frame, packet, surfaces, packet.hit), color);
-    }
-    const GroundLanes ground = meetGround(frame, packet, surfaces);
-    const LaneMask lit = packet.hit | ground.seen;
-    if (!any(lit))
-        return color;
-    const LaneColors shaded = shadeSurfaces(frame, packet, surfaces, lit);
-    color = blended(color, shaded, ground.weight);
-    return select(packet.hit, shaded, color);
-}
-
 struct TracedPacket {
     LaneInts pixels;
     LaneInts objects;
@@ -62,8 +37,12 @@ inline TracedPacket trace(const FrameSetup& frame, RayPacket& packet) {
     SurfaceLanes surfaces;
     readSurfaces(frame, packet, surfaces);
     traced.objects = select(packet.hit, surfaces.surface + LaneInts(1), LaneInts(0));
-    traced.pixels = encoded(frame, frame.layers.count > 1 ? shadeLayers(frame, packet, surfaces)
-                                                          : shadeOpaque(frame, packet, surfaces));
+    if (frame.has_see_through)
+        traced.pixels = encoded(frame, shadeThroughPanes(frame, packet, surfaces, traced.nearness));
+    else
+        traced.pixels =
+            encoded(frame, frame.layers.count > 1 ? shadeLayers(frame, packet, surfaces)
+                                                  : shadeOpaque(frame, packet, surfaces));
     return traced;
 }
 

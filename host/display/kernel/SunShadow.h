@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/display/OpacityFilter.h"
 #include "host/display/kernel/ShadowTerminator.h"
 #include "host/display/kernel/SurfaceLanes.h"
 
@@ -48,6 +49,23 @@ inline void liftTurnedAway(const FrameSetup& frame, const RayPacket& packet,
     }
 }
 
+/// The part of the sun's light that arrives where see-through surfaces may stand before it.
+[[gnu::noinline]] inline Lanes throughPanes(const FrameSetup& frame, const FrameLight& sun,
+                                            const LaneMask& look, RTCRay16& ray) {
+    PassingLight light;
+    rtcInitIntersectContext(&light.context);
+    for (int i = 0; i < lane_count; ++i) {
+        light.passed[i] = 1.0F;
+        ray.id[i] = static_cast<unsigned>(i + 1);
+    }
+    rtcOccluded16(look.data(), frame.scene, &light.context, &ray);
+    alignas(64) float passed[lane_count];
+    for (int i = 0; i < lane_count; ++i)
+        passed[i] = light.passed[i];
+    const Lanes kept_off = select(load(ray.tfar) < 0.0F, Lanes(1.0F), Lanes(1.0F) - load(passed));
+    return select(look, Lanes(1.0F) - kept_off * sun.shadow, 1.0F);
+}
+
 /// Looks from the lit lanes toward the sun.
 /// @param facing  cosine between shading normal and sun; lanes at 0 are not looked at
 /// @return the part of the sun's light that arrives
@@ -72,6 +90,8 @@ inline Lanes sunlightArriving(const FrameSetup& frame, const FrameLight& sun,
     if (any(turned_away))
         liftTurnedAway(frame, packet, surfaces, bits(turned_away), ray);
     // Not coherent: occlusion packets of partly masked rays do not end there in Embree 3.13.
+    if (frame.has_see_through)
+        return throughPanes(frame, sun, look, ray);
     RTCIntersectContext context;
     rtcInitIntersectContext(&context);
     rtcOccluded16(look.data(), frame.scene, &context, &ray);

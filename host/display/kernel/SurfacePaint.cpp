@@ -45,6 +45,19 @@ float textureLevel(const FrameSetup& frame, const RaySurface& surface, const RTC
     return ratio > 1.0F ? 0.5F * std::log2(ratio) : 0.0F;
 }
 
+TextureSample textureAt(const FrameSetup& frame, const RaySurface& surface, const RTCRayHit16& rays,
+                        int lane, const float (&place)[3]) {
+    const std::uint32_t* const vertex = surface.triangles[rays.hit.primID[lane]].vi;
+    const float weight[3] = {1.0F - place[0] - place[1], place[0], place[1]};
+    float u = 0.0F;
+    float v = 0.0F;
+    for (int corner = 0; corner < 3; ++corner) {
+        u += weight[corner] * surface.texture_coordinates[vertex[corner]].x;
+        v += weight[corner] * surface.texture_coordinates[vertex[corner]].y;
+    }
+    return surface.texture->sample(u, v, textureLevel(frame, surface, rays, lane, place[2]));
+}
+
 void multiplyVertexColor(const RaySurface& surface, const std::uint32_t* vertex,
                          const float (&weight)[3], float (&color)[3]) {
     LinearColor mean;
@@ -61,6 +74,22 @@ void multiplyVertexColor(const RaySurface& surface, const std::uint32_t* vertex,
 
 } // namespace
 
+float paneOpacityAt(const FrameSetup& frame, const RaySurface& surface, const RTCRayHit16& rays,
+                    int lane, const float (&place)[3]) {
+    const std::uint32_t* const vertex = surface.triangles[rays.hit.primID[lane]].vi;
+    const float weight[3] = {1.0F - place[0] - place[1], place[0], place[1]};
+    float opacity = surface.opacity;
+    if (surface.colors) {
+        float alpha = 0.0F;
+        for (int corner = 0; corner < 3; ++corner)
+            alpha += weight[corner] * static_cast<float>(surface.colors[vertex[corner]].a);
+        opacity *= alpha / 255.0F;
+    }
+    if (surface.texture)
+        opacity *= textureAt(frame, surface, rays, lane, place).alpha;
+    return opacity;
+}
+
 void paintAt(const FrameSetup& frame, const RaySurface& surface, const RTCRayHit16& rays, int lane,
              const float (&place)[3], float (&color)[3]) {
     const std::uint32_t* const vertex = surface.triangles[rays.hit.primID[lane]].vi;
@@ -69,14 +98,7 @@ void paintAt(const FrameSetup& frame, const RaySurface& surface, const RTCRayHit
         multiplyVertexColor(surface, vertex, weight, color);
     if (!surface.texture)
         return;
-    float u = 0.0F;
-    float v = 0.0F;
-    for (int corner = 0; corner < 3; ++corner) {
-        u += weight[corner] * surface.texture_coordinates[vertex[corner]].x;
-        v += weight[corner] * surface.texture_coordinates[vertex[corner]].y;
-    }
-    const TextureSample sample =
-        surface.texture->sample(u, v, textureLevel(frame, surface, rays, lane, place[2]));
+    const TextureSample sample = textureAt(frame, surface, rays, lane, place);
     color[0] *= sample.color.r;
     color[1] *= sample.color.g;
     color[2] *= sample.color.b;

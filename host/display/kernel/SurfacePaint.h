@@ -9,4 +9,9 @@ namespace quarn {
 void paintAt(const FrameSetup& frame, const RaySurface& surface, const RTCRayHit16& rays, int lane,
              const float (&place)[3], float (&color)[3]);
 
+/// How opaque a see-through surface is where ray `lane` met it, 0 to 1.
+/// @param place  the hit's u and v and the distance along the ray
+float paneOpacityAt(const FrameSetup& frame, const RaySurface& surface, const RTCRayHit16& rays,
+                    int lane, const float (&place)[3]);
+
 } // namespace quarn

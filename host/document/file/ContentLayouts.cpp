@@ -154,13 +154,16 @@ bool readTexture(KM_BinaryArchive& archive, SharedContent& shared) {
 }
 
 bool writeMaterial(KM_BinaryArchive& archive, const Material& material, std::int32_t texture) {
-    return materialFields(FieldWriter(archive), material) && archive.WriteInt(texture);
+    return materialFields(FieldWriter(archive), material) && archive.WriteInt(texture) &&
+           (!material.see_through || archive.WriteBool(true));
 }
 
 bool readMaterial(KM_BinaryArchive& archive, SharedContent& shared) {
     auto material = std::make_shared<Material>();
     if (!materialFields(FieldReader(archive), *material) ||
         !readShared(archive, shared.textures, true, material->base_color_texture))
+        return false;
+    if (archive.BytesLeft() > 0 && !archive.ReadBool(material->see_through))
         return false;
     shared.materials.push_back(std::move(material));
     return true;

@@ -1,12 +1,10 @@
-#include "host/display/AlphaCutout.h"
+#include "host/display/OpacityFilter.h"
 
 #include "host/display/MipTexture.h"
 #include "host/display/RaySurface.h"
 #include "kelmar/KM_Mesh.h"
 
 namespace quarn {
-
-namespace {
 
 float opacityAt(const RaySurface& surface, unsigned triangle, float u, float v) {
     float opacity = surface.opacity;
@@ -28,6 +26,8 @@ float opacityAt(const RaySurface& surface, unsigned triangle, float u, float v) 
     return opacity;
 }
 
+namespace {
+
 void rejectCutouts(const RTCFilterFunctionNArguments* arguments) {
     const auto& surface = *static_cast<const RaySurface*>(arguments->geometryUserPtr);
     for (unsigned i = 0; i < arguments->N; ++i) {
@@ -41,11 +41,33 @@ void rejectCutouts(const RTCFilterFunctionNArguments* arguments) {
     }
 }
 
+/// Rays that ask for it go on behind a see-through surface with less light.
+void dimPassingLight(const RTCFilterFunctionNArguments* arguments) {
+    const auto& surface = *static_cast<const RaySurface*>(arguments->geometryUserPtr);
+    for (unsigned i = 0; i < arguments->N; ++i) {
+        const unsigned id = RTCRayN_id(arguments->ray, arguments->N, i);
+        if (arguments->valid[i] == 0 || id == 0)
+            continue;
+        const float opacity = opacityAt(surface, RTCHitN_primID(arguments->hit, arguments->N, i),
+                                        RTCHitN_u(arguments->hit, arguments->N, i),
+                                        RTCHitN_v(arguments->hit, arguments->N, i));
+        reinterpret_cast<PassingLight*>(arguments->context)->passed[id - 1] *= 1.0F - opacity;
+        arguments->valid[i] = 0;
+    }
+}
+
 } // namespace
 
-void setAlphaCutout(RTCGeometry geometry) {
-    rtcSetGeometryIntersectFilterFunction(geometry, rejectCutouts);
-    rtcSetGeometryOccludedFilterFunction(geometry, rejectCutouts);
+bool setOpacityFilter(RTCGeometry geometry, const RaySurface& surface) {
+    if (!surface.has_cutout && !surface.see_through)
+        return false;
+    // Embree hands the data back to the filters, which only read it.
+    rtcSetGeometryUserData(geometry, const_cast<RaySurface*>(&surface));
+    if (surface.has_cutout)
+        rtcSetGeometryIntersectFilterFunction(geometry, rejectCutouts);
+    rtcSetGeometryOccludedFilterFunction(geometry,
+                                         surface.has_cutout ? rejectCutouts : dimPassingLight);
+    return true;
 }
 
 } // namespace quarn
