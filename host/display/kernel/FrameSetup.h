@@ -34,11 +34,20 @@ struct FrameLayers {
 /// How many see-through surfaces of a pixel are kept, to tell what lies before a line.
 inline constexpr int layers_kept = 4;
 
-/// How many rays each pixel sends toward the sky to find how much of it is free.
-inline constexpr int sky_rays = 4;
+/// The free sky is found on a grid that is coarser than the picture: place (i, j) lies at the
+/// continuous pixel (sky_spacing * i + sky_spacing / 2, sky_spacing * j + sky_spacing / 2).
+inline constexpr int sky_spacing = 2;
+/// How many rays each place sends toward the sky to find how much of it is free.
+inline constexpr int sky_rays = 2;
 
-/// One direction for each pixel of a tile, about (0, 0, 1), the density of all being as the cosine
-/// of their angle to it; and how far each looks, as a part of `FrameSetup::sky_reach`.
+/// Two places show one surface if each lies near the other's plane, by parts of the reach and of
+/// how far they are apart, and if the cosine of the angle between their normals is not too small.
+inline constexpr float sky_step_of_reach = 0.06F;
+inline constexpr float sky_step_of_slope = 0.25F;
+inline constexpr float sky_least_facing = 0.7F;
+
+/// Sixteen directions about (0, 0, 1), the density of all being as the cosine of their angle to it;
+/// and how far each looks, as a part of `FrameSetup::sky_reach`.
 struct SkyDirections {
     alignas(64) float x[lane_count];
     alignas(64) float y[lane_count];
@@ -46,7 +55,13 @@ struct SkyDirections {
     alignas(64) float reach[lane_count];
 };
 
-/// What a pixel's middle shows, to compare neighbours.
+/// The directions of the free sky.
+struct SkyTable {
+    SkyDirections shared[sky_rays]; ///< each place of a 4 by 4 tile of the grid takes one of each
+    SkyDirections alone;            ///< all for one pixel that no place of the grid speaks for
+};
+
+/// What a place of the grid shows, to compare neighbours.
 struct SkyPlace {
     float normal[3];
     float distance; ///< along the ray; negative: nothing
@@ -100,9 +115,11 @@ struct FrameSetup {
     float toward_sun[3] = {0, 0, 1};
 
     float sky_reach = 0.0F; ///< how far surfaces hide the sky from others; 0: not at all
-    const SkyDirections* sky_directions = nullptr; ///< sky_rays of them
-    SkyPlace* sky_places = nullptr;                ///< by pixel
-    float* free_sky = nullptr;                     ///< by pixel, 0 to 1
+    const SkyTable* sky_table = nullptr;
+    int sky_width = 0;              ///< places of the grid in a row
+    int sky_height = 0;             ///< rows of the grid
+    SkyPlace* sky_places = nullptr; ///< by place, row by row
+    float* free_sky = nullptr;      ///< by place, 0 to 1
 
     const std::uint32_t* display_table = nullptr; ///< DisplayTable::entries()
 
@@ -136,8 +153,8 @@ struct RayKernel {
     const char* name;
     void (*trace_block)(const FrameSetup& frame, const PixelBlock& block);
     void (*trace_samples)(const FrameSetup& frame, SamplePacket& samples);
-    /// Fills `sky_places` and `free_sky` of a block. What a pixel finds is rough; the pixels of a
-    /// tile together are right.
+    /// Fills `sky_places` and `free_sky` of a block, which is given in places of the grid. What a
+    /// place finds is rough; the places of a tile together are right.
     void (*find_free_sky)(const FrameSetup& frame, const PixelBlock& block);
 };
 

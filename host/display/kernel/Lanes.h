@@ -112,6 +112,15 @@ inline Lanes clamped(const Lanes& a) {
 inline Lanes floatsOf(const LaneInts& a) {
     return eachPart<Lanes>([&](int p) { return __builtin_convertvector(a.part[p], NativeFloats); });
 }
+/// What stands before the point, for numbers that fit; cut off toward 0.
+inline LaneInts wholePart(const Lanes& a) {
+    return eachPart<LaneInts>(
+        [&](int p) { return __builtin_convertvector(a.part[p], NativeInts); });
+}
+/// One lane's number.
+inline float laneOf(const Lanes& a, int lane) {
+    return a.part[lane / native_lanes][lane % native_lanes];
+}
 /// The bits of each float.
 inline LaneInts bitsOf(const Lanes& a) {
     return eachPart<LaneInts>([&](int p) { return reinterpret_cast<NativeInts>(a.part[p]); });

@@ -3,6 +3,7 @@
 #include "host/display/DisplayTable.h"
 #include "host/display/kernel/LayeredShading.h"
 #include "host/display/kernel/SeeThroughShading.h"
+#include "host/display/kernel/SkyLoops.h"
 
 namespace quarn {
 namespace {
@@ -120,19 +121,6 @@ void traceBlock(const FrameSetup& frame, const PixelBlock& block) {
             storeTile(traced.nearness, frame.nearness, frame.width, place);
         if (frame.objects)
             storeTile(traced.objects, frame.objects, frame.width, place);
-    });
-}
-
-void findFreeSky(const FrameSetup& frame, const PixelBlock& block) {
-    forEachTile(block, [&](RayPacket& packet, const TilePlace&) {
-        aim(frame, packet);
-        intersect(frame, packet);
-        SurfaceLanes surfaces;
-        readSurfaces(frame, packet, surfaces);
-        LaneMask seen = packet.hit;
-        if (frame.has_ground)
-            seen = seen | meetGround(frame, packet, surfaces).seen;
-        keepFreeSky(frame, packet, surfaces, seen, freeSky(frame, packet, surfaces, seen));
     });
 }
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/display/kernel/OpenSky.h"
+#include "host/display/kernel/SkyGrid.h"
 
 namespace quarn {
 namespace {
