@@ -16,6 +16,11 @@ constexpr int HALVINGS = 24;
 
 constexpr double LEAST_COS_ELEVATION = 1e-6;
 
+/// Less than this, as a share of a radius or of a ring's height, may be rounding: it decides
+/// neither which point of a ring counts nor in which ring a point lies. A model is so turned in the
+/// same way wherever it stands.
+constexpr double ROUNDING = 1e-5;
+
 } // namespace
 
 TurnProfile::TurnProfile(const KM_3dPoint& target, double low, double high)
@@ -23,10 +28,11 @@ TurnProfile::TurnProfile(const KM_3dPoint& target, double low, double high)
       m_rings_per_height(high > low ? (RING_COUNT - 1) / (high - low) : 0.0), m_rings(RING_COUNT) {}
 
 void TurnProfile::add(const KM_3dPoint& point) {
-    const double place = std::clamp((point.z - m_low) * m_rings_per_height, 0.0, RING_COUNT - 1.0);
+    const double rise = (point.z - m_low) * m_rings_per_height;
+    const double place = std::clamp(rise + ROUNDING, 0.0, RING_COUNT - 1.0);
     Ring& ring = m_rings[static_cast<std::size_t>(place)];
     const double radius = std::hypot(point.x - m_target.x, point.y - m_target.y);
-    if (radius > ring.radius)
+    if (ring.radius < 0.0 || radius > (1.0 + ROUNDING) * ring.radius)
         ring = {radius, point.z};
 }
 

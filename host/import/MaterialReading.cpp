@@ -6,6 +6,7 @@
 
 #include <assimp/GltfMaterial.h>
 #include <assimp/material.h>
+#include <assimp/mesh.h>
 #include <assimp/scene.h>
 
 #include <algorithm>
@@ -45,6 +46,29 @@ TextureWrap wrapOf(aiTextureMapMode mode) {
     return clamps ? TextureWrap::clamp : TextureWrap::repeat;
 }
 
+/// Where the glTF extension KHR_texture_transform puts a texture: coordinates are scaled, turned
+/// and moved, with v running downward from the upper border. The reading library keeps scale and
+/// angle, the angle with its sign turned, and has added to the offset what would make up for a turn
+/// about the middle of the picture; that is taken off again.
+TexturePlace texturePlaceOf(const aiMaterial& source) {
+    aiUVTransform read;
+    if (source.Get(AI_MATKEY_UVTRANSFORM(aiTextureType_BASE_COLOR, 0), read) != aiReturn_SUCCESS) {
+        return {};
+    }
+    const double angle = -static_cast<double>(read.mRotation);
+    const double scale_u = static_cast<double>(read.mScaling.x);
+    const double scale_v = static_cast<double>(read.mScaling.y);
+    const double cosine = std::cos(angle);
+    const double sine = std::sin(angle);
+    const double offset_u =
+        static_cast<double>(read.mTranslation.x) - 0.5 * scale_u * (1.0 - cosine + sine);
+    const double offset_v = 0.5 * scale_v * (sine + cosine - 1.0) + 1.0 - scale_v -
+                            static_cast<double>(read.mTranslation.y);
+    // Ours run upward from the lower border: 1 - v goes in, 1 - v comes out.
+    return {{cosine * scale_u, -sine * scale_v, offset_u + sine * scale_v},
+            {sine * scale_u, cosine * scale_v, 1.0 - offset_v - cosine * scale_v}};
+}
+
 aiColor4D baseColorOf(const aiMaterial& source) {
     aiColor4D color(0.8F, 0.8F, 0.8F, 1.0F);
     if (source.Get(AI_MATKEY_BASE_COLOR, color) == aiReturn_SUCCESS) {
@@ -56,31 +80,68 @@ aiColor4D baseColorOf(const aiMaterial& source) {
     return color;
 }
 
-bool hasTransparency(const Texture& texture) {
+/// What a texture or vertices let through.
+enum class Transparency { none, holes, partial };
+
+/// Soft borders of holes do not make a texture of leaves one of glass.
+Transparency transparencyOf(const Texture& texture) {
+    constexpr std::size_t border_share = 10;
+    std::size_t clear = 0;
+    std::size_t partial = 0;
     for (std::size_t i = 3; i < texture.rgba.size(); i += 4) {
-        if (texture.rgba[i] < 128) {
-            return true;
-        }
+        const std::uint8_t alpha = texture.rgba[i];
+        clear += alpha < 16 ? 1 : 0;
+        partial += alpha >= 16 && alpha < 240 ? 1 : 0;
     }
-    return false;
+    if (clear == 0 && partial == 0) {
+        return Transparency::none;
+    }
+    return partial * border_share > texture.rgba.size() / 4 ? Transparency::partial
+                                                            : Transparency::holes;
 }
 
-/// Holes in the texture are holes in the surface, where the file says that its alpha counts.
-void readCutout(const aiMaterial& source, Material& material) {
+bool isSeeThrough(const aiMesh& mesh) {
+    return mesh.mColors[0] != nullptr &&
+           std::any_of(mesh.mColors[0], mesh.mColors[0] + mesh.mNumVertices,
+                       [](const aiColor4D& color) { return color.a < 1.0F; });
+}
+
+bool hasSeeThroughVertices(const aiScene& scene, const aiMaterial& material) {
+    const std::span meshes(scene.mMeshes, scene.mNumMeshes);
+    return std::any_of(meshes.begin(), meshes.end(), [&](const aiMesh* mesh) {
+        return mesh->mMaterialIndex < scene.mNumMaterials &&
+               scene.mMaterials[mesh->mMaterialIndex] == &material && isSeeThrough(*mesh);
+    });
+}
+
+void readAlphaCutoff(const aiMaterial& source, Material& material) {
+    material.alpha_cutout = true;
+    source.Get(AI_MATKEY_GLTF_ALPHACUTOFF, material.alpha_cutoff);
+    const float cutoff = material.alpha_cutoff;
+    material.alpha_cutoff = std::isfinite(cutoff) ? std::clamp(cutoff, 0.0F, 1.0F) : 0.5F;
+}
+
+/// Whether the surface has holes or is see-through, where the file says that its alpha counts.
+void readAlpha(const aiScene& scene, const aiMaterial& source, Material& material) {
     aiString mode;
     const bool has_mode = source.Get(AI_MATKEY_GLTF_ALPHAMODE, mode) == aiReturn_SUCCESS;
-    const bool has_opacity_map = source.GetTextureCount(aiTextureType_OPACITY) > 0;
     const std::string_view name = mode.C_Str();
-    material.alpha_cutout = has_mode ? name == "MASK" || name == "BLEND" : has_opacity_map;
     if (name == "MASK") {
-        source.Get(AI_MATKEY_GLTF_ALPHACUTOFF, material.alpha_cutoff);
-        const float cutoff = material.alpha_cutoff;
-        material.alpha_cutoff = std::isfinite(cutoff) ? std::clamp(cutoff, 0.0F, 1.0F) : 0.5F;
+        readAlphaCutoff(source, material);
+        return;
     }
-    if (material.alpha_cutout && name != "MASK") {
-        material.alpha_cutout =
-            material.base_color_texture != nullptr && hasTransparency(*material.base_color_texture);
+    if (has_mode && name != "BLEND") {
+        return;
     }
+    const bool texture_counts = has_mode || source.GetTextureCount(aiTextureType_OPACITY) > 0;
+    const Transparency of_texture = texture_counts && material.base_color_texture != nullptr
+                                        ? transparencyOf(*material.base_color_texture)
+                                        : Transparency::none;
+    // Many programs write an opacity of 0 where they mean that there is none to write.
+    const bool is_dimmed = material.base_color.a < 255 && (has_mode || material.base_color.a > 0);
+    material.see_through = is_dimmed || of_texture == Transparency::partial ||
+                           (has_mode && hasSeeThroughVertices(scene, source));
+    material.alpha_cutout = !material.see_through && of_texture == Transparency::holes;
 }
 
 /// Pixels that the file holds as they are. The sizes were checked when the file was read.
@@ -135,7 +196,7 @@ ReadMaterial MaterialReading::read(const aiMaterial& source) {
         m_linear_colors ? colorFromLinear(c.r, c.g, c.b, c.a) : colorFromSrgb(c.r, c.g, c.b, c.a);
     readTexture(source, result);
     readOpacityMap(source, result);
-    readCutout(source, *result.material);
+    readAlpha(m_scene, source, *result.material);
     return result;
 }
 
@@ -146,6 +207,7 @@ void MaterialReading::readTexture(const aiMaterial& source, ReadMaterial& result
     }
     Material& material = *result.material;
     result.texture_coordinates = reference.coordinates;
+    result.texture_place = m_linear_colors ? texturePlaceOf(source) : TexturePlace();
     material.base_color_texture =
         texture({reference.name, wrapOf(reference.modes[0]), wrapOf(reference.modes[1])});
     KM_Color& color = material.base_color;

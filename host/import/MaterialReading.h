@@ -2,6 +2,7 @@
 
 #include "host/document/Material.h"
 #include "host/import/ModelFolder.h"
+#include "host/import/TexturePlace.h"
 
 #include <map>
 #include <memory>
@@ -21,6 +22,7 @@ namespace quarn {
 struct ReadMaterial {
     std::shared_ptr<Material> material; ///< null: the file gives none
     unsigned texture_coordinates = 0;   ///< the set that its texture uses
+    TexturePlace texture_place;
 };
 
 /// Makes materials of a model file on demand, each once, with the textures that they name.

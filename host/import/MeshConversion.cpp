@@ -6,6 +6,7 @@
 
 #include <assimp/mesh.h>
 
+#include <algorithm>
 #include <array>
 #include <cmath>
 #include <cstdint>
@@ -163,7 +164,7 @@ private:
         }
         if (m_has_texture) {
             const aiVector3D& t = m_source.mTextureCoords[m_reading.texture_coordinates][v];
-            vertex.texture = KM_2fPoint(finiteOrZero(t.x), finiteOrZero(t.y));
+            vertex.texture = textureAt(static_cast<double>(t.x), static_cast<double>(t.y));
         }
         if (m_has_colors) {
             const aiColor4D& c = m_source.mColors[0][v];
@@ -171,6 +172,12 @@ private:
                                                    : colorFromSrgb(c.r, c.g, c.b, c.a);
         }
         return vertex;
+    }
+
+    KM_2fPoint textureAt(double u, double v) const {
+        const TexturePlace& place = m_reading.texture_place;
+        return {finiteOrZero(static_cast<float>(place.u[0] * u + place.u[1] * v + place.u[2])),
+                finiteOrZero(static_cast<float>(place.v[0] * u + place.v[1] * v + place.v[2]))};
     }
 
     std::uint32_t add(const Vertex& vertex) {
@@ -240,6 +247,16 @@ void completeMesh(KM_Mesh& mesh) {
     mesh.m_C.shrink_to_fit();
     mesh.m_F.shrink_to_fit();
     mesh.PadForRayTracing();
+}
+
+bool hasArea(const KM_Mesh& mesh) {
+    constexpr double least_sine = 1e-7; // of a corner; coordinates have seven digits
+    return std::any_of(mesh.m_F.begin(), mesh.m_F.end(), [&](const KM_MeshTriangle& triangle) {
+        const KM_3dPoint a = mesh.m_V[triangle.vi[0]].ToDouble();
+        const KM_3dVector b = mesh.m_V[triangle.vi[1]].ToDouble() - a;
+        const KM_3dVector c = mesh.m_V[triangle.vi[2]].ToDouble() - a;
+        return KM_CrossProduct(b, c).Length() > least_sine * b.Length() * c.Length();
+    });
 }
 
 bool isUsableCoordinate(double coordinate) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/import/TexturePlace.h"
 #include "kelmar/KM_Mesh.h"
 #include "kelmar/KM_Xform.h"
 
@@ -16,6 +17,7 @@ struct MeshReading {
     bool keep_normals = true;         ///< false: the file's normals say no more than its triangles
     bool linear_colors = false;       ///< vertex colours are linear light, not sRGB
     unsigned texture_coordinates = 0; ///< which set of the mesh to take
+    TexturePlace texture_place;       ///< where its coordinates lie on the texture
 };
 
 struct ConvertedMesh {
@@ -31,6 +33,9 @@ ConvertedMesh convertTriangles(const aiMesh& mesh, const MeshReading& reading);
 
 /// Gives each vertex that has none its normal, and releases memory that was only kept in reserve.
 void completeMesh(KM_Mesh& mesh);
+
+/// False when the corners of each triangle lie on a line or at one place, but for rounding.
+bool hasArea(const KM_Mesh& mesh);
 
 /// True for a coordinate that can be drawn: a number, and small enough that distances between such
 /// numbers do not overflow.

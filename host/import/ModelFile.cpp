@@ -106,8 +106,11 @@ Error nothingLeft(const fs::path& path, const ImportedModel& model) {
 
 /// Reads the file into the importer's scene; false with the importer's error text otherwise.
 bool readScene(Assimp::Importer& importer, const fs::path& path) {
-    constexpr unsigned steps = aiProcess_ValidateDataStructure | aiProcess_Triangulate |
-                               aiProcess_SortByPType | aiProcess_TransformUVCoords;
+    unsigned steps =
+        aiProcess_ValidateDataStructure | aiProcess_Triangulate | aiProcess_SortByPType;
+    if (!isOneOf(modelFormat(path), {"gltf", "glb"})) {
+        steps |= aiProcess_TransformUVCoords; // turned ones of glTF come out wrong
+    }
     if (importer.ReadFile(path.string(), 0) == nullptr) {
         return false;
     }

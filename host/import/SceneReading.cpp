@@ -252,6 +252,7 @@ private:
         if (converted->m_F.empty()) {
             return;
         }
+        m_without_area += hasArea(*converted) ? 0 : 1;
         const KM_Xform world_from_mesh = shares ? placed.world_from_node : worldFromOrigin();
         m_model.meshes.push_back(
             {nameOf(placed, mesh), std::move(converted), material.material, world_from_mesh});
@@ -272,6 +273,7 @@ private:
         reading.keep_normals = m_conventions.keep_normals;
         reading.linear_colors = m_conventions.linear_colors;
         reading.texture_coordinates = material.texture_coordinates;
+        reading.texture_place = material.texture_place;
         ConvertedMesh converted = convertTriangles(mesh, reading);
         m_triangles += mesh.mNumFaces;
         m_dropped += converted.triangles_dropped;
@@ -421,6 +423,11 @@ private:
         warn(m_dropped, m_triangles, "triangles");
         warn(m_lines_dropped, m_lines_dropped, "line segments");
         warn(m_points_dropped, m_points_dropped, "points");
+        if (m_without_area > 0) {
+            m_model.warnings.push_back(std::to_string(m_without_area) +
+                                       " of its meshes cannot be seen: their triangles have no "
+                                       "area.");
+        }
     }
 
     void warn(std::uint64_t dropped, std::uint64_t all, std::string_view what) {
@@ -443,6 +450,7 @@ private:
     std::vector<PlacedNode> m_nodes;
     std::vector<std::uint64_t> m_uses; ///< how many more times each mesh is shown
     MeshReleases m_releases;
+    std::uint64_t m_without_area = 0;    ///< meshes of triangles that are all lines or points
     std::vector<SharedMesh> m_shared;    ///< by mesh of the scene
     std::vector<KM_BoundingBox> m_boxes; ///< likewise, in the mesh's own coordinates
     std::vector<std::shared_ptr<KM_Mesh>> m_incomplete;

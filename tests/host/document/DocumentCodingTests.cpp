@@ -141,6 +141,17 @@ TEST(DocumentCoding, MeshesWithTheirMaterialsAndTexturesComeBack) {
     EXPECT_FALSE(content.objects[1].material);
 }
 
+TEST(DocumentCoding, SeeThroughMaterialsComeBackAndOthersAreWrittenAsEver) {
+    DocumentContent content = sampleContent();
+    const Bytes before = encoded(content);
+    auto material = std::make_shared<Material>(*content.objects[0].material);
+    material->see_through = true;
+    content.objects[0].material = material;
+    EXPECT_TRUE(roundTrip(content).objects[0].material->see_through);
+    EXPECT_EQ(before.size() + 1, encoded(content).size());
+    EXPECT_FALSE(roundTrip(sampleContent()).objects[0].material->see_through);
+}
+
 TEST(DocumentCoding, AMeshThatObjectsShareIsWrittenOnceAndSharedAgain) {
     const DocumentContent sample = sampleContent();
     const DocumentContent content = roundTrip(sample);
