@@ -69,52 +69,20 @@ template <class Function> void forEachRow(int height, const Function& function) 
     });
 }
 
-/// Where the rays of the grid meet the surfaces.
-class PlacesSeen {
-public:
-    explicit PlacesSeen(const FrameSetup& frame) : m_frame(frame) {}
+float dot(const float (&a)[3], const float (&b)[3]) {
+    return a[0] * b[0] + a[1] * b[1] + a[2] * b[2];
+}
 
-    /// 1 if two places show the same part of a surface, else 0.
-    float likeness(int ax, int ay, int bx, int by) const {
-        const SkyPlace& a = at(ax, ay);
-        const SkyPlace& b = at(bx, by);
-        if (a.distance < 0.0F || b.distance < 0.0F)
-            return 0.0F;
-        const float facing = dot(a.normal, b.normal);
-        if (facing < sky_least_facing)
-            return 0.0F;
-        float p[3];
-        float q[3];
-        place(ax, ay, a.distance, p);
-        place(bx, by, b.distance, q);
-        const float apart[3] = {q[0] - p[0], q[1] - p[1], q[2] - p[2]};
-        const float tolerance = sky_step_of_reach * m_frame.sky_reach +
-                                sky_step_of_slope * std::sqrt(dot(apart, apart));
-        const float step =
-            std::max(std::fabs(dot(a.normal, apart)), std::fabs(dot(b.normal, apart)));
-        return step < tolerance ? 1.0F : 0.0F;
-    }
-
-private:
-    static float dot(const float (&a)[3], const float (&b)[3]) {
-        return a[0] * b[0] + a[1] * b[1] + a[2] * b[2];
-    }
-    const SkyPlace& at(int x, int y) const {
-        return m_frame
-            .sky_places[static_cast<std::size_t>(y) * static_cast<std::size_t>(m_frame.sky_width) +
-                        static_cast<std::size_t>(x)];
-    }
-    void place(int x, int y, float distance, float (&p)[3]) const {
-        const CameraRays& c = m_frame.rays;
-        const float u = (static_cast<float>(x) + 0.5F) * sky_spacing;
-        const float v = (static_cast<float>(y) + 0.5F) * sky_spacing;
-        for (int i = 0; i < 3; ++i)
-            p[i] = c.origin[i] + u * c.origin_dx[i] + v * c.origin_dy[i] +
-                   distance * (c.direction[i] + u * c.direction_dx[i] + v * c.direction_dy[i]);
-    }
-
-    const FrameSetup& m_frame;
-};
+/// True if two places show the same part of a surface.
+bool areAlike(const SkyPlace& a, const SkyPlace& b, float sky_reach) {
+    if (dot(a.normal, b.normal) < sky_least_facing)
+        return false;
+    const float apart[3] = {b.point[0] - a.point[0], b.point[1] - a.point[1],
+                            b.point[2] - a.point[2]};
+    const float tolerance =
+        sky_step_of_reach * sky_reach + sky_step_of_slope * std::sqrt(dot(apart, apart));
+    return std::max(std::fabs(dot(a.normal, apart)), std::fabs(dot(b.normal, apart))) < tolerance;
+}
 
 } // namespace
 
@@ -149,7 +117,6 @@ void FreeSky::find(FrameSetup& frame, const RayKernel& kernel) {
 
 /// Replaces each place by the mean of some in its row or column that show the same surface.
 void FreeSky::smooth(const FrameSetup& frame, int dx, int dy, Span span) {
-    const PlacesSeen places(frame);
     forEachRow(frame.sky_height, [&](int y) {
         for (int x = 0; x < frame.sky_width; ++x) {
             const auto offset = [&](int i) {
@@ -172,9 +139,10 @@ void FreeSky::smooth(const FrameSetup& frame, int dx, int dy, Span span) {
                     weights += i == 0 ? 0.0F : 1.0F;
                     continue;
                 }
-                const float weight = places.likeness(x, y, x + i * dx, y + i * dy);
-                sum += weight * other;
-                weights += weight;
+                if (!areAlike(m_places[offset(0)], m_places[offset(i)], frame.sky_reach))
+                    continue;
+                sum += other;
+                weights += 1.0F;
             }
             m_smoothed[offset(0)] = sum / weights;
         }

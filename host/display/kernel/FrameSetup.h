@@ -63,8 +63,8 @@ struct SkyTable {
 
 /// What a place of the grid shows, to compare neighbours.
 struct SkyPlace {
-    float normal[3];
-    float distance; ///< along the ray; negative: nothing
+    float normal[3]; ///< all 0: nothing
+    float point[3];
 };
 
 /// Everything that the ray loops need for one picture; plain numbers and pointers, because the

@@ -36,43 +36,37 @@ inline SkyNeighbours skyNeighbours(const FrameSetup& frame, const RayPacket& pac
 
 /// What the grid knows there.
 struct SkyKnown {
-    LaneVectors normal;
-    Lanes distance;
+    LaneVectors normal; ///< 0: no surface
+    LaneVectors point;
     Lanes free;
 };
 
 inline SkyKnown known(const FrameSetup& frame, const SkyNeighbours& at) {
     alignas(64) std::uint32_t places[lane_count];
-    alignas(64) float values[5][lane_count];
+    alignas(64) float values[7][lane_count];
     store(places, at.row * LaneInts(frame.sky_width) + at.column);
     for (int i = 0; i < lane_count; ++i) {
         const SkyPlace& place = frame.sky_places[places[i]];
-        values[0][i] = place.normal[0];
-        values[1][i] = place.normal[1];
-        values[2][i] = place.normal[2];
-        values[3][i] = place.distance;
-        values[4][i] = frame.free_sky[places[i]];
+        for (int axis = 0; axis < 3; ++axis) {
+            values[axis][i] = place.normal[axis];
+            values[3 + axis][i] = place.point[axis];
+        }
+        values[6][i] = frame.free_sky[places[i]];
     }
-    return {{load(values[0]), load(values[1]), load(values[2])}, load(values[3]), load(values[4])};
+    return {{load(values[0]), load(values[1]), load(values[2])},
+            {load(values[3]), load(values[4]), load(values[5])},
+            load(values[6])};
 }
 
 /// True where a place of the grid shows the surface that the packet's ray met.
 inline LaneMask showSameSurface(const FrameSetup& frame, const LaneVectors& place,
-                                const LaneVectors& normal, const SkyNeighbours& at,
-                                const SkyKnown& there) {
-    RayPacket to;
-    to.x = (floatsOf(at.column) + 0.5F) * static_cast<float>(sky_spacing);
-    to.y = (floatsOf(at.row) + 0.5F) * static_cast<float>(sky_spacing);
-    const CameraRays& c = frame.rays;
-    const LaneVectors met =
-        along(atPixels(to, c.origin, c.origin_dx, c.origin_dy),
-              atPixels(to, c.direction, c.direction_dx, c.direction_dy), there.distance);
+                                const LaneVectors& normal, const SkyKnown& there) {
+    const LaneVectors& met = there.point;
     const LaneVectors apart{met.x - place.x, met.y - place.y, met.z - place.z};
     const Lanes step = greatest(absolute(dot(normal, apart)), absolute(dot(there.normal, apart)));
     const Lanes allowed = squareRoot(dot(apart, apart)) * sky_step_of_slope +
                           Lanes(sky_step_of_reach * frame.sky_reach);
-    return (there.distance > 0.0F) & (dot(normal, there.normal) > sky_least_facing) &
-           (step < allowed);
+    return (dot(normal, there.normal) > sky_least_facing) & (step < allowed);
 }
 
 /// The part of the sky's light that arrives at the lit lanes. What the grid found around a pixel
@@ -90,7 +84,7 @@ inline Lanes skyArriving(const FrameSetup& frame, const RayPacket& packet,
         const SkyNeighbours at = skyNeighbours(frame, packet, side % 2, side / 2);
         const SkyKnown there = known(frame, at);
         const Lanes weight =
-            select(showSameSurface(frame, place, surfaces.normal, at, there), at.weight, 0.0F);
+            select(showSameSurface(frame, place, surfaces.normal, there), at.weight, 0.0F);
         sum = sum + weight * there.free;
         weights = weights + weight;
     }

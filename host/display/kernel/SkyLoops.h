@@ -16,21 +16,24 @@ inline void keepFreeSky(const FrameSetup& frame, const GridPlaces& places, const
                         const SkyKnown& found) {
     alignas(64) float column[lane_count];
     alignas(64) float row[lane_count];
-    alignas(64) float values[5][lane_count];
+    alignas(64) float values[7][lane_count];
     store(column, places.column);
     store(row, places.row);
     store(values[0], found.normal.x);
     store(values[1], found.normal.y);
     store(values[2], found.normal.z);
-    store(values[3], found.distance);
-    store(values[4], found.free);
+    store(values[3], found.point.x);
+    store(values[4], found.point.y);
+    store(values[5], found.point.z);
+    store(values[6], found.free);
     for (unsigned rest = bits(active); rest != 0; rest &= rest - 1) {
         const int i = __builtin_ctz(rest);
         const auto place =
             static_cast<std::size_t>(row[i]) * static_cast<std::size_t>(frame.sky_width) +
             static_cast<std::size_t>(column[i]);
-        frame.sky_places[place] = {{values[0][i], values[1][i], values[2][i]}, values[3][i]};
-        frame.free_sky[place] = values[4][i];
+        frame.sky_places[place] = {{values[0][i], values[1][i], values[2][i]},
+                                   {values[3][i], values[4][i], values[5][i]}};
+        frame.free_sky[place] = values[6][i];
     }
 }
 
@@ -49,9 +52,11 @@ inline void findFreeSky(const FrameSetup& frame, const GridPlaces& places, RayPa
     if (frame.has_ground)
         seen = seen | meetGround(frame, packet, surfaces).seen;
     const SkyPoints points = skyPoints(frame, packet, surfaces, seen);
-    keepFreeSky(
-        frame, places, packet.active,
-        {surfaces.normal, select(seen, packet.distance, no_distance), freeSky(frame, points)});
+    const LaneVectors point =
+        along(packet.origin, packet.direction, select(seen, packet.distance, 0.0F));
+    keepFreeSky(frame, places, packet.active,
+                {select(seen, surfaces.normal, LaneVectors{0.0F, 0.0F, 0.0F}), point,
+                 freeSky(frame, points)});
 }
 
 void findFreeSky(const FrameSetup& frame, const PixelBlock& block) {
