@@ -21,7 +21,7 @@ struct RaySurface {
     const KM_2fPoint* texture_coordinates = nullptr; ///< null unless there is a texture
     const KM_Color* colors = nullptr;                ///< null when vertices have no colours
     const MipTexture* texture = nullptr;
-    const SurfacePlace* place = nullptr; ///< null: the vertices are in the frame's coordinates
+    const SurfacePlace* place = nullptr;  ///< null: the vertices are in the frame's coordinates
     float albedo[3] = {0.6F, 0.6F, 0.6F}; ///< linear base colour
     float opacity = 1.0F;                 ///< of the base colour
     bool see_through = false;             ///< what lies behind shines through
