@@ -1,9 +1,9 @@
 #!/usr/bin/env python3
-"""Puts what the benchmarks printed into the tables of README.md.
+"""Puts what the benchmarks printed into the tables of README.md and docs/speed.md.
 
 usage: ./dev bench | tee FILE; bench/quote.py FILE...
 
-README quotes some rows of some tables. A row is found again by its table's header and by its cells
+The pages quote some rows of some tables. A row is found again by its table's header and by its cells
 before the first number; it takes over the numbers. Rows that the files do not have stay.
 """
 
@@ -11,7 +11,8 @@ import pathlib
 import re
 import sys
 
-README = pathlib.Path(__file__).resolve().parent.parent / "README.md"
+PROJECT = pathlib.Path(__file__).resolve().parent.parent
+PAGES = [PROJECT / "README.md", PROJECT / "docs" / "speed.md"]
 NUMBER = re.compile(r"\d+(\.\d+)?")
 
 
@@ -40,21 +41,26 @@ def table_lines(lines):
             yield number, header
 
 
-def main(files):
-    printed = {}
-    for file in files:
-        lines = pathlib.Path(file).read_text("utf-8").splitlines()
-        for number, header in table_lines(lines):
-            printed[header, key_of(lines[number])] = lines[number]
-    lines = README.read_text("utf-8").splitlines()
+def quote(page, printed):
+    lines = page.read_text("utf-8").splitlines()
     quoted = 0
     for number, header in table_lines(lines):
         row = printed.get((header, key_of(lines[number])))
         if row is not None:
             lines[number] = row
             quoted += 1
-    README.write_text("\n".join(lines) + "\n", "utf-8")
-    print(f"{quoted} rows quoted")
+    page.write_text("\n".join(lines) + "\n", "utf-8")
+    return quoted
+
+
+def main(files):
+    printed = {}
+    for file in files:
+        lines = pathlib.Path(file).read_text("utf-8").splitlines()
+        for number, header in table_lines(lines):
+            printed[header, key_of(lines[number])] = lines[number]
+    for page in PAGES:
+        print(f"{page.name}: {quote(page, printed)} rows quoted")
 
 
 if __name__ == "__main__":
