@@ -2,8 +2,28 @@
 
 namespace quarn {
 
+DialogEvents::~DialogEvents() = default;
+
+DialogWindow::~DialogWindow() = default;
+
 FrontEnd::~FrontEnd() = default;
 
 void FrontEnd::pictureRendered(double) {}
+
+std::unique_ptr<DialogWindow> FrontEnd::makeDialog(const DialogTemplate&, HWND) {
+    return nullptr;
+}
+
+std::optional<Place> FrontEnd::chooseLocation(std::wstring_view, const Place&) {
+    return std::nullopt;
+}
+
+FileChoice FrontEnd::chooseFile(const FileQuestion&) {
+    return {};
+}
+
+void FrontEnd::viewShown(CQuarnView&, const ShownPicture&) {}
+
+void FrontEnd::renderWindowShown(const ShownPicture&) {}
 
 } // namespace quarn

@@ -1,13 +1,19 @@
 #pragma once
 
+#include "host/front_end/DialogTemplate.h"
+#include "host/front_end/DialogWindow.h"
+#include "host/front_end/FrontEndChoices.h"
 #include "kelmar/KM_wString.h"
 #include "sdk/qncore/QnExport.h"
 #include "sdk/qncore/QnWnd.h"
 
 #include <filesystem>
+#include <memory>
 #include <optional>
 #include <string_view>
 #include <vector>
+
+class CQuarnView;
 
 namespace quarn {
 
@@ -67,6 +73,23 @@ public:
     /// Told some times a second while a picture is rendered. Shows nothing unless it is overridden.
     /// @param share  how much of the picture is done, from 0 to 1; 1 comes last, however it ended
     virtual void pictureRendered(double share);
+
+    // ---- Windows. A front end without any leaves these as they are: it shows nothing, and nobody
+    // chooses.
+
+    /// Makes the window of a dialog; it is shown when it runs.
+    /// @param owner  the window it stands before; null for the main window
+    /// @return null where there are no dialogs
+    virtual std::unique_ptr<DialogWindow> makeDialog(const DialogTemplate& form, HWND owner);
+    /// Lets a person choose a place on the earth. @return nothing when none was chosen
+    virtual std::optional<Place> chooseLocation(std::wstring_view title, const Place& start);
+    /// Lets a person choose a file to open, or one to save in; an existing one of the latter only
+    /// after the person agreed to replace it.
+    virtual FileChoice chooseFile(const FileQuestion& question);
+    /// Told whenever a view shows a picture, drawn anew or not.
+    virtual void viewShown(CQuarnView& view, const ShownPicture& picture);
+    /// Told when the render window shows another picture; one of no size when it was closed.
+    virtual void renderWindowShown(const ShownPicture& picture);
 };
 
 } // namespace quarn

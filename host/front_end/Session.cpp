@@ -35,7 +35,8 @@ std::vector<CommandName> Session::commandNames() const {
     std::vector<CommandName> names;
     for (const RegisteredCommand& entry : m_state->application.commands().sortedByName()) {
         if (!entry.command->IsHidden())
-            names.push_back({entry.english_name, entry.local_name});
+            names.push_back(
+                {entry.english_name, entry.local_name, entry.command->CommandDescription()});
     }
     return names;
 }
@@ -54,6 +55,10 @@ bool Session::closeView(std::wstring_view name) {
     if (!closed)
         application.tell(closed.message());
     return closed.ok();
+}
+
+bool Session::isCommandRunning() const {
+    return m_state->application.runner().current() != nullptr;
 }
 
 bool Session::isExitRequested() const {

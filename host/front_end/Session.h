@@ -55,7 +55,8 @@ struct PlugInLoad {
 /// What a command is called.
 struct CommandName {
     KM_wString english;
-    KM_wString local; ///< the same where the command has no name in the user's language
+    KM_wString local;       ///< the same where the command has no name in the user's language
+    KM_wString description; ///< one line in the user's language, as Help prints it
 };
 
 /// The running host: the application, its documents and its plug-ins, behind one front end. There
@@ -102,6 +103,10 @@ public:
     /// also while it lets the front end work on events, the view stays until the command has ended.
     /// @return false, with a message, when there is no such view and when no view would be left
     bool closeView(std::wstring_view name);
+
+    /// Whether a command runs now, also while it waits for an answer. Then the session starts no
+    /// other one.
+    bool isCommandRunning() const;
 
     /// True once a command asked the program to end.
     bool isExitRequested() const;
