@@ -16,6 +16,8 @@
 #include <string_view>
 #include <vector>
 
+class CDialog;
+
 namespace quarn {
 
 /// The running host. A session owns it; there is at most one, because the programming interface
@@ -56,6 +58,10 @@ public:
     /// The window object for a window; null for a null window.
     CWnd* windowFor(HWND window);
 
+    /// The dialog that is open, or null: there is at most one.
+    const CDialog* openDialog() const { return m_open_dialog; }
+    void setOpenDialog(const CDialog* dialog) { m_open_dialog = dialog; }
+
     void requestExit() { m_exit_requested = true; }
     bool isExitRequested() const { return m_exit_requested; }
 
@@ -72,6 +78,7 @@ private:
     std::unique_ptr<DocumentList> m_documents;
     std::unique_ptr<PlugInLoader> m_plug_ins;
     std::map<HWND, std::unique_ptr<CWnd>> m_windows;
+    const CDialog* m_open_dialog = nullptr;
     bool m_exit_requested = false;
 };
 

@@ -6,6 +6,19 @@
 
 namespace quarn {
 
+namespace {
+
+/// Takes the front of a queue; nothing when it is empty.
+template <class Choice> std::optional<Choice> next(std::deque<Choice>& queue) {
+    if (queue.empty())
+        return std::nullopt;
+    std::optional<Choice> front = std::move(queue.front());
+    queue.pop_front();
+    return front;
+}
+
+} // namespace
+
 ScriptedFrontEnd::ScriptedFrontEnd() = default;
 
 ScriptedFrontEnd::~ScriptedFrontEnd() = default;
@@ -21,6 +34,18 @@ void ScriptedFrontEnd::addAnswer(std::wstring_view answer) {
 
 void ScriptedFrontEnd::addFolderChoice(std::optional<std::filesystem::path> folder) {
     m_folder_choices.push_back(std::move(folder));
+}
+
+void ScriptedFrontEnd::addDialog(HeadlessDialogWindow::Script script) {
+    m_dialog_scripts.push_back(std::move(script));
+}
+
+void ScriptedFrontEnd::addLocationChoice(std::optional<Place> place) {
+    m_location_choices.push_back(place);
+}
+
+void ScriptedFrontEnd::addFileChoice(FileChoice choice) {
+    m_file_choices.push_back(std::move(choice));
 }
 
 void ScriptedFrontEnd::setKeyDown(int virtual_key, bool down) {
@@ -49,6 +74,18 @@ const std::vector<ScriptedFrontEnd::Message>& ScriptedFrontEnd::messages() const
     return m_messages;
 }
 
+const std::vector<DialogTemplate>& ScriptedFrontEnd::dialogs() const {
+    return m_dialogs;
+}
+
+const std::vector<ScriptedFrontEnd::LocationQuestion>& ScriptedFrontEnd::locationQuestions() const {
+    return m_location_questions;
+}
+
+const std::vector<FileQuestion>& ScriptedFrontEnd::fileQuestions() const {
+    return m_file_questions;
+}
+
 unsigned long long ScriptedFrontEnd::waited_ms() const {
     return m_waited_ms;
 }
@@ -59,11 +96,7 @@ void ScriptedFrontEnd::print(std::wstring_view text) {
 
 Answer ScriptedFrontEnd::ask(const Question& question) {
     m_questions.push_back(question);
-    if (m_answers.empty())
-        return {};
-    Answer answer = std::move(m_answers.front());
-    m_answers.pop_front();
-    return answer;
+    return next(m_answers).value_or(Answer{});
 }
 
 int ScriptedFrontEnd::showMessage(std::wstring_view text, std::wstring_view title, unsigned flags) {
@@ -73,11 +106,7 @@ int ScriptedFrontEnd::showMessage(std::wstring_view text, std::wstring_view titl
 
 std::optional<std::filesystem::path>
 ScriptedFrontEnd::chooseFolder(std::wstring_view, std::wstring_view, const std::filesystem::path&) {
-    if (m_folder_choices.empty())
-        return std::nullopt;
-    auto choice = std::move(m_folder_choices.front());
-    m_folder_choices.pop_front();
-    return choice;
+    return next(m_folder_choices).value_or(std::nullopt);
 }
 
 void ScriptedFrontEnd::pumpEvents(unsigned milliseconds) {
@@ -98,5 +127,21 @@ HWND ScriptedFrontEnd::mainWindow() {
 }
 
 void ScriptedFrontEnd::frameWritten(const std::filesystem::path&, int, int) {}
+
+std::unique_ptr<DialogWindow> ScriptedFrontEnd::makeDialog(const DialogTemplate& form, HWND) {
+    m_dialogs.push_back(form);
+    auto script = next(m_dialog_scripts);
+    return script ? std::make_unique<HeadlessDialogWindow>(form, std::move(*script)) : nullptr;
+}
+
+std::optional<Place> ScriptedFrontEnd::chooseLocation(std::wstring_view title, const Place& start) {
+    m_location_questions.push_back({std::wstring(title), start});
+    return next(m_location_choices).value_or(std::nullopt);
+}
+
+FileChoice ScriptedFrontEnd::chooseFile(const FileQuestion& question) {
+    m_file_questions.push_back(question);
+    return next(m_file_choices).value_or(FileChoice{});
+}
 
 } // namespace quarn

@@ -31,6 +31,10 @@ struct SessionOptions {
     /// error output says so and the call does nothing. Nothing: strict where the environment
     /// variable QUARN_STRICT is set to anything but 0.
     std::optional<bool> strict = std::nullopt;
+    /// Folders of dialog templates (`<id>.dialog.json`). Those of a plug-in `Name.qnp` are looked
+    /// for in `dialogs/Name` beside its file, then in `Name` in these folders; those of the program
+    /// itself in these folders.
+    std::vector<std::filesystem::path> dialog_folders = {};
 };
 
 /// How a plug-in file was loaded, or why not.

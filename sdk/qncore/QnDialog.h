@@ -24,8 +24,9 @@ struct CQnRuntimeClass {
 };
 
 /// A modal dialog: a window made from a template, whose controls are addressed by their ids. The
-/// template with id N is the file `N.dialog.json` of the plug-in that the dialog belongs to, see
-/// docs/dialogs.md. All calls belong on the main thread.
+/// template with id N is the file `N.dialog.json` of the plug-in that the dialog's class is part of,
+/// see docs/dialogs.md. All calls belong on the main thread. A dialog must live until DoModal has
+/// returned. What an overridden operation throws ends there: it is told, and the dialog is closed.
 class QNCORE_API CDialog {
 public:
     static const CQnRuntimeClass ClassRecord;
@@ -42,8 +43,8 @@ public:
 
     /// Shows the dialog and waits until it is closed.
     /// @return 1 when it was confirmed, 2 when it was not; -1, after a message, when it cannot be
-    ///         shown: there is nobody to show it to, the template is missing or wrong, or another
-    ///         dialog of this host is open already
+    ///         shown: there is nobody to show it to, the template is missing or wrong, another
+    ///         dialog of this host is open already, or an operation of it threw
     int DoModal();
 
     int TemplateId() const;
@@ -61,19 +62,23 @@ public:
     /// Exchanges every member with its control through DoDataExchange.
     /// @param store  true reads the controls into the members, false shows the members
     /// @return false when a control holds what its member cannot take: the person is told and the
-    ///         control has the keyboard then; members exchanged before it have their new values
+    ///         control has the keyboard then; members exchanged before it have their new values.
+    ///         False, with nothing exchanged, when the dialog is closed.
     bool UpdateData(bool store);
 
 protected:
     /// Names the combo box that stands for a control of the template. To be called before the
     /// window is made, as a rule in the constructor. The combo box must live as long as the dialog.
+    /// It forgets the control before the window goes. In a window without such a combo box it keeps
+    /// the control that it has.
     void AttachComboBox(int control, CComboBox& combo_box);
 
     /// Exchanges members with controls, one after the other (DDX_Text and its like). The base does
     /// nothing.
     virtual void DoDataExchange(CQnDialogExchange& exchange);
     /// Called once the window is made and before it is shown. The base shows the members.
-    /// @return 1 to let the window give the keyboard to its first control
+    /// @return 1 to let the window give the keyboard to its first control; 0 where the operation
+    ///         gave it to one itself. The base returns 1.
     virtual int OnInitDialog();
     /// Called when the person confirms. The base reads the controls and closes the dialog when all
     /// of them could be taken.
@@ -85,11 +90,13 @@ protected:
     /// nothing.
     virtual void OnButton(int control);
 
-    /// Closes the dialog. @param result  what DoModal returns
+    /// Closes the dialog; in OnInitDialog: does not show it at all. The first call counts.
+    /// @param result  what DoModal returns
     void EndDialog(int result);
 
 private:
     friend struct quarn::DialogState;
+    friend class CQuarnDialog;
     friend class CQnDialogExchange;
     std::unique_ptr<quarn::DialogState> m_state;
 };
@@ -109,7 +116,8 @@ public:
 
     // ---- For whoever shows the dialog in a window of its own making
 
-    /// Runs the dialog in this window instead of one that the front end makes from the template.
+    /// Runs the dialog in this window instead of one that the front end makes from the template,
+    /// which is not looked at. The window stays the caller's.
     /// @return as DoModal
     int DoModalIn(quarn::DialogWindow& window);
 };
@@ -117,7 +125,8 @@ public:
 // ---- Data exchange
 
 /// One exchange between the members of a dialog and its controls. After a control was refused the
-/// rest of the exchange does nothing.
+/// rest of the exchange does nothing; so does the exchange of a closed dialog. A control that the
+/// window does not have is passed over, and its member keeps its value.
 class QNCORE_API CQnDialogExchange {
 public:
     CQnDialogExchange(CDialog& dialog, bool store);
@@ -126,7 +135,7 @@ public:
     bool HasFailed() const { return m_failed; }
     CDialog& Dialog() const { return m_dialog; }
 
-    /// The window. Valid during the exchange.
+    /// The window; one without controls when the dialog is closed. Valid during the exchange.
     quarn::DialogWindow& Window() const;
     /// The control that was exchanged last, which a range check speaks of.
     int LastControl() const { return m_last_control; }
@@ -150,7 +159,10 @@ QNCORE_API void DDX_Text(CQnDialogExchange& exchange, int control, double& value
 QNCORE_API void DDX_Text(CQnDialogExchange& exchange, int control, int& value);
 /// Exchanges a text as it stands.
 QNCORE_API void DDX_Text(CQnDialogExchange& exchange, int control, KM_wString& value);
-/// Exchanges a date, a time or both, as the control shows them; what it does not show stays.
+/// Exchanges a date or a time, as the control of the template shows them: of a date the time of day
+/// stays, of a time the date. In a window of another making both are exchanged. What is no date of
+/// the calendar is refused: "Enter a date". A value that is not valid is not shown; the control
+/// keeps its own.
 QNCORE_API void DDX_DateTimeCtrl(CQnDialogExchange& exchange, int control, COleDateTime& value);
 /// Refuses a number of the control exchanged last that lies outside the limits, which belong to the
 /// range: "Enter a number between -90 and 90". Only when controls are read.

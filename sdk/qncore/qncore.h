@@ -3,8 +3,10 @@
 /// The host's whole programming interface.
 
 #include "sdk/qncore/QnApp.h"
+#include "sdk/qncore/QnComboBox.h"
 #include "sdk/qncore/QnCommand.h"
 #include "sdk/qncore/QnDateTime.h"
+#include "sdk/qncore/QnDialog.h"
 #include "sdk/qncore/QnDib.h"
 #include "sdk/qncore/QnDirDialog.h"
 #include "sdk/qncore/QnDisplayAttributes.h"
@@ -17,6 +19,7 @@
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLightTable.h"
 #include "sdk/qncore/QnLocalize.h"
+#include "sdk/qncore/QnLocationDialog.h"
 #include "sdk/qncore/QnObject.h"
 #include "sdk/qncore/QnPlatform.h"
 #include "sdk/qncore/QnPlugIn.h"

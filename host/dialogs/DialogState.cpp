@@ -1,0 +1,152 @@
+#include "host/dialogs/DialogState.h"
+
+#include "host/app/Application.h"
+#include "host/app/Border.h"
+#include "host/dialogs/DialogTemplates.h"
+#include "sdk/qncore/QnLocalize.h"
+
+#include <algorithm>
+#include <dlfcn.h>
+#include <typeinfo>
+
+namespace quarn {
+
+namespace {
+
+/// The file of the plug-in, or of the program, that the dialog's class is part of.
+std::filesystem::path libraryOf(const CDialog& dialog) {
+    Dl_info library{};
+    if (!dladdr(&typeid(dialog), &library) || !library.dli_fname)
+        return {};
+    std::error_code error;
+    const std::filesystem::path whole = std::filesystem::canonical(library.dli_fname, error);
+    return error ? std::filesystem::path(library.dli_fname) : whole;
+}
+
+/// Whether the dialog may be opened now; tells why not.
+bool mayOpen(Application& application) {
+    if (application.openDialog())
+        application.tell(
+            KM_wString(QnLocalizeString(L"Another dialog is open. Close it first.", 42410))
+                .ToUtf8());
+    return !application.openDialog();
+}
+
+/// The dialog is the open one for as long as this lives.
+class OpenDialog {
+public:
+    OpenDialog(Application& application, DialogState& state, DialogWindow& window)
+        : m_application(application), m_state(state) {
+        m_application.setOpenDialog(&state.dialog);
+        m_state.window = &window;
+        m_state.result.reset();
+    }
+    ~OpenDialog() {
+        m_state.window = nullptr;
+        m_application.setOpenDialog(nullptr);
+    }
+    OpenDialog(const OpenDialog&) = delete;
+    OpenDialog& operator=(const OpenDialog&) = delete;
+
+private:
+    Application& m_application;
+    DialogState& m_state;
+};
+
+} // namespace
+
+int DialogState::show() {
+    Application* application = Application::forCall("CDialog::DoModal");
+    if (!application || !mayOpen(*application))
+        return NOT_SHOWN;
+    const auto folders =
+        dialogTemplateFolders(libraryOf(dialog), application->options().dialog_folders);
+    Result<DialogTemplate> read = findDialogTemplate(template_id, folders, application->texts());
+    if (!read) {
+        application->tell(read.message());
+        return NOT_SHOWN;
+    }
+    form = std::move(read.value());
+    const auto made = application->frontEnd().makeDialog(form, parent ? parent->m_hWnd : nullptr);
+    if (made)
+        return runIn(*application, *made);
+    application->tell(KM_wString::FormatToString(
+                          QnLocalizeString(L"The dialog \"%s\" cannot be shown: there is no "
+                                           L"window here.",
+                                           42411),
+                          form.title.Array())
+                          .ToUtf8());
+    return NOT_SHOWN;
+}
+
+int DialogState::showIn(DialogWindow& shown_window) {
+    Application* application = Application::forCall("CQuarnDialog::DoModalIn");
+    if (!application || !mayOpen(*application))
+        return NOT_SHOWN;
+    form = {};
+    return runIn(*application, shown_window);
+}
+
+int DialogState::runIn(Application& application, DialogWindow& shown_window) {
+    const OpenDialog open(application, *this, shown_window);
+    const AttachedComboBoxes attached(*this, shown_window);
+    int takes_focus = 1;
+    call("OnInitDialog", [&] { takes_focus = dialog.OnInitDialog(); });
+    if (takes_focus != 0 && !form.controls.empty())
+        shown_window.focus(form.controls.front().id);
+    if (!result)
+        shown_window.run(*this);
+    return result.value_or(GIVEN_UP);
+}
+
+void DialogState::end(int how) {
+    if (!window || result)
+        return;
+    result = how;
+    window->close();
+}
+
+std::optional<DialogControl::Kind> DialogState::kindOf(int control) const {
+    const auto found = std::ranges::find(form.controls, control, &DialogControl::id);
+    return found == form.controls.end() ? std::nullopt : std::optional(found->kind);
+}
+
+void DialogState::confirmed() {
+    call("OnOK", [this] { dialog.OnOK(); });
+}
+
+void DialogState::givenUp() {
+    call("OnCancel", [this] { dialog.OnCancel(); });
+}
+
+void DialogState::buttonClicked(int control) {
+    call("OnButton", [this, control] { dialog.OnButton(control); });
+}
+
+void DialogState::call(const char* name, const std::function<void()>& operation) {
+    if (result)
+        return;
+    const Result<void> called = acrossBorder(operation);
+    if (called)
+        return;
+    Application::current()->tell(std::string(name) + " of the dialog " +
+                                 std::to_string(template_id) +
+                                 " stopped with an error: " + called.message() + ".");
+    end(NOT_SHOWN);
+}
+
+AttachedComboBoxes::AttachedComboBoxes(const DialogState& state, DialogWindow& window) {
+    for (const auto& [control, combo_box] : state.combo_boxes) {
+        if (std::unique_ptr<IQnComboBoxControl> list = window.comboBox(control)) {
+            combo_box->SetControl(std::move(list));
+            m_attached.push_back(combo_box);
+        }
+    }
+}
+
+AttachedComboBoxes::~AttachedComboBoxes() {
+    for (CComboBox* combo_box : m_attached)
+        combo_box->SetControl(nullptr);
+}
+
+} // namespace quarn
