@@ -79,9 +79,10 @@ std::vector<std::string> wantedLanguages(std::string_view language) {
     if (name.empty() || name == "C" || name == "POSIX" ||
         !std::ranges::all_of(name, isLanguageCharacter))
         return {};
-    std::vector<std::string> languages = {name};
-    if (const std::size_t country = name.find_first_of("_-"); country != std::string::npos)
-        languages.push_back(name.substr(0, country));
+    std::vector<std::string> languages;
+    for (std::size_t end = name.size(); end != std::string::npos && end > 0;
+         end = name.find_last_of("_-", end - 1))
+        languages.push_back(name.substr(0, end));
     return languages;
 }
 

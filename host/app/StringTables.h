@@ -14,8 +14,9 @@ namespace quarn {
 enum class TextSpace { strings, option_names, option_values };
 
 /// The languages in which tables are looked for, the best first: "de_AT.UTF-8" gives "de_AT" and
-/// "de". An empty text takes the language from LC_ALL, LC_MESSAGES or LANG, the first that is set.
-/// "C" and "POSIX", and what is no language name, give none.
+/// "de", "zh-Hans-CN" gives "zh-Hans-CN", "zh-Hans" and "zh". An empty text takes the language from
+/// LC_ALL, LC_MESSAGES or LANG, the first that is set. "C" and "POSIX", and what is no language
+/// name, give none.
 std::vector<std::string> wantedLanguages(std::string_view language);
 
 /// The texts of the user's language: one table for the host and one for each plug-in.

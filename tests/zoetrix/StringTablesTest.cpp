@@ -10,7 +10,7 @@
 namespace {
 
 const std::filesystem::path source_folder = QUARN_SOURCE_DIR;
-const char* const languages[] = {"de", "es", "fr", "ja"};
+const char* const languages[] = {"de", "es", "fr", "ja", "zh"};
 
 /// The tables of a language: part, number, text.
 nlohmann::json tableOf(const std::filesystem::path& folder, const std::string& language) {

@@ -35,6 +35,28 @@ TEST(StringTables, TheLanguageComesWithAndWithoutItsCountry) {
     EXPECT_THAT(wantedLanguages("../../etc/passwd"), IsEmpty());
 }
 
+TEST(StringTables, AScriptBetweenLanguageAndCountryIsLeftOutStepByStep) {
+    EXPECT_THAT(wantedLanguages("zh_Hans_CN.UTF-8"), ElementsAre("zh_Hans_CN", "zh_Hans", "zh"));
+    EXPECT_THAT(wantedLanguages("zh-Hant-TW"), ElementsAre("zh-Hant-TW", "zh-Hant", "zh"));
+    EXPECT_THAT(wantedLanguages("_-"), ElementsAre("_-", "_"));
+}
+
+/// Who reads the long form of Chinese characters reads the short one more easily than English.
+TEST(StringTables, EveryNameOfChineseFindsTheOneChineseTable) {
+    for (const char* name : {"zh_CN.UTF-8", "zh_SG", "zh-Hans", "zh_Hans_CN", "zh_TW.Big5", "zh_HK",
+                             "zh-Hant", "zh@pinyin", "zh"}) {
+        StringTables tables(name);
+        ASSERT_TRUE(tables.load("host", {std::filesystem::path(QUARN_SOURCE_DIR) / "host/locale"}));
+        EXPECT_STREQ(tables.find(TextSpace::option_names, 42002), L"目标") << name;
+    }
+}
+
+TEST(StringTables, ALanguageWithoutATableIsEnglish) {
+    StringTables tables("pt_BR.UTF-8");
+    ASSERT_TRUE(tables.load("host", {std::filesystem::path(QUARN_SOURCE_DIR) / "host/locale"}));
+    EXPECT_EQ(tables.find(TextSpace::option_names, 42002), nullptr);
+}
+
 TEST(StringTables, TheEnvironmentIsAskedInTheOrderAllMessagesLang) {
     setenv("LANG", "fr_FR.UTF-8", 1);
     unsetenv("LC_MESSAGES");
