@@ -1,0 +1,44 @@
+#include "desktop/window/CommandStarter.h"
+
+#include "desktop/Texts.h"
+#include "desktop/front_end/DesktopFrontEnd.h"
+
+namespace quarn::desktop {
+
+CommandStarter::CommandStarter(Session& session, DesktopFrontEnd& front_end, QObject* parent)
+    : QObject(parent), m_session(session), m_front_end(front_end) {}
+
+bool CommandStarter::isRunning() const {
+    return m_session.isCommandRunning();
+}
+
+void CommandStarter::start(const QString& line) {
+    if (line.trimmed().isEmpty())
+        return;
+    if (isRunning()) {
+        refuse();
+        return;
+    }
+    m_front_end.commandStarts();
+    m_line = line.trimmed();
+    emit started(m_line);
+    const CQuarnCommand::result result = m_session.runCommand(wideText(m_line).View(), true);
+    m_line.clear();
+    m_front_end.commandEnded();
+    emit ended(result);
+}
+
+void CommandStarter::stop() {
+    if (isRunning())
+        m_front_end.requestStop();
+}
+
+void CommandStarter::refuse() {
+    const QString reason =
+        localized(L"%1 is still running. End it first, with Escape or the Stop button.", 45001)
+            .arg(m_line.section(' ', 0, 0));
+    m_front_end.print(wideText(reason + '\n').View());
+    emit refused(reason);
+}
+
+} // namespace quarn::desktop

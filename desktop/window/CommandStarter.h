@@ -1,0 +1,47 @@
+#pragma once
+
+#include "host/front_end/Session.h"
+
+#include <QObject>
+
+namespace quarn::desktop {
+
+class DesktopFrontEnd;
+
+/// The one way in which the window starts commands: menus, command line, animation bar and mouse
+/// all come here. One command runs at a time.
+class CommandStarter : public QObject {
+    Q_OBJECT
+
+public:
+    /// Session and front end must outlive this.
+    CommandStarter(Session& session, DesktopFrontEnd& front_end, QObject* parent = nullptr);
+
+    bool isRunning() const;
+    /// The line of the running command; empty while none runs.
+    const QString& line() const { return m_line; }
+
+public slots:
+    /// Runs a command line now, as typed by a person who may be shown dialogs; returns when the
+    /// command has ended. While another one runs nothing is started and the person is told.
+    void start(const QString& line);
+    /// Asks the running command to end: until the outermost command has ended, the front end
+    /// counts as interrupted and Escape as held down. Without one it does nothing.
+    void stop();
+
+signals:
+    void started(const QString& line);
+    /// The outermost command has ended. Views and documents may be others than before.
+    void ended(CQuarnCommand::result result);
+    /// A line was not started, and why, in one sentence.
+    void refused(const QString& reason);
+
+private:
+    void refuse();
+
+    Session& m_session;
+    DesktopFrontEnd& m_front_end;
+    QString m_line;
+};
+
+} // namespace quarn::desktop

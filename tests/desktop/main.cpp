@@ -1,0 +1,19 @@
+#include <gtest/gtest.h>
+
+#include <QApplication>
+#include <QSettings>
+#include <QTemporaryDir>
+
+/// The window's parts need an application object, but no screen: the pictures stay in memory.
+int main(int argument_count, char** arguments) {
+    if (!qEnvironmentVariableIsSet("QT_QPA_PLATFORM"))
+        qputenv("QT_QPA_PLATFORM", "offscreen");
+    testing::InitGoogleTest(&argument_count, arguments);
+    const QTemporaryDir settings;
+    QSettings::setDefaultFormat(QSettings::IniFormat);
+    QSettings::setPath(QSettings::IniFormat, QSettings::UserScope, settings.path());
+    QApplication application(argument_count, arguments);
+    QApplication::setOrganizationName("Quarn");
+    QApplication::setApplicationName("quarn-desktop");
+    return RUN_ALL_TESTS();
+}
