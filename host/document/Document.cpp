@@ -72,6 +72,8 @@ void Document::close() {
 
 void Document::closeAllViews() {
     m_due_views.clear();
+    m_due_frame_sizes.clear();
+    m_due_active_view = nullptr;
     m_active_view = nullptr;
     for (std::unique_ptr<ViewState>& view : m_views) {
         view->close();
@@ -130,9 +132,41 @@ Result<void> Document::closeView(std::wstring_view name) {
     return {};
 }
 
+void Document::activateWhenIdle(ViewState& view) {
+    if (m_list.isCommandRunning())
+        m_due_active_view = &view;
+    else
+        m_active_view = &view;
+}
+
+bool Document::setFrameSizeWhenIdle(ViewState& view, int width_px, int height_px) {
+    if (!ViewState::isPictureSide(width_px) || !ViewState::isPictureSide(height_px))
+        return false;
+    m_due_frame_sizes[&view] = {width_px, height_px};
+    if (!m_list.isCommandRunning())
+        resizeDueFrames();
+    return true;
+}
+
+void Document::settleViews() {
+    if (m_due_active_view)
+        m_active_view = std::exchange(m_due_active_view, nullptr);
+    closeDueViews();
+    resizeDueFrames();
+}
+
 void Document::closeDueViews() {
     for (ViewState* view : std::exchange(m_due_views, {}))
         closeNow(*view);
+}
+
+void Document::resizeDueFrames() {
+    for (const auto& [view, size] : std::exchange(m_due_frame_sizes, {})) {
+        const bool is_new =
+            view->frameWidth() != size.width_px || view->frameHeight() != size.height_px;
+        if (view->isOpen() && is_new)
+            view->setFrameSize(size.width_px, size.height_px);
+    }
 }
 
 void Document::closeNow(ViewState& view) {

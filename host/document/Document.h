@@ -81,6 +81,12 @@ public:
     ViewState* findView(std::wstring_view name) const;
     /// Makes the view with this name, ignoring case, the active one. @return false: there is none
     bool activateView(std::wstring_view name);
+    /// Makes one of the document's views the active one; while a command runs, when the outermost
+    /// one has ended: a command goes on with the view that it began with.
+    void activateWhenIdle(ViewState& view);
+    /// As ViewState::setFrameSize; while a command runs, when the outermost one has ended, so that
+    /// all pictures of a recording have one size. A view of that size already keeps its picture.
+    bool setFrameSizeWhenIdle(ViewState& view, int width_px, int height_px);
     /// Whether a view may be added under this name.
     /// @return an error for an empty name, one with control characters, and one that a view has
     Result<void> checkNewViewName(const KM_wString& name) const;
@@ -94,8 +100,8 @@ public:
     /// has ended. When it was the active one, the view behind it becomes active, or the last one.
     /// @return an error when there is no such view and when no view would be left
     Result<void> closeView(std::wstring_view name);
-    /// Called when the outermost command has ended: closes the views that closeView put off.
-    void closeDueViews();
+    /// Called when the outermost command has ended: does to the views what was put off until then.
+    void settleViews();
     const std::vector<NamedView>& namedViews() const { return m_named_views; }
 
     double absoluteTolerance() const { return m_absolute_tolerance; }
@@ -156,6 +162,8 @@ private:
     void fitTolerance();
     std::vector<KM_Light> shiningLights(const SceneChanges& changes) const;
     void closeNow(ViewState& view);
+    void closeDueViews();
+    void resizeDueFrames();
     Result<void> updateScene(const SceneChanges& changes);
     Error memoryLacks(const char* how, int width_px, int height_px);
 
@@ -173,6 +181,12 @@ private:
     std::vector<std::unique_ptr<ViewState>> m_views;
     ViewState* m_active_view = nullptr;
     std::vector<ViewState*> m_due_views; ///< to be closed when the command ends
+    struct FrameSize {
+        int width_px;
+        int height_px;
+    };
+    std::map<ViewState*, FrameSize> m_due_frame_sizes; ///< to be set when the command ends
+    ViewState* m_due_active_view = nullptr;            ///< to be active then; null: as it is
     std::vector<std::unique_ptr<ViewState>> m_closed_views;
     bool m_is_open = true;
     std::unique_ptr<DocumentScene> m_scene; ///< null until something is drawn

@@ -57,7 +57,7 @@ void DocumentList::commandEnded() {
     m_is_command_running = false;
     closeAllBut(m_active);
     if (m_active)
-        m_active->closeDueViews();
+        m_active->settleViews();
 }
 
 void DocumentList::closeAll() {

@@ -34,7 +34,7 @@ public:
     /// because the command may hold it.
     void commandStarted() { m_is_command_running = true; }
     /// Called when the outermost command has ended: closes every document but the active one, and
-    /// the views that were to close meanwhile.
+    /// does to its views what was put off until then.
     void commandEnded();
     bool isCommandRunning() const { return m_is_command_running; }
 

@@ -10,10 +10,6 @@ namespace quarn {
 
 namespace {
 
-bool isPictureSide(int side_px) {
-    return side_px >= 1 && side_px <= ViewState::largest_side_px;
-}
-
 bool hasScreenPort(const KM_Viewport& viewport, int width_px, int height_px) {
     int width = 0;
     int height = 0;
@@ -120,6 +116,9 @@ void ViewState::redraw(unsigned int flags) {
     if (!(flags & CQuarnView::show_frame_buffer) && m_mode)
         render(*m_frame_buffer, m_frame_width, m_frame_height, m_current_attributes);
     ++m_show_count;
+    if (m_frame_buffer->width > 0)
+        m_document.frontEnd().viewShown(
+            m_view_face, {m_frame_buffer->width, m_frame_buffer->height, m_frame_buffer->rgba});
 }
 
 } // namespace quarn

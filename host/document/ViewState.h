@@ -20,6 +20,7 @@ public:
     static constexpr int default_width_px = 1280;
     static constexpr int default_height_px = 720;
     static constexpr int largest_side_px = 16384;
+    static bool isPictureSide(int side_px) { return side_px >= 1 && side_px <= largest_side_px; }
 
     ViewState(Document& document, const KM_wString& name, const KM_Viewport& viewport);
     ~ViewState();
