@@ -13,6 +13,7 @@ SessionOptions sessionOptions(const CommonOptions& common) {
     options.plug_in_folders = {plugInFolder()};
     options.locale_folders = {hostLocaleFolder()};
     options.language = common.language;
+    options.dialog_folders = {dialogFolder()};
     return options;
 }
 

@@ -18,4 +18,8 @@ std::filesystem::path hostLocaleFolder() {
     return installedTree() / "share" / "quarn" / "locale" / "host";
 }
 
+std::filesystem::path dialogFolder() {
+    return installedTree() / "share" / "quarn" / "dialogs";
+}
+
 } // namespace quarn::program

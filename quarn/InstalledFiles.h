@@ -14,4 +14,7 @@ std::filesystem::path plugInFolder();
 /// Where the host's own string tables are.
 std::filesystem::path hostLocaleFolder();
 
+/// Where the dialog templates of plug-ins are, in a folder for each.
+std::filesystem::path dialogFolder();
+
 } // namespace quarn::program

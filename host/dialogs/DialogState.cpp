@@ -59,9 +59,7 @@ int DialogState::show() {
     Application* application = Application::forCall("CDialog::DoModal");
     if (!application || !mayOpen(*application))
         return NOT_SHOWN;
-    const auto folders =
-        dialogTemplateFolders(libraryOf(dialog), application->options().dialog_folders);
-    Result<DialogTemplate> read = findDialogTemplate(template_id, folders, application->texts());
+    Result<DialogTemplate> read = readForm(*application);
     if (!read) {
         application->tell(read.message());
         return NOT_SHOWN;
@@ -79,11 +77,19 @@ int DialogState::show() {
     return NOT_SHOWN;
 }
 
+Result<DialogTemplate> DialogState::readForm(Application& application) const {
+    const auto folders =
+        dialogTemplateFolders(libraryOf(dialog), application.options().dialog_folders);
+    return findDialogTemplate(template_id, folders, application.texts());
+}
+
 int DialogState::showIn(DialogWindow& shown_window) {
     Application* application = Application::forCall("CQuarnDialog::DoModalIn");
     if (!application || !mayOpen(*application))
         return NOT_SHOWN;
-    form = {};
+    Result<DialogTemplate> read = readForm(*application);
+    form = read ? std::move(read.value()) : DialogTemplate{};
+    form.controls.clear();
     return runIn(*application, shown_window);
 }
 

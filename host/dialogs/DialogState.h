@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/app/Result.h"
 #include "host/front_end/DialogTemplate.h"
 #include "host/front_end/DialogWindow.h"
 #include "sdk/qncore/QnDialog.h"
@@ -47,11 +48,12 @@ struct DialogState final : DialogEvents {
     const int template_id;
     CWnd* const parent;
     std::vector<std::pair<int, CComboBox*>> combo_boxes;
-    DialogTemplate form;            ///< empty in a window of another making
+    DialogTemplate form;            ///< without controls in a window of another making
     DialogWindow* window = nullptr; ///< while the dialog is open
     std::optional<int> result;      ///< once the dialog has ended
 
 private:
+    Result<DialogTemplate> readForm(Application& application) const;
     int runIn(Application& application, DialogWindow& shown_window);
     /// Calls an overridden operation; one that throws ends the dialog.
     void call(const char* name, const std::function<void()>& operation);

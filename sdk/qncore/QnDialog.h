@@ -116,8 +116,9 @@ public:
 
     // ---- For whoever shows the dialog in a window of its own making
 
-    /// Runs the dialog in this window instead of one that the front end makes from the template,
-    /// which is not looked at. The window stays the caller's.
+    /// Runs the dialog in this window instead of one that the front end makes from the template, of
+    /// which only the title is taken, for messages; there need be none. The window stays the
+    /// caller's.
     /// @return as DoModal
     int DoModalIn(quarn::DialogWindow& window);
 };

@@ -22,11 +22,16 @@ nlohmann::json tableOf(const std::string& language) {
 }
 
 /// But those of the sun, which hold no texts and the long numbers of formulas.
+bool holdsTexts(const std::filesystem::path& file) {
+    return (file.extension() == ".cpp" && file.parent_path().filename() != "sun") ||
+           file.parent_path().filename() == "dialogs";
+}
+
 std::string allSources() {
     std::string text;
     for (const auto& entry :
          std::filesystem::recursive_directory_iterator(source_folder / "zoetrix"))
-        if (entry.path().extension() == ".cpp" && entry.path().parent_path().filename() != "sun")
+        if (holdsTexts(entry.path()))
             text += readFile(entry.path());
     return text;
 }
@@ -54,6 +59,21 @@ std::string unescaped(const std::string& source) {
         text += escaped && source[i] == 'n' ? '\n' : source[i];
     }
     return text;
+}
+
+/// English texts by their numbers, where the dialogs' templates have them side by side.
+std::map<std::string, std::string> textsOfTemplates() {
+    const std::regex text_and_number("\"text\": \"([^\"]*)\", \"id\": ([1-4][0-9]{4})");
+    std::map<std::string, std::string> texts;
+    for (const auto& entry :
+         std::filesystem::directory_iterator(source_folder / "zoetrix" / "dialogs")) {
+        const std::string form = readFile(entry.path());
+        for (const std::smatch& match : matches(form, text_and_number)) {
+            const auto [place, is_new] = texts.try_emplace(match[2], match[1]);
+            EXPECT_EQ(place->second, match[1]) << entry.path() << " " << match[2];
+        }
+    }
+    return texts;
 }
 
 /// English texts by their numbers, where the sources have them side by side.
@@ -118,6 +138,17 @@ TEST(StringTables, NoNumberStandsForTwoTexts) {
         EXPECT_EQ(place->second, match[1]) << match[2];
     }
     EXPECT_GT(seen.size(), 60U);
+}
+
+TEST(StringTables, TemplatesAndSourcesSayTheSameByTheSameNumber) {
+    const std::map<std::string, std::string> in_sources = englishTexts();
+    const std::map<std::string, std::string> in_templates = textsOfTemplates();
+    EXPECT_EQ("Set Location...", in_templates.at("40511"));
+    EXPECT_EQ(in_sources.at("40005"), in_templates.at("40005"));
+    for (const auto& [number, text] : in_templates)
+        if (in_sources.contains(number)) {
+            EXPECT_EQ(in_sources.at(number), text) << number;
+        }
 }
 
 TEST(StringTables, KeepFormatDirectivesAndTheEndOfTheLine) {

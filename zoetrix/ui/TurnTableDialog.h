@@ -1,0 +1,65 @@
+#pragma once
+
+#include "kelmar/KM_Array.h"
+#include "kelmar/KM_wString.h"
+#include "sdk/qncore/QnComboBox.h"
+#include "sdk/qncore/QnDialog.h"
+
+/// The plug-in's own form of a turntable animation: frame count, direction, file type, capture
+/// method, viewport and name. It stands by itself: whoever shows it hands it the lists, and reads
+/// the members after DoModal returned 1.
+///
+/// When the form is filled a selection that is not below the count of its list becomes 0. The
+/// viewport selection is measured against the count of the file types, and stored choices depend on
+/// that.
+class CTurnTableDialog : public CQuarnDialog {
+public:
+    static const CQnRuntimeClass ClassRecord;
+
+    /// Controls of the template.
+    enum control_id : int {
+        template_id = 6004,
+        frame_count_id = 6005,
+        name_id = 6009,
+        file_type_id = 6011,
+        capture_id = 6012,
+        viewport_id = 6013,
+        direction_id = 6014,
+    };
+
+    /// @param frame_count  frames of the animation
+    /// @param name         of the animation
+    /// @param parent       the window that owns the dialog; may be null
+    CTurnTableDialog(int frame_count, const KM_wString& name,
+                     const KM_ClassArray<KM_wString>& direction_list, int direction_selection,
+                     const KM_ClassArray<KM_wString>& file_type_list, int file_type_selection,
+                     const KM_ClassArray<KM_wString>& capture_list, int capture_selection,
+                     const KM_ClassArray<KM_wString>& viewport_list, int viewport_selection,
+                     CWnd* parent);
+    ~CTurnTableDialog() override;
+
+    const CQnRuntimeClass* GetRuntimeClass() const override;
+    /// "QXTurnTableDialogController".
+    const wchar_t* ControllerName() const override;
+
+    int m_frame_count;
+    CComboBox m_direction_combo;
+    KM_ClassArray<KM_wString> m_direction_list;
+    int m_direction_selection;
+    CComboBox m_file_type_combo;
+    KM_ClassArray<KM_wString> m_file_type_list;
+    int m_file_type_selection;
+    CComboBox m_capture_combo;
+    KM_ClassArray<KM_wString> m_capture_list;
+    int m_capture_selection;
+    CComboBox m_viewport_combo;
+    KM_ClassArray<KM_wString> m_viewport_list;
+    int m_viewport_selection;
+    KM_wString m_name;
+
+protected:
+    void DoDataExchange(CQnDialogExchange& exchange) override;
+    int OnInitDialog() override;
+    void OnOK() override;
+    void OnCancel() override;
+};
