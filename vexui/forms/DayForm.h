@@ -1,0 +1,24 @@
+#pragma once
+
+#include "vexui/forms/SunForm.h"
+
+namespace vexui {
+
+/// The form of a sun study of one day.
+class DayForm final : public SunForm {
+public:
+    DayForm(const IZoetrixDataUI& lists, const KM_3dmAnimationProperties& record, QWidget* owner);
+
+protected:
+    Span span() const override;
+    std::int64_t stepInSeconds() const override;
+    void takeStep(KM_3dmAnimationProperties& record) const override;
+    QString momentsText(const QDateTime& start, const StudyFrames& frames) const override;
+
+private:
+    QDateEdit* m_date = nullptr;
+    QTimeEdit* m_start = nullptr;
+    QTimeEdit* m_end = nullptr;
+};
+
+} // namespace vexui

@@ -1,0 +1,85 @@
+#include "vexui/forms/PlaceFields.h"
+
+#include "sdk/qncore/QnLocalize.h"
+#include "sdk/qncore/QnLocationDialog.h"
+#include "vexui/Texts.h"
+#include "vexui/forms/NumberField.h"
+
+#include <QLabel>
+
+#include <cmath>
+
+namespace vexui {
+
+namespace {
+
+constexpr int location_chosen = 1;
+
+/// The same longitude from -180 to 180 degrees.
+double inRange(double longitude) {
+    return std::abs(longitude) <= 180.0 ? longitude : std::remainder(longitude, 360.0);
+}
+
+/// Nobody points at a place more exactly than to some ten metres.
+double rounded(double degrees) {
+    constexpr double parts = 10000.0;
+    return std::round(degrees * parts) / parts;
+}
+
+/// The zone by which the plug-in reckons the sun: a whole hour for every full 15 degrees.
+QString zoneAt(double longitude) {
+    const int hours = static_cast<int>(longitude / 15.0);
+    const QString utc = QString::fromLatin1("UTC");
+    if (hours == 0)
+        return utc;
+    return utc + (hours > 0 ? QChar(u'+') : QChar(0x2212)) + QString::number(std::abs(hours));
+}
+
+} // namespace
+
+void PlaceFields::show(const KM_3dmAnimationProperties& record) const {
+    latitude->setNumber(record.Latitude());
+    longitude->setNumber(inRange(record.Longitude()));
+    north_angle->setNumber(record.NorthAngle());
+}
+
+void PlaceFields::choose() const {
+    double chosen_latitude = latitude->number().value_or(0.0);
+    double chosen_longitude = longitude->number().value_or(0.0);
+    if (QnShowLocationDialog(QnLocalizeString(L"Set Animation Location", 34509), chosen_latitude,
+                             chosen_longitude) != location_chosen)
+        return;
+    latitude->setNumber(rounded(chosen_latitude));
+    longitude->setNumber(rounded(inRange(chosen_longitude)));
+}
+
+void PlaceFields::tellZone() const {
+    const std::optional<double> degrees = longitude->number();
+    zone->setText(degrees ? localText(L"Times are those of %1, without daylight saving.", 44110)
+                                .arg(zoneAt(*degrees))
+                          : QString());
+}
+
+void PlaceFields::takeInto(KM_3dmAnimationProperties& record) const {
+    record.SetLatitude(latitude->number().value_or(0.0));
+    record.SetLongitude(longitude->number().value_or(0.0));
+    record.SetNorthAngle(north_angle->number().value_or(0.0));
+}
+
+QString PlaceFields::latitudeFault() const {
+    return latitude->number() ? QString()
+                              : localText(L"Enter a latitude from -90 to 90 degrees.", 44072);
+}
+
+QString PlaceFields::longitudeFault() const {
+    return longitude->number() ? QString()
+                               : localText(L"Enter a longitude from -180 to 180 degrees.", 44073);
+}
+
+QString PlaceFields::northAngleFault() const {
+    return north_angle->number()
+               ? QString()
+               : localText(L"Enter a north angle from -360 to 360 degrees.", 44074);
+}
+
+} // namespace vexui
