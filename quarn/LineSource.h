@@ -1,6 +1,6 @@
 #pragma once
 
-#include "quarn/Completion.h"
+#include "host/front_end/Completion.h"
 
 #include <functional>
 #include <string>

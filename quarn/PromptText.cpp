@@ -1,6 +1,6 @@
 #include "quarn/PromptText.h"
 
-#include "quarn/Completion.h"
+#include "host/front_end/Completion.h"
 
 #include <algorithm>
 

@@ -1,7 +1,5 @@
-#include "quarn/Columns.h"
-#include "quarn/Completion.h"
-#include "quarn/FileCompletion.h"
-#include "quarn/PromptText.h"
+#include "host/front_end/Completion.h"
+#include "host/front_end/FileCompletion.h"
 #include "tests/support/TempFolder.h"
 
 #include <gmock/gmock.h>
@@ -10,12 +8,6 @@
 namespace quarn::test {
 namespace {
 
-using program::completeAnswer;
-using program::completeCommand;
-using program::completeFile;
-using program::Completion;
-using program::inColumns;
-using program::promptText;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
@@ -149,26 +141,6 @@ TEST(AnswerCompletion, IsOfObjectsWhereTheyAreAskedFor) {
     question.kind = Question::Kind::object;
     question.object_names = {KM_wString(L"North gate"), KM_wString(L"Tower")};
     EXPECT_THAT(textsOf(completeAnswer(L"no", question)), ElementsAre(L"North gate"));
-}
-
-TEST(PromptText, ShowsDefaultAndOptionsAsTheyAreTyped) {
-    Question question = questionOf(Question::Kind::integer);
-    EXPECT_EQ(promptText(question), L"Direction ( Rechts Bilder=12 ): ");
-    question.default_answer = KM_wString(L"Rechts");
-    EXPECT_EQ(promptText(question), L"Direction <Rechts> ( Rechts Bilder=12 ): ");
-    question.kind = Question::Kind::string;
-    EXPECT_EQ(promptText(question), L"Direction <Rechts> ( [Rechts] [Bilder=12] ): ");
-    question.options.clear();
-    question.default_answer = KM_wString();
-    EXPECT_EQ(promptText(question), L"Direction: ");
-}
-
-TEST(Columns, GoDownFirstAndFillTheWidth) {
-    // Three columns of 3 and two gaps of 2 make 13.
-    EXPECT_EQ(inColumns({L"a", L"bbb", L"c", L"d", L"e"}, 13), "a    c    e\nbbb  d\n");
-    EXPECT_EQ(inColumns({L"a", L"bbb", L"c"}, 12), "a    c\nbbb\n");
-    EXPECT_EQ(inColumns({L"größe", L"b"}, 1), "größe\nb\n");
-    EXPECT_EQ(inColumns({}, 80), "");
 }
 
 } // namespace

@@ -1,10 +1,10 @@
-#include "quarn/Completion.h"
+#include "host/front_end/Completion.h"
 
-#include "quarn/FileCompletion.h"
+#include "host/front_end/FileCompletion.h"
 
 #include <algorithm>
 
-namespace quarn::program {
+namespace quarn {
 
 namespace {
 
@@ -104,4 +104,4 @@ std::wstring optionText(Question::Kind kind, std::wstring_view inside) {
     return is_text_question ? L'[' + std::wstring(inside) + L']' : std::wstring(inside);
 }
 
-} // namespace quarn::program
+} // namespace quarn

@@ -1,11 +1,11 @@
-#include "quarn/FileCompletion.h"
+#include "host/front_end/FileCompletion.h"
 
-#include "quarn/Words.h"
+#include "kelmar/KM_wString.h"
 
 #include <algorithm>
 #include <system_error>
 
-namespace quarn::program {
+namespace quarn {
 
 namespace {
 
@@ -20,7 +20,7 @@ std::vector<Entry> entriesOf(const std::filesystem::path& folder, std::wstring_v
     std::error_code error;
     for (std::filesystem::directory_iterator it(folder, error), end; !error && it != end;
          it.increment(error)) {
-        const std::wstring name = wideText(it->path().filename().native());
+        const std::wstring name(KM_wString::FromUtf8(it->path().filename().native()).View());
         if (!name.starts_with(start) || (start.empty() && name.starts_with(L'.')))
             continue;
         std::error_code ignored;
@@ -43,7 +43,7 @@ Completion completeFile(std::wstring_view typed, bool is_word) {
     const std::size_t name_begin = slash == path.npos ? 0 : slash + 1;
     const std::wstring folder(path.substr(0, name_begin));
 
-    const std::string folder_bytes = utf8Text(folder);
+    const std::string folder_bytes = KM_wString(folder).ToUtf8();
     const std::vector<Entry> entries =
         entriesOf(folder.empty() ? "." : folder_bytes, path.substr(name_begin));
     const bool is_quoted = was_quoted || (is_word && std::ranges::any_of(entries, hasBlank));
@@ -59,4 +59,4 @@ Completion completeFile(std::wstring_view typed, bool is_word) {
     return completion;
 }
 
-} // namespace quarn::program
+} // namespace quarn
