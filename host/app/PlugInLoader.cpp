@@ -178,6 +178,7 @@ void PlugInLoader::readWhatWaited(const KM_UUID& id) {
     for (const std::string& warning :
          readPlugInContents(m_application, *document, {*waiting}, options).warnings)
         m_application.tell(warning);
+    document->markRecordSaved();
 }
 
 PlugInLoad PlugInLoader::takeObjects(Loaded& candidate, const PendingObjects& objects) const {

@@ -161,13 +161,17 @@ void addToDocument(Document& document, const AskedFile& asked) {
 void openAsDocument(DocumentList& list, const AskedFile& asked) {
     Document& document = list.openNew();
     const auto* content = std::get_if<DocumentContent>(&asked.content);
-    if (!content)
-        return addToDocument(document, asked);
+    if (!content) {
+        addToDocument(document, asked);
+        document.markSaved(); // nobody wants to be asked about a model that was only looked at
+        return;
+    }
     tellContent(asked, openContent(document, *content));
     std::error_code ignored;
     document.setFile(std::filesystem::absolute(asked.file, ignored));
     if (content->views.empty())
         fitViews(document);
+    document.markSaved();
 }
 
 } // namespace quarn

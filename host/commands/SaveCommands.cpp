@@ -90,8 +90,10 @@ CQuarnCommand::result saveWhole(Document& document, const SaveTarget& target) {
     if (target.result != CQuarnCommand::success)
         return target.result;
     const CQuarnCommand::result saved = save(document, target, false);
-    if (saved == CQuarnCommand::success && target.version == KM_CURRENT_ARCHIVE_VERSION)
+    if (saved == CQuarnCommand::success && target.version == KM_CURRENT_ARCHIVE_VERSION) {
         document.setFile(target.file);
+        document.markSaved();
+    }
     return saved;
 }
 

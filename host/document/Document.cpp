@@ -3,6 +3,7 @@
 #include "host/display/DisplayMode.h"
 #include "host/document/DocumentList.h"
 #include "host/document/DocumentScene.h"
+#include "host/document/SavedState.h"
 #include "host/document/SceneChanges.h"
 #include "host/document/StandardViews.h"
 #include "host/document/file/FileRemainder.h"
@@ -68,6 +69,7 @@ void Document::close() {
     m_named_views.clear();
     m_edges.clear();
     *m_file_remainder = FileRemainder();
+    m_saved_state.reset();
 }
 
 void Document::closeAllViews() {
@@ -162,11 +164,29 @@ void Document::closeDueViews() {
 
 void Document::resizeDueFrames() {
     for (const auto& [view, size] : std::exchange(m_due_frame_sizes, {})) {
-        const bool is_new =
-            view->frameWidth() != size.width_px || view->frameHeight() != size.height_px;
-        if (view->isOpen() && is_new)
-            view->setFrameSize(size.width_px, size.height_px);
+        const int old_width_px = view->frameWidth();
+        const int old_height_px = view->frameHeight();
+        const bool is_new = old_width_px != size.width_px || old_height_px != size.height_px;
+        if (!view->isOpen() || !is_new)
+            continue;
+        view->setFrameSize(size.width_px, size.height_px);
+        // A window that a person makes wider does not change the document.
+        if (m_saved_state)
+            m_saved_state->follow(*view, old_width_px, old_height_px);
     }
+}
+
+bool Document::isModified() const {
+    return m_saved_state && *m_saved_state != savedStateOf(*this);
+}
+
+void Document::markSaved() {
+    m_saved_state = std::make_unique<SavedState>(savedStateOf(*this));
+}
+
+void Document::markRecordSaved() {
+    if (m_saved_state)
+        m_saved_state->record = recordStateOf(*this);
 }
 
 void Document::closeNow(ViewState& view) {
@@ -274,6 +294,18 @@ Result<RenderEnd> Document::render(const KM_Viewport& viewport, const RenderRequ
         return Renderer().render(m_scene->display(), viewport, request, watch, picture);
     } catch (const std::bad_alloc&) {
         return memoryLacks("rendered", request.width_px, request.height_px);
+    }
+}
+
+Result<const DocumentScene*> Document::upToDateScene() {
+    try {
+        const auto updated = updateScene(SceneChanges());
+        if (!updated)
+            return updated.error();
+        return m_scene.get();
+    } catch (const std::bad_alloc&) {
+        m_scene.reset();
+        return Error{"There is too little memory for the scene. Close other programs."};
     }
 }
 

@@ -29,6 +29,7 @@ struct FileRemainder;
 struct Image;
 struct ImportedModel;
 struct RenderRequest;
+struct SavedState;
 struct SceneChanges;
 enum class RenderEnd;
 
@@ -55,6 +56,7 @@ public:
     /// The document behind the one that plug-ins see.
     static Document& of(const CQuarnDoc& document);
     CQuarnDoc& face() { return m_face; }
+    const CQuarnDoc& face() const { return m_face; }
 
     unsigned int serialNumber() const { return m_serial_number; }
     DocumentList& list() const { return m_list; }
@@ -68,10 +70,14 @@ public:
     ObjectTable& objects() { return m_objects; }
     const ObjectTable& objects() const { return m_objects; }
     LightStore& lights() { return m_lights; }
+    const LightStore& lights() const { return m_lights; }
     DocumentSun& sun() { return m_sun; }
+    const DocumentSun& sun() const { return m_sun; }
     /// Which edges of meshes a display mode draws in this document.
     MeshEdgeChoice edgesOf(const KM_UUID& display_mode) const;
     void setEdgesOf(const KM_UUID& display_mode, MeshEdgeChoice choice);
+    /// The choices that are not as the display mode has it, by display mode.
+    const std::map<KM_UUID, MeshEdgeChoice>& edges() const { return m_edges; }
     CQuarnDocProperties& properties() { return m_properties; }
 
     const std::vector<std::unique_ptr<ViewState>>& views() const { return m_views; }
@@ -112,6 +118,16 @@ public:
     const std::filesystem::path& file() const { return m_file; }
     void setFile(const std::filesystem::path& file) { m_file = file; }
 
+    /// Whether what a file of it holds was changed since the last call of markSaved; cameras, the
+    /// active view and the selection do not count, nor does what playing alone changes of the
+    /// animation record. Looks at everything but coordinates: some milliseconds for large
+    /// documents.
+    bool isModified() const;
+    /// Called when the document was made, opened or saved: as it is now, it is not modified.
+    void markSaved();
+    /// Called when a plug-in began to keep the animation record of the document.
+    void markRecordSaved();
+
     /// What of the file it came from nobody here understands, to be written back.
     FileRemainder& fileRemainder() { return *m_file_remainder; }
 
@@ -149,6 +165,9 @@ public:
     Result<RenderEnd> render(const KM_Viewport& viewport, const RenderRequest& request,
                              const std::function<bool(double share)>& watch, Image& picture,
                              const SceneChanges& changes);
+    /// The scene as it is drawn now, brought up to date. Valid until the next call that draws.
+    /// @return an error when it cannot be built
+    Result<const DocumentScene*> upToDateScene();
     RenderWindow& renderWindow() { return m_render_window; }
     /// Brings the scene up to date where it was built before.
     void regenerate();
@@ -177,6 +196,7 @@ private:
     UnitSystem m_units = UnitSystem::none;
     std::filesystem::path m_file;
     std::unique_ptr<FileRemainder> m_file_remainder;
+    std::unique_ptr<SavedState> m_saved_state; ///< null until markSaved
     std::vector<NamedView> m_named_views;
     std::vector<std::unique_ptr<ViewState>> m_views;
     ViewState* m_active_view = nullptr;

@@ -50,6 +50,7 @@ Document& DocumentList::openNew() {
     m_documents.push_back(std::make_unique<Document>(*this, nextSerialNumber()));
     m_active = m_documents.back().get();
     emptyAnimationRecord(*m_active);
+    m_active->markSaved();
     return *m_active;
 }
 
@@ -87,6 +88,8 @@ void DocumentList::rememberFreshRecord() {
     if (m_active && Zoetrix_QuarnDynamicAccess())
         m_fresh_record = std::make_unique<KM_3dmAnimationProperties>(
             m_active->properties().AnimationProperties());
+    if (m_active)
+        m_active->markRecordSaved();
 }
 
 void DocumentList::emptyAnimationRecord(Document& document) {

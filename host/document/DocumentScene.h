@@ -28,6 +28,8 @@ public:
 
     /// What the last update left.
     const DisplayScene& display() const { return m_display; }
+    /// What it was made of; its meshes, curves and points are in the order of the display's.
+    const SceneContent& content() const { return m_content; }
 
 private:
     void takeObjects(const ObjectTable& objects);

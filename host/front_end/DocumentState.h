@@ -11,10 +11,19 @@ namespace quarn {
 /// The document file that a document was opened from or saved to last; empty when there is none.
 QNCORE_API std::filesystem::path documentFile(CQuarnDoc& document);
 
-/// Whether a document holds something that its file does not: objects, lights, sun, cameras of
-/// views, display modes, frame sizes, or the animation record were changed since it was made,
-/// opened or saved. Moving the camera with the mouse alone does not count: nobody wants to be asked
-/// about that.
+/// Whether a document holds something that its file does not: objects, their names and visibility,
+/// lights, sun, views, their display modes and frame sizes, edges, or the animation are others than
+/// when it was made, opened or saved. What was put back is no change: a curve that is hidden while
+/// an animation plays, a light that a sun study moves.
+///
+/// These alone do not count, as nobody wants to be asked about them: cameras, which view is active,
+/// what is selected, which frame of the animation was shown last, frame sizes that a window gives
+/// with setFrameSize. A new document, and one that a model file was opened as, is not modified; nor
+/// is one after SaveAs in an older version of the file where it was not before, but that does not
+/// make a modified one unmodified, because such a file may hold less.
+///
+/// Takes some milliseconds for a document of many thousand objects or frames; ask after commands,
+/// not for every picture.
 QNCORE_API bool isModified(CQuarnDoc& document);
 
 /// How many objects it has, hidden ones too.
