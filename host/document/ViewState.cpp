@@ -51,6 +51,13 @@ bool ViewState::setViewport(const KM_Viewport& viewport, bool update_target,
     return true;
 }
 
+KM_Viewport ViewState::frameCamera() const {
+    KM_Viewport camera = m_viewport;
+    if (!hasScreenPort(camera, m_frame_width, m_frame_height))
+        camera.SetScreenPort(m_frame_width, m_frame_height);
+    return camera;
+}
+
 bool ViewState::setTargetAndCamera(const KM_3dPoint& target, const KM_3dPoint& camera,
                                    bool update_target, bool update_up) {
     KM_Viewport moved = m_viewport;

@@ -42,6 +42,9 @@ public:
     // ---- Camera
 
     const KM_Viewport& viewport() const { return m_viewport; }
+    /// The camera as the view's pictures have it: with the frame's size and aspect, also where a
+    /// plug-in set another one.
+    KM_Viewport frameCamera() const;
     /// As CQuarnViewport::SetVP.
     bool setViewport(const KM_Viewport& viewport, bool update_target, bool update_frame_size);
     /// As CQuarnViewport::SetTargetAndCameraLocation.
