@@ -42,8 +42,9 @@ Application::Application(FrontEnd& front_end, SessionOptions options)
       m_runner(*this) {
     claimMainThread();
     running_application = this;
-    if (Result<void> texts = m_texts.load("host", m_options.locale_folders); !texts)
-        tell(texts.message());
+    loadTexts("host", m_options.locale_folders);
+    if (!m_options.program_locale_folder.empty())
+        loadTexts("program", {m_options.program_locale_folder});
     DisplayModeList::instance().localize();
     registerHostCommands();
     m_documents = std::make_unique<DocumentList>(front_end);
@@ -61,6 +62,12 @@ Application::~Application() {
     running_application = nullptr;
     releaseMainThread();
     setBreachReceiver(m_former_receiver);
+}
+
+void Application::loadTexts(const std::string& owner,
+                            const std::vector<std::filesystem::path>& folders) {
+    if (const Result<void> loaded = m_texts.load(owner, folders); !loaded)
+        tell(loaded.message());
 }
 
 void Application::registerHostCommands() {

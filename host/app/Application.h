@@ -66,6 +66,7 @@ public:
     bool isExitRequested() const { return m_exit_requested; }
 
 private:
+    void loadTexts(const std::string& owner, const std::vector<std::filesystem::path>& folders);
     void registerHostCommands();
 
     FrontEnd& m_front_end;
