@@ -23,7 +23,7 @@ std::string blanksAtBegin(const std::string& text) {
 
 /// Letters to press: an ampersand before anything but a blank or another one.
 std::size_t accessKeys(const std::string& text) {
-    const std::regex key("&[^ &]");
+    static const std::regex key("&[^ &]");
     return static_cast<std::size_t>(
         std::distance(std::sregex_iterator(text.begin(), text.end(), key), {}));
 }
@@ -31,8 +31,9 @@ std::size_t accessKeys(const std::string& text) {
 } // namespace
 
 std::vector<std::string> formatCodes(const std::string& text) {
-    const std::regex code("%(?:[1-9](?![0-9.$]*[a-zA-Z])|"
-                          "[-+#0]*(?:[0-9]+|\\*)?(?:\\.[0-9]+)?(?:hh|ll|[hlLzjt])?[a-zA-Z%])");
+    static const std::regex code(
+        "%(?:[1-9](?![0-9.$]*[a-zA-Z])|"
+        "[-+#0]*(?:[0-9]+|\\*)?(?:\\.[0-9]+)?(?:hh|ll|[hlLzjt])?[a-zA-Z%])");
     std::vector<std::string> codes;
     for (std::sregex_iterator found(text.begin(), text.end(), code), end; found != end; ++found)
         if (found->str() != "%%")

@@ -33,10 +33,20 @@ void countNumbers(const std::string& json, Table& table) {
                                std::to_string(table.texts.size()) + " numbers");
 }
 
+void addOnce(std::vector<std::string>& texts, const std::string& text) {
+    if (std::ranges::find(texts, text) == texts.end())
+        texts.push_back(text);
+}
+
 Module readModule(const std::filesystem::path& folder) {
-    Module module{folder, textUsesBelow(folder), {}};
+    Module module{folder, textUsesBelow(folder), {}, {}, {}};
     for (const char* language : LANGUAGES)
         module.tables.push_back(readTable(folder / "locale" / (std::string(language) + ".json")));
+    for (const TextUse& use : module.uses)
+        if (use.english)
+            addOnce(use.space ? module.looked_up[{*use.space, use.number}]
+                              : module.listed[use.number],
+                    *use.english);
     return module;
 }
 
@@ -72,15 +82,12 @@ Table readTable(const std::filesystem::path& file) {
     return table;
 }
 
-std::vector<std::string> Module::englishOf(const TextKey& key) const {
-    std::vector<std::string> looked_up, listed;
-    for (const TextUse& use : uses) {
-        std::vector<std::string>& texts = use.space ? looked_up : listed;
-        if (use.number == key.second && use.english && use.space.value_or(key.first) == key.first &&
-            std::ranges::find(texts, *use.english) == texts.end())
-            texts.push_back(*use.english);
-    }
-    return looked_up.empty() ? listed : looked_up;
+const std::vector<std::string>& Module::englishOf(const TextKey& key) const {
+    static const std::vector<std::string> none;
+    if (const auto found = looked_up.find(key); found != looked_up.end())
+        return found->second;
+    const auto found = listed.find(key.second);
+    return found == listed.end() ? none : found->second;
 }
 
 const std::vector<Module>& modules() {

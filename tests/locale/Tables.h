@@ -37,7 +37,10 @@ struct Module {
 
     /// The English texts of a number in one space, as far as the sources show them: those that are
     /// looked up there, else those that stand in a list of the sources.
-    std::vector<std::string> englishOf(const TextKey& key) const;
+    const std::vector<std::string>& englishOf(const TextKey& key) const;
+
+    std::map<TextKey, std::vector<std::string>> looked_up;
+    std::map<int, std::vector<std::string>> listed;
 };
 
 /// Every folder of the sources that has a folder `locale`.

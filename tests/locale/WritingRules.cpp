@@ -139,14 +139,15 @@ bool hasSpanishPairs(wstring_view text) {
 
 /// Listed signs (\ / : * ? " < > |) are not the sentence's own marks.
 std::string withoutListedSigns(const std::string& text) {
-    return std::regex_replace(text, std::regex(R"(\\ / : \* \? " < > \|)"), "");
+    static const std::regex signs(R"( ?\\ / : \* \? " < > \|)");
+    return std::regex_replace(text, signs, "");
 }
 
 } // namespace
 
 std::vector<std::string> faultsOfWriting(const Translation& text) {
     const KM_wString local = KM_wString::FromUtf8(withoutListedSigns(text.local));
-    const KM_wString english = KM_wString::FromUtf8(text.english);
+    const KM_wString english = KM_wString::FromUtf8(withoutListedSigns(text.english));
     const wstring_view written = local.View();
     std::vector<std::string> faults;
     const auto require = [&](bool is_met, const char* fault) {
@@ -157,7 +158,7 @@ std::vector<std::string> faultsOfWriting(const Translation& text) {
     require(isInScriptOf(text.language, written), "characters of another language's script");
     require(endMark(written) == endMark(english.View()), "another mark at the end than in English");
     require(written.find(L"...") == wstring_view::npos, "three dots in place of an ellipsis");
-    require(!hasAny(written, L"’`´"), "an apostrophe that is none of the others'");
+    require(!hasAny(written, L"'`´"), "a typewriter's apostrophe");
     require(written.find(L"  ") == wstring_view::npos, "two blanks");
     require(hasOwnQuotes(text.language, written), "quotes of another language, or open ones");
     require(!isWide(text.language) || hasWideMarks(written), "narrow marks beside wide characters");
