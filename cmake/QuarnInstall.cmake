@@ -2,10 +2,17 @@ include(CMakePackageConfigHelpers)
 
 set(package_folder ${QUARN_LIB_FOLDER}/cmake/Quarn)
 install(TARGETS Kelmar QnCore EXPORT QuarnTargets LIBRARY DESTINATION ${QUARN_LIB_FOLDER})
+if(QUARN_BUILD_COCOA)
+    install(TARGETS QnCocoa EXPORT QuarnTargets LIBRARY DESTINATION ${QUARN_LIB_FOLDER})
+    install(TARGETS ZoetrixCocoa LIBRARY DESTINATION ${QUARN_LIB_FOLDER})
+else()
+    set(without_cocoa PATTERN "cocoa" EXCLUDE)
+endif()
 install(TARGETS Zoetrix LIBRARY DESTINATION ${QUARN_PLUGIN_FOLDER})
 install(TARGETS quarn RUNTIME DESTINATION ${QUARN_BIN_FOLDER})
 install(DIRECTORY "${PROJECT_SOURCE_DIR}/kelmar" "${PROJECT_SOURCE_DIR}/sdk"
     DESTINATION ${QUARN_INCLUDE_FOLDER} FILES_MATCHING PATTERN "*.h"
+    ${without_cocoa}
     # What the toolkit's own sources share is not for plug-in authors.
     PATTERN "KM_CaseFold.h" EXCLUDE
     PATTERN "KM_LittleEndian.h" EXCLUDE

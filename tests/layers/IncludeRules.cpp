@@ -19,6 +19,7 @@ struct Rule {
     std::array<std::string_view, 8> allowed = {}; ///< path prefixes of the included file
     bool knows_itself = true;
     bool standard_library_only = false; ///< no `<...>` but the language's own headers
+    bool knows_cocoa = false;           ///< Objective-C++, which may use its frameworks
 };
 
 constexpr std::string_view ALL_OF_ZOETRIX = "zoetrix/";
@@ -27,9 +28,15 @@ constexpr std::string_view UTILITIES = "zoetrix/plugin/ZoetrixUtilities.h";
 /// The first rule whose place matches decides, so the narrower places stand first.
 constexpr Rule RULES[] = {
     {"kelmar/", {}, true, true},
+    {"sdk/cocoa/", {"sdk/", "kelmar/"}, true, true, true},
     {"sdk/", {"kelmar/"}, true, true},
     {"zoetrix/sun/VyrSun", {"zoetrix/sun/VyrSun.h"}, false, true},
     {"zoetrix/sun/", {"sdk/", "kelmar/", UTILITIES}, true, true},
+    {"zoetrix/ui/QXTurnTableDialogController",
+     {"sdk/", "kelmar/", "zoetrix/ui/"},
+     false,
+     true,
+     true},
     {"zoetrix/ui/", {"sdk/", "kelmar/", UTILITIES}, true, true},
     {"zoetrix/plugin/", {"sdk/", "kelmar/", "zoetrix/paths/"}, true, true},
     {"zoetrix/paths/", {"sdk/", "kelmar/", "zoetrix/plugin/"}, true, true},
@@ -39,6 +46,7 @@ constexpr Rule RULES[] = {
      true},
     {"zoetrix/", {"sdk/", "kelmar/", ALL_OF_ZOETRIX}, true, true},
     {"vexui/", {"sdk/", "kelmar/"}, true, false},
+    {"host/cocoa/", {"sdk/", "kelmar/", "host/app/Result.h", "host/front_end/"}, true, false, true},
     {"host/", {"sdk/", "kelmar/"}, true, false},
     {"quarn/", {"sdk/", "host/front_end/"}, true, false},
     {"desktop/", {"sdk/", "host/front_end/"}, true, false},
@@ -54,6 +62,16 @@ const Rule* ruleFor(std::string_view file) {
 /// The language's own headers have neither a folder nor an ending.
 bool isStandardHeader(std::string_view path) {
     return path.find_first_of("/.") == std::string_view::npos;
+}
+
+bool isCocoaFramework(std::string_view path) {
+    return path.starts_with("AppKit/") || path.starts_with("Foundation/");
+}
+
+/// Objective-C++, which the rest of the project is built without.
+bool isCocoaHeader(std::string_view path) {
+    return path.starts_with("sdk/cocoa/") || path.starts_with("host/cocoa/") ||
+           path == "zoetrix/ui/QXTurnTableDialogController.h";
 }
 
 /// Only the one file that defines the plug-in's global objects stands above its folders.
@@ -107,10 +125,13 @@ bool isAllowed(const std::string& file, const Include& include) {
     if (rule == nullptr) {
         return false;
     }
+    if (!include.quoted && isCocoaFramework(include.path)) {
+        return rule->knows_cocoa;
+    }
     if (!include.quoted) {
         return !rule->standard_library_only || isStandardHeader(include.path);
     }
-    if (isAboveTheFolders(include.path)) {
+    if (isAboveTheFolders(include.path) || (isCocoaHeader(include.path) && !rule->knows_cocoa)) {
         return false;
     }
     if (rule->knows_itself && include.path.starts_with(rule->place)) {

@@ -83,6 +83,25 @@ TEST(Layers, OnlyTheGlobalObjectsStandAboveTheFoldersOfThePlugIn) {
     EXPECT_FALSE(allowsQuoted("zoetrix/commands/A.cpp", "zoetrix/ZoetrixGlobals.h"));
 }
 
+TEST(Layers, CocoaStaysInTheFilesOfObjectiveC) {
+    const std::string controller = "zoetrix/ui/QXTurnTableDialogController.mm";
+    EXPECT_TRUE(allowsAngled(controller, "AppKit/AppKit.h"));
+    EXPECT_TRUE(allowsQuoted(controller, "sdk/cocoa/QXDialogController.h"));
+    EXPECT_TRUE(allowsQuoted(controller, "zoetrix/ui/TurnTableDialog.h"));
+    EXPECT_TRUE(allowsAngled("sdk/cocoa/QXText.h", "Foundation/Foundation.h"));
+    EXPECT_TRUE(allowsQuoted("host/cocoa/QXText.mm", "sdk/cocoa/QXText.h"));
+    EXPECT_TRUE(allowsQuoted("host/cocoa/Window.mm", "host/front_end/DialogWindow.h"));
+
+    EXPECT_FALSE(allowsQuoted(controller, "host/cocoa/CocoaDialogs.h"));
+    EXPECT_FALSE(allowsQuoted("host/cocoa/Window.mm", "host/document/Document.h"));
+    EXPECT_FALSE(allowsAngled("zoetrix/ui/TurnTableDialog.cpp", "AppKit/AppKit.h"));
+    EXPECT_FALSE(allowsAngled("host/app/Application.cpp", "Foundation/Foundation.h"));
+    EXPECT_FALSE(allowsQuoted("host/app/Application.cpp", "host/cocoa/CocoaDialogs.h"));
+    EXPECT_FALSE(allowsQuoted("sdk/qncore/qncore.h", "sdk/cocoa/QXText.h"));
+    EXPECT_FALSE(
+        allowsQuoted("zoetrix/ui/TurnTableDialog.h", "zoetrix/ui/QXTurnTableDialogController.h"));
+}
+
 TEST(Layers, AFolderWithoutARuleMayIncludeNothing) {
     EXPECT_FALSE(allowsQuoted("attic/A.cpp", "kelmar/KM_Point.h"));
 }

@@ -1,0 +1,11 @@
+#pragma once
+
+#include "sdk/cocoa/QXDialogController.h"
+
+namespace quarn {
+
+/// Puts the texts of a controller's window into the user's language: the title by its
+/// `titleTextId`, labels and buttons by their tags.
+void localizeWindow(QXDialogController* controller);
+
+} // namespace quarn
