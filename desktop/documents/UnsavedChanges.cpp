@@ -1,0 +1,81 @@
+#include "desktop/documents/UnsavedChanges.h"
+
+#include "desktop/Texts.h"
+#include "desktop/documents/StartedLine.h"
+#include "desktop/window/CommandStarter.h"
+#include "host/front_end/DocumentState.h"
+
+#include <QMessageBox>
+#include <QPushButton>
+
+namespace quarn::desktop {
+
+namespace {
+
+bool leavesDocument(const QString& english_name) {
+    return english_name == "New" || english_name == "Open" || english_name == "Exit";
+}
+
+QString nameOf(CQuarnDoc& document) {
+    const std::filesystem::path file = documentFile(document);
+    return file.empty() ? localized(L"the new document", 45250) : qtText(file.filename());
+}
+
+} // namespace
+
+UnsavedChanges::UnsavedChanges(Session& session, CommandStarter& starter, QWidget& window)
+    : QObject(&window), m_session(session), m_starter(starter), m_window(window) {}
+
+bool UnsavedChanges::mayLeave() {
+    const bool was_settled = m_may_exit && m_session.isExitRequested();
+    if (was_settled || !isModified(m_session.document()))
+        return true;
+    switch (askPerson()) {
+    case Choice::save:
+        return save();
+    case Choice::discard:
+        return true;
+    case Choice::stay:
+        break;
+    }
+    return false;
+}
+
+void UnsavedChanges::start(const QString& line) {
+    const QString name = readLine(m_session, line).english_name;
+    if (!m_starter.isRunning() && leavesDocument(name)) {
+        if (!mayLeave())
+            return;
+        m_may_exit = name == "Exit";
+    }
+    m_starter.start(line);
+}
+
+UnsavedChanges::Choice UnsavedChanges::askPerson() {
+    QMessageBox box(QMessageBox::Warning, localized(L"Unsaved changes", 45251),
+                    localized(L"Save the changes to %1?", 45252).arg(nameOf(m_session.document())),
+                    QMessageBox::NoButton, &m_window);
+    box.setObjectName("unsavedChanges");
+    box.setInformativeText(localized(L"Without saving they are lost.", 45253));
+    QPushButton* const save = box.addButton(localized(L"&Save", 45254), QMessageBox::AcceptRole);
+    QPushButton* const discard =
+        box.addButton(localized(L"&Don't save", 45255), QMessageBox::DestructiveRole);
+    QPushButton* const stay = box.addButton(localized(L"Cancel", 45105), QMessageBox::RejectRole);
+    save->setObjectName("saveChanges");
+    discard->setObjectName("discardChanges");
+    stay->setObjectName("keepDocument");
+    box.setDefaultButton(save);
+    box.setEscapeButton(stay);
+    box.exec();
+    if (box.clickedButton() == save)
+        return Choice::save;
+    return box.clickedButton() == discard ? Choice::discard : Choice::stay;
+}
+
+/// A new document's file is asked for by the command; who gives up there stays.
+bool UnsavedChanges::save() {
+    m_starter.start("_Save");
+    return !isModified(m_session.document());
+}
+
+} // namespace quarn::desktop
