@@ -4,6 +4,7 @@
 #include "host/display/MipTexture.h"
 #include "host/document/PlacedMesh.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace quarn {
@@ -120,6 +121,12 @@ void DisplayScene::choosePlaces(const SceneContent& content) {
     const KM_Xform frame_from_world = KM_Xform::Translation(KM_3dPoint::Origin - m_origin);
     for (std::size_t i = 0; i < m_meshes.size(); ++i)
         m_meshes[i].frame_from_mesh = frame_from_world * content.meshes[i].world_from_mesh;
+}
+
+std::size_t DisplayScene::meshOfSurface(std::size_t surface) const {
+    const std::size_t member = m_rays.surfaceMembers()[surface];
+    const auto found = std::ranges::find(m_member_of_mesh, member);
+    return static_cast<std::size_t>(found - m_member_of_mesh.begin());
 }
 
 RaySurface DisplayScene::surfaceOf(const SceneMesh& object, const RayMesh& mesh,

@@ -48,6 +48,8 @@ public:
 
     const RayScene& rays() const { return m_rays; }
     std::span<const MeshObject> meshes() const { return m_meshes; }
+    /// The mesh object that a surface of the ray scene belongs to, as an index in `meshes`.
+    std::size_t meshOfSurface(std::size_t surface) const;
     std::span<const SceneCurve> curves() const { return m_curves; }
     std::span<const ScenePoint> points() const { return m_points; }
     std::span<const KM_Light> lights() const { return m_lights; }

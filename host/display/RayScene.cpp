@@ -131,6 +131,7 @@ void RayScene::build(std::vector<Member> members) {
     m_first_surfaces.clear();
     m_surfaces.clear();
     m_surfaces.reserve(m_members.size()); // geometries point into it
+    m_surface_members.clear();
     m_surface_places.clear();
     m_surface_places.reserve(m_members.size()); // and these into that
     m_places.assign(m_members.size(), {});
@@ -202,6 +203,7 @@ void RayScene::place(std::size_t member, unsigned geometry) {
     m_places[member] = {m_instances.size() - 1, geometry};
     ++m_instances.back().visible_members;
     m_surfaces.push_back(m_members[member].surface);
+    m_surface_members.push_back(static_cast<std::uint32_t>(member));
     if (m_instances.back().placed) {
         m_surface_places.push_back(placeOf(m_members[member].frame_from_mesh));
         m_surfaces.back().place = &m_surface_places.back();

@@ -47,6 +47,8 @@ public:
     std::span<const std::uint32_t> firstSurfaces() const { return m_first_surfaces; }
     /// In the order of surface indices, which is not that of the members.
     std::span<const RaySurface> surfaces() const { return m_surfaces; }
+    /// Of each surface the index of its member in `build`.
+    std::span<const std::uint32_t> surfaceMembers() const { return m_surface_members; }
 
     /// Whether some visible surface is see-through.
     bool hasSeeThrough() const { return m_has_see_through; }
@@ -113,6 +115,7 @@ private:
     std::vector<std::uint32_t> m_first_surfaces;
     std::vector<RaySurface> m_surfaces;
     std::vector<SurfacePlace> m_surface_places;
+    std::vector<std::uint32_t> m_surface_members;
     std::size_t m_build_count = 0;
     bool m_has_see_through = false;
 };
