@@ -1,6 +1,7 @@
 #include "host/app/Application.h"
 #include "host/app/PathText.h"
 #include "host/commands/CommandEnd.h"
+#include "host/commands/FileAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/ObjectNaming.h"
 #include "host/commands/ReplacedObject.h"
@@ -29,7 +30,7 @@ CQuarnCommand::result askName(const ObjectTable& objects, KM_wString& name) {
     return why.empty() ? CQuarnCommand::success : fail(why);
 }
 
-CQuarnCommand::result askFile(const ObjectTable& objects, CurveFileWish& wish) {
+CQuarnCommand::result promptForFile(const ObjectTable& objects, CurveFileWish& wish) {
     CQuarnGetString get;
     get.SetCommandPrompt(QnLocalizeString(L"Curve file", 42314));
     get.AddCommandOption(QnLocalizeCommandOptionName(L"Name", 42300));
@@ -45,6 +46,15 @@ CQuarnCommand::result askFile(const ObjectTable& objects, CurveFileWish& wish) {
     }
     wish.file = pathFromText(get.String());
     return get.CommandResult();
+}
+
+CQuarnCommand::result askFile(const CQuarnCommandContext& context, const ObjectTable& objects,
+                              CurveFileWish& wish) {
+    const FileChoice choice = chooseFile(context, FileUse::import_curve);
+    if (choice.kind == FileChoice::Kind::nobody)
+        return promptForFile(objects, wish);
+    wish.file = choice.file;
+    return choice.kind == FileChoice::Kind::chosen ? CQuarnCommand::success : CQuarnCommand::cancel;
 }
 
 /// The file's name without its extension, where an object can be called so.
@@ -70,7 +80,7 @@ const DocumentObject& put(ObjectTable& objects, const CurveFileWish& wish,
 CQuarnCommand::result runImportCurve(const CQuarnCommandContext& context) {
     ObjectTable& objects = Document::of(context.Document()).objects();
     CurveFileWish wish;
-    const CQuarnCommand::result asked = askFile(objects, wish);
+    const CQuarnCommand::result asked = askFile(context, objects, wish);
     if (asked != CQuarnCommand::success)
         return asked;
     CurveResult curve = readCurveFile(wish.file);

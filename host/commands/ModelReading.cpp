@@ -134,10 +134,15 @@ Result<void> readModel(AskedFile& asked, UpAxis up) {
 
 } // namespace
 
-AskedFile askFileToRead() {
+AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use) {
     AskedFile asked;
     UpAxis up = UpAxis::by_format;
-    asked.result = askFile(asked.file, up);
+    const FileChoice choice = chooseFile(context, use);
+    if (choice.kind == FileChoice::Kind::nobody)
+        asked.result = askFile(asked.file, up);
+    else if (choice.kind == FileChoice::Kind::given_up)
+        asked.result = CQuarnCommand::cancel;
+    asked.file = choice.kind == FileChoice::Kind::chosen ? choice.file : asked.file;
     if (asked.result != CQuarnCommand::success)
         return asked;
     const auto read = isDocumentFile(asked.file) ? readDocument(asked, up) : readModel(asked, up);

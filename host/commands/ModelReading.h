@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/commands/FileAsking.h"
 #include "host/document/file/DocumentContent.h"
 #include "host/import/ModelFile.h"
 #include "sdk/qncore/QnCommand.h"
@@ -21,7 +22,8 @@ struct AskedFile {
 
 /// Asks for a model or document file and reads and checks it whole; no open document is touched.
 /// What was wrong is told already.
-AskedFile askFileToRead();
+/// @param use  what the file is for: to open or to import
+AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use);
 
 /// Adds what was read to a document and tells what it is. Where the document was empty, its views
 /// are fitted, so that the model is seen whatever its units.

@@ -1,5 +1,5 @@
 #include "host/app/Application.h"
-#include "host/app/PathText.h"
+#include "host/commands/FileAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/WordsLeft.h"
 #include "sdk/qncore/QnGet.h"
@@ -46,13 +46,13 @@ CQuarnCommand::result runHelp(const CQuarnCommandContext&) {
     return CQuarnCommand::success;
 }
 
-CQuarnCommand::result runLoadPlugIn(const CQuarnCommandContext&) {
+CQuarnCommand::result runLoadPlugIn(const CQuarnCommandContext& context) {
     Application& application = *Application::current();
-    CQuarnGetString get;
-    get.SetCommandPrompt(QnLocalizeString(L"Plug-in file", 41102));
-    if (get.GetString() != CQuarnGet::string)
-        return get.CommandResult();
-    const std::filesystem::path file = pathFromText(get.String());
+    std::filesystem::path file;
+    const CQuarnCommand::result asked =
+        askFile(context, FileUse::load_plug_in, QnLocalizeString(L"Plug-in file", 41102), file);
+    if (asked != CQuarnCommand::success)
+        return asked;
     const PlugInLoad load = application.plugIns().load(file);
     if (load.ok())
         application.tell("Loaded " + file.filename().string() + ".");

@@ -1,12 +1,13 @@
 #include "host/app/Application.h"
-#include "host/app/PathText.h"
 #include "host/commands/CommandEnd.h"
+#include "host/commands/FileAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/Rendering.h"
 #include "host/display/ImageFile.h"
 #include "host/document/Document.h"
 #include "host/document/SceneChanges.h"
-#include "sdk/qncore/QnGet.h"
+#include "host/front_end/FrontEnd.h"
+#include "sdk/qncore/QnLocalize.h"
 
 #include <utility>
 
@@ -27,6 +28,8 @@ CQuarnCommand::result renderActiveView(Document& document, int samples) {
     if (end.value() == RenderEnd::cancelled)
         return CQuarnCommand::cancel;
     window.picture = std::move(picture);
+    document.frontEnd().renderWindowShown(
+        {window.picture.width, window.picture.height, window.picture.rgba});
     return CQuarnCommand::success;
 }
 
@@ -46,11 +49,11 @@ CQuarnCommand::result runSaveRenderWindowAs(const CQuarnCommandContext& context)
     const RenderWindow& window = Document::of(context.Document()).renderWindow();
     if (!window.isOpen())
         return fail("There is no rendered picture. Make one with Render or RenderPreview first.");
-    CQuarnGetString get;
-    get.SetCommandPrompt(QnLocalizeString(L"Image file", 42201));
-    if (get.GetString() != CQuarnGet::string)
-        return get.CommandResult();
-    const std::filesystem::path file = pathFromText(get.String());
+    std::filesystem::path file;
+    const CQuarnCommand::result asked =
+        askFile(context, FileUse::save_rendering, QnLocalizeString(L"Image file", 42201), file);
+    if (asked != CQuarnCommand::success)
+        return asked;
     const auto written = writeImageFile(file, window.picture);
     if (!written)
         return fail(written.message());
@@ -59,7 +62,9 @@ CQuarnCommand::result runSaveRenderWindowAs(const CQuarnCommandContext& context)
 }
 
 CQuarnCommand::result runCloseRenderWindow(const CQuarnCommandContext& context) {
-    Document::of(context.Document()).renderWindow().close();
+    Document& document = Document::of(context.Document());
+    document.renderWindow().close();
+    document.frontEnd().renderWindowShown({});
     return CQuarnCommand::success;
 }
 

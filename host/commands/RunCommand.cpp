@@ -1,18 +1,19 @@
 #include "host/app/Application.h"
-#include "host/app/PathText.h"
+#include "host/commands/FileAsking.h"
 #include "host/commands/FileOpener.h"
 #include "host/commands/HostCommands.h"
-#include "sdk/qncore/QnGet.h"
+#include "sdk/qncore/QnLocalize.h"
 
 namespace quarn {
 
-CQuarnCommand::result runRun(const CQuarnCommandContext&) {
+CQuarnCommand::result runRun(const CQuarnCommandContext& context) {
     Application& application = *Application::current();
-    CQuarnGetString get;
-    get.SetCommandPrompt(QnLocalizeString(L"File to open", 41103));
-    if (get.GetString() != CQuarnGet::string)
-        return get.CommandResult();
-    const Result<void> opened = openWithDesktop(pathFromText(get.String()), application.frontEnd());
+    std::filesystem::path file;
+    const CQuarnCommand::result asked =
+        askFile(context, FileUse::run, QnLocalizeString(L"File to open", 41103), file);
+    if (asked != CQuarnCommand::success)
+        return asked;
+    const Result<void> opened = openWithDesktop(file, application.frontEnd());
     if (opened)
         return CQuarnCommand::success;
     application.tell(opened.message());

@@ -1,6 +1,7 @@
 #include "host/app/Application.h"
 #include "host/app/PathText.h"
 #include "host/commands/CommandEnd.h"
+#include "host/commands/FileAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/document/Document.h"
 #include "host/document/file/DocumentFile.h"
@@ -18,12 +19,12 @@ struct SaveTarget {
     int version = KM_CURRENT_ARCHIVE_VERSION;
 };
 
-/// The document file that a text names: a name without an ending gets that of documents.
-Result<std::filesystem::path> documentPath(const KM_wString& text) {
-    std::filesystem::path file = pathFromText(text.View());
+/// The document file that a path names: a name without an ending gets that of documents.
+Result<std::filesystem::path> documentPath(std::filesystem::path file) {
     const std::filesystem::path name = file.filename();
     if (name.empty() || name == "." || name == "..")
-        return Error{"\"" + text.ToUtf8() + "\" names a folder. Give the name of a file."};
+        return Error{"\"" + textFromPath(file).ToUtf8() +
+                     "\" names a folder. Give the name of a file."};
     if (!file.has_extension())
         file += DOCUMENT_EXTENSION;
     if (!isDocumentFile(file))
@@ -55,8 +56,16 @@ CQuarnGet::result askFile(CQuarnGetString& get, const std::filesystem::path& off
     return get.GetString();
 }
 
+void setFile(SaveTarget& target, const std::filesystem::path& file) {
+    const auto path = documentPath(file);
+    if (path)
+        target.file = path.value();
+    else
+        target.result = fail(path.message());
+}
+
 /// @param offered  the file that Enter takes; empty for none
-SaveTarget askTarget(const std::filesystem::path& offered) {
+SaveTarget promptForTarget(const std::filesystem::path& offered) {
     SaveTarget target;
     for (;;) {
         CQuarnGetString get;
@@ -67,13 +76,23 @@ SaveTarget askTarget(const std::filesystem::path& offered) {
             return target;
         if (answer != CQuarnGet::string)
             continue;
-        const auto path = documentPath(get.String());
-        if (path)
-            target.file = path.value();
-        else
-            target.result = fail(path.message());
+        setFile(target, pathFromText(get.String()));
         return target;
     }
+}
+
+/// @param offered  the file that is there already; empty for none
+SaveTarget askTarget(const CQuarnCommandContext& context, FileUse use,
+                     const std::filesystem::path& offered) {
+    const FileChoice choice = chooseFile(context, use, offered);
+    if (choice.kind == FileChoice::Kind::nobody)
+        return promptForTarget(offered);
+    SaveTarget target;
+    if (choice.kind == FileChoice::Kind::given_up)
+        target.result = CQuarnCommand::cancel;
+    else
+        setFile(target, choice.file);
+    return target;
 }
 
 CQuarnCommand::result save(Document& document, const SaveTarget& target, bool only_selected) {
@@ -108,7 +127,7 @@ bool isFileOf(const Document& document, const std::filesystem::path& file) {
 CQuarnCommand::result runSave(const CQuarnCommandContext& context) {
     Document& document = Document::of(context.Document());
     if (document.file().empty())
-        return saveWhole(document, askTarget(document.file()));
+        return saveWhole(document, askTarget(context, FileUse::save, {}));
     SaveTarget target;
     target.file = document.file();
     return saveWhole(document, target);
@@ -116,14 +135,14 @@ CQuarnCommand::result runSave(const CQuarnCommandContext& context) {
 
 CQuarnCommand::result runSaveAs(const CQuarnCommandContext& context) {
     Document& document = Document::of(context.Document());
-    return saveWhole(document, askTarget(document.file()));
+    return saveWhole(document, askTarget(context, FileUse::save, document.file()));
 }
 
 CQuarnCommand::result runSaveSelected(const CQuarnCommandContext& context) {
     Document& document = Document::of(context.Document());
     if (document.objects().selectedCount() == 0)
         return fail("Nothing is selected. Select what is to be saved with Select first.");
-    const SaveTarget target = askTarget({});
+    const SaveTarget target = askTarget(context, FileUse::save_selected, {});
     if (target.result != CQuarnCommand::success)
         return target.result;
     if (isFileOf(document, target.file))

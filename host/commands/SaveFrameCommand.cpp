@@ -2,6 +2,7 @@
 #include "host/app/Border.h"
 #include "host/app/PathText.h"
 #include "host/commands/CommandEnd.h"
+#include "host/commands/FileAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/PictureSizePrompt.h"
 #include "host/commands/Rendering.h"
@@ -116,12 +117,11 @@ Result<void> checkImageFile(const std::filesystem::path& file) {
     return {};
 }
 
-CQuarnCommand::result askImageFile(FrameWish& wish) {
-    CQuarnGetString get;
-    get.SetCommandPrompt(QnLocalizeString(L"Image file", 42201));
-    if (get.GetString() != CQuarnGet::string)
-        return get.CommandResult();
-    wish.file = pathFromText(get.String());
+CQuarnCommand::result askImageFile(const CQuarnCommandContext& context, FrameWish& wish) {
+    const CQuarnCommand::result asked =
+        askFile(context, FileUse::save_frame, QnLocalizeString(L"Image file", 42201), wish.file);
+    if (asked != CQuarnCommand::success)
+        return asked;
     const auto checked = checkImageFile(wish.file);
     return checked ? CQuarnCommand::success : fail(checked.message());
 }
@@ -130,13 +130,14 @@ bool isRendered(const KM_3dmAnimationProperties& record) {
     return record.RenderFull() || record.RenderPreview();
 }
 
-CQuarnCommand::result askWish(const Animation& animation, FrameWish& wish) {
+CQuarnCommand::result askWish(const CQuarnCommandContext& context, const Animation& animation,
+                              FrameWish& wish) {
     const RenderSettings& settings = animation.view->document().renderWindow().settings;
     const bool rendered = isRendered(*animation.record);
     wish.width_px = rendered ? settings.width_px : animation.view->frameWidth();
     wish.height_px = rendered ? settings.height_px : animation.view->frameHeight();
     const CQuarnCommand::result asked = askFrame(*animation.record, wish);
-    return asked == CQuarnCommand::success ? askImageFile(wish) : asked;
+    return asked == CQuarnCommand::success ? askImageFile(context, wish) : asked;
 }
 
 Result<FrameScene> sunAtFrame(const Animation& animation, int frame) {
@@ -246,7 +247,7 @@ CQuarnCommand::result runSaveFrame(const CQuarnCommandContext& context) {
     if (!animation)
         return fail(animation.message());
     FrameWish wish;
-    const CQuarnCommand::result asked = askWish(animation.value(), wish);
+    const CQuarnCommand::result asked = askWish(context, animation.value(), wish);
     return asked == CQuarnCommand::success ? saveFrame(animation.value(), wish) : asked;
 }
 

@@ -64,6 +64,8 @@ void Document::close() {
     m_lights.close();
     m_sun.close();
     m_scene.reset();
+    if (m_render_window.isOpen())
+        frontEnd().renderWindowShown({});
     m_render_window.close();
     m_objects = ObjectTable();
     m_named_views.clear();

@@ -62,8 +62,8 @@ TEST_F(DocumentStateTest, WhatDoesNotBecomeTheDocumentsFileLeavesItModified) {
 }
 
 TEST_F(DocumentStateTest, AnOpenedDocumentIsUnmodifiedAndSoIsAModelThatIsLookedAt) {
-    runAll({L"Point 1,2,3", L"SaveAs " + path("a.quarn"), L"Point 4,5,6",
-            L"Open " + path("a.quarn")});
+    runAll(
+        {L"Point 1,2,3", L"SaveAs " + path("a.quarn"), L"Point 4,5,6", L"Open " + path("a.quarn")});
     EXPECT_FALSE(modified());
     EXPECT_EQ(objectCount(session.document()), 1);
     std::ofstream(folder.path() / "a.obj") << "v 0 0 0\nv 1 0 0\nv 0 1 0\nf 1 2 3\n";

@@ -1,0 +1,41 @@
+#pragma once
+
+#include "host/front_end/FrontEndChoices.h"
+#include "sdk/qncore/QnCommand.h"
+
+#include <filesystem>
+#include <vector>
+
+namespace quarn {
+
+// Commands that a person starts in a window ask for files with a chooser, where the line gives no
+// file and there is a chooser; all others at their prompts.
+
+/// What a command wants a file for: the title of its chooser.
+enum class FileUse {
+    open,
+    import,
+    save,
+    save_selected,
+    save_frame,
+    save_rendering,
+    import_curve,
+    load_plug_in,
+    run,
+};
+
+/// Lets a person choose a file.
+/// @param offered  for a file to save: the one that is there already; empty for none
+/// @return nobody where the command has to ask at its prompt: it is a script's, its line has words
+///         left, or there is no chooser
+FileChoice chooseFile(const CQuarnCommandContext& context, FileUse use,
+                      const std::filesystem::path& offered = {});
+
+/// Asks for a file, with a chooser or at a prompt.
+/// @param prompt  in the user's language
+/// @param file    receives the file after success
+/// @return cancel when the chooser was closed; else as the prompt ended
+CQuarnCommand::result askFile(const CQuarnCommandContext& context, FileUse use,
+                              const wchar_t* prompt, std::filesystem::path& file);
+
+} // namespace quarn
