@@ -8,21 +8,37 @@ namespace quarn::desktop {
 CommandStarter::CommandStarter(Session& session, DesktopFrontEnd& front_end, QObject* parent)
     : QObject(parent), m_session(session), m_front_end(front_end) {}
 
+/// Between two lines of a script no command runs.
 bool CommandStarter::isRunning() const {
-    return m_session.isCommandRunning();
+    return m_is_started || m_session.isCommandRunning();
 }
 
 void CommandStarter::start(const QString& line) {
-    if (line.trimmed().isEmpty())
+    const QString trimmed = line.trimmed();
+    if (trimmed.isEmpty())
         return;
+    runBetween(trimmed, [&] { return m_session.runCommand(wideText(trimmed).View(), true); });
+}
+
+void CommandStarter::startScript(const QString& file) {
+    runBetween(file, [&] {
+        return m_session.runScriptFile(nativePath(file)) ? CQuarnCommand::success
+                                                         : CQuarnCommand::failure;
+    });
+}
+
+void CommandStarter::runBetween(const QString& line,
+                                const std::function<CQuarnCommand::result()>& run) {
     if (isRunning()) {
         refuse();
         return;
     }
     m_front_end.commandStarts();
-    m_line = line.trimmed();
+    m_line = line;
+    m_is_started = true;
     emit started(m_line);
-    const CQuarnCommand::result result = m_session.runCommand(wideText(m_line).View(), true);
+    const CQuarnCommand::result result = run();
+    m_is_started = false;
     m_line.clear();
     m_front_end.commandEnded();
     emit ended(result);

@@ -4,6 +4,8 @@
 
 #include <QObject>
 
+#include <functional>
+
 namespace quarn::desktop {
 
 class DesktopFrontEnd;
@@ -25,6 +27,9 @@ public slots:
     /// Runs a command line now, as typed by a person who may be shown dialogs; returns when the
     /// command has ended. While another one runs nothing is started and the person is told.
     void start(const QString& line);
+    /// Runs the command lines of a script file one after the other, without dialogs; to whoever
+    /// watches, as one command.
+    void startScript(const QString& file);
     /// Asks the running command to end: until the outermost command has ended, the front end
     /// counts as interrupted and Escape as held down. Without one it does nothing.
     void stop();
@@ -38,10 +43,12 @@ signals:
 
 private:
     void refuse();
+    void runBetween(const QString& line, const std::function<CQuarnCommand::result()>& run);
 
     Session& m_session;
     DesktopFrontEnd& m_front_end;
     QString m_line;
+    bool m_is_started = false;
 };
 
 } // namespace quarn::desktop

@@ -1,0 +1,12 @@
+#include "desktop/views/ViewContext.h"
+
+#include "desktop/command_line/CommandPane.h"
+#include "desktop/window/CommandStarter.h"
+
+namespace quarn::desktop {
+
+bool ViewContext::areViewsFree() const {
+    return !session.isCommandRunning() || pane.isAsking();
+}
+
+} // namespace quarn::desktop

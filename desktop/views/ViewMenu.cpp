@@ -1,0 +1,113 @@
+#include "desktop/views/ViewMenu.h"
+
+#include "desktop/Texts.h"
+#include "desktop/views/OpenViews.h"
+#include "desktop/views/ViewWidget.h"
+#include "desktop/window/CommandStarter.h"
+#include "host/front_end/ViewFrame.h"
+
+#include <QActionGroup>
+
+namespace quarn::desktop {
+
+namespace {
+
+struct Direction {
+    const wchar_t* name;
+    int text_id;
+};
+constexpr Direction DIRECTIONS[] = {
+    {L"Top", 45010}, {L"Front", 45011}, {L"Right", 45012}, {L"Perspective", 45013}};
+
+constexpr QSize FRAME_SIZES[] = {{1280, 720}, {1920, 1080}, {3840, 2160}};
+
+/// A mode's English name as an option: those hold letters and digits only.
+QString optionOf(const CDisplayPipelineAttributes& mode) {
+    QString name = qtText(mode.EnglishName());
+    name.removeIf([](QChar character) { return QString("_ -,").contains(character); });
+    return name;
+}
+
+QAction& addChoice(QMenu& menu, QActionGroup& group, const QString& text, bool is_checked) {
+    QAction& action = *menu.addAction(text);
+    action.setCheckable(true);
+    action.setChecked(is_checked);
+    group.addAction(&action);
+    return action;
+}
+
+} // namespace
+
+ViewMenu::ViewMenu(ViewContext context, ViewWidget& widget)
+    : QObject(&widget), m_context(context), m_widget(widget) {
+    connect(&widget.menu(), &QMenu::aboutToShow, this, &ViewMenu::fill);
+}
+
+void ViewMenu::fill() {
+    QMenu& menu = m_widget.menu();
+    menu.clear();
+    addModes(menu);
+    menu.addSeparator();
+    connect(menu.addAction(localized(L"Fit to model", 45014)), &QAction::triggered, this,
+            [this] { run("_-FitView _Enter"); });
+    addDirections(*menu.addMenu(localized(L"Look from", 45015)));
+    menu.addSeparator();
+    addFrameSizes(*menu.addMenu(localized(L"Frame size", 45016)));
+    menu.addSeparator();
+    connect(menu.addAction(m_widget.maximizeButton().toolTip()), &QAction::triggered, &m_widget,
+            &ViewWidget::maximizeClicked);
+    const bool is_free = !m_context.session.isCommandRunning();
+    for (QAction* const action : menu.actions())
+        action->setEnabled(is_free);
+    menu.actions().last()->setEnabled(true);
+}
+
+void ViewMenu::addModes(QMenu& menu) {
+    CQuarnView* const view = findView(m_context.session.document(), m_widget.viewName());
+    const CDisplayPipelineAttributes* const current = view ? view->DisplayAttributes() : nullptr;
+    KM_SimpleArray<const CDisplayPipelineAttributes*> modes;
+    CQuarnDisplayAttrsMgr::GetDisplayAttrsList(modes);
+    auto* const group = new QActionGroup(&menu);
+    for (int i = 0; i < modes.Count(); ++i) {
+        const CDisplayPipelineAttributes& mode = *modes[i];
+        QAction& action = addChoice(menu, *group, qtText(mode.LocalName()),
+                                    current && current->Id() == mode.Id());
+        connect(&action, &QAction::triggered, this,
+                [this, option = optionOf(mode)] { run("_-DisplayMode _" + option); });
+    }
+}
+
+void ViewMenu::addDirections(QMenu& menu) {
+    for (const Direction& direction : DIRECTIONS)
+        connect(menu.addAction(localized(direction.name, direction.text_id)), &QAction::triggered,
+                this, [this, name = qtText(direction.name)] { run("_-StandardView _" + name); });
+}
+
+void ViewMenu::addFrameSizes(QMenu& menu) {
+    auto* const group = new QActionGroup(&menu);
+    const std::optional<QSize> fixed = m_widget.fixedFrame();
+    connect(&addChoice(menu, *group, localized(L"As in the window", 45017), !fixed),
+            &QAction::triggered, this, &ViewMenu::frameFreed);
+    QList<QSize> sizes(std::begin(FRAME_SIZES), std::end(FRAME_SIZES));
+    if (fixed && !sizes.contains(*fixed))
+        sizes.append(*fixed);
+    for (const QSize& size : sizes) {
+        const QString text = QString("%1 × %2").arg(size.width()).arg(size.height());
+        connect(&addChoice(menu, *group, text, fixed == size), &QAction::triggered, this,
+                [this, size] {
+                    run(QString("_-ViewportSize %1 %2").arg(size.width()).arg(size.height()));
+                });
+    }
+}
+
+/// Commands work in the active view.
+void ViewMenu::run(const QString& line) {
+    if (m_context.session.isCommandRunning())
+        return;
+    if (CQuarnView* const view = findView(m_context.session.document(), m_widget.viewName())) {
+        activateView(*view);
+        m_context.starter.start(line);
+    }
+}
+
+} // namespace quarn::desktop

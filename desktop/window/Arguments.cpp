@@ -1,0 +1,58 @@
+#include "desktop/window/Arguments.h"
+
+#include <QCommandLineParser>
+
+namespace quarn::desktop {
+
+namespace {
+
+bool isSet(const char* variable) {
+    return !qEnvironmentVariableIsEmpty(variable);
+}
+
+} // namespace
+
+Arguments readArguments(const QStringList& arguments) {
+    QCommandLineParser parser;
+    parser.setApplicationDescription(
+        "The window of Quarn: shows models, and sets up and records their animations.");
+    parser.addPositionalArgument("file", "A model or a document to open.", "[file]");
+    const QCommandLineOption help({"h", "help"}, "Shows this help.");
+    const QCommandLineOption version("version", "Shows the version.");
+    const QCommandLineOption language("language",
+                                      "The language of the window: en, de, es, fr, ja "
+                                      "or zh. Default: the environment's.",
+                                      "code");
+    const QCommandLineOption script("run-script", "Runs the command lines of a file in the window.",
+                                    "script");
+    const QCommandLineOption exit("exit", "Ends when the script has ended.");
+    parser.addOptions({help, version, language, script, exit});
+
+    Arguments read;
+    const bool is_good = parser.parse(arguments);
+    if (!is_good)
+        read.mistake = parser.errorText();
+    else if (parser.positionalArguments().size() > 1)
+        read.mistake = "Only one file can be opened at the start.";
+    else if (parser.isSet(help))
+        read.answer = parser.helpText();
+    else if (parser.isSet(version))
+        read.answer = "quarn-desktop " QUARN_VERSION "\n";
+    read.file = parser.positionalArguments().value(0);
+    read.language = parser.value(language);
+    read.script = parser.value(script);
+    read.wants_exit = parser.isSet(exit);
+    return read;
+}
+
+QString whyNoWindow() {
+#ifdef Q_OS_LINUX
+    const bool has_display = isSet("DISPLAY") || isSet("WAYLAND_DISPLAY");
+    if (!has_display && !isSet("QT_QPA_PLATFORM"))
+        return "There is no display to open a window on: neither DISPLAY nor WAYLAND_DISPLAY is "
+               "set. The program quarn does the same without one.";
+#endif
+    return {};
+}
+
+} // namespace quarn::desktop

@@ -1,0 +1,77 @@
+#pragma once
+
+#include "desktop/front_end/DesktopFrontEnd.h"
+#include "host/front_end/Session.h"
+
+#include <QMainWindow>
+
+class QDockWidget;
+
+namespace quarn::desktop {
+
+class AnimationBar;
+class CommandMenus;
+class CommandPane;
+class CommandStarter;
+class FileDrop;
+class RecentFiles;
+class RenderPictureWindow;
+class UnsavedChanges;
+class ViewArea;
+class WindowClosing;
+
+/// The window of the program: menus, the views of the document, the animation below them, and the
+/// command line. It puts the parts together and knows nothing that they know.
+class MainWindow final : public QMainWindow {
+    Q_OBJECT
+
+public:
+    /// Becomes the window of the front end. Both must outlive this.
+    MainWindow(Session& session, DesktopFrontEnd& front_end);
+    ~MainWindow() override;
+
+    CommandStarter& starter() { return *m_starter; }
+    CommandPane& commandPane() { return *m_pane; }
+    ViewArea& views() { return *m_views; }
+    AnimationBar& animationBar() { return *m_animation; }
+    CommandMenus& menus() { return *m_menus; }
+
+    /// Runs the command lines of a script file, as a program without a person does, while the
+    /// window shows what happens.
+    /// @param wants_exit  closes the window afterwards, without a question
+    void runScript(const QString& file, bool wants_exit);
+    /// Size, place and borders of the last run (QSettings); a good size where there was none.
+    void restoreLayout();
+
+protected:
+    void closeEvent(QCloseEvent* event) override;
+
+private:
+    void layOut();
+    void buildMenus();
+    void connectParts();
+    FrontEndParts parts();
+    void commandEnded();
+    void showRenderedPicture(const ShownPicture& picture);
+    void showRenderProgress(double share);
+    RenderPictureWindow& renderWindow();
+    void showTitle();
+    void saveLayout();
+    void tell(const QString& message);
+
+    Session& m_session;
+    DesktopFrontEnd& m_front_end;
+    CommandStarter* m_starter;
+    CommandPane* m_pane;
+    ViewArea* m_views;
+    AnimationBar* m_animation;
+    CommandMenus* m_menus;
+    RecentFiles* m_recent_files;
+    UnsavedChanges* m_changes;
+    WindowClosing* m_closing;
+    FileDrop* m_file_drop;
+    RenderPictureWindow* m_render_window = nullptr;
+    QDockWidget* m_command_dock = nullptr;
+};
+
+} // namespace quarn::desktop

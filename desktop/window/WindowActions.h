@@ -1,0 +1,13 @@
+#pragma once
+
+class QDockWidget;
+
+namespace quarn::desktop {
+
+class MainWindow;
+
+/// Adds to the menus what changes the window alone and is no command: one view or all of them, and
+/// the command line.
+void addWindowActions(MainWindow& window, QDockWidget& command_dock);
+
+} // namespace quarn::desktop
