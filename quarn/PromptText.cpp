@@ -1,6 +1,7 @@
 #include "quarn/PromptText.h"
 
 #include "host/front_end/Completion.h"
+#include "quarn/TextWidth.h"
 
 #include <algorithm>
 
@@ -36,18 +37,19 @@ std::wstring promptText(const Question& question) {
 
 std::wstring wrappedPrompt(const std::wstring& prompt, std::size_t width) {
     const std::size_t room = width > 2 * ROOM_TO_TYPE ? width - ROOM_TO_TYPE : width;
-    if (prompt.size() <= room)
+    if (textWidth(prompt) <= room)
         return prompt;
     std::wstring wrapped;
     std::size_t column = 0;
     for (std::size_t begin = 0; begin < prompt.size();) {
         const std::size_t end = std::min(prompt.find(L' ', begin), prompt.size() - 1) + 1;
-        if (column > 0 && column + end - begin > room) {
+        const std::wstring_view word = std::wstring_view(prompt).substr(begin, end - begin);
+        if (column > 0 && column + textWidth(word) > room) {
             wrapped += INDENT;
             column = INDENT.size() - 1;
         }
-        wrapped += prompt.substr(begin, end - begin);
-        column += end - begin;
+        wrapped += word;
+        column += textWidth(word);
         begin = end;
     }
     return wrapped;

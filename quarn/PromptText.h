@@ -12,7 +12,7 @@ namespace quarn::program {
 std::wstring promptText(const Question& question);
 
 /// Breaks a prompt between its words into lines that leave room to type behind the last.
-/// @param width  characters of a line
+/// @param width  columns of a line, of which a wide character takes two
 std::wstring wrappedPrompt(const std::wstring& prompt, std::size_t width);
 
 } // namespace quarn::program

@@ -1,5 +1,6 @@
 #include "quarn/Columns.h"
 #include "quarn/PromptText.h"
+#include "quarn/TextWidth.h"
 
 #include <gtest/gtest.h>
 
@@ -8,6 +9,8 @@ namespace {
 
 using program::inColumns;
 using program::promptText;
+using program::textWidth;
+using program::wrappedPrompt;
 
 Question questionOf(Question::Kind kind) {
     Question question;
@@ -35,6 +38,31 @@ TEST(Columns, GoDownFirstAndFillTheWidth) {
     EXPECT_EQ(inColumns({L"a", L"bbb", L"c"}, 12), "a    c\nbbb\n");
     EXPECT_EQ(inColumns({L"größe", L"b"}, 1), "größe\nb\n");
     EXPECT_EQ(inColumns({}, 80), "");
+}
+
+TEST(TextWidth, EastAsianCharactersTakeTwoColumnsAndCombiningMarksNone) {
+    EXPECT_EQ(textWidth(L""), 0U);
+    EXPECT_EQ(textWidth(L"größe … “a”"), 11U);
+    EXPECT_EQ(textWidth(L"线框"), 4U);
+    EXPECT_EQ(textWidth(L"ワイヤー（Y軸）、"), 17U); // eight wide and one narrow
+    EXPECT_EQ(textWidth(L"ﾜｲﾔ"), 3U);                // halfwidth forms
+    EXPECT_EQ(textWidth(L"한글"), 4U);
+    EXPECT_EQ(textWidth(L"o\u0308"), 1U);
+    EXPECT_EQ(textWidth(L"\U00020000"), 2U);
+}
+
+TEST(Columns, WideNamesStandUnderEachOther) {
+    // Two columns of 6 and a gap of 2 make 14.
+    EXPECT_EQ(inColumns({L"线框", L"abc", L"半透明", L"d"}, 14), "线框    半透明\nabc     d\n");
+    EXPECT_EQ(inColumns({L"线框", L"abc", L"半透明"}, 13), "线框\nabc\n半透明\n");
+}
+
+TEST(PromptText, WideWordsBreakWhereTheirColumnsDo) {
+    // 60 columns leave 36 for the prompt: three of these words take 30, and four would take 40.
+    const std::wstring word = L"线框线框线"; // ten columns
+    const std::wstring prompt = word + L" " + word + L" " + word + L" " + word;
+    EXPECT_EQ(wrappedPrompt(prompt, 60), word + L" " + word + L" " + word + L" \n  " + word);
+    EXPECT_EQ(wrappedPrompt(word + L" " + word, 60), word + L" " + word);
 }
 
 } // namespace
