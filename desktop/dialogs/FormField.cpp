@@ -57,9 +57,14 @@ QDateEdit* makeDate(QWidget* parent) {
     return field;
 }
 
+/// The language's own order of hours and minutes; some have seconds in it.
+QString timeFormat() {
+    return QLocale().timeFormat(QLocale::ShortFormat).remove(":ss").remove(".ss");
+}
+
 QTimeEdit* makeTime(QWidget* parent) {
     auto* const field = new QTimeEdit(parent);
-    field->setDisplayFormat(QLocale().timeFormat(QLocale::ShortFormat));
+    field->setDisplayFormat(timeFormat());
     return field;
 }
 
@@ -104,8 +109,8 @@ COleDateTime withTime(const QTime& time, const COleDateTime& former) {
 
 /// Seconds that are there must be seen.
 void showTime(QTimeEdit& field, const QTime& time) {
-    QString format = QLocale().timeFormat(QLocale::ShortFormat);
-    if (time.second() != 0 && !format.contains("ss"))
+    QString format = timeFormat();
+    if (time.second() != 0)
         format.replace("mm", "mm:ss");
     field.setDisplayFormat(format);
     field.setTime(time);

@@ -60,8 +60,11 @@ QStringList withMnemonics(const QStringList& labels, QString taken) {
 }
 
 QString withoutMnemonic(QString label) {
-    for (qsizetype at = label.indexOf('&'); at >= 0; at = label.indexOf('&', at + 1))
-        label.remove(at, 1);
+    for (qsizetype at = label.indexOf('&'); at >= 0; at = label.indexOf('&', at + 1)) {
+        const bool marks = at + 1 < label.size() && !label[at + 1].isSpace();
+        if (marks)
+            label.remove(at, 1);
+    }
     return label;
 }
 
