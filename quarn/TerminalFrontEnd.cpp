@@ -2,6 +2,7 @@
 
 #include "quarn/Interruption.h"
 #include "quarn/PromptText.h"
+#include "quarn/TypedPlace.h"
 #include "sdk/qncore/QnPlatform.h"
 
 namespace quarn::program {
@@ -55,6 +56,24 @@ TerminalFrontEnd::chooseFolder(std::wstring_view title, std::wstring_view,
     if (answer.kind != Answer::Kind::text)
         return std::nullopt;
     return answer.text.IsEmpty() ? start_folder : std::filesystem::path(answer.text.ToUtf8());
+}
+
+std::optional<Place> TerminalFrontEnd::chooseLocation(std::wstring_view title, const Place& start) {
+    Question question;
+    question.kind = Question::Kind::string;
+    question.prompt = KM_wString(title) + L" (city, or latitude and longitude)";
+    question.default_answer = KM_wString(std::wstring_view(textFromPlace(start)));
+    for (;;) {
+        const Answer answer = ask(question);
+        if (answer.kind != Answer::Kind::text)
+            return std::nullopt;
+        if (answer.text.IsEmpty())
+            return start;
+        const auto typed = placeFromText(answer.text.View());
+        if (const Place* const place = std::get_if<Place>(&typed))
+            return *place;
+        print(std::get<std::wstring>(typed) + L"\n");
+    }
 }
 
 /// A person who wants an end of it need not wait.

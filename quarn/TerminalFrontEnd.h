@@ -19,6 +19,8 @@ public:
     std::optional<std::filesystem::path>
     chooseFolder(std::wstring_view title, std::wstring_view message,
                  const std::filesystem::path& start_folder) override;
+    /// Asks for a city, or for a latitude and a longitude, until it is one or the person gives up.
+    std::optional<Place> chooseLocation(std::wstring_view title, const Place& start) override;
     void pumpEvents(unsigned milliseconds) override;
     bool isKeyDown(int virtual_key) override;
 
