@@ -1,6 +1,7 @@
 #include "tests/locale/SourceTexts.h"
 
 #include "tests/locale/SourceTokens.h"
+#include "tests/locale/TemplateTexts.h"
 
 #include <algorithm>
 #include <fstream>
@@ -74,6 +75,10 @@ bool isSource(const std::filesystem::path& file) {
     return extension == ".cpp" || extension == ".h" || extension == ".mm";
 }
 
+bool isTemplate(const std::filesystem::path& file) {
+    return file.filename().string().ends_with(".dialog.json");
+}
+
 } // namespace
 
 std::vector<TextUse> textUses(std::string_view source, const std::filesystem::path& file) {
@@ -94,11 +99,13 @@ std::vector<TextUse> textUses(std::string_view source, const std::filesystem::pa
 std::vector<TextUse> textUsesBelow(const std::filesystem::path& folder) {
     std::vector<TextUse> uses;
     for (const auto& entry : std::filesystem::recursive_directory_iterator(folder)) {
-        if (!isSource(entry.path()))
+        if (!isSource(entry.path()) && !isTemplate(entry.path()))
             continue;
         std::ifstream stream(entry.path(), std::ios::binary);
         const std::string source{std::istreambuf_iterator<char>(stream), {}};
-        std::ranges::move(textUses(source, entry.path()), std::back_inserter(uses));
+        std::ranges::move(isSource(entry.path()) ? textUses(source, entry.path())
+                                                 : templateTextUses(source, entry.path()),
+                          std::back_inserter(uses));
     }
     return uses;
 }

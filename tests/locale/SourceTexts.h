@@ -27,7 +27,7 @@ struct TextUse {
 /// Numbers of texts have five digits.
 std::vector<TextUse> textUses(std::string_view source, const std::filesystem::path& file);
 
-/// Those of all sources (.cpp, .h, .mm) below a folder.
+/// Those of all sources (.cpp, .h, .mm) and dialog templates below a folder.
 std::vector<TextUse> textUsesBelow(const std::filesystem::path& folder);
 
 } // namespace locale_rules
