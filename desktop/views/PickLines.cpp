@@ -2,26 +2,35 @@
 
 #include "desktop/Texts.h"
 
+#include <algorithm>
+
 namespace quarn::desktop {
 
 namespace {
 
-/// The name where it finds this very object, as a person would type it; else the id.
-QString wordFor(const CQuarnDoc& document, const PickedObject& picked) {
-    const CQuarnObject* const named = document.FindObjectByName(picked.name);
-    const bool finds_it = named && named->Id() == picked.id;
-    if (finds_it && picked.name.Find(L'"') < 0)
-        return '"' + qtText(picked.name) + '"';
-    return qtText(KM_UuidToString(picked.id));
-}
+constexpr const char* DRAWING_COMMANDS[] = {"Circle",   "Line",          "Point",
+                                            "Polyline", "SplineThrough", "Spline"};
 
 } // namespace
 
+KM_wString objectWord(const CQuarnDoc& document, const PickedObject& picked) {
+    const CQuarnObject* const named = document.FindObjectByName(picked.name);
+    const bool finds_it = named && named->Id() == picked.id;
+    return finds_it ? picked.name : KM_UuidToString(picked.id);
+}
+
+bool asksForPoints(const QString& english_name) {
+    return std::ranges::find(DRAWING_COMMANDS, english_name) != std::end(DRAWING_COMMANDS);
+}
+
+/// No word of a line can hold a double quote.
 QString selectLine(const CQuarnDoc& document, const std::optional<PickedObject>& picked,
                    bool adds) {
     if (!picked)
         return adds ? QString() : QString("_-Select _None");
-    return (adds ? "_-Select " : "_-Select _None ") + wordFor(document, *picked);
+    const QString name = qtText(objectWord(document, *picked));
+    const QString word = name.contains('"') ? qtText(KM_UuidToString(picked->id)) : name;
+    return QString(adds ? "_-Select \"%1\"" : "_-Select _None \"%1\"").arg(word);
 }
 
 KM_wString pointText(const KM_3dPoint& point) {

@@ -44,7 +44,7 @@ void ViewArea::showPicture(CQuarnView& view, const ShownPicture& picture) {
     if (view.Document().RuntimeSerialNumber() != m_document_number)
         return;
     const QString name = qtText(view.MainViewport().Name());
-    if (m_context.session.isCommandRunning())
+    if (m_context.session.isCommandRunning() && !m_drawing.isDrawing())
         m_shown_by_command.append(name);
     if (ViewWidget* const shown = widget(name))
         shown->setPicture(picture);

@@ -33,6 +33,8 @@ public:
     void fitFrames();
     /// Something else drew the view: nothing is left to do.
     void forget(const QString& view_name);
+    /// Whether it draws a view now; else who draws is a command.
+    bool isDrawing() const { return m_is_drawing; }
     /// Draws what is wanted now instead of in the next turn.
     void drawWanted();
 

@@ -9,7 +9,7 @@ namespace quarn::desktop {
 
 namespace {
 
-constexpr int BORDER = 2; // of the active view
+constexpr double ACTIVE_BORDER = 2.0;
 constexpr int NAME_MARGIN = 7;
 constexpr QRgb BEHIND_PICTURE = qRgb(52, 54, 58);
 
@@ -144,11 +144,19 @@ void ViewWidget::paintEvent(QPaintEvent*) {
         painter.drawText(rect().adjusted(20, 20, -20, -20), Qt::AlignCenter | Qt::TextWordWrap,
                          m_hint);
     }
-    if (!m_is_active)
-        return;
-    painter.setPen(QPen(palette().color(QPalette::Highlight), BORDER));
-    painter.drawRect(
-        QRectF(rect()).adjusted(BORDER / 2.0, BORDER / 2.0, -BORDER / 2.0, -BORDER / 2.0));
+    paintBorder(painter);
+}
+
+/// Every view has its border, so that pale pictures side by side stay apart.
+void ViewWidget::paintBorder(QPainter& painter) {
+    const double width = m_is_active ? ACTIVE_BORDER : 1.0;
+    const QColor colour =
+        m_is_active ? palette().color(QPalette::Highlight) : QColor(BEHIND_PICTURE);
+    QPen pen(colour, width);
+    pen.setJoinStyle(Qt::MiterJoin);
+    painter.setPen(pen);
+    const double half = width / 2.0;
+    painter.drawRect(QRectF(rect()).adjusted(half, half, -half, -half));
 }
 
 void ViewWidget::resizeEvent(QResizeEvent* event) {

@@ -70,6 +70,7 @@ private:
     QSize frameSize_px() const;
     void styleName();
     void placeButtons();
+    void paintBorder(QPainter& painter);
 
     QString m_view_name;
     QImage m_picture;
