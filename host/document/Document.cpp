@@ -179,7 +179,7 @@ void Document::resizeDueFrames() {
 }
 
 bool Document::isModified() const {
-    return m_saved_state && *m_saved_state != savedStateOf(*this);
+    return m_saved_state && !m_saved_state->covers(savedStateOf(*this));
 }
 
 void Document::markSaved() {

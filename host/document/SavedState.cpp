@@ -32,16 +32,28 @@ SavedState::View stateOf(const ViewState& view) {
             view.frameHeight()};
 }
 
-std::uint32_t crcOf(const KM_3dmAnimationProperties& record) {
+SavedState::Record stateOf(const KM_3dmAnimationProperties& record) {
     KM_3dmAnimationProperties lasting(record);
     lasting.SetCurrentFrame(0);
     lasting.SetLightIndex(-1);
     KM_BinaryArchive archive = KM_BinaryArchive::ForWriting();
     lasting.Write(archive);
-    return KM_Crc32(archive.Bytes());
+    return {KM_Crc32(archive.Bytes()), std::wstring(record.ViewportName().View()),
+            record.DisplayMode()};
 }
 
 } // namespace
+
+bool SavedState::covers(SavedState now) const {
+    if (now.record && now.views.size() == views.size()) {
+        for (std::size_t i = 0; i < views.size(); ++i) {
+            View& view = now.views[i];
+            if (view.name == now.record->view && view.display_mode == now.record->display_mode)
+                view.display_mode = views[i].display_mode;
+        }
+    }
+    return now == *this;
+}
 
 void SavedState::follow(const ViewState& view, int old_width_px, int old_height_px) {
     for (View& each : views) {
@@ -68,13 +80,14 @@ SavedState savedStateOf(const Document& document) {
     return state;
 }
 
-std::optional<std::uint32_t> recordStateOf(const Document& document) {
+std::optional<SavedState::Record> recordStateOf(const Document& document) {
     const IQnZoetrixDynamicAccess* access = Zoetrix_QuarnDynamicAccess();
     if (!access)
         return std::nullopt;
-    const auto crc = acrossBorder(
-        [&]() -> std::uint32_t { return crcOf(access->AnimationProperties(document.face())); });
-    return crc ? std::optional(crc.value()) : std::nullopt;
+    const auto state = acrossBorder([&]() -> SavedState::Record {
+        return stateOf(access->AnimationProperties(document.face()));
+    });
+    return state ? std::optional(state.value()) : std::nullopt;
 }
 
 } // namespace quarn

@@ -29,6 +29,16 @@ struct SavedState {
         friend bool operator==(const View&, const View&) = default;
     };
 
+    /// The animation that a plug-in keeps.
+    struct Record {
+        /// A check sequence, without what playing changes: the current frame and the light that
+        /// moves.
+        std::uint32_t crc = 0;
+        std::wstring view;                  ///< that is animated
+        KM_UUID display_mode = KM_nil_uuid; ///< that showing a frame brings into that view
+        friend bool operator==(const Record&, const Record&) = default;
+    };
+
     std::uint64_t object_revision = 0;
     std::uint32_t object_names = 0; ///< a check sequence of all names
     std::vector<KM_UUID> hidden;    ///< objects
@@ -38,12 +48,13 @@ struct SavedState {
     std::map<KM_UUID, MeshEdgeChoice> edges;
     std::vector<View> views;
     std::size_t named_views = 0;
-    /// A check sequence of the animation record, without what playing it changes: the current frame
-    /// and the light that moves. None while no plug-in keeps a record.
-    std::optional<std::uint32_t> record;
+    std::optional<Record> record; ///< none while no plug-in keeps one
 
     friend bool operator==(const SavedState&, const SavedState&) = default;
 
+    /// Whether a document in the state `now` has nothing beyond this state. Where the animated view
+    /// has the animation's display mode, because a frame was shown, that is nothing new.
+    bool covers(SavedState now) const;
     /// Takes over the size of a view's frame where it had the former one.
     void follow(const ViewState& view, int old_width_px, int old_height_px);
 };
@@ -51,6 +62,6 @@ struct SavedState {
 SavedState savedStateOf(const Document& document);
 
 /// The part of the state that a plug-in keeps.
-std::optional<std::uint32_t> recordStateOf(const Document& document);
+std::optional<SavedState::Record> recordStateOf(const Document& document);
 
 } // namespace quarn

@@ -17,10 +17,11 @@ QNCORE_API std::filesystem::path documentFile(CQuarnDoc& document);
 /// an animation plays, a light that a sun study moves.
 ///
 /// These alone do not count, as nobody wants to be asked about them: cameras, which view is active,
-/// what is selected, which frame of the animation was shown last, frame sizes that a window gives
-/// with setFrameSize. A new document, and one that a model file was opened as, is not modified; nor
-/// is one after SaveAs in an older version of the file where it was not before, but that does not
-/// make a modified one unmodified, because such a file may hold less.
+/// what is selected, which frame of the animation was shown last and that its view has the
+/// animation's display mode since, frame sizes that a window gives with setFrameSize. A new
+/// document, and one that a model file was opened as, is not modified; nor is one after SaveAs in
+/// an older version of the file where it was not before, but that does not make a modified one
+/// unmodified, because such a file may hold less.
 ///
 /// Takes some milliseconds for a document of many thousand objects or frames; ask after commands,
 /// not for every picture.

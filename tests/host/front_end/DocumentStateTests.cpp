@@ -141,6 +141,21 @@ TEST_F(DocumentStateTest, TheAnimationCountsButNotWhatPlayingItChanges) {
     EXPECT_TRUE(modified());
 }
 
+TEST_F(DocumentStateTest, TheAnimationsDisplayModeInItsViewIsNoChangeAnywhereElseItIs) {
+    RecordKeeper keeper;
+    keeper.record.SetViewportName(L"Perspective");
+    keeper.record.SetDisplayMode(rendered_mode_id);
+    document().markSaved();
+    document().findView(L"Perspective")->setDisplayMode(rendered_mode_id);
+    EXPECT_FALSE(modified());
+    document().findView(L"Perspective")->setDisplayMode(wireframe_mode_id);
+    EXPECT_TRUE(modified());
+    document().findView(L"Perspective")->setDisplayMode(shaded_mode_id);
+    EXPECT_FALSE(modified());
+    document().findView(L"Top")->setDisplayMode(rendered_mode_id);
+    EXPECT_TRUE(modified());
+}
+
 TEST_F(DocumentStateTest, CamerasActiveViewsSelectionAndAWindowsSizesDoNotCount) {
     const KM_UUID id = document().objects().addPoint(L"P", {1.0, 2.0, 3.0}).id;
     document().markSaved();
