@@ -7,6 +7,7 @@
 #include "desktop/views/ViewWidget.h"
 #include "desktop/window/CommandStarter.h"
 #include "host/front_end/DocumentState.h"
+#include "host/front_end/ViewFrame.h"
 
 #include <QVBoxLayout>
 
@@ -144,12 +145,24 @@ void ViewArea::fitFrames() {
     for (ViewWidget* const widget : std::as_const(m_widgets))
         if (CQuarnView* const view = findView(m_context.session.document(), widget->viewName()))
             m_given_sizes[widget->viewName()] = frameSizeOf(*view);
+    emit frameChanged();
+}
+
+void ViewArea::fillFrameSizes(QMenu& menu) {
+    menu.clear();
+    if (ViewWidget* const active = widget(activeViewName(m_context.session.document())))
+        active->findChild<ViewMenu*>()->addFrameSizes(menu);
+}
+
+QSize ViewArea::activeFrameSize() const {
+    return frameSizeOf(activeView(m_context.session.document()));
 }
 
 void ViewArea::showActive() {
     const QString active = activeViewName(m_context.session.document());
     for (ViewWidget* const widget : std::as_const(m_widgets))
         widget->setActive(widget->viewName() == active);
+    emit frameChanged();
 }
 
 void ViewArea::showHint() {

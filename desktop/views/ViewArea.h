@@ -7,6 +7,7 @@
 #include "sdk/qncore/QnView.h"
 
 #include <QMap>
+#include <QMenu>
 #include <QSize>
 
 namespace quarn::desktop {
@@ -29,6 +30,15 @@ public:
     QList<ViewWidget*> widgets() const { return m_widgets; }
     ViewDrawing& drawing() { return m_drawing; }
     ViewGrid& grid() { return *m_grid; }
+
+    /// Fills a menu with the sizes that the frame of the active view can have.
+    void fillFrameSizes(QMenu& menu);
+    /// The size of the active view's frame, in pixels: that of recorded pictures.
+    QSize activeFrameSize() const;
+
+signals:
+    /// The active view is another one, or its frame has another size.
+    void frameChanged();
 
 public slots:
     /// A command begins: notes which pictures it shows.

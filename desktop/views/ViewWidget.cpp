@@ -11,6 +11,7 @@ namespace {
 
 constexpr double ACTIVE_BORDER = 2.0;
 constexpr int NAME_MARGIN = 7;
+constexpr QRgb BORDER = qRgb(150, 153, 158);
 constexpr QRgb BEHIND_PICTURE = qRgb(52, 54, 58);
 
 /// Readable on any picture, so it does not follow the palette.
@@ -150,8 +151,7 @@ void ViewWidget::paintEvent(QPaintEvent*) {
 /// Every view has its border, so that pale pictures side by side stay apart.
 void ViewWidget::paintBorder(QPainter& painter) {
     const double width = m_is_active ? ACTIVE_BORDER : 1.0;
-    const QColor colour =
-        m_is_active ? palette().color(QPalette::Highlight) : QColor(BEHIND_PICTURE);
+    const QColor colour = m_is_active ? palette().color(QPalette::Highlight) : QColor(BORDER);
     QPen pen(colour, width);
     pen.setJoinStyle(Qt::MiterJoin);
     painter.setPen(pen);

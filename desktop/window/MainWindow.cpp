@@ -97,6 +97,7 @@ void MainWindow::layOut() {
 void MainWindow::buildMenus() {
     m_menus->addBelow("Open", {m_recent_files->menu().menuAction()});
     addWindowActions(*this, *m_command_dock);
+    addFrameSizeButton(*this);
     m_menus->menu(MenuPlace::animation).addSeparator();
     m_menus->menu(MenuPlace::animation).addAction(&m_animation->openPageAction());
 }

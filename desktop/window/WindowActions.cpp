@@ -1,11 +1,13 @@
 #include "desktop/window/WindowActions.h"
 
 #include "desktop/Texts.h"
+#include "desktop/animation/AnimationBar.h"
 #include "desktop/menus/CommandMenus.h"
 #include "desktop/views/ViewArea.h"
 #include "desktop/window/MainWindow.h"
 
 #include <QDockWidget>
+#include <QToolButton>
 
 namespace quarn::desktop {
 
@@ -20,6 +22,27 @@ void addWindowActions(MainWindow& window, QDockWidget& command_dock) {
     QAction* const command_line = command_dock.toggleViewAction();
     command_line->setText(localized(L"&Command line", 45024));
     menu.addAction(command_line);
+}
+
+void addFrameSizeButton(MainWindow& window) {
+    auto* const button = new QToolButton(&window);
+    auto* const menu = new QMenu(button);
+    button->setObjectName("frameSize");
+    button->setAutoRaise(true);
+    button->setPopupMode(QToolButton::InstantPopup);
+    button->setMenu(menu);
+    button->setToolTip(
+        localized(L"Size of the active view's pictures, also of recorded ones", 45025));
+    ViewArea& views = window.views();
+    const auto show_size = [&views, button] {
+        const QSize size_px = views.activeFrameSize();
+        button->setText(QString("%1 × %2").arg(size_px.width()).arg(size_px.height()));
+    };
+    QObject::connect(menu, &QMenu::aboutToShow, button,
+                     [&views, menu] { views.fillFrameSizes(*menu); });
+    QObject::connect(&views, &ViewArea::frameChanged, button, show_size);
+    show_size();
+    window.animationBar().addControl(button);
 }
 
 } // namespace quarn::desktop

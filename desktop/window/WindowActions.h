@@ -10,4 +10,7 @@ class MainWindow;
 /// the command line.
 void addWindowActions(MainWindow& window, QDockWidget& command_dock);
 
+/// Adds to the animation bar how large the pictures will be, with a menu of sizes.
+void addFrameSizeButton(MainWindow& window);
+
 } // namespace quarn::desktop
