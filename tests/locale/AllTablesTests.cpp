@@ -22,7 +22,7 @@ TEST(AllTables, AreThereForTheHostTheAnimationPlugInAndTheirWindows) {
     std::set<std::string> names;
     for (const Module& module : modules())
         names.insert(module.folder.filename());
-    for (const char* name : {"host", "zoetrix"})
+    for (const char* name : {"desktop", "host", "vexui", "zoetrix"})
         EXPECT_TRUE(names.contains(name)) << name;
 }
 

@@ -12,9 +12,9 @@
 namespace locale_rules {
 namespace {
 
-/// Texts that are the same in every language: names, endings of files, and what only begins.
-constexpr std::string_view NAMES[] = {"Zoetrix", "Vex UI", "Quarn", "jpg",
-                                      "bmp",     "png",    "tga",   "OK"};
+/// Texts that may be the same in every language: names, endings of files, and signs of units.
+constexpr std::string_view NAMES[] = {"Zoetrix", "Vex UI", "Quarn", "jpg",    "bmp",
+                                      "png",     "tga",    "OK",    "%1 min", "%1 h %2 min"};
 
 /// Words that a language shares with English.
 constexpr struct {

@@ -159,7 +159,9 @@ std::vector<std::string> faultsOfWriting(const Translation& text) {
     require(endMark(written) == endMark(english.View()), "another mark at the end than in English");
     require(written.find(L"...") == wstring_view::npos, "three dots in place of an ellipsis");
     require(!hasAny(written, L"'`´"), "a typewriter's apostrophe");
-    require(written.find(L"  ") == wstring_view::npos, "two blanks");
+    require(written.find(L"  ") == wstring_view::npos ||
+                english.View().find(L"  ") != wstring_view::npos,
+            "two blanks");
     require(hasOwnQuotes(text.language, written), "quotes of another language, or open ones");
     require(!isWide(text.language) || hasWideMarks(written), "narrow marks beside wide characters");
     require(isWide(text.language) || !hasAny(written, L"，。：；？！（）"), "wide marks");
