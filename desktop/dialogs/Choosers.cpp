@@ -106,9 +106,7 @@ std::optional<std::filesystem::path> askFolder(QWidget* owner, std::wstring_view
                                                std::wstring_view message,
                                                const std::filesystem::path& start) {
     const QPointer<FileBrowser> browser = new FileBrowser(topmostOwner(owner), qtText(title));
-    browser->setFileMode(QFileDialog::Directory);
-    browser->setOption(QFileDialog::ShowDirsOnly);
-    browser->setLabelText(QFileDialog::Accept, localized(L"Choose", 45328));
+    browser->askForFolder();
     browser->setMessage(qtText(message));
     begin(*browser, start);
     std::optional<fs::path> folder;

@@ -29,6 +29,17 @@ FileBrowser::FileBrowser(QWidget* owner, const QString& title) : QFileDialog(own
     setLabelText(QFileDialog::Reject, localized(L"Cancel", 45301));
 }
 
+void FileBrowser::askForFolder() {
+    setFileMode(QFileDialog::Directory);
+    setOption(QFileDialog::ShowDirsOnly);
+    setLabelText(QFileDialog::Accept, localized(L"Choose", 45328));
+    // There is one kind of folder only, so its row would say nothing.
+    for (const char* part : {"fileTypeLabel", "fileTypeCombo"}) {
+        if (auto* const widget = findChild<QWidget*>(part))
+            widget->hide();
+    }
+}
+
 void FileBrowser::setMessage(const QString& message) {
     auto* const grid = qobject_cast<QGridLayout*>(layout());
     if (!grid || message.isEmpty())

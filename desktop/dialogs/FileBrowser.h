@@ -13,6 +13,9 @@ class FileBrowser final : public QFileDialog {
 public:
     FileBrowser(QWidget* owner, const QString& title);
 
+    /// Lets a person choose a folder; files are not shown.
+    void askForFolder();
+
     /// A sentence above the folders. The desktop's own window has no place for it.
     void setMessage(const QString& message);
 

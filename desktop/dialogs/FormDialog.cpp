@@ -65,6 +65,7 @@ void FormDialog::addControl(const DialogControl& control, const QString& label, 
             m_row->addWidget(text);
     } else {
         m_row = new QHBoxLayout;
+        m_row->setSpacing(8);
         rows.addRow(text, m_row);
     }
     m_row->addWidget(field, is_button ? 0 : 1, is_button ? Qt::AlignLeft : Qt::Alignment());

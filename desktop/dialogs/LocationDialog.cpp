@@ -47,6 +47,12 @@ QString longitudeFlaw(Flaw flaw) {
     return {};
 }
 
+/// Read on a light or a dark ground.
+QColor warningColour(const QPalette& palette) {
+    return palette.color(QPalette::Window).lightness() < 128 ? QColor(255, 138, 128)
+                                                             : QColor(183, 28, 28);
+}
+
 QLabel* makeLabel(const QString& text, QWidget* buddy, QWidget* parent) {
     auto* const label = new QLabel(text, parent);
     label->setBuddy(buddy);
@@ -87,7 +93,7 @@ void LocationDialog::layOut() {
     const QList<QWidget*> order = {m_search, m_table, m_map, m_latitude, m_longitude, m_ok};
     for (qsizetype index = 1; index < order.size(); ++index)
         setTabOrder(order[index - 1], order[index]);
-    resize(1080, 500);
+    resize(1180, 500);
 }
 
 QLayout* LocationDialog::citiesSide() {
@@ -112,7 +118,7 @@ QLayout* LocationDialog::citiesSide() {
     m_table->verticalHeader()->setDefaultSectionSize(m_table->fontMetrics().height() + 7);
     m_table->horizontalHeader()->setHighlightSections(false);
     m_table->horizontalHeader()->setStretchLastSection(true);
-    m_table->setMinimumWidth(m_table->fontMetrics().averageCharWidth() * 52);
+    m_table->setMinimumWidth(m_table->fontMetrics().averageCharWidth() * 66);
     auto* const side = new QVBoxLayout;
     side->addWidget(m_search);
     side->addWidget(m_table, 1);
@@ -126,7 +132,7 @@ QLayout* LocationDialog::mapSide() {
     m_hover = new QLabel(this);
     m_hover->setObjectName("hover");
     m_hover->setAlignment(Qt::AlignRight | Qt::AlignVCenter);
-    m_hover->setEnabled(false);
+    showHovered({});
     auto* const side = new QVBoxLayout;
     side->addWidget(m_map, 1);
     side->addWidget(m_hover);
@@ -143,6 +149,9 @@ QLayout* LocationDialog::fieldsRow() {
         localized(L"Degrees from -180 to 180, east positive, as 11.58 or 70.67 W", 45321));
     m_flaw = new QLabel(this);
     m_flaw->setObjectName("flaw");
+    QPalette warning = m_flaw->palette();
+    warning.setColor(QPalette::WindowText, warningColour(warning));
+    m_flaw->setPalette(warning);
     auto* const row = new QHBoxLayout;
     row->setSpacing(10);
     row->addWidget(makeLabel(localized(L"&Latitude", 45345), m_latitude, this));
@@ -166,7 +175,7 @@ QLineEdit* LocationDialog::makeAngleField(const char* name, const QString& hint)
 QLayout* LocationDialog::buttonsRow() {
     auto* const hint =
         new QLabel(localized(L"Click on the map or drag the mark; the wheel zooms.", 45314), this);
-    hint->setEnabled(false);
+    hint->setForegroundRole(QPalette::PlaceholderText);
     m_ok = makeButton("ok", localized(L"OK", 45300), this);
     m_ok->setDefault(true);
     QPushButton* const cancel = makeButton("cancel", localized(L"Cancel", 45301), this);
@@ -209,6 +218,7 @@ void LocationDialog::search(const QString& text) {
     const QScopedValueRollback showing(m_is_showing, true);
     m_choice.search(text.toStdWString());
     m_cities->show(m_choice.listedCities());
+    m_table->doItemsLayout(); // so that there is something to scroll
     showCityRow();
 }
 
@@ -244,8 +254,10 @@ bool LocationDialog::eventFilter(QObject* watched, QEvent* event) {
 /// The rows can be scrolled to once the table has its size.
 void LocationDialog::showEvent(QShowEvent* event) {
     QDialog::showEvent(event);
-    m_table->setColumnWidth(0, m_table->viewport()->width() * 38 / 100);
-    m_table->setColumnWidth(1, m_table->viewport()->width() * 28 / 100);
+    m_table->resizeColumnToContents(2);
+    const int for_names = m_table->viewport()->width() - m_table->columnWidth(2);
+    m_table->setColumnWidth(0, for_names * 54 / 100);
+    m_table->setColumnWidth(1, for_names * 46 / 100);
     showCityRow();
 }
 

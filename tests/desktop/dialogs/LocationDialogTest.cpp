@@ -180,6 +180,16 @@ TEST_F(LocationDialogTest, TableOpensAtTheCityOfTheStartOrTheNearest) {
     });
 }
 
+TEST_F(LocationDialogTest, TableGoesBackToTheNearestCityWhenTheSearchIsCleared) {
+    ask({-33.5, 150.9}, [&](QWidget& window) {
+        type(window, "search", "zag");
+        part<QLineEdit>(window, "search").clear();
+        auto& table = part<QTableView>(window, "cities");
+        EXPECT_TRUE(table.viewport()->rect().intersects(table.visualRect(rowOf(window, "Sydney"))));
+        press(window, "ok");
+    });
+}
+
 TEST_F(LocationDialogTest, ClickOnTheMapChoosesThePlaceBelow) {
     const auto place = ask({0, 0}, [](QWidget& window) {
         auto& map = part<WorldMap>(window, "map");
