@@ -5,7 +5,6 @@
 #include "host/front_end/Completion.h"
 
 #include <QHBoxLayout>
-#include <QStyle>
 
 namespace quarn::desktop {
 
@@ -51,10 +50,8 @@ PromptStrip::PromptStrip(QWidget* parent)
     m_choices->layout()->addWidget(m_objects);
 
     m_ok->setObjectName("promptOk");
-    m_ok->setIcon(style()->standardIcon(QStyle::SP_DialogOkButton));
     auto* const cancel = new QPushButton(localized(L"Cancel", 45105), this);
     cancel->setObjectName("promptCancel");
-    cancel->setIcon(style()->standardIcon(QStyle::SP_DialogCancelButton));
     cancel->setShortcut(Qt::Key_Escape);
     cancel->setToolTip(localized(L"Ends the command (Escape)", 45106));
 

@@ -105,7 +105,13 @@ void CommandMenus::setCommandRuns(bool runs) {
 
 /// The English name, so that a plug-in's local name never hides another command.
 QString CommandMenus::lineOf(const QString& name) {
-    return name == "RecordAnimation" ? recordingLine(m_session.document()) : "_" + name;
+    if (name == "RecordAnimation")
+        return recordingLine(m_session.document());
+    const auto rows = menuRows();
+    const auto row = std::ranges::find_if(
+        rows, [&](const MenuRow& candidate) { return qtText(candidate.command) == name; });
+    const bool has_words = row != rows.end() && row->words;
+    return has_words ? "_" + name + ' ' + qtText(row->words) : "_" + name;
 }
 
 } // namespace quarn::desktop

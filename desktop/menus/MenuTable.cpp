@@ -31,7 +31,7 @@ constexpr MenuRow ROWS[] = {
     {edit, L"List", L"&List the contents", 45143, "Ctrl+L", true},
 
     {view, L"StandardView", L"&Look from…", 45144, "Ctrl+1"},
-    {view, L"FitView", L"&Fit to the window", 45145, "Ctrl+0"},
+    {view, L"FitView", L"&Fit to the window", 45145, "Ctrl+0", false, L"_Enter"},
     {view, L"Camera", L"Place the &camera…", 45146},
     {view, L"AddView", L"&Add a view…", 45147, nullptr, true},
     {view, L"RemoveView", L"&Remove a view…", 45148},

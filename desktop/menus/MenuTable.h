@@ -25,6 +25,8 @@ struct MenuRow {
     /// A shortcut in the portable notation of QKeySequence; null for none.
     const char* shortcut = nullptr;
     bool begins_group = false; ///< a line stands above it
+    /// Words that follow the command: it is done at once where it would ask for refinements.
+    const wchar_t* words = nullptr;
 };
 
 /// Titles in the order of the menu bar.
