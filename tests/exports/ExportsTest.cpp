@@ -50,18 +50,31 @@ bool isDeclaredIn(const std::string& declarations, const std::string& symbol) {
     return mentions(declarations, name.front());
 }
 
+/// The entry points of every plug-in file.
+constexpr const char* PLUG_IN_ENTRIES = "QuarnPlugInDeveloperAddress\n"
+                                        "QuarnPlugInDeveloperCountry\n"
+                                        "QuarnPlugInDeveloperEmail\n"
+                                        "QuarnPlugInDeveloperFax\n"
+                                        "QuarnPlugInDeveloperOrganization\n"
+                                        "QuarnPlugInDeveloperPhone\n"
+                                        "QuarnPlugInDeveloperWebsite\n"
+                                        "QuarnPlugInSdkServiceRelease\n"
+                                        "QuarnPlugInSdkVersion\n"
+                                        "QuarnPlugInUpdateURL\n";
+
 TEST(Exports, ThePlugInShowsItsEntryPointsAndNothingElse) {
-    EXPECT_EQ(listed(exportedSymbols(ZOETRIX_PLUGIN_PATH)), "QuarnPlugInDeveloperAddress\n"
-                                                            "QuarnPlugInDeveloperCountry\n"
-                                                            "QuarnPlugInDeveloperEmail\n"
-                                                            "QuarnPlugInDeveloperFax\n"
-                                                            "QuarnPlugInDeveloperOrganization\n"
-                                                            "QuarnPlugInDeveloperPhone\n"
-                                                            "QuarnPlugInDeveloperWebsite\n"
-                                                            "QuarnPlugInSdkServiceRelease\n"
-                                                            "QuarnPlugInSdkVersion\n"
-                                                            "QuarnPlugInUpdateURL\n");
+    EXPECT_EQ(listed(exportedSymbols(ZOETRIX_PLUGIN_PATH)), PLUG_IN_ENTRIES);
 }
+
+#ifdef VEXUI_PLUGIN_PATH
+TEST(Exports, TheDialogPlugInShowsItsDialogsToo) {
+    EXPECT_EQ(listed(exportedSymbols(VEXUI_PLUGIN_PATH)),
+              PLUG_IN_ENTRIES + std::string("ZelVexUiDay\n"
+                                            "ZelVexUiPathAnimation\n"
+                                            "ZelVexUiSeason\n"
+                                            "ZelVexUiTurnTable\n"));
+}
+#endif
 
 TEST(Exports, TheGeometryToolkitShowsWhatItsHeadersDeclare) {
     const std::string declarations = declarationsBelow(QUARN_SOURCE_DIR "/kelmar");

@@ -6,7 +6,6 @@
 
 #include <QComboBox>
 #include <QFormLayout>
-#include <QLineEdit>
 #include <QLocale>
 
 #include <algorithm>
@@ -40,11 +39,10 @@ void CameraForm::addMotion(const IZoetrixDataUI& lists, const KM_3dmAnimationPro
     QFormLayout& section = addSection(localText(L"Camera", 44007));
     m_frames = new CountField(1, most_frames, this);
     m_frames->setValue(std::max(record.FrameCount(), 1));
-    addField(section,
+    addCount(section,
              {"frames", localText(L"&Frames:", 44020),
               localText(L"How many pictures the animation has", 44040)},
              *m_frames);
-    connect(m_frames->findChild<QLineEdit*>(), &QLineEdit::textChanged, this, [this] { review(); });
     check(*m_frames, [this] { return frameFault(); });
     if (m_kind == Kind::turntable)
         m_directions = &addList(section,

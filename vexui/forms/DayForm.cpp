@@ -23,7 +23,7 @@ DayForm::DayForm(const IZoetrixDataUI& lists, const KM_3dmAnimationProperties& r
                  QWidget* owner)
     : SunForm("dayForm", localText(L"One-Day Sun Study", 44003), owner) {
     addPlace(record);
-    QFormLayout& section = addSection(localText(L"Time", 44009));
+    QFormLayout& section = addTimes();
     m_date = &addDate(
         section,
         {"date", localText(L"&Date:", 44030), localText(L"The day whose sun is shown", 44050)},

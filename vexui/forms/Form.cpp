@@ -1,6 +1,7 @@
 #include "vexui/forms/Form.h"
 
 #include "vexui/Texts.h"
+#include "vexui/forms/CountField.h"
 
 #include <QComboBox>
 #include <QDialogButtonBox>
@@ -19,7 +20,7 @@ namespace vexui {
 
 namespace {
 
-constexpr int least_width_px = 440;
+constexpr int least_width_px = 460;
 constexpr int icon_size_px = 24;
 
 /// The background of a field that cannot be taken: reddish, and as light or dark as the others.
@@ -82,6 +83,13 @@ void Form::addField(QFormLayout& section, const Caption& caption, QWidget& field
     section.addRow(label, &field);
     m_labels.push_back(label);
     addToTabOrder(field);
+}
+
+void Form::addCount(QFormLayout& section, const Caption& caption, CountField& field) {
+    addField(section, caption, field);
+    // The one tells of numbers, the other of what is none.
+    connect(&field, &QSpinBox::valueChanged, this, [this] { review(); });
+    connect(field.findChild<QLineEdit*>(), &QLineEdit::textChanged, this, [this] { review(); });
 }
 
 void Form::addToTabOrder(QWidget& field) {

@@ -17,6 +17,8 @@ class QVBoxLayout;
 
 namespace vexui {
 
+class CountField;
+
 /// What a form will lead to, for the line beneath its fields.
 struct Outcome {
     QString text;            ///< in the user's language
@@ -53,6 +55,8 @@ protected:
     QFormLayout& addSection(const QString& title);
     /// Adds a field. Fields are reached with Tab in the order they are added.
     void addField(QFormLayout& section, const Caption& caption, QWidget& field);
+    /// Adds a field for a whole number; the form follows what stands in it.
+    void addCount(QFormLayout& section, const Caption& caption, CountField& field);
     /// Has a field checked whenever anything changes.
     void check(QWidget& field, Fault fault);
     /// A list with its selection; entry 0 is selected when the selection is outside the list.

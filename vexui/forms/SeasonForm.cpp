@@ -23,7 +23,7 @@ SeasonForm::SeasonForm(const IZoetrixDataUI& lists, const KM_3dmAnimationPropert
                        QWidget* owner)
     : SunForm("seasonForm", localText(L"Seasonal Sun Study", 44004), owner) {
     addPlace(record);
-    QFormLayout& section = addSection(localText(L"Time", 44009));
+    QFormLayout& section = addTimes();
     m_start = &addDate(section,
                        {"startDate", localText(L"&Start date:", 44034),
                         localText(L"The day of the first frame", 44054)},

@@ -65,6 +65,9 @@ void SunForm::addNumber(QFormLayout& section, const Caption& caption, NumberFiel
 }
 
 void SunForm::addPlace(const KM_3dmAnimationProperties& record) {
+    m_place.zone = new QLabel(this);
+    m_place.zone->setObjectName(QString::fromLatin1("zone"));
+    m_place.zone->setTextFormat(Qt::PlainText);
     QFormLayout& section = addSection(localText(L"Place", 44008));
     m_place.latitude = new NumberField(-90.0, 90.0, this);
     addNumber(
@@ -99,11 +102,12 @@ void SunForm::addChooser(QFormLayout& section) {
     connect(button, &QPushButton::clicked, this, [this] { m_place.choose(); });
     addBeneath(section, *button);
     addToTabOrder(*button);
-    m_place.zone = new QLabel(this);
-    m_place.zone->setObjectName(QString::fromLatin1("zone"));
-    m_place.zone->setTextFormat(Qt::PlainText);
-    m_place.zone->setWordWrap(true);
-    addBeneath(section, *m_place.zone);
+}
+
+QFormLayout& SunForm::addTimes() {
+    QFormLayout& section = addSection(localText(L"Time", 44009));
+    section.addRow(m_place.zone);
+    return section;
 }
 
 QDateEdit& SunForm::addDate(QFormLayout& section, const Caption& caption, int year, int month,
@@ -130,8 +134,7 @@ void SunForm::addStep(QFormLayout& section, const Caption& caption, int step, in
                       const QString& fault) {
     m_step = new CountField(0, longest, this);
     m_step->setValue(magnitude(step));
-    addField(section, caption, *m_step);
-    connect(m_step->findChild<QLineEdit*>(), &QLineEdit::textChanged, this, [this] { review(); });
+    addCount(section, caption, *m_step);
     check(*m_step, [this, fault] { return m_step->count().value_or(-1) < 0 ? fault : QString(); });
 }
 

@@ -28,6 +28,8 @@ protected:
     SunForm(const char* name, const QString& title, QWidget* owner);
 
     void addPlace(const KM_3dmAnimationProperties& record);
+    /// A section for the times, with the zone they are of.
+    QFormLayout& addTimes();
     /// Both show the nearest that a calendar or clock knows, whatever numbers they are given.
     QDateEdit& addDate(QFormLayout& section, const Caption& caption, int year, int month, int day);
     QTimeEdit& addTime(QFormLayout& section, const Caption& caption, int hour, int minute);
