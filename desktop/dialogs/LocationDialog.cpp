@@ -128,14 +128,21 @@ QLayout* LocationDialog::citiesSide() {
 QLayout* LocationDialog::mapSide() {
     m_map = new WorldMap(this);
     m_map->setObjectName("map");
-    m_map->setToolTip({});
     m_hover = new QLabel(this);
     m_hover->setObjectName("hover");
     m_hover->setAlignment(Qt::AlignRight | Qt::AlignVCenter);
     showHovered({});
+    m_flaw = new QLabel(this);
+    m_flaw->setObjectName("flaw");
+    QPalette warning = m_flaw->palette();
+    warning.setColor(QPalette::WindowText, warningColour(warning));
+    m_flaw->setPalette(warning);
+    auto* const told = new QHBoxLayout;
+    told->addWidget(m_flaw, 1);
+    told->addWidget(m_hover);
     auto* const side = new QVBoxLayout;
     side->addWidget(m_map, 1);
-    side->addWidget(m_hover);
+    side->addLayout(told);
     side->addLayout(fieldsRow());
     return side;
 }
@@ -147,11 +154,6 @@ QLayout* LocationDialog::fieldsRow() {
     m_longitude = makeAngleField(
         "longitude",
         localized(L"Degrees from -180 to 180, east positive, as 11.58 or 70.67 W", 45321));
-    m_flaw = new QLabel(this);
-    m_flaw->setObjectName("flaw");
-    QPalette warning = m_flaw->palette();
-    warning.setColor(QPalette::WindowText, warningColour(warning));
-    m_flaw->setPalette(warning);
     auto* const row = new QHBoxLayout;
     row->setSpacing(10);
     row->addWidget(makeLabel(localized(L"&Latitude", 45345), m_latitude, this));
@@ -160,7 +162,6 @@ QLayout* LocationDialog::fieldsRow() {
     row->addWidget(makeLabel(localized(L"L&ongitude", 45346), m_longitude, this));
     row->addWidget(m_longitude);
     row->addStretch(1);
-    row->addWidget(m_flaw);
     return row;
 }
 
