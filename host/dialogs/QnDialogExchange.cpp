@@ -24,11 +24,10 @@ bool begins(CQnDialogExchange& exchange, int control) {
     return true;
 }
 
-/// A number in the user's notation. A comma is the decimal mark where no point stands beside it.
+/// A number in the user's notation: a comma is a decimal mark as a point is. There may be one mark,
+/// so that a text with marks of thousands is no number.
 std::optional<double> readUsersNumber(std::wstring text) {
-    const bool has_one_comma = std::ranges::count(text, L',') == 1;
-    if (has_one_comma && text.find(L'.') == std::wstring::npos)
-        std::ranges::replace(text, L',', L'.');
+    std::ranges::replace(text, L',', L'.');
     return quarn::readNumber(text);
 }
 

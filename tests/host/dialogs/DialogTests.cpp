@@ -11,6 +11,26 @@ namespace {
 class Dialog : public DialogTest {};
 using Texts = std::vector<std::wstring>;
 
+/// A window that tells of OK twice, and of its being closed, before it goes.
+class EagerWindow final : public DialogWindow {
+public:
+    void run(DialogEvents& events) override {
+        events.confirmed();
+        events.confirmed();
+        events.givenUp();
+    }
+    void close() override { ++closings; }
+    bool hasControl(int) const override { return false; }
+    std::wstring text(int) const override { return {}; }
+    void setText(int, std::wstring_view) override {}
+    COleDateTime dateTime(int) const override { return {}; }
+    void setDateTime(int, const COleDateTime&) override {}
+    std::unique_ptr<IQnComboBoxControl> comboBox(int) override { return nullptr; }
+    void focus(int) override {}
+
+    int closings = 0;
+};
+
 /// A dialog of a class that has a record of its own.
 class RecordedDialog : public SampleDialog {
 public:
@@ -231,6 +251,19 @@ TEST_F(Dialog, InAWindowWithoutTheComboBoxKeepsTheControlThatItWasGiven) {
     EXPECT_TRUE(sample.colours.HasControl());
     EXPECT_EQ(Texts({L"red", L"green", L"blue"}), elsewhere.entries(list_id));
     sample.colours.SetControl(nullptr);
+}
+
+TEST_F(Dialog, HearsNothingMoreOfItsWindowOnceItIsClosed) {
+    int confirmations = 0;
+    sample.on_ok = [&](SampleDialog& dialog) {
+        ++confirmations;
+        dialog.EndDialog(1);
+    };
+    EagerWindow window;
+    EXPECT_EQ(1, sample.DoModalIn(window));
+    EXPECT_EQ(1, confirmations);
+    EXPECT_EQ(0, sample.give_ups);
+    EXPECT_EQ(1, window.closings);
 }
 
 TEST_F(Dialog, TakesTheTitleOfMessagesFromTheTemplateInAWindowOfAnotherMaking) {
