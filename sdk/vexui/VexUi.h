@@ -30,7 +30,8 @@ public:
     virtual int DirectionListSelection() const = 0;
     virtual void SetDirectionListSelection(int selection) = 0;
 
-    /// The window that owns the dialog; null where there is none.
+    /// The window that owns the dialog; null where there is none. In the Qt window it is a
+    /// `QWidget*`.
     virtual HWND Parent() const = 0;
     /// Extension hook. @return 0 when the named extension is not understood
     virtual int EVF(const wchar_t* name, void* data) = 0;
@@ -40,7 +41,8 @@ public:
 QNCORE_API extern const KM_UUID ZelVexUiPlugInId;
 
 /// Runs an animation dialog: shows the lists and the record, and changes both as the person
-/// does. @return true when the person confirmed
+/// does. Called on the main thread while a command runs.
+/// @return true when the person confirmed; on false lists and record are as they were
 using QnZoetrixVexUiDialog = bool (*)(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record);
 
 /// The turntable dialog of the dialog plug-in, which exports it as `ZelVexUiTurnTable`; null when
