@@ -28,6 +28,9 @@ CommandPane::CommandPane(const Session& session, QWidget* parent)
       m_line(new CommandEdit(m_frame)) {
     m_frame->setObjectName("askingFrame");
     m_frame->setAutoFillBackground(true);
+    // Files that are dropped here are for the window to open.
+    m_output->setAcceptDrops(false);
+    m_line->setAcceptDrops(false);
     auto* const framed = new QVBoxLayout(m_frame);
     framed->setContentsMargins(MARGIN_PX, MARGIN_PX, MARGIN_PX, MARGIN_PX);
     framed->setSpacing(MARGIN_PX);

@@ -24,14 +24,23 @@ QString promptHtml(const Question& question) {
     return text;
 }
 
-QString optionCaption(const QuestionOption& option) {
+/// As it is typed, but with room to read: `Name = Value`.
+QString optionText(const QuestionOption& option) {
     const QString name = qtText(option.local_name);
-    return plainCaption(option.value.IsEmpty() ? name : name + " = " + qtText(option.value));
+    return option.value.IsEmpty() ? name : name + " = " + qtText(option.value);
+}
+
+/// A folder may be longer than the strip is wide; its end tells most.
+QString shortened(const QString& text) {
+    constexpr qsizetype LONGEST = 48;
+    const qsizetype begin = LONGEST / 3;
+    return text.size() <= LONGEST ? text
+                                  : text.left(begin) + u'\u2026' + text.right(LONGEST - begin - 1);
 }
 
 /// The English name behind "_" picks an option in every language.
 QString optionAnswer(Question::Kind kind, const QuestionOption& option) {
-    return qtText(optionText(kind, L"_" + std::wstring(option.english_name.View())));
+    return qtText(quarn::optionText(kind, L"_" + std::wstring(option.english_name.View())));
 }
 
 } // namespace
@@ -95,7 +104,8 @@ void PromptStrip::showOptions(const Question& question) {
         button->deleteLater();
     }
     for (const QuestionOption& option : question.options) {
-        auto* const button = new QPushButton(optionCaption(option));
+        auto* const button = new QPushButton(plainCaption(shortened(optionText(option))));
+        button->setToolTip(optionText(option));
         button->setObjectName("option_" + qtText(option.english_name));
         const QString answer = optionAnswer(question.kind, option);
         connect(button, &QPushButton::clicked, this, [this, answer] { emit answered(answer); });
