@@ -66,6 +66,14 @@ TEST(Coastlines, ReadStepsFromTheFirstPointOn) {
     EXPECT_TRUE(land.contains(QPointF(0, -1)));
 }
 
+TEST(Coastlines, RingWithinARingIsALakeWhicheverWayItRuns) {
+    for (const char* lake : {"-1 1 2 0 0 -2 -2 0", "-1 1 0 -2 2 0 0 2"}) {
+        const QPainterPath land = coastlinesFromText("1\n-2 2 4 0 0 -4 -4 0\n" + QByteArray(lake));
+        EXPECT_FALSE(land.contains(QPointF(0, 0))) << lake;
+        EXPECT_TRUE(land.contains(QPointF(1.5, 0))) << lake;
+    }
+}
+
 TEST(Coastlines, TakeNoHarmFromAFileThatIsNone) {
     for (const char* text :
          {"", "0\n1 2 3 4 5 6\n", "x\n1 2 3 4 5 6\n", "50\n\n1 2 3\n1 2 a b 3 4\n"})
