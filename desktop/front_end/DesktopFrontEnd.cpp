@@ -2,6 +2,7 @@
 
 #include "sdk/qncore/QnPlatform.h"
 
+#include <QApplication>
 #include <QCoreApplication>
 #include <QEventLoop>
 #include <QTimer>
@@ -77,7 +78,10 @@ FileChoice DesktopFrontEnd::chooseFile(const FileQuestion& question) {
 std::optional<Place> DesktopFrontEnd::chooseLocation(std::wstring_view title, const Place& start) {
     if (!m_parts.choose_place)
         return std::nullopt;
-    const std::optional<Place> place = m_parts.choose_place(m_main_window, title, start);
+    // A form asks for the place while it is open: the picker belongs before that form.
+    QWidget* const form = QApplication::activeModalWidget();
+    const std::optional<Place> place =
+        m_parts.choose_place(form ? form : m_main_window.data(), title, start);
     m_escape.forgetTap();
     return place;
 }
