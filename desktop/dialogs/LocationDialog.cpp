@@ -254,11 +254,13 @@ bool LocationDialog::eventFilter(QObject* watched, QEvent* event) {
 
 /// The rows can be scrolled to once the table has its size.
 void LocationDialog::showEvent(QShowEvent* event) {
+    const QScopedValueRollback showing(m_is_showing, true);
     QDialog::showEvent(event);
     m_table->resizeColumnToContents(2);
     const int for_names = m_table->viewport()->width() - m_table->columnWidth(2);
     m_table->setColumnWidth(0, for_names * 54 / 100);
     m_table->setColumnWidth(1, for_names * 46 / 100);
+    m_table->setCurrentIndex({}); // so that its row is scrolled to
     showCityRow();
 }
 

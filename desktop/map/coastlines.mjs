@@ -128,7 +128,7 @@ function line(points) {
             [last_x, last_y] = [x, y];
         }
     }
-    return numbers.length > 6 - 1 ? numbers.join(' ') : '';
+    return numbers.length >= 6 ? numbers.join(' ') : '';
 }
 
 const [source, target] = process.argv.slice(2);

@@ -170,6 +170,8 @@ TEST_F(LocationDialogTest, TableOpensAtTheCityOfTheStartOrTheNearest) {
         const auto& table = part<QTableView>(window, "cities");
         EXPECT_EQ(table.currentIndex().siblingAtColumn(0).data().toString(), "Munich");
         EXPECT_TRUE(isShown(window, "Munich"));
+        EXPECT_TRUE(isShown(window, "Montreal")); // some rows above and below
+        EXPECT_TRUE(isShown(window, "Nairobi"));
         press(window, "ok");
     });
     ask({-33.5, 150.9}, [&](QWidget& window) {
