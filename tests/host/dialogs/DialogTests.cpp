@@ -1,6 +1,9 @@
 #include "tests/host/dialogs/DialogFixture.h"
 
+#include "tests/host/app/BreachList.h"
+
 #include <stdexcept>
+#include <thread>
 
 using namespace quarn;
 using namespace quarn::test;
@@ -300,4 +303,22 @@ TEST_F(Dialog, OfTheBaseClassShowsItsTemplateAndClosesByItself) {
                   EXPECT_TRUE(window.isOpen());
                   window.pressOk();
               }));
+}
+
+// ---- Rules
+
+TEST_F(Dialog, IsCalledOnTheMainThreadOnly) {
+    BreachList breaches;
+    front_end.addDialog(nullptr);
+    std::thread elsewhere([this] {
+        EXPECT_EQ(-1, sample.DoModal());
+        EXPECT_FALSE(sample.UpdateData(true));
+    });
+    elsewhere.join();
+    EXPECT_EQ((std::vector<std::string>{
+                  "CDialog::DoModal: only the main thread may call it",
+                  "CDialog::UpdateData: only the main thread may call it",
+              }),
+              breaches.take());
+    EXPECT_TRUE(front_end.dialogs().empty());
 }
