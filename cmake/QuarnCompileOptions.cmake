@@ -1,7 +1,9 @@
 # Flags for our own targets alone; they travel by linking this target and never by global variables.
 add_library(quarn_compile_options INTERFACE)
 target_compile_features(quarn_compile_options INTERFACE cxx_std_20)
-target_compile_options(quarn_compile_options INTERFACE -Wall -Wextra -Wpedantic -Wshadow)
+target_compile_options(quarn_compile_options INTERFACE -Wall -Wextra -Wpedantic
+    # `id` is a type of Objective-C and an ordinary name in the headers it shares with C++.
+    $<$<COMPILE_LANGUAGE:CXX>:-Wshadow>)
 # g++ 12 takes the joining of short texts for overlapping copies (its bug 105651).
 target_compile_options(quarn_compile_options INTERFACE
     $<$<AND:$<CXX_COMPILER_ID:GNU>,$<VERSION_LESS:$<CXX_COMPILER_VERSION>,13>>:-Wno-restrict>)

@@ -1,6 +1,6 @@
 #include "host/cocoa/BoundKeys.h"
 
-#include "sdk/cocoa/QXText.h"
+#include "host/cocoa/TextOf.h"
 
 #include <string>
 #include <utility>
@@ -50,9 +50,8 @@ Result<BoundKeys> BoundKeys::takeOver(QXDialogController* controller) {
         NSControl* const control =
             controlBoundTo(key, controller, [[controller window] contentView]);
         if (!control) {
-            return Error{"The nib \"" + [[controller nibName] KMwString].ToUtf8() +
-                         "\" has no control that is bound to \"" + [key KMwString].ToUtf8() +
-                         "\"."};
+            return Error{"The nib \"" + textOf([controller nibName]).ToUtf8() +
+                         "\" has no control that is bound to \"" + textOf(key).ToUtf8() + "\"."};
         }
         [control unbind:NSValueBinding];
         [keys.m_controls setObject:control forKey:key];

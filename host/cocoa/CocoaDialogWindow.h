@@ -34,6 +34,7 @@ private:
     QXDialogController* m_controller;
     const BoundKeys& m_keys;
     DialogEvents* m_events = nullptr; ///< while it runs
+    bool m_is_closed = false;
 };
 
 } // namespace quarn

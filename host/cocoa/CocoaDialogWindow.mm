@@ -1,9 +1,22 @@
 #include "host/cocoa/CocoaDialogWindow.h"
 
 #include "host/cocoa/DialogEvents.h"
+#include "host/cocoa/TextOf.h"
 #include "sdk/cocoa/QXText.h"
 
 namespace quarn {
+namespace {
+
+/// Waits for the next event, though not for long: a dialog need not end in one.
+void waitForEvent() {
+    constexpr NSTimeInterval LONGEST_S = 0.05;
+    [NSApp nextEventMatchingMask:NSAnyEventMask
+                       untilDate:[NSDate dateWithTimeIntervalSinceNow:LONGEST_S]
+                          inMode:NSModalPanelRunLoopMode
+                         dequeue:NO];
+}
+
+} // namespace
 
 CocoaDialogWindow::CocoaDialogWindow(QXDialogController* controller, const BoundKeys& keys)
     : m_controller(controller), m_keys(keys) {}
@@ -14,16 +27,24 @@ void CocoaDialogWindow::run(DialogEvents& events) {
     m_keys.show();
     NSWindow* const window = [m_controller window];
     [window center];
-    [NSApp runModalForWindow:window];
+    m_is_closed = false;
+    const NSModalSession session = [NSApp beginModalSessionForWindow:window];
+    while (!m_is_closed) {
+        NSAutoreleasePool* const pool = [[NSAutoreleasePool alloc] init];
+        [NSApp runModalSession:session];
+        if (!m_is_closed) {
+            waitForEvent();
+        }
+        [pool drain];
+    }
+    [NSApp endModalSession:session];
     [m_controller setDialogEvents:nullptr];
     m_events = nullptr;
 }
 
 void CocoaDialogWindow::close() {
     [m_controller willCloseDialog];
-    if (m_events) {
-        [NSApp stopModal];
-    }
+    m_is_closed = true;
 }
 
 void CocoaDialogWindow::confirmed() {
@@ -49,7 +70,7 @@ bool CocoaDialogWindow::hasControl(int control) const {
 }
 
 std::wstring CocoaDialogWindow::text(int control) const {
-    return std::wstring([[find(control) stringValue] KMwString].View());
+    return std::wstring(textOf([find(control) stringValue]).View());
 }
 
 void CocoaDialogWindow::setText(int control, std::wstring_view text) {

@@ -2,6 +2,7 @@
 
 #include "host/cocoa/BoundKeys.h"
 #include "host/cocoa/CocoaDialogWindow.h"
+#include "host/cocoa/TextOf.h"
 #include "host/cocoa/WindowTexts.h"
 #include "sdk/cocoa/QXDialogController.h"
 #include "sdk/cocoa/QXText.h"
@@ -30,6 +31,10 @@ public:
         [m_controller setQuarnDialog:&dialog];
     }
     ~Controller() {
+        // The window belongs to the controller, whatever its nib says.
+        NSWindow* const window = [m_controller isWindowLoaded] ? [m_controller window] : nil;
+        [window setDelegate:nil];
+        [window setReleasedWhenClosed:NO];
         [m_controller close];
         [m_controller setQuarnDialog:nullptr];
         [m_controller release];
@@ -69,7 +74,7 @@ Result<void> loadWindow(QXDialogController* controller, const CQuarnDialog& dial
                      " does not serve the dialog " + std::to_string(dialog.TemplateId()) + "."};
     }
     if (![controller windowNibPath] || ![controller window]) {
-        return Error{"The nib " + quoted([[controller nibName] KMwString]) +
+        return Error{"The nib " + quoted(textOf([controller nibName])) +
                      " was not found, or holds no window."};
     }
     return {};

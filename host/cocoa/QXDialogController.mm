@@ -6,7 +6,8 @@
 @implementation QXDialogController
 
 - (id)init {
-    return [self initWithWindowNibName:[self nibName]];
+    NSString* const name = [self nibName];
+    return name ? [self initWithWindowNibName:name] : [self initWithWindow:nil];
 }
 
 - (NSString*)nibName {

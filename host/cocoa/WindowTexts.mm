@@ -1,13 +1,27 @@
 #include "host/cocoa/WindowTexts.h"
 
+#include "host/cocoa/TextOf.h"
 #include "sdk/cocoa/QXText.h"
 #include "sdk/qncore/QnLocalize.h"
 
 namespace quarn {
 namespace {
 
-NSString* localized(NSString* english, NSInteger id) {
-    return [NSString stringWithLPCTSTR:QnLocalizeString([english KMwString], static_cast<int>(id))];
+NSString* localized(NSString* english, NSInteger text_id) {
+    return
+        [NSString stringWithLPCTSTR:QnLocalizeString(textOf(english), static_cast<int>(text_id))];
+}
+
+/// OK and Cancel have the same texts in every dialog; other buttons have their controls' ids as
+/// tags.
+NSString* titleOf(NSButton* button) {
+    if (sel_isEqual([button action], @selector(confirmDialog:))) {
+        return [NSString stringWithLPCTSTR:QnLocalizeString(L"OK", 42490)];
+    }
+    if (sel_isEqual([button action], @selector(cancelDialog:))) {
+        return [NSString stringWithLPCTSTR:QnLocalizeString(L"Cancel", 42491)];
+    }
+    return [button title];
 }
 
 bool isLabel(NSView* view) {
@@ -25,7 +39,7 @@ void localize(NSView* view) {
         [label setStringValue:localized([label stringValue], [label tag])];
     } else if (isPlainButton(view)) {
         auto* const button = static_cast<NSButton*>(view);
-        [button setTitle:localized([button title], [button tag])];
+        [button setTitle:titleOf(button)];
     }
     NSArray* const inside = [view subviews];
     for (NSUInteger at = 0; at < [inside count]; ++at) {

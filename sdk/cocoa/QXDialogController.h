@@ -16,7 +16,7 @@ class DialogEvents;
 /// - a control of the dialog has the control's id as its tag;
 /// - the value of a control may be bound to a key of the controller;
 /// - OK, Cancel and other buttons send `confirmDialog:`, `cancelDialog:` and `pressDialogButton:`;
-/// - a label or button with another tag shows the text with that id in the user's language.
+/// - a label shows the text with the id that is its tag in the user's language.
 ///
 /// Made for manual retain and release: compile it, and what stands on it, without ARC.
 @interface QXDialogController : NSWindowController {
@@ -34,7 +34,7 @@ class DialogEvents;
 - (int)titleTextId;
 
 /// The keys of the controller that the nib binds to controls of the window. They are shown when the
-/// window opens, written when a control is edited, and put back when the dialog is given up.
+/// window opens, written when it is confirmed, and put back when it is given up after all.
 /// @return NSStrings; the base has none
 - (NSArray*)bindingKeyNames;
 

@@ -12,7 +12,8 @@
 /// @return an autoreleased string, never nil
 + (NSString*)stringWithLPCTSTR:(const wchar_t*)text;
 
-/// The characters of this string, one for each code point. Sent to nil it gives empty text.
+/// The characters of this string, one for each code point. Not to be sent to nil: what comes of
+/// that is no object.
 - (KM_wString)KMwString;
 
 @end

@@ -25,6 +25,8 @@ class CTurnTableDialog;
 
 /// @return "QXTurnTableDialog"
 - (NSString*)nibName;
+/// The text "Turntable Animation".
+- (int)titleTextId;
 /// @return "frameCount" and "name"
 - (NSArray*)bindingKeyNames;
 

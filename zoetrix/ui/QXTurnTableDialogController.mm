@@ -15,6 +15,10 @@
     return @"QXTurnTableDialog";
 }
 
+- (int)titleTextId {
+    return 40501;
+}
+
 - (NSArray*)bindingKeyNames {
     return [NSArray arrayWithObjects:@"frameCount", @"name", nil];
 }
