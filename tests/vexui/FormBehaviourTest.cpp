@@ -225,6 +225,11 @@ TEST_F(FormBehaviour, ASecondFormIsRefusedWhileOneIsOpen) {
     EXPECT_TRUE(openTurntable([&](QDialog& form) {
         for (const QnZoetrixVexUiDialog dialog : allDialogs()) {
             front_end.clearPrinted();
+            QObject during_the_call;
+            QTimer::singleShot(0, &during_the_call, [] {
+                ADD_FAILURE() << "a second form waits for its answer";
+                QApplication::activeModalWidget()->close();
+            });
             EXPECT_FALSE(dialog(others, other));
             EXPECT_EQ(L"The form of another animation is open. Close it first. Nothing done\n",
                       printed());
