@@ -24,9 +24,10 @@ NSString* titleOf(NSButton* button) {
     return [button title];
 }
 
+/// GNUstep makes every text field of a nib editable that does not say otherwise; a label has no
+/// frame.
 bool isLabel(NSView* view) {
-    return
-        [view isKindOfClass:[NSTextField class]] && ![static_cast<NSTextField*>(view) isEditable];
+    return [view isKindOfClass:[NSTextField class]] && ![static_cast<NSTextField*>(view) isBezeled];
 }
 
 bool isPlainButton(NSView* view) {
@@ -36,6 +37,8 @@ bool isPlainButton(NSView* view) {
 void localize(NSView* view) {
     if (isLabel(view)) {
         auto* const label = static_cast<NSTextField*>(view);
+        [label setEditable:NO];
+        [label setSelectable:NO];
         [label setStringValue:localized([label stringValue], [label tag])];
     } else if (isPlainButton(view)) {
         auto* const button = static_cast<NSButton*>(view);

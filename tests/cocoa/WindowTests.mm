@@ -236,6 +236,8 @@ protected:
 TEST_F(GermanTurnTableWindow, SpeaksTheLanguageOfTheUser) {
     run([] {
         EXPECT_STREQ([[field(40007) stringValue] UTF8String], "Drehrichtung");
+        EXPECT_STREQ([[[NSApp modalWindow] title] UTF8String], "Drehteller-Animation");
+        EXPECT_FALSE([field(40007) isEditable]);
         EXPECT_STREQ([[buttonThatSends(@selector(cancelDialog:)) title] UTF8String], "Abbrechen");
         EXPECT_GT(photograph("turntable-de.png"), 8);
         pressCancel();
