@@ -71,7 +71,7 @@ TEST_F(ViewAreaTest, FramesHaveTheSizesOfTheirWidgets) {
     for (const QString& name : names())
         EXPECT_EQ(frameOf(name), view(name).size()) << name.toStdString();
     window.resize(1000, 800);
-    QCoreApplication::processEvents();
+    settle();
     for (const QString& name : names()) {
         EXPECT_EQ(frameOf(name), view(name).size()) << name.toStdString();
         EXPECT_EQ(view(name).picture().size(), view(name).size()) << name.toStdString();
@@ -105,11 +105,11 @@ TEST_F(ViewAreaTest, ModeOfOneViewLeavesTheOthers) {
 
 TEST_F(ViewAreaTest, FixedFrameKeepsItsSizeAndIsShownWhole) {
     choose("Perspective", "1920 × 1080");
-    QCoreApplication::processEvents();
+    settle();
     EXPECT_EQ(frameOf("Perspective"), QSize(1920, 1080));
     EXPECT_EQ(view("Perspective").picture().size(), QSize(1920, 1080));
     window.resize(1000, 800);
-    QCoreApplication::processEvents();
+    settle();
     EXPECT_EQ(frameOf("Perspective"), QSize(1920, 1080));
     choose("Perspective", "As in the window");
     EXPECT_EQ(frameOf("Perspective"), view("Perspective").size());
@@ -118,7 +118,7 @@ TEST_F(ViewAreaTest, FixedFrameKeepsItsSizeAndIsShownWhole) {
 TEST_F(ViewAreaTest, SizeThatACommandChoseIsKept) {
     run("_-ViewportSize 640 360");
     window.resize(1000, 800);
-    QCoreApplication::processEvents();
+    settle();
     EXPECT_EQ(frameOf("Perspective"), QSize(640, 360));
     EXPECT_EQ(frameOf("Top"), view("Top").size());
 }
@@ -140,7 +140,7 @@ TEST_F(ViewAreaTest, ClosedMaximizedViewLeavesTheOthersInSight) {
 }
 
 TEST_F(ViewAreaTest, EmptyDocumentSaysWhereModelsComeFrom) {
-    QCoreApplication::processEvents();
+    settle();
     const QImage with_words = view("Perspective").grab().toImage();
     readSlab();
     run("_-Select _All");
@@ -155,7 +155,7 @@ TEST_F(ViewAreaTest, PictureThatACommandShowsStaysAfterIt) {
     setUpTurntable(4);
     run("_-PlayAnimation");
     const QImage last_frame = view("Perspective").picture();
-    QCoreApplication::processEvents();
+    settle();
     EXPECT_EQ(view("Perspective").picture(), last_frame);
 }
 
