@@ -105,6 +105,7 @@ void MainWindow::buildMenus() {
 void MainWindow::connectParts() {
     connect(m_pane, &CommandPane::lineEntered, m_changes, &UnsavedChanges::start);
     connect(m_menus, &CommandMenus::lineChosen, m_changes, &UnsavedChanges::start);
+    connect(&m_menus->stopAction(), &QAction::triggered, m_pane, &CommandPane::cancelQuestion);
     connect(m_recent_files, &RecentFiles::lineChosen, m_changes, &UnsavedChanges::start);
     connect(m_recent_files, &RecentFiles::missing, this, &MainWindow::tell);
     connect(m_file_drop, &FileDrop::refused, this, &MainWindow::tell);
