@@ -19,7 +19,7 @@ std::vector<std::wstring> textsOf(const Completion& completion) {
 }
 
 const std::vector<CommandName> NAMES = {
-    {L"Help", L"Hilfe"}, {L"Hide", L"Hide"}, {L"SetTurntable", L"SetTurntable"}};
+    {L"Help", L"Hilfe", L""}, {L"Hide", L"Hide", L""}, {L"SetTurntable", L"SetTurntable", L""}};
 
 TEST(CommandCompletion, FindsNamesInAnyCaseAndBothLanguages) {
     EXPECT_THAT(textsOf(completeCommand(L"h", NAMES)), ElementsAre(L"Hilfe", L"Help", L"Hide"));
