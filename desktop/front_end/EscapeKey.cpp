@@ -28,9 +28,12 @@ void EscapeKey::notePress() {
     m_is_down = true;
 }
 
-/// A program that is no longer in front is not told when the key goes up.
+/// A press that is somebody's shortcut comes as the question about it alone. A program that is no
+/// longer in front is not told when the key goes up.
 bool EscapeKey::eventFilter(QObject* watched, QEvent* event) {
-    if (event->type() == QEvent::KeyPress && isEscape(*event))
+    const bool is_press =
+        event->type() == QEvent::KeyPress || event->type() == QEvent::ShortcutOverride;
+    if (is_press && isEscape(*event))
         notePress();
     else if (event->type() == QEvent::KeyRelease && isEscape(*event) &&
              !static_cast<QKeyEvent*>(event)->isAutoRepeat())

@@ -16,7 +16,7 @@ public:
     DuringPlay(CommandStarter& starter, std::function<void()> work) : m_work(std::move(work)) {
         connect(&starter, &CommandStarter::started, this, [this](const QString& line) {
             if (line.contains("PlayAnimation"))
-                QTimer::singleShot(60, this, m_work);
+                QTimer::singleShot(30, this, m_work);
         });
     }
 
@@ -44,7 +44,7 @@ TEST_F(MainWindowTest, TypedCommandIsRunAndItsWordsStandInTheOutput) {
 
 TEST_F(MainWindowTest, SecondCommandIsRefusedWhileOneRunsAndThePersonIsTold) {
     readSlab();
-    setUpTurntable(4);
+    setUpTurntable(60);
     QSignalSpy refused(&window.starter(), &CommandStarter::refused);
     DuringPlay second(window.starter(), [&] {
         EXPECT_TRUE(window.starter().isRunning());
@@ -78,7 +78,7 @@ TEST_F(MainWindowTest, EscapeEndsWhatPlays) {
     bool was_pressed = false;
     DuringPlay press(window.starter(), [&] {
         was_pressed = window.starter().isRunning();
-        QTest::keyClick(&window, Qt::Key_Escape);
+        QTest::keyPress(&window, Qt::Key_Escape);
     });
     QElapsedTimer clock;
     clock.start();
@@ -89,7 +89,7 @@ TEST_F(MainWindowTest, EscapeEndsWhatPlays) {
 
 TEST_F(MainWindowTest, ViewThatIsClosedWhileItPlaysStaysUntilTheCommandHasEnded) {
     readSlab();
-    setUpTurntable(3);
+    setUpTurntable(60);
     bool was_there = false;
     DuringPlay close(window.starter(), [&] {
         session.closeView(L"Perspective");
@@ -115,24 +115,24 @@ TEST_F(MainWindowTest, WindowRepaintsWhileItPlays) {
 
 TEST_F(MainWindowTest, ResizeWhileItPlaysTakesEffectAfterwards) {
     readSlab();
-    setUpTurntable(4);
+    setUpTurntable(60);
     QSize frame_meanwhile;
     const QSize frame_before = view("Perspective").size();
     DuringPlay resize(window.starter(), [&] {
         window.resize(1100, 820);
-        QCoreApplication::processEvents();
+        settle();
         auto& pipeline = *hostView("Perspective").MainViewport().DisplayPipeline();
         frame_meanwhile = {pipeline.FrameWidth(), pipeline.FrameHeight()};
     });
     run("_-PlayAnimation");
-    QCoreApplication::processEvents();
+    settle();
     EXPECT_EQ(frame_meanwhile, frame_before);
     EXPECT_NE(view("Perspective").size(), frame_before);
     EXPECT_EQ(view("Perspective").picture().size(), view("Perspective").size());
 }
 
 TEST_F(MainWindowTest, ScriptRunsInTheWindowAsOneCommand) {
-    writeFile(folder / "steps.txt", "_Point 1,2,3\n_Point 4,5,6\n");
+    quarn::test::writeFile(folder / "steps.txt", "_Point 1,2,3\n_Point 4,5,6\n");
     QSignalSpy ended(&window.starter(), &CommandStarter::ended);
     window.runScript(qtText(folder / "steps.txt"), false);
     EXPECT_EQ(ended.size(), 1);
@@ -149,7 +149,7 @@ TEST_F(MainWindowTest, SizeAndBordersComeBackInTheNextRun) {
 
 TEST_F(MainWindowTest, ExitClosesTheWindow) {
     run("_-Exit");
-    QCoreApplication::processEvents();
+    settle();
     EXPECT_FALSE(window.isVisible());
 }
 

@@ -22,7 +22,7 @@ protected:
         EXPECT_TRUE(load.ok()) << load.message;
         window.resize(900, 700);
         window.show();
-        QCoreApplication::processEvents();
+        settle();
     }
 
     static SessionOptions strictOptions(const std::filesystem::path& documents) {
@@ -31,15 +31,17 @@ protected:
         return options;
     }
 
+    /// Lets the window do what it put off: layouts, and the drawing of views.
+    static void settle() { QTest::qWait(20); }
     /// A slab of 4 by 4 by 1 about the origin's upper side, seen whole in all views.
     void readSlab() {
-        writeFile(folder / "slab.obj", "o Slab\n"
-                                       "v -2 -2 0\nv 2 -2 0\nv 2 2 0\nv -2 2 0\n"
-                                       "v -2 -2 1\nv 2 -2 1\nv 2 2 1\nv -2 2 1\n"
-                                       "f 4 3 2 1\nf 5 6 7 8\nf 1 2 6 5\nf 2 3 7 6\n"
-                                       "f 3 4 8 7\nf 4 1 5 8\n");
+        quarn::test::writeFile(folder / "slab.obj", "o Slab\n"
+                                                    "v -2 -2 0\nv 2 -2 0\nv 2 2 0\nv -2 2 0\n"
+                                                    "v -2 -2 1\nv 2 -2 1\nv 2 2 1\nv -2 2 1\n"
+                                                    "f 4 3 2 1\nf 5 6 7 8\nf 1 2 6 5\nf 2 3 7 6\n"
+                                                    "f 3 4 8 7\nf 4 1 5 8\n");
         run("_-Open \"" + qtText(folder / "slab.obj") + '"');
-        QCoreApplication::processEvents();
+        settle();
     }
     /// A turntable of the slab that plays in the view Perspective.
     void setUpTurntable(int frames) {
