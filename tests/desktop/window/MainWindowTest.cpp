@@ -72,21 +72,6 @@ TEST_F(MainWindowTest, StopEndsWhatPlaysAndTheNextCommandIsNotStopped) {
     EXPECT_FALSE(front_end.isInterrupted());
 }
 
-TEST_F(MainWindowTest, EscapeEndsWhatPlays) {
-    readSlab();
-    setUpTurntable(2000);
-    bool was_pressed = false;
-    DuringPlay press(window.starter(), [&] {
-        was_pressed = window.starter().isRunning();
-        QTest::keyPress(&window, Qt::Key_Escape);
-    });
-    QElapsedTimer clock;
-    clock.start();
-    run("_-PlayAnimation");
-    EXPECT_TRUE(was_pressed);
-    EXPECT_LT(clock.elapsed(), 20000) << "2000 frames would take longer";
-}
-
 TEST_F(MainWindowTest, ViewThatIsClosedWhileItPlaysStaysUntilTheCommandHasEnded) {
     readSlab();
     setUpTurntable(60);
