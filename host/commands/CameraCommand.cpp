@@ -1,37 +1,20 @@
+#include "host/commands/CameraForm.h"
 #include "host/commands/CommandEnd.h"
+#include "host/commands/FormAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/PointText.h"
-#include "host/document/CameraMove.h"
 #include "host/document/Document.h"
 #include "sdk/qncore/QnGet.h"
-
-#include <optional>
 
 namespace quarn {
 
 namespace {
 
-constexpr double SHORTEST_LENS_MM = 1.0;
-constexpr double LONGEST_LENS_MM = 10000.0;
-
-/// What the person wants of the camera; what is not there stays as it is.
-struct CameraWish {
-    std::optional<KM_3dPoint> location;
-    std::optional<KM_3dPoint> target;
-    std::optional<double> lens_mm;
-    bool parallel = false;
-};
-
-KM_3dPoint targetOf(const KM_Viewport& viewport) {
-    const KM_3dPoint& target = viewport.TargetPoint();
-    return target.IsValid() ? target : viewport.CameraLocation() + viewport.CameraDirection();
-}
-
-/// Turns a wish into prompts, and the answers into a viewport.
+/// Asks for the parts of a wish until Enter.
 class CameraQuestion {
 public:
-    explicit CameraQuestion(ViewState& view) : m_view(view) {
-        m_wish.parallel = view.viewport().IsParallelProjection();
+    explicit CameraQuestion(const KM_Viewport& viewport) : m_viewport(viewport) {
+        m_wish.parallel = viewport.IsParallelProjection();
         m_get.SetCommandPrompt(QnLocalizeString(L"Camera", 42001));
         m_get.AcceptNothing();
         m_location = m_get.AddCommandOption(QnLocalizeCommandOptionName(L"Location", 42001));
@@ -47,7 +30,7 @@ public:
         for (;;) {
             const CQuarnGet::result answer = m_get.GetOption();
             if (answer == CQuarnGet::nothing)
-                return moveView();
+                return CQuarnCommand::success;
             if (answer == CQuarnGet::string)
                 return failForWord(m_get.String(), "Location, Target, Lens, Parallel or _Enter");
             if (answer != CQuarnGet::option)
@@ -58,14 +41,15 @@ public:
         }
     }
 
+    const CameraWish& wish() const { return m_wish; }
+
 private:
     CQuarnCommand::result askPart(int option) {
-        const KM_Viewport& viewport = m_view.viewport();
         if (option == m_location)
-            return askPoint(QnLocalizeString(L"Camera location", 42002), viewport.CameraLocation(),
-                            m_wish.location);
+            return askPoint(QnLocalizeString(L"Camera location", 42002),
+                            m_viewport.CameraLocation(), m_wish.location);
         if (option == m_target)
-            return askPoint(QnLocalizeString(L"Camera target", 42003), targetOf(viewport),
+            return askPoint(QnLocalizeString(L"Camera target", 42003), cameraTarget(m_viewport),
                             m_wish.target);
         return option == m_lens ? askLens() : CQuarnCommand::success;
     }
@@ -90,7 +74,7 @@ private:
         get.SetLowerLimit(SHORTEST_LENS_MM);
         get.SetUpperLimit(LONGEST_LENS_MM);
         double present_mm = 0.0;
-        if (m_view.viewport().GetCamera35mmLensLength(&present_mm))
+        if (m_viewport.GetCamera35mmLensLength(&present_mm))
             get.SetDefaultNumber(present_mm);
         if (get.GetNumber() != CQuarnGet::number)
             return get.CommandResult();
@@ -98,24 +82,7 @@ private:
         return CQuarnCommand::success;
     }
 
-    CQuarnCommand::result moveView() {
-        KM_Viewport viewport = m_view.viewport();
-        const KM_3dPoint target = m_wish.target.value_or(targetOf(viewport));
-        const KM_3dPoint location = m_wish.location.value_or(viewport.CameraLocation());
-        if (m_wish.location || m_wish.target) {
-            if (!moveCamera(viewport, target, location, true))
-                return fail("The camera cannot stand at its target. Give another location or "
-                            "target.");
-            viewport.SetTargetPoint(target);
-        }
-        viewport.SetProjection(m_wish.parallel ? KM_parallel_view : KM_perspective_view);
-        if (m_wish.lens_mm && !viewport.SetCamera35mmLensLength(*m_wish.lens_mm))
-            return fail("A parallel view has no lens. Set Parallel=No or leave Lens out.");
-        m_view.setViewport(viewport, true, true);
-        return CQuarnCommand::success;
-    }
-
-    ViewState& m_view;
+    const KM_Viewport& m_viewport;
     CameraWish m_wish;
     CQuarnGetOption m_get;
     int m_location = 0;
@@ -123,10 +90,32 @@ private:
     int m_lens = 0;
 };
 
+CQuarnCommand::result askCamera(const CQuarnCommandContext& context, const KM_Viewport& viewport,
+                                CameraWish& wish) {
+    CameraForm form(viewport);
+    if (const auto answered = askInForm(context, form)) {
+        wish = form.wish();
+        return *answered;
+    }
+    CameraQuestion question(viewport);
+    const CQuarnCommand::result asked = question.run();
+    wish = question.wish();
+    return asked;
+}
+
 } // namespace
 
 CQuarnCommand::result runCamera(const CQuarnCommandContext& context) {
-    return CameraQuestion(Document::of(context.Document()).activeView()).run();
+    ViewState& view = Document::of(context.Document()).activeView();
+    KM_Viewport viewport = view.viewport();
+    CameraWish wish;
+    const CQuarnCommand::result asked = askCamera(context, viewport, wish);
+    if (asked != CQuarnCommand::success)
+        return asked;
+    if (const Result<void> moved = fulfil(wish, viewport); !moved)
+        return fail(moved.message());
+    view.setViewport(viewport, true, true);
+    return CQuarnCommand::success;
 }
 
 } // namespace quarn

@@ -1,6 +1,8 @@
 #include "host/commands/CommandEnd.h"
+#include "host/commands/FormAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/PictureSizePrompt.h"
+#include "host/commands/RenderSettingsForm.h"
 #include "host/document/Document.h"
 #include "sdk/qncore/QnGet.h"
 
@@ -73,14 +75,27 @@ private:
     int m_preview_samples = 0;
 };
 
+CQuarnCommand::result askSettings(const CQuarnCommandContext& context, RenderSettings& settings) {
+    const ViewState& view = Document::of(context.Document()).activeView();
+    RenderSettingsForm form(settings, view.frameWidth(), view.frameHeight());
+    if (const auto answered = askInForm(context, form)) {
+        settings = form.settings;
+        return *answered;
+    }
+    SettingsQuestion question(settings);
+    const CQuarnCommand::result asked = question.run();
+    settings = question.wish();
+    return asked;
+}
+
 } // namespace
 
 CQuarnCommand::result runRenderSettings(const CQuarnCommandContext& context) {
     RenderSettings& settings = Document::of(context.Document()).renderWindow().settings;
-    SettingsQuestion question(settings);
-    const CQuarnCommand::result asked = question.run();
+    RenderSettings wish = settings;
+    const CQuarnCommand::result asked = askSettings(context, wish);
     if (asked == CQuarnCommand::success)
-        settings = question.wish();
+        settings = wish;
     return asked;
 }
 

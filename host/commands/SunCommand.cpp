@@ -1,12 +1,18 @@
 #include "host/app/Application.h"
+#include "host/app/Border.h"
 #include "host/commands/CommandEnd.h"
+#include "host/commands/FormAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/NumberPrompt.h"
+#include "host/commands/SunForm.h"
 #include "host/commands/SunPlacePrompt.h"
 #include "host/commands/SunText.h"
 #include "host/document/Document.h"
 #include "host/document/SunDirection.h"
 #include "sdk/qncore/QnGet.h"
+#include "sdk/qncore/QnZoetrixDynamicAccess.h"
+
+#include <cmath>
 
 namespace quarn {
 
@@ -73,13 +79,61 @@ CQuarnCommand::result moveByPlaceAndTime(DocumentSun& sun) {
     if (!position)
         return fail("The sun has no known position for this place and time.");
     print(whereAndWhen(wish, *position));
+    sun.setLastPlaceAndTime({wish.site, wish.clock, wish.north_angle_deg});
     return moveTo(sun, {position->azimuth_deg + wish.north_angle_deg, position->altitude_deg});
 }
 
-} // namespace
+bool isOnEarth(const KM_3dmAnimationProperties& record) {
+    return std::abs(record.Latitude()) <= 90 && std::abs(record.Longitude()) <= 180;
+}
 
-CQuarnCommand::result runSun(const CQuarnCommandContext& context) {
-    DocumentSun& sun = Document::of(context.Document()).sun();
+/// Where a record has its sun study, at noon of the first day.
+PlaceAndTime placeAndTimeOf(const KM_3dmAnimationProperties& record) {
+    PlaceAndTime study;
+    study.site = {record.Latitude(), record.Longitude()};
+    study.clock.time = {record.StartYear(), record.StartMonth(), record.StartDay(), 12, 0, 0};
+    study.clock.zone_minutes = zoneOfLongitude(record.Longitude());
+    study.north_angle_deg = record.NorthAngle();
+    return study;
+}
+
+/// The place and time that a form begins with: the last ones, else those of the document's sun
+/// study. The record is looked at in place, as a copy of its point lists may be long; one from a
+/// file may hold what is no place and no day.
+PlaceAndTime placeAndTimeToOffer(Document& document) {
+    if (document.sun().lastPlaceAndTime())
+        return *document.sun().lastPlaceAndTime();
+    if (const IQnZoetrixDynamicAccess* access = Zoetrix_QuarnDynamicAccess()) {
+        const auto record =
+            acrossBorder([&] { return &access->AnimationProperties(document.face()); });
+        if (record && isOnEarth(*record.value())) {
+            const PlaceAndTime study = placeAndTimeOf(*record.value());
+            if (sunPositionAt(study.site, study.clock))
+                return study;
+        }
+    }
+    return placeAndTimeOf({});
+}
+
+CQuarnCommand::result takeOver(const SunForm& form, DocumentSun& sun) {
+    const PlaceAndTime& entered = form.placeAndTime();
+    sun.setLastPlaceAndTime(entered);
+    if (form.isByPlaceAndTime()) {
+        SunWish wish;
+        wish.site = entered.site;
+        wish.clock = entered.clock;
+        if (const auto position = sunPositionAt(wish.site, wish.clock))
+            print(whereAndWhen(wish, *position));
+    }
+    sun.beginChange();
+    if (const auto position = form.movedTo())
+        sun.setDirectionToSun(directionToSun(*position));
+    sun.setEnabled(form.isEnabled());
+    sun.endChange();
+    return showSun(sun);
+}
+
+CQuarnCommand::result askAndMove(DocumentSun& sun) {
     CQuarnGetOption get;
     get.SetCommandPrompt(QnLocalizeString(L"Sun", 42320));
     get.AcceptNothing();
@@ -98,6 +152,20 @@ CQuarnCommand::result runSun(const CQuarnCommandContext& context) {
     if (picked == on || picked == off)
         return enable(sun, picked == on);
     return picked == direction ? moveByAngles(sun) : moveByPlaceAndTime(sun);
+}
+
+} // namespace
+
+CQuarnCommand::result runSun(const CQuarnCommandContext& context) {
+    Document& document = Document::of(context.Document());
+    DocumentSun& sun = document.sun();
+    if (!mayAskInForm(context))
+        return askAndMove(sun);
+    SunForm form(sun, placeAndTimeToOffer(document));
+    const auto answered = askInForm(context, form);
+    if (!answered)
+        return askAndMove(sun);
+    return *answered == CQuarnCommand::success ? takeOver(form, sun) : *answered;
 }
 
 } // namespace quarn

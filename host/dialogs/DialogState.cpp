@@ -56,6 +56,18 @@ private:
 } // namespace
 
 int DialogState::show() {
+    if (const std::optional<int> ended = showWhereThereAreDialogs())
+        return *ended;
+    Application::current()->tell(
+        KM_wString::FormatToString(QnLocalizeString(L"The dialog \"%s\" cannot be shown: there is "
+                                                    L"no window here.",
+                                                    42411),
+                                   form.title.Array())
+            .ToUtf8());
+    return NOT_SHOWN;
+}
+
+std::optional<int> DialogState::showWhereThereAreDialogs() {
     Application* application = Application::forCall("CDialog::DoModal");
     if (!application || !mayOpen(*application))
         return NOT_SHOWN;
@@ -66,15 +78,7 @@ int DialogState::show() {
     }
     form = std::move(read.value());
     const auto made = application->frontEnd().makeDialog(form, parent ? parent->m_hWnd : nullptr);
-    if (made)
-        return runIn(*application, *made);
-    application->tell(KM_wString::FormatToString(
-                          QnLocalizeString(L"The dialog \"%s\" cannot be shown: there is no "
-                                           L"window here.",
-                                           42411),
-                          form.title.Array())
-                          .ToUtf8());
-    return NOT_SHOWN;
+    return made ? std::optional(runIn(*application, *made)) : std::nullopt;
 }
 
 Result<DialogTemplate> DialogState::readForm(Application& application) const {

@@ -28,6 +28,9 @@ struct DialogState final : DialogEvents {
     /// Reads the template, has the front end make the window, and runs in it.
     /// @return as CDialog::DoModal
     int show();
+    /// As show, but for a front end without dialogs, which is no fault here and not told.
+    /// @return nothing where there are no dialogs
+    std::optional<int> showWhereThereAreDialogs();
     /// Runs in a window. @return as CDialog::DoModal
     int showIn(DialogWindow& shown_window);
     /// Closes the window; only the first call counts.

@@ -2,10 +2,10 @@
 #include "host/dialogs/DialogState.h"
 #include "host/front_end/HeadlessDialogWindow.h"
 #include "host/prompt/NumberText.h"
+#include "host/prompt/UsersNumber.h"
 #include "sdk/qncore/QnDialog.h"
 #include "sdk/qncore/QnLocalize.h"
 
-#include <algorithm>
 #include <string>
 
 namespace {
@@ -22,13 +22,6 @@ bool begins(CQnDialogExchange& exchange, int control) {
         return false;
     exchange.SetLastControl(control);
     return true;
-}
-
-/// A number in the user's notation: a comma is a decimal mark as a point is. There may be one mark,
-/// so that a text with marks of thousands is no number.
-std::optional<double> readUsersNumber(std::wstring text) {
-    std::ranges::replace(text, L',', L'.');
-    return quarn::readNumber(text);
 }
 
 /// What a control shows; the part that it does not show is taken from `kept`.
@@ -72,7 +65,7 @@ void DDX_Text(CQnDialogExchange& exchange, int control, double& value) {
         exchange.Window().setText(control, quarn::numberText(value).View());
         return;
     }
-    const auto number = readUsersNumber(exchange.Window().text(control));
+    const auto number = quarn::readUsersNumber(exchange.Window().text(control));
     if (number)
         value = *number;
     else

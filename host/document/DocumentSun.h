@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/sun/ClockTime.h"
 #include "kelmar/KM_Light.h"
 #include "sdk/qncore/QnSun.h"
 
@@ -7,6 +8,13 @@
 #include <vector>
 
 namespace quarn {
+
+/// Where and when a sun is looked at.
+struct PlaceAndTime {
+    SunSite site{};
+    ClockTime clock;
+    double north_angle_deg = 0; ///< from the Y axis to north, clockwise seen from above
+};
 
 /// The sun of a document. A new one is on and stands in the south-east, halfway up: azimuth 135
 /// degrees clockwise from north (+Y), altitude 45 degrees.
@@ -36,6 +44,11 @@ public:
         m_state = {enabled, direction_to_sun};
     }
 
+    /// The place and time that the sun was put by last, to be offered again; nothing when none was
+    /// given since the document was opened. Files do not hold it, and the sun may be elsewhere.
+    const std::optional<PlaceAndTime>& lastPlaceAndTime() const { return m_last_place_and_time; }
+    void setLastPlaceAndTime(const PlaceAndTime& last) { m_last_place_and_time = last; }
+
     /// The light that the sun sheds; nothing while it is off.
     std::optional<KM_Light> light() const;
 
@@ -55,6 +68,7 @@ private:
 
     State m_state;
     std::vector<State> m_at_change_begin; ///< one for each open change
+    std::optional<PlaceAndTime> m_last_place_and_time;
     CQuarnSun m_face;
     bool m_is_open = true;
 };

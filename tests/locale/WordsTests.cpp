@@ -21,12 +21,12 @@ constexpr struct {
     std::string_view language;
     std::string_view word;
 } COGNATES[] = {
-    {"de", "Animation"}, {"de", "Name"},     {"de", "Radius"},    {"de", "Parallel"},
-    {"de", "Version"},   {"de", "Ids"},      {"de", "Standard"},  {"de", "Text"},
-    {"de", "Plug-ins"},  {"es", "No"},       {"es", "Ids"},       {"fr", "Animation"},
-    {"fr", "Direction"}, {"fr", "Distance"}, {"fr", "Version"},   {"fr", "Ids"},
-    {"fr", "Standard"},  {"fr", "Latitude"}, {"fr", "Longitude"}, {"fr", "Perspective"},
-    {"fr", "Point"},     {"ja", "Ids"},
+    {"de", "Animation"}, {"de", "Name"},     {"de", "Radius"},     {"de", "Parallel"},
+    {"de", "Version"},   {"de", "Ids"},      {"de", "Standard"},   {"de", "Text"},
+    {"de", "Plug-ins"},  {"es", "No"},       {"es", "Ids"},        {"fr", "Animation"},
+    {"fr", "Direction"}, {"fr", "Distance"}, {"fr", "Version"},    {"fr", "Ids"},
+    {"fr", "Standard"},  {"fr", "Latitude"}, {"fr", "Longitude"},  {"fr", "Perspective"},
+    {"fr", "Point"},     {"fr", "Date"},     {"fr", "Projection"}, {"ja", "Ids"},
 };
 
 /// English texts with more than one sense, which other languages have words of their own for.
