@@ -16,6 +16,11 @@ namespace {
 
 namespace fs = std::filesystem;
 
+/// Brackets in a label would be taken for patterns.
+QString labelOf(const FileKind& kind) {
+    return qtText(kind.label).replace('(', '[').replace(')', ']');
+}
+
 /// "OBJ models (*.obj *.OBJ)": the desktop's file systems tell upper from lower case.
 QString filterOf(const FileKind& kind) {
     QStringList patterns;
@@ -24,9 +29,7 @@ QString filterOf(const FileKind& kind) {
                  << "*." + QString::fromStdString(extension).toUpper();
     if (patterns.isEmpty())
         patterns << "*";
-    // Brackets in the label would be taken for patterns.
-    QString label = qtText(kind.label).replace('(', '[').replace(')', ']');
-    return label + " (" + patterns.join(' ') + ")";
+    return labelOf(kind) + " (" + patterns.join(' ') + ")";
 }
 
 QStringList filtersOf(const std::vector<FileKind>& kinds) {
@@ -66,10 +69,14 @@ bool endsWith(const std::string& extension, const FileKind& kind) {
     return std::ranges::find(kind.extensions, extension) != kind.extensions.end();
 }
 
-/// The kind whose filter is picked; the first where the window does not tell.
+/// The kind whose filter is picked; the first where the window does not tell. Some windows tell the
+/// filter, some the label that they show.
 std::size_t pickedKind(const FileBrowser& browser, const std::vector<FileKind>& kinds) {
-    const qsizetype index = filtersOf(kinds).indexOf(browser.selectedNameFilter());
-    return index < 0 ? 0 : static_cast<std::size_t>(index);
+    const QString told = browser.selectedNameFilter();
+    const auto picked = std::ranges::find_if(kinds, [&](const FileKind& kind) {
+        return told == filterOf(kind) || told == labelOf(kind);
+    });
+    return picked == kinds.end() ? 0 : static_cast<std::size_t>(picked - kinds.begin());
 }
 
 FileChoice chosen(FileBrowser& browser, const FileQuestion& question) {

@@ -3,10 +3,14 @@
 #include "desktop/Texts.h"
 #include "desktop/dialogs/MessageBox.h"
 
+#include <QDialogButtonBox>
 #include <QDir>
+#include <QEvent>
 #include <QGridLayout>
 #include <QGuiApplication>
 #include <QLabel>
+#include <QLineEdit>
+#include <QPushButton>
 
 namespace quarn::desktop {
 namespace {
@@ -23,6 +27,7 @@ FileBrowser::FileBrowser(QWidget* owner, const QString& title) : QFileDialog(own
     setObjectName("chooser");
     setWindowModality(Qt::ApplicationModal);
     setOption(QFileDialog::DontUseNativeDialog, !hasDesktop());
+    setOption(QFileDialog::HideNameFilterDetails); // some kinds have dozens of endings
     setLabelText(QFileDialog::LookIn, localized(L"Folder", 45322));
     setLabelText(QFileDialog::FileName, localized(L"Name", 45323));
     setLabelText(QFileDialog::FileType, localized(L"Kind", 45324));
@@ -38,6 +43,20 @@ void FileBrowser::askForFolder() {
         if (auto* const widget = findChild<QWidget*>(part))
             widget->hide();
     }
+    if (auto* const buttons = findChild<QDialogButtonBox*>("buttonBox"))
+        for (QAbstractButton* const button : buttons->buttons())
+            if (buttons->buttonRole(button) == QDialogButtonBox::AcceptRole)
+                button->installEventFilter(this);
+}
+
+/// A folder that is only a name as yet can be chosen, too.
+bool FileBrowser::eventFilter(QObject* watched, QEvent* event) {
+    auto* const button = qobject_cast<QPushButton*>(watched);
+    const auto* const name = findChild<QLineEdit*>("fileNameEdit");
+    if (button && event->type() == QEvent::EnabledChange && !button->isEnabled() && name &&
+        !name->text().trimmed().isEmpty())
+        button->setEnabled(true);
+    return QFileDialog::eventFilter(watched, event);
 }
 
 void FileBrowser::setMessage(const QString& message) {

@@ -22,6 +22,7 @@ public:
     void accept() override;
 
 private:
+    bool eventFilter(QObject* watched, QEvent* event) override;
     bool makeTypedFolder();
 };
 

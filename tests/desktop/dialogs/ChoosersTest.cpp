@@ -4,6 +4,7 @@
 
 #include <gtest/gtest.h>
 
+#include <QDialogButtonBox>
 #include <QFileDialog>
 #include <QLabel>
 #include <QLineEdit>
@@ -67,6 +68,21 @@ TEST_F(ChoosersTest, FolderThatIsNotThereYetIsMade) {
     onceShown("chooser", [&](QWidget& window) { enter(window, wanted); });
     EXPECT_EQ(askFolder(nullptr, L"Record", L"", m_folder.path()), wanted);
     EXPECT_TRUE(fs::is_directory(wanted));
+}
+
+TEST_F(ChoosersTest, FolderThatIsOfferedIsChosenByTheMouseAlone) {
+    const fs::path offered = m_folder.path() / "walk";
+    onceShown("chooser", [&](QWidget& window) {
+        EXPECT_EQ(part<QLineEdit>(window, "fileNameEdit").text(), "walk");
+        auto& buttons = part<QDialogButtonBox>(window, "buttonBox");
+        QPushButton* const choose = buttons.button(QDialogButtonBox::Open);
+        ASSERT_TRUE(choose);
+        EXPECT_TRUE(choose->isEnabled());
+        QTest::mouseClick(choose, Qt::LeftButton);
+        window.close();
+    });
+    EXPECT_EQ(askFolder(nullptr, L"Record", L"", offered), offered);
+    EXPECT_TRUE(fs::is_directory(offered));
 }
 
 TEST_F(ChoosersTest, FolderThatCannotBeMadeIsToldAndTheChooserStaysOpen) {
