@@ -1,0 +1,161 @@
+#include "tests/desktop_window/driver/Desk.h"
+#include "tests/desktop_window/driver/ReferencePicture.h"
+#include "tests/quarn/Models.h"
+#include "tests/quarn/Pictures.h"
+
+#include <algorithm>
+#include <gtest/gtest.h>
+
+namespace quarn::test {
+
+namespace {
+
+/// Opens the model of the home folder in the file chooser.
+void openHouse(Desk& desk) {
+    desk.chooseInMenu("command_Open");
+    desk.clickItem("treeView", "house.obj");
+    desk.clickButton("Open");
+    const Windows opened = desk.waitUntilIdle();
+    ASSERT_TRUE(opened.widget("output")->text.contains("house.obj: 2 objects with 24 triangles"));
+}
+
+/// Plays the animation to its end and sees the slider move.
+void play(Desk& desk, int last_frame) {
+    desk.click("play");
+    desk.lookUntil("a frame in the middle", [&](const Windows& seen) {
+        const SeenWidget* const number = seen.widget("frameNumber");
+        return number && number->value > 0 && number->value < last_frame;
+    });
+    const Windows ended = desk.waitUntilIdle();
+    EXPECT_EQ(ended.widget("frameNumber")->value, last_frame);
+}
+
+/// Records into the folder that the folder chooser offers.
+void record(Desk& desk) {
+    desk.click("record");
+    desk.click("option_TargetFolder");
+    desk.clickButton("Choose");
+    desk.click("promptOk");
+    desk.waitUntilIdle();
+}
+
+std::vector<std::string> frameNames(const std::string& name, const std::string& type, int count) {
+    std::vector<std::string> names = {name + ".html"};
+    for (int frame = 0; frame < count; ++frame) {
+        const std::string number = std::to_string(frame);
+        names.push_back(name + std::string(3 - number.size(), '0') + number + '.' + type);
+    }
+    std::ranges::sort(names);
+    return names;
+}
+
+void expectRecording(const std::filesystem::path& folder, const std::string& type, int count,
+                     QSize size_px) {
+    EXPECT_EQ(filesIn(folder), frameNames(folder.filename(), type, count));
+    for (const std::string& name : filesIn(folder)) {
+        if (name.ends_with(".html"))
+            continue;
+        const std::optional<PictureHeader> header = readPictureHeader(folder / name);
+        ASSERT_TRUE(header) << name;
+        EXPECT_EQ(header->format, type) << name;
+        EXPECT_EQ(header->width_px, size_px.width()) << name;
+        EXPECT_EQ(header->height_px, size_px.height()) << name;
+    }
+}
+
+/// "638 × 305", as it stands beside the Record button.
+QSize toldFrameSize(Desk& desk) {
+    const QStringList numbers = desk.widget("frameSize").text.split(QString::fromUtf8(" × "));
+    return {numbers.value(0).toInt(), numbers.value(1).toInt()};
+}
+
+QImage frame(const Desk& desk, int number) {
+    return QImage(QString("%1/Animation/Animation%2.jpg")
+                      .arg(QString::fromStdString(desk.documents()))
+                      .arg(number, 3, 10, QChar('0')));
+}
+
+/// Where a place is on a map of the whole earth.
+QPoint onMap(const QRect& map, double latitude_deg, double longitude_deg) {
+    const double pixels_per_degree = map.width() / 360.0;
+    return map.topLeft() + QPoint(qRound((longitude_deg + 180.0) * pixels_per_degree),
+                                  qRound((90.0 - latitude_deg) * pixels_per_degree));
+}
+
+void openPage(Desk& desk, const std::filesystem::path& page) {
+    desk.click("openPageButton");
+    desk.lookUntil("the opener called",
+                   [&](const Windows&) { return !desk.openedFiles().empty(); });
+    EXPECT_EQ(desk.openedFiles(), page.string() + '\n');
+    desk.waitUntilIdle();
+}
+
+TEST(MouseAlone, ATurntableIsSetUpPlayedRecordedAndItsPageOpened) {
+    Desk desk;
+    writeHouse(desk.documents() / "house.obj");
+    desk.start();
+    openHouse(desk);
+
+    desk.chooseInMenu("command_SetTurntableAnimation");
+    desk.choose("direction", "AntiClockwise");
+    desk.choose("fileType", "png");
+    desk.choose("captureMethod", "RenderedViewport");
+    desk.choose("viewport", "Perspective");
+    desk.stepTo("frames", 96);
+    EXPECT_EQ(compareWithReference(desk.stillPicture(), "turntable-form"), "");
+    desk.click("ok");
+    desk.waitUntilIdle();
+
+    play(desk, 95);
+    EXPECT_EQ(compareWithReference(desk.stillPicture(), "turntable-played"), "");
+    record(desk);
+    expectRecording(desk.documents() / "Animation", "png", 96, toldFrameSize(desk));
+    openPage(desk, desk.documents() / "Animation" / "Animation.html");
+}
+
+/// The place is Athens, whose coordinates the table of cities has.
+TEST(MouseAlone, ADayOfSunAtAPlaceOfTheMapIsSetUpPlayedAndRecorded) {
+    Desk desk;
+    writeHouse(desk.documents() / "house.obj");
+    desk.start();
+    openHouse(desk);
+
+    desk.chooseInMenu("command_SetOneDaySunAnimation");
+    desk.click("choosePlace");
+    desk.display().click(onMap(desk.widget("map").place, 37.98, 23.73));
+    desk.waitForText("latitude", "37.98");
+    desk.waitForText("longitude", "23.73");
+    EXPECT_EQ(compareWithReference(desk.stillPicture(), "place-picker"), "");
+    desk.click("ok");
+    desk.waitUntilGone("map");
+    desk.waitForText("latitude", "37.98");
+    desk.waitForText("longitude", "23.73");
+    desk.choose("captureMethod", "RenderedViewport");
+    desk.choose("viewport", "Perspective");
+    desk.stepTo("minutes", 60);
+    desk.click("ok");
+    desk.waitUntilIdle();
+
+    // On the hour, from six in the morning to six in the evening.
+    play(desk, 12);
+    EXPECT_TRUE(desk.widget("frameDate").text.contains("18:00"));
+    record(desk);
+    expectRecording(desk.documents() / "Animation", "jpg", 13, toldFrameSize(desk));
+    const QImage morning = frame(desk, 0);
+    const QImage noon = frame(desk, 6);
+    EXPECT_GT(differenceOf(morning, noon).differing_share, 0.02) << "no shadow has moved";
+    openPage(desk, desk.documents() / "Animation" / "Animation.html");
+}
+
+/// References are worth something only where another window is told from them.
+TEST(MouseAlone, AnotherWindowIsToldFromTheReferences) {
+    Desk desk;
+    desk.start();
+    const QImage empty = desk.stillPicture();
+    for (const char* const name : {"turntable-form", "turntable-played", "place-picker"})
+        EXPECT_NE(compareWithReference(empty, name), "") << name;
+}
+
+} // namespace
+
+} // namespace quarn::test
