@@ -145,8 +145,8 @@ TEST_F(GermanPage, HasItsTextsInTheUsersLanguage) {
     EXPECT_THAT(page, HasSubstr(L">Endlos wiederholen\n"));
     EXPECT_THAT(page, HasSubstr(L">Bildzähler anzeigen\n"));
     EXPECT_THAT(page, HasSubstr(L"Animation erstellt mit <A HREF"));
-    EXPECT_THAT(page, HasSubstr(L"onDblClick=\"start_stop()\">Stopp</BUTTON>"));
-    EXPECT_THAT(page, HasSubstr(L".textContent = \"Stopp\";"));
+    EXPECT_THAT(page, HasSubstr(L"onDblClick=\"start_stop()\">Anhalten</BUTTON>"));
+    EXPECT_THAT(page, HasSubstr(L".textContent = \"Anhalten\";"));
     EXPECT_THAT(page, Not(HasSubstr(L"\"Stop\"")));
 }
 
