@@ -213,6 +213,29 @@ TEST_F(CameraForms, SelectionsOutsideTheirListsShowTheFirstEntry) {
     }
 }
 
+TEST_F(CameraForms, FirstTimeInADocumentOffersTheActiveViewAsItIsDrawn) {
+    lists.viewports.selection = 0;
+    lists.captures = listOf({L"RenderFull", L"RenderPreview", L"Wireframe", L"Shaded", L"Rendered",
+                             L"Translucent", L"X-Ray", L"Drawing", L"Clay"},
+                            2);
+    EXPECT_TRUE(openTurntable([](QDialog& form) {
+        EXPECT_EQ("Perspective", textIn(form, "viewport"));
+        EXPECT_EQ("Shaded", textIn(form, "captureMethod")) << "as a new Perspective is drawn";
+        form.accept();
+    }));
+    EXPECT_EQ(3, lists.viewports.selection);
+    EXPECT_EQ(3, lists.captures.selection);
+
+    record.SetViewportName(L"Top");
+    lists.viewports.selection = 0;
+    lists.captures.selection = 2;
+    EXPECT_FALSE(openTurntable([](QDialog& form) {
+        EXPECT_EQ("Top", textIn(form, "viewport"));
+        EXPECT_EQ("Wireframe", textIn(form, "captureMethod"));
+        form.reject();
+    }));
+}
+
 TEST_F(CameraForms, EmptyListsAreShownDisabledAndKeepTheirSelection) {
     lists.files = lists.captures = lists.viewports = lists.directions = listOf({}, 5);
     EXPECT_TRUE(openTurntable([](QDialog& form) {

@@ -2,6 +2,7 @@
 
 #include "vexui/Texts.h"
 #include "vexui/forms/CountField.h"
+#include "vexui/forms/FirstChoices.h"
 
 #include <QComboBox>
 #include <QDialogButtonBox>
@@ -134,6 +135,7 @@ RecordingFields Form::addRecording(const IZoetrixDataUI& lists,
                  {"viewport", localText(L"&Viewport:", 44024),
                   localText(L"The viewport that shows the animation and is recorded", 44044)},
                  lists.ViewportList(), lists.ViewportListSelection());
+    offerWhatIsSeen(fields, lists, record);
     fields.name = new QLineEdit(toQt(record.HtmlFilename()), this);
     addField(section,
              {"name", localText(L"&Name:", 44025),
