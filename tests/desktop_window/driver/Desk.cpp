@@ -19,6 +19,7 @@ using Clock = std::chrono::steady_clock;
 constexpr std::chrono::seconds LONGEST_WAIT{60};
 constexpr std::chrono::milliseconds BETWEEN_LOOKS{20};
 constexpr std::chrono::milliseconds STILL{250};
+constexpr std::chrono::milliseconds DOUBLE_CLICK{450};
 constexpr unsigned ESCAPE = 0xff1b;
 
 void writeProgram(const std::filesystem::path& file, const std::string& script) {
@@ -220,6 +221,8 @@ void Desk::choose(const QString& combo_box, const QString& entry) {
     };
     const Windows open = lookUntil((entry + " in the list of " + combo_box).toStdString(),
                                    [&](const Windows& seen) { return listWith(seen) != nullptr; });
+    // Where the entry lies under the mouse already, a quicker click belongs to the opening one.
+    std::this_thread::sleep_for(DOUBLE_CLICK);
     m_display->click(listWith(open)->place.center());
     lookUntil((combo_box + " showing " + entry).toStdString(), [&](const Windows& seen) {
         const SeenWidget* const box = seen.widget(combo_box);
