@@ -51,7 +51,7 @@ void CommandStarter::stop() {
 
 void CommandStarter::refuse() {
     const QString reason =
-        localized(L"%1 is still running. End it first, with Escape or the Stop button.", 45001)
+        localized(L"%1 is still running. End it first, with Stop (Shift+F5).", 45001)
             .arg(m_line.section(' ', 0, 0));
     m_front_end.print(wideText(reason + '\n').View());
     emit refused(reason);
