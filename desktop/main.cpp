@@ -3,6 +3,7 @@
 #include "desktop/window/Arguments.h"
 #include "desktop/window/CommandStarter.h"
 #include "desktop/window/InstalledFiles.h"
+#include "desktop/window/Language.h"
 #include "desktop/window/MainWindow.h"
 
 #include <QApplication>
@@ -24,6 +25,7 @@ void openFile(MainWindow& window, const QString& file) {
 }
 
 int runWindow(QApplication& application, const Arguments& arguments) {
+    const Language language(arguments.language);
     DesktopFrontEnd front_end;
     quarn::Session session(front_end, sessionOptions(arguments.language.toStdString()));
     const quarn::PlugInLoad load = session.loadPlugIn(plugInFolder() / "Zoetrix.qnp");

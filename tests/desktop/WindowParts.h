@@ -24,11 +24,13 @@ inline std::filesystem::path programTree() {
 
 inline SessionOptions sessionOptions(const std::string& language,
                                      const std::filesystem::path& documents_folder) {
-    const std::filesystem::path locale = programTree() / "share" / "quarn" / "locale";
+    const std::filesystem::path shared = programTree() / "share" / "quarn";
+    const std::filesystem::path locale = shared / "locale";
     SessionOptions options;
     options.plug_in_folders = {programTree() / "lib" / "quarn" / "plug-ins"};
     options.locale_folders = {locale / "host"};
     options.program_locale_folder = locale / "desktop";
+    options.dialog_folders = {shared / "dialogs"};
     options.language = language;
     options.documents_folder = documents_folder;
     return options;
