@@ -25,7 +25,8 @@ Arguments readArguments(const QStringList& arguments) {
                                       "code");
     const QCommandLineOption script("run-script", "Runs the command lines of a file in the window.",
                                     "script");
-    const QCommandLineOption exit("exit", "Ends when the script has ended.");
+    const QCommandLineOption exit(
+        "exit", "Ends when the script has ended: with 0, or with 1 where a command failed.");
     parser.addOptions({help, version, language, script, exit});
 
     Arguments read;

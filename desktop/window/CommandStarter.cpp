@@ -20,11 +20,13 @@ void CommandStarter::start(const QString& line) {
     runBetween(trimmed, [&] { return m_session.runCommand(wideText(trimmed).View(), true); });
 }
 
-void CommandStarter::startScript(const QString& file) {
+bool CommandStarter::startScript(const QString& file) {
+    bool has_succeeded = false;
     runBetween(file, [&] {
-        return m_session.runScriptFile(nativePath(file)) ? CQuarnCommand::success
-                                                         : CQuarnCommand::failure;
+        has_succeeded = m_session.runScriptFile(nativePath(file));
+        return has_succeeded ? CQuarnCommand::success : CQuarnCommand::failure;
     });
+    return has_succeeded;
 }
 
 void CommandStarter::runBetween(const QString& line,

@@ -28,8 +28,8 @@ public slots:
     /// command has ended. While another one runs nothing is started and the person is told.
     void start(const QString& line);
     /// Runs the command lines of a script file one after the other, without dialogs; to whoever
-    /// watches, as one command.
-    void startScript(const QString& file);
+    /// watches, as one command. @return whether every command succeeded
+    bool startScript(const QString& file);
     /// Asks the running command to end: until the outermost command has ended, the front end
     /// counts as interrupted and Escape as held down. Without one it does nothing.
     void stop();

@@ -189,9 +189,9 @@ void MainWindow::tell(const QString& message) {
 }
 
 void MainWindow::runScript(const QString& file, bool wants_exit) {
-    m_starter->startScript(file);
-    if (wants_exit)
-        QTimer::singleShot(0, qApp, &QCoreApplication::quit);
+    const bool has_succeeded = m_starter->startScript(file);
+    if (wants_exit) // without the question about changes that closing the window asks
+        QTimer::singleShot(0, qApp, [=] { QCoreApplication::exit(has_succeeded ? 0 : 1); });
 }
 
 void MainWindow::restoreLayout() {

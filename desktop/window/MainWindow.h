@@ -38,7 +38,8 @@ public:
 
     /// Runs the command lines of a script file, as a program without a person does, while the
     /// window shows what happens.
-    /// @param wants_exit  closes the window afterwards, without a question
+    /// @param wants_exit  ends the program afterwards, without a question: with 0 where every
+    ///                    command succeeded, else with 1
     void runScript(const QString& file, bool wants_exit);
     /// Size, place and borders of the last run (QSettings); a good size where there was none.
     void restoreLayout();
