@@ -180,8 +180,8 @@ void MainWindow::showRenderedPicture(const ShownPicture& picture) {
 
 void MainWindow::showRenderProgress(double share) {
     m_animation->pictureRendered(share);
-    if (m_render_window)
-        m_render_window->showProgress(share);
+    if (share < 1.0 || m_render_window)
+        renderWindow().showProgress(share);
 }
 
 void MainWindow::tell(const QString& message) {
