@@ -107,7 +107,8 @@ void RecentFiles::fillMenu() {
     m_menu->clear();
     int number = 1;
     for (const QString& file : m_files) {
-        QAction* const action = m_menu->addAction(captionOf(file, number++));
+        QAction* const action = m_menu->addAction(captionOf(file, number));
+        action->setObjectName(QString("recentFile%1").arg(number++));
         action->setData(file);
         connect(action, &QAction::triggered, this, [this, file] { open(file); });
     }

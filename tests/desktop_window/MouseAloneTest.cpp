@@ -1,6 +1,5 @@
-#include "tests/desktop_window/driver/Desk.h"
+#include "tests/desktop_window/HouseDesk.h"
 #include "tests/desktop_window/driver/ReferencePicture.h"
-#include "tests/quarn/Models.h"
 #include "tests/quarn/Pictures.h"
 
 #include <algorithm>
@@ -9,15 +8,6 @@
 namespace quarn::test {
 
 namespace {
-
-/// Opens the model of the home folder in the file chooser.
-void openHouse(Desk& desk) {
-    desk.chooseInMenu("command_Open");
-    desk.clickItem("treeView", "house.obj");
-    desk.clickButton("Open");
-    const Windows opened = desk.waitUntilIdle();
-    ASSERT_TRUE(opened.widget("output")->text.contains("house.obj: 2 objects with 24 triangles"));
-}
 
 /// Plays the animation to its end and sees the slider move.
 void play(Desk& desk, int last_frame) {
@@ -91,10 +81,9 @@ void openPage(Desk& desk, const std::filesystem::path& page) {
 }
 
 TEST(MouseAlone, ATurntableIsSetUpPlayedRecordedAndItsPageOpened) {
-    Desk desk;
-    writeHouse(desk.documents() / "house.obj");
+    HouseDesk desk;
     desk.start();
-    openHouse(desk);
+    desk.openHouse();
 
     desk.chooseInMenu("command_SetTurntableAnimation");
     desk.choose("direction", "AntiClockwise");
@@ -115,10 +104,9 @@ TEST(MouseAlone, ATurntableIsSetUpPlayedRecordedAndItsPageOpened) {
 
 /// The place is Athens, whose coordinates the table of cities has.
 TEST(MouseAlone, ADayOfSunAtAPlaceOfTheMapIsSetUpPlayedAndRecorded) {
-    Desk desk;
-    writeHouse(desk.documents() / "house.obj");
+    HouseDesk desk;
     desk.start();
-    openHouse(desk);
+    desk.openHouse();
 
     desk.chooseInMenu("command_SetOneDaySunAnimation");
     desk.click("choosePlace");

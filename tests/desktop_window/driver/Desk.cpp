@@ -244,26 +244,62 @@ void Desk::stepTo(const QString& number, int value) {
 }
 
 void Desk::chooseInMenu(const QString& action) {
-    const auto titleOf = [&](const Windows& seen) -> const SeenItem* {
-        for (const SeenWidget& bar : seen.widgets)
-            for (const SeenItem& title : bar.items)
-                if (bar.classes.contains("QMenuBar") && title.holds.contains(action))
+    const auto titleOf = [&](const Windows& seen, const char* kind) -> const SeenItem* {
+        for (const SeenWidget& menu : seen.widgets)
+            for (const SeenItem& title : menu.items)
+                if (menu.classes.contains(kind) && title.holds.contains(action) && title.is_enabled)
                     return &title;
         return nullptr;
     };
-    const Windows closed = lookUntil("a menu with " + action.toStdString(),
-                                     [&](const Windows& seen) { return titleOf(seen) != nullptr; });
-    m_display->click(titleOf(closed)->place.center());
-    const Windows open =
-        lookUntil(action.toStdString() + ", enabled in its menu", [&](const Windows& seen) {
-            const SeenWidget* const menu = seen.menuWith(action);
-            return menu && menu->item(action)->is_enabled;
-        });
+    const Windows closed =
+        lookUntil("a menu with " + action.toStdString(),
+                  [&](const Windows& seen) { return titleOf(seen, "QMenuBar") != nullptr; });
+    m_display->click(titleOf(closed, "QMenuBar")->place.center());
+    Windows open = lookUntil(action.toStdString() + " in an open menu", [&](const Windows& seen) {
+        return seen.menuWith(action) || titleOf(seen, "QMenu");
+    });
+    if (!open.menuWith(action))
+        m_display->click(titleOf(open, "QMenu")->place.center());
+    open = lookUntil(action.toStdString() + ", enabled in its menu", [&](const Windows& seen) {
+        const SeenWidget* const menu = seen.menuWith(action);
+        return menu && menu->item(action)->is_enabled;
+    });
     m_display->click(open.menuWith(action)->item(action)->place.center());
 }
 
+/// A window manager would have given the window in front the keyboard.
 void Desk::escape() {
+    const Windows seen = look();
+    for (const SeenWidget& window : seen.widgets)
+        if (window.is_window &&
+            (window.is_in_front || (window.name == "mainWindow" && seen.modalWindows().isEmpty())))
+            m_display->giveKeyboard(window.window_id);
     m_display->tapKey(ESCAPE);
+}
+
+void Desk::giveUp(const std::function<void(const Windows&)>& how) {
+    constexpr std::chrono::milliseconds TO_ACT{60};
+    const Clock::time_point deadline = Clock::now() + LONGEST_WAIT;
+    for (Windows seen = look(); seen.isCommandRunning() || !seen.modalWindows().isEmpty();
+         seen = look()) {
+        if (Clock::now() > deadline)
+            fail("it cannot be given up");
+        how(seen);
+        std::this_thread::sleep_for(TO_ACT);
+    }
+}
+
+void Desk::cancel(const Windows& seen) {
+    for (const char* const name : {"cancel", "promptCancel", "keepDocument"})
+        if (const SeenWidget* const button = seen.widget(name); button && button->is_enabled) {
+            m_display->click(button->place.center());
+            return;
+        }
+    const SeenWidget* const button = seen.button("Cancel");
+    if (button && button->is_in_front)
+        m_display->click(button->place.center());
+    else
+        escape();
 }
 
 void Desk::closeWindow(const QString& window_name) {

@@ -63,9 +63,15 @@ public:
     /// Opens a menu of the menu bar and clicks an entry in it.
     /// @param action  its name, as `command_Open`
     void chooseInMenu(const QString& action);
+    /// Presses Escape in the window that is in front.
     void escape();
     /// The button in the frame of a window.
     void closeWindow(const QString& window_name);
+
+    /// Gives up whatever is asked, in dialogs, choosers and questions, until the program is idle.
+    void giveUp(const std::function<void(const Windows&)>& how);
+    /// A click on Cancel, wherever it stands; Escape where it stands nowhere.
+    void cancel(const Windows& seen);
 
     /// The screen, once it shows the same for a moment.
     QImage stillPicture();
