@@ -9,6 +9,7 @@
 #include <QApplication>
 #include <QTimer>
 
+#include <csignal>
 #include <cstdio>
 
 namespace {
@@ -60,6 +61,7 @@ int main(int argument_count, char** arguments) {
         return answer(typed.answer, stdout, 0);
     if (const QString why = whyNoWindow(); !why.isEmpty())
         return answer("quarn-desktop: " + why + "\n", stderr, 1);
+    std::signal(SIGXFSZ, SIG_IGN); // a file that may not grow is a write that fails, no crash
     QApplication application(argument_count, arguments);
     QApplication::setOrganizationName("Quarn");
     QApplication::setApplicationName("quarn-desktop");
