@@ -135,7 +135,7 @@ void RayScene::build(std::vector<Member> members) {
     m_surface_places.clear();
     m_surface_places.reserve(m_members.size()); // and these into that
     m_places.assign(m_members.size(), {});
-    m_top = RaySceneHandle(rtcNewScene(m_device.get()));
+    m_top = makeScene();
     m_placed_meshes.clear();
     for (const Member& member : m_members)
         if (!member.frame_from_mesh.IsIdentity())
@@ -180,9 +180,16 @@ std::vector<std::size_t> RayScene::smallMembersBySpace() const {
     return order;
 }
 
+/// Rays can gather all that they meet there.
+RaySceneHandle RayScene::makeScene() const {
+    RaySceneHandle scene(rtcNewScene(m_device.get()));
+    rtcSetSceneFlags(scene.get(), RTC_SCENE_FLAG_CONTEXT_FILTER_FUNCTION);
+    return scene;
+}
+
 std::shared_ptr<RayScene::Group> RayScene::makeGroup() const {
     auto group = std::make_shared<Group>();
-    group->scene = RaySceneHandle(rtcNewScene(m_device.get()));
+    group->scene = makeScene();
     group->changed = true;
     return group;
 }

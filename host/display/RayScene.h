@@ -98,6 +98,7 @@ private:
     void addInstance(std::shared_ptr<Group> group, const KM_Xform& frame_from_mesh);
     void place(std::size_t member, unsigned geometry);
     RayGeometry makeTriangles(std::size_t member) const;
+    RaySceneHandle makeScene() const;
     std::shared_ptr<Group> makeGroup() const;
     SoleGroups soleGroups() const;
     std::vector<std::size_t> smallMembersBySpace() const;

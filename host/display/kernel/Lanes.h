@@ -125,6 +125,10 @@ inline float laneOf(const Lanes& a, int lane) {
 inline LaneInts bitsOf(const Lanes& a) {
     return eachPart<LaneInts>([&](int p) { return reinterpret_cast<NativeInts>(a.part[p]); });
 }
+/// The float that has these bits.
+inline Lanes floatsWith(const LaneInts& a) {
+    return eachPart<Lanes>([&](int p) { return reinterpret_cast<NativeFloats>(a.part[p]); });
+}
 /// from[index] for each lane.
 inline LaneInts gathered(const std::uint32_t* from, const LaneInts& index) {
     return eachPart<LaneInts>([&](int p) { return nativeGather(from, index.part[p]); });
@@ -150,6 +154,12 @@ inline Lanes load(const float* from) {
 inline LaneInts load(const unsigned* from) {
     return eachPart<LaneInts>(
         [&](int p) { return *(reinterpret_cast<const NativeInts*>(from) + p); });
+}
+/// 0 to 15.
+inline LaneInts laneNumbers() {
+    alignas(64) constexpr unsigned numbers[lane_count] = {0, 1, 2,  3,  4,  5,  6,  7,
+                                                          8, 9, 10, 11, 12, 13, 14, 15};
+    return load(numbers);
 }
 inline void store(float* to, const Lanes& a) {
     for (int p = 0; p < lane_parts; ++p)

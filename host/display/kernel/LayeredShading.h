@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/display/kernel/Background.h"
+#include "host/display/kernel/LayerHits.h"
 #include "host/display/kernel/SurfaceShading.h"
 
 namespace quarn {
@@ -45,8 +46,10 @@ inline void keepLayer(const FrameSetup& frame, const RayPacket& packet, int laye
     }
 }
 
-/// Lays one surface after the other under what was seen so far. `packet` holds the first hits.
-inline LaneColors shadeLayers(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfaces) {
+/// Lays one surface after the other under what was seen so far.
+/// @param packet  holds the first of `hits`, and `surfaces` what they are
+inline LaneColors shadeLayers(const FrameSetup& frame, RayPacket& packet, LayerHits& hits,
+                              SurfaceLanes& surfaces) {
     const LaneMask active = packet.active;
     LaneColors left{1.0F, 1.0F, 1.0F}; // what still comes through
     LaneColors sum{0.0F, 0.0F, 0.0F};
@@ -63,11 +66,9 @@ inline LaneColors shadeLayers(const FrameSetup& frame, RayPacket& packet, Surfac
         packet.active = packet.hit & seen;
         // Faces that lie on each other count as one layer everywhere, not now one and now two.
         const Lanes beyond = packet.distance * 1.00002F + 1e-5F * frame.scene_size;
-        store(packet.rays.ray.tnear, select(packet.active, beyond, 0.0F));
-        intersect(frame, packet);
+        hits.next(frame, packet, beyond);
         readSurfaces(frame, packet, surfaces);
     }
-    store(packet.rays.ray.tnear, 0.0F);
     packet.active = active;
     const LaneColors behind = backgroundColors(frame, packet);
     return {sum.r + left.r * behind.r, sum.g + left.g * behind.g, sum.b + left.b * behind.b};

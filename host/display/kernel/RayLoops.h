@@ -29,21 +29,38 @@ struct TracedPacket {
     Lanes nearness;
 };
 
+/// What the packet met first.
+inline TracedPacket firstMet(const FrameSetup& frame, const RayPacket& packet,
+                             SurfaceLanes& surfaces) {
+    readSurfaces(frame, packet, surfaces);
+    TracedPacket traced;
+    traced.objects = select(packet.hit, surfaces.surface + LaneInts(1), LaneInts(0));
+    traced.nearness = nearnessOf(frame, packet);
+    return traced;
+}
+
+/// Finds what aimed rays see where every surface lets some of what is behind it through.
+[[gnu::noinline]] TracedPacket traceLayers(const FrameSetup& frame, RayPacket& packet) {
+    LayerHits hits(frame, packet);
+    hits.next(frame, packet, 0.0F);
+    SurfaceLanes surfaces;
+    TracedPacket traced = firstMet(frame, packet, surfaces);
+    traced.pixels = encoded(frame, shadeLayers(frame, packet, hits, surfaces));
+    return traced;
+}
+
 /// Shoots the packet's rays and finds the colours that they see.
 inline TracedPacket trace(const FrameSetup& frame, RayPacket& packet) {
     aim(frame, packet);
+    if (frame.layers.count > 1)
+        return traceLayers(frame, packet);
     intersect(frame, packet);
-    TracedPacket traced;
-    traced.nearness = nearnessOf(frame, packet);
     SurfaceLanes surfaces;
-    readSurfaces(frame, packet, surfaces);
-    traced.objects = select(packet.hit, surfaces.surface + LaneInts(1), LaneInts(0));
+    TracedPacket traced = firstMet(frame, packet, surfaces);
     if (frame.has_see_through)
         traced.pixels = encoded(frame, shadeThroughPanes(frame, packet, surfaces, traced.nearness));
     else
-        traced.pixels =
-            encoded(frame, frame.layers.count > 1 ? shadeLayers(frame, packet, surfaces)
-                                                  : shadeOpaque(frame, packet, surfaces));
+        traced.pixels = encoded(frame, shadeOpaque(frame, packet, surfaces));
     return traced;
 }
 
