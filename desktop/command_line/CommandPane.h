@@ -30,6 +30,8 @@ public:
     bool isAsking() const { return !m_asked.empty(); }
     /// What kind of answer is wanted now; nothing while none is.
     std::optional<Question::Kind> askedKind() const;
+    /// Whether a text that is given now is a point.
+    bool takesPoint() const { return isAsking() && m_asked.back()->question.takes_points; }
 
     OutputPane& output() { return *m_output; }
     CommandEdit& line() { return *m_line; }

@@ -2,25 +2,12 @@
 
 #include "desktop/Texts.h"
 
-#include <algorithm>
-
 namespace quarn::desktop {
-
-namespace {
-
-constexpr const char* DRAWING_COMMANDS[] = {"Circle",   "Line",          "Point",
-                                            "Polyline", "SplineThrough", "Spline"};
-
-} // namespace
 
 KM_wString objectWord(const CQuarnDoc& document, const PickedObject& picked) {
     const CQuarnObject* const named = document.FindObjectByName(picked.name);
     const bool finds_it = named && named->Id() == picked.id;
     return finds_it ? picked.name : KM_UuidToString(picked.id);
-}
-
-bool asksForPoints(const QString& english_name) {
-    return std::ranges::find(DRAWING_COMMANDS, english_name) != std::end(DRAWING_COMMANDS);
 }
 
 /// No word of a line can hold a double quote.

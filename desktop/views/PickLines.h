@@ -15,10 +15,6 @@ QString selectLine(const CQuarnDoc& document, const std::optional<PickedObject>&
 /// A picked object as an answer: the name where it finds this very object; else the id.
 KM_wString objectWord(const CQuarnDoc& document, const PickedObject& picked);
 
-/// Whether the questions of a command that offer options ask for points.
-/// @param english_name  of the command
-bool asksForPoints(const QString& english_name);
-
 /// A point as a question for points takes it: "1.25,0,-3", with as many digits as a click has.
 KM_wString pointText(const KM_3dPoint& point);
 

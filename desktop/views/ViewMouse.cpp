@@ -2,7 +2,6 @@
 
 #include "desktop/Texts.h"
 #include "desktop/command_line/CommandPane.h"
-#include "desktop/documents/StartedLine.h"
 #include "desktop/views/OpenViews.h"
 #include "desktop/views/PickLines.h"
 #include "desktop/views/ViewDrawing.h"
@@ -144,15 +143,10 @@ void ViewMouse::answerAt(CQuarnView& view, const QPointF& frame_point) {
     if (m_context.pane.askedKind() == Question::Kind::object) {
         if (const auto picked = objectAt(view, frame_point.x(), frame_point.y()))
             m_context.pane.answerWithObject(objectWord(m_context.session.document(), *picked));
-    } else if (isPointAsked()) {
+    } else if (m_context.pane.takesPoint()) {
         if (const auto point = pointAt(view, frame_point.x(), frame_point.y()))
             m_context.pane.answer(pointText(*point));
     }
-}
-
-bool ViewMouse::isPointAsked() const {
-    const QString command = readLine(m_context.session, m_context.starter.line()).english_name;
-    return m_context.pane.askedKind() == Question::Kind::option && asksForPoints(command);
 }
 
 void ViewMouse::selectAt(CQuarnView& view, const QPointF& frame_point, bool adds) {

@@ -40,7 +40,6 @@ private:
     void pinch(const QNativeGestureEvent& event);
     void zoom(double factor, const QPointF& point);
     void click(const QPointF& point, Qt::KeyboardModifiers modifiers);
-    bool isPointAsked() const;
     void answerAt(CQuarnView& view, const QPointF& frame_point);
     void selectAt(CQuarnView& view, const QPointF& frame_point, bool adds);
     void fit();

@@ -2,6 +2,7 @@
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FormAsking.h"
 #include "host/commands/HostCommands.h"
+#include "host/commands/PointQuestion.h"
 #include "host/commands/PointText.h"
 #include "host/document/Document.h"
 #include "sdk/qncore/QnGet.h"
@@ -56,7 +57,7 @@ private:
 
     static CQuarnCommand::result askPoint(const wchar_t* prompt, const KM_3dPoint& present,
                                           std::optional<KM_3dPoint>& wish) {
-        CQuarnGetString get;
+        PointQuestion<CQuarnGetString> get;
         get.SetCommandPrompt(prompt);
         get.SetDefaultString(pointText(present));
         if (get.GetString() != CQuarnGet::string)

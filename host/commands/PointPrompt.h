@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/commands/PointQuestion.h"
 #include "host/document/CurveMaking.h"
 #include "host/document/ObjectTable.h"
 #include "sdk/qncore/QnGet.h"
@@ -41,7 +42,7 @@ public:
     bool refuse(std::string_view why);
 
 private:
-    CQuarnGetOption m_get;
+    PointQuestion<CQuarnGetOption> m_get;
     bool m_accepts_end = false;
     bool m_is_line = false;
     bool m_from_line = false;

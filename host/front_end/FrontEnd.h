@@ -33,6 +33,7 @@ struct Question {
     std::optional<KM_wString> default_answer;
     bool accepts_nothing = false;         ///< Enter without an answer ends the question
     std::vector<KM_wString> object_names; ///< that answer a question for objects; else empty
+    bool takes_points = false;            ///< text is a point, written x,y,z
 };
 
 /// What a person answered: a word, Enter, Escape, or nothing because nobody can be asked.

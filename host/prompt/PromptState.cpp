@@ -26,7 +26,7 @@ int PromptState::addOption(PromptOption option) {
 }
 
 Question PromptState::question() const {
-    Question question{kind, prompt, {}, default_answer, accepts_nothing, {}};
+    Question question{kind, prompt, {}, default_answer, accepts_nothing, {}, takes_points};
     for (const PromptOption& option : options) {
         const CQuarnCommandOptionValue* value = option.shownValue();
         question.options.push_back(

@@ -46,6 +46,7 @@ struct PromptState {
     bool accepts_nothing = false;
     std::optional<KM_wString> default_answer;
     std::vector<PromptOption> options;
+    bool takes_points = false;           ///< text is a point, written x,y,z
     double lower_limit = KM_UNSET_VALUE; ///< unset: none
     double upper_limit = KM_UNSET_VALUE; ///< unset: none
     ObjectPick objects;

@@ -110,6 +110,27 @@ TEST_F(DrawingCommandsTest, APointReplacesNoCurve) {
     expectFailure(L"_-Point _Replace Way 4,5,6", "Another object is called \"Way\"");
 }
 
+TEST_F(DrawingCommandsTest, OnlyQuestionsForPointsTakePoints) {
+    front_end.addAnswer(L"Name");
+    front_end.addAnswer(L"Mark");
+    front_end.addAnswer(L"1,2,3");
+    ASSERT_EQ(run(L"Point"), CQuarnCommand::success);
+    ASSERT_EQ(front_end.questions().size(), 3U);
+    EXPECT_TRUE(front_end.questions()[0].takes_points);
+    EXPECT_FALSE(front_end.questions()[1].takes_points) << "it asks for a name";
+    EXPECT_TRUE(front_end.questions()[2].takes_points);
+}
+
+TEST_F(DrawingCommandsTest, TheCameraAsksForPointsToo) {
+    front_end.addAnswer(L"Location");
+    front_end.addAnswer(L"1,2,3");
+    front_end.addAnswer(L"_Enter");
+    ASSERT_EQ(run(L"Camera"), CQuarnCommand::success);
+    ASSERT_EQ(front_end.questions().size(), 3U);
+    EXPECT_FALSE(front_end.questions()[0].takes_points) << "its text is nothing";
+    EXPECT_TRUE(front_end.questions()[1].takes_points);
+}
+
 TEST_F(DrawingCommandsTest, APersonIsAskedAgainForABadPoint) {
     for (const wchar_t* answer : {L"here", L"0,0,0", L"0,0,0", L"0,0", L"0,3,0"})
         front_end.addAnswer(answer);
