@@ -95,7 +95,7 @@ private:
     int m_ends[2] = {-1, -1};
 };
 
-Desk::Desk() {
+Desk::Desk() : m_home(m_folder / "home/architect") {
     for (const char* const folder : {"Documents", "bin", ".run"})
         std::filesystem::create_directories(home() / folder);
     std::filesystem::permissions(home() / ".run", std::filesystem::perms::owner_all);

@@ -27,7 +27,7 @@ public:
     Desk(const Desk&) = delete;
     Desk& operator=(const Desk&) = delete;
 
-    const std::filesystem::path& home() const { return m_home.path(); }
+    const std::filesystem::path& home() const { return m_home; }
     std::filesystem::path documents() const { return home() / "Documents"; }
     Display& display() { return *m_display; }
 
@@ -82,7 +82,8 @@ private:
     class Probe;
     void fail(const std::string& what);
 
-    TempFolder m_home;
+    TempFolder m_folder;
+    std::filesystem::path m_home;
     std::unique_ptr<Display> m_display;
     std::unique_ptr<Probe> m_probe;
     std::unique_ptr<RunningProgram> m_program;
