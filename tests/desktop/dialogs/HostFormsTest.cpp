@@ -13,6 +13,8 @@
 #include <QMessageBox>
 #include <QTimeEdit>
 
+#include <limits>
+
 namespace quarn::desktop {
 namespace {
 
@@ -119,6 +121,42 @@ TEST_F(HostFormsTest, SunIsPutByAPlaceChosenBeforeTheForm) {
     });
     EXPECT_TRUE(printed.contains("sun: on, azimuth 194.34, altitude 39.87"))
         << printed.toStdString();
+}
+
+TEST_F(HostFormsTest, SunFormBeginsWithThePlaceAndDayOfTheSunStudy) {
+    KM_3dmAnimationProperties study = record();
+    study.SetLatitude(48.137);
+    study.SetLongitude(11.575);
+    study.SetNorthAngle(30);
+    study.SetStartYear(2026);
+    study.SetStartMonth(12);
+    study.SetStartDay(21);
+    session.document().Properties().SetAnimationProperties(study);
+    answer("_Sun", sun, [](QWidget& form) {
+        EXPECT_EQ(field(form, 4302).text(), "48.14");
+        EXPECT_EQ(field(form, 4303).text(), "11.58");
+        EXPECT_EQ(part<QDateEdit>(form, "control4305").date(), QDate(2026, 12, 21));
+        EXPECT_EQ(field(form, 4308).text(), "30");
+        press(form, "cancel");
+    });
+}
+
+TEST_F(HostFormsTest, SunFormPassesOverAStudyOfNoPlaceAndNoDay) {
+    KM_3dmAnimationProperties no_place = record();
+    no_place.SetLongitude(1e300);
+    KM_3dmAnimationProperties no_number = record();
+    no_number.SetLatitude(std::numeric_limits<double>::quiet_NaN());
+    KM_3dmAnimationProperties no_day = record();
+    no_day.SetStartDay(31); // of June
+    for (const KM_3dmAnimationProperties& hostile : {no_place, no_number, no_day}) {
+        session.document().Properties().SetAnimationProperties(hostile);
+        answer("_Sun", sun, [](QWidget& form) {
+            EXPECT_EQ(field(form, 4302).text(), "51.28");
+            EXPECT_EQ(field(form, 4303).text(), "0");
+            EXPECT_EQ(part<QDateEdit>(form, "control4305").date(), QDate(2010, 6, 1));
+            press(form, "cancel");
+        });
+    }
 }
 
 struct Spoken {
