@@ -16,7 +16,8 @@ file(RENAME "${WORK}/first" "${WORK}/moved to/quarn")
 set(tree "${WORK}/moved to/quarn")
 
 foreach(file IN ITEMS bin/quarn lib/libQnCore.so lib/libKelmar.so lib/quarn/plug-ins/Zoetrix.qnp
-        include/quarn/kelmar/kelmar.h include/quarn/sdk/qncore/qncore.h)
+        include/quarn/kelmar/kelmar.h include/quarn/sdk/qncore/qncore.h
+        share/quarn/dialogs/4203.dialog.json share/quarn/dialogs/Zoetrix/6004.dialog.json)
     if(NOT EXISTS "${tree}/${file}")
         message(FATAL_ERROR "the installed tree lacks ${file}")
     endif()
