@@ -1,7 +1,7 @@
 #include "host/display/ColorSpace.h"
 
 #include <algorithm>
-#include <array>
+#include <bit>
 #include <cmath>
 
 namespace quarn {
@@ -26,7 +26,35 @@ std::array<float, 256> makeByteTable() {
     return table;
 }
 
+/// The least float from 0 to 1 whose nearest byte is not below `value`. The bits of such floats
+/// rise with them.
+float leastLinearOf(std::uint8_t value) {
+    std::uint32_t low = 0;
+    std::uint32_t high = std::bit_cast<std::uint32_t>(1.0F);
+    while (low < high) {
+        const std::uint32_t middle = low + (high - low) / 2;
+        if (srgbByteFromLinear(std::bit_cast<float>(middle)) < value)
+            low = middle + 1;
+        else
+            high = middle;
+    }
+    return std::bit_cast<float>(low);
+}
+
 } // namespace
+
+SrgbTables::SrgbTables() : m_linear(makeByteTable()) {
+    for (int value = 0; value < 256; ++value)
+        m_least[static_cast<std::size_t>(value)] = leastLinearOf(static_cast<std::uint8_t>(value));
+    for (int cell = 0; cell <= cells; ++cell)
+        m_first[static_cast<std::size_t>(cell)] =
+            srgbByteFromLinear(static_cast<float>(cell) / static_cast<float>(cells));
+}
+
+const SrgbTables& srgbTables() {
+    static const SrgbTables tables;
+    return tables;
+}
 
 float linearFromSrgbByte(std::uint8_t value) {
     static const std::array<float, 256> table = makeByteTable();

@@ -2,6 +2,7 @@
 
 #include "kelmar/KM_Color.h"
 
+#include <array>
 #include <cstdint>
 
 namespace quarn {
@@ -11,6 +12,29 @@ float linearFromSrgbByte(std::uint8_t value);
 
 /// The sRGB byte nearest to a linear value; values outside 0 to 1 are moved to the limit.
 std::uint8_t srgbByteFromLinear(float linear);
+
+/// linearFromSrgbByte and srgbByteFromLinear by tables, for many colours.
+class SrgbTables {
+public:
+    SrgbTables();
+    float linear(std::uint8_t value) const { return m_linear[value]; }
+    /// @param linear  0 to 1
+    std::uint8_t byte(float linear) const {
+        unsigned value = m_first[static_cast<std::size_t>(linear * cells)];
+        while (value < 255 && linear >= m_least[value + 1])
+            ++value;
+        return static_cast<std::uint8_t>(value);
+    }
+
+private:
+    static constexpr int cells = 1024;
+    std::array<float, 256> m_linear;
+    std::array<float, 256> m_least;              ///< of each byte the least linear value
+    std::array<std::uint8_t, cells + 1> m_first; ///< the byte at the beginning of each cell
+};
+
+/// The tables, made once.
+const SrgbTables& srgbTables();
 
 /// Scene light as it is shown: the same up to 0.6, above it ever less until 1 is reached far out,
 /// so that bright surfaces keep their modelling.

@@ -57,16 +57,16 @@ struct LinearSum {
     float channels[3] = {0.0F, 0.0F, 0.0F};
     int count = 0;
 
-    void add(std::uint32_t pixel) {
+    void add(std::uint32_t pixel, const SrgbTables& srgb) {
         for (int c = 0; c < 3; ++c)
-            channels[c] += linearFromSrgbByte(channel(pixel, c));
+            channels[c] += srgb.linear(channel(pixel, c));
         ++count;
     }
-    std::uint32_t mean() const {
+    std::uint32_t mean(const SrgbTables& srgb) const {
         std::uint32_t pixel = 0xFF000000U;
         for (int c = 0; c < 3; ++c) {
             const float linear = channels[c] / static_cast<float>(count);
-            pixel |= static_cast<std::uint32_t>(srgbByteFromLinear(linear)) << (8 * c);
+            pixel |= static_cast<std::uint32_t>(srgb.byte(linear)) << (8 * c);
         }
         return pixel;
     }
@@ -198,10 +198,10 @@ private:
             const bool outlier = centerIsOutlier(m_frame.objects[pixel.place], objects);
             const bool varied = m_twice && (outlier || isVaried(center, colors));
             if (!outlier)
-                pixel.sum.add(center);
+                pixel.sum.add(center, m_srgb);
             addAll(pixel.sum, colors);
             if (!varied) {
-                center = pixel.sum.mean();
+                center = pixel.sum.mean(m_srgb);
                 return;
             }
             m_second.add(pixel);
@@ -212,13 +212,13 @@ private:
     void shootSecond() {
         m_second.shoot([&](SampledPixel& pixel, const Colors& colors, const Colors&) {
             addAll(pixel.sum, colors);
-            m_frame.pixels[pixel.place] = pixel.sum.mean();
+            m_frame.pixels[pixel.place] = pixel.sum.mean(m_srgb);
         });
     }
 
-    static void addAll(LinearSum& sum, const Colors& colors) {
+    void addAll(LinearSum& sum, const Colors& colors) const {
         for (const std::uint32_t color : colors)
-            sum.add(color);
+            sum.add(color, m_srgb);
     }
 
     /// Whether something crosses the pixel that more rays would draw better.
@@ -231,6 +231,7 @@ private:
     }
 
     const FrameSetup& m_frame;
+    const SrgbTables& m_srgb = srgbTables();
     bool m_twice;
     SampleBatch m_first;
     SampleBatch m_second;
