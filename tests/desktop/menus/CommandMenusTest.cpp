@@ -2,6 +2,7 @@
 
 #include "tests/desktop/WindowParts.h"
 
+#include <QFile>
 #include <QMainWindow>
 
 #include <gmock/gmock.h>
@@ -149,6 +150,27 @@ TEST_F(CommandMenusTest, NoTwoShortcutsOrMnemonicsOfAMenuAreTheSame) {
     }
     EXPECT_EQ(shortcuts.removeDuplicates(), 0);
     EXPECT_TRUE(shortcuts.contains("Ctrl+O"));
+}
+
+/// Each row of the page's list of keys, but those that are no command's.
+TEST_F(CommandMenusTest, PageOfTheWindowNamesKeysThatAreThere) {
+    QFile page(QUARN_SOURCE_DIR "/docs/window.md");
+    ASSERT_TRUE(page.open(QIODevice::ReadOnly));
+    const QString keys = QString::fromUtf8(page.readAll()).section("| key | does |", 1);
+    QStringList shortcuts = {"Shift+F5", "Ctrl+M", "Esc", "Up", "Down", "Tab"};
+    for (const MenuRow& row : menuRows())
+        if (row.shortcut)
+            shortcuts.append(row.shortcut);
+    int told = 0;
+    for (const QString& line : keys.split('\n').mid(2)) {
+        if (!line.startsWith('|'))
+            continue;
+        for (const QString& key : line.section('|', 1, 1).trimmed().split(", ")) {
+            EXPECT_TRUE(shortcuts.contains(key)) << key.toStdString();
+            ++told;
+        }
+    }
+    EXPECT_GT(told, 20);
 }
 
 TEST_F(GermanMenusTest, MenusAreInTheWordsOfTheUser) {
