@@ -12,9 +12,14 @@ namespace quarn {
 
 namespace {
 
-/// A mesh of this many triangles has a scene of its own; smaller ones share scenes of at most so
-/// many, whose rebuild takes about 2 ms.
+/// A mesh of this many triangles has a scene of its own; smaller ones share scenes.
 constexpr std::size_t large_mesh_triangles = 8192;
+
+/// How many triangles a shared scene has at most. Rays are quickest in few large scenes; but once
+/// some of its meshes is hidden or shown again a scene is split into small ones, whose rebuild
+/// takes about 2 ms.
+constexpr std::size_t bundle_triangles = 262144;
+constexpr std::size_t split_bundle_triangles = 8192;
 
 /// The first three rows, column by column.
 std::array<float, 12> columnsOf(const KM_Xform& x) {
@@ -137,28 +142,23 @@ void RayScene::build(std::vector<Member> members) {
     m_places.assign(m_members.size(), {});
     m_top = makeScene();
     m_placed_meshes.clear();
-    for (const Member& member : m_members)
+    std::vector<bool> wanted;
+    for (Member& member : m_members) {
         if (!member.frame_from_mesh.IsIdentity())
             m_placed_meshes.insert(member.mesh.get());
+        wanted.push_back(std::exchange(member.visible, true));
+    }
 
     for (std::size_t i = 0; i < m_members.size(); ++i)
         if (standsAlone(m_members[i]))
             addSole(i, groups);
     const std::vector<std::size_t> small = smallMembersBySpace();
-    std::size_t first = 0;
-    while (first < small.size()) {
-        std::size_t triangles = 0;
-        std::size_t end = first;
-        while (end < small.size() && (end == first || triangles < large_mesh_triangles))
-            triangles += m_members[small[end++]].mesh->mesh().m_F.size();
-        addSmall(std::span(small).subspan(first, end - first));
-        first = end;
-    }
-    for (std::size_t i = 0; i < m_members.size(); ++i) {
-        const bool visible = m_members[i].visible;
-        m_members[i].visible = true;
-        setVisible(i, visible);
-    }
+    const std::size_t first_surface = m_surfaces.size();
+    for (const std::size_t member : small)
+        addSurface(member);
+    addBundles(small, bundle_triangles, first_surface, m_instances.size());
+    for (std::size_t i = 0; i < m_members.size(); ++i)
+        setVisible(i, wanted[i]);
     commit();
 }
 
@@ -206,40 +206,45 @@ RayGeometry RayScene::makeTriangles(std::size_t member) const {
     return geometry;
 }
 
-void RayScene::place(std::size_t member, unsigned geometry) {
-    m_places[member] = {m_instances.size() - 1, geometry};
-    ++m_instances.back().visible_members;
+void RayScene::addSurface(std::size_t member) {
     m_surfaces.push_back(m_members[member].surface);
     m_surface_members.push_back(static_cast<std::uint32_t>(member));
-    if (m_instances.back().placed) {
-        m_surface_places.push_back(placeOf(m_members[member].frame_from_mesh));
-        m_surfaces.back().place = &m_surface_places.back();
-    }
 }
 
-void RayScene::addInstance(std::shared_ptr<Group> group, const KM_Xform& frame_from_mesh) {
+/// @param slot  of the instance: a new one, or one whose place in the scene is free
+void RayScene::putInstance(std::size_t slot, std::shared_ptr<Group> group,
+                           const KM_Xform& frame_from_mesh, std::size_t first_surface) {
     RayGeometry instance(rtcNewGeometry(m_device.get(), RTC_GEOMETRY_TYPE_INSTANCE));
     rtcSetGeometryInstancedScene(instance.get(), group->scene.get());
     rtcSetGeometryTransform(instance.get(), 0, RTC_FORMAT_FLOAT3X4_COLUMN_MAJOR,
                             columnsOf(frame_from_mesh).data());
     rtcCommitGeometry(instance.get());
-    rtcAttachGeometryByID(m_top.get(), instance.get(), static_cast<unsigned>(m_instances.size()));
-    m_first_surfaces.push_back(static_cast<std::uint32_t>(m_surfaces.size()));
-    m_instances.push_back(
-        {std::move(group), std::move(instance), !frame_from_mesh.IsIdentity(), 0, true});
+    rtcAttachGeometryByID(m_top.get(), instance.get(), static_cast<unsigned>(slot));
+    if (slot == m_instances.size()) {
+        m_instances.emplace_back();
+        m_first_surfaces.emplace_back();
+    }
+    m_first_surfaces[slot] = static_cast<std::uint32_t>(first_surface);
+    m_instances[slot] = {std::move(group), std::move(instance), !frame_from_mesh.IsIdentity(), 0,
+                         true};
 }
 
 void RayScene::addSole(std::size_t member, SoleGroups& groups) {
     const KM_Xform& frame_from_mesh = m_members[member].frame_from_mesh;
     std::shared_ptr<Group>& group = groups[keyOf(m_members[member])];
-    if (group) {
-        addInstance(group, frame_from_mesh);
-        place(member, 0);
-        return;
+    const bool is_new = !group;
+    if (is_new)
+        group = makeGroup();
+    m_places[member] = {m_instances.size(), 0};
+    putInstance(m_instances.size(), group, frame_from_mesh, m_surfaces.size());
+    m_instances.back().visible_members = 1;
+    addSurface(member);
+    if (m_instances.back().placed) {
+        m_surface_places.push_back(placeOf(frame_from_mesh));
+        m_surfaces.back().place = &m_surface_places.back();
     }
-    group = makeGroup();
-    addInstance(group, frame_from_mesh);
-    place(member, 0);
+    if (!is_new)
+        return;
     group->geometries.push_back(makeTriangles(member));
     RTCGeometry geometry = group->geometries.back().get();
     if (!setOpacityFilter(geometry, m_surfaces.back()))
@@ -248,23 +253,58 @@ void RayScene::addSole(std::size_t member, SoleGroups& groups) {
     rtcAttachGeometryByID(group->scene.get(), geometry, 0);
 }
 
-void RayScene::addSmall(std::span<const std::size_t> members) {
-    auto group = makeGroup();
-    addInstance(group, KM_Xform());
-    for (const std::size_t member : members) {
-        const auto id = static_cast<unsigned>(group->geometries.size());
-        place(member, id);
-        group->geometries.push_back(makeTriangles(member));
-        RTCGeometry geometry = group->geometries.back().get();
-        setOpacityFilter(geometry, m_surfaces.back());
-        rtcCommitGeometry(geometry);
-        rtcAttachGeometryByID(group->scene.get(), geometry, id);
+/// Lets members, whose surfaces follow each other, share scenes.
+/// @param slot  of the first scene's instance; further ones are new
+void RayScene::addBundles(std::span<const std::size_t> members, std::size_t most_triangles,
+                          std::size_t first_surface, std::size_t slot) {
+    std::size_t first = 0;
+    while (first < members.size()) {
+        std::size_t triangles = 0;
+        std::size_t end = first;
+        while (end < members.size() && (end == first || triangles < most_triangles))
+            triangles += m_members[members[end++]].mesh->mesh().m_F.size();
+        putInstance(slot, makeGroup(), KM_Xform(), first_surface + first);
+        fillBundle(slot, members.subspan(first, end - first));
+        m_instances[slot].group->is_split = triangles < 2 * split_bundle_triangles;
+        first = end;
+        slot = m_instances.size();
     }
+}
+
+void RayScene::fillBundle(std::size_t slot, std::span<const std::size_t> members) {
+    Instance& instance = m_instances[slot];
+    Group& group = *instance.group;
+    for (const std::size_t member : members) {
+        const auto id = static_cast<unsigned>(group.geometries.size());
+        m_places[member] = {slot, id};
+        group.geometries.push_back(makeTriangles(member));
+        RTCGeometry geometry = group.geometries.back().get();
+        setOpacityFilter(geometry, m_surfaces[m_first_surfaces[slot] + id]);
+        rtcCommitGeometry(geometry);
+        rtcAttachGeometryByID(group.scene.get(), geometry, id);
+        if (m_members[member].visible)
+            ++instance.visible_members;
+        else
+            setEnabled(geometry, false);
+    }
+}
+
+void RayScene::split(std::size_t slot) {
+    const std::shared_ptr<Group> bundle = m_instances[slot].group;
+    const std::size_t first_surface = m_first_surfaces[slot];
+    const auto begin = m_surface_members.begin() + static_cast<std::ptrdiff_t>(first_surface);
+    const std::vector<std::size_t> members(
+        begin, begin + static_cast<std::ptrdiff_t>(bundle->geometries.size()));
+    rtcDetachGeometry(m_top.get(), static_cast<unsigned>(slot));
+    addBundles(members, split_bundle_triangles, first_surface, slot);
 }
 
 void RayScene::setVisible(std::size_t member, bool visible) {
     if (m_members[member].visible == visible)
         return;
+    const Group& shared = *m_instances[m_places[member].instance].group;
+    if (shared.geometries.size() > 1 && !shared.is_split)
+        split(m_places[member].instance);
     m_members[member].visible = visible;
     Instance& instance = m_instances[m_places[member].instance];
     instance.visible_members += visible ? 1 : std::size_t(-1);

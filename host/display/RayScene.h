@@ -17,9 +17,9 @@
 namespace quarn {
 
 /// The surfaces that rays meet. Meshes of many triangles, and those that a transform puts into
-/// their place, get a scene of their own under an instance; the small others share one, so that
-/// showing or hiding an object rebuilds little: nothing for a large one, some thousand triangles
-/// for a small one.
+/// their place, get a scene of their own under an instance; the small others share a few. The first
+/// time that one of these is hidden or shown its scene is split, so that from then on showing or
+/// hiding an object rebuilds little: nothing for a large one, some thousand triangles for a small.
 class RayScene {
 public:
     /// One mesh object; `mesh` is drawable and `surface` describes it, without its place.
@@ -67,6 +67,7 @@ private:
         std::vector<RayGeometry> geometries;
         const RayMesh* sole_mesh = nullptr; ///< of a mesh that stands alone: to find it again
         bool changed = false;
+        bool is_split = false; ///< of several meshes: it is small
     };
     struct Instance {
         std::shared_ptr<Group> group;
@@ -94,9 +95,13 @@ private:
     bool standsAlone(const Member& member) const;
     GroupKey keyOf(const Member& member) const;
     void addSole(std::size_t member, SoleGroups& groups);
-    void addSmall(std::span<const std::size_t> members);
-    void addInstance(std::shared_ptr<Group> group, const KM_Xform& frame_from_mesh);
-    void place(std::size_t member, unsigned geometry);
+    void addBundles(std::span<const std::size_t> members, std::size_t most_triangles,
+                    std::size_t first_surface, std::size_t slot);
+    void fillBundle(std::size_t slot, std::span<const std::size_t> members);
+    void split(std::size_t slot);
+    void addSurface(std::size_t member);
+    void putInstance(std::size_t slot, std::shared_ptr<Group> group,
+                     const KM_Xform& frame_from_mesh, std::size_t first_surface);
     RayGeometry makeTriangles(std::size_t member) const;
     RaySceneHandle makeScene() const;
     std::shared_ptr<Group> makeGroup() const;
