@@ -15,6 +15,7 @@
 #include <QPointer>
 #include <QPushButton>
 #include <QScopedValueRollback>
+#include <QScreen>
 #include <QTableView>
 #include <QVBoxLayout>
 
@@ -93,7 +94,8 @@ void LocationDialog::layOut() {
     const QList<QWidget*> order = {m_search, m_table, m_map, m_latitude, m_longitude, m_ok};
     for (qsizetype index = 1; index < order.size(); ++index)
         setTabOrder(order[index - 1], order[index]);
-    resize(1180, 500);
+    constexpr QSize roomy(1180, 500);
+    resize(roomy.boundedTo(screen()->availableSize()));
 }
 
 QLayout* LocationDialog::citiesSide() {

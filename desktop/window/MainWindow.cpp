@@ -23,6 +23,7 @@
 #include <QDockWidget>
 #include <QLabel>
 #include <QMenuBar>
+#include <QScreen>
 #include <QSettings>
 #include <QStatusBar>
 #include <QTimer>
@@ -34,6 +35,7 @@ namespace {
 
 constexpr int MESSAGE_MS = 8000;
 constexpr QSize FIRST_SIZE{1280, 860};
+constexpr QSize FRAME_ROOM{8, 40}; ///< that a window manager's frame may take
 constexpr int FIRST_COMMAND_HEIGHT = 170;
 
 constexpr const char* GEOMETRY = "window/geometry";
@@ -197,7 +199,7 @@ void MainWindow::runScript(const QString& file, bool wants_exit) {
 void MainWindow::restoreLayout() {
     const QSettings settings;
     if (!restoreGeometry(settings.value(GEOMETRY).toByteArray()))
-        resize(FIRST_SIZE);
+        resize(FIRST_SIZE.boundedTo(screen()->availableSize() - FRAME_ROOM));
     if (!restoreState(settings.value(PANELS).toByteArray(), PANELS_VERSION))
         resizeDocks({m_command_dock}, {FIRST_COMMAND_HEIGHT}, Qt::Vertical);
     m_views->grid().restoreBorders(settings.value(BORDERS).toByteArray());

@@ -165,6 +165,26 @@ TEST_F(BadInput, WindowOfAnySizeGoesOn) {
     expectAlive();
 }
 
+/// Of an old laptop.
+TEST_F(BadInput, SmallScreenHasRoomForTheWindowAndItsDialogs) {
+    const QRect screen(0, 0, 1024, 768);
+    desk.startWithHouse({.screen_px = screen.size()});
+    const auto expectOnScreen = [&](const char* name) {
+        const QRect place = desk.widget(name).place;
+        EXPECT_TRUE(screen.contains(place)) << name << ": " << place.x() << ',' << place.y() << ' '
+                                            << place.width() << " x " << place.height();
+    };
+    expectOnScreen("mainWindow");
+    desk.chooseInMenu("command_SetOneDaySunAnimation");
+    expectOnScreen("dayForm");
+    desk.click("choosePlace");
+    expectOnScreen("location");
+    desk.click("cancel");
+    desk.waitUntilGone("location");
+    desk.click("cancel");
+    desk.waitUntilIdle();
+}
+
 TEST_F(BadInput, LanguagesWithOtherScriptsSetUpATurntable) {
     for (const char* const language : {"ja", "zh"}) {
         desk.start({.arguments = {"--language", language,

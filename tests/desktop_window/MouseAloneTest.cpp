@@ -2,6 +2,8 @@
 #include "tests/desktop_window/driver/ReferencePicture.h"
 #include "tests/quarn/Pictures.h"
 
+#include <QRegularExpression>
+
 #include <algorithm>
 #include <gtest/gtest.h>
 
@@ -55,8 +57,9 @@ void expectRecording(const std::filesystem::path& folder, const std::string& typ
 
 /// "638 × 305", as it stands beside the Record button.
 QSize toldFrameSize(Desk& desk) {
-    const QStringList numbers = desk.widget("frameSize").text.split(QString::fromUtf8(" × "));
-    return {numbers.value(0).toInt(), numbers.value(1).toInt()};
+    const QRegularExpressionMatch told =
+        QRegularExpression("(\\d+) × (\\d+)").match(desk.widget("frameSize").text);
+    return {told.captured(1).toInt(), told.captured(2).toInt()};
 }
 
 QImage frame(const Desk& desk, int number) {
