@@ -1,11 +1,14 @@
 #include "desktop/views/ViewArea.h"
 
 #include "desktop/Texts.h"
+#include "desktop/documents/StartedLine.h"
 #include "desktop/views/OpenViews.h"
+#include "desktop/views/SizeMenu.h"
 #include "desktop/views/ViewMenu.h"
 #include "desktop/views/ViewMouse.h"
 #include "desktop/views/ViewWidget.h"
 #include "desktop/window/CommandStarter.h"
+#include "host/front_end/AnimationState.h"
 #include "host/front_end/DocumentState.h"
 #include "host/front_end/ViewFrame.h"
 
@@ -51,8 +54,10 @@ void ViewArea::showPicture(CQuarnView& view, const ShownPicture& picture) {
         shown->setPicture(picture);
 }
 
-void ViewArea::commandStarted() {
+void ViewArea::commandStarted(const QString& line) {
     m_shown_by_command.clear();
+    if (readLine(m_context.session, line).english_name == "RecordAnimation")
+        sizeForRecording();
 }
 
 void ViewArea::commandEnded() {
@@ -148,14 +153,48 @@ void ViewArea::fitFrames() {
     emit frameChanged();
 }
 
-void ViewArea::fillFrameSizes(QMenu& menu) {
-    menu.clear();
-    if (ViewWidget* const active = widget(activeViewName(m_context.session.document())))
-        active->findChild<ViewMenu*>()->addFrameSizes(menu);
+/// The view that the animation is made for; before there is one, the view that is worked in.
+ViewWidget* ViewArea::recordedWidget() const {
+    CQuarnDoc& document = m_context.session.document();
+    const AnimationState animation = animationState(document);
+    ViewWidget* const animated = animation.can_play ? widget(qtText(animation.view)) : nullptr;
+    return animated ? animated : widget(activeViewName(document));
 }
 
-QSize ViewArea::activeFrameSize() const {
-    return frameSizeOf(activeView(m_context.session.document()));
+QSize ViewArea::recordedSize() const {
+    const ViewWidget* const widget = recordedWidget();
+    if (widget && widget->fixedFrame())
+        return *widget->fixedFrame();
+    if (m_recorded_size.chosen() || !widget)
+        return m_recorded_size.chosen().value_or(QSize());
+    return widget->wantedFrame();
+}
+
+void ViewArea::chooseRecordedSize(std::optional<QSize> size_px) {
+    m_recorded_size.choose(size_px);
+    if (ViewWidget* const widget = recordedWidget())
+        widget->setFixedFrame(std::nullopt);
+    fitFrames();
+}
+
+/// Nothing else of the window changes: the frame has the window's size again when the command has
+/// ended.
+void ViewArea::sizeForRecording() {
+    const ViewWidget* const widget = recordedWidget();
+    CQuarnView* const view =
+        widget ? findView(m_context.session.document(), widget->viewName()) : nullptr;
+    const QSize size_px = recordedSize();
+    if (view && setFrameSize(*view, size_px.width(), size_px.height()))
+        m_given_sizes[widget->viewName()] = size_px;
+}
+
+void ViewArea::fillRecordedSizes(QMenu& menu) {
+    menu.clear();
+    delete menu.findChild<QActionGroup*>();
+    const ViewWidget* const widget = recordedWidget();
+    const bool is_fixed = widget && widget->fixedFrame();
+    addSizes(menu, is_fixed ? widget->fixedFrame() : m_recorded_size.chosen(),
+             [this](std::optional<QSize> size_px) { chooseRecordedSize(size_px); });
 }
 
 void ViewArea::showActive() {

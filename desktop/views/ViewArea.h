@@ -1,5 +1,6 @@
 #pragma once
 
+#include "desktop/views/RecordedSize.h"
 #include "desktop/views/ViewContext.h"
 #include "desktop/views/ViewDrawing.h"
 #include "desktop/views/ViewGrid.h"
@@ -31,18 +32,20 @@ public:
     ViewDrawing& drawing() { return m_drawing; }
     ViewGrid& grid() { return *m_grid; }
 
-    /// Fills a menu with the sizes that the frame of the active view can have.
-    void fillFrameSizes(QMenu& menu);
-    /// The size of the active view's frame, in pixels: that of recorded pictures.
-    QSize activeFrameSize() const;
+    /// The size that recorded pictures will have, in pixels: the one that the view's frame was
+    /// given by a command, else the chosen one.
+    QSize recordedSize() const;
+    /// Fills a menu with the sizes that recorded pictures can have.
+    void fillRecordedSizes(QMenu& menu);
 
 signals:
-    /// The active view is another one, or its frame has another size.
+    /// recordedSize may be another one.
     void frameChanged();
 
 public slots:
-    /// A command begins: notes which pictures it shows.
-    void commandStarted();
+    /// A command begins: notes which pictures it shows, and gives the view of a recording the size
+    /// of its pictures.
+    void commandStarted(const QString& line);
     /// A command has ended: shows the views that there are now, and draws those whose picture the
     /// command did not show itself.
     void commandEnded();
@@ -55,6 +58,9 @@ private:
     void refresh();
     void rebuild(const QStringList& names);
     ViewWidget& addWidget(const QString& name);
+    ViewWidget* recordedWidget() const;
+    void chooseRecordedSize(std::optional<QSize> size_px);
+    void sizeForRecording();
     void noteFrameSizes();
     void fitFrames();
     void showActive();
@@ -67,6 +73,7 @@ private:
     unsigned m_document_number = 0;
     QMap<QString, QSize> m_given_sizes; ///< of frames, by the name of the view
     QStringList m_shown_by_command;
+    RecordedSize m_recorded_size;
 };
 
 } // namespace quarn::desktop

@@ -2,11 +2,10 @@
 
 #include "desktop/Texts.h"
 #include "desktop/views/OpenViews.h"
+#include "desktop/views/SizeMenu.h"
 #include "desktop/views/ViewWidget.h"
 #include "desktop/window/CommandStarter.h"
 #include "host/front_end/ViewFrame.h"
-
-#include <QActionGroup>
 
 namespace quarn::desktop {
 
@@ -19,21 +18,11 @@ struct Direction {
 constexpr Direction DIRECTIONS[] = {
     {L"Top", 45010}, {L"Front", 45011}, {L"Right", 45012}, {L"Perspective", 45013}};
 
-constexpr QSize FRAME_SIZES[] = {{1280, 720}, {1920, 1080}, {3840, 2160}};
-
 /// A mode's English name as an option: those hold letters and digits only.
 QString optionOf(const CDisplayPipelineAttributes& mode) {
     QString name = qtText(mode.EnglishName());
     name.removeIf([](QChar character) { return QString("_ -,").contains(character); });
     return name;
-}
-
-QAction& addChoice(QMenu& menu, QActionGroup& group, const QString& text, bool is_checked) {
-    QAction& action = *menu.addAction(text);
-    action.setCheckable(true);
-    action.setChecked(is_checked);
-    group.addAction(&action);
-    return action;
 }
 
 } // namespace
@@ -84,20 +73,12 @@ void ViewMenu::addDirections(QMenu& menu) {
 }
 
 void ViewMenu::addFrameSizes(QMenu& menu) {
-    auto* const group = new QActionGroup(&menu);
-    const std::optional<QSize> fixed = m_widget.fixedFrame();
-    connect(&addChoice(menu, *group, localized(L"As in the window", 45017), !fixed),
-            &QAction::triggered, this, &ViewMenu::frameFreed);
-    QList<QSize> sizes(std::begin(FRAME_SIZES), std::end(FRAME_SIZES));
-    if (fixed && !sizes.contains(*fixed))
-        sizes.append(*fixed);
-    for (const QSize& size : sizes) {
-        const QString text = QString("%1 × %2").arg(size.width()).arg(size.height());
-        connect(&addChoice(menu, *group, text, fixed == size), &QAction::triggered, this,
-                [this, size] {
-                    run(QString("_-ViewportSize %1 %2").arg(size.width()).arg(size.height()));
-                });
-    }
+    addSizes(menu, m_widget.fixedFrame(), [this](std::optional<QSize> size_px) {
+        if (size_px)
+            run(QString("_-ViewportSize %1 %2").arg(size_px->width()).arg(size_px->height()));
+        else
+            emit frameFreed();
+    });
 }
 
 /// Commands work in the active view.

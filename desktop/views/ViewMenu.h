@@ -19,9 +19,6 @@ public:
     /// Fills the widget's menu whenever it opens; belongs to the widget.
     ViewMenu(ViewContext context, ViewWidget& widget);
 
-    /// Adds the sizes that the view's frame can have to a menu, the present one checked.
-    void addFrameSizes(QMenu& menu);
-
 signals:
     /// The frame is to have the size of the widget again.
     void frameFreed();
@@ -30,6 +27,7 @@ private:
     void fill();
     void addModes(QMenu& menu);
     void addDirections(QMenu& menu);
+    void addFrameSizes(QMenu& menu);
     void run(const QString& line);
 
     ViewContext m_context;

@@ -3,6 +3,7 @@
 #include "desktop/Texts.h"
 #include "desktop/animation/AnimationBar.h"
 #include "desktop/menus/CommandMenus.h"
+#include "desktop/views/SizeMenu.h"
 #include "desktop/views/ViewArea.h"
 #include "desktop/window/MainWindow.h"
 
@@ -31,15 +32,11 @@ void addFrameSizeButton(MainWindow& window) {
     button->setAutoRaise(true);
     button->setPopupMode(QToolButton::InstantPopup);
     button->setMenu(menu);
-    button->setToolTip(
-        localized(L"Size of the active view's pictures, also of recorded ones", 45025));
+    button->setToolTip(localized(L"Size of recorded pictures", 45025));
     ViewArea& views = window.views();
-    const auto show_size = [&views, button] {
-        const QSize size_px = views.activeFrameSize();
-        button->setText(QString("%1 × %2").arg(size_px.width()).arg(size_px.height()));
-    };
+    const auto show_size = [&views, button] { button->setText(sizeText(views.recordedSize())); };
     QObject::connect(menu, &QMenu::aboutToShow, button,
-                     [&views, menu] { views.fillFrameSizes(*menu); });
+                     [&views, menu] { views.fillRecordedSizes(*menu); });
     QObject::connect(&views, &ViewArea::frameChanged, button, show_size);
     show_size();
     window.animationBar().addControl(button);
