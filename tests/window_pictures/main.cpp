@@ -93,7 +93,7 @@ public:
 private:
     void open(Desk& desk, const char* language) {
         std::filesystem::copy(m_model.parent_path(), desk.documents());
-        desk.start({.screen_px = {1280, 860}, .arguments = {"--language", language}});
+        desk.start({.screen_px = {1300, 900}, .arguments = {"--language", language}});
         desk.chooseInMenu("command_Open");
         const auto fileIn = [](const Windows& seen) -> const SeenItem* {
             const SeenWidget* const files = seen.widget("treeView");
@@ -129,6 +129,7 @@ private:
                 front = window->place;
         for (const SeenWidget* const window : seen.modalWindows())
             addShadow(picture, window->place, window->is_in_front ? QRect() : front);
+        picture = picture.copy(seen.widget("mainWindow")->place);
         picture.save(m_folder + '/' + name + ".jpg", "jpg", JPEG_QUALITY);
     }
 
