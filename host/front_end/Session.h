@@ -31,8 +31,8 @@ struct SessionOptions {
     /// error output says so and the call does nothing. Nothing: strict where the environment
     /// variable QUARN_STRICT is set to anything but 0.
     std::optional<bool> strict = std::nullopt;
-    /// The folder of the string tables of the program that runs the session (`<language>.json`), for
-    /// QnLocalizeString; the host's own texts go first. Empty: the program has none.
+    /// The folder of the string tables of the program that runs the session (`<language>.json`),
+    /// for QnLocalizeString; the host's own texts go first. Empty: the program has none.
     std::filesystem::path program_locale_folder = {};
     /// Folders of dialog templates (`<id>.dialog.json`). Those of a plug-in `Name.qnp` are looked
     /// for in `dialogs/Name` beside its file, then in `Name` in these folders; those of the program

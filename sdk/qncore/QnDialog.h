@@ -24,9 +24,10 @@ struct CQnRuntimeClass {
 };
 
 /// A modal dialog: a window made from a template, whose controls are addressed by their ids. The
-/// template with id N is the file `N.dialog.json` of the plug-in that the dialog's class is part of,
-/// see docs/dialogs.md. All calls belong on the main thread. A dialog must live until DoModal has
-/// returned. What an overridden operation throws ends there: it is told, and the dialog is closed.
+/// template with id N is the file `N.dialog.json` of the plug-in that the dialog's class is part
+/// of, see docs/dialogs.md. All calls belong on the main thread. A dialog must live until DoModal
+/// has returned. What an overridden operation throws ends there: it is told, and the dialog is
+/// closed.
 class QNCORE_API CDialog {
 public:
     static const CQnRuntimeClass ClassRecord;
