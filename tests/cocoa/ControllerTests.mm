@@ -132,10 +132,10 @@ TEST_F(TurnTableController, HandsEachPopUpButtonToTheComboBoxOfItsList) {
     serve(dialog);
     makeOutlets();
     [controller windowDidLoad];
-    dialog.m_direction_combo.InsertString(-1, L"of the direction");
-    dialog.m_file_type_combo.InsertString(-1, L"of the file type");
-    dialog.m_capture_combo.InsertString(-1, L"of the capture method");
-    dialog.m_viewport_combo.InsertString(-1, L"of the viewport");
+    dialog.m_direction.m_combo.InsertString(-1, L"of the direction");
+    dialog.m_file_type.m_combo.InsertString(-1, L"of the file type");
+    dialog.m_capture.m_combo.InsertString(-1, L"of the capture method");
+    dialog.m_viewport.m_combo.InsertString(-1, L"of the viewport");
     EXPECT_STREQ([[direction itemTitleAtIndex:0] UTF8String], "of the direction");
     EXPECT_STREQ([[file_type itemTitleAtIndex:0] UTF8String], "of the file type");
     EXPECT_STREQ([[capture itemTitleAtIndex:0] UTF8String], "of the capture method");
@@ -162,10 +162,10 @@ TEST_F(TurnTableController, ComboBoxesRetainTheirButtonsUntilTheDialogCloses) {
         EXPECT_EQ([outlets()[at] retainCount], before[at]) << at;
         [outlets()[at] release];
     }
-    EXPECT_FALSE(dialog.m_direction_combo.HasControl());
-    EXPECT_FALSE(dialog.m_file_type_combo.HasControl());
-    EXPECT_FALSE(dialog.m_capture_combo.HasControl());
-    EXPECT_FALSE(dialog.m_viewport_combo.HasControl());
+    EXPECT_FALSE(dialog.m_direction.m_combo.HasControl());
+    EXPECT_FALSE(dialog.m_file_type.m_combo.HasControl());
+    EXPECT_FALSE(dialog.m_capture.m_combo.HasControl());
+    EXPECT_FALSE(dialog.m_viewport.m_combo.HasControl());
 }
 
 TEST_F(TurnTableController, AComboBoxReleasesTheButtonItHadForASecondOne) {
@@ -205,7 +205,7 @@ TEST_F(TurnTableController, EntriesOfTheSameTextStayApart) {
     serve(dialog);
     makeOutlets();
     [controller windowDidLoad];
-    CComboBox& combo = dialog.m_viewport_combo;
+    CComboBox& combo = dialog.m_viewport.m_combo;
     combo.InsertString(-1, L"Top");
     combo.InsertString(-1, L"Top");
     EXPECT_EQ(combo.GetCount(), 2);
@@ -224,8 +224,8 @@ TEST_F(TurnTableController, WithoutADialogOrOutletsNothingIsHandedOver) {
     [controller willCloseDialog];
     serve(dialog);
     [controller windowDidLoad];
-    EXPECT_FALSE(dialog.m_direction_combo.HasControl());
-    EXPECT_FALSE(dialog.m_viewport_combo.HasControl());
+    EXPECT_FALSE(dialog.m_direction.m_combo.HasControl());
+    EXPECT_FALSE(dialog.m_viewport.m_combo.HasControl());
 }
 
 } // namespace

@@ -81,10 +81,10 @@ protected:
     void expectNothingChanged() const {
         EXPECT_EQ(dialog.m_frame_count, 120);
         EXPECT_EQ(dialog.m_name, L"Turn");
-        EXPECT_EQ(dialog.m_direction_selection, 1);
-        EXPECT_EQ(dialog.m_file_type_selection, 0);
-        EXPECT_EQ(dialog.m_capture_selection, 2);
-        EXPECT_EQ(dialog.m_viewport_selection, 3);
+        EXPECT_EQ(dialog.m_direction.m_selection, 1);
+        EXPECT_EQ(dialog.m_file_type.m_selection, 0);
+        EXPECT_EQ(dialog.m_capture.m_selection, 2);
+        EXPECT_EQ(dialog.m_viewport.m_selection, 3);
     }
 };
 
@@ -123,11 +123,11 @@ TEST_F(TurnTableWindow, OKStoresWhatWasChosenAndTyped) {
     EXPECT_EQ(result, 1);
     EXPECT_EQ(dialog.m_frame_count, 48);
     EXPECT_EQ(dialog.m_name, L"Haus \u56DE");
-    EXPECT_EQ(dialog.m_direction_selection, 0);
-    EXPECT_EQ(dialog.m_file_type_selection, 1);
-    EXPECT_EQ(dialog.m_capture_selection, 0);
-    EXPECT_EQ(dialog.m_viewport_selection, 2);
-    EXPECT_FALSE(dialog.m_direction_combo.HasControl());
+    EXPECT_EQ(dialog.m_direction.m_selection, 0);
+    EXPECT_EQ(dialog.m_file_type.m_selection, 1);
+    EXPECT_EQ(dialog.m_capture.m_selection, 0);
+    EXPECT_EQ(dialog.m_viewport.m_selection, 2);
+    EXPECT_FALSE(dialog.m_direction.m_combo.HasControl());
 }
 
 TEST_F(TurnTableWindow, CancelChangesNothing) {

@@ -145,10 +145,10 @@ TEST_F(PlugInFormsTest, TurntableFormFillsEveryMember) {
     EXPECT_EQ(result, 1);
     EXPECT_EQ(dialog.m_frame_count, 36);
     EXPECT_EQ(dialog.m_name.View(), L"Round the house");
-    EXPECT_EQ(dialog.m_direction_selection, 0);
-    EXPECT_EQ(dialog.m_file_type_selection, 0);
-    EXPECT_EQ(dialog.m_capture_selection, 1);
-    EXPECT_EQ(dialog.m_viewport_selection, 3);
+    EXPECT_EQ(dialog.m_direction.m_selection, 0);
+    EXPECT_EQ(dialog.m_file_type.m_selection, 0);
+    EXPECT_EQ(dialog.m_capture.m_selection, 1);
+    EXPECT_EQ(dialog.m_viewport.m_selection, 3);
 }
 
 TEST_F(PlugInFormsTest, TurntableFormMeasuresItsViewportAgainstTheFileTypes) {
@@ -157,7 +157,7 @@ TEST_F(PlugInFormsTest, TurntableFormMeasuresItsViewportAgainstTheFileTypes) {
         EXPECT_EQ(shownEntry(form, CTurnTableDialog::viewport_id), 0);
         press(form, "ok");
     });
-    EXPECT_EQ(dialog.m_viewport_selection, 0);
+    EXPECT_EQ(dialog.m_viewport.m_selection, 0);
 }
 
 TEST_F(PlugInFormsTest, TurntableFormRefusesAFrameCountThatIsNoWholeNumber) {
@@ -185,7 +185,7 @@ TEST_F(PlugInFormsTest, FormsThatAreGivenUpChangeNothing) {
         });
         EXPECT_EQ(result, 2);
         EXPECT_EQ(dialog.m_frame_count, 100);
-        EXPECT_EQ(dialog.m_capture_selection, 0);
+        EXPECT_EQ(dialog.m_capture.m_selection, 0);
     }
 }
 
@@ -204,9 +204,9 @@ TEST_F(PlugInFormsTest, PathFormFillsEveryMember) {
     EXPECT_EQ(result, 1);
     EXPECT_EQ(dialog.m_frame_count, 250);
     EXPECT_EQ(dialog.m_name.View(), L"Evening walk");
-    EXPECT_EQ(dialog.m_file_type_selection, 1);
-    EXPECT_EQ(dialog.m_capture_selection, 1);
-    EXPECT_EQ(dialog.m_viewport_selection, 0);
+    EXPECT_EQ(dialog.m_file_type.m_selection, 1);
+    EXPECT_EQ(dialog.m_capture.m_selection, 1);
+    EXPECT_EQ(dialog.m_viewport.m_selection, 0);
 }
 
 TEST_F(PlugInFormsTest, OneDayFormFillsEveryMember) {
@@ -235,9 +235,9 @@ TEST_F(PlugInFormsTest, OneDayFormFillsEveryMember) {
     EXPECT_TRUE(dialog.m_third_date_time == COleDateTime(2026, 6, 21, 21, 15, 0));
     EXPECT_EQ(dialog.m_frame_step, 10);
     EXPECT_EQ(dialog.m_text.View(), L"Sydney");
-    EXPECT_EQ(dialog.m_file_type_selection, 2);
-    EXPECT_EQ(dialog.m_capture_selection, 0);
-    EXPECT_EQ(dialog.m_viewport_selection, 4);
+    EXPECT_EQ(dialog.m_file_type.m_selection, 2);
+    EXPECT_EQ(dialog.m_capture.m_selection, 0);
+    EXPECT_EQ(dialog.m_viewport.m_selection, 4);
 }
 
 TEST_F(PlugInFormsTest, OneDayFormRefusesWhatIsOutOfRangeAndTakesTheLimits) {

@@ -1,7 +1,5 @@
 #include "zoetrix/ui/PathAnimationDialog.h"
 
-#include "zoetrix/ui/ComboBoxEntries.h"
-
 const CQnRuntimeClass CPathAnimationDialog::ClassRecord = {"CPathAnimationDialog",
                                                            &CQuarnDialog::ClassRecord};
 
@@ -10,12 +8,11 @@ CPathAnimationDialog::CPathAnimationDialog(
     int file_type_selection, const KM_ClassArray<KM_wString>& capture_list, int capture_selection,
     const KM_ClassArray<KM_wString>& viewport_list, int viewport_selection, CWnd* parent)
     : CQuarnDialog(template_id, parent), m_frame_count(frame_count),
-      m_file_type_list(file_type_list), m_file_type_selection(file_type_selection),
-      m_capture_list(capture_list), m_capture_selection(capture_selection),
-      m_viewport_list(viewport_list), m_viewport_selection(viewport_selection), m_name(name) {
-    AttachComboBox(file_type_id, m_file_type_combo);
-    AttachComboBox(capture_id, m_capture_combo);
-    AttachComboBox(viewport_id, m_viewport_combo);
+      m_file_type(file_type_list, file_type_selection), m_capture(capture_list, capture_selection),
+      m_viewport(viewport_list, viewport_selection), m_name(name) {
+    AttachComboBox(file_type_id, m_file_type.m_combo);
+    AttachComboBox(capture_id, m_capture.m_combo);
+    AttachComboBox(viewport_id, m_viewport.m_combo);
 }
 
 CPathAnimationDialog::~CPathAnimationDialog() = default;
@@ -32,21 +29,18 @@ void CPathAnimationDialog::DoDataExchange(CQnDialogExchange& exchange) {
 
 int CPathAnimationDialog::OnInitDialog() {
     CQuarnDialog::OnInitDialog();
-    for (CComboBox* combo_box : {&m_file_type_combo, &m_capture_combo, &m_viewport_combo})
+    for (CComboBox* combo_box : {&m_file_type.m_combo, &m_capture.m_combo, &m_viewport.m_combo})
         combo_box->ResetContent();
-    InsertEntries(m_file_type_combo, m_file_type_list);
-    SelectEntry(m_file_type_combo, m_file_type_selection, m_file_type_list.Count());
-    InsertEntries(m_capture_combo, m_capture_list);
-    SelectEntry(m_capture_combo, m_capture_selection, m_capture_list.Count());
-    InsertEntries(m_viewport_combo, m_viewport_list);
-    SelectEntry(m_viewport_combo, m_viewport_selection, m_file_type_list.Count());
+    m_file_type.Show();
+    m_capture.Show();
+    m_viewport.Show(m_file_type.m_list.Count());
     return 1;
 }
 
 void CPathAnimationDialog::OnOK() {
-    m_file_type_selection = m_file_type_combo.GetCurSel();
-    m_capture_selection = m_capture_combo.GetCurSel();
-    m_viewport_selection = m_viewport_combo.GetCurSel();
+    m_file_type.Store();
+    m_capture.Store();
+    m_viewport.Store();
     CQuarnDialog::OnOK();
 }
 

@@ -2,8 +2,8 @@
 
 #include "kelmar/KM_Array.h"
 #include "kelmar/KM_wString.h"
-#include "sdk/qncore/QnComboBox.h"
 #include "sdk/qncore/QnDialog.h"
+#include "zoetrix/ui/ComboBoxList.h"
 
 /// The plug-in's own form of an animation along a path: frame count, file type, capture method,
 /// viewport and name. It stands by itself: whoever shows it hands it the lists, and reads the
@@ -39,15 +39,9 @@ public:
     const CQnRuntimeClass* GetRuntimeClass() const override;
 
     int m_frame_count;
-    CComboBox m_file_type_combo;
-    KM_ClassArray<KM_wString> m_file_type_list;
-    int m_file_type_selection;
-    CComboBox m_capture_combo;
-    KM_ClassArray<KM_wString> m_capture_list;
-    int m_capture_selection;
-    CComboBox m_viewport_combo;
-    KM_ClassArray<KM_wString> m_viewport_list;
-    int m_viewport_selection;
+    ComboBoxList m_file_type;
+    ComboBoxList m_capture;
+    ComboBoxList m_viewport;
     KM_wString m_name;
 
 protected:

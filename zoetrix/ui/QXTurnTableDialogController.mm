@@ -56,10 +56,10 @@
     if (!_turnTableDialog) {
         return;
     }
-    _turnTableDialog->m_direction_combo.SetControl(QXMakePopUpControl(directionCtrl));
-    _turnTableDialog->m_file_type_combo.SetControl(QXMakePopUpControl(fileTypeCtrl));
-    _turnTableDialog->m_capture_combo.SetControl(QXMakePopUpControl(captureMethodCtrl));
-    _turnTableDialog->m_viewport_combo.SetControl(QXMakePopUpControl(viewportCtrl));
+    _turnTableDialog->m_direction.m_combo.SetControl(QXMakePopUpControl(directionCtrl));
+    _turnTableDialog->m_file_type.m_combo.SetControl(QXMakePopUpControl(fileTypeCtrl));
+    _turnTableDialog->m_capture.m_combo.SetControl(QXMakePopUpControl(captureMethodCtrl));
+    _turnTableDialog->m_viewport.m_combo.SetControl(QXMakePopUpControl(viewportCtrl));
 }
 
 - (void)willCloseDialog {
@@ -67,10 +67,10 @@
     if (!_turnTableDialog) {
         return;
     }
-    _turnTableDialog->m_direction_combo.SetControl(nullptr);
-    _turnTableDialog->m_file_type_combo.SetControl(nullptr);
-    _turnTableDialog->m_capture_combo.SetControl(nullptr);
-    _turnTableDialog->m_viewport_combo.SetControl(nullptr);
+    _turnTableDialog->m_direction.m_combo.SetControl(nullptr);
+    _turnTableDialog->m_file_type.m_combo.SetControl(nullptr);
+    _turnTableDialog->m_capture.m_combo.SetControl(nullptr);
+    _turnTableDialog->m_viewport.m_combo.SetControl(nullptr);
 }
 
 @end

@@ -2,7 +2,6 @@
 
 #include "sdk/qncore/QnLocalize.h"
 #include "sdk/qncore/QnLocationDialog.h"
-#include "zoetrix/ui/ComboBoxEntries.h"
 
 namespace {
 
@@ -28,13 +27,12 @@ CSunStudyDialog::CSunStudyDialog(int template_id, double latitude, double longit
     : CQuarnDialog(template_id, parent), m_latitude(latitude), m_longitude(longitude),
       m_north_angle(north_angle), m_first_date_time(first_date_time),
       m_second_date_time(second_date_time), m_third_date_time(third_date_time), m_text(text),
-      m_frame_step(frame_step), m_file_type_list(file_types),
-      m_file_type_selection(file_type_selection), m_capture_list(capture_methods),
-      m_capture_selection(capture_method_selection), m_viewport_list(viewports),
-      m_viewport_selection(viewport_selection) {
-    AttachComboBox(file_type_id, m_file_type_combo);
-    AttachComboBox(capture_id, m_capture_combo);
-    AttachComboBox(viewport_id, m_viewport_combo);
+      m_frame_step(frame_step), m_file_type(file_types, file_type_selection),
+      m_capture(capture_methods, capture_method_selection),
+      m_viewport(viewports, viewport_selection) {
+    AttachComboBox(file_type_id, m_file_type.m_combo);
+    AttachComboBox(capture_id, m_capture.m_combo);
+    AttachComboBox(viewport_id, m_viewport.m_combo);
 }
 
 CSunStudyDialog::~CSunStudyDialog() = default;
@@ -56,21 +54,18 @@ void CSunStudyDialog::DoDataExchange(CQnDialogExchange& exchange) {
 
 int CSunStudyDialog::OnInitDialog() {
     CQuarnDialog::OnInitDialog();
-    for (CComboBox* combo_box : {&m_file_type_combo, &m_capture_combo, &m_viewport_combo})
+    for (CComboBox* combo_box : {&m_file_type.m_combo, &m_capture.m_combo, &m_viewport.m_combo})
         combo_box->ResetContent();
-    InsertEntries(m_file_type_combo, m_file_type_list);
-    SelectEntry(m_file_type_combo, m_file_type_selection, m_file_type_list.Count());
-    InsertEntries(m_capture_combo, m_capture_list);
-    SelectEntry(m_capture_combo, m_capture_selection, m_capture_list.Count());
-    InsertEntries(m_viewport_combo, m_viewport_list);
-    SelectEntry(m_viewport_combo, m_viewport_selection, m_file_type_list.Count());
+    m_file_type.Show();
+    m_capture.Show();
+    m_viewport.Show(m_file_type.m_list.Count());
     return 1;
 }
 
 void CSunStudyDialog::OnOK() {
-    m_file_type_selection = m_file_type_combo.GetCurSel();
-    m_capture_selection = m_capture_combo.GetCurSel();
-    m_viewport_selection = m_viewport_combo.GetCurSel();
+    m_file_type.Store();
+    m_capture.Store();
+    m_viewport.Store();
     CQuarnDialog::OnOK();
 }
 

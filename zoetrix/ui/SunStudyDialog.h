@@ -2,9 +2,9 @@
 
 #include "kelmar/KM_Array.h"
 #include "kelmar/KM_wString.h"
-#include "sdk/qncore/QnComboBox.h"
 #include "sdk/qncore/QnDateTime.h"
 #include "sdk/qncore/QnDialog.h"
+#include "zoetrix/ui/ComboBoxList.h"
 
 /// What the forms of both sun studies are: place, dates and times, step, file type, capture method
 /// and viewport, with a button for the host's location picker. A form stands by itself: whoever
@@ -46,15 +46,9 @@ public:
     COleDateTime m_third_date_time;
     KM_wString m_text; ///< what it means is the caller's
     int m_frame_step;
-    CComboBox m_file_type_combo;
-    KM_ClassArray<KM_wString> m_file_type_list;
-    int m_file_type_selection;
-    CComboBox m_capture_combo;
-    KM_ClassArray<KM_wString> m_capture_list;
-    int m_capture_selection;
-    CComboBox m_viewport_combo;
-    KM_ClassArray<KM_wString> m_viewport_list;
-    int m_viewport_selection;
+    ComboBoxList m_file_type;
+    ComboBoxList m_capture;
+    ComboBoxList m_viewport;
 
 protected:
     CSunStudyDialog(int template_id, double latitude, double longitude, double north_angle,

@@ -47,31 +47,31 @@ TEST_F(PathForm, HandsBackWhatWasEntered) {
               }));
     EXPECT_EQ(300, path.m_frame_count);
     EXPECT_EQ(L"Flight", path.m_name.View());
-    EXPECT_EQ(1, path.m_file_type_selection);
-    EXPECT_EQ(2, path.m_capture_selection);
-    EXPECT_EQ(3, path.m_viewport_selection);
+    EXPECT_EQ(1, path.m_file_type.m_selection);
+    EXPECT_EQ(2, path.m_capture.m_selection);
+    EXPECT_EQ(3, path.m_viewport.m_selection);
 }
 
 TEST_F(PathForm, SelectionThatIsNotBelowTheCountShowsTheFirstEntry) {
     CPathAnimationDialog path = form(4, 3, 4);
     confirm(path);
-    EXPECT_EQ(0, path.m_file_type_selection);
-    EXPECT_EQ(0, path.m_capture_selection);
-    EXPECT_EQ(0, path.m_viewport_selection);
+    EXPECT_EQ(0, path.m_file_type.m_selection);
+    EXPECT_EQ(0, path.m_capture.m_selection);
+    EXPECT_EQ(0, path.m_viewport.m_selection);
 }
 
 TEST_F(PathForm, ThirdSelectionIsMeasuredAgainstTheFirstList) {
     file_types = {L"jpg", L"png"};
     CPathAnimationDialog few_types = form(0, 0, 3);
     confirm(few_types);
-    EXPECT_EQ(0, few_types.m_viewport_selection);
+    EXPECT_EQ(0, few_types.m_viewport.m_selection);
     file_types = names(6);
     CPathAnimationDialog many_types = form(0, 0, 3);
     confirm(many_types);
-    EXPECT_EQ(3, many_types.m_viewport_selection);
+    EXPECT_EQ(3, many_types.m_viewport.m_selection);
     CPathAnimationDialog behind_the_viewports = form(0, 0, 5);
     confirm(behind_the_viewports);
-    EXPECT_EQ(-1, behind_the_viewports.m_viewport_selection);
+    EXPECT_EQ(-1, behind_the_viewports.m_viewport.m_selection);
 }
 
 TEST_F(PathForm, CancelKeepsTheMembers) {
@@ -82,7 +82,7 @@ TEST_F(PathForm, CancelKeepsTheMembers) {
                   window.pressClose();
               }));
     EXPECT_EQ(L"Walk", path.m_name.View());
-    EXPECT_EQ(1, path.m_capture_selection);
+    EXPECT_EQ(1, path.m_capture.m_selection);
 }
 
 TEST_F(PathForm, HasNoControllerOfItsOwn) {

@@ -63,12 +63,12 @@ TYPED_TEST(SunForms, KeepEveryArgument) {
     EXPECT_EQ(this->second, dialog.m_second_date_time);
     EXPECT_EQ(this->third, dialog.m_third_date_time);
     EXPECT_EQ(L"note", dialog.m_text.View());
-    EXPECT_EQ(this->names(1), dialog.m_file_type_list);
-    EXPECT_EQ(4, dialog.m_file_type_selection);
-    EXPECT_EQ(this->names(2), dialog.m_capture_list);
-    EXPECT_EQ(5, dialog.m_capture_selection);
-    EXPECT_EQ(this->names(3), dialog.m_viewport_list);
-    EXPECT_EQ(6, dialog.m_viewport_selection);
+    EXPECT_EQ(this->names(1), dialog.m_file_type.m_list);
+    EXPECT_EQ(4, dialog.m_file_type.m_selection);
+    EXPECT_EQ(this->names(2), dialog.m_capture.m_list);
+    EXPECT_EQ(5, dialog.m_capture.m_selection);
+    EXPECT_EQ(this->names(3), dialog.m_viewport.m_list);
+    EXPECT_EQ(6, dialog.m_viewport.m_selection);
     EXPECT_EQ(7, dialog.m_frame_step);
     EXPECT_EQ(&parent, dialog.Parent());
 }
@@ -108,9 +108,9 @@ TYPED_TEST(SunForms, HandBackWhatWasEntered) {
     EXPECT_EQ(359.5, dialog.m_north_angle);
     EXPECT_EQ(L"x", dialog.m_text.View());
     EXPECT_EQ(7, dialog.m_frame_step);
-    EXPECT_EQ(3, dialog.m_file_type_selection);
-    EXPECT_EQ(2, dialog.m_capture_selection);
-    EXPECT_EQ(1, dialog.m_viewport_selection);
+    EXPECT_EQ(3, dialog.m_file_type.m_selection);
+    EXPECT_EQ(2, dialog.m_capture.m_selection);
+    EXPECT_EQ(1, dialog.m_viewport.m_selection);
 }
 
 TYPED_TEST(SunForms, TakePlacesAndNorthAnglesUpToTheirLimits) {

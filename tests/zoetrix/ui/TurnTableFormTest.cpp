@@ -53,10 +53,10 @@ TEST_F(TurnTableForm, HandsBackWhatWasEntered) {
               }));
     EXPECT_EQ(120, turntable.m_frame_count);
     EXPECT_EQ(L"Round trip", turntable.m_name.View());
-    EXPECT_EQ(1, turntable.m_direction_selection);
-    EXPECT_EQ(3, turntable.m_file_type_selection);
-    EXPECT_EQ(2, turntable.m_capture_selection);
-    EXPECT_EQ(1, turntable.m_viewport_selection);
+    EXPECT_EQ(1, turntable.m_direction.m_selection);
+    EXPECT_EQ(3, turntable.m_file_type.m_selection);
+    EXPECT_EQ(2, turntable.m_capture.m_selection);
+    EXPECT_EQ(1, turntable.m_viewport.m_selection);
 }
 
 TEST_F(TurnTableForm, CancelKeepsTheMembers) {
@@ -67,16 +67,16 @@ TEST_F(TurnTableForm, CancelKeepsTheMembers) {
                   window.pressCancel();
               }));
     EXPECT_EQ(36, turntable.m_frame_count);
-    EXPECT_EQ(1, turntable.m_direction_selection);
-    EXPECT_EQ(3, turntable.m_viewport_selection);
+    EXPECT_EQ(1, turntable.m_direction.m_selection);
+    EXPECT_EQ(3, turntable.m_viewport.m_selection);
 }
 
 TEST_F(TurnTableForm, SelectionThatIsNotBelowTheCountShowsTheFirstEntry) {
     CTurnTableDialog turntable = form(2, 4, 3, 0);
     confirm(turntable);
-    EXPECT_EQ(0, turntable.m_direction_selection);
-    EXPECT_EQ(0, turntable.m_file_type_selection);
-    EXPECT_EQ(0, turntable.m_capture_selection);
+    EXPECT_EQ(0, turntable.m_direction.m_selection);
+    EXPECT_EQ(0, turntable.m_file_type.m_selection);
+    EXPECT_EQ(0, turntable.m_capture.m_selection);
 }
 
 TEST_F(TurnTableForm, ViewportSelectionIsMeasuredAgainstTheCountOfFileTypes) {
@@ -101,8 +101,8 @@ TEST_F(TurnTableForm, ShowsEmptyListsWithNothingSelected) {
     directions = file_types = captures = viewports = {};
     CTurnTableDialog turntable = form(0, 0, 0, 0);
     EXPECT_EQ(1, confirm(turntable));
-    EXPECT_EQ(-1, turntable.m_direction_selection);
-    EXPECT_EQ(-1, turntable.m_viewport_selection);
+    EXPECT_EQ(-1, turntable.m_direction.m_selection);
+    EXPECT_EQ(-1, turntable.m_viewport.m_selection);
 }
 
 TEST_F(TurnTableForm, NamesWithPercentSignsAreShownAsTheyStand) {
@@ -125,7 +125,7 @@ TEST_F(TurnTableForm, FrameCountThatIsNoWholeNumberIsRefusedUnderTheFormsTitle) 
     EXPECT_EQ(L"Enter a whole number", lastMessage());
     EXPECT_EQ(L"Turntable Animation", front_end.messages().back().title);
     EXPECT_EQ(36, turntable.m_frame_count);
-    EXPECT_EQ(1, turntable.m_direction_selection) << "stored before the exchange";
+    EXPECT_EQ(1, turntable.m_direction.m_selection) << "stored before the exchange";
 }
 
 TEST_F(TurnTableForm, FrameCountsThatTheCommandWillRefuseAreHandedOnAsTheyAre) {
