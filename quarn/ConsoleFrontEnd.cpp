@@ -62,6 +62,11 @@ void ConsoleFrontEnd::rememberWords(std::string_view text) {
     }
 }
 
+std::string ConsoleFrontEnd::takeKeptWords() {
+    m_keeps_words = false;
+    return std::exchange(m_kept_words, {});
+}
+
 void ConsoleFrontEnd::print(std::wstring_view text) {
     const std::string bytes = utf8Text(text);
     rememberWords(bytes);

@@ -37,9 +37,12 @@ public:
 
     /// From now on everything that is printed is shown.
     void showWords() { m_prints = Prints::shown; }
+    bool hidesWords() const { return m_prints == Prints::hidden; }
     /// From now on everything that is printed is kept.
     void keepWords() { m_keeps_words = true; }
     const std::string& keptWords() const { return m_kept_words; }
+    /// What was kept; from now on nothing is.
+    std::string takeKeptWords();
 
     void print(std::wstring_view text) override;
     Answer ask(const Question& question) override;

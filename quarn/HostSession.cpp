@@ -4,6 +4,9 @@
 #include "quarn/Interruption.h"
 #include "quarn/Words.h"
 
+#include <cstdio>
+#include <sstream>
+
 namespace quarn::program {
 
 namespace {
@@ -15,6 +18,15 @@ SessionOptions sessionOptions(const CommonOptions& common) {
     options.language = common.language;
     options.dialog_folders = {dialogFolder()};
     return options;
+}
+
+/// A command that reads a model tells what is wrong with it, and in its last line what it holds.
+void tellDefects(const std::string& words, const std::string& model) {
+    std::istringstream stream(words);
+    std::string defect;
+    std::getline(stream, defect);
+    for (std::string next; std::getline(stream, next); defect = next)
+        std::fprintf(stderr, "quarn: %s: %s\n", model.c_str(), defect.c_str());
 }
 
 } // namespace
@@ -45,9 +57,21 @@ std::optional<Outcome> HostSession::run(const std::string& line) {
 std::optional<Outcome> HostSession::readModel(const std::filesystem::path& model) {
     if (const auto refusal = whyPathIsRefused("the model's path", model))
         return Outcome::misuse(*refusal);
-    m_front_end.showStep("reading " + model.filename().native());
-    std::optional<Outcome> trouble = run(readingLine(model));
+    std::optional<Outcome> trouble = runReading(readingLine(model), model);
     m_front_end.clearProgress();
+    return trouble;
+}
+
+std::optional<Outcome> HostSession::runReading(const std::string& line,
+                                               const std::filesystem::path& model) {
+    m_front_end.showStep("reading " + model.filename().native());
+    m_front_end.keepWords();
+    std::optional<Outcome> trouble = run(line);
+    const std::string words = m_front_end.takeKeptWords();
+    if (!trouble && m_front_end.hidesWords()) {
+        m_front_end.clearProgress();
+        tellDefects(words, model.filename().native());
+    }
     return trouble;
 }
 

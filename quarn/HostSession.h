@@ -25,6 +25,11 @@ public:
     /// run().
     std::optional<Outcome> readModel(const std::filesystem::path& model);
 
+    /// Runs the host command that reads a model or a document. What is wrong with the file, but not
+    /// so wrong that it cannot be shown, is told even where the host's words are hidden. Result as
+    /// of run().
+    std::optional<Outcome> runReading(const std::string& line, const std::filesystem::path& model);
+
     Session& session() { return m_session; }
     ConsoleFrontEnd& frontEnd() { return m_front_end; }
 

@@ -93,7 +93,8 @@ Outcome runRecording(const RecordingRequest& request, const RecordingScript& scr
     HostSession host(front_end, common);
     if (const auto trouble = host.loadAnimationPlugIn())
         return *trouble;
-    front_end.showStep("reading " + request.model.filename().native());
+    if (const auto trouble = host.runReading(script.reading, request.model))
+        return *trouble;
     for (const std::string& line : script.set_up)
         if (const auto trouble = host.run(line))
             return *trouble;

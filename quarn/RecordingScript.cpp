@@ -7,8 +7,8 @@ namespace quarn::program {
 RecordingScript composeRecording(const RecordingRequest& request, const AnimationLines& lines) {
     RecordingScript script;
     script.notes = lines.notes;
+    script.reading = readingLine(request.model, request.up_axis);
     std::vector<std::string>& set_up = script.set_up;
-    set_up.push_back(readingLine(request.model, request.up_axis));
     for (const std::string& name : request.hidden)
         set_up.push_back("_-Hide \"" + name + "\"");
     const std::string size =
@@ -33,6 +33,7 @@ std::string scriptText(const RecordingScript& script) {
     std::string text;
     for (const std::string& note : script.notes)
         text += "# " + note + "\n";
+    text += script.reading + "\n";
     for (const std::string& line : script.set_up)
         text += line + "\n";
     text += "# The folder must be there before the recording starts.\n";

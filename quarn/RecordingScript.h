@@ -18,7 +18,8 @@ struct AnimationLines {
 /// The host commands of a whole recording.
 struct RecordingScript {
     std::vector<std::string> notes;  ///< for a person
-    std::vector<std::string> set_up; ///< from the model file to the animation
+    std::string reading;             ///< of the model file
+    std::vector<std::string> set_up; ///< from the model to the animation
     /// Keeps the document before the recording begins, so that one which is stopped keeps it too.
     std::optional<std::string> saving;
     std::string recording; ///< this and `saving` need the folder to be there

@@ -21,6 +21,7 @@ std::optional<std::string> mistakeIn(const FrameOptions& options) {
     return whyPathIsRefused("the path of --out", options.file);
 }
 
+/// The line that reads the document and the one that writes the frame.
 /// @param options  without a mistake
 std::vector<std::string> composeFrame(const FrameOptions& options) {
     std::string line = "_-SaveFrame ";
@@ -37,9 +38,10 @@ Outcome runFrame(const FrameOptions& options, const std::vector<std::string>& sc
     HostSession host(front_end, options.common);
     if (const auto trouble = host.loadAnimationPlugIn())
         return *trouble;
-    for (const std::string& line : script)
-        if (const auto trouble = host.run(line))
-            return *trouble;
+    if (const auto trouble = host.runReading(script.front(), options.document))
+        return *trouble;
+    if (const auto trouble = host.run(script.back()))
+        return *trouble;
     return Outcome::success("frame " + options.number + " in " + options.file);
 }
 
