@@ -4,7 +4,7 @@
 #include "host/commands/HostCommands.h"
 #include "host/commands/Rendering.h"
 #include "host/display/ImageFile.h"
-#include "host/document/Document.h"
+#include "host/document/DocumentList.h"
 #include "host/document/SceneChanges.h"
 #include "host/front_end/FrontEnd.h"
 #include "sdk/qncore/QnLocalize.h"
@@ -15,12 +15,12 @@ namespace quarn {
 
 namespace {
 
-/// Renders the active view into the render window. One that is cancelled or fails leaves the
-/// picture that was there.
-CQuarnCommand::result renderActiveView(Document& document, int samples) {
+/// Renders the active view, or the one that the command which runs this one has placed, into the
+/// render window. One that is cancelled or fails leaves the picture that was there.
+CQuarnCommand::result renderView(Document& document, int samples) {
     RenderWindow& window = document.renderWindow();
     const RenderRequest request{window.settings.width_px, window.settings.height_px, samples};
-    const KM_Viewport viewport = document.activeView().viewport();
+    const KM_Viewport viewport = document.list().viewToRender(document).viewport();
     Image picture;
     const auto end = renderWatched(document, viewport, request, picture, SceneChanges());
     if (!end)
@@ -37,12 +37,12 @@ CQuarnCommand::result renderActiveView(Document& document, int samples) {
 
 CQuarnCommand::result runRender(const CQuarnCommandContext& context) {
     Document& document = Document::of(context.Document());
-    return renderActiveView(document, document.renderWindow().settings.samples);
+    return renderView(document, document.renderWindow().settings.samples);
 }
 
 CQuarnCommand::result runRenderPreview(const CQuarnCommandContext& context) {
     Document& document = Document::of(context.Document());
-    return renderActiveView(document, document.renderWindow().settings.preview_samples);
+    return renderView(document, document.renderWindow().settings.preview_samples);
 }
 
 CQuarnCommand::result runSaveRenderWindowAs(const CQuarnCommandContext& context) {

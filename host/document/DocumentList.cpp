@@ -54,8 +54,19 @@ Document& DocumentList::openNew() {
     return *m_active;
 }
 
+void DocumentList::viewPlaced(ViewState& view) {
+    if (m_is_command_running)
+        m_placed_view = &view;
+}
+
+ViewState& DocumentList::viewToRender(const Document& document) const {
+    const bool is_placed = m_placed_view && &m_placed_view->document() == &document;
+    return is_placed ? *m_placed_view : document.activeView();
+}
+
 void DocumentList::commandEnded() {
     m_is_command_running = false;
+    m_placed_view = nullptr;
     closeAllBut(m_active);
     if (m_active)
         m_active->settleViews();

@@ -33,6 +33,11 @@ public:
     /// Called when the outermost command starts: until it has ended no document and no view closes,
     /// because the command may hold it.
     void commandStarted() { m_is_command_running = true; }
+    /// Called when a plug-in placed the camera of a view or chose its display mode.
+    void viewPlaced(ViewState& view);
+    /// The view that pictures of a document are rendered of: the one that the running command has
+    /// placed last, as one that records places the view of the animation; else the active one.
+    ViewState& viewToRender(const Document& document) const;
     /// Called when the outermost command has ended: closes every document but the active one, and
     /// does to its views what was put off until then.
     void commandEnded();
@@ -73,6 +78,7 @@ private:
     std::vector<std::unique_ptr<Document>> m_closed_documents;
     Document* m_active = nullptr;
     bool m_is_command_running = false;
+    ViewState* m_placed_view = nullptr; ///< by the command that runs; null: none
     std::unique_ptr<ImageEncoder> m_image_encoder;
     std::vector<std::uint8_t> m_picture_storage;
     std::unique_ptr<KM_3dmAnimationProperties> m_fresh_record;

@@ -13,6 +13,14 @@ const KM_Viewport& noCamera() {
     return viewport;
 }
 
+/// Notes a view that a plug-in placed.
+/// @return whether it did
+bool placed(quarn::ViewState& view, bool is_done) {
+    if (is_done)
+        view.document().list().viewPlaced(view);
+    return is_done;
+}
+
 } // namespace
 
 // ---- CQuarnViewport
@@ -28,7 +36,7 @@ const KM_Viewport& CQuarnViewport::VP() const {
 bool CQuarnViewport::SetVP(const KM_Viewport& viewport, bool update_target,
                            bool update_frame_size) {
     return mayCallView(*m_view, "CQuarnViewport::SetVP") &&
-           m_view->setViewport(viewport, update_target, update_frame_size);
+           placed(*m_view, m_view->setViewport(viewport, update_target, update_frame_size));
 }
 
 KM_3dPoint CQuarnViewport::Target() const {
@@ -39,12 +47,12 @@ KM_3dPoint CQuarnViewport::Target() const {
 bool CQuarnViewport::SetTargetAndCameraLocation(const KM_3dPoint& target, const KM_3dPoint& camera,
                                                 bool update_target, bool update_up) {
     return mayCallView(*m_view, "CQuarnViewport::SetTargetAndCameraLocation") &&
-           m_view->setTargetAndCamera(target, camera, update_target, update_up);
+           placed(*m_view, m_view->setTargetAndCamera(target, camera, update_target, update_up));
 }
 
 bool CQuarnViewport::SetDisplayMode(const KM_UUID& display_mode_id) {
     return mayCallView(*m_view, "CQuarnViewport::SetDisplayMode") &&
-           m_view->setDisplayMode(display_mode_id);
+           placed(*m_view, m_view->setDisplayMode(display_mode_id));
 }
 
 CQuarnDisplayPipeline* CQuarnViewport::DisplayPipeline() {

@@ -1,3 +1,4 @@
+#include "host/front_end/ViewFrame.h"
 #include "tests/zoetrix/RecordingFixture.h"
 
 #include <cstdlib>
@@ -223,6 +224,45 @@ TEST_F(RecordCommand, RendererWritesEveryFrameAndThePage) {
     ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
     expectThreeFramesAndThePageIn(frames);
     EXPECT_EQ(3, record().Images().Count());
+}
+
+TEST_F(RecordCommand, RenderedFramesAreOfTheAnimationsViewWhicheverIsActive) {
+    renderSmall();
+    record().SetRenderPreview(true);
+    const auto recorded = [this] {
+        EXPECT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
+        std::vector<std::string> pictures;
+        for (const char* name : {"Walk000.jpg", "Walk001.jpg", "Walk002.jpg"})
+            pictures.push_back(readFile(frames / name));
+        return pictures;
+    };
+    const std::vector<std::string> of_the_active_view = recorded();
+    EXPECT_NE(of_the_active_view[0], of_the_active_view[2]);
+    quarn::activateView(view(L"Top"));
+    EXPECT_EQ(of_the_active_view, recorded());
+    // Afterwards a command of its own renders the active view again.
+    ASSERT_EQ(CQuarnCommand::success, run(L"RenderPreview"));
+    const auto saved = [this](const char* name) {
+        const std::filesystem::path file = folder.path() / name;
+        EXPECT_EQ(CQuarnCommand::success, run(L"SaveRenderWindowAs \"" + wide(file) + L"\""));
+        return readFile(file);
+    };
+    const std::string of_top = saved("top.jpg");
+    quarn::activateView(view(L"Perspective"));
+    ASSERT_EQ(CQuarnCommand::success, run(L"RenderPreview"));
+    EXPECT_NE(of_top, saved("perspective.jpg"));
+}
+
+TEST_F(RecordCommand, RenderedSunStudyIsOfTheAnimationsViewAndLitByItsSuns) {
+    renderSmall();
+    setUpSunFrames(3);
+    record().SetRenderPreview(true);
+    ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
+    const std::string first = readFile(frames / "Walk000.jpg");
+    EXPECT_NE(first, readFile(frames / "Walk002.jpg"));
+    quarn::activateView(view(L"Front"));
+    ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
+    EXPECT_EQ(first, readFile(frames / "Walk000.jpg"));
 }
 
 TEST_F(RecordCommand, NamesThatLeaveTheFolderGiveNeitherFrameNorPage) {
