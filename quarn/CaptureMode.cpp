@@ -24,19 +24,18 @@ std::string comparable(std::string_view name) {
 struct CaptureMode {
     std::string name;   ///< as a person reads it
     std::string option; ///< as the prompt knows it
-    bool shows_sun;
+    bool suits_sun_studies;
 };
 
 CaptureMode displayMode(const CDisplayPipelineAttributes& mode) {
     const std::string name = mode.EnglishName().ToUtf8();
-    const bool shows_sun = mode.m_mode_kind == CDisplayPipelineAttributes::shaded &&
-                           (mode.m_uses_document_lights || mode.m_casts_shadows);
-    // The prompt calls these two by names of its own.
+    // The prompt calls these two by names of its own. It offers sun studies other modes with lights
+    // too, but the frames of a study are drawn in the rendered mode whichever was picked.
     if (comparable(name) == "rendered")
-        return {name, "_RenderedViewport", shows_sun};
+        return {name, "_RenderedViewport", true};
     if (comparable(name) == "xray")
-        return {name, "_XRay", shows_sun};
-    return {name, "_" + name, shows_sun};
+        return {name, "_XRay", false};
+    return {name, "_" + name, false};
 }
 
 std::vector<CaptureMode> captureModes() {
@@ -65,17 +64,17 @@ bool isRendered(std::string_view option) {
                        [&](const std::string& method) { return option == "_" + method; });
 }
 
-bool showsSun(std::string_view option) {
+bool suitsSunStudies(std::string_view option) {
     for (const CaptureMode& mode : captureModes())
         if (mode.option == option)
-            return mode.shows_sun;
+            return mode.suits_sun_studies;
     return false;
 }
 
 std::string captureModeNames(CaptureSubject subject) {
     std::string names;
     for (const CaptureMode& mode : captureModes())
-        if (subject != CaptureSubject::moving_sun || mode.shows_sun)
+        if (subject != CaptureSubject::moving_sun || mode.suits_sun_studies)
             names += (names.empty() ? "" : ", ") + mode.name;
     return names;
 }

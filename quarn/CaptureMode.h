@@ -6,7 +6,7 @@
 
 namespace quarn::program {
 
-/// What is to be captured: some display modes do not show where the sun stands.
+/// What is to be captured: sun studies are drawn in the rendered mode alone.
 enum class CaptureSubject { moving_camera, moving_sun };
 
 /// The option that picks a capture mode at the prompt of the set-up commands.
@@ -17,8 +17,8 @@ enum class CaptureSubject { moving_camera, moving_sun };
 ///         that is no mode's
 std::optional<std::string> captureOption(std::string_view name);
 
-/// Whether the sun commands take this option of captureOption().
-bool showsSun(std::string_view option);
+/// Whether a sun study that was set up with this option of captureOption() is recorded so.
+bool suitsSunStudies(std::string_view option);
 
 /// Whether a capture mode is a render method, whose pictures have a size of their own.
 /// @param option  as captureOption gives it

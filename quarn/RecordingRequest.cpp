@@ -61,10 +61,9 @@ private:
         if (!option)
             m_mistake.note("unknown display mode \"" + m_typed.mode + "\"; --mode takes " +
                            captureModeNames(m_subject) + ".");
-        else if (m_subject == CaptureSubject::moving_sun && !showsSun(*option))
-            m_mistake.note("the display mode \"" + m_typed.mode +
-                           "\" does not show the sun; --mode takes " + captureModeNames(m_subject) +
-                           ".");
+        else if (m_subject == CaptureSubject::moving_sun && !suitsSunStudies(*option))
+            m_mistake.note("sun studies are not recorded in the display mode \"" + m_typed.mode +
+                           "\"; --mode takes " + captureModeNames(m_subject) + ".");
         m_request.capture_option = option.value_or("");
     }
 

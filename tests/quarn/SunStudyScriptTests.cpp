@@ -100,15 +100,15 @@ TEST(DayScript, SetsUpTheDefaultsOfAPlace) {
 }
 
 TEST(DayScript, HoldsEveryOption) {
-    const Words script =
-        scriptOf(day({"--latitude", "-33.5",      "--longitude", "-70.25", "--north",     "-12.5",
-                      "--date",     "2199-02-28", "--from",      "4:05",   "--to",        "21:50",
-                      "--every",    "7",          "--azimuth",   "0",      "--elevation", "0",
-                      "--distance", "2",          "--target",    "1,2,3",  "--mode",      "clay",
-                      "--size",     "640x360",    "--format",    "png",    "--hide",      "Trees",
-                      "--up",       "y",          "--name",      "Sun",    "--save",      "sun"}));
+    const Words script = scriptOf(
+        day({"--latitude", "-33.5",      "--longitude", "-70.25", "--north",     "-12.5",
+             "--date",     "2199-02-28", "--from",      "4:05",   "--to",        "21:50",
+             "--every",    "7",          "--azimuth",   "0",      "--elevation", "0",
+             "--distance", "2",          "--target",    "1,2,3",  "--mode",      "render preview",
+             "--size",     "640x360",    "--format",    "png",    "--hide",      "Trees",
+             "--up",       "y",          "--name",      "Sun",    "--save",      "sun"}));
     EXPECT_THAT(script, Contains("_-SetOneDaySunAnimation -33.5 -70.25 -12.5 28 2 2199 4 5 21 50 7 "
-                                 "_png _Clay _Enter _Enter"));
+                                 "_png _RenderPreview _Enter _Enter"));
     EXPECT_THAT(script, Contains("_-FitView _KeepTarget=Yes _Distance 2 _Enter"));
     EXPECT_THAT(script, Contains("_-SaveAs \"sun.quarn\""));
     EXPECT_THAT(script, Contains("_-Hide \"Trees\""));
@@ -299,10 +299,11 @@ TEST(SunStudySteps, AreWholeAndNeverNone) {
     EXPECT_EQ(seasonInTheWest({"--every", "2147483647"}).exit_code, 0);
 }
 
-TEST(SunStudyMode, MustShowTheSun) {
-    for (const char* mode : {"Wireframe", "Shaded", "Translucent", "X-Ray", "Drawing"})
+TEST(SunStudyMode, IsTheOneThatStudiesAreDrawnInOrARenderMethod) {
+    for (const char* mode : {"Wireframe", "Shaded", "Translucent", "X-Ray", "Drawing", "Clay"})
         expectRefusal(dayInAthens({"--mode", mode}),
-                      {"does not show the sun", mode, "--mode takes Rendered, "});
+                      {"sun studies are not recorded in", mode,
+                       "--mode takes Rendered, RenderFull, RenderPreview."});
     expectRefusal(dayInAthens({"--mode", "Cubist"}), {"unknown display mode", "Cubist"});
     for (const char* mode : {"Rendered", "RenderFull", "render preview"})
         EXPECT_EQ(dayInAthens({"--mode", mode}).exit_code, 0) << mode;
