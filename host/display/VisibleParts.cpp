@@ -9,6 +9,9 @@ namespace quarn {
 
 namespace {
 
+/// Depths count as the same within this part of them.
+constexpr float same_depth = 3e-4F;
+
 /// In samples.
 constexpr std::size_t longest_gap = 3;
 constexpr std::size_t shortest_run = 6;
@@ -64,10 +67,39 @@ bool SurfaceView::hides(int x, int y, float nearness) const {
     if (!m_target.depth)
         return false;
     const auto hidden = [&](int column, int row) {
-        return nearness < (1.0F - 3e-4F) * nearnessAt(column, row);
+        return nearness < (1.0F - same_depth) * nearnessAt(column, row);
     };
     return hidden(x, y) && hidden(x - 1, y) && hidden(x + 1, y) && hidden(x, y - 1) &&
            hidden(x, y + 1);
+}
+
+/// Looks at the pixels above and below a flat line, and to the left and right of a steep one.
+bool SurfaceView::meetsSurfaceBeside(const ScreenSegment& line, const ScreenPoint& place) const {
+    const float dx = line.to.x - line.from.x;
+    const float dy = line.to.y - line.from.y;
+    const bool is_flat = std::fabs(dx) >= std::fabs(dy);
+    const float run = is_flat ? dx : dy;
+    if (run == 0.0F)
+        return false;
+    const float along = is_flat ? place.x : place.y;
+    const int column = pixelOf(along);
+    const float to_middle = static_cast<float>(column) + 0.5F - along;
+    const float across = (is_flat ? place.y : place.x) + to_middle * (is_flat ? dy : dx) / run;
+    const float nearness =
+        place.nearness + to_middle * (line.to.nearness - line.from.nearness) / run;
+    const int row = pixelOf(across);
+    const auto meets = [&](int side) {
+        float near[3];
+        for (int i = 0; i < 3; ++i) {
+            const int beside = row + side * (i + 1);
+            near[i] = is_flat ? nearnessAt(column, beside) : nearnessAt(beside, column);
+        }
+        if (std::fabs(near[0] - 2.0F * near[1] + near[2]) > same_depth * near[0])
+            return false;
+        const float away = std::fabs(static_cast<float>(row + side) + 0.5F - across);
+        return nearness >= (1.0F - same_depth) * (near[0] + away * (near[0] - near[1]));
+    };
+    return meets(-1) || meets(1);
 }
 
 float SurfaceView::bendAt(int x, int y, const Aside& aside) const {
@@ -106,7 +138,9 @@ void VisibleParts::look(const ScreenSegment& segment) {
         const ScreenPoint place = along(segment, t);
         const int x = pixelOf(place.x);
         const int y = pixelOf(place.y);
-        m_seen[i] = m_view.hides(x, y, place.nearness) ? 0 : 1;
+        const bool is_hidden =
+            m_view.hides(x, y, place.nearness) && !m_view.meetsSurfaceBeside(segment, place);
+        m_seen[i] = is_hidden ? 0 : 1;
         m_bends[i] = m_view.bendAt(x, y, aside);
     }
 }

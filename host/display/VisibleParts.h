@@ -22,6 +22,9 @@ public:
     /// point of the line may lie in the next pixel, so the farthest of the surfaces seen there
     /// counts.
     bool hides(int x, int y, float nearness) const;
+    /// True when a place of a line lies where a plane beside the line would run on to. At the foot
+    /// of a wall the line is farther away than all that the pixels around show, and yet seen.
+    bool meetsSurfaceBeside(const ScreenSegment& line, const ScreenPoint& place) const;
     /// How sharply surfaces bend across a line: the second difference of depth, in pixels. 0 within
     /// a plane, about the size of the step where a surface ends before another, and `open_end`
     /// where nothing lies behind.
