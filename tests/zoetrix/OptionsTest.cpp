@@ -175,11 +175,16 @@ TEST_F(Options, KnownMethodInOtherCaseStaysAsItIs) {
 
 TEST_F(Options, SunStudiesAreOfferedNoWireframe) {
     EXPECT_EQ(CQuarnCommand::success, ask({L"_Enter", L"_Enter", L"_Enter", L"_Enter"}, true));
-    const Texts offered = optionsOf(1);
-    EXPECT_EQ(L"RenderFull", offered.at(0));
-    EXPECT_EQ(1, std::ranges::count(offered, L"RenderedViewport"));
-    EXPECT_EQ(0, std::ranges::count(offered, L"Wireframe"));
+    EXPECT_EQ(Texts({L"RenderFull", L"RenderPreview", L"RenderedViewport", L"Clay"}), optionsOf(1));
     EXPECT_EQ(CQuarnCommand::failure, ask({L"_Enter", L"_Wireframe"}, true));
+    EXPECT_EQ(CQuarnCommand::failure, ask({L"_Enter", L"_Shaded"}, true));
+}
+
+TEST_F(Options, ModeThatShowsNoSunBecomesTheFirstOneThatDoesByNameOnly) {
+    EXPECT_EQ(CQuarnCommand::success, ask({L"_Enter", L"_Enter", L"_Enter", L"_Enter"}, true));
+    EXPECT_EQ(L"RenderedViewport", props.CaptureMethod().View());
+    EXPECT_EQ(L"RenderedViewport", question(1).default_answer->View());
+    EXPECT_EQ(some_mode, props.DisplayMode());
 }
 
 TEST_F(Options, ViewportIsFoundInAnyCaseAndStoredAsTyped) {

@@ -25,6 +25,52 @@ protected:
     }
 };
 
+/// A window in which a person sees the views.
+class SeeingFrontEnd final : public quarn::ScriptedFrontEnd {
+public:
+    void viewShown(CQuarnView&, const quarn::ShownPicture& picture) override {
+        ++times_shown;
+        seen.assign(picture.rgba.begin(), picture.rgba.end());
+    }
+
+    int times_shown = 0;
+    std::vector<std::uint8_t> seen; ///< four bytes a pixel, from the top
+};
+
+/// Frames that are recorded before a person's eyes.
+class SeenFrames : public RecordFrames {
+protected:
+    void SetUp() override {
+        session.reset();
+        session = std::make_unique<quarn::Session>(person, quarn::SessionOptions());
+        ASSERT_TRUE(session->adoptProgramPlugIn().ok());
+        RecordFrames::SetUp();
+        person.times_shown = 0;
+        person.seen.clear();
+    }
+    void TearDown() override { session.reset(); }
+
+    SeeingFrontEnd person;
+};
+
+/// The pixels of a bitmap file as a view shows them.
+std::vector<std::uint8_t> pixelsOf(const std::string& bmp, std::size_t width_px,
+                                   std::size_t height_px) {
+    constexpr std::size_t header_bytes = 54;
+    const std::size_t row_bytes = 3 * width_px; // of no padding where the width is fourfold
+    if (bmp.size() != header_bytes + row_bytes * height_px)
+        return {};
+    std::vector<std::uint8_t> rgba;
+    for (std::size_t y = height_px; y-- > 0;)
+        for (std::size_t x = 0; x < width_px; ++x) {
+            const std::size_t blue = header_bytes + y * row_bytes + 3 * x;
+            for (const std::size_t channel : {blue + 2, blue + 1, blue})
+                rgba.push_back(static_cast<std::uint8_t>(bmp[channel]));
+            rgba.push_back(255);
+        }
+    return rgba;
+}
+
 } // namespace
 
 TEST_F(RecordFrames, FrameFiveOfWalkIsWalk005) {
@@ -187,4 +233,43 @@ TEST_F(RecordFrames, InterruptedProgramWritesNothing) {
     front_end.interrupt();
     EXPECT_FALSE(recordFrame());
     EXPECT_THAT(files(), IsEmpty());
+}
+
+TEST_F(SeenFrames, WhatIsRecordedIsAlsoWhatIsSeen) {
+    record().SetFileExtension(L"bmp");
+    for (const int frame : {1, 2}) {
+        record().SetCurrentFrame(frame);
+        placeCamera(L"Perspective", {4.0 * frame, -9.0, 3.0}, {0.0, 0.0, 1.0});
+        ASSERT_TRUE(recordFrame());
+        const std::string name = "Walk00" + std::to_string(frame) + ".bmp";
+        const std::vector<std::uint8_t> recorded = pixelsOf(readFile(frames / name), 64, 48);
+        ASSERT_FALSE(recorded.empty());
+        EXPECT_TRUE(recorded == person.seen) << frame;
+        EXPECT_EQ(frame, person.times_shown);
+    }
+}
+
+TEST_F(SeenFrames, AViewThatIsRenderedIsDrawnAsWell) {
+    renderSmall();
+    for (const bool full : {true, false}) {
+        record().SetRenderFull(full);
+        record().SetRenderPreview(!full);
+        person.times_shown = 0;
+        ASSERT_TRUE(recordFrame());
+        EXPECT_EQ(1, person.times_shown);
+        EXPECT_EQ(4U * 64U * 48U, person.seen.size());
+    }
+}
+
+TEST_F(SeenFrames, AViewWhoseRenderFailedIsDrawnAllTheSame) {
+    renderSmall();
+    person.setKeyDown(VK_ESCAPE, true);
+    for (const bool full : {true, false}) {
+        record().SetRenderFull(full);
+        record().SetRenderPreview(!full);
+        person.times_shown = 0;
+        EXPECT_FALSE(recordFrame());
+        EXPECT_EQ(1, person.times_shown);
+    }
+    EXPECT_THAT(images(), IsEmpty());
 }
