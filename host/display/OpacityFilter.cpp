@@ -46,7 +46,7 @@ void dimPassingLight(const RTCFilterFunctionNArguments* arguments) {
     const auto& surface = *static_cast<const RaySurface*>(arguments->geometryUserPtr);
     for (unsigned i = 0; i < arguments->N; ++i) {
         const unsigned id = RTCRayN_id(arguments->ray, arguments->N, i);
-        if (arguments->valid[i] == 0 || id == 0)
+        if (arguments->valid[i] == 0 || id == 0 || id > PassingLight::count)
             continue;
         const float opacity = opacityAt(surface, RTCHitN_primID(arguments->hit, arguments->N, i),
                                         RTCHitN_u(arguments->hit, arguments->N, i),

@@ -7,10 +7,11 @@ namespace quarn {
 struct RaySurface;
 
 /// The context of occlusion rays that see-through surfaces only dim. Such a ray's id is its place
-/// in `passed` plus one; for rays of id 0 these surfaces are like others.
+/// in `passed` plus one; for rays of id 0, and of an id beyond, these surfaces are like others.
 struct PassingLight {
+    static constexpr unsigned count = 16;
     RTCIntersectContext context; ///< first: rays are shot with its address
-    float passed[16];            ///< what comes through, to begin with 1
+    float passed[count];         ///< what comes through, to begin with 1
 };
 
 /// Makes a geometry let rays pass where its surface has a cut-out or is see-through.

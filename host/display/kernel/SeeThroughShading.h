@@ -59,8 +59,8 @@ inline void goOn(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfa
 /// @param packet    holds the first hits
 /// @param nearness  of the first hits; takes that of the last surface which each ray met, so that
 ///   lines are seen through panes
-[[gnu::noinline]] LaneColors shadeThroughPanes(const FrameSetup& frame, RayPacket& packet,
-                                               SurfaceLanes& surfaces, Lanes& nearness) {
+[[gnu::noinline]] inline LaneColors shadeThroughPanes(const FrameSetup& frame, RayPacket& packet,
+                                                      SurfaceLanes& surfaces, Lanes& nearness) {
     const LaneMask active = packet.active;
     Lanes left = 1.0F; // what still comes through
     LaneColors sum{0.0F, 0.0F, 0.0F};

@@ -1,8 +1,7 @@
 #pragma once
 
-#include "host/display/kernel/Background.h"
-#include "host/display/kernel/GroundPlane.h"
-#include "host/display/kernel/SurfaceShading.h"
+#include "host/display/kernel/SeeThroughShading.h"
+#include "host/render/TintedLight.h"
 #include "host/render/kernel/Directions.h"
 
 namespace quarn {
@@ -51,14 +50,13 @@ inline void setOff(const FrameSetup& frame, const RayPacket& packet, const Surfa
         liftTurnedAway(frame, packet, surfaces, bits(turned_away), ray);
 }
 
-/// The part of a sun's light that arrives from one place of its disc.
-inline Lanes softSunArriving(const RenderSetup& setup, int index, const RayPacket& packet,
-                             const SurfaceLanes& surfaces, const StartLanes& start,
-                             const LaneMask& lit, const DiscLanes& disc) {
+/// Aims shadow rays at one place of a sun's disc.
+/// @return the lanes that have to look
+inline LaneMask aimAtSun(const RenderSetup& setup, int index, const RayPacket& packet,
+                         const SurfaceLanes& surfaces, const StartLanes& start, const LaneMask& lit,
+                         const DiscLanes& disc, RTCRay16& ray) {
     const FrameSetup& frame = setup.frame;
     const FrameLight& sun = frame.suns[index];
-    if (!frame.scene || sun.shadow <= 0.0F)
-        return 1.0F;
     const float(&across)[3] = setup.discs[index].across;
     const float(&up)[3] = setup.discs[index].along;
     const LaneVectors toward{disc.x * across[0] + disc.y * up[0] + sun.toward[0],
@@ -66,16 +64,50 @@ inline Lanes softSunArriving(const RenderSetup& setup, int index, const RayPacke
                              disc.x * across[2] + disc.y * up[2] + sun.toward[2]};
     const LaneMask look = lit & reachesBox(frame, start.place, toward);
     if (!any(look))
-        return 1.0F;
-    RTCRay16 ray;
+        return look;
     prepare(ray);
     setOff(frame, packet, surfaces, start, toward, look, ray);
     store(ray.tfar, select(look, unlimited, no_distance));
+    return look;
+}
+
+/// What arrives of sixteen shadow rays where see-through surfaces colour it.
+[[gnu::noinline]] LaneColors throughTintedPanes(const FrameSetup& frame, float shadow,
+                                                const LaneMask& look, RTCRay16& ray) {
+    TintedLight light;
+    startTintedLight(frame, light, ray);
+    rtcOccluded16(look.data(), frame.scene, &light.context, &ray);
+    const LaneMask ended = load(ray.tfar) < 0.0F;
+    const auto channel = [&](int c) {
+        alignas(64) float passed[lane_count];
+        for (int i = 0; i < lane_count; ++i)
+            passed[i] = light.passed[c][i];
+        const Lanes kept_off = select(ended, Lanes(1.0F), Lanes(1.0F) - load(passed));
+        return select(look, Lanes(1.0F) - kept_off * shadow, 1.0F);
+    };
+    return {channel(0), channel(1), channel(2)};
+}
+
+/// The part of a sun's light that arrives from one place of its disc.
+inline LaneColors softSunArriving(const RenderSetup& setup, int index, const RayPacket& packet,
+                                  const SurfaceLanes& surfaces, const StartLanes& start,
+                                  const LaneMask& lit, const DiscLanes& disc) {
+    const FrameSetup& frame = setup.frame;
+    const float shadow = frame.suns[index].shadow;
+    if (!frame.scene || shadow <= 0.0F)
+        return {1.0F, 1.0F, 1.0F};
+    RTCRay16 ray;
+    const LaneMask look = aimAtSun(setup, index, packet, surfaces, start, lit, disc, ray);
+    if (!any(look))
+        return {1.0F, 1.0F, 1.0F};
+    if (frame.has_see_through)
+        return throughTintedPanes(frame, shadow, look, ray);
     // Not coherent: occlusion packets of partly masked rays do not end there in Embree 3.13.
     RTCIntersectContext context;
     rtcInitIntersectContext(&context);
     rtcOccluded16(look.data(), frame.scene, &context, &ray);
-    return select(look & (load(ray.tfar) < 0.0F), 1.0F - sun.shadow, 1.0F);
+    const Lanes arriving = select(look & (load(ray.tfar) < 0.0F), 1.0F - shadow, 1.0F);
+    return {arriving, arriving, arriving};
 }
 
 /// Light of all suns on the lit lanes, before albedo.
@@ -87,9 +119,11 @@ inline LaneColors sunLight(const RenderSetup& setup, const RayPacket& packet,
     for (int k = 0; k < setup.frame.sun_count; ++k) {
         const FrameLight& sun = setup.frame.suns[k];
         const Lanes facing = greatest(dot(surfaces.normal, sun.toward), 0.0F);
-        const Lanes arriving =
+        const LaneColors arriving =
             softSunArriving(setup, k, packet, surfaces, start, lit & (facing > 0.0F), disc);
-        addLight(sun.color, facing * arriving, light);
+        light.r = light.r + facing * arriving.r * sun.color[0];
+        light.g = light.g + facing * arriving.g * sun.color[1];
+        light.b = light.b + facing * arriving.b * sun.color[2];
     }
     return light;
 }
@@ -100,8 +134,71 @@ inline LaneColors domeColors(const RenderSetup& setup, const RayPacket& packet) 
     return {sky.r * setup.sky_scale[0], sky.g * setup.sky_scale[1], sky.b * setup.sky_scale[2]};
 }
 
-/// The light that comes to the lit lanes from one direction each: of the sky, or of the surface or
-/// ground that stands before it, which is shaded as in a drawing.
+/// What rays see in the direction in which each was sent: the sky, or the surface or the ground
+/// that stands before it, which is shaded as in a drawing.
+/// @param met  the surfaces; takes the ground
+inline LaneColors seenAround(const RenderSetup& setup, RayPacket& bounce, SurfaceLanes& met) {
+    const FrameSetup& frame = setup.bounce;
+    const LaneMask missed = bounce.active & ~bounce.hit;
+    LaneColors color = any(missed) ? domeColors(setup, bounce) : LaneColors{0.0F, 0.0F, 0.0F};
+    Lanes weight = select(bounce.hit, 1.0F, 0.0F);
+    if (frame.has_ground && any(missed))
+        weight = greatest(weight, meetGround(frame, bounce, met).weight);
+    const LaneMask shaded = bounce.active & (weight > 0.0F);
+    if (!any(shaded))
+        return color;
+    const LaneColors surface = shadeSurfaces(frame, bounce, met, shaded);
+    const LaneColors mixed{color.r + weight * (surface.r - color.r),
+                           color.g + weight * (surface.g - color.g),
+                           color.b + weight * (surface.b - color.b)};
+    return select(shaded, mixed, color);
+}
+
+/// How much light of each colour comes through panes, see passedByPane.
+inline LaneColors passedByPanes(const Lanes& opacity, const LaneColors& albedo) {
+    const Lanes brightest = greatest(greatest(albedo.r, albedo.g), albedo.b);
+    const Lanes scale = Lanes(1.0F) / greatest(brightest, 1e-12F);
+    const LaneMask has_hue = brightest > 1e-12F;
+    const Lanes clear = Lanes(1.0F) - opacity;
+    const auto channel = [&](const Lanes& color) {
+        const Lanes hue = select(has_hue, color * scale, 1.0F);
+        return clear * (Lanes(1.0F) - opacity * (Lanes(1.0F) - hue));
+    };
+    return {channel(albedo.r), channel(albedo.g), channel(albedo.b)};
+}
+
+/// What rays see where they go on behind see-through surfaces, by whose colour it is tinted.
+[[gnu::noinline]] LaneColors seenThroughPanes(const RenderSetup& setup, RayPacket& bounce,
+                                              SurfaceLanes& met) {
+    const FrameSetup& frame = setup.bounce;
+    const LaneMask active = bounce.active;
+    LaneColors left{1.0F, 1.0F, 1.0F};
+    LaneColors sum{0.0F, 0.0F, 0.0F};
+    for (int pane = 0;; ++pane) {
+        const Lanes opacity = pane < most_panes ? paneOpacities(frame, bounce, met) : 1.0F;
+        const LaneColors passed = passedByPanes(opacity, met.albedo);
+        const LaneMask hit = bounce.hit;
+        const LaneColors seen = seenAround(setup, bounce, met);
+        const Lanes part = select(bounce.active, opacity, 0.0F);
+        sum = {sum.r + left.r * part * seen.r, sum.g + left.g * part * seen.g,
+               sum.b + left.b * part * seen.b};
+        left = {left.r * passed.r, left.g * passed.g, left.b * passed.b};
+        const Lanes most = greatest(greatest(left.r, left.g), left.b);
+        bounce.active = bounce.active & hit & (opacity < 1.0F) & (most > least_light);
+        if (!any(bounce.active))
+            break;
+        const Lanes beyond = bounce.distance * 1.00002F + 1e-5F * frame.scene_size;
+        store(bounce.rays.ray.tnear, select(bounce.active, beyond, 0.0F));
+        intersect(frame, bounce, RTC_INTERSECT_CONTEXT_FLAG_INCOHERENT);
+        readSurfaces(frame, bounce, met);
+    }
+    store(bounce.rays.ray.tnear, 0.0F);
+    bounce.active = active;
+    return sum;
+}
+
+/// The light that comes to the lit lanes from one direction each: of the sky, or of what stands
+/// before it.
 /// @param bounce  prepared; holds the rays afterwards
 inline LaneColors skyLight(const RenderSetup& setup, const RayPacket& packet,
                            const SurfaceLanes& surfaces, const StartLanes& start,
@@ -117,21 +214,11 @@ inline LaneColors skyLight(const RenderSetup& setup, const RayPacket& packet,
                      load(bounce.rays.ray.org_z)};
     intersect(frame, bounce, RTC_INTERSECT_CONTEXT_FLAG_INCOHERENT);
     bounce.active = lit;
-    const LaneMask missed = lit & ~bounce.hit;
-    LaneColors color = any(missed) ? domeColors(setup, bounce) : LaneColors{0.0F, 0.0F, 0.0F};
     SurfaceLanes met;
     readSurfaces(frame, bounce, met);
-    Lanes weight = select(bounce.hit, 1.0F, 0.0F);
-    if (frame.has_ground && any(missed))
-        weight = greatest(weight, meetGround(frame, bounce, met).weight);
-    const LaneMask shaded = lit & (weight > 0.0F);
-    if (!any(shaded))
-        return color;
-    const LaneColors surface = shadeSurfaces(frame, bounce, met, shaded);
-    const LaneColors mixed{color.r + weight * (surface.r - color.r),
-                           color.g + weight * (surface.g - color.g),
-                           color.b + weight * (surface.b - color.b)};
-    return select(shaded, mixed, color);
+    if (frame.has_see_through)
+        return seenThroughPanes(setup, bounce, met);
+    return seenAround(setup, bounce, met);
 }
 
 } // namespace

@@ -24,6 +24,15 @@ inline Image rendered(const SceneContent& content, const KM_Viewport& viewport,
     return image;
 }
 
+/// Adds a mesh of see-through material, as opaque as its colour says; gives back its index.
+inline std::size_t addPane(SceneContent& content, KM_Mesh mesh, KM_Color color) {
+    const std::size_t index = addMesh(content, std::move(mesh), color);
+    auto material = std::make_shared<Material>(*content.meshes[index].material);
+    material->see_through = true;
+    content.meshes[index].material = material;
+    return index;
+}
+
 /// The sums of a scene under a sky of brightness 1 from all sides, with no other light, no ground
 /// and surfaces that other light comes from black.
 inline RenderLayers underUniformSky(const SceneContent& content, const KM_Viewport& viewport,
