@@ -86,7 +86,7 @@ QToolBar* RenderPictureWindow::makeTools() {
                      localized(L"Writes the picture into a file", 45356));
     m_save->setShortcut(QKeySequence::Save);
     m_stop = addTool(*tools, "stop", localized(L"Stop", 45357),
-                     localized(L"Ends rendering; what is done stays", 45358));
+                     localized(L"Ends rendering and brings the earlier picture back", 45361));
     connect(sizes, &QActionGroup::triggered, this, &RenderPictureWindow::fit);
     connect(m_save, &QAction::triggered, this, &RenderPictureWindow::saveRequested);
     connect(m_stop, &QAction::triggered, this, &RenderPictureWindow::stopRequested);

@@ -15,22 +15,30 @@ namespace quarn {
 
 namespace {
 
+ShownPicture asShown(const Image& picture) {
+    return {picture.width, picture.height, picture.rgba};
+}
+
 /// Renders the active view, or the one that the command which runs this one has placed, into the
 /// render window. One that is cancelled or fails leaves the picture that was there.
 CQuarnCommand::result renderView(Document& document, int samples) {
     RenderWindow& window = document.renderWindow();
     const RenderRequest request{window.settings.width_px, window.settings.height_px, samples};
     const KM_Viewport viewport = document.list().viewToRender(document).viewport();
+    FrontEnd& front_end = document.frontEnd();
+    Renderer::Shown so_far;
+    if (front_end.mainWindow()) // else there is no render window either
+        so_far = [&](const Image& picture) { front_end.renderWindowShown(asShown(picture)); };
     Image picture;
-    const auto end = renderWatched(document, viewport, request, picture, SceneChanges());
+    const auto end = renderWatched(document, viewport, request, picture, SceneChanges(), so_far);
+    const bool is_done = end && end.value() == RenderEnd::done;
+    if (is_done)
+        window.picture = std::move(picture);
+    if (is_done || so_far)
+        front_end.renderWindowShown(asShown(window.picture));
     if (!end)
         return fail(end.message());
-    if (end.value() == RenderEnd::cancelled)
-        return CQuarnCommand::cancel;
-    window.picture = std::move(picture);
-    document.frontEnd().renderWindowShown(
-        {window.picture.width, window.picture.height, window.picture.rgba});
-    return CQuarnCommand::success;
+    return is_done ? CQuarnCommand::success : CQuarnCommand::cancel;
 }
 
 } // namespace

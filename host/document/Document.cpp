@@ -288,12 +288,13 @@ Result<void> Document::draw(const KM_Viewport& viewport, const DisplayModeAttrib
 
 Result<RenderEnd> Document::render(const KM_Viewport& viewport, const RenderRequest& request,
                                    const std::function<bool(double share)>& watch, Image& picture,
-                                   const SceneChanges& changes) {
+                                   const SceneChanges& changes,
+                                   const std::function<void(const Image& so_far)>& shown) {
     try {
         const auto updated = updateScene(changes);
         if (!updated)
             return updated.error();
-        return Renderer().render(m_scene->display(), viewport, request, watch, picture);
+        return Renderer().render(m_scene->display(), viewport, request, watch, picture, shown);
     } catch (const std::bad_alloc&) {
         return memoryLacks("rendered", request.width_px, request.height_px);
     }

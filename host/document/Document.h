@@ -160,11 +160,11 @@ public:
     /// Draws the same otherwise than it is; neither the document nor what its views show changes.
     Result<void> draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode, int width_px,
                       int height_px, Image& picture, const SceneChanges& changes);
-    /// Renders the surfaces that are visible, otherwise than they are where `changes` says so; as
-    /// Renderer::render.
+    /// Renders what is visible, otherwise than it is where `changes` says so; as Renderer::render.
     Result<RenderEnd> render(const KM_Viewport& viewport, const RenderRequest& request,
                              const std::function<bool(double share)>& watch, Image& picture,
-                             const SceneChanges& changes);
+                             const SceneChanges& changes,
+                             const std::function<void(const Image& so_far)>& shown = {});
     /// The scene as it is drawn now, brought up to date. Valid until the next call that draws.
     /// @return an error when it cannot be built
     Result<const DocumentScene*> upToDateScene();

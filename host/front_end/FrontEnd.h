@@ -89,7 +89,9 @@ public:
     virtual FileChoice chooseFile(const FileQuestion& question);
     /// Told whenever a view shows a picture, drawn anew or not.
     virtual void viewShown(CQuarnView& view, const ShownPicture& picture);
-    /// Told when the render window shows another picture; one of no size when it was closed.
+    /// Told when the render window shows another picture; one of no size when it was closed. Where
+    /// there is a main window, also now and then while a picture is rendered, how far it is; at the
+    /// end then with the picture that the window keeps, the earlier one after a cancelled render.
     virtual void renderWindowShown(const ShownPicture& picture);
 };
 

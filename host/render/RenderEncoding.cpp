@@ -48,7 +48,27 @@ std::uint8_t shown(float light, const std::uint32_t* table) {
     return static_cast<std::uint8_t>(table[std::clamp(place, 0, DisplayTable::count - 1)]);
 }
 
+/// Of pixels that nothing is known of, in sRGB.
+constexpr std::uint8_t not_begun = 60;
+
 } // namespace
+
+void encodeRow(const RenderLayers& layers, int samples, const RowPart& part, Image& image) {
+    const std::uint32_t* const table = displayTable().entries();
+    const float scale = samples > 0 ? 1.0F / static_cast<float>(samples) : 0.0F;
+    std::uint8_t* pixel = image.rgba.data() + 4 * (static_cast<std::size_t>(part.y) *
+                                                       static_cast<std::size_t>(image.width) +
+                                                   static_cast<std::size_t>(part.begin_x));
+    for (int x = part.begin_x; x < part.end_x; ++x, pixel += 4) {
+        for (int c = 0; c < 3; ++c) {
+            const float light = layers.at(RenderPlane::direct_r + c, x, part.y) +
+                                layers.at(RenderPlane::sky_r + c, x, part.y) +
+                                layers.at(RenderPlane::sun_r + c, x, part.y);
+            pixel[c] = samples > 0 ? shown(scale * light, table) : not_begun;
+        }
+        pixel[3] = 255;
+    }
+}
 
 void encodeRender(const RenderLayers& layers, int samples, LightFilter& filter, Image& image) {
     const float scale = 1.0F / static_cast<float>(samples);

@@ -19,12 +19,26 @@ SceneContent village() {
     return content;
 }
 
+/// The village with a glass house, and a path through it.
+SceneContent glassVillage() {
+    SceneContent content = village();
+    addPane(content, boxMesh({-2.0, -16.0, 0.0}, {6.0, -9.0, 4.0}), {90, 170, 120, 110});
+    addPane(content, sphereMesh({12.0, 4.0, 2.0}, 2.0F, 12), {220, 60, 40, 90});
+    SceneCurve path;
+    path.id = KM_CreateUuid();
+    for (const KM_3dPoint& corner : {KM_3dPoint(-20, -18, 0), {2, -12, 1}, {18, 6, 0}})
+        path.polyline.Append(corner);
+    content.curves.push_back(path);
+    content.points.push_back({KM_CreateUuid(), {2.0, -12.0, 2.0}, {200, 0, 0, 255}, true});
+    return content;
+}
+
 KM_Viewport fromTheStreet() {
     return perspectiveView({25.0, -30.0, 14.0}, {0.0, 0.0, 2.0});
 }
 
 TEST(Renderer, SamePictureForAnyNumberOfThreads) {
-    const SceneContent content = village();
+    const SceneContent content = glassVillage();
     const auto with = [&](int threads) {
         const tbb::global_control limit(tbb::global_control::max_allowed_parallelism,
                                         static_cast<std::size_t>(std::max(threads, 2)));
@@ -39,7 +53,7 @@ TEST(Renderer, SamePictureForAnyNumberOfThreads) {
 }
 
 TEST(Renderer, SamePictureOnEveryKindOfProcessor) {
-    const SceneContent content = village();
+    const SceneContent content = glassVillage();
     const Image plain = rendered(content, fromTheStreet(), {100, 60, 8}, &baseline_render_kernel);
     const Image best = rendered(content, fromTheStreet(), {100, 60, 8});
     EXPECT_TRUE(plain.rgba == best.rgba);
