@@ -169,6 +169,7 @@ public:
     /// @return an error when it cannot be built
     Result<const DocumentScene*> upToDateScene();
     RenderWindow& renderWindow() { return m_render_window; }
+    const RenderWindow& renderWindow() const { return m_render_window; }
     /// Brings the scene up to date where it was built before.
     void regenerate();
 

@@ -61,6 +61,8 @@ DocumentContent Document::content(bool only_selected) const {
         content.cameras.push_back({camera.name, camera.viewport});
     for (const auto& [display_mode, choice] : m_edges)
         content.edges.push_back({display_mode, choice});
+    if (m_render_window.settings != RenderSettings())
+        content.rendering = m_render_window.settings;
     content.settings.light_slots = m_lights.count();
     for (const auto& [index, slot] : m_lights.live())
         content.lights.push_back({index, slot.Light()});
@@ -75,6 +77,7 @@ std::vector<std::string> Document::openContent(const DocumentContent& content) {
     addCameras(content);
     for (const EdgesContent& edges : content.edges)
         setEdgesOf(edges.display_mode, edges.choice);
+    m_render_window.settings = content.rendering.value_or(RenderSettings());
     for (const LightContent& light : content.lights) {
         m_lights.addDeletedUpTo(light.index);
         m_lights.add(light.light);

@@ -73,6 +73,7 @@ SavedState savedStateOf(const Document& document) {
     state.sun_enabled = document.sun().isEnabled();
     state.direction_to_sun = document.sun().directionToSun();
     state.edges = document.edges();
+    state.rendering = document.renderWindow().settings;
     for (const auto& view : document.views())
         state.views.push_back(stateOf(*view));
     state.named_views = document.namedViews().size();

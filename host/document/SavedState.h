@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/render/RenderSettings.h"
 #include "kelmar/KM_Light.h"
 #include "kelmar/KM_Uuid.h"
 
@@ -46,6 +47,7 @@ struct SavedState {
     bool sun_enabled = false;
     KM_3dVector direction_to_sun;
     std::map<KM_UUID, MeshEdgeChoice> edges;
+    RenderSettings rendering;
     std::vector<View> views;
     std::size_t named_views = 0;
     std::optional<Record> record; ///< none while no plug-in keeps one

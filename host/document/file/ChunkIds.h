@@ -20,6 +20,7 @@ inline constexpr std::uint32_t OBJECT = named("OBJT");
 inline constexpr std::uint32_t VIEW = named("VIEW");
 inline constexpr std::uint32_t CAMERA = named("CAMR");
 inline constexpr std::uint32_t EDGES = named("EDGE");
+inline constexpr std::uint32_t RENDERING = named("RNDR");
 inline constexpr std::uint32_t LIGHT = named("LITE");
 inline constexpr std::uint32_t PLUG_IN = named("PLUG");
 /// The last one: a file without it was cut off.

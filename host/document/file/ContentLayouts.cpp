@@ -53,6 +53,19 @@ bool makesSense(const ViewContent& view) {
     return !view.name.IsEmpty() && isPictureSide(view.width_px) && isPictureSide(view.height_px);
 }
 
+bool makesSense(const RenderSettings& settings) {
+    const auto isNumberOfSamples = [](int samples) {
+        return samples >= 1 && samples <= RenderSettings::most_samples;
+    };
+    return isPictureSide(settings.width_px) && isPictureSide(settings.height_px) &&
+           isNumberOfSamples(settings.samples) && isNumberOfSamples(settings.preview_samples);
+}
+
+template <class Step, class AnySettings> bool renderFields(Step step, AnySettings& settings) {
+    return step(settings.width_px) && step(settings.height_px) && step(settings.samples) &&
+           step(settings.preview_samples) && step.check(makesSense(settings));
+}
+
 template <class Step, class AnySettings> bool settingsFields(Step step, AnySettings& settings) {
     return step(settings.units, UnitSystem::none, LAST_UNIT_SYSTEM) &&
            step(settings.absolute_tolerance) && step(settings.sun_enabled) &&
@@ -251,6 +264,14 @@ bool writeEdges(KM_BinaryArchive& archive, const EdgesContent& edges) {
 bool readEdges(KM_BinaryArchive& archive, EdgesContent& edges) {
     return archive.ReadUuid(edges.display_mode) &&
            FieldReader(archive)(edges.choice, MeshEdgeChoice::none, MeshEdgeChoice::all);
+}
+
+bool writeRendering(KM_BinaryArchive& archive, const RenderSettings& settings) {
+    return renderFields(FieldWriter(archive), settings);
+}
+
+bool readRendering(KM_BinaryArchive& archive, RenderSettings& settings) {
+    return renderFields(FieldReader(archive), settings);
 }
 
 bool writeLight(KM_BinaryArchive& archive, const LightContent& light) {

@@ -47,6 +47,8 @@ bool writeCamera(KM_BinaryArchive& archive, const CameraContent& camera);
 bool readCamera(KM_BinaryArchive& archive, CameraContent& camera);
 bool writeEdges(KM_BinaryArchive& archive, const EdgesContent& edges);
 bool readEdges(KM_BinaryArchive& archive, EdgesContent& edges);
+bool writeRendering(KM_BinaryArchive& archive, const RenderSettings& settings);
+bool readRendering(KM_BinaryArchive& archive, RenderSettings& settings);
 
 bool writeLight(KM_BinaryArchive& archive, const LightContent& light);
 bool readLight(KM_BinaryArchive& archive, LightContent& light);

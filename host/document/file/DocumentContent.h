@@ -3,6 +3,7 @@
 #include "host/display/DisplayMode.h"
 #include "host/document/Material.h"
 #include "host/document/UnitSystem.h"
+#include "host/render/RenderSettings.h"
 #include "kelmar/KM_BinaryArchive.h"
 #include "kelmar/KM_Curve.h"
 #include "kelmar/KM_Light.h"
@@ -95,6 +96,7 @@ struct DocumentContent {
     std::vector<ViewContent> views;
     std::vector<CameraContent> cameras;
     std::vector<EdgesContent> edges;  ///< each display mode once
+    std::optional<RenderSettings> rendering; ///< none: those that a new document has
     std::vector<LightContent> lights; ///< by ascending index, each below settings.light_slots
     std::vector<PlugInContent> plug_ins;
     std::vector<UnknownContent> unknown;

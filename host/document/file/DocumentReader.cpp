@@ -75,6 +75,9 @@ private:
             return readCamera(m_archive, m_content.cameras.emplace_back());
         case chunk::EDGES:
             return readEdges(m_archive, m_content.edges.emplace_back());
+        case chunk::RENDERING:
+            return !m_content.rendering ? readRendering(m_archive, m_content.rendering.emplace())
+                                        : m_archive.Fail();
         case chunk::LIGHT:
             return readLight(m_archive, m_content.lights.emplace_back());
         case chunk::PLUG_IN:

@@ -137,6 +137,7 @@ private:
         if (!writeEach(chunk::VIEW, "a view", m_content.views, writeView) ||
             !writeEach(chunk::CAMERA, "a camera", m_content.cameras, writeCamera) ||
             !writeEach(chunk::EDGES, "the edges of a display mode", m_content.edges, writeEdges) ||
+            !writeRenderSettings() ||
             !writeEach(chunk::LIGHT, "a light", m_content.lights, writeLight) ||
             !writeEach(chunk::PLUG_IN, "what a plug-in keeps", m_content.plug_ins, writePlugIn))
             return false;
@@ -145,6 +146,13 @@ private:
                             [&] { return unknown(m_archive, content); }))
                 return false;
         return true;
+    }
+
+    /// Those of a new document need no chunk.
+    bool writeRenderSettings() {
+        return !m_content.rendering ||
+               writeChunk(chunk::RENDERING, "the settings of the renderer",
+                          [&] { return writeRendering(m_archive, *m_content.rendering); });
     }
 
     const DocumentContent& m_content;

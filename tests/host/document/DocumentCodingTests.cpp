@@ -210,6 +210,45 @@ TEST(DocumentCoding, ViewsAndCamerasComeBackToTheLastBit) {
     EXPECT_EQ(MeshEdgeChoice::all, content.edges[0].choice);
 }
 
+TEST(DocumentCoding, RenderSettingsComeBackOrAreThoseOfANewDocument) {
+    DocumentContent content = sampleContent();
+    EXPECT_EQ((RenderSettings{640, 360, 128, 4}), roundTrip(content).rendering);
+    content.rendering.reset();
+    EXPECT_FALSE(roundTrip(content).rendering);
+}
+
+Bytes littleEndian(std::initializer_list<std::int32_t> numbers) {
+    Bytes bytes;
+    for (const std::int32_t number : numbers)
+        for (int shift = 0; shift < 32; shift += 8)
+            bytes.push_back(static_cast<std::uint8_t>(static_cast<std::uint32_t>(number) >> shift));
+    return bytes;
+}
+
+TEST(DocumentCoding, RenderSettingsOutOfRangeAreRefused) {
+    constexpr std::uint32_t rndr = 0x52444E52; // spells RNDR
+    DocumentContent content = sampleContent();
+    content.rendering.reset();
+    const auto with = [&](const Bytes& payload) {
+        content.unknown = {{rndr, payload}};
+        return encoded(content);
+    };
+    EXPECT_TRUE(decodeDocument(with(littleEndian({1, 16384, 16384, 1}))).ok());
+    for (const int wrong : {0, -1, 16385, std::numeric_limits<int>::max()}) {
+        expectRefused(with(littleEndian({wrong, 10, 10, 10})));
+        expectRefused(with(littleEndian({10, wrong, 10, 10})));
+        expectRefused(with(littleEndian({10, 10, wrong, 10})));
+        expectRefused(with(littleEndian({10, 10, 10, wrong})));
+    }
+    expectRefused(with(littleEndian({10, 10, 10})));
+    expectRefused(with(littleEndian({10, 10, 10, 10, 10})));
+    content.rendering = RenderSettings();
+    expectRefused(with(littleEndian({10, 10, 10, 10}))); // twice
+    content.unknown.clear();
+    content.rendering = RenderSettings{0, 10, 10, 10};
+    EXPECT_FALSE(encodeDocument(content));
+}
+
 TEST(DocumentCoding, LightsComeBackWithTheirIndices) {
     const DocumentContent sample = sampleContent();
     const DocumentContent content = roundTrip(sample);

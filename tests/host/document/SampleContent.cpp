@@ -112,6 +112,7 @@ void addViews(DocumentContent& content) {
     content.views.push_back(plan);
     content.cameras.push_back({L"Kamera 1", view.viewport});
     content.edges.push_back({wireframe_mode_id, MeshEdgeChoice::all});
+    content.rendering = RenderSettings{640, 360, 128, 4};
 }
 
 void addLights(std::vector<LightContent>& lights) {

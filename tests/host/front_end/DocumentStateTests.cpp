@@ -55,6 +55,20 @@ TEST_F(DocumentStateTest, SavingRemembersTheFileAndTheDocumentIsUnmodifiedAgain)
     EXPECT_FALSE(modified());
 }
 
+TEST_F(DocumentStateTest, RenderSettingsBelongToTheDocument) {
+    runAll({L"RenderSettings Size 320 200 Samples 9 _Enter"});
+    EXPECT_TRUE(modified());
+    runAll({L"SaveAs " + path("a.quarn"), L"New"});
+    EXPECT_EQ(document().renderWindow().settings, RenderSettings());
+    runAll({L"Open " + path("a.quarn")});
+    EXPECT_EQ(document().renderWindow().settings, (RenderSettings{320, 200, 9, 8}));
+    EXPECT_FALSE(modified());
+    runAll({L"RenderSettings Samples 10 _Enter"});
+    EXPECT_TRUE(modified());
+    runAll({L"RenderSettings Samples 9 _Enter"});
+    EXPECT_FALSE(modified());
+}
+
 TEST_F(DocumentStateTest, WhatDoesNotBecomeTheDocumentsFileLeavesItModified) {
     runAll({L"Point 1,2,3", L"Select _All", L"SaveSelected " + path("part.quarn")});
     EXPECT_TRUE(modified());
