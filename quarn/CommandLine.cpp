@@ -57,6 +57,9 @@ void addRecordingOptions(CLI::App& command, RecordingOptions& options,
     add("--size", options.size, "WxH", "Size of a picture in pixels")->capture_default_str();
     add("--mode", options.mode, "NAME", "Display mode: " + captureModeNames(subject))
         ->capture_default_str();
+    add("--samples", options.samples, "N",
+        "With RenderFull or RenderPreview: how often each pixel is looked at, 1 to 16384 (default: "
+        "64 and 8, or the document's own)");
     add("--format", options.format, "NAME", "jpg, png, bmp or tga")->capture_default_str();
     command.add_option("--hide", options.hidden, "Leave out this object; may be given again")
         ->type_name("NAME")

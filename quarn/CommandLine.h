@@ -23,6 +23,7 @@ struct RecordingOptions {
     std::string folder;
     std::string size = "1280x720";
     std::string mode = "Rendered";
+    std::string samples; ///< of a rendered picture's pixels; empty: as the document has it
     std::string format = "jpg";
     std::vector<std::string> hidden; ///< names of objects
     std::string name;

@@ -21,6 +21,7 @@ public:
         checkName();
         checkSize();
         checkMode();
+        checkSamples();
         checkFormat();
         checkHidden();
         checkDocument();
@@ -65,6 +66,21 @@ private:
             m_mistake.note("sun studies are not recorded in the display mode \"" + m_typed.mode +
                            "\"; --mode takes " + captureModeNames(m_subject) + ".");
         m_request.capture_option = option.value_or("");
+    }
+
+    void checkSamples() {
+        constexpr int MOST_SAMPLES = 16384;
+        if (m_typed.samples.empty())
+            return;
+        m_request.samples = wholeNumber(m_typed.samples).value_or(0);
+        if (m_request.samples < 1 || m_request.samples > MOST_SAMPLES)
+            m_mistake.note("--samples must be a whole number from 1 to " +
+                           std::to_string(MOST_SAMPLES) + notBut(m_typed.samples));
+        if (!isRendered(m_request.capture_option))
+            m_mistake.note(
+                "--samples is for rendered pictures: with it --mode must be RenderFull or "
+                "RenderPreview" +
+                notBut(m_typed.mode));
     }
 
     void checkFormat() {

@@ -4,6 +4,18 @@
 
 namespace quarn::program {
 
+namespace {
+
+/// Each render method has its own number of samples.
+std::string samplesAnswer(const RecordingRequest& request) {
+    if (request.samples == 0)
+        return "";
+    const bool is_preview = request.capture_option == "_RenderPreview";
+    return (is_preview ? " _PreviewSamples " : " _Samples ") + std::to_string(request.samples);
+}
+
+} // namespace
+
 RecordingScript composeRecording(const RecordingRequest& request, const AnimationLines& lines) {
     RecordingScript script;
     script.notes = lines.notes;
@@ -18,7 +30,7 @@ RecordingScript composeRecording(const RecordingRequest& request, const Animatio
     set_up.push_back("_-AnimationName \"" + request.name + "\"");
     set_up.push_back(lines.setting_up);
     if (isRendered(request.capture_option))
-        set_up.push_back("_-RenderSettings _Size " + size + " _Enter");
+        set_up.push_back("_-RenderSettings _Size " + size + samplesAnswer(request) + " _Enter");
     if (!request.document.empty())
         script.saving = "_-SaveAs " + quotedPath(request.document);
     script.recording = "_-RecordAnimation _TargetFolder " + quotedPath(request.folder) + " _Enter";

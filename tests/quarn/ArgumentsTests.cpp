@@ -128,6 +128,15 @@ TEST(Arguments, UnknownModeListsTheModes) {
                                                       "RenderPreview"});
 }
 
+TEST(Arguments, SamplesAreForRenderedPicturesAndFrom1To16384) {
+    for (const char* samples : {"0", "-1", "16385", "many", "1.5"})
+        expectRefusal(wholeTurntable({"--mode", "RenderFull", "--samples", samples}),
+                      {"--samples must be a whole number from 1 to 16384", samples});
+    expectRefusal(wholeTurntable({"--mode", "Shaded", "--samples", "64"}),
+                  {"--samples is for rendered pictures", "RenderFull or RenderPreview", "Shaded"});
+    expectRefusal(wholeTurntable({"--samples", "64"}), {"--samples is for rendered pictures"});
+}
+
 TEST(Arguments, UnknownFormatListsTheFormats) {
     expectRefusal(wholeTurntable({"--format", "gif"}), {"jpg, png, bmp or tga", "gif"});
 }

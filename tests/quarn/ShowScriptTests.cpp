@@ -139,6 +139,17 @@ TEST(ShowScript, RenderedPicturesGetTheSizeToo) {
     EXPECT_THAT(scriptWith({"--mode", "Rendered"})[6], testing::StartsWith("#"));
 }
 
+TEST(ShowScript, SamplesAreThoseOfTheRenderMethod) {
+    const auto settings = [](const char* mode, const char* samples) {
+        return scriptWith({"--mode", mode, "--samples", samples})[6];
+    };
+    EXPECT_EQ(settings("RenderFull", "200"), "_-RenderSettings _Size 1280 720 _Samples 200 _Enter");
+    EXPECT_EQ(settings("RenderPreview", "1"),
+              "_-RenderSettings _Size 1280 720 _PreviewSamples 1 _Enter");
+    EXPECT_EQ(settings("RenderFull", "16384"),
+              "_-RenderSettings _Size 1280 720 _Samples 16384 _Enter");
+}
+
 TEST(ShowScript, NameComesFromTheModelWithoutForbiddenCharacters) {
     const auto name_of = [](const std::string& model) {
         return scriptOf({model, "--frames", "8", "--out", "out"})[4];
