@@ -12,6 +12,8 @@ namespace quarn::program {
 namespace {
 
 constexpr std::chrono::milliseconds PROGRESS_STEP{50};
+/// What the host begins a line with that shows a command of a script.
+constexpr std::string_view SHOWN_COMMAND = "Command: ";
 
 std::string trimmed(const std::string& line) {
     constexpr const char* BLANKS = " \t\r\n";
@@ -56,7 +58,9 @@ void ConsoleFrontEnd::rememberWords(std::string_view text) {
             m_open_line += c;
             continue;
         }
-        if (std::string line = trimmed(m_open_line); !line.empty())
+        // A command that is shown while a recording runs it says nothing about how it went.
+        std::string line = trimmed(m_open_line);
+        if (!line.empty() && !line.starts_with(SHOWN_COMMAND))
             m_line_before = std::exchange(m_last_line, std::move(line));
         m_open_line.clear();
     }

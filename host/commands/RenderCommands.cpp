@@ -20,8 +20,11 @@ ShownPicture asShown(const Image& picture) {
 }
 
 /// Renders the active view, or the one that the command which runs this one has placed, into the
-/// render window. One that is cancelled or fails leaves the picture that was there.
+/// render window. One that is cancelled or fails leaves the picture that was there. Where that
+/// command could not save the picture before, it would not save this one either.
 CQuarnCommand::result renderView(Document& document, int samples) {
+    if (const std::string& trouble = document.list().unsavedPicture(); !trouble.empty())
+        return fail(trouble + " No more pictures are rendered.");
     RenderWindow& window = document.renderWindow();
     const RenderRequest request{window.settings.width_px, window.settings.height_px, samples};
     const KM_Viewport viewport = document.list().viewToRender(document).viewport();
@@ -54,7 +57,8 @@ CQuarnCommand::result runRenderPreview(const CQuarnCommandContext& context) {
 }
 
 CQuarnCommand::result runSaveRenderWindowAs(const CQuarnCommandContext& context) {
-    const RenderWindow& window = Document::of(context.Document()).renderWindow();
+    Document& document = Document::of(context.Document());
+    const RenderWindow& window = document.renderWindow();
     if (!window.isOpen())
         return fail("There is no rendered picture. Make one with Render or RenderPreview first.");
     std::filesystem::path file;
@@ -63,6 +67,7 @@ CQuarnCommand::result runSaveRenderWindowAs(const CQuarnCommandContext& context)
     if (asked != CQuarnCommand::success)
         return asked;
     const auto written = writeImageFile(file, window.picture);
+    document.list().noteUnsavedPicture(written ? std::string() : written.message());
     if (!written)
         return fail(written.message());
     Application::current()->pictureWritten(file);

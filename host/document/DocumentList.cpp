@@ -67,6 +67,7 @@ ViewState& DocumentList::viewToRender(const Document& document) const {
 void DocumentList::commandEnded() {
     m_is_command_running = false;
     m_placed_view = nullptr;
+    m_unsaved_picture.clear();
     closeAllBut(m_active);
     if (m_active)
         m_active->settleViews();

@@ -4,6 +4,8 @@
 
 #include <cstdint>
 #include <memory>
+#include <string>
+#include <utility>
 #include <vector>
 
 namespace quarn {
@@ -38,6 +40,10 @@ public:
     /// The view that pictures of a document are rendered of: the one that the running command has
     /// placed last, as one that records places the view of the animation; else the active one.
     ViewState& viewToRender(const Document& document) const;
+    /// Why the running command could not save the picture that it rendered last; empty when it
+    /// could, and when no command runs.
+    const std::string& unsavedPicture() const { return m_unsaved_picture; }
+    void noteUnsavedPicture(std::string why) { m_unsaved_picture = std::move(why); }
     /// Called when the outermost command has ended: closes every document but the active one, and
     /// does to its views what was put off until then.
     void commandEnded();
@@ -79,6 +85,7 @@ private:
     Document* m_active = nullptr;
     bool m_is_command_running = false;
     ViewState* m_placed_view = nullptr; ///< by the command that runs; null: none
+    std::string m_unsaved_picture;
     std::unique_ptr<ImageEncoder> m_image_encoder;
     std::vector<std::uint8_t> m_picture_storage;
     std::unique_ptr<KM_3dmAnimationProperties> m_fresh_record;
