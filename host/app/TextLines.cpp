@@ -9,6 +9,8 @@ namespace quarn {
 
 Result<std::vector<std::wstring>> readTextLines(const std::filesystem::path& file) {
     std::error_code error;
+    if (std::filesystem::is_directory(file, error))
+        return Error{file.string() + " is a folder; give the file that is to be read."};
     if (!std::filesystem::is_regular_file(file, error))
         return Error{"There is no file " + file.string() + "."};
     std::ifstream stream(file, std::ios::binary);

@@ -46,6 +46,12 @@ TEST_F(ScriptRun, TellsThatTheScriptIsMissing) {
     EXPECT_THAT(ended.err, HasSubstr("/nowhere/steps.txt"));
 }
 
+TEST_F(ScriptRun, TellsThatTheScriptIsAFolder) {
+    const Ended ended = run({"run", "/"});
+    EXPECT_EQ(ended.exit_code, 1);
+    EXPECT_THAT(ended.err, HasSubstr("/ is a folder"));
+}
+
 TEST_F(ScriptRun, OfAnEmptyScriptDoesNothing) {
     for (const char* script : {"", "\n\n", "# nothing\r\n   \r\n"}) {
         const Ended ended = runScript(script);
