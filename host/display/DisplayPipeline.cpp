@@ -15,24 +15,42 @@ namespace quarn {
 namespace {
 
 /// Pixels of a task's block; neighbouring rays share what they read of the scene.
-constexpr int block_width = 64;
+constexpr int block_width = EdgeMarks::block_width;
 constexpr int block_height = 32;
 
 bool isValidSize(int size) {
     return size >= 1 && size <= DisplayPipeline::max_size_px;
 }
 
-void traceAll(const FrameSetup& frame, const RayKernel& kernel) {
-    const int columns = (frame.width + block_width - 1) / block_width;
-    const int rows = (frame.height + block_height - 1) / block_height;
-    tbb::parallel_for(0, columns * rows, [&](int index) {
-        const FlushDenormals flush;
-        const int x = index % columns * block_width;
-        const int y = index / columns * block_height;
-        kernel.trace_block(frame, {x, y, std::min(frame.width, x + block_width),
-                                   std::min(frame.height, y + block_height)});
-    });
-}
+/// The blocks of a picture, in rows.
+class BlockGrid {
+public:
+    explicit BlockGrid(const FrameSetup& frame)
+        : m_width(frame.width), m_height(frame.height),
+          m_columns((frame.width + block_width - 1) / block_width),
+          m_rows((frame.height + block_height - 1) / block_height) {}
+
+    std::size_t count() const {
+        return static_cast<std::size_t>(m_columns) * static_cast<std::size_t>(m_rows);
+    }
+    /// Calls work(block, index) for all blocks, on all threads.
+    template <class Work> void forEach(const Work& work) const {
+        tbb::parallel_for(0, m_columns * m_rows, [&](int index) {
+            const FlushDenormals flush;
+            const int x = index % m_columns * block_width;
+            const int y = index / m_columns * block_height;
+            work(PixelBlock{x, y, std::min(m_width, x + block_width),
+                            std::min(m_height, y + block_height)},
+                 static_cast<std::size_t>(index));
+        });
+    }
+
+private:
+    int m_width;
+    int m_height;
+    int m_columns;
+    int m_rows;
+};
 
 } // namespace
 
@@ -84,14 +102,30 @@ void DisplayPipeline::drawSurfaces(FrameSetup& frame, const DisplayModeAttribute
                          static_cast<std::size_t>(frame.height));
         frame.objects = m_objects.data();
     }
+    frame.needs_unit_faces = frame.sun_count > 0 || frame.sky_reach > 0.0F;
     if (frame.scene && frame.sky_reach > 0.0F)
         m_free_sky.find(frame, *m_kernel);
-    traceAll(frame, *m_kernel);
-    frame.layer_nearness = nullptr; // the rays that smooth edges look beside the pixels' middles
+    const BlockGrid blocks(frame);
     m_smoothed = 0;
-    if (!smooths)
+    if (!smooths) {
+        blocks.forEach(
+            [&](const PixelBlock& block, std::size_t) { m_kernel->trace_block(frame, block); });
         return;
-    m_edges.refine(frame, *m_kernel, level == 1 ? 4 : 8);
+    }
+    // The rays that smooth edges look beside the pixels' middles: the lines' layers stay out of it.
+    FrameSetup again = frame;
+    again.layer_nearness = nullptr;
+    again.nearness = nullptr;
+    m_edges.begin(frame, level == 1 ? 4 : 8, blocks.count());
+    blocks.forEach([&](const PixelBlock& block, std::size_t index) {
+        m_kernel->trace_block(frame, block);
+        m_edges.refineInside(again, *m_kernel, block, index);
+    });
+    blocks.forEach(
+        [&](const PixelBlock& block, std::size_t) { m_edges.findAcross(again, *m_kernel, block); });
+    blocks.forEach([&](const PixelBlock& block, std::size_t index) {
+        m_edges.refineBorder(again, *m_kernel, block, index);
+    });
     m_smoothed = m_edges.count();
 }
 

@@ -12,6 +12,9 @@ public:
     static constexpr int shift = 15;
     static constexpr int first = (127 - 13) << (23 - shift);
     static constexpr int count = 16 << (23 - shift);
+    /// Light that the first and the last entry stand for.
+    static constexpr float darkest = 0x1p-13F;
+    static constexpr float brightest = 0x1.FFFFFEp2F;
 
     DisplayTable();
     /// `count` entries; entry 0 stands for everything below the first step too.

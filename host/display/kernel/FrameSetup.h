@@ -5,6 +5,7 @@
 
 #include <embree3/rtcore.h>
 
+#include <cstddef>
 #include <cstdint>
 
 namespace quarn {
@@ -83,6 +84,9 @@ struct FrameSetup {
     float scene_max[3] = {0, 0, 0};
     float scene_size = 0.0F; ///< diagonal of that box
 
+    /// Whether the triangles' own normals must have unit length: shadows and the free sky go by
+    /// them, while shading alone asks for their side.
+    bool needs_unit_faces = true;
     bool base_colors = true; ///< else every surface has plain_albedo
     bool textures = false;   ///< textures and vertex colours
     float plain_albedo[3] = {1, 1, 1};
@@ -131,6 +135,10 @@ struct FrameSetup {
     std::uint32_t* objects = nullptr; ///< surface index + 1, or 0; null when nobody asks
 };
 
+/// How visible a change of colour from pixel to pixel must be for an edge, in steps of a channel's
+/// 255.
+inline constexpr int visible_step = 14;
+
 /// A part of the picture, in pixels; the upper left corner lies on a tile's corner.
 struct PixelBlock {
     int x_begin = 0;
@@ -153,6 +161,10 @@ struct RayKernel {
     const char* name;
     void (*trace_block)(const FrameSetup& frame, const PixelBlock& block);
     void (*trace_samples)(const FrameSetup& frame, SamplePacket& samples);
+    /// A bit for each of up to 64 pixels from offset `row` on, the lowest for the first: whether it
+    /// differs visibly, in colour or object, from its match in those from `other` on.
+    std::uint64_t (*find_steps)(const FrameSetup& frame, std::size_t row, std::size_t other,
+                                int count);
     /// Fills `sky_places` and `free_sky` of a block, which is given in places of the grid. What a
     /// place finds is rough; the places of a tile together are right.
     void (*find_free_sky)(const FrameSetup& frame, const PixelBlock& block);

@@ -105,6 +105,34 @@ inline Lanes squareRoot(const Lanes& a) {
 inline Lanes absolute(const Lanes& a) {
     return greatest(a, -a);
 }
+/// The absolute value without its sign's bit.
+inline Lanes magnitude(const Lanes& a) {
+    return eachPart<Lanes>([&](int p) {
+        return reinterpret_cast<NativeFloats>(reinterpret_cast<NativeInts>(a.part[p]) & 0x7FFFFFFF);
+    });
+}
+/// @param a  not negative
+inline Lanes withSignOf(const Lanes& a, const Lanes& sign) {
+    return eachPart<Lanes>([&](int p) {
+        constexpr auto sign_bit = static_cast<std::int32_t>(0x80000000U);
+        return reinterpret_cast<NativeFloats>(
+            reinterpret_cast<NativeInts>(a.part[p]) |
+            (reinterpret_cast<NativeInts>(sign.part[p]) & sign_bit));
+    });
+}
+/// 1 / sqrt(a) to five parts in a million for positive numbers; some large number for 0. Quicker
+/// than a root and a division. The first guess halves the exponent and is bettered by two of
+/// Newton's steps (C. Lomont, "Fast Inverse Square Root", 2003).
+inline Lanes inverseRoot(const Lanes& a) {
+    return eachPart<Lanes>([&](int p) {
+        const NativeFloats x = a.part[p];
+        NativeFloats y =
+            reinterpret_cast<NativeFloats>(0x5F375A86 - (reinterpret_cast<NativeInts>(x) >> 1));
+        const NativeFloats half = x * 0.5F;
+        y = y * (1.5F - half * y * y);
+        return y * (1.5F - half * y * y);
+    });
+}
 inline Lanes clamped(const Lanes& a) {
     return least(greatest(a, 0.0F), 1.0F);
 }

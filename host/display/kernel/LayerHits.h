@@ -15,8 +15,6 @@ public:
         m_call.context.flags = RTC_INTERSECT_CONTEXT_FLAG_COHERENT;
         m_call.context.filter = keepHits;
         m_call.hits = this;
-        for (auto& distances : m_distance)
-            store(distances, Lanes(nowhere));
         store(m_known, Lanes(unlimited));
         store(m_count, LaneInts(0));
         find(frame, packet, packet.active, 0.0F);
@@ -48,8 +46,8 @@ private:
     };
 
     void forget(const LaneMask& lanes) {
-        for (auto& distances : m_distance)
-            store(distances, select(lanes, Lanes(nowhere), load(distances)));
+        for (unsigned k = 0; k < m_slots; ++k)
+            store(m_distance[k], select(lanes, Lanes(nowhere), load(m_distance[k])));
         store(m_known, select(lanes, Lanes(unlimited), load(m_known)));
         store(m_count, select(lanes, LaneInts(0), load(m_count)));
     }
@@ -67,9 +65,23 @@ private:
 
     static void keepHits(const RTCFilterFunctionNArguments* arguments) {
         LayerHits& hits = *reinterpret_cast<Call*>(arguments->context)->hits;
-        for (unsigned i = 0; i < arguments->N; ++i)
-            if (arguments->valid[i] != 0)
-                arguments->valid[i] = hits.keep(*arguments, i) ? 0 : -1;
+        for (unsigned wanted = wantedOf(*arguments); wanted != 0; wanted &= wanted - 1) {
+            const auto i = static_cast<unsigned>(__builtin_ctz(wanted));
+            arguments->valid[i] = hits.keep(*arguments, i) ? 0 : -1;
+        }
+    }
+
+    /// A bit for each ray of the call that met something; mostly few of them.
+    static unsigned wantedOf(const RTCFilterFunctionNArguments& arguments) {
+        if (arguments.N == lane_count) {
+            LaneMask valid;
+            __builtin_memcpy(&valid, arguments.valid, sizeof valid);
+            return bits(valid);
+        }
+        unsigned wanted = 0;
+        for (unsigned i = 0; i < arguments.N; ++i)
+            wanted |= arguments.valid[i] != 0 ? 1U << i : 0U;
+        return wanted;
     }
 
     /// @return false when nothing behind this hit will be kept: then it ends the ray
@@ -78,6 +90,8 @@ private:
         const float distance = RTCRayN_tfar(arguments.ray, arguments.N, index);
         unsigned slot = m_count[lane];
         if (slot < capacity) {
+            if (slot == m_slots)
+                store(m_distance[m_slots++], Lanes(nowhere));
             ++m_count[lane];
         } else {
             slot = farthest(lane);
@@ -106,7 +120,7 @@ private:
     void choose(RayPacket& packet, const Lanes& beyond) const {
         Lanes nearest = load(m_known);
         LaneInts slot(-1);
-        for (unsigned k = 0; k < capacity; ++k) {
+        for (unsigned k = 0; k < m_slots; ++k) {
             const Lanes distance = load(m_distance[k]);
             const LaneMask nearer = (distance > beyond) & ~(distance > nearest);
             nearest = select(nearer, distance, nearest);
@@ -133,6 +147,7 @@ private:
     }
 
     Call m_call;
+    unsigned m_slots = 0; ///< how many are in use, by the ray that uses most
     alignas(64) float m_known[lane_count]; ///< every surface that is nearer is kept
     alignas(64) std::uint32_t m_count[lane_count];
     alignas(64) float m_distance[capacity][lane_count];

@@ -1,20 +1,23 @@
 // The ray loops. Each RayKernel_*.cpp includes this once, with its own processor's flags.
 
 #include "host/display/DisplayTable.h"
+#include "host/display/kernel/EdgeSteps.h"
 #include "host/display/kernel/LayeredShading.h"
 #include "host/display/kernel/SeeThroughShading.h"
 #include "host/display/kernel/SkyLoops.h"
+
+#include <cstddef>
 
 namespace quarn {
 namespace {
 
 /// The display table's byte for each lane.
 inline LaneInts displayed(const FrameSetup& frame, const Lanes& light) {
-    const LaneInts place = shiftedRight(bitsOf(greatest(light, 0.0F)), DisplayTable::shift) -
-                           LaneInts(DisplayTable::first);
-    const LaneInts from_0 = select(place > LaneInts(0), place, LaneInts(0));
-    const LaneInts last(DisplayTable::count - 1);
-    return gathered(frame.display_table, select(from_0 > last, last, from_0));
+    constexpr float darkest = DisplayTable::darkest;
+    constexpr float brightest = DisplayTable::brightest;
+    const LaneInts step =
+        shiftedRight(bitsOf(least(greatest(light, darkest), brightest)), DisplayTable::shift);
+    return gathered(frame.display_table, step - LaneInts(DisplayTable::first));
 }
 
 inline LaneInts encoded(const FrameSetup& frame, const LaneColors& color) {
@@ -35,7 +38,8 @@ inline TracedPacket firstMet(const FrameSetup& frame, const RayPacket& packet,
     readSurfaces(frame, packet, surfaces);
     TracedPacket traced;
     traced.objects = select(packet.hit, surfaces.surface + LaneInts(1), LaneInts(0));
-    traced.nearness = nearnessOf(frame, packet);
+    if (frame.nearness || frame.has_see_through)
+        traced.nearness = nearnessOf(frame, packet);
     return traced;
 }
 
@@ -71,34 +75,23 @@ struct TilePlace {
     int rows;
 };
 
-/// @param values  the sixteen of a tile, row by row; T has four bytes
+/// @param values  the sixteen of a tile, row by row; numbers of four bytes
 template <class T>
-inline void storeTile(const T* values, T* image, int width, const TilePlace& place) {
-    for (int row = 0; row < place.rows; ++row) {
-        T* const to = image +
-                      static_cast<std::size_t>(place.y + row) * static_cast<std::size_t>(width) +
-                      static_cast<std::size_t>(place.x);
-        const T* const from = values + tile_size * row;
-        if (place.columns == tile_size) {
-            __builtin_memcpy(to, from, tile_size * sizeof(T));
-            continue;
-        }
+inline void storePartOfTile(const T* values, T* image, int width, const TilePlace& place) {
+    for (int row = 0; row < place.rows; ++row)
         for (int column = 0; column < place.columns; ++column)
-            to[column] = from[column];
-    }
+            image[row * std::ptrdiff_t{width} + column] = values[tile_size * row + column];
 }
 
-inline void storeTile(const LaneInts& values, std::uint32_t* image, int width,
-                      const TilePlace& place) {
-    alignas(64) std::uint32_t plain[lane_count];
-    store(plain, values);
-    storeTile(plain, image, width, place);
-}
-
-inline void storeTile(const Lanes& values, float* image, int width, const TilePlace& place) {
-    alignas(64) float plain[lane_count];
-    store(plain, values);
-    storeTile(plain, image, width, place);
+template <class LanesOfTile, class T>
+inline void storeTile(const LanesOfTile& values, T* image, int width, const TilePlace& place) {
+    const auto pitch = std::ptrdiff_t{width};
+    T* const to = image + place.y * pitch + place.x;
+    const T* const from = reinterpret_cast<const T*>(values.part);
+    if (place.columns < tile_size || place.rows < tile_size)
+        return storePartOfTile(from, to, width, place);
+    for (int row = 0; row < tile_size; ++row)
+        __builtin_memcpy(to + row * pitch, from + tile_size * row, tile_size * sizeof(T));
 }
 
 inline int smaller(int a, int b) {
@@ -158,6 +151,7 @@ void traceSamples(const FrameSetup& frame, SamplePacket& samples) {
 } // namespace
 
 extern const RayKernel QUARN_RAY_KERNEL;
-const RayKernel QUARN_RAY_KERNEL{QUARN_RAY_KERNEL_NAME, traceBlock, traceSamples, findFreeSky};
+const RayKernel QUARN_RAY_KERNEL{QUARN_RAY_KERNEL_NAME, traceBlock, traceSamples, findSteps,
+                                 findFreeSky};
 
 } // namespace quarn

@@ -9,7 +9,8 @@ namespace {
 
 /// The surfaces that a packet met.
 struct SurfaceLanes {
-    LaneVectors face;   ///< unit normals of the triangles, toward the observer
+    /// Normals of the triangles, toward the observer; of unit length if the frame needs it.
+    LaneVectors face;
     LaneVectors normal; ///< unit normals for shading, on the same side
     LaneColors albedo;
     LaneInts surface; ///< index into FrameSetup::surfaces; 0 for rays that met none
@@ -43,20 +44,26 @@ inline LaneVectors geometricNormals(const FrameSetup& frame, const RayPacket& pa
         straight_up);
 }
 
-/// Turns normals toward the observer and gives them unit length.
-inline LaneVectors faceNormals(const RayPacket& packet, const LaneVectors& normal) {
-    const Lanes length = greatest(squareRoot(dot(normal, normal)), 1e-30F);
-    const Lanes turn = select(dot(normal, packet.direction) > 0.0F, -1.0F, 1.0F);
-    return normal * (turn / length);
+inline LaneVectors ofUnitLength(const LaneVectors& v) {
+    return v * (Lanes(1.0F) / greatest(squareRoot(dot(v, v)), 1e-30F));
 }
 
-/// The direction that packNormal stored, not of unit length.
+/// The normals, turned toward the observer.
+inline LaneVectors towardObserver(const FrameSetup& frame, const RayPacket& packet,
+                                  const LaneVectors& normal) {
+    const Lanes turn = select(dot(normal, packet.direction) > 0.0F, -1.0F, 1.0F);
+    if (!frame.needs_unit_faces)
+        return normal * turn;
+    return normal * (turn / greatest(squareRoot(dot(normal, normal)), 1e-30F));
+}
+
+/// The direction that packNormal stored, some 32767 long.
 inline LaneVectors unpacked(const LaneInts& packed) {
-    const Lanes u = floatsOf(shiftedRight(shiftedLeft(packed, 16), 16)) * (1.0F / 32767.0F);
-    const Lanes v = floatsOf(shiftedRight(packed, 16)) * (1.0F / 32767.0F);
-    const Lanes z = Lanes(1.0F) - absolute(u) - absolute(v);
-    const Lanes fold = least(z, 0.0F);
-    return {u + select(u < 0.0F, -fold, fold), v + select(v < 0.0F, -fold, fold), z};
+    const Lanes u = floatsOf(shiftedRight(shiftedLeft(packed, 16), 16));
+    const Lanes v = floatsOf(shiftedRight(packed, 16));
+    const Lanes below = magnitude(u) + magnitude(v) - 32767.0F;
+    const Lanes fold = greatest(below, 0.0F);
+    return {u - withSignOf(fold, u), v - withSignOf(fold, v), -below};
 }
 
 /// Interpolates the corner normals of one surface; only the lanes of `mask` come out right.
@@ -74,9 +81,7 @@ inline LaneVectors smoothNormals(const RaySurface& surface, const RayPacket& pac
                     w * a.z + u * b.z + v * c.z};
     if (surface.place)
         sum = turned(surface.place->cofactors, sum);
-    const Lanes length = greatest(squareRoot(dot(sum, sum)), 1e-30F);
-    const Lanes turn = select(dot(sum, face) < 0.0F, -1.0F, 1.0F);
-    return sum * (turn / length);
+    return sum * withSignOf(inverseRoot(dot(sum, sum)), dot(sum, face));
 }
 
 /// Multiplies the albedo of the lanes by vertex colours and texture.
@@ -102,11 +107,14 @@ inline void readSurface(const FrameSetup& frame, const RaySurface& surface, cons
     if (surface.place) {
         const LaneVectors normal =
             turned(surface.place->cofactors, geometricNormals(frame, packet));
-        lanes.face = select(mask, faceNormals(packet, normal), lanes.face);
-        lanes.normal = select(mask, lanes.face, lanes.normal);
+        lanes.face = select(mask, towardObserver(frame, packet, normal), lanes.face);
     }
     if (surface.corner_normals)
         lanes.normal = select(mask, smoothNormals(surface, packet, mask, lanes.face), lanes.normal);
+    else if (frame.needs_unit_faces)
+        lanes.normal = select(mask, lanes.face, lanes.normal);
+    else
+        lanes.normal = select(mask, ofUnitLength(lanes.face), lanes.normal);
     if (!frame.base_colors)
         return;
     lanes.albedo = select(mask, uniformColor(surface.albedo), lanes.albedo);
@@ -115,10 +123,11 @@ inline void readSurface(const FrameSetup& frame, const RaySurface& surface, cons
 }
 
 /// Fills `lanes` for all rays that hit something. Most packets meet one surface only.
-inline void readSurfaces(const FrameSetup& frame, const RayPacket& packet, SurfaceLanes& lanes) {
+[[gnu::always_inline]] inline void readSurfaces(const FrameSetup& frame, const RayPacket& packet,
+                                                SurfaceLanes& lanes) {
     lanes.surface = surfacesMet(frame, packet);
-    lanes.face = faceNormals(packet, geometricNormals(frame, packet));
-    lanes.normal = lanes.face;
+    lanes.face = towardObserver(frame, packet, geometricNormals(frame, packet));
+    lanes.normal = {0.0F, 0.0F, 1.0F};
     lanes.albedo = uniformColor(frame.plain_albedo);
     alignas(64) std::uint32_t surfaces[lane_count];
     store(surfaces, lanes.surface);

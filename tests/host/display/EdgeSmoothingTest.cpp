@@ -75,7 +75,7 @@ bool stepsVisibly(const Image& image, int x, int y, int other_x, int other_y) {
         return false;
     for (std::size_t c = 0; c < 3; ++c)
         if (std::abs(image.pixel(x, y)[c] - image.pixel(other_x, other_y)[c]) >
-            EdgePixels::color_threshold)
+            visible_step)
             return true;
     return false;
 }
