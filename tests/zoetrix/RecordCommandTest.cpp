@@ -265,6 +265,24 @@ TEST_F(RecordCommand, RenderedSunStudyIsOfTheAnimationsViewAndLitByItsSuns) {
     EXPECT_EQ(first, readFile(frames / "Walk000.jpg"));
 }
 
+TEST_F(RecordCommand, RenderedPictureThatCannotBeSavedEndsTheRecording) {
+    renderSmall();
+    record().SetRenderPreview(true);
+    std::filesystem::create_directories(frames / "Walk001.jpg");
+    ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
+    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk000.jpg", "Walk001.jpg"));
+    EXPECT_TRUE(std::filesystem::is_directory(frames / "Walk001.jpg"));
+    // A picture that was rendered counts; the next one is not begun.
+    EXPECT_THAT(images(), ElementsAre(L"Walk000.jpg", L"Walk001.jpg"));
+    EXPECT_EQ(2, record().CurrentFrame());
+    EXPECT_THAT(printed(), HasSubstr(L"there is a folder of this name. No more pictures are "
+                                     L"rendered.\n"));
+    // The next recording begins anew.
+    std::filesystem::remove(frames / "Walk001.jpg");
+    ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
+    expectThreeFramesAndThePageIn(frames);
+}
+
 TEST_F(RecordCommand, NamesThatLeaveTheFolderGiveNeitherFrameNorPage) {
     for (const wchar_t* name : {L"../Walk", L"a\nb"}) {
         record().SetHtmlFilename(name);
