@@ -10,6 +10,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
 namespace quarn {
 
@@ -17,11 +18,10 @@ namespace {
 
 constexpr std::size_t lines_per_job = 8192;
 
-/// The inner edges of a mesh fade out where they stand closer than this, in pixels.
-constexpr double sparse_px = 10.0;
-constexpr double dense_px = 1.5;
 constexpr float inner_edge_strength = 0.45F;
 constexpr float weakest_drawn = 0.03F;
+/// Of the tone that stands for edges that cannot be told apart.
+constexpr float tone_strength = 0.13F;
 
 bool wantsEdges(const DisplayModeAttributes& mode) {
     return mode.draws_edges || mode.draws_all_edges || mode.draws_outlines;
@@ -32,18 +32,34 @@ double depthOf(const CameraRays& rays, const KM_3dPoint& p) {
            (rays.eye[2] - p.z) * rays.camera_z[2];
 }
 
-/// How visible the inner edges of a mesh are: of a dense net nothing could be made out.
+/// How near the nearest and the farthest part of a mesh are, in the measure of DepthImage.
+struct NearnessRange {
+    float nearest;
+    float farthest;
+};
+
+NearnessRange nearnessOf(const DisplayScene::MeshObject& object, const KM_3dPoint& origin,
+                         const CameraRays& rays) {
+    const double least_depth = 1e-3 * object.box.Diagonal().Length();
+    NearnessRange range{0.0F, std::numeric_limits<float>::max()};
+    for (int i = 0; i < 8; ++i) {
+        const KM_3dPoint corner = object.box.Corner(i) + (KM_3dPoint::Origin - origin);
+        const double depth = std::max(depthOf(rays, corner), least_depth);
+        const auto nearness =
+            static_cast<float>(rays.parallel ? rays.far_depth - depth : 1.0 / depth);
+        range.nearest = std::max(range.nearest, nearness);
+        range.farthest = std::min(range.farthest, nearness);
+    }
+    return range;
+}
+
+/// How strong the inner edges of a mesh are where they can be told apart; 0 if they nowhere can.
 float innerStrength(const DisplayScene::MeshObject& object, const KM_3dPoint& origin,
                     const CameraRays& rays) {
-    double pixel = rays.pixel_size;
-    const KM_3dPoint center = object.box.Center() + (KM_3dPoint::Origin - origin);
-    if (!rays.parallel)
-        pixel *= std::max(depthOf(rays, center), 1e-3 * object.box.Diagonal().Length());
-    const double length = object.mesh->edges().meanInnerLength() *
-                          std::cbrt(std::abs(object.frame_from_mesh.Determinant()));
-    const double spacing_px = length / std::max(pixel, 1e-300);
-    const double t = std::clamp((spacing_px - dense_px) / (sparse_px - dense_px), 0.0, 1.0);
-    return inner_edge_strength * static_cast<float>(t);
+    const float nearest = nearnessOf(object, origin, rays).nearest;
+    const bool is_clear =
+        inner_edge_strength * EdgeSpacing(object, rays).clearness(nearest) > weakest_drawn;
+    return is_clear ? inner_edge_strength : 0.0F;
 }
 
 struct Point3 {
@@ -136,6 +152,21 @@ void LineDrawing::listMeshes(const DisplayScene& scene, const CameraRays& rays,
         });
 }
 
+/// Where the inner edges of meshes cannot be told apart, a tone says that they are there.
+void LineDrawing::layTone(const DisplayScene& scene, const CameraRays& rays,
+                          const DisplayModeAttributes& mode, const ScreenProjection& projection,
+                          const LineTarget& target) {
+    m_tone.reset(target.width, target.height);
+    for (const DisplayScene::MeshObject& object : scene.meshes()) {
+        if (!object.visible || !object.mesh)
+            continue;
+        const float farthest = nearnessOf(object, scene.origin(), rays).farthest;
+        if (EdgeSpacing(object, rays).clearness(farthest) < 1.0F)
+            m_tone.add(object, rays, projection, target);
+    }
+    m_tone.blend(target, mode.edge_color, tone_strength);
+}
+
 void LineDrawing::listCurvesAndPoints(const DisplayScene& scene,
                                       const DisplayModeAttributes& mode) {
     for (std::size_t i = 0; i < scene.curves().size(); ++i) {
@@ -207,6 +238,8 @@ void LineDrawing::draw(const DisplayScene& scene, const CameraRays& rays,
         }
         batch.sortIntoBands(target.height);
     });
+    if (mode.draws_all_edges)
+        layTone(scene, rays, mode, projection, target);
     drawLines({m_batches.data(), m_jobs.size()}, target);
 }
 

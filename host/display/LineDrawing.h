@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/display/DenseTone.h"
 #include "host/display/LineRaster.h"
 
 #include <cstddef>
@@ -37,6 +38,9 @@ private:
 
     void listMeshes(const DisplayScene& scene, const CameraRays& rays,
                     const DisplayModeAttributes& mode);
+    void layTone(const DisplayScene& scene, const CameraRays& rays,
+                 const DisplayModeAttributes& mode, const ScreenProjection& projection,
+                 const LineTarget& target);
     void listCurvesAndPoints(const DisplayScene& scene, const DisplayModeAttributes& mode);
     void list(Source source, std::size_t object, std::size_t count, const LineStyle& style,
               float strength = 1.0F);
@@ -45,6 +49,7 @@ private:
 
     std::vector<Job> m_jobs;
     std::vector<LineBatch> m_batches;
+    DenseTone m_tone;
 };
 
 } // namespace quarn

@@ -267,7 +267,8 @@ void addToCrowding(const ScreenSegment& s, float width, int top, int bottom,
     const float length = (leave - enter) * std::sqrt(dx * dx + dy * dy);
     const int pieces = 1 + static_cast<int>(length / piece_px);
     const float step = (leave - enter) / static_cast<float>(pieces);
-    const float area = width * length / static_cast<float>(pieces);
+    const float strength = 0.5F * (s.from.strength + s.to.strength);
+    const float area = strength * width * length / static_cast<float>(pieces);
     const auto inBand = [&](float y) {
         return std::clamp(y, static_cast<float>(top), static_cast<float>(bottom) - 0.5F);
     };

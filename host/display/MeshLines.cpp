@@ -50,7 +50,7 @@ MeshLines::MeshLines(const DisplayScene::MeshObject& object, const CameraRays& r
       m_stands(m_frame_from_mesh.IsIdentity()), m_parallel(rays.parallel),
       m_eye(rays.eye[0], rays.eye[1], rays.eye[2]),
       m_backward(rays.camera_z[0], rays.camera_z[1], rays.camera_z[2]), m_projection(projection),
-      m_fade(fade) {
+      m_fade(fade), m_spacing(object, rays) {
     KM_Xform mesh_from_frame = m_frame_from_mesh;
     if (m_stands || !mesh_from_frame.Invert())
         return;
@@ -60,12 +60,12 @@ MeshLines::MeshLines(const DisplayScene::MeshObject& object, const CameraRays& r
 
 void MeshLines::addAll(std::span<const MeshEdges::Edge> edges, LineBatch& batch) const {
     for (const auto& edge : edges)
-        add(edge.from, edge.to, batch);
+        addDense(edge.from, edge.to, batch);
 }
 
 void MeshLines::addAll(std::span<const MeshEdges::FlatEdge> edges, LineBatch& batch) const {
     for (const auto& edge : edges)
-        add(edge.from, edge.to, batch);
+        addDense(edge.from, edge.to, batch);
 }
 
 void MeshLines::addOutlines(std::span<const MeshEdges::Edge> edges, LineBatch& batch) const {
@@ -92,18 +92,38 @@ bool MeshLines::isOutline(const MeshEdges::Edge& edge) const {
     return (toward_a > 0.0F) != (toward_b > 0.0F);
 }
 
-void MeshLines::add(std::uint32_t from, std::uint32_t to, LineBatch& batch) const {
+bool MeshLines::project(std::uint32_t from, std::uint32_t to, ScreenSegment& segment) const {
     KM_3dPoint a = m_vertices[from].ToDouble();
     KM_3dPoint b = m_vertices[to].ToDouble();
     if (!m_stands) {
         a = m_frame_from_mesh * a;
         b = m_frame_from_mesh * b;
     }
-    ScreenSegment segment;
     if (!m_projection.project({a.x, a.y, a.z}, {b.x, b.y, b.z}, segment))
-        return;
+        return false;
     segment.from.strength = m_fade.at(segment.from.nearness);
     segment.to.strength = m_fade.at(segment.to.nearness);
+    return true;
+}
+
+void MeshLines::add(std::uint32_t from, std::uint32_t to, LineBatch& batch) const {
+    ScreenSegment segment;
+    if (project(from, to, segment))
+        batch.add(segment);
+}
+
+void MeshLines::addDense(std::uint32_t from, std::uint32_t to, LineBatch& batch) const {
+    constexpr float least = 0.04F; // fainter lines cannot be seen
+    const KM_3dPoint vertex = m_vertices[from].ToDouble();
+    const KM_3dPoint start = m_stands ? vertex : m_frame_from_mesh * vertex;
+    const float nearness = m_projection.nearness({start.x, start.y, start.z});
+    if (nearness > 0.0F && m_spacing.clearness(nearness) < least)
+        return;
+    ScreenSegment segment;
+    if (!project(from, to, segment))
+        return;
+    for (ScreenPoint* const end : {&segment.from, &segment.to})
+        end->strength *= m_spacing.clearness(end->nearness);
     batch.add(segment);
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/display/DenseTone.h"
 #include "host/display/DisplayScene.h"
 #include "host/display/LineRaster.h"
 #include "host/display/MeshEdges.h"
@@ -38,7 +39,7 @@ public:
     MeshLines(const DisplayScene::MeshObject& object, const CameraRays& rays,
               const ScreenProjection& projection, const DepthFade& fade);
 
-    /// All of the edges.
+    /// All of the edges, as clearly as they can be told apart.
     void addAll(std::span<const MeshEdges::Edge> edges, LineBatch& batch) const;
     void addAll(std::span<const MeshEdges::FlatEdge> edges, LineBatch& batch) const;
     /// Those where the surface turns away from the observer, or ends.
@@ -49,6 +50,8 @@ public:
 private:
     bool isOutline(const MeshEdges::Edge& edge) const;
     void add(std::uint32_t from, std::uint32_t to, LineBatch& batch) const;
+    void addDense(std::uint32_t from, std::uint32_t to, LineBatch& batch) const;
+    bool project(std::uint32_t from, std::uint32_t to, ScreenSegment& segment) const;
 
     std::span<const KM_3fPoint> m_vertices;
     const KM_Xform& m_frame_from_mesh;
@@ -58,6 +61,7 @@ private:
     KM_3dVector m_backward; ///< against the direction of view
     const ScreenProjection& m_projection;
     const DepthFade& m_fade;
+    EdgeSpacing m_spacing;
 };
 
 } // namespace quarn

@@ -25,7 +25,8 @@ ScreenProjection::ScreenProjection(const CameraRays& rays, int width, int height
     : m_left(rays.left), m_top(rays.top), m_pixels_per_x(1.0 / rays.pixel_width),
       m_pixels_per_y(1.0 / rays.pixel_size), m_near(rays.line_near), m_far(rays.far_depth),
       m_parallel(rays.parallel), m_min(-margin_px), m_max_x(static_cast<float>(width) + margin_px),
-      m_max_y(static_cast<float>(height) + margin_px) {
+      m_max_y(static_cast<float>(height) + margin_px), m_width(static_cast<float>(width)),
+      m_height(static_cast<float>(height)) {
     std::copy_n(rays.eye, 3, m_eye);
     std::copy_n(rays.camera_x, 3, m_x);
     std::copy_n(rays.camera_y, 3, m_y);
@@ -63,6 +64,22 @@ bool ScreenProjection::project(const double (&from)[3], const double (&to)[3],
     }
     segment = {screenPoint(a), screenPoint(b)};
     return clipToPicture(segment);
+}
+
+float ScreenProjection::nearness(const double (&world)[3]) const {
+    const double toward[3] = {m_eye[0] - world[0], m_eye[1] - world[1], m_eye[2] - world[2]};
+    const double depth = dot(toward, m_z);
+    if (m_parallel)
+        return static_cast<float>(m_far - depth);
+    return depth < m_near ? 0.0F : static_cast<float>(1.0 / depth);
+}
+
+bool ScreenProjection::project(const double (&world)[3], ScreenPoint& point) const {
+    const CameraPoint camera_point = cameraPoint(world);
+    if (!m_parallel && camera_point.depth < m_near)
+        return false;
+    point = screenPoint(camera_point);
+    return point.x >= 0.0F && point.x < m_width && point.y >= 0.0F && point.y < m_height;
 }
 
 /// By Y.-D. Liang and B. A. Barsky, "A New Concept and Method for Line Clipping", 1984.

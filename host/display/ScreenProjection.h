@@ -31,6 +31,12 @@ public:
     /// @return false when nothing of it is left or a coordinate is not finite
     bool project(const double (&from)[3], const double (&to)[3], ScreenSegment& segment) const;
 
+    /// Projects a point of the world.
+    /// @return false when it lies behind the camera or outside the picture
+    bool project(const double (&world)[3], ScreenPoint& point) const;
+    /// How near a point of the world is, in the measure of DepthImage; 0 behind the camera.
+    float nearness(const double (&world)[3]) const;
+
 private:
     struct CameraPoint {
         double x;
@@ -55,6 +61,8 @@ private:
     float m_min;
     float m_max_x;
     float m_max_y;
+    float m_width;
+    float m_height;
 };
 
 } // namespace quarn

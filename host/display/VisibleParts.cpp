@@ -11,12 +11,15 @@ namespace {
 
 /// Depths count as the same within this part of them.
 constexpr float same_depth = 3e-4F;
+/// A line that is farther than this part of what a pixel shows lies in none of its folds.
+constexpr float least_in_fold = 0.97F;
 
 /// In samples.
 constexpr std::size_t longest_gap = 3;
 constexpr std::size_t shortest_run = 6;
 constexpr std::size_t piece = 8;
 constexpr std::size_t mean_reach = 8;
+constexpr std::size_t probe_step = 8;
 
 /// Bends below the first are joints within a plane, from the second on they are edges.
 constexpr float no_bend = 0.08F;
@@ -88,6 +91,8 @@ bool SurfaceView::meetsSurfaceBeside(const ScreenSegment& line, const ScreenPoin
     const float nearness =
         place.nearness + to_middle * (line.to.nearness - line.from.nearness) / run;
     const int row = pixelOf(across);
+    if (nearness < least_in_fold * (is_flat ? nearnessAt(column, row) : nearnessAt(row, column)))
+        return false;
     const auto meets = [&](int side) {
         float near[3];
         for (int i = 0; i < 3; ++i) {
@@ -117,6 +122,7 @@ float SurfaceView::bendAt(int x, int y, const Aside& aside) const {
 
 void VisibleParts::add(const ScreenSegment& segment, LineBatch& batch) {
     look(segment);
+    lookIntoFolds(segment);
     closeGaps();
     dropDots();
     forEachRun(m_seen, 1,
@@ -134,15 +140,34 @@ void VisibleParts::look(const ScreenSegment& segment) {
     m_seen.resize(count);
     m_bends.resize(count);
     for (std::size_t i = 0; i < count; ++i) {
-        const float t = (static_cast<float>(i) + 0.5F) / static_cast<float>(count);
-        const ScreenPoint place = along(segment, t);
+        const ScreenPoint place = sampleOf(segment, i);
         const int x = pixelOf(place.x);
         const int y = pixelOf(place.y);
-        const bool is_hidden =
-            m_view.hides(x, y, place.nearness) && !m_view.meetsSurfaceBeside(segment, place);
-        m_seen[i] = is_hidden ? 0 : 1;
+        m_seen[i] = m_view.hides(x, y, place.nearness) ? 0 : 1;
         m_bends[i] = m_view.bendAt(x, y, aside);
     }
+}
+
+ScreenPoint VisibleParts::sampleOf(const ScreenSegment& segment, std::size_t index) const {
+    const auto count = static_cast<float>(m_seen.size());
+    return along(segment, (static_cast<float>(index) + 0.5F) / count);
+}
+
+void VisibleParts::lookIntoFolds(const ScreenSegment& segment) {
+    const bool is_seen = std::find(m_seen.begin(), m_seen.end(), 1) != m_seen.end();
+    if (!is_seen && !isInFold(segment))
+        return;
+    for (std::size_t i = 0; i < m_seen.size(); ++i)
+        if (!m_seen[i] && m_view.meetsSurfaceBeside(segment, sampleOf(segment, i)))
+            m_seen[i] = 1;
+}
+
+/// Most lines lie far behind what hides them: a few samples tell.
+bool VisibleParts::isInFold(const ScreenSegment& segment) const {
+    for (std::size_t i = probe_step / 2; i < m_seen.size(); i += probe_step)
+        if (m_view.meetsSurfaceBeside(segment, sampleOf(segment, i)))
+            return true;
+    return false;
 }
 
 void VisibleParts::closeGaps() {

@@ -50,6 +50,9 @@ public:
 
 private:
     void look(const ScreenSegment& segment);
+    void lookIntoFolds(const ScreenSegment& segment);
+    bool isInFold(const ScreenSegment& segment) const;
+    ScreenPoint sampleOf(const ScreenSegment& segment, std::size_t index) const;
     void closeGaps();
     void dropDots();
     float meanBend(std::size_t at, std::size_t begin, std::size_t end) const;
