@@ -274,7 +274,7 @@ std::shared_ptr<Texture> MaterialReading::loadFile(const std::string& reference)
     const auto path = m_folder.find(reference);
     if (!path) {
         warnLeftOut(reference, m_folder.leadsOutside(reference)
-                                   ? "it lies outside the model's folder"
+                                   ? "it lies outside the model's folder; copy it beside the model"
                                    : "there is no such file beside the model");
         return nullptr;
     }

@@ -78,6 +78,12 @@ float finiteOrZero(float number) {
     return std::isfinite(number) ? number + 0.0F : 0.0F;
 }
 
+/// Polygons of n corners are n - 2 triangles by now, so where no two share a vertex there are more
+/// vertices than triangles. In a mesh whose polygons share them there are half as many.
+bool mayShareNothing(const aiMesh& mesh) {
+    return mesh.mNumVertices > mesh.mNumFaces;
+}
+
 class TriangleReader {
 public:
     TriangleReader(const aiMesh& source, const MeshReading& reading)
@@ -86,8 +92,7 @@ public:
           m_has_texture(reading.texture_coordinates < AI_MAX_NUMBER_OF_TEXTURECOORDS &&
                         source.mTextureCoords[reading.texture_coordinates] != nullptr),
           m_has_colors(source.mColors[0] != nullptr),
-          m_in_place(reading.world_from_mesh.IsIdentity()),
-          m_weld(source.mNumVertices / 3 >= source.mNumFaces),
+          m_in_place(reading.world_from_mesh.IsIdentity()), m_weld(mayShareNothing(source)),
           m_table(m_weld ? source.mNumVertices / usual_sharing : 0) {}
 
     ConvertedMesh read() {

@@ -27,7 +27,7 @@ struct ConvertedMesh {
 };
 
 /// The triangles of `mesh` in world coordinates, with the normals of the file if it has any. Only
-/// vertices that a triangle uses are kept; where no two triangles share a vertex, equal ones are
+/// vertices that a triangle uses are kept; where no two polygons share a vertex, equal ones are
 /// made one. The result wants completeMesh(), which no longer needs the source.
 ConvertedMesh convertTriangles(const aiMesh& mesh, const MeshReading& reading);
 

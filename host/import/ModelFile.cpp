@@ -1,11 +1,15 @@
 #include "host/import/ModelFile.h"
 
 #include "host/import/CoordinateShift.h"
+#include "host/import/GltfLosses.h"
 #include "host/import/LargeStack.h"
+#include "host/import/LibraryWords.h"
 #include "host/import/ModelFileAccess.h"
 #include "host/import/ModelFileCheck.h"
 #include "host/import/SceneReading.h"
 #include "host/import/SceneRepair.h"
+#include "host/import/TextIndices.h"
+#include "host/import/WideText.h"
 
 #include <assimp/Importer.hpp>
 #include <assimp/commonMetaData.h>
@@ -16,6 +20,7 @@
 #include <algorithm>
 #include <array>
 #include <exception>
+#include <future>
 #include <optional>
 #include <set>
 #include <string_view>
@@ -26,18 +31,6 @@ namespace {
 namespace fs = std::filesystem;
 
 constexpr std::string_view repair = "The file may be damaged; export the model again.";
-
-/// One sentence of the reading library as a part of one of ours.
-std::string cleaned(std::string_view text) {
-    constexpr std::size_t longest = 300;
-    std::string clean(text.substr(0, longest));
-    std::replace_if(
-        clean.begin(), clean.end(), [](char c) { return static_cast<unsigned char>(c) < 32; }, ' ');
-    while (!clean.empty() && (clean.back() == ' ' || clean.back() == '.')) {
-        clean.pop_back();
-    }
-    return clean.empty() ? "its contents cannot be understood" : clean;
-}
 
 bool isOneOf(std::string_view format, std::initializer_list<std::string_view> formats) {
     return std::find(formats.begin(), formats.end(), format) != formats.end();
@@ -56,14 +49,15 @@ bool isYUp(const std::string& format, UpAxis up) {
     if (up != UpAxis::by_format) {
         return up == UpAxis::y;
     }
-    return !isOneOf(format, {"obj", "ply", "stl", "off", "3mf", "amf", "dxf", "blend"});
+    return !isOneOf(format, {"obj", "ply", "stl", "off", "3mf", "amf", "blend", "cob", "hmp", "q3o",
+                             "q3s", "scn", "smd", "vta"});
 }
 
 ModelConventions conventionsOf(const aiScene& scene, const fs::path& path, UpAxis up) {
     const std::string format = modelFormat(path);
     ModelConventions conventions;
     conventions.turn_y_up = isYUp(format, up);
-    conventions.keep_normals = format != "stl";
+    conventions.keep_normals = !isOneOf(format, {"stl", "blend"});
     conventions.gltf_cameras = isOneOf(format, {"gltf", "glb"});
     conventions.linear_colors = hasLinearColors(scene, format);
     conventions.file_name = KM_wString::FromUtf8(path.stem().string());
@@ -98,37 +92,99 @@ bool isEmpty(const ImportedModel& model) {
 }
 
 Error nothingLeft(const fs::path& path, const ImportedModel& model) {
-    const std::string why = model.warnings.empty()
-                                ? "it holds no triangles, lines or points"
-                                : "nothing in it can be shown. " + cleaned(model.warnings.back());
+    const std::string why = model.warnings.empty() ? "it holds no triangles, lines or points"
+                                                   : "nothing in it can be shown. " +
+                                                         inPlainWords(model.warnings.back());
     return cannotReadModel(path, why, "Export the model again, with its meshes.");
 }
 
-/// Reads the file into the importer's scene; false with the importer's error text otherwise.
-bool readScene(Assimp::Importer& importer, const fs::path& path) {
-    unsigned steps =
-        aiProcess_ValidateDataStructure | aiProcess_Triangulate | aiProcess_SortByPType;
-    if (!isOneOf(modelFormat(path), {"gltf", "glb"})) {
-        steps |= aiProcess_TransformUVCoords; // turned ones of glTF come out wrong
+/// What is found out about a file beside the library's reading, which keeps it to itself.
+struct BesideReading {
+    std::string why_bad; ///< empty: nothing speaks against the file
+    std::optional<GltfDescription> gltf;
+};
+
+BesideReading readBeside(const fs::path& path) {
+    BesideReading beside;
+    beside.why_bad = whyBadIndices(path);
+    if (isOneOf(modelFormat(path), {"gltf", "glb"})) {
+        beside.gltf = readGltfDescription(path);
     }
-    if (importer.ReadFile(path.string(), 0) == nullptr) {
-        return false;
+    return beside;
+}
+
+/// The scene is the importer's own, which hands it out as constant only for its users' sake.
+aiScene& sceneOf(const Assimp::Importer& importer) {
+    return *const_cast<aiScene*>(importer.GetScene());
+}
+
+unsigned stepsFor(const std::string& format) {
+    constexpr unsigned steps = aiProcess_ValidateDataStructure | aiProcess_Triangulate |
+                               aiProcess_SortByPType | aiProcess_GenUVCoords;
+    const bool is_gltf = isOneOf(format, {"gltf", "glb"});
+    return is_gltf ? steps
+                   : steps | aiProcess_TransformUVCoords; // turned ones of glTF come out wrong
+}
+
+/// Turns what was read into triangles, lines and points; false with the importer's error text where
+/// it is damaged.
+bool completeScene(Assimp::Importer& importer, const std::string& format,
+                   std::vector<std::string>& warnings) {
+    aiScene& scene = sceneOf(importer);
+    const std::uint64_t without_corners = repairScene(scene);
+    if (without_corners > 0) {
+        warnings.push_back(std::to_string(without_corners) +
+                           " faces were left out: they have no corners.");
     }
-    // The scene is the importer's own, which hands it out as constant only for its users' sake.
-    auto* const scene = const_cast<aiScene*>(importer.GetScene());
-    repairScene(*scene);
-    return scene->mNumMeshes == 0 || importer.ApplyPostProcessing(steps) != nullptr;
+    return scene.mNumMeshes == 0 || importer.ApplyPostProcessing(stepsFor(format)) != nullptr;
+}
+
+/// Other bytes than those on the disk, for what the library would not understand or not exactly.
+struct Replacement {
+    std::optional<std::string> bytes;
+    KM_3dPoint origin; ///< where their coordinates begin
+};
+
+Replacement replacementFor(const fs::path& path) {
+    if (std::optional<ShiftedFile> shifted = shiftFarCoordinates(path)) {
+        return {std::move(shifted->bytes), shifted->origin};
+    }
+    return {utf8OfWideFile(path), KM_3dPoint::Origin};
+}
+
+Result<ImportedModel> takeChecked(Assimp::Importer& importer, const fs::path& path,
+                                  const ModelFolder& folder, const ModelConventions& conventions,
+                                  BesideReading beside) {
+    const auto refused = [&path, &beside](const std::string& why) {
+        return cannotReadModel(path, beside.why_bad.empty() ? why : beside.why_bad, repair);
+    };
+    std::vector<std::string> warnings;
+    if (beside.gltf) {
+        warnings = tellLostFaces(sceneOf(importer), *beside.gltf);
+    }
+    const bool is_complete = completeScene(importer, modelFormat(path), warnings);
+    if (!is_complete || !beside.why_bad.empty()) {
+        return refused(inPlainWords(importer.GetErrorString()));
+    }
+    const std::unique_ptr<aiScene> scene(importer.GetOrphanedScene());
+    importer.FreeScene();
+    Result<ImportedModel> model = takeScene(*scene, folder, conventions);
+    if (!model) {
+        return refused(model.message());
+    }
+    model.value().warnings.insert(model.value().warnings.begin(), warnings.begin(), warnings.end());
+    return model;
 }
 
 Result<ImportedModel> readChecked(const fs::path& path, UpAxis up) {
     const ModelFolder folder(path);
     std::set<std::string> refused;
-    const std::optional<ShiftedFile> shifted = shiftFarCoordinates(path);
+    const Replacement replacement = replacementFor(path);
     Assimp::Importer importer;
     auto* const access = new ModelFileAccess(folder, refused);
     importer.SetIOHandler(access); // which owns it
-    if (shifted) {
-        access->replace(path, shifted->bytes);
+    if (replacement.bytes) {
+        access->replace(path, *replacement.bytes);
     }
     configure(importer);
     const std::string extension = path.extension().string();
@@ -136,18 +192,17 @@ Result<ImportedModel> readChecked(const fs::path& path, UpAxis up) {
         return cannotReadModel(path, "files of this kind are not known",
                                "Choose a model file (OBJ, glTF, GLB, PLY, STL, ...).");
     }
-    if (!readScene(importer, path)) {
-        return cannotReadModel(path, cleaned(importer.GetErrorString()), repair);
+    auto beside = std::async(std::launch::async | std::launch::deferred, readBeside, path);
+    if (importer.ReadFile(path.string(), 0) == nullptr) {
+        const std::string why = beside.get().why_bad;
+        return cannotReadModel(path, why.empty() ? inPlainWords(importer.GetErrorString()) : why,
+                               repair);
     }
-    const std::unique_ptr<aiScene> scene(importer.GetOrphanedScene());
-    importer.FreeScene();
-    ModelConventions conventions = conventionsOf(*scene, path, up);
-    if (shifted) {
-        conventions.origin = shifted->origin;
-    }
-    Result<ImportedModel> model = takeScene(*scene, folder, conventions);
+    ModelConventions conventions = conventionsOf(sceneOf(importer), path, up);
+    conventions.origin = replacement.origin;
+    Result<ImportedModel> model = takeChecked(importer, path, folder, conventions, beside.get());
     if (!model) {
-        return cannotReadModel(path, model.message(), repair);
+        return model;
     }
     model.value().units = unitsOf(modelFormat(path));
     warnOfRefused(refused, model.value());
@@ -160,7 +215,7 @@ Result<ImportedModel> readGuarded(const fs::path& path, UpAxis up) {
     } catch (const std::bad_alloc&) {
         return cannotReadModel(path, "there is not enough memory", "Use a smaller model.");
     } catch (const std::exception& failure) {
-        return cannotReadModel(path, cleaned(failure.what()), repair);
+        return cannotReadModel(path, inPlainWords(failure.what()), repair);
     }
 }
 

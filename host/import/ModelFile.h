@@ -65,9 +65,9 @@ enum class UpAxis {
 /// 3DS, 3MF, OFF, ...).
 ///
 /// - Coordinates are in the file's own units. Z is up: formats that are Y-up by their definition
-///   (glTF, GLB), or that Assimp hands out Y-up (FBX, DAE, 3DS and others), are turned, with Y to Z
-///   and Z to -Y. OBJ, PLY, STL, OFF, 3MF, AMF, DXF and BLEND state no axis or are Z-up: they stay
-///   as they are. Files of these that were made Y-up are read with UpAxis::y.
+///   (glTF, GLB), or that Assimp hands out Y-up (FBX, DAE, 3DS, DXF and others), are turned, with Y
+///   to Z and Z to -Y. OBJ, PLY, STL, OFF, 3MF, AMF, BLEND, COB, HMP, Q3O and SMD state no axis or
+///   are Z-up: they stay as they are. Files of these that were made Y-up are read with UpAxis::y.
 /// - Lengths of glTF and GLB are metres (Khronos Group, glTF 2.0 Specification, section 3.4); other
 ///   formats leave the units to whoever made the file.
 /// - The transforms of the file's nodes are applied. A mesh that stands in a scene ten times
@@ -76,7 +76,8 @@ enum class UpAxis {
 ///   stays outside.
 /// - A model that lies far from the origin has its vertices near a place of its own, to which the
 ///   objects' transforms lead, because they have single precision.
-/// - Vertex normals of the file are kept, except those of STL, which only repeat the facets. Where
+/// - Vertex normals of the file are kept, except those of STL, which only repeat the facets, and of
+/// BLEND, which smooth everything. Where
 ///   they are missing, vertices are smoothed over edges flatter than 40 degrees and sharp edges
 ///   stay sharp.
 /// - Colours come out in sRGB: base colour factors and vertex colours of glTF are linear in the

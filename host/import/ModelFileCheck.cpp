@@ -1,6 +1,6 @@
 #include "host/import/ModelFileCheck.h"
 
-#include "host/import/PlyHeader.h"
+#include "host/import/PlyLength.h"
 
 #include <array>
 #include <cerrno>

@@ -12,6 +12,8 @@ std::string withSlashes(std::string_view reference) {
     std::replace(text.begin(), text.end(), '\\', '/');
     if (text.starts_with("file://")) {
         text.erase(0, 7);
+    } else if (text.starts_with("//")) {
+        text.erase(0, 2); // so BLEND files write what counts from their own folder
     }
     return text;
 }

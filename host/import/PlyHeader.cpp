@@ -2,46 +2,12 @@
 
 #include <algorithm>
 #include <array>
-#include <optional>
 #include <sstream>
 #include <string_view>
 #include <utility>
-#include <vector>
 
 namespace quarn {
 namespace {
-
-struct PlyProperty {
-    int count_bytes = 0; ///< of the number before a list, 0 when it is no list
-    int value_bytes = 0;
-};
-
-struct PlyElement {
-    std::string name;
-    std::uint64_t count = 0;
-    std::vector<PlyProperty> properties;
-
-    bool hasList() const {
-        return std::any_of(properties.begin(), properties.end(),
-                           [](const PlyProperty& p) { return p.count_bytes > 0; });
-    }
-
-    /// The least bytes that one of these takes, as text or as binary.
-    std::uint64_t leastBytes(bool text) const {
-        std::uint64_t bytes = 0;
-        for (const PlyProperty& p : properties) {
-            bytes += static_cast<std::uint64_t>(
-                text ? 2 : (p.count_bytes ? p.count_bytes : p.value_bytes));
-        }
-        return bytes;
-    }
-};
-
-struct PlyHeader {
-    bool text = false;
-    bool big_endian = false;
-    std::vector<PlyElement> elements;
-};
 
 int bytesOf(std::string_view type) {
     static constexpr std::array<std::pair<std::string_view, int>, 16> sizes{{{"char", 1},
@@ -78,6 +44,7 @@ bool readProperty(std::istream& words, PlyHeader& header) {
         }
     }
     property.value_bytes = bytesOf(type);
+    words >> property.name;
     if (property.value_bytes == 0 || header.elements.empty()) {
         return false;
     }
@@ -115,7 +82,24 @@ bool readHeaderLine(const std::string& line, PlyHeader& header) {
     return first == "property" ? readProperty(words, header) : true;
 }
 
-std::optional<PlyHeader> readHeader(std::istream& file) {
+} // namespace
+
+bool PlyElement::hasList() const {
+    return std::any_of(properties.begin(), properties.end(),
+                       [](const PlyProperty& p) { return p.count_bytes > 0; });
+}
+
+std::uint64_t PlyElement::leastBytes(bool text) const {
+    std::uint64_t bytes = 0;
+    for (const PlyProperty& p : properties) {
+        const int of_text = p.count_bytes > 0 ? 0 : 2;
+        const int of_binary = p.count_bytes > 0 ? p.count_bytes : p.value_bytes;
+        bytes += static_cast<std::uint64_t>(text ? of_text : of_binary);
+    }
+    return bytes;
+}
+
+std::optional<PlyHeader> readPlyHeader(std::istream& file) {
     constexpr int most_lines = 10000;
     PlyHeader header;
     std::string line;
@@ -131,108 +115,6 @@ std::optional<PlyHeader> readHeader(std::istream& file) {
         }
     }
     return std::nullopt;
-}
-
-/// Steps over `count` elements with lists; false when the file ends before them.
-class ListWalk {
-public:
-    ListWalk(std::istream& file, bool big_endian, std::uint64_t left)
-        : m_file(file), m_big_endian(big_endian), m_left(left) {}
-
-    bool skip(const PlyElement& element) {
-        if (!element.hasList()) {
-            const std::uint64_t bytes = element.count * element.leastBytes(false);
-            return skipBytes(bytes);
-        }
-        for (std::uint64_t i = 0; i < element.count; ++i) {
-            if (!skipOne(element)) {
-                return false;
-            }
-        }
-        return true;
-    }
-
-private:
-    bool skipOne(const PlyElement& element) {
-        for (const PlyProperty& p : element.properties) {
-            std::uint64_t values = 1;
-            if (p.count_bytes > 0 && !readCount(p.count_bytes, values)) {
-                return false;
-            }
-            if (!skipBytes(values * static_cast<std::uint64_t>(p.value_bytes))) {
-                return false;
-            }
-        }
-        return true;
-    }
-
-    bool readCount(int bytes, std::uint64_t& count) {
-        if (bytes > 4 || m_left < static_cast<std::uint64_t>(bytes)) {
-            return false;
-        }
-        count = 0;
-        for (int i = 0; i < bytes; ++i) {
-            const auto byte = static_cast<std::uint64_t>(m_file.rdbuf()->sbumpc() & 0xFF);
-            count = m_big_endian ? count << 8 | byte : count | byte << (8 * i);
-        }
-        m_left -= static_cast<std::uint64_t>(bytes);
-        return true;
-    }
-
-    bool skipBytes(std::uint64_t bytes) {
-        if (bytes > m_left) {
-            return false;
-        }
-        m_left -= bytes;
-        if (bytes > 64) {
-            m_file.seekg(static_cast<std::streamoff>(bytes), std::ios::cur);
-            return m_file.good();
-        }
-        for (std::uint64_t i = 0; i < bytes; ++i) {
-            m_file.rdbuf()->sbumpc();
-        }
-        return true;
-    }
-
-    std::istream& m_file;
-    bool m_big_endian;
-    std::uint64_t m_left;
-};
-
-std::string endsBefore(const PlyElement& element) {
-    return "it claims " + std::to_string(element.count) + " elements of kind '" + element.name +
-           "' but ends before them";
-}
-
-} // namespace
-
-std::string whyBadPly(std::istream& file, std::uint64_t size) {
-    std::string magic;
-    std::getline(file, magic);
-    if (!magic.starts_with("ply")) {
-        return "it is not a PLY file, whatever its name says";
-    }
-    const std::optional<PlyHeader> header = readHeader(file);
-    if (!header) {
-        return "its PLY header is damaged";
-    }
-    std::uint64_t left = size - static_cast<std::uint64_t>(file.tellg());
-    for (const PlyElement& element : header->elements) {
-        const std::uint64_t least = std::max<std::uint64_t>(1, element.leastBytes(header->text));
-        if (element.count > (left + 1) / least) { // the last line may lack its line break
-            return endsBefore(element);
-        }
-    }
-    if (header->text) {
-        return {};
-    }
-    ListWalk walk(file, header->big_endian, left);
-    for (const PlyElement& element : header->elements) {
-        if (!walk.skip(element)) {
-            return endsBefore(element);
-        }
-    }
-    return {};
 }
 
 } // namespace quarn

@@ -13,7 +13,7 @@ namespace quarn {
 /// What the format of a model file implies.
 struct ModelConventions {
     bool turn_y_up = false;     ///< the scene is Y-up and must be turned
-    bool keep_normals = true;   ///< false for STL, whose normals only repeat its facets
+    bool keep_normals = true;   ///< false: those of the file are worth nothing
     bool linear_colors = false; ///< colours are linear light
     /// The loader of glTF repeats a camera's place, which its node states already, and gives the
     /// vertical angle times the aspect for the horizontal one.

@@ -1,12 +1,17 @@
 #pragma once
 
+#include <cstdint>
+
 struct aiScene;
 
 namespace quarn {
 
-/// Makes a scene of the reading library pass its own validation where the file is sound but the
-/// library's loader is not: vertices without faces, as in a point cloud, become points; meshes
-/// without vertices are taken out of the scene and of its nodes.
-void repairScene(aiScene& scene);
+/// Mends what the reading library hands out and then refuses itself when it checks its scene: empty
+/// meshes, faces without corners and nodes that are missing go, a mesh of vertices alone becomes
+/// points. Lights and animations go as well, for nobody here reads them. So do vertex colours that
+/// are nothing at all, which stand for missing ones.
+///
+/// @return how many faces without corners there were
+std::uint64_t repairScene(aiScene& scene);
 
 } // namespace quarn

@@ -41,7 +41,12 @@ INSTANTIATE_TEST_SUITE_P(
         Refusal{"truncated.ply", "claims 2 elements of kind 'face' but ends before them"},
         Refusal{"huge_count.ply", "claims 2147483648 elements of kind 'face'"},
         Refusal{"huge_list.ply", "elements of kind 'face' but ends before them"},
-        Refusal{"bad_index.ply", "out of range"}, Refusal{"text.stl", "triangles but holds only 0"},
+        Refusal{"bad_index.ply", "out of range"},
+        Refusal{"wrapped_index.ply", "line 13 holds the index 4294967298, which is out of range"},
+        Refusal{"negative_index.ply", "line 13 holds the index -1, which is out of range"},
+        Refusal{"short_face.ply", "line 13 ends after 2 of 3 corners"},
+        Refusal{"wrapped_index.off", "line 6 holds the index 4294967298, which is out of range"},
+        Refusal{"text.stl", "triangles but holds only 0"},
         Refusal{"wrong_count.stl", "claims 1000 triangles but holds only 1"},
         Refusal{"huge_count.stl", "claims 4294967295 triangles but holds only 1"},
         Refusal{"text.glb", "not a GLB file"},
@@ -68,7 +73,7 @@ TEST(HostileModel, NamesThatLeaveTheFolderAreNotFollowed) {
         EXPECT_EQ(mesh.material->base_color_texture, nullptr);
     }
     EXPECT_THAT(model.warnings, Contains("The texture '/etc/passwd' was left out: it lies outside "
-                                         "the model's folder."));
+                                         "the model's folder; copy it beside the model."));
     EXPECT_THAT(model.warnings, Contains(HasSubstr("'../../CMakeLists.txt' was left out")));
 }
 
