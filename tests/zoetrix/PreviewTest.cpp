@@ -1,6 +1,7 @@
 #include "tests/zoetrix/PlugInFixture.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 
+#include <algorithm>
 #include <cmath>
 #include <limits>
 #include <map>
@@ -55,10 +56,18 @@ public:
         look();
         return ScriptedFrontEnd::isKeyDown(virtual_key);
     }
-    void pumpEvents(unsigned) override { look(); }
+    void pumpEvents(unsigned milliseconds) override {
+        waits_ms.push_back(milliseconds);
+        look();
+    }
+    void viewShown(CQuarnView&, const quarn::ShownPicture&) override {
+        shown_before_wait.push_back(waits_ms.size());
+    }
 
     quarn::Session* session = nullptr;
-    std::map<int, KM_Light> lights; ///< all that ever shone, by their indices
+    std::vector<unsigned> waits_ms;
+    std::vector<std::size_t> shown_before_wait; ///< for each picture shown, the waits before it
+    std::map<int, KM_Light> lights;             ///< all that ever shone, by their indices
 
 private:
     void look() {
@@ -81,6 +90,8 @@ protected:
         ASSERT_TRUE(session->adoptProgramPlugIn().ok());
         Preview::SetUp();
         watching.session = session.get();
+        watching.waits_ms.clear();
+        watching.shown_before_wait.clear();
     }
     void TearDown() override { session.reset(); }
 
@@ -326,6 +337,31 @@ TEST_F(WatchedPreview, EachSunFrameShinesFromItsOwnPoint) {
         EXPECT_EQ(KM_LightStyle::world_directional, light.Style());
         EXPECT_TRUE(near(light.Location(), sunOfFrame(k), 0.0));
         EXPECT_TRUE(near(light.Direction(), KM_3dPoint::Origin - sunOfFrame(k), 0.0));
+    }
+}
+
+TEST_F(WatchedPreview, TheViewIsShownInItsModeBeforeTheFirstFrameAndOnceForEachFrame) {
+    for (const bool is_sun_study : {false, true}) {
+        for (const int frame : {-1, 1}) {
+            if (is_sun_study)
+                setUpSunFrames(3);
+            else
+                setUpCameraFrames(3);
+            watching.waits_ms.clear();
+            watching.shown_before_wait.clear();
+            ASSERT_EQ(CQuarnCommand::success, preview(frame));
+            // The host works on its events once for nothing, then after each frame.
+            ASSERT_FALSE(watching.waits_ms.empty());
+            EXPECT_EQ(0U, watching.waits_ms.front());
+            EXPECT_EQ(1, std::ranges::count(watching.waits_ms, 0U));
+            const std::size_t frames = frame < 0 ? 3 : 1;
+            ASSERT_EQ(1 + frames, watching.shown_before_wait.size());
+            EXPECT_EQ(0U, watching.shown_before_wait[0]);
+            EXPECT_EQ(1U, watching.shown_before_wait[1]);
+            if (frames == 3) {
+                EXPECT_LT(watching.shown_before_wait[1], watching.shown_before_wait[2]);
+            }
+        }
     }
 }
 
