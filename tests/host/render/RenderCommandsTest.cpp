@@ -96,6 +96,41 @@ TEST_F(RenderCommandsTest, SettingsAreKeptUntilTheyAreConfirmed) {
     EXPECT_EQ(window().settings.preview_samples, 16384);
 }
 
+TEST_F(RenderCommandsTest, SettingsTakeTheirLimitsAndNothingBeyond) {
+    const auto set = [this](const std::wstring& settings) {
+        return run((L"RenderSettings " + settings + L" _Enter").c_str());
+    };
+    const RenderSettings before = window().settings;
+    for (const wchar_t* beyond :
+         {L"Size 0 10", L"Size 10 0", L"Size -1 10", L"Size 16385 10", L"Size 10 16385",
+          L"Size 10.5 10", L"Size ten ten", L"Samples 0", L"Samples -1", L"Samples 16385",
+          L"Samples 1.5", L"PreviewSamples 0", L"PreviewSamples 16385"}) {
+        EXPECT_EQ(set(beyond), CQuarnCommand::cancel) << KM_wString(beyond).ToUtf8();
+        EXPECT_TRUE(window().settings == before) << KM_wString(beyond).ToUtf8();
+    }
+    EXPECT_EQ(set(L"Size 16384 16384 Samples 16384 PreviewSamples 16384"), CQuarnCommand::success);
+    EXPECT_EQ(window().settings.height_px, 16384);
+    EXPECT_EQ(set(L"Size 1 1 Samples 1 PreviewSamples 1"), CQuarnCommand::success);
+    ASSERT_EQ(run(L"_Render"), CQuarnCommand::success) << printed();
+    EXPECT_EQ(window().picture.rgba.size(), 4U);
+}
+
+TEST_F(RenderCommandsTest, ClosingAWindowThatNeverOpenedSucceeds) {
+    ASSERT_FALSE(window().isOpen());
+    EXPECT_EQ(run(L"_CloseRenderWindow"), CQuarnCommand::success);
+}
+
+TEST_F(RenderCommandsTest, AFolderThatTakesNoFilesIsToldAndTheWindowStaysOpen) {
+    ASSERT_EQ(run(L"_RenderPreview"), CQuarnCommand::success);
+    EXPECT_EQ(save("/proc/self/a.png"), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("Cannot write '/proc/self/a.png'"));
+    EXPECT_TRUE(window().isOpen());
+    // What could not be saved there can be saved elsewhere, and a new one can be rendered.
+    EXPECT_EQ(save(folder.path() / "a.png"), CQuarnCommand::success) << printed();
+    EXPECT_EQ(save("/proc/self/a.png"), CQuarnCommand::failure);
+    EXPECT_EQ(run(L"_RenderPreview"), CQuarnCommand::success) << printed();
+}
+
 TEST_F(RenderCommandsTest, EmptyDocumentIsRendered) {
     ASSERT_EQ(run(L"New"), CQuarnCommand::success);
     EXPECT_EQ(window().settings.width_px, 1280) << "settings are the document's";
