@@ -41,10 +41,11 @@ DisplayModeAttributes wireframe() {
     attributes.draws_edges = true;
     attributes.draws_outlines = true;
     attributes.shows_hidden_lines = true;
-    attributes.edge_width_px = 0.9F;
-    attributes.outline_width_px = 1.1F;
-    attributes.edge_strength = 0.72F;
-    attributes.far_strength = 0.45F;
+    attributes.edge_width_px = 1.0F;
+    attributes.outline_width_px = 1.3F;
+    attributes.edge_strength = 0.85F;
+    attributes.edge_color = {24, 28, 36, 255};
+    attributes.far_strength = 0.50F;
     attributes.crowded_strength = 1.0F;
     return attributes;
 }

@@ -8,12 +8,12 @@ namespace quarn {
 namespace {
 
 /// Strong enough to be seen as a tone, however many lines there are.
-constexpr float weakest = 0.10F;
+constexpr float weakest = 0.12F;
 
 float strengthAt(float covered) {
     if (covered <= LineCrowding::sparse)
         return 1.0F;
-    return std::max(weakest, std::pow(LineCrowding::sparse / covered, 0.62F));
+    return std::max(weakest, std::pow(LineCrowding::sparse / covered, 0.56F));
 }
 
 int cellOf(float place, int count) {

@@ -86,7 +86,7 @@ struct MeshLineStyles {
           outlines{mode.edge_color, 1.0F, mode.edge_width_px, mode.outline_width_px} {
         inner.crowded = mode.crowded_strength;
         creases.crowded = mode.crowded_strength;
-        outlines.crowded = 0.75F * mode.crowded_strength;
+        outlines.crowded = 0.55F * mode.crowded_strength;
         for (LineStyle* const style : {&inner, &creases, &outlines})
             style->covered_strength = mode.covered_strength;
         creases.hidden_by_pixel = false;

@@ -222,6 +222,41 @@ TEST(Wireframe, DenseMeshesStayLight) {
     }
 }
 
+/// Folds along x over [-4, 4]^2, so steep that each is a crease.
+KM_Mesh foldedSheet(int folds) {
+    KM_Mesh mesh;
+    for (int i = 0; i <= folds; ++i)
+        for (const float x : {-4.0F, 4.0F})
+            mesh.m_V.emplace_back(x,
+                                  -4.0F + 8.0F * static_cast<float>(i) / static_cast<float>(folds),
+                                  i % 2 == 0 ? 0.0F : 0.1F);
+    for (std::uint32_t i = 0; i < 2 * static_cast<std::uint32_t>(folds); i += 2) {
+        mesh.m_F.push_back({{i, i + 1, i + 3}});
+        mesh.m_F.push_back({{i, i + 3, i + 2}});
+    }
+    return mesh;
+}
+
+// Folds stand 4 pixels apart; the pane's border at x = -1 crosses them.
+TEST(Wireframe, AnOutlineStandsOutFromACrowdOfCreases) {
+    SceneContent content;
+    addMesh(content, foldedSheet(40));
+    addMesh(content, floorMesh(-1.0F, -3.0F, 1.0F, 3.0F, 0.0F));
+    const Image image = drawn(content, topView(5.0), modeNamed(L"Wireframe"), 200, 200);
+    const double paper = brightness(image, 1, 1);
+    const auto inkBetween = [&](int left, int right) {
+        double sum = 0.0;
+        for (int y = 80; y < 120; ++y)
+            for (int x = left; x < right; ++x)
+                sum += paper - brightness(image, x, y);
+        return sum / (40.0 * (right - left));
+    };
+    const double crowd = inkBetween(50, 70);
+    EXPECT_GT(crowd, 12.0);
+    EXPECT_LT(crowd, 60.0);
+    EXPECT_GT(inkBetween(79, 81), 2.5 * crowd);
+}
+
 TEST(Shaded, EdgesAreOffUntilTheyAreChosen) {
     SceneContent content;
     addMesh(content, boxMesh({-3.0, -3.0, 0.0}, {3.0, 3.0, 1.0}), {200, 200, 200, 255});
