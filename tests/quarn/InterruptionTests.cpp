@@ -5,6 +5,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <regex>
+#include <thread>
 
 namespace quarn::test {
 namespace {
@@ -16,11 +17,21 @@ using testing::StartsWith;
 
 constexpr int ENDLESS = 100000;
 
-int picturesIn(const std::filesystem::path& folder) {
+int picturesIn(const std::filesystem::path& folder, const std::string& format = "jpg") {
     int count = 0;
-    for (const std::string& name : filesIn(folder))
-        count += name.ends_with(".jpg");
+    if (std::filesystem::exists(folder))
+        for (const std::string& name : filesIn(folder))
+            count += name.ends_with("." + format);
     return count;
+}
+
+/// Nothing is in the folder but whole pictures and the page; what a killed program was writing has
+/// a hidden name.
+void expectWholePicturesIn(const std::filesystem::path& folder) {
+    for (const std::string& name : filesIn(folder))
+        EXPECT_TRUE(name == "house.html" || name.starts_with('.') ||
+                    readPictureHeader(folder / name).has_value())
+            << name;
 }
 
 class StopSignal : public testing::TestWithParam<int> {};
@@ -43,12 +54,50 @@ TEST_P(StopSignal, LeavesWholePicturesAndAPageThatPlaysThem) {
                                       "frames; out/house.html"));
     EXPECT_THAT(readFile(studio / "out/house.html"),
                 HasSubstr("ImageCount = " + std::to_string(count) + ";"));
-    for (const std::string& name : filesIn(studio / "out"))
-        EXPECT_TRUE(name == "house.html" || readPictureHeader(studio / ("out/" + name)).has_value())
-            << name;
+    expectWholePicturesIn(studio / "out");
 }
 
 INSTANTIATE_TEST_SUITE_P(Interruption, StopSignal, testing::Values(SIGINT, SIGTERM));
+
+TEST(Interruption, LeavesOffThePictureThatIsBeingRendered) {
+    const Studio studio;
+    RunningProgram program(
+        studio.turntable(ENDLESS, {"--mode", "RenderFull", "--size", "200x150"}));
+    ASSERT_TRUE(
+        program.waitUntil([&] { return std::filesystem::exists(studio / "out/house001.jpg"); }));
+    program.sendSignal(SIGINT);
+    const Ended ended = program.wait();
+    EXPECT_EQ(ended.exit_code, 130);
+    const int count = picturesIn(studio / "out");
+    EXPECT_GE(count, 2);
+    EXPECT_THAT(ended.err, StartsWith("Stopped after " + std::to_string(count) + " of 100000 "));
+    EXPECT_THAT(readFile(studio / "out/house.html"),
+                HasSubstr("ImageCount = " + std::to_string(count) + ";"));
+    expectWholePicturesIn(studio / "out");
+}
+
+/// Formats whose files tell that they end too early.
+class KilledRecording : public testing::TestWithParam<const char*> {};
+
+TEST_P(KilledRecording, LeavesWholePicturesOnlyAndCanBeMadeAgain) {
+    const Studio studio;
+    const std::vector<std::string> options = {"--format", GetParam(), "--size", "640x480"};
+    for (const int later_ms : {0, 1, 3, 6, 10}) {
+        RunningProgram program(studio.turntable(ENDLESS, options));
+        ASSERT_TRUE(program.waitUntil([&] { return picturesIn(studio / "out", GetParam()) >= 3; }));
+        std::this_thread::sleep_for(std::chrono::milliseconds(later_ms));
+        program.sendSignal(SIGKILL);
+        EXPECT_EQ(program.wait().killed_by, SIGKILL);
+        EXPECT_GE(picturesIn(studio / "out", GetParam()), 3);
+        expectWholePicturesIn(studio / "out");
+        EXPECT_EQ(run(studio.turntable(1, options)).exit_code, 0);
+        expectWholePicturesIn(studio / "out");
+        std::filesystem::remove_all(studio / "out");
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(Formats, KilledRecording, testing::Values("jpg", "png", "bmp"),
+                         [](const auto& format) { return std::string(format.param); });
 
 TEST(Interruption, SecondCtrlCEndsTheProgramAtOnce) {
     const Studio studio;

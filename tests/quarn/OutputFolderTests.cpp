@@ -178,6 +178,30 @@ TEST(RenderMethod, RecordsPicturesOfTheSizeThatIsAskedFor) {
     }
 }
 
+TEST(RenderMethod, FullDiskIsToldAndNoMoreIsRendered) {
+    const Studio studio;
+    Start start = studio.turntable(
+        100000, {"--mode", "RenderPreview", "--size", "160x120", "--format", "bmp"});
+    start.largest_file = 50000; // less than one picture
+    const Ended ended = run(start);
+    EXPECT_EQ(ended.exit_code, 1);
+    EXPECT_THAT(linesOf(ended.err), SizeIs(1)) << ended.err;
+    EXPECT_EQ(framesTold(ended.err, 100000), 0) << ended.err;
+    EXPECT_THAT(ended.err, HasSubstr("house000.bmp': the file would be larger than is allowed"));
+    EXPECT_EQ(picturesIn(studio / "out"), 0);
+}
+
+TEST(RenderMethod, APageThatCannotBeWrittenIsToldWithTheReason) {
+    const Studio studio;
+    std::filesystem::create_directories(studio / "out/house.html");
+    const Ended ended = run(studio.turntable(2, {"--mode", "RenderPreview", "--size", "40x24"}));
+    EXPECT_EQ(ended.exit_code, 1);
+    EXPECT_THAT(linesOf(ended.err), SizeIs(1)) << ended.err;
+    EXPECT_THAT(ended.err, HasSubstr("all frames were written, but the page out/house.html"));
+    EXPECT_THAT(ended.err, testing::Not(HasSubstr("Command:")));
+    EXPECT_EQ(picturesIn(studio / "out"), 2);
+}
+
 TEST(RenderMethod, SizeThatNoMemoryHoldsTellsThatNoFrameWasWritten) {
     const Studio studio;
     Start start = studio.turntable(2, {"--mode", "RenderFull", "--size", "5000x5000"});

@@ -23,12 +23,14 @@ std::vector<std::string> recorded(const Start& start, const std::filesystem::pat
     return contents;
 }
 
-/// Turntables of one model in a display mode.
+/// Turntables of one model in a display mode, or rendered.
 class SameFrames : public testing::TestWithParam<const char*> {
 protected:
     Start turntable(const std::string& out) const {
-        return studio.turntable(
-            frames, {"--mode", GetParam(), "--format", "png", "--size", "160x100", "--out", out});
+        const bool is_rendered =
+            std::string(GetParam()).starts_with("Render") && std::string(GetParam()) != "Rendered";
+        return studio.turntable(frames, {"--mode", GetParam(), "--format", "png", "--size",
+                                         is_rendered ? "61x40" : "160x100", "--out", out});
     }
     std::vector<std::string> recordedInto(const std::string& out) const {
         return recorded(turntable(out), studio / out);
@@ -75,8 +77,13 @@ TEST_P(SameFrames, ComeWhereNumbersHaveADecimalComma) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Modes, SameFrames,
-                         testing::Values("Shaded", "Rendered", "Wireframe", "Drawing", "Clay"),
-                         [](const auto& mode) { return std::string(mode.param); });
+                         testing::Values("Wireframe", "Shaded", "Rendered", "Translucent", "X-Ray",
+                                         "Drawing", "Clay", "RenderFull", "RenderPreview"),
+                         [](const auto& mode) {
+                             std::string name = mode.param;
+                             std::erase(name, '-');
+                             return name;
+                         });
 
 } // namespace
 } // namespace quarn::test
