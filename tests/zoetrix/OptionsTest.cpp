@@ -59,6 +59,24 @@ KM_UUID modeNamed(const wchar_t* english_name) {
 
 using Texts = std::vector<std::wstring>;
 
+/// A display mode as a host of other modes would have it, for as long as the object lives.
+class ChangedMode {
+public:
+    explicit ChangedMode(const wchar_t* english_name)
+        : m_mode(const_cast<CDisplayPipelineAttributes*>(
+              CQuarnDisplayAttrsMgr::FindDisplayAttrs(modeNamed(english_name)))),
+          m_before(*m_mode) {}
+    ~ChangedMode() { *m_mode = m_before; }
+    ChangedMode(const ChangedMode&) = delete;
+    ChangedMode& operator=(const ChangedMode&) = delete;
+
+    CDisplayPipelineAttributes* operator->() const { return m_mode; }
+
+private:
+    CDisplayPipelineAttributes* m_mode;
+    CDisplayPipelineAttributes m_before;
+};
+
 } // namespace
 
 TEST_F(Options, EnterAtEveryPromptKeepsAllButTheViewport) {
@@ -178,6 +196,47 @@ TEST_F(Options, SunStudiesAreOfferedNoWireframe) {
     EXPECT_EQ(Texts({L"RenderFull", L"RenderPreview", L"RenderedViewport", L"Clay"}), optionsOf(1));
     EXPECT_EQ(CQuarnCommand::failure, ask({L"_Enter", L"_Wireframe"}, true));
     EXPECT_EQ(CQuarnCommand::failure, ask({L"_Enter", L"_Shaded"}, true));
+}
+
+TEST_F(Options, SunStudiesAreOfferedShadedModesWithLightsOrShadowsAlone) {
+    const ChangedMode wireframe(L"Wireframe");
+    wireframe->m_uses_document_lights = wireframe->m_casts_shadows = true;
+    const ChangedMode lit(L"Shaded");
+    lit->m_uses_document_lights = true;
+    lit->m_casts_shadows = false;
+    const ChangedMode shadowed(L"Drawing");
+    shadowed->m_uses_document_lights = false;
+    shadowed->m_casts_shadows = true;
+    const ChangedMode dark(L"Clay");
+    dark->m_uses_document_lights = dark->m_casts_shadows = false;
+
+    const Texts expected = {L"RenderFull", L"RenderPreview", L"Shaded", L"RenderedViewport",
+                            L"Drawing"};
+    EXPECT_EQ(CQuarnCommand::success, ask({L"_Enter", L"_Enter", L"_Enter", L"_Enter"}, true));
+    EXPECT_EQ(expected, optionsOf(1));
+
+    KM_ClassArray<KM_wString> types, methods, views;
+    KM_SimpleArray<KM_UUID> ids;
+    int type = 0, method = 0, view_index = 0;
+    EXPECT_TRUE(GetDailogAnimationOptions(props, types, type, methods, method, views, view_index,
+                                          ids, true));
+    ASSERT_EQ(static_cast<int>(expected.size()), methods.Count());
+    for (int i = 0; i < methods.Count(); ++i)
+        EXPECT_EQ(expected[static_cast<std::size_t>(i)], methods[i].View());
+    EXPECT_EQ(3, ids.Count());
+}
+
+TEST_F(Options, ModesAreNamedWithoutTheCharactersThatOptionsDoNotHold) {
+    const ChangedMode ghosted(L"Translucent");
+    ghosted->m_local_name = L"Ghost_ed - View, 2";
+    ghosted->m_english_name = L"Ghosted";
+    const ChangedMode rendered(L"Rendered");
+    rendered->m_local_name = L"REN-dered";
+    EXPECT_EQ(CQuarnCommand::success, askMethod(L"_ghosted"));
+    EXPECT_EQ(L"GhostedView2", props.CaptureMethod().View());
+    EXPECT_EQ(ghosted->m_id, props.DisplayMode());
+    EXPECT_EQ(L"RenderedViewport", optionsOf(1).at(4));
+    EXPECT_EQ(L"GhostedView2", optionsOf(1).at(5));
 }
 
 TEST_F(Options, ModeThatShowsNoSunBecomesTheFirstOneThatDoesByNameOnly) {
