@@ -106,7 +106,7 @@ void setGround(FrameSetup& frame) {
     frame.ground_fade_end = 12.0F * reach;
     // Far ground lies in the haze of the horizon, so that both meet without a line.
     std::copy_n(frame.sky_horizon, 3, frame.sky_nadir);
-    set(frame.ground_albedo, {0.46F, 0.45F, 0.425F});
+    set(frame.ground_albedo, {0.49F, 0.48F, 0.455F});
 }
 
 void setStyle(FrameSetup& frame, SurfaceStyle style, bool shows_panes) {

@@ -142,11 +142,11 @@ struct TimeOfDay {
 };
 
 AmbientLight skyLight(const TimeOfDay& time, const float* toward_sun) {
-    const LinearColor above = time.among({{0.36F, 0.43F, 0.54F},
+    const LinearColor above = time.among({{0.37F, 0.42F, 0.50F},
                                           {0.31F, 0.32F, 0.41F},
                                           {0.170F, 0.185F, 0.265F},
                                           {0.072F, 0.090F, 0.142F}});
-    const LinearColor below = time.among({{0.19F, 0.175F, 0.155F},
+    const LinearColor below = time.among({{0.26F, 0.225F, 0.185F},
                                           {0.15F, 0.13F, 0.12F},
                                           {0.075F, 0.070F, 0.080F},
                                           {0.028F, 0.033F, 0.052F}});

@@ -222,6 +222,18 @@ TEST(Wireframe, DenseMeshesStayLight) {
     }
 }
 
+// A grey wall that looks north, and the sun in the south: what it has is from sky and ground.
+TEST(Rendered, AWallInShadeIsNeitherBlueNorDull) {
+    SceneContent content;
+    addMesh(content, boxMesh({-3.0, -3.0, 0.0}, {3.0, 3.0, 4.0}));
+    content.lights.push_back(sunLight({0.0, 1.0, -1.0}));
+    const KM_Viewport viewport = perspectiveView({0.0, 14.0, 2.0}, {0.0, 3.0, 2.0});
+    const Image image = drawn(content, viewport, modeNamed(L"Rendered"), 100, 100);
+    EXPECT_LT(lightAt(image, 2), 1.15 * lightAt(image, 0));
+    EXPECT_GT(lightAt(image, 1), 0.18); // of the 0.60 that the grey sends back in full light
+    EXPECT_LT(lightAt(image, 1), 0.30);
+}
+
 /// Folds along x over [-4, 4]^2, so steep that each is a crease.
 KM_Mesh foldedSheet(int folds) {
     KM_Mesh mesh;
