@@ -25,15 +25,24 @@ constexpr std::uintmax_t most_bytes = 256ULL << 20;
 constexpr const char* too_large =
     "it is too large: more than 64 million pixels, or more than 16384 in a row";
 
-/// Why the last picture could not be decoded: it is wider or higher than is read at all.
-bool isTooLarge() {
-    const char* const reason = stbi_failure_reason();
-    return reason != nullptr && std::string_view(reason) == "too large";
-}
-
 struct FreePixels {
     void operator()(stbi_uc* pixels) const { stbi_image_free(pixels); }
 };
+
+using Pixels = std::unique_ptr<stbi_uc, FreePixels>;
+
+/// Why a picture whose size cannot be told cannot be read. Only the attempt to read all of it says
+/// whether that is so for its size.
+const char* whyUnknown(std::span<const std::uint8_t> bytes) {
+    int unused = 0;
+    const Pixels pixels(stbi_load_from_memory(bytes.data(), static_cast<int>(bytes.size()), &unused,
+                                              &unused, &unused, 4));
+    const char* const reason = stbi_failure_reason();
+    const bool is_too_large = reason != nullptr && std::string_view(reason) == "too large";
+    return pixels == nullptr && is_too_large
+               ? too_large
+               : "it is not a picture of a known kind (PNG, JPEG, BMP, TGA, GIF)";
+}
 
 } // namespace
 
@@ -46,17 +55,14 @@ Result<Texture> decodeTexture(std::span<const std::uint8_t> bytes) {
     int height = 0;
     int channels = 0;
     if (stbi_info_from_memory(bytes.data(), size, &width, &height, &channels) == 0) {
-        return Error{isTooLarge()
-                         ? too_large
-                         : "it is not a picture of a known kind (PNG, JPEG, BMP, TGA, GIF)"};
+        return Error{whyUnknown(bytes)};
     }
     if (static_cast<std::int64_t>(width) * height > most_pixels) {
         return Error{too_large};
     }
-    const std::unique_ptr<stbi_uc, FreePixels> pixels(
-        stbi_load_from_memory(bytes.data(), size, &width, &height, &channels, 4));
+    const Pixels pixels(stbi_load_from_memory(bytes.data(), size, &width, &height, &channels, 4));
     if (pixels == nullptr) {
-        return Error{isTooLarge() ? too_large : "the picture is damaged"};
+        return Error{"the picture is damaged"};
     }
     const std::size_t byte_count = 4 * static_cast<std::size_t>(width) * height;
     Texture texture;
