@@ -53,28 +53,80 @@ constexpr auto makeDigitOrders() {
 
 constexpr auto digit_orders = makeDigitOrders();
 
-/// A pixel's place along the Z-shaped curve through its square, with the four quarters of every
-/// square within it in an order of their own.
-std::uint32_t shuffledPlace(std::uint32_t x, std::uint32_t y, std::uint32_t seed) {
-    const std::uint32_t place = spread(x & 0xFFU) | spread(y & 0xFFU) << 1;
-    std::uint32_t shuffled = 0;
-    for (int shift = 2 * square_bits - 2; shift >= 0; shift -= 2) {
-        const std::uint32_t above = place >> shift >> 2;
-        const std::uint32_t pick =
-            scattered(above + (static_cast<std::uint32_t>(shift) << 16), seed);
-        shuffled = shuffled << 2 | digit_orders[pick % 24][place >> shift & 3U];
+/// Places along the Z-shaped curve through a square, with the four quarters of every square within
+/// it in an order of their own. All pixels of a tile share the way to it.
+class ShuffledTile {
+public:
+    ShuffledTile(std::uint32_t x, std::uint32_t y, std::uint32_t seed)
+        : m_tile((spread(x & 0xFFU) | spread(y & 0xFFU) << 1) >> tile_bits), m_seed(seed) {
+        for (int shift = 2 * square_bits - 2; shift >= tile_bits; shift -= 2)
+            m_start = m_start << 2 | digit(m_tile >> (shift - tile_bits), shift);
+        m_start <<= tile_bits;
+        for (std::uint32_t quarter = 0; quarter < 4; ++quarter) {
+            const std::uint32_t place = m_tile << 2 | quarter;
+            m_quarters[quarter] = digit(place, 2) << 2;
+            m_orders[quarter] = orderOf(place, 0);
+        }
     }
-    return shuffled;
-}
 
-void startPixel(std::uint32_t x, std::uint32_t y, int log2_length, int use, int lane,
-                TileSamples& samples) {
+    /// Where the tile begins.
+    std::uint32_t start() const { return m_start; }
+    /// How far behind that a pixel of it stands, 0 to 15.
+    std::uint32_t placeIn(int lane) const {
+        const auto column = static_cast<std::uint32_t>(lane % tile_size);
+        const auto row = static_cast<std::uint32_t>(lane / tile_size);
+        const std::uint32_t place = spread(column) | spread(row) << 1;
+        return m_quarters[place >> 2] | digit_orders[m_orders[place >> 2]][place & 3U];
+    }
+
+private:
+    static constexpr int tile_bits = 4;
+
+    std::uint32_t orderOf(std::uint32_t above, int shift) const {
+        return scattered(above + (static_cast<std::uint32_t>(shift) << 16), m_seed) % 24;
+    }
+    /// @param place  from the digit on upward
+    std::uint32_t digit(std::uint32_t place, int shift) const {
+        return digit_orders[orderOf(place >> 2, shift)][place & 3U];
+    }
+
+    std::uint32_t m_tile;
+    std::uint32_t m_seed;
+    std::uint32_t m_start = 0;
+    std::uint32_t m_quarters[4] = {};
+    std::uint32_t m_orders[4] = {};
+};
+
+/// The coordinates of the sixteen stretches behind each other, which are those of every tile but
+/// for what the tile's start adds: coordinates of a sum without carries are those of its parts
+/// together.
+struct StretchCoordinates {
+    explicit StretchCoordinates(int log2_length) {
+        for (std::uint32_t i = 0; i < lane_count; ++i) {
+            first[i] = firstCoordinate(i << log2_length);
+            second[i] = secondCoordinate(i << log2_length);
+        }
+    }
+    std::uint32_t first[lane_count];
+    std::uint32_t second[lane_count];
+};
+
+void startUse(std::uint32_t x, std::uint32_t y, int log2_length, int use,
+              const StretchCoordinates& stretches, TileSamples& samples) {
     const auto seed = static_cast<std::uint32_t>(use);
     const std::uint32_t square = scattered(scattered(x >> square_bits, y >> square_bits), seed);
-    const std::uint32_t start = shuffledPlace(x, y, square) << log2_length;
-    samples.order[use][lane] = scattered(scattered(x, y), seed);
-    samples.first[use][lane] = firstCoordinate(start) ^ scattered(square, 1);
-    samples.second[use][lane] = secondCoordinate(start) ^ scattered(square, 2);
+    const ShuffledTile tile(x, y, square);
+    const std::uint32_t start = tile.start() << log2_length;
+    const std::uint32_t first = firstCoordinate(start) ^ scattered(square, 1);
+    const std::uint32_t second = secondCoordinate(start) ^ scattered(square, 2);
+    for (int lane = 0; lane < lane_count; ++lane) {
+        const auto column = static_cast<std::uint32_t>(lane % tile_size);
+        const auto row = static_cast<std::uint32_t>(lane / tile_size);
+        const std::uint32_t place = tile.placeIn(lane);
+        samples.order[use][lane] = scattered(scattered(x + column, y + row), seed);
+        samples.first[use][lane] = first ^ stretches.first[place];
+        samples.second[use][lane] = second ^ stretches.second[place];
+    }
 }
 
 std::uint32_t reversed(std::uint32_t number, int bits) {
@@ -114,11 +166,10 @@ SampleSequence::SampleSequence(int samples) {
 }
 
 void startTile(int x, int y, int log2_length, TileSamples& samples) {
-    for (int lane = 0; lane < lane_count; ++lane)
-        for (int use = 0; use < sample_use_count; ++use)
-            startPixel(static_cast<std::uint32_t>(x + lane % tile_size),
-                       static_cast<std::uint32_t>(y + lane / tile_size), log2_length, use, lane,
-                       samples);
+    const StretchCoordinates stretches(log2_length);
+    for (int use = 0; use < sample_use_count; ++use)
+        startUse(static_cast<std::uint32_t>(x), static_cast<std::uint32_t>(y), log2_length, use,
+                 stretches, samples);
 }
 
 } // namespace quarn

@@ -179,5 +179,22 @@ TEST(SampleSequence, PixelsOfATileHaveStretchesOfTheirOwn) {
     }
 }
 
+TEST(SampleSequence, PixelsOfASquareShareTheSequenceOut) {
+    // The sixteen tiles of a 16 by 16 square are an aligned run of 256 stretches of 2^3 places:
+    // bits 3 to 10 of where they begin take each value once, and with them, mirrored, bits 28 to 21
+    // of the first coordinate.
+    for (const int use : {0, 1, 2}) {
+        std::set<std::uint32_t> values;
+        for (int y = 32; y < 48; y += tile_size)
+            for (int x = 64; x < 80; x += tile_size) {
+                TileSamples samples;
+                startTile(x, y, 3, samples);
+                for (const std::uint32_t first : samples.first[use])
+                    values.insert(first >> 21 & 0xFFU);
+            }
+        EXPECT_EQ(values.size(), 256U) << use;
+    }
+}
+
 } // namespace
 } // namespace quarn
