@@ -53,6 +53,12 @@ inline bool isPaved(double x, double y, double half_tile) {
     return !under_pavilion && !under_basin;
 }
 
+/// What fills the joints of the paving.
+inline void addPavingBed(ModelWriter& model) {
+    model.beginObject("Paving bed", "mortar");
+    addBox(model, {-15.6, -15.6, -0.035}, {15.6, 15.6, -0.009});
+}
+
 /// Tiles of three tones: rings around the basin, a grid with darker bands elsewhere.
 inline void addPaving(ModelWriter& model) {
     constexpr int count = 40;
@@ -120,6 +126,15 @@ inline void addTree(ModelWriter& model, const std::string& name, const Vec& foot
         branches.push_back({{out * std::cos(a), out * std::sin(a), up},
                             height * (0.19 + 0.04 * scattered(seed + 30 + i))});
     }
+    constexpr int above = 4;
+    for (unsigned i = 0; i < above; ++i) {
+        const double a =
+            2.0 * std::numbers::pi * (i + 0.5 + 0.3 * scattered(seed + 50 + i)) / above;
+        const double out = height * (0.13 + 0.03 * scattered(seed + 60 + i));
+        const double up = height * (0.71 + 0.06 * scattered(seed + 70 + i));
+        branches.push_back({{out * std::cos(a), out * std::sin(a), up},
+                            height * (0.13 + 0.03 * scattered(seed + 80 + i))});
+    }
     for (const Branch& branch : branches) {
         addBar(model, foot + Vec{0, 0, fork - 0.05}, foot + branch.tip, 0.07);
     }
@@ -129,7 +144,7 @@ inline void addTree(ModelWriter& model, const std::string& name, const Vec& foot
         for (std::size_t i = tone; i < branches.size(); i += 3) {
             const double s = branches[i].size;
             addBlob(model, foot + branches[i].tip, {s, s, 0.82 * s},
-                    seed + 40 + static_cast<unsigned>(i));
+                    seed + 40 + static_cast<unsigned>(i), 0.08);
         }
     }
 }
@@ -212,6 +227,7 @@ inline void addHedge(ModelWriter& model, const Vec& low, const Vec& high) {
 
 inline void add(ModelWriter& model) {
     addGround(model);
+    addPavingBed(model);
     addPaving(model);
     addBasin(model);
     addGardenWall(model, "South wall west", {-15.5, -15.5, 0}, {-2.2, -15.5, 0});

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "examples/pavilion/Figures.h"
 #include "examples/pavilion/Garden.h"
 #include "examples/pavilion/Houses.h"
 #include "examples/pavilion/Temple.h"
@@ -31,7 +32,10 @@ inline constexpr Paint paints[] = {
     {"hedge", "0.29 0.42 0.22"},         {"cypress", "0.22 0.36 0.23"},
     {"leaves", "0.38 0.53 0.24"},        {"leaves_deep", "0.31 0.46 0.23"},
     {"leaves_light", "0.48 0.61 0.28"},  {"bark", "0.40 0.30 0.22"},
-    {"iron", "0.17 0.18 0.20"},          {"lamp", "0.99 0.93 0.74"}};
+    {"iron", "0.17 0.18 0.20"},          {"lamp", "0.99 0.93 0.74"},
+    {"mortar", "0.66 0.60 0.52"},        {"skin", "0.83 0.66 0.55"},
+    {"cloth_dark", "0.24 0.25 0.29"},    {"coat_red", "0.66 0.25 0.22"},
+    {"coat_blue", "0.25 0.38 0.55"},     {"coat_ochre", "0.85 0.67 0.35"}};
 
 inline bool writeMaterials(const std::filesystem::path& path) {
     std::ofstream file(path, std::ios::binary);
@@ -47,6 +51,7 @@ inline bool writeModel(const std::filesystem::path& path) {
     garden::add(model);
     temple::add(model);
     houses::add(model);
+    figures::add(model);
     model.polyline("Walk", walk::points());
     std::ofstream file(path, std::ios::binary);
     model.write(file, "pavilion.mtl");

@@ -131,15 +131,17 @@ inline double scattered(unsigned seed) {
 /// A ball whose surface swells and sinks a little, like the crown of a tree.
 inline void addBlob(ModelWriter& model, const Vec& centre, const Vec& radii, unsigned seed,
                     double roughness = 0.10) {
-    constexpr int around = 20;
-    constexpr int rings = 12;
+    constexpr int around = 32;
+    constexpr int rings = 18;
     const double shift = 6.0 * scattered(seed);
     const auto place = [&](double turn, double rise) {
         const double a = 2.0 * std::numbers::pi * turn;
         const double b = std::numbers::pi * (rise - 0.5);
-        const double swell = 1.0 + roughness * std::cos(b) *
-                                       (std::sin(5.0 * a + shift + 3.0 * b) +
-                                        0.7 * std::sin(3.0 * a - 2.0 * shift - 7.0 * b));
+        const double swell =
+            1.0 + roughness * std::cos(b) *
+                      (std::sin(5.0 * a + shift + 3.0 * b) +
+                       0.7 * std::sin(3.0 * a - 2.0 * shift - 7.0 * b) +
+                       0.6 * std::sin(9.0 * a + 2.0 * shift) * std::sin(8.0 * b + shift));
         return centre + Vec{radii.x * swell * std::cos(b) * std::cos(a),
                             radii.y * swell * std::cos(b) * std::sin(a),
                             radii.z * swell * std::sin(b)};
