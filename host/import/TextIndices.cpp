@@ -35,10 +35,49 @@ bool readNumber(std::string_view word, std::uint64_t& number) {
     return failure != std::errc::invalid_argument && rest == end;
 }
 
+/// Whether so many words stand on a line; faster than taking them one by one.
+bool hasWords(std::string_view line, std::size_t wanted) {
+    std::size_t count = 0;
+    bool was_blank = true;
+    for (const char c : line) {
+        const bool is_blank = c == ' ' || c == '\t' || c == '\r';
+        count += was_blank && !is_blank ? 1 : 0;
+        was_blank = is_blank;
+    }
+    return count >= wanted;
+}
+
+/// Takes a number of at most ten digits and the blanks before it.
+/// @return the number, or one that is larger than any index
+std::uint64_t takeShortNumber(const char*& at, const char* end) {
+    while (at != end && *at == ' ') {
+        ++at;
+    }
+    const char* const begin = at;
+    std::uint64_t number = 0;
+    while (at != end && *at >= '0' && *at <= '9' && at - begin < 10) {
+        number = 10 * number + static_cast<std::uint64_t>(*at++ - '0');
+    }
+    return at == begin || (at != end && *at != ' ' && *at != '\r') ? UINT64_MAX : number;
+}
+
 /// Checks the lines of faces: a count, and so many indices.
 class FaceCheck {
 public:
     explicit FaceCheck(std::uint64_t vertices) : m_vertices(vertices) {}
+
+    /// Whether a line is one of the usual ones, which are in order. Of any other one nothing is
+    /// said.
+    bool isUsual(std::string_view line) const {
+        const char* at = line.data();
+        const char* const end = at + line.size();
+        const std::uint64_t count = takeShortNumber(at, end);
+        bool is_usual = count <= line.size();
+        for (std::uint64_t i = 0; is_usual && i < count; ++i) {
+            is_usual = takeShortNumber(at, end) < m_vertices;
+        }
+        return is_usual;
+    }
 
     /// @return what is wrong with the list that begins with the next word; empty when nothing is
     std::string check(LineWords& words, bool holds_indices) const {
@@ -90,6 +129,7 @@ public:
 
     std::string why() {
         for (const PlyElement& element : m_header.elements) {
+            const Kind kind = kindOf(element);
             for (std::uint64_t i = 0; i < element.count; ++i) {
                 std::string_view line;
                 if (!m_lines.next(line)) {
@@ -97,7 +137,8 @@ public:
                            std::to_string(element.count) + " elements of kind '" + element.name +
                            "'";
                 }
-                const std::string why = whyBadLine(line, element);
+                const std::string why =
+                    isUsual(line, element, kind) ? std::string() : whyBadLine(line, element);
                 if (!why.empty()) {
                     return inLine(m_lines.number()) + why;
                 }
@@ -107,6 +148,24 @@ public:
     }
 
 private:
+    enum class Kind { indices, numbers, mixed };
+
+    static Kind kindOf(const PlyElement& element) {
+        if (!element.hasList()) {
+            return Kind::numbers;
+        }
+        const bool is_face = element.name == "face" && element.properties.size() == 1 &&
+                             namesVertices(element.properties.front());
+        return is_face ? Kind::indices : Kind::mixed;
+    }
+
+    /// A quick look at the lines that nearly all files are made of.
+    bool isUsual(std::string_view line, const PlyElement& element, Kind kind) const {
+        return kind == Kind::indices
+                   ? m_faces.isUsual(line)
+                   : kind == Kind::numbers && hasWords(line, element.properties.size());
+    }
+
     static std::uint64_t vertexCount(const PlyHeader& header) {
         for (const PlyElement& element : header.elements) {
             if (element.name == "vertex") {
