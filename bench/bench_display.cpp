@@ -39,7 +39,7 @@ constexpr PictureSize picture_sizes[] = {{"1280x720", 1280, 720}, {"1920x1080", 
 constexpr double budget_of_row_ms = 1500.0;
 
 std::string nameOf(const quarn::DisplayModeAttributes& mode) {
-    const std::wstring_view name = mode.english_name.View();
+    const std::wstring_view name = mode.english_name;
     return {name.begin(), name.end()};
 }
 

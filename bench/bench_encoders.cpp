@@ -51,7 +51,7 @@ void measure(const quarn::Image& image, const char* extension, const fs::path& f
             if (const auto encoded = encoder.encode(image, format); !encoded)
                 bench::fail(encoded.message());
         });
-        bench::keepBest(write_ms, [&] { bench::require(encoder.write(file, image)); });
+        bench::keepBest(write_ms, [&] { bench::require(encoder.write(file.c_str(), image)); });
         bench::keepBest(copy_ms, [&] {
             bench::require(quarn::writeFileAtomically(plain, std::as_bytes(std::span(image.rgba))));
         });

@@ -28,7 +28,6 @@ DisplayModeAttributes mode(const KM_UUID& id, const wchar_t* name, SurfaceStyle 
     DisplayModeAttributes attributes;
     attributes.id = id;
     attributes.english_name = name;
-    attributes.local_name = name;
     attributes.surface_style = style;
     return attributes;
 }

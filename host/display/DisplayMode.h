@@ -2,9 +2,9 @@
 
 #include "kelmar/KM_Color.h"
 #include "kelmar/KM_Uuid.h"
-#include "kelmar/KM_wString.h"
 
 #include <span>
+#include <string_view>
 
 namespace quarn {
 
@@ -36,8 +36,7 @@ enum class AntialiasingLevel : int {
 /// their mode's attributes and may change it.
 struct DisplayModeAttributes {
     KM_UUID id;
-    KM_wString english_name;
-    KM_wString local_name;
+    std::wstring_view english_name; ///< of a standard mode; lives as long as the program
     DisplayKind kind = DisplayKind::shaded;
     SurfaceStyle surface_style = SurfaceStyle::studio;
     bool uses_document_lights = false;

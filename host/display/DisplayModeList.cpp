@@ -29,7 +29,6 @@ CDisplayPipelineAttributes attributesOf(const DisplayModeAttributes& mode) {
     CDisplayPipelineAttributes attributes;
     attributes.m_id = mode.id;
     attributes.m_english_name = mode.english_name;
-    attributes.m_local_name = mode.local_name;
     attributes.m_mode_kind = static_cast<int>(mode.kind);
     attributes.m_uses_document_lights = mode.uses_document_lights;
     attributes.m_casts_shadows = mode.casts_shadows;

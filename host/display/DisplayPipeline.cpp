@@ -18,6 +18,9 @@ namespace {
 constexpr int block_width = EdgeMarks::block_width;
 constexpr int block_height = 32;
 
+/// After so many pictures of less than a quarter of the pixels the buffers of a large one go.
+constexpr int small_pictures_to_let_go = 64;
+
 bool isValidSize(int size) {
     return size >= 1 && size <= DisplayPipeline::max_size_px;
 }
@@ -67,6 +70,7 @@ Result<void> DisplayPipeline::draw(const DisplayScene& scene, const KM_Viewport&
         return Error{"The view cannot be drawn: its camera has no valid location, direction or "
                      "up. Set the camera again."};
 
+    makeRoom(width, height);
     FrameSetup frame = makeFrameSetup(scene, viewport, mode, width, height);
     image.resize(width, height);
     // Pixels are written as whole 32-bit words; the storage is aligned for them.
@@ -92,6 +96,22 @@ Result<void> DisplayPipeline::draw(const DisplayScene& scene, const KM_Viewport&
                      {frame.pixels, width, height, hides_lines ? depth_used : nullptr,
                       frame.rays.pixel_size, layers});
     return {};
+}
+
+/// Views of several sizes are drawn by turns, so one small picture says nothing.
+void DisplayPipeline::makeRoom(int width, int height) {
+    const std::int64_t pixels = std::int64_t{width} * height;
+    m_small_pictures = 4 * pixels < m_held_px ? m_small_pictures + 1 : 0;
+    if (m_small_pictures >= small_pictures_to_let_go) {
+        m_objects = std::vector<std::uint32_t>();
+        m_depth = DepthImage();
+        m_layers = std::vector<float>();
+        m_edges = EdgePixels();
+        m_free_sky = FreeSky();
+        m_held_px = 0;
+        m_small_pictures = 0;
+    }
+    m_held_px = std::max(m_held_px, pixels);
 }
 
 void DisplayPipeline::drawSurfaces(FrameSetup& frame, const DisplayModeAttributes& mode) {

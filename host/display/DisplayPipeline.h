@@ -18,7 +18,8 @@ class DisplayScene;
 struct RayKernel;
 
 /// Draws pictures of a scene. It keeps its buffers, so drawing many frames of one size asks for
-/// memory once. One picture at a time; the threads it uses have ended their work when a call
+/// memory once; after many pictures that are far smaller than an earlier one it lets the buffers of
+/// that one go. One picture at a time; the threads it uses have ended their work when a call
 /// returns. The same picture comes out for any number of threads.
 class DisplayPipeline {
 public:
@@ -43,7 +44,11 @@ public:
     /// How many pixels of the last picture were smoothed.
     std::size_t smoothedPixelCount() const { return m_smoothed; }
 
+    /// Pixels of the largest picture for which memory is held.
+    std::int64_t heldPixels() const { return m_held_px; }
+
 private:
+    void makeRoom(int width, int height);
     void drawSurfaces(struct FrameSetup& frame, const DisplayModeAttributes& mode);
 
     const RayKernel* m_kernel;
@@ -54,6 +59,8 @@ private:
     FreeSky m_free_sky;
     LineDrawing m_lines;
     std::size_t m_smoothed = 0;
+    std::int64_t m_held_px = 0;
+    int m_small_pictures = 0; ///< since the last that needed about as much as is held
 };
 
 } // namespace quarn

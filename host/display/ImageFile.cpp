@@ -22,6 +22,14 @@ std::string whyNotEncodable(const ImageView& image) {
                                            : "the picture's pixels do not fit its size";
 }
 
+/// With its dot; empty for a name without one, and for one that begins with its only dot.
+std::string_view extensionOf(std::string_view path) {
+    const std::string_view name = path.substr(path.rfind('/') + 1);
+    const std::size_t dot = name.rfind('.');
+    const bool has_extension = dot != std::string_view::npos && dot > 0 && name != "..";
+    return has_extension ? name.substr(dot) : std::string_view();
+}
+
 } // namespace
 
 std::optional<ImageFormat> imageFormatFor(std::string_view extension) {
@@ -42,6 +50,7 @@ std::optional<ImageFormat> imageFormatFor(std::string_view extension) {
 
 struct ImageEncoder::Buffers {
     JpegEncoder jpeg;
+    PngEncoder png;
     std::vector<std::byte> bytes;
 };
 
@@ -60,7 +69,7 @@ Result<std::span<const std::byte>> ImageEncoder::encode(const ImageView& image,
     }
     std::vector<std::byte>& bytes = m_buffers->bytes;
     bytes.clear();
-    const Result<void> encoded = format == ImageFormat::png   ? encodePng(image, bytes)
+    const Result<void> encoded = format == ImageFormat::png   ? m_buffers->png.encode(image, bytes)
                                  : format == ImageFormat::bmp ? encodeBmp(image, bytes)
                                                               : encodeTga(image, bytes);
     if (!encoded) {
@@ -69,21 +78,22 @@ Result<std::span<const std::byte>> ImageEncoder::encode(const ImageView& image,
     return std::span<const std::byte>(bytes);
 }
 
-Result<void> ImageEncoder::write(const std::filesystem::path& path, const ImageView& image) {
-    const auto format = imageFormatFor(path.extension().string());
+Result<void> ImageEncoder::write(const char* path, const ImageView& image) {
+    const std::string_view extension = extensionOf(path);
+    const auto format = imageFormatFor(extension);
     if (!format) {
-        return Error{"Cannot write '" + path.string() + "': pictures of the kind '" +
-                     path.extension().string() + "' are not known. Choose jpg, png, bmp or tga."};
+        return Error{"Cannot write '" + std::string(path) + "': pictures of the kind '" +
+                     std::string(extension) + "' are not known. Choose jpg, png, bmp or tga."};
     }
     const auto encoded = encode(image, *format);
     if (!encoded) {
-        return Error{"Cannot write '" + path.string() + "': " + encoded.message() + "."};
+        return Error{"Cannot write '" + std::string(path) + "': " + encoded.message() + "."};
     }
     return writeFileAtomically(path, encoded.value());
 }
 
 Result<void> writeImageFile(const std::filesystem::path& path, const ImageView& image) {
-    return ImageEncoder().write(path, image);
+    return ImageEncoder().write(path.c_str(), image);
 }
 
 } // namespace quarn

@@ -52,7 +52,7 @@ public:
     /// or not at all, and replaces one of the same name.
     /// @return an error that names the file: unknown extension, the picture cannot be encoded, the
     ///   folder is missing, no permission, the disk is full
-    Result<void> write(const std::filesystem::path& path, const ImageView& image);
+    Result<void> write(const char* path, const ImageView& image);
 
 private:
     struct Buffers;

@@ -1,8 +1,10 @@
 #pragma once
 
+#include "host/display/PictureScratch.h"
+
 #include <cstddef>
 #include <cstdint>
-#include <vector>
+#include <span>
 
 namespace quarn {
 
@@ -15,8 +17,9 @@ public:
     /// Lines that cover less than this part of a cell are drawn in full.
     static constexpr float sparse = 0.10F;
 
-    /// Starts anew for a picture of this size; keeps the storage.
-    void reset(int width, int height);
+    /// Starts anew for a picture of this size.
+    /// @param scratch  keeps the cells; must outlive their use
+    void reset(int width, int height, PictureScratch& scratch);
     /// Adds lines' area at a place of the picture. Different rows of cells may be filled by
     /// different threads.
     void add(float x, float y, float square_pixels);
@@ -33,7 +36,7 @@ private:
 
     int m_columns = 0;
     int m_rows = 0;
-    std::vector<float> m_cells;
+    std::span<float> m_cells;
 };
 
 } // namespace quarn

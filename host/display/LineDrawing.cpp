@@ -94,13 +94,6 @@ struct MeshLineStyles {
     }
 };
 
-void keepVisibleParts(const LineTarget& target, LineBatch& batch) {
-    const std::vector<ScreenSegment> all = batch.takeSegments();
-    VisibleParts parts(target);
-    for (const ScreenSegment& segment : all)
-        parts.add(segment, batch);
-}
-
 } // namespace
 
 bool LineDrawing::hasLines(const DisplayScene& scene, const DisplayModeAttributes& mode) {
@@ -114,8 +107,19 @@ bool LineDrawing::hasLines(const DisplayScene& scene, const DisplayModeAttribute
 void LineDrawing::list(Source source, std::size_t object, std::size_t count, const LineStyle& style,
                        float strength) {
     for (std::size_t begin = 0; begin < count; begin += lines_per_job)
-        m_jobs.push_back(
-            {source, object, begin, std::min(count, begin + lines_per_job), style, strength});
+        listPart({source, object, begin, std::min(count, begin + lines_per_job), strength}, style);
+}
+
+/// Many small objects share a task.
+void LineDrawing::listPart(const Part& part, const LineStyle& style) {
+    const std::size_t count = part.end - part.begin;
+    const bool joins = !m_jobs.empty() && m_jobs.back().style == style &&
+                       m_jobs.back().line_count + count <= lines_per_job;
+    if (!joins)
+        m_jobs.push_back({style, m_parts.size(), m_parts.size(), 0});
+    m_parts.push_back(part);
+    ++m_jobs.back().end_part;
+    m_jobs.back().line_count += count;
 }
 
 /// Style by style, so that lines of one style cover a pixel once, whichever objects they are of.
@@ -132,8 +136,6 @@ void LineDrawing::listMeshes(const DisplayScene& scene, const CameraRays& rays,
     if (mode.draws_all_edges)
         forEachMesh([&](std::size_t i, const DisplayScene::MeshObject& object) {
             const float strength = innerStrength(object, scene.origin(), rays);
-            if (strength <= weakest_drawn)
-                return;
             const MeshEdges& edges = object.mesh->edges();
             list(Source::flat, i, edges.flat().size(), styles.inner, strength);
             list(Source::smooth, i, edges.smooth().size(), styles.inner, strength);
@@ -180,67 +182,96 @@ void LineDrawing::listCurvesAndPoints(const DisplayScene& scene,
             list(Source::point, i, 1, {scene.points()[i].color, 1.0F, mode.point_size_px});
 }
 
-void LineDrawing::addMeshLines(const Job& job, const MeshLines& lines, const MeshEdges& edges,
+struct LineDrawing::Shared {
+    const DisplayScene& scene;
+    const CameraRays& rays;
+    const DisplayModeAttributes& mode;
+    const LineTarget& target;
+    const ScreenProjection projection;
+    const KM_3dVector frame_from_world;
+    const KM_BoundingBox box; ///< of what is shown, in the coordinates of the frame
+};
+
+void LineDrawing::addCurve(const Part& part, const Shared& shared, LineBatch& batch) {
+    const KM_3dPoint* const points = shared.scene.curves()[part.object].polyline.Array();
+    for (std::size_t i = part.begin; i < part.end; ++i)
+        addLine(shared.projection, Point3(points[i] + shared.frame_from_world),
+                Point3(points[i + 1] + shared.frame_from_world), batch);
+}
+
+void LineDrawing::addPoint(const Part& part, const Shared& shared, LineBatch& batch) {
+    const Point3 place(shared.scene.points()[part.object].location + shared.frame_from_world);
+    addLine(shared.projection, place, place, batch);
+}
+
+void LineDrawing::addMeshLines(const Part& part, const Shared& shared, VisibleParts* visible_parts,
                                LineBatch& batch) {
-    const std::size_t count = job.end - job.begin;
-    switch (job.source) {
+    const DisplayScene::MeshObject& object = shared.scene.meshes()[part.object];
+    const MeshEdges& edges = object.mesh->edges();
+    const DepthFade fade(part.strength, shared.mode.far_strength, shared.rays, shared.box);
+    const MeshLines lines(object, shared.rays, shared.projection, fade, visible_parts);
+    const std::size_t count = part.end - part.begin;
+    switch (part.source) {
     case Source::flat:
-        lines.addAll(edges.flat().subspan(job.begin, count), batch);
+        lines.addAll(edges.flat().subspan(part.begin, count), batch);
         break;
     case Source::smooth:
-        lines.addAll(edges.smooth().subspan(job.begin, count), batch);
+        lines.addAll(edges.smooth().subspan(part.begin, count), batch);
         break;
     case Source::creases:
-        lines.addInner(edges.features().subspan(job.begin, count), batch);
+        lines.addInner(edges.features().subspan(part.begin, count), batch);
         break;
     case Source::feature_outlines:
-        lines.addOutlines(edges.features().subspan(job.begin, count), batch);
+        lines.addOutlines(edges.features().subspan(part.begin, count), batch);
         break;
     default:
-        lines.addOutlines(edges.smooth().subspan(job.begin, count), batch);
+        lines.addOutlines(edges.smooth().subspan(part.begin, count), batch);
     }
+}
+
+void LineDrawing::run(const Job& job, const Shared& shared, LineBatch& batch) {
+    batch.reset(job.style, m_scratch);
+    VisibleParts visible_parts(shared.target, m_scratch);
+    const bool keeps_visible = shared.target.depth && !job.style.hidden_by_pixel;
+    for (std::size_t i = job.first_part; i < job.end_part; ++i) {
+        const Part& part = m_parts[i];
+        if (part.source == Source::curve)
+            addCurve(part, shared, batch);
+        else if (part.source == Source::point)
+            addPoint(part, shared, batch);
+        else if (part.strength > weakest_drawn)
+            addMeshLines(part, shared, keeps_visible ? &visible_parts : nullptr, batch);
+    }
+    batch.sortIntoBands(shared.target.height);
 }
 
 void LineDrawing::draw(const DisplayScene& scene, const CameraRays& rays,
                        const DisplayModeAttributes& mode, const LineTarget& target) {
+    m_scratch.reset();
+    m_parts.clear();
     m_jobs.clear();
     listMeshes(scene, rays, mode);
     listCurvesAndPoints(scene, mode);
-    if (m_batches.size() < m_jobs.size())
-        m_batches.resize(m_jobs.size());
+    m_batches.resize(m_jobs.size());
     const float margin = std::max({mode.edge_width_px, mode.outline_width_px, mode.curve_width_px,
                                    mode.point_size_px}) +
                          1.0F;
-    const KM_3dVector from_world = KM_3dPoint::Origin - scene.origin();
+    const KM_3dVector frame_from_world = KM_3dPoint::Origin - scene.origin();
     KM_BoundingBox box = scene.boundingBox();
     if (box.IsValid())
-        box = {box.m_min + from_world, box.m_max + from_world};
-    const ScreenProjection projection(rays, target.width, target.height, margin);
-    tbb::parallel_for(std::size_t{0}, m_jobs.size(), [&](std::size_t index) {
-        const Job& job = m_jobs[index];
-        LineBatch& batch = m_batches[index];
-        batch.reset(job.style);
-        if (job.source == Source::curve) {
-            const KM_3dPoint* const points = scene.curves()[job.object].polyline.Array();
-            for (std::size_t i = job.begin; i < job.end; ++i)
-                addLine(projection, Point3(points[i] + from_world),
-                        Point3(points[i + 1] + from_world), batch);
-        } else if (job.source == Source::point) {
-            const Point3 place(scene.points()[job.object].location + from_world);
-            addLine(projection, place, place, batch);
-        } else {
-            const DisplayScene::MeshObject& object = scene.meshes()[job.object];
-            const DepthFade fade(job.strength, mode.far_strength, rays, box);
-            const MeshLines lines(object, rays, projection, fade);
-            addMeshLines(job, lines, object.mesh->edges(), batch);
-            if (target.depth && !job.style.hidden_by_pixel)
-                keepVisibleParts(target, batch);
-        }
-        batch.sortIntoBands(target.height);
-    });
+        box = {box.m_min + frame_from_world, box.m_max + frame_from_world};
+    const Shared shared{scene,
+                        rays,
+                        mode,
+                        target,
+                        ScreenProjection(rays, target.width, target.height, margin),
+                        frame_from_world,
+                        box};
+    tbb::parallel_for(std::size_t{0}, m_jobs.size(),
+                      [&](std::size_t index) { run(m_jobs[index], shared, m_batches[index]); });
     if (mode.draws_all_edges)
-        layTone(scene, rays, mode, projection, target);
-    drawLines({m_batches.data(), m_jobs.size()}, target);
+        layTone(scene, rays, mode, shared.projection, target);
+    drawLines(m_batches, target, m_scratch);
 }
 
 } // namespace quarn

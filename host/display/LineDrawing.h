@@ -9,8 +9,7 @@
 namespace quarn {
 
 class DisplayScene;
-class MeshEdges;
-class MeshLines;
+class VisibleParts;
 struct CameraRays;
 struct DisplayModeAttributes;
 
@@ -26,15 +25,23 @@ public:
 
 private:
     enum class Source { flat, smooth, creases, feature_outlines, smooth_outlines, curve, point };
-    /// A part of one object's lines, small enough for one task.
-    struct Job {
+    /// Some lines that follow each other in one object.
+    struct Part {
         Source source;
         std::size_t object;
         std::size_t begin;
         std::size_t end;
-        LineStyle style;
         float strength;
     };
+    /// Parts of one style, together small enough for one task.
+    struct Job {
+        LineStyle style;
+        std::size_t first_part;
+        std::size_t end_part;
+        std::size_t line_count;
+    };
+    /// What the tasks of one picture share.
+    struct Shared;
 
     void listMeshes(const DisplayScene& scene, const CameraRays& rays,
                     const DisplayModeAttributes& mode);
@@ -44,9 +51,15 @@ private:
     void listCurvesAndPoints(const DisplayScene& scene, const DisplayModeAttributes& mode);
     void list(Source source, std::size_t object, std::size_t count, const LineStyle& style,
               float strength = 1.0F);
-    static void addMeshLines(const Job& job, const MeshLines& lines, const MeshEdges& edges,
+    void listPart(const Part& part, const LineStyle& style);
+    void run(const Job& job, const Shared& shared, LineBatch& batch);
+    static void addCurve(const Part& part, const Shared& shared, LineBatch& batch);
+    static void addPoint(const Part& part, const Shared& shared, LineBatch& batch);
+    static void addMeshLines(const Part& part, const Shared& shared, VisibleParts* visible_parts,
                              LineBatch& batch);
 
+    PictureScratch m_scratch;
+    std::vector<Part> m_parts;
     std::vector<Job> m_jobs;
     std::vector<LineBatch> m_batches;
     DenseTone m_tone;

@@ -3,6 +3,7 @@
 #include "host/display/CameraRays.h"
 #include "host/display/PackedNormal.h"
 #include "host/display/ScreenProjection.h"
+#include "host/display/VisibleParts.h"
 
 #include <algorithm>
 #include <limits>
@@ -45,12 +46,13 @@ float DepthFade::at(float nearness) const {
 }
 
 MeshLines::MeshLines(const DisplayScene::MeshObject& object, const CameraRays& rays,
-                     const ScreenProjection& projection, const DepthFade& fade)
+                     const ScreenProjection& projection, const DepthFade& fade,
+                     VisibleParts* visible_parts)
     : m_vertices(object.mesh->mesh().m_V), m_frame_from_mesh(object.frame_from_mesh),
       m_stands(m_frame_from_mesh.IsIdentity()), m_parallel(rays.parallel),
       m_eye(rays.eye[0], rays.eye[1], rays.eye[2]),
       m_backward(rays.camera_z[0], rays.camera_z[1], rays.camera_z[2]), m_projection(projection),
-      m_fade(fade), m_spacing(object, rays) {
+      m_fade(fade), m_visible_parts(visible_parts), m_spacing(object, rays) {
     KM_Xform mesh_from_frame = m_frame_from_mesh;
     if (m_stands || !mesh_from_frame.Invert())
         return;
@@ -109,6 +111,13 @@ bool MeshLines::project(std::uint32_t from, std::uint32_t to, ScreenSegment& seg
 void MeshLines::add(std::uint32_t from, std::uint32_t to, LineBatch& batch) const {
     ScreenSegment segment;
     if (project(from, to, segment))
+        addVisible(segment, batch);
+}
+
+void MeshLines::addVisible(const ScreenSegment& segment, LineBatch& batch) const {
+    if (m_visible_parts)
+        m_visible_parts->add(segment, batch);
+    else
         batch.add(segment);
 }
 
@@ -124,7 +133,7 @@ void MeshLines::addDense(std::uint32_t from, std::uint32_t to, LineBatch& batch)
         return;
     for (ScreenPoint* const end : {&segment.from, &segment.to})
         end->strength *= m_spacing.clearness(end->nearness);
-    batch.add(segment);
+    addVisible(segment, batch);
 }
 
 } // namespace quarn

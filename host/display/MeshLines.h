@@ -9,6 +9,7 @@
 
 namespace quarn {
 
+class VisibleParts;
 struct CameraRays;
 
 /// How clearly lines are drawn by their depth: far ones are lighter, so that near ones stand out.
@@ -36,8 +37,10 @@ private:
 /// Projects the edges of one mesh object onto the picture.
 class MeshLines {
 public:
+    /// @param visible_parts  cuts out of the edges what is seen; null: they are kept whole
     MeshLines(const DisplayScene::MeshObject& object, const CameraRays& rays,
-              const ScreenProjection& projection, const DepthFade& fade);
+              const ScreenProjection& projection, const DepthFade& fade,
+              VisibleParts* visible_parts = nullptr);
 
     /// All of the edges, as clearly as they can be told apart.
     void addAll(std::span<const MeshEdges::Edge> edges, LineBatch& batch) const;
@@ -51,6 +54,7 @@ private:
     bool isOutline(const MeshEdges::Edge& edge) const;
     void add(std::uint32_t from, std::uint32_t to, LineBatch& batch) const;
     void addDense(std::uint32_t from, std::uint32_t to, LineBatch& batch) const;
+    void addVisible(const ScreenSegment& segment, LineBatch& batch) const;
     bool project(std::uint32_t from, std::uint32_t to, ScreenSegment& segment) const;
 
     std::span<const KM_3fPoint> m_vertices;
@@ -61,6 +65,7 @@ private:
     KM_3dVector m_backward; ///< against the direction of view
     const ScreenProjection& m_projection;
     const DepthFade& m_fade;
+    VisibleParts* m_visible_parts;
     EdgeSpacing m_spacing;
 };
 

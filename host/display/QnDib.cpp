@@ -33,10 +33,10 @@ bool CQuarnDib::WriteToFile(const wchar_t* path, int) const {
     quarn::Application* application = quarn::Application::forCall("CQuarnDib::WriteToFile");
     if (!application || !path || !m_image)
         return false;
-    const std::filesystem::path file = quarn::pathFromText(path);
-    const auto written = application->documents().imageEncoder().write(file, *m_image);
+    const quarn::SystemPath file(path);
+    const auto written = application->documents().imageEncoder().write(file.c_str(), *m_image);
     if (written)
-        application->pictureWritten(file);
+        application->pictureWritten(application->pictureFile(file.view()));
     else
         application->tell(written.message());
     return written.ok();

@@ -156,7 +156,10 @@ void RayScene::build(std::vector<Member> members) {
     const std::size_t first_surface = m_surfaces.size();
     for (const std::size_t member : small)
         addSurface(member);
-    addBundles(small, bundle_triangles, first_surface, m_instances.size());
+    std::vector<RayGeometry> geometries;
+    for (std::size_t i = 0; i < small.size(); ++i)
+        geometries.push_back(makeSurface(small[i], m_surfaces[first_surface + i]));
+    addBundles(small, geometries, bundle_triangles, first_surface, m_instances.size());
     for (std::size_t i = 0; i < m_members.size(); ++i)
         setVisible(i, wanted[i]);
     commit();
@@ -203,6 +206,14 @@ RayGeometry RayScene::makeTriangles(std::size_t member) const {
     rtcSetSharedGeometryBuffer(geometry.get(), RTC_BUFFER_TYPE_INDEX, 0, RTC_FORMAT_UINT3,
                                mesh.mesh().m_F.data(), 0, sizeof(KM_MeshTriangle),
                                mesh.mesh().m_F.size());
+    return geometry;
+}
+
+/// The triangles of a small mesh, ready for a scene that it shares.
+RayGeometry RayScene::makeSurface(std::size_t member, const RaySurface& surface) const {
+    RayGeometry geometry = makeTriangles(member);
+    setOpacityFilter(geometry.get(), surface);
+    rtcCommitGeometry(geometry.get());
     return geometry;
 }
 
@@ -254,9 +265,10 @@ void RayScene::addSole(std::size_t member, SoleGroups& groups) {
 }
 
 /// Lets members, whose surfaces follow each other, share scenes.
-/// @param slot  of the first scene's instance; further ones are new
-void RayScene::addBundles(std::span<const std::size_t> members, std::size_t most_triangles,
-                          std::size_t first_surface, std::size_t slot) {
+/// @param geometries  of the members; they move into the scenes
+/// @param slot        of the first scene's instance; further ones are new
+void RayScene::addBundles(std::span<const std::size_t> members, std::span<RayGeometry> geometries,
+                          std::size_t most_triangles, std::size_t first_surface, std::size_t slot) {
     std::size_t first = 0;
     while (first < members.size()) {
         std::size_t triangles = 0;
@@ -264,28 +276,26 @@ void RayScene::addBundles(std::span<const std::size_t> members, std::size_t most
         while (end < members.size() && (end == first || triangles < most_triangles))
             triangles += m_members[members[end++]].mesh->mesh().m_F.size();
         putInstance(slot, makeGroup(), KM_Xform(), first_surface + first);
-        fillBundle(slot, members.subspan(first, end - first));
+        fillBundle(slot, members.subspan(first, end - first),
+                   geometries.subspan(first, end - first));
         m_instances[slot].group->is_split = triangles < 2 * split_bundle_triangles;
         first = end;
         slot = m_instances.size();
     }
 }
 
-void RayScene::fillBundle(std::size_t slot, std::span<const std::size_t> members) {
+void RayScene::fillBundle(std::size_t slot, std::span<const std::size_t> members,
+                          std::span<RayGeometry> geometries) {
     Instance& instance = m_instances[slot];
     Group& group = *instance.group;
-    for (const std::size_t member : members) {
-        const auto id = static_cast<unsigned>(group.geometries.size());
-        m_places[member] = {slot, id};
-        group.geometries.push_back(makeTriangles(member));
+    for (std::size_t i = 0; i < members.size(); ++i) {
+        const auto id = static_cast<unsigned>(i);
+        m_places[members[i]] = {slot, id};
+        group.geometries.push_back(std::move(geometries[i]));
         RTCGeometry geometry = group.geometries.back().get();
-        setOpacityFilter(geometry, m_surfaces[m_first_surfaces[slot] + id]);
-        rtcCommitGeometry(geometry);
         rtcAttachGeometryByID(group.scene.get(), geometry, id);
-        if (m_members[member].visible)
-            ++instance.visible_members;
-        else
-            setEnabled(geometry, false);
+        instance.visible_members += m_members[members[i]].visible ? 1 : 0;
+        setEnabled(geometry, m_members[members[i]].visible);
     }
 }
 
@@ -296,7 +306,7 @@ void RayScene::split(std::size_t slot) {
     const std::vector<std::size_t> members(
         begin, begin + static_cast<std::ptrdiff_t>(bundle->geometries.size()));
     rtcDetachGeometry(m_top.get(), static_cast<unsigned>(slot));
-    addBundles(members, split_bundle_triangles, first_surface, slot);
+    addBundles(members, bundle->geometries, split_bundle_triangles, first_surface, slot);
 }
 
 void RayScene::setVisible(std::size_t member, bool visible) {

@@ -95,14 +95,16 @@ private:
     bool standsAlone(const Member& member) const;
     GroupKey keyOf(const Member& member) const;
     void addSole(std::size_t member, SoleGroups& groups);
-    void addBundles(std::span<const std::size_t> members, std::size_t most_triangles,
-                    std::size_t first_surface, std::size_t slot);
-    void fillBundle(std::size_t slot, std::span<const std::size_t> members);
+    void addBundles(std::span<const std::size_t> members, std::span<RayGeometry> geometries,
+                    std::size_t most_triangles, std::size_t first_surface, std::size_t slot);
+    void fillBundle(std::size_t slot, std::span<const std::size_t> members,
+                    std::span<RayGeometry> geometries);
     void split(std::size_t slot);
     void addSurface(std::size_t member);
     void putInstance(std::size_t slot, std::shared_ptr<Group> group,
                      const KM_Xform& frame_from_mesh, std::size_t first_surface);
     RayGeometry makeTriangles(std::size_t member) const;
+    RayGeometry makeSurface(std::size_t member, const RaySurface& surface) const;
     RaySceneHandle makeScene() const;
     std::shared_ptr<Group> makeGroup() const;
     SoleGroups soleGroups() const;

@@ -22,29 +22,27 @@ KM_3dPointArray displayPolyline(const KM_Curve& curve) {
 
 } // namespace
 
-Result<void> DocumentScene::update(const ObjectTable& objects, std::vector<KM_Light> lights,
+Result<void> DocumentScene::update(const ObjectTable& objects, std::span<const KM_Light> lights,
                                    std::span<const KM_UUID> hidden) {
     if (m_content.revision != objects.revision())
         takeObjects(objects);
     takeVisibility(objects, hidden);
-    m_content.lights = std::move(lights);
+    m_content.lights.assign(lights.begin(), lights.end());
     return m_display.update(m_content);
 }
 
 Result<void> DocumentScene::draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode,
                                  int width_px, int height_px, Image& picture) {
-    const Result<void> fits = checkPictureMemory(width_px, height_px, m_largest_px);
+    const Result<void> fits = checkPictureMemory(width_px, height_px, m_pipeline.heldPixels());
     if (!fits)
         return fits;
-    const Result<void> drawn =
-        m_pipeline.draw(m_display, viewport, mode, width_px, height_px, picture);
-    if (drawn)
-        m_largest_px = std::max(m_largest_px, std::int64_t{width_px} * height_px);
-    return drawn;
+    return m_pipeline.draw(m_display, viewport, mode, width_px, height_px, picture);
 }
 
 void DocumentScene::takeObjects(const ObjectTable& objects) {
-    m_content = SceneContent();
+    m_content.meshes.clear();
+    m_content.curves.clear();
+    m_content.points.clear();
     m_content.revision = objects.revision();
     for (const auto& object : objects.objects()) {
         if (object->mesh)

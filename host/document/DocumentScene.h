@@ -18,7 +18,7 @@ public:
     /// or changed, else the lights and what is shown or hidden.
     /// @param hidden  objects that are not shown although they are visible
     /// @return an error when the scene cannot be built
-    Result<void> update(const ObjectTable& objects, std::vector<KM_Light> lights,
+    Result<void> update(const ObjectTable& objects, std::span<const KM_Light> lights,
                         std::span<const KM_UUID> hidden = {});
 
     /// Draws the scene as the last update left it; as DisplayPipeline::draw. A picture that does
@@ -37,8 +37,7 @@ private:
 
     SceneContent m_content;
     DisplayScene m_display;
-    DisplayPipeline m_pipeline;    ///< keeps its buffers from picture to picture
-    std::int64_t m_largest_px = 0; ///< pixels of the largest picture so far
+    DisplayPipeline m_pipeline; ///< keeps its buffers from picture to picture
 };
 
 } // namespace quarn

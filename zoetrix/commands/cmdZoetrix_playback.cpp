@@ -21,6 +21,7 @@ struct Playback {
     FrameRange frames;
     bool plays_all; ///< and puts the view back afterwards
     bool records;
+    FrameBuffers buffers;
 };
 
 int FailWith(const wchar_t* text, int id) {
@@ -62,7 +63,8 @@ template <class SetUp> void ShowFrames(Playback& playback, SetUp&& set_up) {
             set_up(*camera, *target);
         if (!playback.records)
             playback.view.Redraw();
-        else if (!RecordFrame(playback.doc.RuntimeSerialNumber(), props, &playback.view))
+        else if (!RecordFrame(playback.doc.RuntimeSerialNumber(), props, &playback.view,
+                              playback.buffers))
             return;
         WaitAndCheckForEscapeKey(1);
     }
@@ -130,7 +132,7 @@ int PreviewAnimation(CQuarnDoc& doc, KM_3dmAnimationProperties& props, int frame
     CleanExtention(extension);
     props.SetFileExtension(extension);
 
-    Playback playback{doc, props, *view, FramesToShow(props, frame), plays_all, record};
+    Playback playback{doc, props, *view, FramesToShow(props, frame), plays_all, record, {}};
     if (IsSunStudy(props))
         ShowSunStudy(playback);
     else

@@ -53,6 +53,13 @@ TEST(AtomicFile, LongestNameThatTheSystemAllowsCanBeWritten) {
     EXPECT_THAT(written.message(), ::testing::HasSubstr("the name is too long"));
 }
 
+TEST(AtomicFile, PathLongerThanTheSystemTakesIsAnErrorThatSaysSo) {
+    const std::string path = "/tmp/" + std::string(5000, '/') + "a";
+    const auto written = writeFileAtomically(path.c_str(), bytesOf("x"));
+    ASSERT_FALSE(written.ok());
+    EXPECT_THAT(written.message(), ::testing::HasSubstr("the name is too long"));
+}
+
 TEST(AtomicFile, RelativeNameGoesToTheCurrentFolder) {
     const TemporaryFolder folder;
     const fs::path before = fs::current_path();

@@ -12,7 +12,7 @@ namespace {
 TEST(DisplayMode, StandardModesStandInTheHostsOrder) {
     std::vector<std::string> names;
     for (const DisplayModeAttributes& mode : standardDisplayModes())
-        names.push_back(mode.english_name.ToUtf8());
+        names.push_back(KM_wString(mode.english_name).ToUtf8());
     EXPECT_EQ(names, (std::vector<std::string>{"Wireframe", "Shaded", "Rendered", "Translucent",
                                                "X-Ray", "Drawing", "Clay"}));
 }

@@ -17,12 +17,13 @@ public:
         m_pixels.assign(static_cast<std::size_t>(width * height), 0xFFFFFFFFU);
     }
     void draw(const std::vector<ScreenSegment>& segments, float line_width, float opacity = 1.0F) {
+        PictureScratch scratch;
         LineBatch batch;
-        batch.reset({{0, 0, 0, 255}, opacity, line_width});
+        batch.reset({{0, 0, 0, 255}, opacity, line_width}, scratch);
         for (const ScreenSegment& s : segments)
             batch.add(s);
         batch.sortIntoBands(m_height);
-        drawLines({&batch, 1}, {m_pixels.data(), m_width, m_height, nullptr});
+        drawLines({&batch, 1}, {m_pixels.data(), m_width, m_height, nullptr}, scratch);
     }
     /// How much of a pixel is covered, from 0 to 1.
     double cover(int x, int y) const {
@@ -170,8 +171,8 @@ Image plan(const SceneContent& content, const wchar_t* mode) {
 
 TEST(LineDrawing, CurveAboveASurfaceIsSeenInEveryMode) {
     for (const DisplayModeAttributes& mode : standardDisplayModes())
-        EXPECT_TRUE(isRed(plan(curveOverBox(2.0), mode.english_name), 50, 49))
-            << mode.english_name.ToUtf8();
+        EXPECT_TRUE(isRed(plan(curveOverBox(2.0), mode.english_name.data()), 50, 49))
+            << KM_wString(mode.english_name).ToUtf8();
 }
 
 TEST(LineDrawing, CurveOnASurfaceIsSeen) {

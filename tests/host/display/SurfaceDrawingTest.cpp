@@ -154,8 +154,8 @@ TEST(SurfaceDrawing, AnyNumberOfThreadsDrawsTheSamePicture) {
             images.push_back(
                 arena.execute([&] { return drawn(content, viewport, mode, 317, 203); }));
         }
-        EXPECT_EQ(images[0].rgba, images[1].rgba) << standard.english_name.ToUtf8();
-        EXPECT_EQ(images[0].rgba, images[2].rgba) << standard.english_name.ToUtf8();
+        EXPECT_EQ(images[0].rgba, images[1].rgba) << KM_wString(standard.english_name).ToUtf8();
+        EXPECT_EQ(images[0].rgba, images[2].rgba) << KM_wString(standard.english_name).ToUtf8();
     }
 }
 
@@ -175,7 +175,7 @@ TEST(SurfaceDrawing, LoopsForEveryProcessorDrawTheSamePicture) {
         Image plain;
         ASSERT_TRUE(
             DisplayPipeline(baseline_ray_kernel).draw(scene, viewport, mode, 317, 203, plain).ok());
-        EXPECT_EQ(best.rgba, plain.rgba) << standard.english_name.ToUtf8();
+        EXPECT_EQ(best.rgba, plain.rgba) << KM_wString(standard.english_name).ToUtf8();
     }
 }
 
