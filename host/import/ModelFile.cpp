@@ -1,6 +1,7 @@
 #include "host/import/ModelFile.h"
 
 #include "host/import/CoordinateShift.h"
+#include "host/import/GltfExtensions.h"
 #include "host/import/GltfLosses.h"
 #include "host/import/LargeStack.h"
 #include "host/import/LibraryWords.h"
@@ -101,6 +102,7 @@ Error nothingLeft(const fs::path& path, const ImportedModel& model) {
 /// What is found out about a file beside the library's reading, which keeps it to itself.
 struct BesideReading {
     std::string why_bad; ///< empty: nothing speaks against the file
+    std::string_view advice = repair;
     std::optional<GltfDescription> gltf;
 };
 
@@ -109,6 +111,11 @@ BesideReading readBeside(const fs::path& path) {
     beside.why_bad = whyBadIndices(path);
     if (isOneOf(modelFormat(path), {"gltf", "glb"})) {
         beside.gltf = readGltfDescription(path);
+    }
+    const std::string extension = beside.gltf ? unreadableExtension(*beside.gltf) : std::string();
+    if (!extension.empty()) {
+        beside.why_bad = "it needs the glTF extension '" + extension + "', which is not known here";
+        beside.advice = "Export the model without it, or without compression.";
     }
     return beside;
 }
@@ -156,11 +163,14 @@ Result<ImportedModel> takeChecked(Assimp::Importer& importer, const fs::path& pa
                                   const ModelFolder& folder, const ModelConventions& conventions,
                                   BesideReading beside) {
     const auto refused = [&path, &beside](const std::string& why) {
-        return cannotReadModel(path, beside.why_bad.empty() ? why : beside.why_bad, repair);
+        return cannotReadModel(path, beside.why_bad.empty() ? why : beside.why_bad, beside.advice);
     };
     std::vector<std::string> warnings;
     if (beside.gltf) {
         warnings = tellLostFaces(sceneOf(importer), *beside.gltf);
+        for (std::string& sentence : tellUnknownExtensions(*beside.gltf)) {
+            warnings.push_back(std::move(sentence));
+        }
     }
     const bool is_complete = completeScene(importer, modelFormat(path), warnings);
     if (!is_complete || !beside.why_bad.empty()) {
@@ -194,9 +204,10 @@ Result<ImportedModel> readChecked(const fs::path& path, UpAxis up) {
     }
     auto beside = std::async(std::launch::async | std::launch::deferred, readBeside, path);
     if (importer.ReadFile(path.string(), 0) == nullptr) {
-        const std::string why = beside.get().why_bad;
+        const BesideReading found = beside.get();
+        const std::string& why = found.why_bad;
         return cannotReadModel(path, why.empty() ? inPlainWords(importer.GetErrorString()) : why,
-                               repair);
+                               found.advice);
     }
     ModelConventions conventions = conventionsOf(sceneOf(importer), path, up);
     conventions.origin = replacement.origin;

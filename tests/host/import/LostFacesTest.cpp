@@ -31,6 +31,7 @@ struct Parts {
     std::vector<Mesh> meshes;
     std::size_t shown = 1000; ///< how many of them, from the first, stand in the scene
     std::string padding{};    ///< of a text that nobody needs
+    std::string extension{};  ///< that the file says it needs
 
     std::filesystem::path write(const TemporaryFolder& folder) const {
         const float places[9] = {0, 0, 0, 1, 0, 0, 0, 1, 0};
@@ -63,13 +64,14 @@ struct Parts {
             shown_nodes += m < shown ? comma + std::to_string(m) : "";
         }
         folder.write("a.bin", bytes);
-        return folder.write("a.gltf", R"({"asset":{"version":"2.0","copyright":")" + padding +
-                                          R"("},"scene":0,"scenes":[{"nodes":[)" + shown_nodes +
-                                          R"(]}],"nodes":[)" + nodes + R"(],"meshes":[)" +
-                                          all_meshes + R"(],"accessors":[)" + accessors +
-                                          R"(],"bufferViews":[)" + views +
-                                          R"(],"buffers":[{"uri":"a.bin","byteLength":)" +
-                                          std::to_string(bytes.size()) + "}]}");
+        return folder.write(
+            "a.gltf",
+            R"({"asset":{"version":"2.0","copyright":")" + padding +
+                R"("},"extensionsRequired":[)" + (extension.empty() ? "" : '"' + extension + '"') +
+                R"(],"scene":0,"scenes":[{"nodes":[)" + shown_nodes + R"(]}],"nodes":[)" + nodes +
+                R"(],"meshes":[)" + all_meshes + R"(],"accessors":[)" + accessors +
+                R"(],"bufferViews":[)" + views + R"(],"buffers":[{"uri":"a.bin","byteLength":)" +
+                std::to_string(bytes.size()) + "}]}");
     }
 };
 
@@ -143,6 +145,33 @@ TEST(LostFaces, AreFoundBehindTextsOfAnyLength) {
         parts.padding = padding;
         EXPECT_THAT(readOrFail(parts.write(folder)).warnings,
                     ElementsAre(lost(1, 2, "triangles", "roof")));
+    }
+}
+
+TEST(GltfExtension, OfVerticesThatIsNotKnownIsRefused) {
+    const TemporaryFolder folder;
+    Parts parts{{{"roof", {{4, {0, 1, 2}}}}}};
+    for (const char* const extension : {"KHR_mesh_quantization", "EXT_meshopt_compression"}) {
+        parts.extension = extension;
+        const Result<ImportedModel> model = readModelFile(parts.write(folder));
+        ASSERT_FALSE(model.ok());
+        EXPECT_THAT(model.message(),
+                    HasSubstr("it needs the glTF extension '" + std::string(extension) +
+                              "', which is not known here. Export the model"));
+    }
+}
+
+TEST(GltfExtension, OfOtherThingsThatIsNotKnownIsTold) {
+    const TemporaryFolder folder;
+    Parts parts{{{"roof", {{4, {0, 1, 2}}}}}};
+    parts.extension = "KHR_texture_basisu";
+    const ImportedModel model = readOrFail(parts.write(folder));
+    EXPECT_EQ(model.triangleCount(), 1U);
+    EXPECT_THAT(model.warnings,
+                ElementsAre(HasSubstr("needs the glTF extension 'KHR_texture_basisu'")));
+    for (const char* const known : {"KHR_texture_transform", "KHR_materials_unlit"}) {
+        parts.extension = known;
+        EXPECT_THAT(readOrFail(parts.write(folder)).warnings, IsEmpty());
     }
 }
 
