@@ -188,7 +188,7 @@ FrameSetup makeFrameSetup(const DisplayScene& scene, const KM_Viewport& viewport
         setGround(frame);
     if (mode.surface_style == SurfaceStyle::clay) {
         frame.sky_reach = sky_reach_of_scene * frame.scene_size;
-        set(frame.ground_albedo, {0.84F, 0.84F, 0.84F});
+        set(frame.ground_albedo, {0.72F, 0.72F, 0.72F});
     }
     frame.has_sky = mode.has_sky;
     set(frame.background_top, sceneLightShownAs(mode.background_top));

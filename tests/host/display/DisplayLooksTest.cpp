@@ -168,6 +168,17 @@ TEST(Clay, OpenFloorIsWhiteAndAsEvenAsPaper) {
     EXPECT_LE(std::abs(pixel[0] - pixel[2]), 4);
 }
 
+TEST(Clay, AWhiteModelStandsOutFromTheGround) {
+    SceneContent content;
+    addMesh(content, floorMesh(-2.0F, -2.0F, 2.0F, 2.0F, 0.0F));
+    content.lights.push_back(sunLight({0.3, 0.2, -0.9}));
+    const Image image = drawn(content, topView(5.0), modeNamed(L"Clay", 2), 100, 100);
+    const double model = brightness(image, 50, 50);
+    const double ground = brightness(image, 90, 50);
+    EXPECT_LT(ground, model - 7.0);
+    EXPECT_GT(ground, model - 25.0);
+}
+
 TEST(Clay, CornerDarkensSmoothlyAndWithoutNoise) {
     SceneContent content;
     addMesh(content, floorMesh(-20.0F, -20.0F, 20.0F, 20.0F, 0.0F));
