@@ -169,17 +169,36 @@ private:
     }
 
     /// The reading library keeps coordinates in single precision, with 24 binary digits.
+    static double roundingStep(const KM_BoundingBox& box) {
+        double largest = 1e-30;
+        for (int corner = 0; corner < 8 && box.IsValid(); ++corner) {
+            const KM_3dPoint p = box.Corner(corner);
+            largest = std::max({largest, std::abs(p.x), std::abs(p.y), std::abs(p.z)});
+        }
+        return std::ldexp(1.0, std::ilogb(largest) - 23);
+    }
+
+    /// How much longer a transform makes what points along an axis, at most.
+    static double largestScale(const KM_Xform& x) {
+        double largest = 0.0;
+        for (int axis = 0; axis < 3; ++axis) {
+            largest = std::max(
+                largest, std::hypot(x.m_xform[0][axis], x.m_xform[1][axis], x.m_xform[2][axis]));
+        }
+        return largest;
+    }
+
     void warnOfRounding(const KM_BoundingBox& box) {
         constexpr double visible_share = 1e-5;
-        double largest = 0.0;
-        for (unsigned i = 0; i < m_scene.mNumMeshes; ++i) {
-            const KM_BoundingBox& own = m_boxes[i];
-            for (int corner = 0; corner < 8 && own.IsValid() && m_uses[i] > 0; ++corner) {
-                const KM_3dPoint p = own.Corner(corner);
-                largest = std::max({largest, std::abs(p.x), std::abs(p.y), std::abs(p.z)});
+        double step = 0.0;
+        for (const PlacedNode& placed : m_nodes) {
+            const double scale = largestScale(placed.world_from_node);
+            for (unsigned i = 0; i < placed.node->mNumMeshes; ++i) {
+                const unsigned mesh = placed.node->mMeshes[i];
+                step = mesh < m_boxes.size() ? std::max(step, scale * roundingStep(m_boxes[mesh]))
+                                             : step;
             }
         }
-        const double step = std::ldexp(1.0, std::ilogb(std::max(largest, 1e-30)) - 23);
         if (step > visible_share * box.Diagonal().Length() && box.Diagonal().Length() > 0.0) {
             std::ostringstream text;
             text.imbue(std::locale::classic());

@@ -65,5 +65,19 @@ TEST(PlacedModel, CoordinatesThatTheFormatRoundsAreTold) {
     EXPECT_THAT(model.warnings[0], HasSubstr("0.5"));
 }
 
+TEST(PlacedModel, ScaleOfANodeRoundsNothing) {
+    // A triangle of three corners of the unit square, scaled to a micrometre.
+    const TemporaryFolder folder;
+    const ImportedModel model = readOrFail(folder.write(
+        "tiny.gltf",
+        R"({"asset":{"version":"2.0"},"scene":0,"scenes":[{"nodes":[0]}],"nodes":[{"mesh":0,)"
+        R"("scale":[1e-6,1e-6,1e-6]}],"meshes":[{"primitives":[{"attributes":{"POSITION":0}}]}],)"
+        R"("accessors":[{"bufferView":0,"componentType":5126,"count":3,"type":"VEC3"}],)"
+        R"("bufferViews":[{"buffer":0,"byteLength":36}],"buffers":[{"byteLength":36,"uri":)"
+        R"("data:application/octet-stream;base64,AAAAAAAAAAAAAAAAAACAPwAAAAAAAAAAAAAAAAAAgD8AAAAA"}]})"));
+    EXPECT_THAT(model.warnings, IsEmpty());
+    EXPECT_NEAR(boundsOf(model).m_max.x, 1e-6, 1e-12);
+}
+
 } // namespace
 } // namespace quarn::test
