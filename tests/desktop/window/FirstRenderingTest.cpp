@@ -1,3 +1,4 @@
+#include "desktop/render/PictureSheet.h"
 #include "desktop/window/CommandStarter.h"
 #include "tests/desktop/window/WindowFixture.h"
 
@@ -14,17 +15,19 @@ protected:
     bool isRenderWindowShown() { return renderWindow() && renderWindow()->isVisible(); }
 };
 
-TEST_F(FirstRenderingTest, ShowsItsWindowWithProgressWhileItRuns) {
+TEST_F(FirstRenderingTest, ShowsItsWindowWithPictureAndProgressWhileItRuns) {
     run("_-RenderSettings _Size 1600 1200 _Samples 16384 _Enter");
     bool was_shown = false;
     bool had_progress = false;
+    bool had_picture = false;
     QElapsedTimer since_start;
     since_start.start();
     QTimer look;
     QObject::connect(&look, &QTimer::timeout, [&] {
         if (isRenderWindowShown()) {
             was_shown = true;
-            had_progress = test::part<QProgressBar>(*renderWindow(), "progress").isVisible();
+            had_progress |= test::part<QProgressBar>(*renderWindow(), "progress").isVisible();
+            had_picture |= !test::part<PictureSheet>(*renderWindow(), "picture").picture().isNull();
         }
         if (was_shown || since_start.elapsed() > 30000)
             window.starter().stop();
@@ -34,7 +37,8 @@ TEST_F(FirstRenderingTest, ShowsItsWindowWithProgressWhileItRuns) {
     look.stop();
     EXPECT_TRUE(was_shown);
     EXPECT_TRUE(had_progress);
-    // There is no picture: the window has nothing to show.
+    EXPECT_TRUE(had_picture) << "as far as it was";
+    // No picture stays: the window has nothing to show.
     EXPECT_TRUE(QTest::qWaitFor([&] { return !isRenderWindowShown(); }, 5000));
 }
 
