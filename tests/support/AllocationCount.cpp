@@ -23,9 +23,13 @@ void count(std::size_t bytes) {
 
 #if defined(__SANITIZE_ADDRESS__) || HAS_FEATURE(address_sanitizer)
 
-#include <sanitizer/allocator_interface.h>
+// The sanitizer's heap has hooks of its own; not every compiler brings the header that names them.
 
-// The sanitizer's heap has hooks of its own.
+extern "C" {
+int __sanitizer_install_malloc_and_free_hooks(void (*allocated)(const volatile void*, std::size_t),
+                                              void (*freed)(const volatile void*));
+std::size_t __sanitizer_get_current_allocated_bytes();
+}
 
 namespace {
 

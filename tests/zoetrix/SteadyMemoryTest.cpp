@@ -31,7 +31,7 @@ std::string groundObj() {
 std::size_t askedByTheLibraryOf(const std::wstring& format) {
     if (format == L"jpg")
         return 9;
-    return format == L"png" ? 12 : 0;
+    return format == L"png" ? 11 : 0;
 }
 
 /// Recordings of 24 frames with a view of 160 by 100 pixels.
