@@ -44,6 +44,10 @@ void watchForInterruption() {
     sigemptyset(&action.sa_mask);
     sigaction(SIGINT, &action, nullptr);
     sigaction(SIGTERM, &action, nullptr);
+    // A terminal that closes; whoever wants the program to outlive it has this signal ignored.
+    struct sigaction inherited = {};
+    if (sigaction(SIGHUP, nullptr, &inherited) == 0 && inherited.sa_handler != SIG_IGN)
+        sigaction(SIGHUP, &action, nullptr);
     std::signal(SIGXFSZ, SIG_IGN);
 }
 
@@ -52,7 +56,7 @@ bool isInterruptionRequested() {
 }
 
 bool forgetCtrlC() {
-    if (g_stop_signal == SIGTERM)
+    if (g_stop_signal != 0 && g_stop_signal != SIGINT)
         return false;
     emptyWakePipe();
     g_stop_signal = 0;

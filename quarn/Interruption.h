@@ -2,9 +2,9 @@
 
 namespace quarn::program {
 
-/// From now on Ctrl-C (and a request to terminate) is noted instead of ending the program, so that
-/// what is being written gets finished. The second one ends the program at once. A file that grows
-/// over the size limit of the process becomes an error of the write.
+/// From now on Ctrl-C, a request to terminate and the end of the terminal are noted instead of
+/// ending the program, so that what is being written gets finished. The second one ends the program
+/// at once. A file that grows over the size limit of the process becomes an error of the write.
 void watchForInterruption();
 
 /// Whether the program was asked to stop.
@@ -12,7 +12,8 @@ bool isInterruptionRequested();
 
 /// Forgets a Ctrl-C that stopped what it was meant to stop, so that the program goes on and the
 /// next one is the first again.
-/// @return false when the program was asked to terminate; that is not forgotten
+/// @return false when the program was asked to terminate, or lost its terminal; that is not
+///   forgotten
 bool forgetCtrlC();
 
 /// The exit code of a program that was asked to stop: 128 plus the signal's number.

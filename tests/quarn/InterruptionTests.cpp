@@ -57,7 +57,7 @@ TEST_P(StopSignal, LeavesWholePicturesAndAPageThatPlaysThem) {
     expectWholePicturesIn(studio / "out");
 }
 
-INSTANTIATE_TEST_SUITE_P(Interruption, StopSignal, testing::Values(SIGINT, SIGTERM));
+INSTANTIATE_TEST_SUITE_P(Interruption, StopSignal, testing::Values(SIGINT, SIGTERM, SIGHUP));
 
 TEST(Interruption, LeavesOffThePictureThatIsBeingRendered) {
     const Studio studio;
