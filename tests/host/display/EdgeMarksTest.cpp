@@ -124,7 +124,7 @@ std::vector<const RayKernel*> kernelsOfThisProcessor() {
 }
 
 INSTANTIATE_TEST_SUITE_P(Kernels, EdgeMarksTest, testing::ValuesIn(kernelsOfThisProcessor()),
-                         [](const auto& info) { return std::string(info.param->name); });
+                         [](const auto& kernel) { return std::string(kernel.param->name); });
 
 } // namespace
 } // namespace quarn
