@@ -129,7 +129,7 @@ void ConsoleFrontEnd::frameWritten(const std::filesystem::path&, int written, in
     forgetLastWords();
     const int expected = m_frames_expected > 0 ? m_frames_expected : total;
     m_pace.noteFrame(written, expected, now);
-    if (isProgressDue() || written == expected)
+    if (m_progress.isOnTerminal() && (isProgressDue() || written == expected))
         m_progress.show(m_pace.text());
 }
 

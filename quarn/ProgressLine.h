@@ -15,6 +15,8 @@ public:
     ProgressLine(const ProgressLine&) = delete;
     ProgressLine& operator=(const ProgressLine&) = delete;
 
+    /// Whether anything is shown at all.
+    bool isOnTerminal() const { return m_is_terminal; }
     /// Shows the text in place of the last one.
     void show(std::string_view text);
     /// Takes the line away, so that other text can be printed.
