@@ -18,15 +18,15 @@ namespace {
 
 /// Edges that stand closer than the first, in pixels, cannot be told apart; from the second on all
 /// can.
-constexpr double dense_px = 1.5;
+constexpr double dense_px = 2.5;
 constexpr double sparse_px = 10.0;
 
 constexpr std::size_t triangles_per_job = 16384;
 /// Places of a surface that leave a mark, for each pixel that it covers.
-constexpr double marks_per_pixel = 1.5;
+constexpr double marks_per_pixel = 1.2;
 constexpr int most_marks = 64;
 /// So many marked pixels of nine make the full tone: gaps between marks are not seen.
-constexpr float marks_for_full_tone = 4.5F;
+constexpr float marks_for_full_tone = 4.0F;
 
 /// A number from 0 to 1 that looks random and is the same in every frame.
 float scattered(std::uint32_t seed) {
