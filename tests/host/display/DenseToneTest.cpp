@@ -59,8 +59,9 @@ TEST(DenseTone, ComesGraduallyAsTheCameraMovesAway) {
         for (double half = 6.0; half < 240.0; half *= std::pow(2.0, 0.2)) {
             const double mean =
                 middleOf(drawn(content, topView(half), withAllEdges(mode), side, side)).mean;
-            if (before > 0.0)
+            if (before > 0.0) {
                 EXPECT_NEAR(mean, before, 10.0) << mode << ' ' << half;
+            }
             before = mean;
         }
     }

@@ -116,8 +116,9 @@ TEST(Drawing, SphereShowsItsOutlineAllRoundAndNothingWithin) {
     const Image image = drawn(content, topView(5.0), modeNamed(L"Drawing", 2), 300, 300);
     for (int y = 0; y < 300; ++y)
         for (int x = 0; x < 300; ++x)
-            if (std::hypot(x - 149.5, y - 149.5) < 112.0) // of 120 pixels
+            if (std::hypot(x - 149.5, y - 149.5) < 112.0) { // of 120 pixels
                 ASSERT_GT(brightness(image, x, y), 250.0) << x << ' ' << y;
+            }
     for (int i = 0; i < 36; ++i) {
         const double angle = KM_PI * i / 18.0;
         double darkest = 255.0;

@@ -77,7 +77,7 @@ TEST(PlacedMeshDrawing, ObjectsThatShareAMeshLookLikeCopiesInTheirPlaces) {
         sharing.meshes.push_back({KM_CreateUuid(), mesh, nullptr, true, place});
         KM_Mesh copy = knob();
         ASSERT_TRUE(copy.Transform(place));
-        copies.meshes.push_back({KM_CreateUuid(), shared(std::move(copy)), nullptr, true});
+        copies.meshes.push_back({KM_CreateUuid(), shared(std::move(copy)), nullptr, true, {}});
     }
     const KM_Viewport view = perspectiveView({3.0, -16.0, 9.0}, {0.0, 0.0, 0.5});
     for (const wchar_t* const name : all_modes) {

@@ -86,7 +86,7 @@ TEST(Renderer, SmallestPictureAndNumberOfSamplesWork) {
 
 TEST(Renderer, OddSizesAreFilledToTheLastPixel) {
     const Image image = rendered(village(), topView(10.0), {67, 35, 3});
-    for (const auto [x, y] : {std::pair(66, 34), std::pair(0, 34), std::pair(66, 0)})
+    for (const auto& [x, y] : {std::pair(66, 34), std::pair(0, 34), std::pair(66, 0)})
         EXPECT_GT(brightness(image, x, y), 20.0) << x << ' ' << y;
 }
 
