@@ -31,13 +31,13 @@ inline LaneColors gradientColors(const FrameSetup& frame, const Lanes& y) {
 /// Around the sun there is a glow, and its disc, which sets behind the horizon. In a parallel view
 /// all rays look the same way; there the place in the picture adds to their elevation.
 inline LaneColors skyColors(const FrameSetup& frame, const RayPacket& packet) {
-    const Lanes scale = Lanes(1.0F) / squareRoot(dot(packet.direction, packet.direction));
+    const Lanes scale = Lanes(1.0F) / squareRoot(dot(packet.direction(), packet.direction()));
     const float tilt = frame.rays.parallel ? 0.5F / static_cast<float>(frame.height) : 0.0F;
     const float middle = 0.5F * static_cast<float>(frame.height);
-    const Lanes elevation = packet.direction.z * scale + (Lanes(middle) - packet.y) * tilt;
+    const Lanes elevation = packet.direction().z * scale + (Lanes(middle) - packet.y) * tilt;
     const Lanes up = Lanes(1.0F) - power4(Lanes(1.0F) - clamped(elevation));
     const Lanes down = Lanes(1.0F) - power4(power4(Lanes(1.0F) - clamped(-elevation)));
-    const Lanes toward = dot(packet.direction, frame.toward_sun) * scale;
+    const Lanes toward = dot(packet.direction(), frame.toward_sun) * scale;
     const Lanes near_sun = power8(clamped(toward));
     const Lanes above = Lanes(1.0F) - down;
     const Lanes glow = (near_sun * 0.35F + power8(near_sun) * 0.65F) * above;
@@ -45,7 +45,7 @@ inline LaneColors skyColors(const FrameSetup& frame, const RayPacket& packet) {
     // larger than it is: cameras see it so.
     const Lanes risen = clamped(elevation * 1000.0F);
     const Lanes disc = clamped((toward - 0.999945F) * (1.0F / 0.000031F)) * risen;
-    const LaneVectors& d = packet.direction;
+    const LaneVectors d = packet.direction();
     const Lanes sunward = d.x * frame.toward_sun[0] + d.y * frame.toward_sun[1];
     const Lanes side = sunward * scale * (Lanes(1.0F) - up);
     const auto blend = [&](int c) {

@@ -15,12 +15,12 @@ struct GroundLanes {
 /// their lanes of `surfaces`. The ground is seen from above only, so that it never covers a model
 /// that is looked at from below, and it fades out far from the model.
 inline GroundLanes meetGround(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfaces) {
-    const Lanes height = packet.origin.z - frame.ground_height;
-    LaneMask downward = packet.direction.z < Lanes(-1e-5F);
+    const Lanes height = packet.origin().z - frame.ground_height;
+    LaneMask downward = packet.direction().z < Lanes(-1e-5F);
     if (!frame.rays.parallel)
         downward = downward & (height > 0.0F);
-    const Lanes t = height / select(downward, -packet.direction.z, 1.0F);
-    const LaneVectors place = along(packet.origin, packet.direction, t);
+    const Lanes t = height / select(downward, -packet.direction().z, 1.0F);
+    const LaneVectors place = along(packet.origin(), packet.direction(), t);
     const Lanes x = place.x - frame.ground_center[0];
     const Lanes y = place.y - frame.ground_center[1];
     const float fade = 1.0F / (frame.ground_fade_end - frame.ground_fade_start);

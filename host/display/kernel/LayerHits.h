@@ -147,7 +147,7 @@ private:
     }
 
     Call m_call;
-    unsigned m_slots = 0; ///< how many are in use, by the ray that uses most
+    unsigned m_slots = 0;                  ///< how many are in use, by the ray that uses most
     alignas(64) float m_known[lane_count]; ///< every surface that is nearer is kept
     alignas(64) std::uint32_t m_count[lane_count];
     alignas(64) float m_distance[capacity][lane_count];

@@ -10,8 +10,8 @@ namespace {
 /// How opaque see-through surfaces are: the more, the more they are seen along their face.
 inline Lanes layerOpacity(const FrameSetup& frame, const RayPacket& packet,
                           const SurfaceLanes& surfaces) {
-    const Lanes length = squareRoot(dot(packet.direction, packet.direction));
-    const Lanes facing = absolute(dot(surfaces.normal, packet.direction)) / length;
+    const Lanes length = squareRoot(dot(packet.direction(), packet.direction()));
+    const Lanes facing = absolute(dot(surfaces.normal, packet.direction())) / length;
     const Lanes turned = Lanes(1.0F) - clamped(facing);
     const FrameLayers& layers = frame.layers;
     return turned * turned * turned * (layers.edge_on_opacity - layers.facing_opacity) +

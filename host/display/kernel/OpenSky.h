@@ -42,7 +42,7 @@ struct SkyPoints {
 inline SkyPoints skyPoints(const FrameSetup& frame, const RayPacket& packet,
                            const SurfaceLanes& surfaces, const LaneMask& wanted) {
     const Lanes t = select(wanted, packet.distance, 0.0F);
-    const LaneVectors place = along(packet.origin, packet.direction, t);
+    const LaneVectors place = along(packet.origin(), packet.direction(), t);
     return {along(place, surfaces.face, shadowOffset(frame, t, place) * 4.0F), surfaces.face,
             surfaces.normal, wanted & nearScene(frame, place)};
 }

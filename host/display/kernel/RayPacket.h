@@ -11,10 +11,15 @@ struct RayPacket {
     Lanes y;
     LaneMask active;
     LaneMask hit;
-    LaneVectors origin;
-    LaneVectors direction;
     Lanes distance; ///< to what the ray met, in lengths of the direction
     RTCRayHit16 rays;
+
+    LaneVectors origin() const {
+        return {load(rays.ray.org_x), load(rays.ray.org_y), load(rays.ray.org_z)};
+    }
+    LaneVectors direction() const {
+        return {load(rays.ray.dir_x), load(rays.ray.dir_y), load(rays.ray.dir_z)};
+    }
 };
 
 /// A ray that must not travel still needs finite numbers.
@@ -51,10 +56,8 @@ inline LaneVectors atPixels(const RayPacket& packet, const float (&start)[3], co
 
 inline void aim(const FrameSetup& frame, RayPacket& packet) {
     const CameraRays& c = frame.rays;
-    packet.direction = atPixels(packet, c.direction, c.direction_dx, c.direction_dy);
-    packet.origin = atPixels(packet, c.origin, c.origin_dx, c.origin_dy);
-    setOrigin(packet.rays.ray, packet.origin);
-    setDirection(packet.rays.ray, packet.direction);
+    setOrigin(packet.rays.ray, atPixels(packet, c.origin, c.origin_dx, c.origin_dy));
+    setDirection(packet.rays.ray, atPixels(packet, c.direction, c.direction_dx, c.direction_dy));
 }
 
 /// Finds the nearest surface of each ray.

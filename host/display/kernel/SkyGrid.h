@@ -77,7 +77,7 @@ inline Lanes skyArriving(const FrameSetup& frame, const RayPacket& packet,
     if (!any(points.wanted))
         return 1.0F;
     const LaneVectors place =
-        along(packet.origin, packet.direction, select(lit, packet.distance, 0.0F));
+        along(packet.origin(), packet.direction(), select(lit, packet.distance, 0.0F));
     Lanes sum = 0.0F;
     Lanes weights = 0.0F;
     for (int side = 0; side < 4; ++side) {

@@ -53,7 +53,7 @@ inline void findFreeSky(const FrameSetup& frame, const GridPlaces& places, RayPa
         seen = seen | meetGround(frame, packet, surfaces).seen;
     const SkyPoints points = skyPoints(frame, packet, surfaces, seen);
     const LaneVectors point =
-        along(packet.origin, packet.direction, select(seen, packet.distance, 0.0F));
+        along(packet.origin(), packet.direction(), select(seen, packet.distance, 0.0F));
     keepFreeSky(frame, places, packet.active,
                 {select(seen, surfaces.normal, LaneVectors{0.0F, 0.0F, 0.0F}), point,
                  freeSky(frame, points)});

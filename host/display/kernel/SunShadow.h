@@ -76,7 +76,7 @@ inline Lanes sunlightArriving(const FrameSetup& frame, const FrameLight& sun,
         return 1.0F;
     const LaneMask wanted = lit & (facing > 0.0F);
     const Lanes t = select(wanted, packet.distance, 0.0F);
-    const LaneVectors place = along(packet.origin, packet.direction, t);
+    const LaneVectors place = along(packet.origin(), packet.direction(), t);
     const LaneMask look = wanted & reachesScene(frame, sun, place);
     if (!any(look))
         return 1.0F;

@@ -51,7 +51,7 @@ inline LaneVectors ofUnitLength(const LaneVectors& v) {
 /// The normals, turned toward the observer.
 inline LaneVectors towardObserver(const FrameSetup& frame, const RayPacket& packet,
                                   const LaneVectors& normal) {
-    const Lanes turn = select(dot(normal, packet.direction) > 0.0F, -1.0F, 1.0F);
+    const Lanes turn = select(dot(normal, packet.direction()) > 0.0F, -1.0F, 1.0F);
     if (!frame.needs_unit_faces)
         return normal * turn;
     return normal * (turn / greatest(squareRoot(dot(normal, normal)), 1e-30F));

@@ -71,7 +71,7 @@ void skyColorsToward(const FrameSetup& frame, const float (&directions)[3][lane_
     RayPacket packet;
     packet.x = 0.0F;
     packet.y = 0.0F;
-    packet.direction = {load(directions[0]), load(directions[1]), load(directions[2])};
+    setDirection(packet.rays.ray, {load(directions[0]), load(directions[1]), load(directions[2])});
     const LaneColors sky = skyColors(frame, packet);
     store(colors[0], sky.r);
     store(colors[1], sky.g);

@@ -34,7 +34,7 @@ struct StartLanes {
 inline StartLanes startLanes(const FrameSetup& frame, const RayPacket& packet,
                              const SurfaceLanes& surfaces, const LaneMask& lit) {
     const Lanes t = select(lit, packet.distance, 0.0F);
-    const LaneVectors place = along(packet.origin, packet.direction, t);
+    const LaneVectors place = along(packet.origin(), packet.direction(), t);
     return {place, along(place, surfaces.face, shadowOffset(frame, t, place))};
 }
 
@@ -207,11 +207,9 @@ inline LaneColors skyLight(const RenderSetup& setup, const RayPacket& packet,
     const LaneVectors around = aroundNormals(surfaces.normal, place);
     // A direction below the very triangle is turned to the other side of it.
     const Lanes below = least(dot(around, surfaces.face), 0.0F);
-    bounce.direction = along(around, surfaces.face, below * -2.0F);
-    bounce.active = lit & reachesBox(frame, start.off, bounce.direction);
-    setOff(frame, packet, surfaces, start, bounce.direction, bounce.active, bounce.rays.ray);
-    bounce.origin = {load(bounce.rays.ray.org_x), load(bounce.rays.ray.org_y),
-                     load(bounce.rays.ray.org_z)};
+    const LaneVectors toward = along(around, surfaces.face, below * -2.0F);
+    bounce.active = lit & reachesBox(frame, start.off, toward);
+    setOff(frame, packet, surfaces, start, toward, bounce.active, bounce.rays.ray);
     intersect(frame, bounce, RTC_INTERSECT_CONTEXT_FLAG_INCOHERENT);
     bounce.active = lit;
     SurfaceLanes met;
