@@ -133,7 +133,7 @@ std::uint64_t numberOf(const json& value, std::uint64_t otherwise) {
     return value.is_number_unsigned() ? value.get<std::uint64_t>() : otherwise;
 }
 
-/// Khronos Group, glTF 2.0 Specification, section 3.7.2.1 (the modes of a primitive).
+/// Khronos Group, glTF 2.0, section 3.7.2.1 (the modes of a primitive).
 std::uint64_t facesOf(std::uint64_t mode, std::uint64_t indices) {
     const auto chained = [indices](std::uint64_t first) {
         return indices > first ? indices - first : 0;

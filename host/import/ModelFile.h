@@ -68,7 +68,7 @@ enum class UpAxis {
 ///   (glTF, GLB), or that Assimp hands out Y-up (FBX, DAE, 3DS, DXF and others), are turned, with Y
 ///   to Z and Z to -Y. OBJ, PLY, STL, OFF, 3MF, AMF, BLEND, COB, HMP, Q3O and SMD state no axis or
 ///   are Z-up: they stay as they are. Files of these that were made Y-up are read with UpAxis::y.
-/// - Lengths of glTF and GLB are metres (Khronos Group, glTF 2.0 Specification, section 3.4); other
+/// - Lengths of glTF and GLB are metres (Khronos Group, glTF 2.0, section 3.4); other
 ///   formats leave the units to whoever made the file.
 /// - The transforms of the file's nodes are applied. A mesh that stands in a scene ten times
 ///   becomes ten objects that share it, each with its transform; where a mesh stands once, its

@@ -1,38 +1,18 @@
 #include "tests/quarn/Pictures.h"
-#include "tests/quarn/Recording.h"
+#include "tests/quarn/PlacedHouse.h"
 
 #include <array>
-#include <fstream>
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
-#include <sstream>
 
 namespace quarn::test {
 namespace {
-
-/// The house with 4,500,000, 5,200,000 and 100 added to its coordinates.
-void writeSurveyedHouse(const Studio& studio) {
-    std::istringstream near(readFile(studio / "house.obj"));
-    std::ofstream far(studio / "far.obj");
-    far.precision(15);
-    for (std::string line; std::getline(near, line);) {
-        std::istringstream words(line);
-        std::string word;
-        double x = 0.0;
-        double y = 0.0;
-        double z = 0.0;
-        if (words >> word >> x >> y >> z && word == "v")
-            far << "v " << 4.5e6 + x << ' ' << 5.2e6 + y << ' ' << 100.0 + z << '\n';
-        else
-            far << line << '\n';
-    }
-}
 
 /// Records the house at the origin and the far one, and compares their frames.
 /// @param targets  of the one and of the other; empty: found by the program
 void expectSameFrames(const std::array<std::string, 2>& targets) {
     const Studio studio;
-    writeSurveyedHouse(studio);
+    writePlacedHouse(studio, "far.obj", 1.0, {4.5e6, 5.2e6, 100.0});
     for (const char* const mode : {"Rendered", "Shaded", "Drawing"}) {
         const auto recorded = [&](const std::string& name, const std::string& target) {
             std::vector<std::string> options = {"--mode", mode,      "--format", "bmp",

@@ -1,3 +1,4 @@
+#include "tests/quarn/CaptureWays.h"
 #include "tests/quarn/Pictures.h"
 #include "tests/quarn/Recording.h"
 
@@ -76,14 +77,7 @@ TEST_P(SameFrames, ComeWhereNumbersHaveADecimalComma) {
     EXPECT_EQ(recorded(with_comma, studio / "comma"), recordedInto("point"));
 }
 
-INSTANTIATE_TEST_SUITE_P(Modes, SameFrames,
-                         testing::Values("Wireframe", "Shaded", "Rendered", "Translucent", "X-Ray",
-                                         "Drawing", "Clay", "RenderFull", "RenderPreview"),
-                         [](const auto& mode) {
-                             std::string name = mode.param;
-                             std::erase(name, '-');
-                             return name;
-                         });
+INSTANTIATE_TEST_SUITE_P(Modes, SameFrames, everyWayOfCapture(), nameOfWay);
 
 } // namespace
 } // namespace quarn::test

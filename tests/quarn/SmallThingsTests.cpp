@@ -1,39 +1,19 @@
+#include "tests/quarn/CaptureWays.h"
 #include "tests/quarn/Pictures.h"
-#include "tests/quarn/Recording.h"
+#include "tests/quarn/PlacedHouse.h"
 
-#include <fstream>
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
-#include <sstream>
 
 namespace quarn::test {
 namespace {
-
-/// The house, which is 4 long, at a length of a millionth.
-void writeTinyHouse(const Studio& studio) {
-    std::istringstream large(readFile(studio / "house.obj"));
-    std::ofstream tiny(studio / "tiny.obj");
-    tiny.precision(15);
-    constexpr double scale = 0.25e-6;
-    for (std::string line; std::getline(large, line);) {
-        std::istringstream words(line);
-        std::string word;
-        double x = 0.0;
-        double y = 0.0;
-        double z = 0.0;
-        if (words >> word >> x >> y >> z && word == "v")
-            tiny << "v " << scale * x << ' ' << scale * y << ' ' << scale * z << '\n';
-        else
-            tiny << line << '\n';
-    }
-}
 
 /// Every way of capture.
 class SmallThings : public testing::TestWithParam<const char*> {};
 
 TEST_P(SmallThings, AModelOfAMillionthLooksAsItDoesAtItsSize) {
     const Studio studio;
-    writeTinyHouse(studio);
+    writePlacedHouse(studio, "tiny.obj", 0.25e-6, {});
     for (const std::string name : {"house", "tiny"}) {
         const Ended ended = run(studio.turntableOf(
             name + ".obj", 2,
@@ -59,14 +39,7 @@ TEST_P(SmallThings, APictureOfOnePixelIsRecorded) {
     EXPECT_EQ(header->height_px, 1);
 }
 
-INSTANTIATE_TEST_SUITE_P(Modes, SmallThings,
-                         testing::Values("Wireframe", "Shaded", "Rendered", "Translucent", "X-Ray",
-                                         "Drawing", "Clay", "RenderFull", "RenderPreview"),
-                         [](const auto& mode) {
-                             std::string name = mode.param;
-                             std::erase(name, '-');
-                             return name;
-                         });
+INSTANTIATE_TEST_SUITE_P(Modes, SmallThings, everyWayOfCapture(), nameOfWay);
 
 } // namespace
 } // namespace quarn::test
