@@ -1,4 +1,7 @@
-"""Writes the hills that every program of the comparison draws, as a binary PLY file."""
+"""Writes the hills that every program of the comparison draws, as a binary PLY file.
+
+usage: hills.py SIZE FILE
+"""
 
 import array
 import math
@@ -47,3 +50,7 @@ def write(path, cells):
         file.write(header.encode("ascii"))
         file.write(points.tobytes())
         file.write(triangles(cells))
+
+
+if __name__ == "__main__":
+    write(sys.argv[2], CELLS[sys.argv[1]])
