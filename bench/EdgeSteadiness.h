@@ -1,8 +1,8 @@
 #pragma once
 
 #include "host/display/CameraRays.h"
-#include "host/display/kernel/FrameSetup.h"
 #include "host/display/Image.h"
+#include "host/display/kernel/FrameSetup.h"
 
 #include <algorithm>
 #include <cmath>
@@ -51,8 +51,7 @@ inline float nearestAround(const quarn::DepthImage& depth, int x, int y) {
 
 inline bool colorSteps(const quarn::Image& image, int x, int y, int other_x, int other_y) {
     for (std::size_t c = 0; c < 3; ++c)
-        if (std::abs(image.pixel(x, y)[c] - image.pixel(other_x, other_y)[c]) >
-            quarn::visible_step)
+        if (std::abs(image.pixel(x, y)[c] - image.pixel(other_x, other_y)[c]) > quarn::visible_step)
             return true;
     return false;
 }

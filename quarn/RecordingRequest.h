@@ -19,9 +19,9 @@ struct RecordingRequest {
     std::string name; ///< of the animation, its pictures and its page; UTF-8
     int frames;
     PixelSize size;
-    std::string capture_option;      ///< as the capture prompt knows it, with its underscore
-    int samples = 0; ///< of each pixel, by the render method; 0: as the document has it
-    std::string format;              ///< "jpg", "png", "bmp" or "tga"
+    std::string capture_option; ///< as the capture prompt knows it, with its underscore
+    int samples = 0;            ///< of each pixel, by the render method; 0: as the document has it
+    std::string format;         ///< "jpg", "png", "bmp" or "tga"
     std::vector<std::string> hidden; ///< names of objects; UTF-8
     std::filesystem::path document;  ///< to save, a .quarn file; empty: none
 };

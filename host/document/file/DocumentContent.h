@@ -95,7 +95,7 @@ struct DocumentContent {
     std::vector<ObjectContent> objects;
     std::vector<ViewContent> views;
     std::vector<CameraContent> cameras;
-    std::vector<EdgesContent> edges;  ///< each display mode once
+    std::vector<EdgesContent> edges;         ///< each display mode once
     std::optional<RenderSettings> rendering; ///< none: those that a new document has
     std::vector<LightContent> lights; ///< by ascending index, each below settings.light_slots
     std::vector<PlugInContent> plug_ins;

@@ -74,8 +74,7 @@ bool stepsVisibly(const Image& image, int x, int y, int other_x, int other_y) {
     if (other_x < 0 || other_y < 0 || other_x >= image.width || other_y >= image.height)
         return false;
     for (std::size_t c = 0; c < 3; ++c)
-        if (std::abs(image.pixel(x, y)[c] - image.pixel(other_x, other_y)[c]) >
-            visible_step)
+        if (std::abs(image.pixel(x, y)[c] - image.pixel(other_x, other_y)[c]) > visible_step)
             return true;
     return false;
 }
