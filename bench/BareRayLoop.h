@@ -1,8 +1,8 @@
 #pragma once
 
-#include "host/display/CameraRays.h"
-#include "host/display/FlushDenormals.h"
-#include "host/display/RayHandle.h"
+#include "engine/display/CameraRays.h"
+#include "engine/display/FlushDenormals.h"
+#include "engine/display/RayHandle.h"
 #include "kelmar/KM_Light.h"
 #include "kelmar/KM_Mesh.h"
 #include "kelmar/KM_Viewport.h"

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "host/display/CameraRays.h"
-#include "host/display/Image.h"
-#include "host/display/kernel/FrameSetup.h"
+#include "engine/display/CameraRays.h"
+#include "engine/display/kernel/FrameSetup.h"
+#include "engine/images/Image.h"
 
 #include <algorithm>
 #include <cmath>

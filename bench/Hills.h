@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/display/SceneContent.h"
+#include "engine/scene/SceneContent.h"
 #include "kelmar/KM_Light.h"
 #include "kelmar/KM_Mesh.h"
 #include "kelmar/KM_Viewport.h"

@@ -2,9 +2,9 @@
 
 #include "bench/Hills.h"
 #include "bench/Timing.h"
+#include "engine/scene/SceneContent.h"
 #include "examples/pavilion/Pavilion.h"
-#include "host/display/SceneContent.h"
-#include "host/import/ModelFile.h"
+#include "import/ModelFile.h"
 
 #include <filesystem>
 #include <string>

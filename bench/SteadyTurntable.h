@@ -1,10 +1,10 @@
 #pragma once
 
 #include "bench/EdgeSteadiness.h"
-#include "host/app/Result.h"
-#include "host/display/ColorSpace.h"
-#include "host/display/DisplayPipeline.h"
-#include "host/display/DisplayScene.h"
+#include "engine/display/DisplayPipeline.h"
+#include "engine/display/DisplayScene.h"
+#include "engine/images/ColorSpace.h"
+#include "ground/Result.h"
 #include "kelmar/KM_Viewport.h"
 
 #include <array>

@@ -8,7 +8,7 @@
 #include "bench/Pavilion.h"
 #include "bench/SteadyTurntable.h"
 #include "bench/Timing.h"
-#include "host/display/DisplayMode.h"
+#include "engine/display/DisplayMode.h"
 
 #include <cstdio>
 #include <memory>

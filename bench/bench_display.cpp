@@ -9,9 +9,9 @@
 #include "bench/BareRayLoop.h"
 #include "bench/Hills.h"
 #include "bench/Timing.h"
-#include "host/display/DisplayMode.h"
-#include "host/display/DisplayPipeline.h"
-#include "host/display/DisplayScene.h"
+#include "engine/display/DisplayMode.h"
+#include "engine/display/DisplayPipeline.h"
+#include "engine/display/DisplayScene.h"
 
 #include <algorithm>
 #include <cstdio>

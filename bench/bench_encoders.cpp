@@ -4,11 +4,11 @@
 #include "bench/Pavilion.h"
 #include "bench/SteadyTurntable.h"
 #include "bench/Timing.h"
-#include "host/app/AtomicFile.h"
-#include "host/display/DisplayMode.h"
-#include "host/display/DisplayPipeline.h"
-#include "host/display/DisplayScene.h"
-#include "host/display/ImageFile.h"
+#include "engine/display/DisplayMode.h"
+#include "engine/display/DisplayPipeline.h"
+#include "engine/display/DisplayScene.h"
+#include "engine/images/ImageFile.h"
+#include "ground/AtomicFile.h"
 
 #include <cstddef>
 #include <cstdio>

@@ -5,7 +5,7 @@
 // once, so that each of many frames takes as long as each of a few.
 
 #include "host/front_end/ScriptedFrontEnd.h"
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 #include "sdk/qncore/qncore.h"
 #include "tests/support/TempFolder.h"
 

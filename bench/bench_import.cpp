@@ -3,10 +3,11 @@
 // program of its own, so that the most memory it ever held is that format's; the best of several
 // such programs counts.
 
-#include "host/display/DisplayScene.h"
+#include "engine/display/DisplayScene.h"
 #include "host/document/file/DocumentCoding.h"
+#include "host/document/file/DocumentExtension.h"
 #include "host/document/file/DocumentFile.h"
-#include "host/import/ModelFile.h"
+#include "import/ModelFile.h"
 
 #include <algorithm>
 #include <array>

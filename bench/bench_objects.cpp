@@ -3,9 +3,9 @@
 // Memory is what the program holds more than before; what the boxes gave back may serve the copies.
 
 #include "bench/Timing.h"
-#include "host/display/DisplayPipeline.h"
-#include "host/display/DisplayScene.h"
-#include "host/import/ModelFile.h"
+#include "engine/display/DisplayPipeline.h"
+#include "engine/display/DisplayScene.h"
+#include "import/ModelFile.h"
 #include "kelmar/KM_Viewport.h"
 
 #include <cmath>

@@ -6,7 +6,7 @@
 #include "bench/Timing.h"
 #include "host/document/DocumentList.h"
 #include "host/front_end/ScriptedFrontEnd.h"
-#include "host/front_end/ViewPicking.h"
+#include "host/session/ViewPicking.h"
 #include "kelmar/KM_PolylineCurve.h"
 
 #include <cstdio>

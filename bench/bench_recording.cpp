@@ -4,7 +4,7 @@
 // difference holds on a busy machine too.
 
 #include "host/front_end/ScriptedFrontEnd.h"
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 #include "sdk/qncore/qncore.h"
 
 #include <algorithm>

@@ -3,8 +3,8 @@
 // their bytes (0 to 255).
 
 #include "bench/Pavilion.h"
-#include "host/display/DisplayScene.h"
-#include "host/render/Renderer.h"
+#include "engine/display/DisplayScene.h"
+#include "engine/render/Renderer.h"
 #include "kelmar/KM_Viewport.h"
 
 #include <cmath>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/front_end/Completion.h"
+#include "host/session/Completion.h"
 
 #include <functional>
 #include <string>

@@ -1,6 +1,6 @@
 #include "quarn/PlaceList.h"
 
-#include "host/front_end/Cities.h"
+#include "host/cities/Cities.h"
 #include "quarn/StudySite.h"
 #include "quarn/Words.h"
 

@@ -1,6 +1,6 @@
 #include "quarn/PromptText.h"
 
-#include "host/front_end/Completion.h"
+#include "host/session/Completion.h"
 #include "quarn/TextWidth.h"
 
 #include <algorithm>

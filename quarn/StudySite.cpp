@@ -1,6 +1,6 @@
 #include "quarn/StudySite.h"
 
-#include "host/front_end/Cities.h"
+#include "host/cities/Cities.h"
 #include "quarn/Words.h"
 
 #include <cmath>

@@ -1,7 +1,7 @@
 #include "quarn/TypedPlace.h"
 
-#include "host/front_end/Cities.h"
-#include "host/front_end/LocationChoice.h"
+#include "host/cities/Cities.h"
+#include "host/cities/LocationChoice.h"
 #include "quarn/Words.h"
 
 #include <algorithm>

@@ -3,7 +3,7 @@
 #include "desktop/Texts.h"
 #include "desktop/animation/ProgressRow.h"
 #include "desktop/window/CommandStarter.h"
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 #include "sdk/qncore/QnView.h"
 
 #include <QAction>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/front_end/AnimationState.h"
+#include "host/session/AnimationState.h"
 #include "sdk/qncore/QnDoc.h"
 
 #include <QString>

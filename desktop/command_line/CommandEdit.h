@@ -1,7 +1,7 @@
 #pragma once
 
 #include "desktop/command_line/LineHistory.h"
-#include "host/front_end/Completion.h"
+#include "host/session/Completion.h"
 
 #include <QLineEdit>
 #include <QListWidget>

@@ -3,7 +3,7 @@
 #include "desktop/command_line/CommandEdit.h"
 #include "desktop/command_line/OutputPane.h"
 #include "desktop/command_line/PromptStrip.h"
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 
 #include <QEventLoop>
 #include <QFrame>

@@ -2,7 +2,7 @@
 
 #include "desktop/Texts.h"
 #include "desktop/command_line/FlowLayout.h"
-#include "host/front_end/Completion.h"
+#include "host/session/Completion.h"
 
 #include <QHBoxLayout>
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/front_end/Cities.h"
+#include "host/cities/Cities.h"
 
 #include <QAbstractTableModel>
 

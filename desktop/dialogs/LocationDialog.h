@@ -1,7 +1,7 @@
 #pragma once
 
+#include "host/cities/LocationChoice.h"
 #include "host/front_end/FrontEndChoices.h"
-#include "host/front_end/LocationChoice.h"
 
 #include <QDialog>
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "host/front_end/Cities.h"
-#include "host/front_end/LocationChoice.h"
+#include "host/cities/Cities.h"
+#include "host/cities/LocationChoice.h"
 
 #include <QPointF>
 #include <QRectF>

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "desktop/dialogs/MapFrame.h"
-#include "host/front_end/Cities.h"
+#include "host/cities/Cities.h"
 #include "host/front_end/FrontEndChoices.h"
 
 #include <QPixmap>

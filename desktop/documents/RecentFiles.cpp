@@ -3,7 +3,7 @@
 #include "desktop/Texts.h"
 #include "desktop/documents/StartedLine.h"
 #include "desktop/window/CommandStarter.h"
-#include "host/front_end/DocumentState.h"
+#include "host/session/DocumentState.h"
 
 #include <QSettings>
 

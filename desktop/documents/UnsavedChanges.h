@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 
 #include <QObject>
 #include <QWidget>

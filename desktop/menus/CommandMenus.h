@@ -1,7 +1,7 @@
 #pragma once
 
 #include "desktop/menus/MenuTable.h"
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 
 #include <QAction>
 #include <QMenuBar>

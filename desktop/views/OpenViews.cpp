@@ -1,7 +1,7 @@
 #include "desktop/views/OpenViews.h"
 
 #include "desktop/Texts.h"
-#include "host/front_end/ViewFrame.h"
+#include "host/session/ViewFrame.h"
 
 namespace quarn::desktop {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/front_end/ViewPicking.h"
+#include "host/session/ViewPicking.h"
 #include "sdk/qncore/QnDoc.h"
 
 #include <QString>

@@ -8,9 +8,9 @@
 #include "desktop/views/ViewMouse.h"
 #include "desktop/views/ViewWidget.h"
 #include "desktop/window/CommandStarter.h"
-#include "host/front_end/AnimationState.h"
-#include "host/front_end/DocumentState.h"
-#include "host/front_end/ViewFrame.h"
+#include "host/session/AnimationState.h"
+#include "host/session/DocumentState.h"
+#include "host/session/ViewFrame.h"
 
 #include <QVBoxLayout>
 

@@ -2,7 +2,7 @@
 
 #include "desktop/views/OpenViews.h"
 #include "desktop/views/ViewWidget.h"
-#include "host/front_end/ViewFrame.h"
+#include "host/session/ViewFrame.h"
 
 #include <QElapsedTimer>
 

@@ -5,7 +5,7 @@
 #include "desktop/views/SizeMenu.h"
 #include "desktop/views/ViewWidget.h"
 #include "desktop/window/CommandStarter.h"
-#include "host/front_end/ViewFrame.h"
+#include "host/session/ViewFrame.h"
 
 namespace quarn::desktop {
 

@@ -7,9 +7,9 @@
 #include "desktop/views/ViewDrawing.h"
 #include "desktop/views/ViewWidget.h"
 #include "desktop/window/CommandStarter.h"
-#include "host/front_end/DocumentState.h"
-#include "host/front_end/ViewFrame.h"
-#include "host/front_end/ViewNavigation.h"
+#include "host/session/DocumentState.h"
+#include "host/session/ViewFrame.h"
+#include "host/session/ViewNavigation.h"
 
 #include <QApplication>
 #include <QMouseEvent>

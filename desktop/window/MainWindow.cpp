@@ -16,7 +16,7 @@
 #include "desktop/views/ViewArea.h"
 #include "desktop/window/CommandStarter.h"
 #include "desktop/window/WindowActions.h"
-#include "host/front_end/DocumentState.h"
+#include "host/session/DocumentState.h"
 
 #include <QApplication>
 #include <QCloseEvent>

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "desktop/front_end/DesktopFrontEnd.h"
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 
 #include <QMainWindow>
 

@@ -1,8 +1,7 @@
 #include "host/app/Application.h"
 
-#include "host/app/PathText.h"
-#include "host/commands/HostCommands.h"
-#include "host/display/DisplayModeList.h"
+#include "ground/PathText.h"
+#include "host/document/DisplayModeList.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
 namespace quarn {
@@ -46,7 +45,6 @@ Application::Application(FrontEnd& front_end, SessionOptions options)
     if (!m_options.program_locale_folder.empty())
         loadTexts("program", {m_options.program_locale_folder});
     DisplayModeList::instance().localize();
-    registerHostCommands();
     m_documents = std::make_unique<DocumentList>(front_end);
     m_documents->openNew();
     m_plug_ins = std::make_unique<PlugInLoader>(*this);
@@ -70,8 +68,8 @@ void Application::loadTexts(const std::string& owner,
         tell(loaded.message());
 }
 
-void Application::registerHostCommands() {
-    m_host_commands = makeHostCommands();
+void Application::addHostCommands(std::vector<std::unique_ptr<CQuarnCommand>> commands) {
+    m_host_commands = std::move(commands);
     for (const std::unique_ptr<CQuarnCommand>& command : m_host_commands) {
         if (Result<void> added = m_commands.add(*command); !added)
             tell(added.message());

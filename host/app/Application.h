@@ -2,12 +2,12 @@
 
 #include "host/app/CommandRegistry.h"
 #include "host/app/CommandRunner.h"
-#include "host/app/Contract.h"
 #include "host/app/PlugInLoader.h"
 #include "host/app/StringTables.h"
+#include "host/border/Contract.h"
 #include "host/document/DocumentList.h"
 #include "host/front_end/FrontEnd.h"
-#include "host/front_end/Session.h"
+#include "host/front_end/SessionOptions.h"
 
 #include <filesystem>
 #include <map>
@@ -24,7 +24,7 @@ namespace quarn {
 /// names no other.
 class Application {
 public:
-    /// Starts with one new document, the host's commands and the host's texts.
+    /// Starts with one new document and the host's texts.
     Application(FrontEnd& front_end, SessionOptions options);
     /// Closes the documents, then unloads the plug-ins, the last loaded first. What plug-ins have
     /// seen of documents and views stays as in DocumentList until they are unloaded.
@@ -37,6 +37,9 @@ public:
     /// The application, for a call that belongs on the main thread; null when none runs, and on
     /// every other thread, which is reported as a breach.
     static Application* forCall(const char* call);
+
+    /// Registers the host's own commands; one that cannot be is told.
+    void addHostCommands(std::vector<std::unique_ptr<CQuarnCommand>> commands);
 
     FrontEnd& frontEnd() const { return m_front_end; }
     const SessionOptions& options() const { return m_options; }
@@ -70,7 +73,6 @@ public:
 
 private:
     void loadTexts(const std::string& owner, const std::vector<std::filesystem::path>& folders);
-    void registerHostCommands();
 
     FrontEnd& m_front_end;
     SessionOptions m_options;

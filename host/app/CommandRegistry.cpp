@@ -1,6 +1,6 @@
 #include "host/app/CommandRegistry.h"
 
-#include "host/app/Border.h"
+#include "host/border/Border.h"
 
 #include <algorithm>
 

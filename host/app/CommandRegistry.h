@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/app/Result.h"
+#include "ground/Result.h"
 #include "sdk/qncore/QnCommand.h"
 
 #include <string_view>

@@ -1,9 +1,9 @@
 #include "host/app/CommandRunner.h"
 
+#include "ground/PathText.h"
+#include "ground/TextLines.h"
 #include "host/app/Application.h"
-#include "host/app/Border.h"
-#include "host/app/PathText.h"
-#include "host/app/TextLines.h"
+#include "host/border/Border.h"
 
 namespace quarn {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/prompt/CommandLine.h"
+#include "host/app/CommandLine.h"
 #include "sdk/qncore/QnCommand.h"
 
 #include <deque>

@@ -1,7 +1,7 @@
 #include "host/app/PlugInChunks.h"
 
 #include "host/app/Application.h"
-#include "host/app/Border.h"
+#include "host/border/Border.h"
 #include "host/document/file/FileRemainder.h"
 #include "sdk/qncore/QnFileOptions.h"
 

@@ -1,6 +1,6 @@
 #include "host/app/PlugInExports.h"
 
-#include "host/app/Border.h"
+#include "host/border/Border.h"
 #include "sdk/qncore/QnExport.h"
 
 namespace quarn {

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/app/LibraryFile.h"
-#include "host/front_end/Session.h"
+#include "host/front_end/PlugInLoad.h"
 
 #include <string>
 

@@ -1,11 +1,11 @@
 #include "host/app/PlugInLoader.h"
 
 #include "host/app/Application.h"
-#include "host/app/Border.h"
 #include "host/app/FileOptionsAccess.h"
 #include "host/app/PlugInChunks.h"
 #include "host/app/PlugInExports.h"
-#include "host/display/DisplayModeList.h"
+#include "host/border/Border.h"
+#include "host/document/DisplayModeList.h"
 #include "host/document/file/FileRemainder.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 #include "sdk/vexui/VexUi.h"

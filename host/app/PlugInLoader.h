@@ -2,7 +2,7 @@
 
 #include "host/app/LibraryFile.h"
 #include "host/app/PendingObjects.h"
-#include "host/front_end/Session.h"
+#include "host/front_end/PlugInLoad.h"
 #include "kelmar/KM_Uuid.h"
 
 #include <filesystem>

@@ -1,6 +1,6 @@
 #include "sdk/qncore/QnDateTime.h"
 
-#include "host/app/CalendarDay.h"
+#include "host/sun/CalendarDay.h"
 
 #include <cwchar>
 #include <tuple>

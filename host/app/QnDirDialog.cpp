@@ -1,7 +1,7 @@
 #include "sdk/qncore/QnDirDialog.h"
 
+#include "ground/PathText.h"
 #include "host/app/Application.h"
-#include "host/app/PathText.h"
 
 namespace {
 

@@ -1,8 +1,8 @@
 #include "sdk/qncore/QnFileUtilities.h"
 
+#include "ground/PathText.h"
 #include "host/app/Application.h"
 #include "host/app/DocumentsFolder.h"
-#include "host/app/PathText.h"
 
 #include <sys/stat.h>
 

@@ -1,8 +1,8 @@
 #include "sdk/qncore/QnTextFile.h"
 
-#include "host/app/AtomicFile.h"
-#include "host/app/PathText.h"
-#include "host/app/TextEncoding.h"
+#include "ground/AtomicFile.h"
+#include "ground/PathText.h"
+#include "ground/TextEncoding.h"
 
 #include <unistd.h>
 

@@ -1,6 +1,6 @@
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
-#include "host/app/Contract.h"
+#include "host/border/Contract.h"
 
 namespace {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/app/Result.h"
+#include "ground/Result.h"
 
 #include <filesystem>
 #include <map>

@@ -1,6 +1,6 @@
 #include "host/commands/AnimationText.h"
 
-#include "host/app/Border.h"
+#include "host/border/Border.h"
 #include "host/document/Document.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 

@@ -4,9 +4,9 @@
 #include "host/commands/ObjectNaming.h"
 #include "host/commands/PointPrompt.h"
 #include "host/commands/WordsLeft.h"
-#include "host/document/CurveEditing.h"
+#include "host/curves/CurveEditing.h"
+#include "host/curves/EvenSpeed.h"
 #include "host/document/Document.h"
-#include "host/document/EvenSpeed.h"
 
 #include <algorithm>
 

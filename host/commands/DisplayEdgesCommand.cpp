@@ -1,6 +1,6 @@
+#include "engine/display/DisplayMode.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/HostCommands.h"
-#include "host/display/DisplayMode.h"
 #include "host/document/Document.h"
 #include "sdk/qncore/QnGet.h"
 

@@ -1,6 +1,6 @@
 #include "host/commands/CommandEnd.h"
 #include "host/commands/HostCommands.h"
-#include "host/display/DisplayModeList.h"
+#include "host/document/DisplayModeList.h"
 #include "host/document/Document.h"
 #include "sdk/qncore/QnGet.h"
 

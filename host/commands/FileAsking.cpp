@@ -1,10 +1,11 @@
 #include "host/commands/FileAsking.h"
 
+#include "ground/PathText.h"
 #include "host/app/Application.h"
 #include "host/app/DocumentsFolder.h"
-#include "host/app/PathText.h"
 #include "host/commands/WordsLeft.h"
-#include "host/front_end/OpenableFiles.h"
+#include "host/document/file/DocumentExtension.h"
+#include "import/ModelExtensions.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLocalize.h"
 
@@ -36,8 +37,13 @@ const wchar_t* titleFor(FileUse use) {
     return QnLocalizeString(L"Open a file with its program", 42508);
 }
 
+/// Without the dot.
+std::string documentExtension() {
+    return DOCUMENT_EXTENSION + 1;
+}
+
 FileKind documents() {
-    return {QnLocalizeString(L"Quarn documents", 42511), {documentFileExtension()}};
+    return {QnLocalizeString(L"Quarn documents", 42511), {documentExtension()}};
 }
 
 FileKind models() {
@@ -46,7 +52,7 @@ FileKind models() {
 
 FileKind documentsAndModels() {
     FileKind both{QnLocalizeString(L"Documents and models", 42510), modelFileExtensions()};
-    both.extensions.insert(both.extensions.begin(), documentFileExtension());
+    both.extensions.insert(both.extensions.begin(), documentExtension());
     return both;
 }
 

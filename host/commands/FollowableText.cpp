@@ -2,7 +2,7 @@
 
 #include "host/commands/ObjectNaming.h"
 #include "host/commands/PointText.h"
-#include "host/document/CurveEditing.h"
+#include "host/curves/CurveEditing.h"
 
 namespace quarn {
 

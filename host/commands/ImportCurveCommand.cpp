@@ -1,12 +1,12 @@
+#include "ground/PathText.h"
 #include "host/app/Application.h"
-#include "host/app/PathText.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/ObjectNaming.h"
 #include "host/commands/ReplacedObject.h"
+#include "host/curves/CurveFile.h"
 #include "host/document/Document.h"
-#include "host/import/CurveFile.h"
 #include "sdk/qncore/QnGet.h"
 
 namespace quarn {

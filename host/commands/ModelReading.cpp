@@ -1,10 +1,12 @@
 #include "host/commands/ModelReading.h"
 
+#include "ground/PathText.h"
 #include "host/app/Application.h"
-#include "host/app/PathText.h"
+#include "host/app/DocumentSaving.h"
 #include "host/commands/CommandEnd.h"
 #include "host/document/DocumentList.h"
 #include "host/document/ViewFit.h"
+#include "host/document/file/DocumentExtension.h"
 #include "host/document/file/DocumentFile.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLocalize.h"

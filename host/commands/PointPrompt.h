@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/commands/PointQuestion.h"
-#include "host/document/CurveMaking.h"
+#include "host/curves/CurveMaking.h"
 #include "host/document/ObjectTable.h"
 #include "sdk/qncore/QnGet.h"
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/app/Result.h"
+#include "ground/Result.h"
 #include "kelmar/KM_Point.h"
 #include "kelmar/KM_wString.h"
 

@@ -6,6 +6,7 @@
 #include "host/document/Document.h"
 #include "sdk/qncore/QnGet.h"
 
+#include "engine/render/RenderRequest.h"
 namespace quarn {
 
 namespace {
@@ -62,7 +63,7 @@ private:
         get.SetCommandPrompt(QnLocalizeString(L"Samples of each pixel", 42361));
         get.SetDefaultInteger(samples);
         get.SetLowerLimit(1);
-        get.SetUpperLimit(RenderSettings::most_samples);
+        get.SetUpperLimit(RenderRequest::most_samples);
         if (get.GetNumber() == CQuarnGet::number)
             samples = get.Number();
         return get.CommandResult();

@@ -1,5 +1,6 @@
 #include "host/commands/RenderSettingsForm.h"
 
+#include "engine/render/RenderRequest.h"
 #include "host/commands/FormAsking.h"
 #include "host/document/ViewState.h"
 
@@ -14,7 +15,7 @@ RenderSettingsForm::RenderSettingsForm(const RenderSettings& present, int view_w
 
 void RenderSettingsForm::DoDataExchange(CQnDialogExchange& exchange) {
     constexpr int most_px = ViewState::largest_side_px;
-    constexpr int most_samples = RenderSettings::most_samples;
+    constexpr int most_samples = RenderRequest::most_samples;
     exchangeWhole(exchange, width_id, settings.width_px, 1, most_px);
     exchangeWhole(exchange, height_id, settings.height_px, 1, most_px);
     exchangeWhole(exchange, samples_id, settings.samples, 1, most_samples);

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/render/RenderSettings.h"
+#include "host/document/RenderSettings.h"
 #include "sdk/qncore/QnDialog.h"
 
 namespace quarn {

@@ -1,10 +1,11 @@
+#include "ground/PathText.h"
 #include "host/app/Application.h"
-#include "host/app/PathText.h"
+#include "host/app/DocumentSaving.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/document/Document.h"
-#include "host/document/file/DocumentFile.h"
+#include "host/document/file/DocumentExtension.h"
 #include "host/prompt/NumberText.h"
 #include "sdk/qncore/QnGet.h"
 

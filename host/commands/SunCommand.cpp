@@ -1,5 +1,5 @@
 #include "host/app/Application.h"
-#include "host/app/Border.h"
+#include "host/border/Border.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FormAsking.h"
 #include "host/commands/HostCommands.h"
@@ -8,7 +8,7 @@
 #include "host/commands/SunPlacePrompt.h"
 #include "host/commands/SunText.h"
 #include "host/document/Document.h"
-#include "host/document/SunDirection.h"
+#include "host/sun/SunDirection.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 

@@ -1,9 +1,9 @@
 #include "host/commands/SunForm.h"
 
 #include "host/commands/FormAsking.h"
-#include "host/document/SunDirection.h"
 #include "host/prompt/NumberText.h"
 #include "host/prompt/UsersNumber.h"
+#include "host/sun/SunDirection.h"
 #include "sdk/qncore/QnLocalize.h"
 #include "sdk/qncore/QnLocationDialog.h"
 

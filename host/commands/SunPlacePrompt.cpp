@@ -1,11 +1,11 @@
 #include "host/commands/SunPlacePrompt.h"
 
 #include "host/app/Application.h"
+#include "host/cities/CitySpelling.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/NumberPrompt.h"
 #include "host/commands/WordsLeft.h"
 #include "host/prompt/NumberText.h"
-#include "host/sun/CitySpelling.h"
 #include "sdk/qncore/QnGet.h"
 
 #include <cmath>

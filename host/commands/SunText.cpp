@@ -1,8 +1,8 @@
 #include "host/commands/SunText.h"
 
 #include "host/document/DocumentSun.h"
-#include "host/document/SunDirection.h"
 #include "host/prompt/NumberText.h"
+#include "host/sun/SunDirection.h"
 
 #include <cmath>
 

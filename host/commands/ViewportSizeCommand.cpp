@@ -1,9 +1,9 @@
+#include "engine/images/PictureMemory.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FormAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/PictureSizePrompt.h"
 #include "host/commands/ViewportSizeForm.h"
-#include "host/display/PictureMemory.h"
 #include "host/document/Document.h"
 
 namespace quarn {

@@ -1,7 +1,7 @@
 #include "host/commands/ViewportSizeForm.h"
 
+#include "engine/images/PictureMemory.h"
 #include "host/commands/FormAsking.h"
-#include "host/display/PictureMemory.h"
 #include "host/document/ViewState.h"
 
 namespace quarn {

@@ -1,7 +1,7 @@
 #include "host/dialogs/DialogState.h"
 
 #include "host/app/Application.h"
-#include "host/app/Border.h"
+#include "host/border/Border.h"
 #include "host/dialogs/DialogTemplates.h"
 #include "sdk/qncore/QnLocalize.h"
 

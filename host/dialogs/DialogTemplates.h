@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/app/Result.h"
+#include "ground/Result.h"
 #include "host/app/StringTables.h"
 #include "host/front_end/DialogTemplate.h"
 

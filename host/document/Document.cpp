@@ -1,6 +1,7 @@
 #include "host/document/Document.h"
 
-#include "host/display/DisplayMode.h"
+#include "engine/display/DisplayMode.h"
+#include "engine/render/Renderer.h"
 #include "host/document/DocumentList.h"
 #include "host/document/DocumentScene.h"
 #include "host/document/SavedState.h"
@@ -8,8 +9,7 @@
 #include "host/document/StandardViews.h"
 #include "host/document/file/FileRemainder.h"
 #include "host/front_end/FrontEnd.h"
-#include "host/import/ModelFile.h"
-#include "host/render/Renderer.h"
+#include "import/ModelFile.h"
 #include "kelmar/KM_PolylineCurve.h"
 #include "sdk/qncore/QnLocalize.h"
 

@@ -1,12 +1,12 @@
 #pragma once
 
-#include "host/app/Result.h"
+#include "engine/scene/UnitSystem.h"
+#include "ground/Result.h"
 #include "host/document/DocumentSun.h"
 #include "host/document/LightStore.h"
 #include "host/document/ObjectTable.h"
-#include "host/document/UnitSystem.h"
+#include "host/document/RenderWindow.h"
 #include "host/document/ViewState.h"
-#include "host/render/RenderWindow.h"
 #include "sdk/qncore/QnDoc.h"
 
 #include <filesystem>

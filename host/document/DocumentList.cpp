@@ -1,7 +1,7 @@
 #include "host/document/DocumentList.h"
 
-#include "host/display/Image.h"
-#include "host/display/ImageFile.h"
+#include "engine/images/Image.h"
+#include "engine/images/ImageFile.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
 #include <algorithm>

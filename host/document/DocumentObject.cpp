@@ -1,8 +1,8 @@
 #include "host/document/DocumentObject.h"
 
-#include "host/app/Contract.h"
+#include "engine/scene/PlacedMesh.h"
+#include "host/border/Contract.h"
 #include "host/document/DocumentList.h"
-#include "host/document/PlacedMesh.h"
 
 namespace quarn {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/document/Material.h"
+#include "engine/scene/Material.h"
 #include "kelmar/KM_BoundingBox.h"
 #include "kelmar/KM_Curve.h"
 #include "kelmar/KM_Mesh.h"

@@ -1,6 +1,6 @@
 #include "host/document/DocumentScene.h"
 
-#include "host/display/PictureMemory.h"
+#include "engine/images/PictureMemory.h"
 #include "host/document/ObjectTable.h"
 
 #include <algorithm>

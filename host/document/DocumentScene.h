@@ -1,8 +1,8 @@
 #pragma once
 
-#include "host/display/DisplayPipeline.h"
-#include "host/display/DisplayScene.h"
-#include "host/display/SceneContent.h"
+#include "engine/display/DisplayPipeline.h"
+#include "engine/display/DisplayScene.h"
+#include "engine/scene/SceneContent.h"
 
 #include <cstdint>
 #include <span>

@@ -1,6 +1,6 @@
 #include "host/document/DocumentSun.h"
 
-#include "host/app/Contract.h"
+#include "host/border/Contract.h"
 
 namespace quarn {
 

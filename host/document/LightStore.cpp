@@ -1,6 +1,6 @@
 #include "host/document/LightStore.h"
 
-#include "host/app/Contract.h"
+#include "host/border/Contract.h"
 #include "sdk/qncore/QnApp.h"
 #include "sdk/qncore/QnLocalize.h"
 

@@ -1,5 +1,5 @@
-#include "host/app/Border.h"
-#include "host/app/Contract.h"
+#include "host/border/Border.h"
+#include "host/border/Contract.h"
 #include "host/document/DocumentList.h"
 #include "host/front_end/FrontEnd.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"

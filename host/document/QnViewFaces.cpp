@@ -1,5 +1,5 @@
-#include "host/app/Contract.h"
-#include "host/display/Image.h"
+#include "engine/images/Image.h"
+#include "host/border/Contract.h"
 #include "host/document/Document.h"
 #include "host/document/DocumentList.h"
 

@@ -1,6 +1,6 @@
 #include "host/document/SavedState.h"
 
-#include "host/app/Border.h"
+#include "host/border/Border.h"
 #include "host/document/Document.h"
 #include "kelmar/KM_BinaryArchive.h"
 #include "kelmar/KM_Crc32.h"

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/render/RenderSettings.h"
+#include "host/document/RenderSettings.h"
 #include "kelmar/KM_Light.h"
 #include "kelmar/KM_Uuid.h"
 

@@ -1,8 +1,8 @@
 #include "host/document/ViewState.h"
 
-#include "host/display/DisplayModeList.h"
-#include "host/display/Image.h"
+#include "engine/images/Image.h"
 #include "host/document/CameraMove.h"
+#include "host/document/DisplayModeList.h"
 #include "host/document/Document.h"
 #include "host/front_end/FrontEnd.h"
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/app/Result.h"
+#include "ground/Result.h"
 #include "host/sun/SunPosition.h"
 #include "sdk/qncore/QnDateTime.h"
 

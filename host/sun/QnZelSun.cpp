@@ -1,6 +1,6 @@
 #include "sdk/zel/QnZelSun.h"
 
-#include "host/app/CalendarDay.h"
+#include "host/sun/CalendarDay.h"
 #include "host/sun/EarthRotationDelay.h"
 #include "host/sun/SunPosition.h"
 

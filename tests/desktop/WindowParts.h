@@ -3,7 +3,7 @@
 #include "desktop/Texts.h"
 #include "desktop/front_end/DesktopFrontEnd.h"
 #include "desktop/window/CommandStarter.h"
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 #include "tests/support/TempFolder.h"
 
 #include <QApplication>

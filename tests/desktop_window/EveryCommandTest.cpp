@@ -1,5 +1,5 @@
 #include "host/front_end/ScriptedFrontEnd.h"
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 #include "tests/desktop_window/HouseDesk.h"
 
 #include <gtest/gtest.h>

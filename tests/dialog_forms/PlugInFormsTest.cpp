@@ -2,7 +2,7 @@
 #include "desktop/dialogs/LocationDialog.h"
 #include "desktop/dialogs/MessageBox.h"
 #include "desktop/front_end/DesktopFrontEnd.h"
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 #include "tests/desktop/dialogs/DialogDriver.h"
 #include "zoetrix/ui/PathAnimationDialog.h"
 #include "zoetrix/ui/SeasonDialog.h"

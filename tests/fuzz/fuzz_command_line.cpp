@@ -1,7 +1,7 @@
 // A line that a person or a script gives: split into words, read as a command line, and every word
 // read as what a prompt may take it for. The text is taken as UTF-8, as in a script file.
+#include "host/app/CommandLine.h"
 #include "host/commands/PointText.h"
-#include "host/prompt/CommandLine.h"
 #include "host/prompt/NumberText.h"
 #include "host/prompt/OptionPick.h"
 #include "host/prompt/PromptAnswer.h"

@@ -1,7 +1,7 @@
 // Curve files. Whatever the text, it is refused with a reason or makes a curve that can be followed
 // and that has a form of even speed, or none for a reason.
-#include "host/document/EvenSpeed.h"
-#include "host/import/CurveFile.h"
+#include "host/curves/CurveFile.h"
+#include "host/curves/EvenSpeed.h"
 
 #include <cstdint>
 #include <cstdlib>

@@ -46,7 +46,7 @@ constexpr Rule RULES[] = {
      true},
     {"zoetrix/", {"sdk/", "kelmar/", ALL_OF_ZOETRIX}, true, true},
     {"vexui/", {"sdk/", "kelmar/"}, true, false},
-    {"host/cocoa/", {"sdk/", "kelmar/", "host/app/Result.h", "host/front_end/"}, true, false, true},
+    {"host/cocoa/", {"sdk/", "kelmar/", "ground/Result.h", "host/front_end/"}, true, false, true},
     {"host/", {"sdk/", "kelmar/"}, true, false},
     {"quarn/", {"sdk/", "host/front_end/"}, true, false},
     {"desktop/", {"sdk/", "host/front_end/"}, true, false},

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/front_end/ScriptedFrontEnd.h"
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 #include "tests/support/TempFolder.h"
 
 #include <filesystem>

@@ -1,4 +1,4 @@
-#include "host/front_end/ViewFrame.h"
+#include "host/session/ViewFrame.h"
 #include "tests/zoetrix/RecordingFixture.h"
 
 #include <cstdlib>

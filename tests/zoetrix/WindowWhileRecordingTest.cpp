@@ -1,8 +1,8 @@
-#include "host/front_end/AnimationState.h"
-#include "host/front_end/DocumentState.h"
-#include "host/front_end/ViewFrame.h"
-#include "host/front_end/ViewNavigation.h"
-#include "host/front_end/ViewPicking.h"
+#include "host/session/AnimationState.h"
+#include "host/session/DocumentState.h"
+#include "host/session/ViewFrame.h"
+#include "host/session/ViewNavigation.h"
+#include "host/session/ViewPicking.h"
 #include "tests/zoetrix/RecordingFixture.h"
 
 namespace {

@@ -1,5 +1,6 @@
 #include "host/document/file/ContentLayouts.h"
 
+#include "engine/render/RenderRequest.h"
 #include "host/document/LightStore.h"
 #include "host/document/ViewState.h"
 #include "host/document/file/CurveLayout.h"
@@ -55,7 +56,7 @@ bool makesSense(const ViewContent& view) {
 
 bool makesSense(const RenderSettings& settings) {
     const auto isNumberOfSamples = [](int samples) {
-        return samples >= 1 && samples <= RenderSettings::most_samples;
+        return samples >= 1 && samples <= RenderRequest::most_samples;
     };
     return isPictureSide(settings.width_px) && isPictureSide(settings.height_px) &&
            isNumberOfSamples(settings.samples) && isNumberOfSamples(settings.preview_samples);

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/app/Result.h"
+#include "ground/Result.h"
 #include "host/document/file/DocumentContent.h"
 
 #include <cstdint>

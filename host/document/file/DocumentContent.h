@@ -1,9 +1,9 @@
 #pragma once
 
-#include "host/display/DisplayMode.h"
-#include "host/document/Material.h"
-#include "host/document/UnitSystem.h"
-#include "host/render/RenderSettings.h"
+#include "engine/display/DisplayMode.h"
+#include "engine/scene/Material.h"
+#include "engine/scene/UnitSystem.h"
+#include "host/document/RenderSettings.h"
 #include "kelmar/KM_BinaryArchive.h"
 #include "kelmar/KM_Curve.h"
 #include "kelmar/KM_Light.h"

@@ -1,49 +1,19 @@
 #pragma once
 
-#include "host/app/Result.h"
+#include "ground/Result.h"
 #include "host/document/file/DocumentContent.h"
 
 #include <filesystem>
-#include <string>
-#include <vector>
 
 namespace quarn {
 
-class Document;
-
-/// The ending of document files.
-inline constexpr const char* DOCUMENT_EXTENSION = ".quarn";
-
-/// Whether a file is a document by its name, ignoring case.
-bool isDocumentFile(const std::filesystem::path& file);
-
-/// What is written of a document, and for whom.
-struct DocumentSaveOptions {
-    /// From OLDEST_DOCUMENT_VERSION to KM_CURRENT_ARCHIVE_VERSION.
-    int version = KM_CURRENT_ARCHIVE_VERSION;
-    /// Only the selected objects, without views, cameras and lights.
-    bool only_selected = false;
-};
-
-/// Writes a document file with what the document holds and what plug-ins keep in it. The file
-/// appears whole and on the disk, or not at all; a file that was there before stays whole until
-/// then. The document does not change, nor does it remember the file.
+/// Writes a document file. It appears whole and on the disk, or not at all; a file that was there
+/// before stays whole until then.
 /// @return an error that names the file, what could not be written, and why
-Result<void> saveDocument(Document& document, const std::filesystem::path& file,
-                          const DocumentSaveOptions& options = {});
+Result<void> writeDocumentFile(const DocumentContent& content, const std::filesystem::path& file);
 
-/// Reads a document file whole and checks it. No open document is touched.
+/// Reads a document file whole and checks it.
 /// @return an error that names the file and tells what is wrong with it
 Result<DocumentContent> readDocumentFile(const std::filesystem::path& file);
-
-/// Puts the content of a file into the document that was opened for it just now, and hands plug-ins
-/// what they keep in it.
-/// @return what could not be taken over, in sentences for the person
-std::vector<std::string> openContent(Document& document, const DocumentContent& content);
-
-/// Adds the objects, cameras and lights of a file to a document, and hands plug-ins what they keep
-/// in the file: an animation there replaces the one here. Settings and views stay as they are.
-/// @return as openContent
-std::vector<std::string> importContent(Document& document, const DocumentContent& content);
 
 } // namespace quarn

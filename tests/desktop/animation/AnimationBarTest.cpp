@@ -1,7 +1,7 @@
 #include "desktop/animation/AnimationBar.h"
 
 #include "desktop/animation/ProgressRow.h"
-#include "host/front_end/ViewFrame.h"
+#include "host/session/ViewFrame.h"
 #include "sdk/qncore/QnView.h"
 #include "tests/desktop/WindowParts.h"
 

@@ -4,7 +4,7 @@
 #include "desktop/documents/StartedLine.h"
 #include "desktop/documents/UnsavedChanges.h"
 #include "desktop/documents/WindowClosing.h"
-#include "host/front_end/DocumentState.h"
+#include "host/session/DocumentState.h"
 #include "tests/desktop/WindowParts.h"
 
 #include <QCloseEvent>

@@ -1,5 +1,5 @@
-#include "host/front_end/DocumentState.h"
-#include "host/front_end/ViewFrame.h"
+#include "host/session/DocumentState.h"
+#include "host/session/ViewFrame.h"
 #include "tests/desktop/window/WindowFixture.h"
 
 #include <QWheelEvent>

@@ -5,8 +5,8 @@
 #include "sdk/qncore/QnView.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 #include "sdk/vexui/VexUi.h"
-#include "tests/host/app/BreachList.h"
 #include "tests/host/app/TestCommand.h"
+#include "tests/host/border/BreachList.h"
 #include "tests/host/document/DocumentFixtures.h"
 
 #include <thread>

@@ -1,8 +1,8 @@
 #include "sdk/qncore/QnApp.h"
 #include "sdk/qncore/QnDoc.h"
 #include "sdk/qncore/QnGet.h"
-#include "tests/host/app/BreachList.h"
 #include "tests/host/app/TestCommand.h"
+#include "tests/host/border/BreachList.h"
 #include "tests/support/TempFolder.h"
 
 #include <gmock/gmock.h>

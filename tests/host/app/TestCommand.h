@@ -2,7 +2,7 @@
 
 #include "host/app/Application.h"
 #include "host/front_end/ScriptedFrontEnd.h"
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 #include "sdk/qncore/QnCommand.h"
 
 #include <gtest/gtest.h>

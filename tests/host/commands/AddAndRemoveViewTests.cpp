@@ -1,4 +1,4 @@
-#include "host/display/DisplayMode.h"
+#include "engine/display/DisplayMode.h"
 #include "sdk/qncore/QnApp.h"
 #include "tests/host/app/TestCommand.h"
 #include "tests/host/document/DocumentFixtures.h"

@@ -1,5 +1,5 @@
-#include "host/display/DisplayMode.h"
-#include "host/display/Image.h"
+#include "engine/display/DisplayMode.h"
+#include "engine/images/Image.h"
 #include "tests/host/app/TestCommand.h"
 #include "tests/host/document/DocumentFixtures.h"
 

@@ -1,4 +1,4 @@
-#include "host/import/ModelFile.h"
+#include "import/ModelFile.h"
 #include "tests/host/app/TestCommand.h"
 #include "tests/host/document/DocumentFixtures.h"
 

@@ -1,7 +1,7 @@
 #include "host/document/Document.h"
 #include "tests/host/app/TestCommand.h"
 #include "tests/host/document/DocumentFixtures.h"
-#include "tests/host/import/ModelFixtures.h"
+#include "tests/import/ModelFixtures.h"
 
 #include <gmock/gmock.h>
 

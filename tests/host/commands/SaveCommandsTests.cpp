@@ -1,4 +1,4 @@
-#include "host/app/PathText.h"
+#include "ground/PathText.h"
 #include "host/document/file/DocumentFile.h"
 #include "tests/host/app/TestCommand.h"
 #include "tests/host/document/DocumentFixtures.h"

@@ -1,4 +1,4 @@
-#include "host/document/SunDirection.h"
+#include "host/sun/SunDirection.h"
 #include "tests/host/app/TestCommand.h"
 #include "tests/host/document/DocumentFixtures.h"
 

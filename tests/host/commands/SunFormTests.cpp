@@ -1,5 +1,5 @@
 #include "host/commands/SunForm.h"
-#include "host/document/SunDirection.h"
+#include "host/sun/SunDirection.h"
 #include "tests/host/commands/FormFixture.h"
 
 namespace quarn::test {

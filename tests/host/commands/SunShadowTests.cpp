@@ -1,6 +1,6 @@
 #include "host/document/Document.h"
+#include "tests/engine/display/DisplayFixture.h"
 #include "tests/host/app/TestCommand.h"
-#include "tests/host/display/DisplayFixture.h"
 
 namespace quarn::test {
 namespace {

@@ -3,7 +3,7 @@
 #include "host/app/Application.h"
 #include "host/front_end/HeadlessDialogWindow.h"
 #include "host/front_end/ScriptedFrontEnd.h"
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 #include "sdk/qncore/QnDialog.h"
 #include "tests/support/TempFolder.h"
 

@@ -1,6 +1,6 @@
 #include "tests/host/dialogs/DialogFixture.h"
 
-#include "tests/host/app/BreachList.h"
+#include "tests/host/border/BreachList.h"
 
 #include <stdexcept>
 #include <thread>

@@ -1,7 +1,7 @@
-#include "host/display/DisplayMode.h"
+#include "engine/display/DisplayMode.h"
 #include "sdk/qncore/QnApp.h"
-#include "tests/host/app/BreachList.h"
 #include "tests/host/app/TestCommand.h"
+#include "tests/host/border/BreachList.h"
 #include "tests/host/document/DocumentFixtures.h"
 
 #include <gmock/gmock.h>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/display/Image.h"
+#include "engine/images/Image.h"
 #include "host/document/DocumentList.h"
 #include "host/front_end/ScriptedFrontEnd.h"
 #include "kelmar/KM_PolylineCurve.h"

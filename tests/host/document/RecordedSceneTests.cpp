@@ -1,8 +1,8 @@
 #include "host/document/Document.h"
 #include "host/document/DocumentScene.h"
 #include "sdk/qncore/qncore.h"
+#include "tests/engine/display/DisplayFixture.h"
 #include "tests/host/app/TestCommand.h"
-#include "tests/host/display/DisplayFixture.h"
 #include "tests/host/document/DocumentFixtures.h"
 #include "tests/support/TempFolder.h"
 

@@ -1,6 +1,6 @@
 #include "tests/host/document/SampleContent.h"
 
-#include "host/display/DisplayMode.h"
+#include "engine/display/DisplayMode.h"
 #include "kelmar/KM_LineCurve.h"
 #include "kelmar/KM_NurbsCurve.h"
 #include "kelmar/KM_PolylineCurve.h"

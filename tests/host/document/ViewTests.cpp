@@ -1,5 +1,5 @@
-#include "host/display/DisplayMode.h"
-#include "host/display/DisplayModeList.h"
+#include "engine/display/DisplayMode.h"
+#include "host/document/DisplayModeList.h"
 #include "tests/host/document/DocumentFixtures.h"
 
 #include <random>

@@ -1,7 +1,7 @@
 #include "host/document/Document.h"
 #include "sdk/qncore/QnGet.h"
-#include "tests/host/app/BreachList.h"
 #include "tests/host/app/TestCommand.h"
+#include "tests/host/border/BreachList.h"
 #include "tests/host/document/DocumentFixtures.h"
 
 #include <gmock/gmock.h>

@@ -1,6 +1,6 @@
 #include "sdk/qncore/QnGet.h"
-#include "tests/host/app/BreachList.h"
 #include "tests/host/app/TestCommand.h"
+#include "tests/host/border/BreachList.h"
 
 #include <gmock/gmock.h>
 

@@ -2,7 +2,7 @@
 
 #include "host/front_end/HeadlessDialogWindow.h"
 #include "host/front_end/ScriptedFrontEnd.h"
-#include "host/front_end/Session.h"
+#include "host/session/Session.h"
 #include "kelmar/KM_Array.h"
 #include "kelmar/KM_wString.h"
 #include "sdk/qncore/QnDialog.h"

@@ -1,0 +1,200 @@
+#include "engine/display/DisplayScene.h"
+
+#include "engine/display/MipTexture.h"
+#include "engine/images/ColorSpace.h"
+#include "engine/scene/PlacedMesh.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace quarn {
+
+namespace {
+
+constexpr std::size_t no_member = static_cast<std::size_t>(-1);
+
+KM_BoundingBox boxOf(const KM_3dPointArray& points) {
+    KM_BoundingBox box;
+    for (const KM_3dPoint& p : points)
+        box.Set(p);
+    return box;
+}
+
+/// @return true when an object was shown or hidden
+template <class Object>
+bool takeVisibility(const std::vector<Object>& from, std::vector<Object>& to) {
+    bool changed = false;
+    for (std::size_t i = 0; i < to.size(); ++i)
+        changed |= std::exchange(to[i].visible, from[i].visible) != from[i].visible;
+    return changed;
+}
+
+} // namespace
+
+DisplayScene::DisplayScene() = default;
+DisplayScene::~DisplayScene() = default;
+
+Result<void> DisplayScene::update(const SceneContent& content) {
+    if (canKeep(content))
+        updateVisibility(content);
+    else
+        rebuild(content);
+    m_lights = content.lights;
+    const std::string error = m_rays.takeError();
+    if (error.empty())
+        return {};
+    clear();
+    return Error{"The scene cannot be drawn: " + error + ". Close other programs or hide objects."};
+}
+
+bool DisplayScene::canKeep(const SceneContent& content) const {
+    return m_built && content.revision == m_revision && content.meshes.size() == m_meshes.size() &&
+           content.curves.size() == m_curves.size() && content.points.size() == m_points.size();
+}
+
+void DisplayScene::clear() {
+    m_built = false;
+    m_meshes.clear();
+    m_curves.clear();
+    m_points.clear();
+    m_rays.build({});
+    updateBoxes();
+}
+
+void DisplayScene::rebuild(const SceneContent& content) {
+    const MeshCache earlier_meshes = std::exchange(m_mesh_cache, {});
+    TextureCache earlier_textures = std::exchange(m_texture_cache, {});
+    m_meshes.clear();
+    for (const SceneMesh& object : content.meshes)
+        addMesh(object, earlier_meshes);
+    choosePlaces(content);
+    std::vector<RayScene::Member> members;
+    m_member_of_mesh.clear();
+    for (std::size_t i = 0; i < m_meshes.size(); ++i) {
+        const MeshObject& object = m_meshes[i];
+        m_member_of_mesh.push_back(object.mesh ? members.size() : no_member);
+        if (object.mesh)
+            members.push_back({object.mesh,
+                               surfaceOf(content.meshes[i], *object.mesh, earlier_textures),
+                               object.visible, object.frame_from_mesh});
+    }
+    m_rays.build(std::move(members));
+    m_curves = content.curves;
+    m_points = content.points;
+    m_revision = content.revision;
+    m_built = true;
+    updateBoxes();
+}
+
+void DisplayScene::addMesh(const SceneMesh& object, const MeshCache& earlier) {
+    auto& mesh = m_mesh_cache[object.mesh.get()];
+    if (!mesh) {
+        const auto found = earlier.find(object.mesh.get());
+        mesh =
+            found != earlier.end() ? found->second : std::make_shared<const RayMesh>(object.mesh);
+    }
+    const bool drawable = mesh->isDrawable();
+    const bool stands = object.world_from_mesh.IsIdentity();
+    const KM_BoundingBox box = !drawable ? KM_BoundingBox()
+                               : stands  ? mesh->box()
+                                         : boxOfPlaced(*object.mesh, object.world_from_mesh);
+    m_meshes.push_back({drawable ? mesh : nullptr, object.visible, KM_Xform(), box});
+}
+
+/// The origin is one of the objects' own where that is near enough: such objects then need no
+/// transform.
+void DisplayScene::choosePlaces(const SceneContent& content) {
+    KM_BoundingBox box;
+    for (const MeshObject& object : m_meshes)
+        box.Union(object.box);
+    m_origin = nearbyOrigin(box);
+    const double reach = 100.0 * box.Diagonal().Length();
+    for (const SceneMesh& object : content.meshes) {
+        const KM_3dPoint own = object.world_from_mesh * KM_3dPoint::Origin;
+        if (m_origin == KM_3dPoint::Origin || own == m_origin)
+            break;
+        if (own != KM_3dPoint::Origin && own.DistanceTo(box.Center()) < reach) {
+            m_origin = own;
+            break;
+        }
+    }
+    const KM_Xform frame_from_world = KM_Xform::Translation(KM_3dPoint::Origin - m_origin);
+    for (std::size_t i = 0; i < m_meshes.size(); ++i)
+        m_meshes[i].frame_from_mesh = frame_from_world * content.meshes[i].world_from_mesh;
+}
+
+std::size_t DisplayScene::meshOfSurface(std::size_t surface) const {
+    const std::size_t member = m_rays.surfaceMembers()[surface];
+    const auto found = std::ranges::find(m_member_of_mesh, member);
+    return static_cast<std::size_t>(found - m_member_of_mesh.begin());
+}
+
+RaySurface DisplayScene::surfaceOf(const SceneMesh& object, const RayMesh& mesh,
+                                   TextureCache& earlier) {
+    static const Material default_material;
+    const Material& material = object.material ? *object.material : default_material;
+    const LinearColor albedo = linearFromColor(material.base_color);
+    RaySurface surface;
+    surface.triangles = mesh.mesh().m_F.data();
+    surface.vertices = mesh.mesh().m_V.data();
+    surface.corner_normals = mesh.cornerNormals();
+    surface.colors = mesh.mesh().m_C.empty() ? nullptr : mesh.mesh().m_C.data();
+    surface.albedo[0] = albedo.r;
+    surface.albedo[1] = albedo.g;
+    surface.albedo[2] = albedo.b;
+    surface.opacity = static_cast<float>(material.base_color.a) / 255.0F;
+    surface.has_cutout = material.alpha_cutout;
+    surface.alpha_cutoff = material.alpha_cutoff;
+    surface.see_through = material.see_through && !material.alpha_cutout;
+    if (!mesh.mesh().m_T.empty() && material.base_color_texture) {
+        surface.texture_coordinates = mesh.mesh().m_T.data();
+        surface.texture = textureOf(material, earlier);
+    }
+    return surface;
+}
+
+const MipTexture* DisplayScene::textureOf(const Material& material, TextureCache& earlier) {
+    const Texture* const key = material.base_color_texture.get();
+    CachedTexture& cached = m_texture_cache[key];
+    if (const auto found = earlier.find(key); !cached.mips && found != earlier.end())
+        cached = std::move(found->second);
+    if (!cached.mips) {
+        cached.source = material.base_color_texture;
+        cached.mips = std::make_unique<MipTexture>(*cached.source);
+    }
+    return cached.mips.get();
+}
+
+void DisplayScene::updateVisibility(const SceneContent& content) {
+    bool rays_changed = false;
+    for (std::size_t i = 0; i < m_meshes.size(); ++i) {
+        if (m_meshes[i].visible == content.meshes[i].visible)
+            continue;
+        m_meshes[i].visible = content.meshes[i].visible;
+        if (m_member_of_mesh[i] != no_member)
+            m_rays.setVisible(m_member_of_mesh[i], m_meshes[i].visible);
+        rays_changed = true;
+    }
+    if (rays_changed)
+        m_rays.commit();
+    const bool curves_changed = takeVisibility(content.curves, m_curves);
+    const bool points_changed = takeVisibility(content.points, m_points);
+    if (rays_changed || curves_changed || points_changed)
+        updateBoxes();
+}
+
+void DisplayScene::updateBoxes() {
+    m_surface_box = KM_BoundingBox();
+    for (const MeshObject& object : m_meshes)
+        if (object.visible && object.mesh)
+            m_surface_box.Union(object.box);
+    m_box = m_surface_box;
+    for (const SceneCurve& curve : m_curves)
+        if (curve.visible)
+            m_box.Union(boxOf(curve.polyline));
+    for (const ScenePoint& point : m_points)
+        if (point.visible)
+            m_box.Set(point.location);
+}
+
+} // namespace quarn

@@ -1,0 +1,90 @@
+#pragma once
+
+#include "engine/display/RayScene.h"
+#include "engine/scene/SceneContent.h"
+#include "ground/Result.h"
+#include "kelmar/KM_BoundingBox.h"
+
+#include <map>
+#include <memory>
+#include <span>
+#include <vector>
+
+namespace quarn {
+
+class MipTexture;
+
+/// A document's content made ready for drawing. It is kept between frames: a camera animation
+/// rebuilds nothing, and a sun study only changes a direction.
+class DisplayScene {
+public:
+    DisplayScene();
+    ~DisplayScene();
+    DisplayScene(const DisplayScene&) = delete;
+    DisplayScene& operator=(const DisplayScene&) = delete;
+
+    /// Takes over what changed since the last call: everything when the revision is new, else the
+    /// lights and what is shown or hidden. Meshes stay shared with the document. A mesh with
+    /// indices outside its vertices or arrays of different lengths is not drawn.
+    /// @return an error when the ray scene cannot be built; then the scene is empty
+    Result<void> update(const SceneContent& content);
+
+    /// The box of everything that is shown; empty when nothing is.
+    const KM_BoundingBox& boundingBox() const { return m_box; }
+    /// The box of the meshes that are shown.
+    const KM_BoundingBox& surfaceBox() const { return m_surface_box; }
+
+    /// Where the coordinates of the ray scene and of `MeshObject` begin: they are those of the
+    /// world, less this point, so that models far from the origin keep their digits.
+    const KM_3dPoint& origin() const { return m_origin; }
+
+    /// A mesh object for drawing its lines; `mesh` is null when it cannot be drawn.
+    struct MeshObject {
+        std::shared_ptr<const RayMesh> mesh;
+        bool visible = true;
+        KM_Xform frame_from_mesh;
+        KM_BoundingBox box; ///< in the world
+    };
+
+    const RayScene& rays() const { return m_rays; }
+    std::span<const MeshObject> meshes() const { return m_meshes; }
+    /// The mesh object that a surface of the ray scene belongs to, as an index in `meshes`.
+    std::size_t meshOfSurface(std::size_t surface) const;
+    std::span<const SceneCurve> curves() const { return m_curves; }
+    std::span<const ScenePoint> points() const { return m_points; }
+    std::span<const KM_Light> lights() const { return m_lights; }
+
+private:
+    using MeshCache = std::map<const KM_Mesh*, std::shared_ptr<const RayMesh>>;
+    struct CachedTexture {
+        std::shared_ptr<const Texture> source; ///< keeps its address from being used again
+        std::unique_ptr<MipTexture> mips;
+    };
+    using TextureCache = std::map<const Texture*, CachedTexture>;
+
+    bool canKeep(const SceneContent& content) const;
+    void rebuild(const SceneContent& content);
+    void updateVisibility(const SceneContent& content);
+    void updateBoxes();
+    void addMesh(const SceneMesh& object, const MeshCache& earlier);
+    void choosePlaces(const SceneContent& content);
+    void clear();
+    RaySurface surfaceOf(const SceneMesh& object, const RayMesh& mesh, TextureCache& earlier);
+    const MipTexture* textureOf(const Material& material, TextureCache& earlier);
+
+    bool m_built = false;
+    std::uint64_t m_revision = 0;
+    RayScene m_rays;
+    MeshCache m_mesh_cache;
+    TextureCache m_texture_cache;
+    std::vector<MeshObject> m_meshes;
+    std::vector<std::size_t> m_member_of_mesh; ///< index in the ray scene; none: no_member
+    std::vector<SceneCurve> m_curves;
+    std::vector<ScenePoint> m_points;
+    std::vector<KM_Light> m_lights;
+    KM_3dPoint m_origin;
+    KM_BoundingBox m_box;
+    KM_BoundingBox m_surface_box;
+};
+
+} // namespace quarn

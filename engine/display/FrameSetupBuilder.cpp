@@ -1,0 +1,200 @@
+#include "engine/display/FrameSetupBuilder.h"
+
+#include "engine/display/DisplayMode.h"
+#include "engine/display/DisplayScene.h"
+#include "engine/display/DisplayTable.h"
+#include "engine/display/SkyModel.h"
+#include "engine/images/ColorSpace.h"
+#include "kelmar/KM_Viewport.h"
+
+#include <algorithm>
+
+namespace quarn {
+
+namespace {
+
+/// How far surfaces of clay hide the sky from each other.
+constexpr float sky_reach_of_scene = 0.09F;
+
+void set(float (&to)[3], const LinearColor& color) {
+    to[0] = color.r;
+    to[1] = color.g;
+    to[2] = color.b;
+}
+
+void setPoint(float (&to)[3], const KM_3dPoint& point) {
+    to[0] = static_cast<float>(point.x);
+    to[1] = static_cast<float>(point.y);
+    to[2] = static_cast<float>(point.z);
+}
+
+void setScene(FrameSetup& frame, const DisplayScene& scene) {
+    frame.scene = scene.rays().root();
+    frame.sole_first_surface = static_cast<std::int32_t>(scene.rays().soleFirstSurface());
+    if (scene.rays().hasInstances())
+        frame.first_surfaces = scene.rays().firstSurfaces().data();
+    frame.surfaces = scene.rays().surfaces().data();
+    const KM_BoundingBox& box = scene.surfaceBox();
+    if (!box.IsValid())
+        return;
+    const KM_3dVector from_world = KM_3dPoint::Origin - scene.origin();
+    setPoint(frame.scene_min, box.m_min + from_world);
+    setPoint(frame.scene_max, box.m_max + from_world);
+    frame.scene_size = static_cast<float>(box.Diagonal().Length());
+}
+
+/// The camera's rays in the coordinates of the scene.
+CameraRays raysIn(const DisplayScene& scene, const KM_Viewport& viewport, int width, int height) {
+    if (scene.origin() == KM_3dPoint::Origin)
+        return cameraRays(viewport, width, height, scene.boundingBox());
+    const KM_3dVector from_world = KM_3dPoint::Origin - scene.origin();
+    KM_Viewport moved = viewport;
+    moved.SetCameraLocation(viewport.CameraLocation() + from_world);
+    KM_BoundingBox box;
+    for (int i = 0; i < 8 && scene.boundingBox().IsValid(); ++i)
+        box.Set(scene.boundingBox().Corner(i) + from_world);
+    return cameraRays(moved, width, height, box);
+}
+
+FrameLight frameLight(const DirectionalLight& light) {
+    FrameLight result{};
+    std::copy_n(light.toward, 3, result.toward);
+    set(result.color, light.color);
+    result.shadow = light.shadow;
+    return result;
+}
+
+template <std::size_t capacity>
+int setLights(const LightList<capacity>& lights, FrameLight (&to)[capacity]) {
+    std::transform(lights.begin(), lights.end(), to, frameLight);
+    return static_cast<int>(lights.size());
+}
+
+void setLighting(FrameSetup& frame, const Lighting& lighting) {
+    std::copy_n(lighting.ambient.base, 3, frame.ambient_base);
+    for (int c = 0; c < 3; ++c)
+        std::copy_n(lighting.ambient.slope[c], 3, frame.ambient_slope[c]);
+    frame.fixed_count = setLights(lighting.fixed, frame.fixed);
+    frame.sun_count = setLights(lighting.suns, frame.suns);
+    set(frame.sky_horizon, lighting.sky.horizon);
+    set(frame.sky_side, lighting.sky.side);
+    set(frame.sky_zenith, lighting.sky.zenith);
+    set(frame.sky_nadir, lighting.sky.nadir);
+    set(frame.sky_glow, lighting.sky.glow);
+    // In a parallel view all rays look the same way: the disc would fill the picture.
+    if (!frame.rays.parallel)
+        set(frame.sky_disc, lighting.sky.disc);
+    std::copy_n(lighting.sky.toward_sun, 3, frame.toward_sun);
+}
+
+/// The ground lies under the lowest point. Rays look for it only where they met no surface, so it
+/// never flickers through a floor of the model's own.
+void setGround(FrameSetup& frame) {
+    if (!frame.scene)
+        return;
+    const float width = frame.scene_max[0] - frame.scene_min[0];
+    const float depth = frame.scene_max[1] - frame.scene_min[1];
+    const float height = frame.scene_max[2] - frame.scene_min[2];
+    const float reach = std::max({width, depth, height});
+    frame.has_ground = true;
+    frame.ground_height = frame.scene_min[2] - 1e-5F * frame.scene_size;
+    frame.ground_center[0] = 0.5F * (frame.scene_min[0] + frame.scene_max[0]);
+    frame.ground_center[1] = 0.5F * (frame.scene_min[1] + frame.scene_max[1]);
+    frame.ground_fade_start = 1.5F * reach; // far enough for the long shadows of a low sun
+    frame.ground_fade_end = 12.0F * reach;
+    // Far ground lies in the haze of the horizon, so that both meet without a line.
+    std::copy_n(frame.sky_horizon, 3, frame.sky_nadir);
+    set(frame.ground_albedo, {0.49F, 0.48F, 0.455F});
+}
+
+void setStyle(FrameSetup& frame, SurfaceStyle style, bool shows_panes) {
+    frame.textures = style == SurfaceStyle::lit;
+    if (style == SurfaceStyle::lit || style == SurfaceStyle::studio)
+        frame.has_see_through = shows_panes;
+    if (style == SurfaceStyle::translucent)
+        frame.layers = {12, 0.36F, 0.85F, 0.55F};
+    if (style == SurfaceStyle::x_ray)
+        frame.layers = {16, 0.10F, 0.75F, 0.12F};
+    if (style == SurfaceStyle::clay || style == SurfaceStyle::x_ray || style == SurfaceStyle::paper)
+        frame.base_colors = false;
+    if (style == SurfaceStyle::clay)
+        set(frame.plain_albedo, {0.86F, 0.86F, 0.86F});
+    if (style == SurfaceStyle::x_ray)
+        set(frame.plain_albedo, {0.42F, 0.58F, 0.76F});
+}
+
+/// Light without colour, more of it from the sky and less from the suns, so that shadows are soft:
+/// a model of plaster in a room with large windows.
+Lighting clayLighting(Lighting lighting) {
+    const auto grey = [](float r, float g, float b) {
+        return 0.2126F * r + 0.7152F * g + 0.0722F * b; // luminance by ITU-R BT.709
+    };
+    constexpr float sky = 1.62F;
+    constexpr float sun = 0.45F;
+    AmbientLight& ambient = lighting.ambient;
+    const float base = grey(ambient.base[0], ambient.base[1], ambient.base[2]);
+    float slope[3];
+    for (int i = 0; i < 3; ++i)
+        slope[i] = grey(ambient.slope[0][i], ambient.slope[1][i], ambient.slope[2][i]);
+    for (int c = 0; c < 3; ++c) {
+        ambient.base[c] = sky * base;
+        for (int i = 0; i < 3; ++i)
+            ambient.slope[c][i] = sky * slope[i];
+    }
+    const auto whiten = [&](DirectionalLight& light) {
+        const float white = sun * grey(light.color.r, light.color.g, light.color.b);
+        light.color = {white, white, white};
+    };
+    std::ranges::for_each(lighting.fixed, whiten);
+    std::ranges::for_each(lighting.suns, whiten);
+    return lighting;
+}
+
+/// Paper gives back the background's colour from everywhere.
+Lighting paperLighting(const KM_Color& paper) {
+    Lighting lighting;
+    const LinearColor light = sceneLightShownAs(paper);
+    lighting.ambient.base[0] = light.r;
+    lighting.ambient.base[1] = light.g;
+    lighting.ambient.base[2] = light.b;
+    return lighting;
+}
+
+Lighting lightingOf(const DisplayScene& scene, const DisplayModeAttributes& mode,
+                    const CameraFrame& camera) {
+    if (mode.surface_style == SurfaceStyle::paper)
+        return paperLighting(mode.background_top);
+    if (mode.uses_document_lights && mode.surface_style == SurfaceStyle::clay)
+        return clayLighting(skyLighting(scene.lights(), mode.casts_shadows, camera));
+    if (mode.uses_document_lights)
+        return skyLighting(scene.lights(), mode.casts_shadows, camera);
+    return studioLighting(camera);
+}
+
+} // namespace
+
+FrameSetup makeFrameSetup(const DisplayScene& scene, const KM_Viewport& viewport,
+                          const DisplayModeAttributes& mode, int width, int height) {
+    FrameSetup frame;
+    frame.width = width;
+    frame.height = height;
+    frame.rays = raysIn(scene, viewport, width, height);
+    if (mode.surface_style != SurfaceStyle::none)
+        setScene(frame, scene);
+    setStyle(frame, mode.surface_style, scene.rays().hasSeeThrough());
+    const CameraFrame camera{frame.rays.camera_x, frame.rays.camera_y, frame.rays.camera_z};
+    setLighting(frame, lightingOf(scene, mode, camera));
+    if (mode.has_ground_plane)
+        setGround(frame);
+    if (mode.surface_style == SurfaceStyle::clay) {
+        frame.sky_reach = sky_reach_of_scene * frame.scene_size;
+        set(frame.ground_albedo, {0.72F, 0.72F, 0.72F});
+    }
+    frame.has_sky = mode.has_sky;
+    set(frame.background_top, sceneLightShownAs(mode.background_top));
+    set(frame.background_bottom, sceneLightShownAs(mode.background_bottom));
+    frame.display_table = displayTable().entries();
+    return frame;
+}
+
+} // namespace quarn

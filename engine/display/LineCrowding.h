@@ -1,0 +1,42 @@
+#pragma once
+
+#include "engine/display/PictureScratch.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <span>
+
+namespace quarn {
+
+/// How crowded with lines each part of a picture is. A dense net of lines would be a black spot:
+/// where lines crowd, each is drawn the lighter, so that its parts can still be told apart.
+class LineCrowding {
+public:
+    /// Side of a cell, in pixels.
+    static constexpr int cell_size = 16;
+    /// Lines that cover less than this part of a cell are drawn in full.
+    static constexpr float sparse = 0.10F;
+
+    /// Starts anew for a picture of this size.
+    /// @param scratch  keeps the cells; must outlive their use
+    void reset(int width, int height, PictureScratch& scratch);
+    /// Adds lines' area at a place of the picture. Different rows of cells may be filled by
+    /// different threads.
+    void add(float x, float y, float square_pixels);
+    /// Turns areas into strengths; call it once, after the last `add`.
+    void finish();
+    /// How strong a line is at the middle of a pixel: 1 where it stands free. Changes smoothly.
+    float strength(int x, int y) const;
+
+private:
+    std::size_t cell(int column, int row) const {
+        return static_cast<std::size_t>(row) * static_cast<std::size_t>(m_columns) +
+               static_cast<std::size_t>(column);
+    }
+
+    int m_columns = 0;
+    int m_rows = 0;
+    std::span<float> m_cells;
+};
+
+} // namespace quarn

@@ -1,0 +1,131 @@
+#pragma once
+
+#include "engine/display/RayHandle.h"
+#include "engine/display/RayMesh.h"
+#include "engine/display/RaySurface.h"
+#include "engine/display/SurfacePlace.h"
+#include "kelmar/KM_Xform.h"
+
+#include <compare>
+#include <cstdint>
+#include <map>
+#include <memory>
+#include <span>
+#include <unordered_set>
+#include <vector>
+
+namespace quarn {
+
+/// The surfaces that rays meet. Meshes of many triangles, and those that a transform puts into
+/// their place, get a scene of their own under an instance; the small others share a few. The first
+/// time that one of these is hidden or shown its scene is split, so that from then on showing or
+/// hiding an object rebuilds little: nothing for a large one, some thousand triangles for a small.
+class RayScene {
+public:
+    /// One mesh object; `mesh` is drawable and `surface` describes it, without its place.
+    struct Member {
+        std::shared_ptr<const RayMesh> mesh;
+        RaySurface surface;
+        bool visible = true;
+        KM_Xform frame_from_mesh; ///< affine; members that share a mesh share its search structure
+    };
+
+    RayScene();
+
+    /// Replaces everything. Scenes of large meshes that were there before are taken over.
+    void build(std::vector<Member> members);
+    /// Shows or hides one member, by its index in `build`. Takes effect with the next `commit`.
+    void setVisible(std::size_t member, bool visible);
+    /// Makes the changes of visibility good.
+    void commit();
+
+    /// What rays are shot into; null when nothing is visible. The surface of a hit is
+    /// firstSurfaces()[instID] + geomID, or soleFirstSurface() + geomID without instances.
+    RTCScene root() const;
+    bool hasInstances() const { return m_root && m_root == m_top.get(); }
+    std::uint32_t soleFirstSurface() const { return m_sole_first_surface; }
+    std::span<const std::uint32_t> firstSurfaces() const { return m_first_surfaces; }
+    /// In the order of surface indices, which is not that of the members.
+    std::span<const RaySurface> surfaces() const { return m_surfaces; }
+    /// Of each surface the index of its member in `build`.
+    std::span<const std::uint32_t> surfaceMembers() const { return m_surface_members; }
+
+    /// Whether some visible surface is see-through.
+    bool hasSeeThrough() const { return m_has_see_through; }
+
+    /// How often a search structure, of a group or of all, was built.
+    std::size_t buildCount() const { return m_build_count; }
+    /// How many meshes have search structures, however often they are shown.
+    std::size_t geometryCount() const;
+
+    /// What the library complained of since the last call; empty when it did not.
+    std::string takeError();
+
+private:
+    struct Group {
+        RaySceneHandle scene;
+        std::vector<RayGeometry> geometries;
+        const RayMesh* sole_mesh = nullptr; ///< of a mesh that stands alone: to find it again
+        bool changed = false;
+        bool is_split = false; ///< of several meshes: it is small
+    };
+    struct Instance {
+        std::shared_ptr<Group> group;
+        RayGeometry geometry;
+        bool placed = false; ///< by a transform
+        std::size_t visible_members = 0;
+        bool enabled = true;
+    };
+    struct Place {
+        std::size_t instance = 0;
+        unsigned geometry = 0;
+    };
+
+    /// What meshes must have in common to share a scene of their own.
+    struct GroupKey {
+        const RayMesh* mesh;
+        const MipTexture* texture; ///< whose opacity counts
+        float cutoff;
+        float opacity;
+        bool see_through;
+        auto operator<=>(const GroupKey&) const = default;
+    };
+    using SoleGroups = std::map<GroupKey, std::shared_ptr<Group>>;
+
+    bool standsAlone(const Member& member) const;
+    GroupKey keyOf(const Member& member) const;
+    void addSole(std::size_t member, SoleGroups& groups);
+    void addBundles(std::span<const std::size_t> members, std::span<RayGeometry> geometries,
+                    std::size_t most_triangles, std::size_t first_surface, std::size_t slot);
+    void fillBundle(std::size_t slot, std::span<const std::size_t> members,
+                    std::span<RayGeometry> geometries);
+    void split(std::size_t slot);
+    void addSurface(std::size_t member);
+    void putInstance(std::size_t slot, std::shared_ptr<Group> group,
+                     const KM_Xform& frame_from_mesh, std::size_t first_surface);
+    RayGeometry makeTriangles(std::size_t member) const;
+    RayGeometry makeSurface(std::size_t member, const RaySurface& surface) const;
+    RaySceneHandle makeScene() const;
+    std::shared_ptr<Group> makeGroup() const;
+    SoleGroups soleGroups() const;
+    std::vector<std::size_t> smallMembersBySpace() const;
+    void chooseRoot();
+
+    std::shared_ptr<std::string> m_error; ///< outlives the device, which writes into it
+    RayDevice m_device;
+    RaySceneHandle m_top;
+    RTCScene m_root = nullptr;
+    std::uint32_t m_sole_first_surface = 0;
+    std::vector<Member> m_members;
+    std::vector<Place> m_places;                        ///< by member
+    std::unordered_set<const RayMesh*> m_placed_meshes; ///< some member puts them elsewhere
+    std::vector<Instance> m_instances;
+    std::vector<std::uint32_t> m_first_surfaces;
+    std::vector<RaySurface> m_surfaces;
+    std::vector<SurfacePlace> m_surface_places;
+    std::vector<std::uint32_t> m_surface_members;
+    std::size_t m_build_count = 0;
+    bool m_has_see_through = false;
+};
+
+} // namespace quarn

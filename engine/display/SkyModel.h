@@ -1,0 +1,84 @@
+#pragma once
+
+#include "engine/display/kernel/FrameSetup.h"
+#include "engine/images/ColorSpace.h"
+
+#include <cstddef>
+#include <span>
+
+class KM_Light;
+
+namespace quarn {
+
+/// A light that shines everywhere from the same direction.
+struct DirectionalLight {
+    float toward[3] = {0.0F, 0.0F, 1.0F}; ///< unit vector to the light, world coordinates
+    LinearColor color;                    ///< scene light on a white surface that faces it
+    float shadow = 0.0F;                  ///< part of it that an occluder takes away, 0 to 1
+};
+
+/// The first `capacity` of the lights that are added; those beyond are passed over.
+template <std::size_t capacity> class LightList {
+public:
+    void push_back(const DirectionalLight& light) {
+        if (m_count < capacity)
+            m_lights[m_count++] = light;
+    }
+    std::size_t size() const { return m_count; }
+    DirectionalLight* begin() { return m_lights; }
+    DirectionalLight* end() { return m_lights + m_count; }
+    const DirectionalLight* begin() const { return m_lights; }
+    const DirectionalLight* end() const { return m_lights + m_count; }
+
+private:
+    DirectionalLight m_lights[capacity];
+    std::size_t m_count = 0;
+};
+
+/// Light from all sides that changes linearly with the direction in which a surface faces:
+/// channel c on a surface with unit normal n gets base[c] + slope[c] . n.
+struct AmbientLight {
+    float base[3] = {0.0F, 0.0F, 0.0F};
+    float slope[3][3] = {};
+};
+
+/// The sky's colours in scene light.
+struct Sky {
+    LinearColor horizon; ///< sideways of the sun
+    LinearColor side;    ///< added to the horizon below the sun and taken away opposite
+    LinearColor zenith;
+    LinearColor nadir; ///< straight down, where no ground is seen
+    LinearColor glow;  ///< added around the sun
+    LinearColor disc;  ///< added on the sun's disc
+    float toward_sun[3] = {0.0F, 0.0F, 1.0F};
+};
+
+/// All the light of one picture.
+struct Lighting {
+    AmbientLight ambient;
+    LightList<max_fixed_lights> fixed; ///< cast no shadows
+    LightList<max_suns> suns;          ///< cast shadows as far as their `shadow` says
+    Sky sky;
+};
+
+/// The camera frame's unit vectors in world coordinates.
+struct CameraFrame {
+    const float* x;
+    const float* y;
+    const float* z; ///< toward the observer
+};
+
+/// A neutral studio light that goes with the camera: a soft key light from the upper left, a weak
+/// fill from the right, more light from above than from below. No surface is overexposed.
+Lighting studioLighting(const CameraFrame& camera);
+
+/// Light of sky and document. The directional lights are suns: the first one's height decides
+/// between day, dusk and night, and one below the horizon shines on nothing. At night a dim blue
+/// light keeps the model readable. Without a directional light a bright, even sky and a head light
+/// make the picture.
+/// @param lights         the lights that are on; other kinds than directional ones add nothing
+/// @param casts_shadows  whether the suns are shadowed
+Lighting skyLighting(std::span<const KM_Light> lights, bool casts_shadows,
+                     const CameraFrame& camera);
+
+} // namespace quarn

@@ -1,0 +1,43 @@
+#pragma once
+
+#include "engine/display/kernel/SkyGrid.h"
+
+namespace quarn {
+namespace {
+
+inline LaneColors ambientLight(const FrameSetup& frame, const LaneVectors& normal) {
+    const auto channel = [&](int c) {
+        return dot(normal, frame.ambient_slope[c]) + frame.ambient_base[c];
+    };
+    return {channel(0), channel(1), channel(2)};
+}
+
+inline void addLight(const float (&color)[3], const Lanes& amount, LaneColors& light) {
+    light.r = light.r + amount * color[0];
+    light.g = light.g + amount * color[1];
+    light.b = light.b + amount * color[2];
+}
+
+/// The light that diffuse surfaces send to the observer, in the lanes of `lit`.
+inline LaneColors shadeSurfaces(const FrameSetup& frame, const RayPacket& packet,
+                                const SurfaceLanes& surfaces, const LaneMask& lit) {
+    LaneColors light = ambientLight(frame, surfaces.normal);
+    if (frame.free_sky) {
+        const Lanes arriving = skyArriving(frame, packet, surfaces, lit);
+        light = {light.r * arriving, light.g * arriving, light.b * arriving};
+    }
+    for (int k = 0; k < frame.fixed_count; ++k) {
+        const FrameLight& fixed = frame.fixed[k];
+        addLight(fixed.color, greatest(dot(surfaces.normal, fixed.toward), 0.0F), light);
+    }
+    for (int k = 0; k < frame.sun_count; ++k) {
+        const FrameLight& sun = frame.suns[k];
+        const Lanes facing = greatest(dot(surfaces.normal, sun.toward), 0.0F);
+        const Lanes arriving = sunlightArriving(frame, sun, packet, surfaces, lit, facing);
+        addLight(sun.color, facing * arriving, light);
+    }
+    return {surfaces.albedo.r * light.r, surfaces.albedo.g * light.g, surfaces.albedo.b * light.b};
+}
+
+} // namespace
+} // namespace quarn

@@ -1,0 +1,65 @@
+#pragma once
+
+#include "engine/images/Image.h"
+#include "ground/Result.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <filesystem>
+#include <memory>
+#include <optional>
+#include <span>
+#include <string>
+
+namespace quarn {
+
+enum class ImageFormat { jpeg, png, bmp, tga };
+
+/// The format that an extension stands for, ignoring case: jpg, jpeg, png, bmp, tga. The extension
+/// may have its dot. Nothing for any other.
+std::optional<ImageFormat> imageFormatFor(std::string_view extension);
+
+/// The pixels of a picture, which someone else keeps.
+struct ImageView {
+    int width = 0;                      ///< pixels
+    int height = 0;                     ///< pixels
+    std::span<const std::uint8_t> rgba; ///< 4 * width * height bytes, sRGB, rows from the top
+
+    ImageView() = default;
+    ImageView(int width_px, int height_px, std::span<const std::uint8_t> pixels)
+        : width(width_px), height(height_px), rgba(pixels) {}
+    ImageView(const Image& image) : ImageView(image.width, image.height, image.rgba) {}
+};
+
+/// Turns pictures into the bytes of image files. It keeps its buffers from one picture to the next,
+/// so whoever writes many frames keeps one; one thread at a time may use it.
+///
+/// All formats are written with 24 bits a pixel; opacity is left out. JPEG has quality 90 and full
+/// colour resolution. BMP and TGA are not compressed.
+class ImageEncoder {
+public:
+    ImageEncoder();
+    ~ImageEncoder();
+    ImageEncoder(ImageEncoder&&) noexcept;
+    ImageEncoder& operator=(ImageEncoder&&) noexcept;
+
+    /// @return the bytes of the file, valid until the next call on this encoder; or why the picture
+    ///   cannot be encoded, a part of a sentence: it is empty, its size and its pixels disagree, or
+    ///   a side is longer than the format allows (65500 for JPEG, 65535 for TGA)
+    Result<std::span<const std::byte>> encode(const ImageView& image, ImageFormat format);
+
+    /// Encodes and writes a picture in the format of the path's extension. The file appears whole
+    /// or not at all, and replaces one of the same name.
+    /// @return an error that names the file: unknown extension, the picture cannot be encoded, the
+    ///   folder is missing, no permission, the disk is full
+    Result<void> write(const char* path, const ImageView& image);
+
+private:
+    struct Buffers;
+    std::unique_ptr<Buffers> m_buffers;
+};
+
+/// Writes one picture, as ImageEncoder::write does.
+Result<void> writeImageFile(const std::filesystem::path& path, const ImageView& image);
+
+} // namespace quarn

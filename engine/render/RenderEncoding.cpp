@@ -1,0 +1,89 @@
+#include "engine/render/RenderEncoding.h"
+
+#include "engine/display/DisplayTable.h"
+#include "engine/render/LightFilter.h"
+#include "engine/render/RenderLayers.h"
+
+#include <tbb/parallel_for.h>
+
+#include <algorithm>
+#include <bit>
+#include <vector>
+
+namespace quarn {
+
+namespace {
+
+using Colors = std::vector<float>; ///< three numbers a pixel
+
+template <class Work> void forRows(const RenderLayers& layers, const Work& work) {
+    tbb::parallel_for(0, layers.height(), [&](int y) {
+        const std::size_t start =
+            static_cast<std::size_t>(y) * static_cast<std::size_t>(layers.width());
+        for (int x = 0; x < layers.width(); ++x)
+            work(start + static_cast<std::size_t>(x), x, y);
+    });
+}
+
+void addDirect(const RenderLayers& layers, float scale, Colors& colors) {
+    forRows(layers, [&](std::size_t pixel, int x, int y) {
+        for (int c = 0; c < 3; ++c)
+            colors[3 * pixel + static_cast<std::size_t>(c)] =
+                scale * layers.at(RenderPlane::direct_r + c, x, y);
+    });
+}
+
+void addLight(const RenderLayers& layers, float scale, const LightImage& light, Colors& colors) {
+    forRows(layers, [&](std::size_t pixel, int x, int y) {
+        for (int c = 0; c < 3; ++c)
+            colors[3 * pixel + static_cast<std::size_t>(c)] +=
+                scale * layers.at(RenderPlane::albedo_r + c, x, y) * light.color[c][pixel];
+    });
+}
+
+std::uint8_t shown(float light, const std::uint32_t* table) {
+    const auto place = static_cast<int>(std::bit_cast<std::uint32_t>(std::max(light, 0.0F)) >>
+                                        DisplayTable::shift) -
+                       DisplayTable::first;
+    return static_cast<std::uint8_t>(table[std::clamp(place, 0, DisplayTable::count - 1)]);
+}
+
+/// Of pixels that nothing is known of, in sRGB.
+constexpr std::uint8_t not_begun = 60;
+
+} // namespace
+
+void encodeRow(const RenderLayers& layers, int samples, const RowPart& part, Image& image) {
+    const std::uint32_t* const table = displayTable().entries();
+    const float scale = samples > 0 ? 1.0F / static_cast<float>(samples) : 0.0F;
+    std::uint8_t* pixel = image.rgba.data() + 4 * (static_cast<std::size_t>(part.y) *
+                                                       static_cast<std::size_t>(image.width) +
+                                                   static_cast<std::size_t>(part.begin_x));
+    for (int x = part.begin_x; x < part.end_x; ++x, pixel += 4) {
+        for (int c = 0; c < 3; ++c) {
+            const float light = layers.at(RenderPlane::direct_r + c, x, part.y) +
+                                layers.at(RenderPlane::sky_r + c, x, part.y) +
+                                layers.at(RenderPlane::sun_r + c, x, part.y);
+            pixel[c] = samples > 0 ? shown(scale * light, table) : not_begun;
+        }
+        pixel[3] = 255;
+    }
+}
+
+void encodeRender(const RenderLayers& layers, int samples, LightFilter& filter, Image& image) {
+    const float scale = 1.0F / static_cast<float>(samples);
+    Colors colors(std::size_t{3} * static_cast<std::size_t>(layers.width()) *
+                  static_cast<std::size_t>(layers.height()));
+    addDirect(layers, scale, colors);
+    addLight(layers, scale, filter.filtered(RenderPlane::sky_r, RenderPlane::sky_square), colors);
+    addLight(layers, scale, filter.filtered(RenderPlane::sun_r, RenderPlane::sun_square), colors);
+    image.resize(layers.width(), layers.height());
+    const std::uint32_t* const table = displayTable().entries();
+    forRows(layers, [&](std::size_t pixel, int, int) {
+        for (std::size_t c = 0; c < 3; ++c)
+            image.rgba[4 * pixel + c] = shown(colors[3 * pixel + c], table);
+        image.rgba[4 * pixel + 3] = 255;
+    });
+}
+
+} // namespace quarn

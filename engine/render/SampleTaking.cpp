@@ -1,0 +1,90 @@
+#include "engine/render/SampleTaking.h"
+
+#include "engine/display/FlushDenormals.h"
+#include "engine/render/RenderLayers.h"
+
+#include <tbb/parallel_for.h>
+
+#include <algorithm>
+#include <chrono>
+
+namespace quarn {
+
+namespace {
+
+/// Pixels of a task's block, and samples that are taken of each at a time.
+constexpr int block_width = 64;
+constexpr int block_height = 32;
+constexpr int samples_at_once = 32;
+
+constexpr double batch_seconds = 0.05;
+
+int columnsOf(const RenderLayers& layers) {
+    return (layers.width() + block_width - 1) / block_width;
+}
+
+} // namespace
+
+SampleTaking::SampleTaking(const RenderSetup& setup, const RenderKernel& kernel,
+                           RenderLayers& layers, int samples)
+    : m_setup(setup), m_kernel(kernel), m_layers(layers), m_samples(samples),
+      m_columns(columnsOf(layers)),
+      m_blocks(m_columns * ((layers.height() + block_height - 1) / block_height)) {}
+
+/// 1, 4, 8, 16, 32 and then all 32.
+int SampleTaking::passEnd(int first, bool grows_evenly) const {
+    const int wanted = !grows_evenly || first >= samples_at_once ? first + samples_at_once
+                       : first == 0                              ? 1
+                       : first == 1                              ? 4
+                                                                 : 2 * first;
+    return std::min(m_samples, wanted);
+}
+
+RenderEnd SampleTaking::run(bool grows_evenly, const Pause& pause) {
+    while (m_pass_first < m_samples) {
+        m_pass_end = passEnd(m_pass_first, grows_evenly);
+        for (m_finished = 0; m_finished < m_blocks;) {
+            const double taken =
+                m_pass_first + double(m_pass_end - m_pass_first) * m_finished / m_blocks;
+            if (!pause(taken / m_samples))
+                return RenderEnd::cancelled;
+            const int next = std::min(m_blocks, m_finished + m_batch);
+            timed([&] { renderBlocks(m_finished, next, m_pass_first, m_pass_end); });
+            m_finished = next;
+        }
+        m_pass_first = m_pass_end;
+    }
+    return RenderEnd::done;
+}
+
+SampleTaking::Taken SampleTaking::takenAt(int x, int y) const {
+    const int column = x / block_width;
+    const int block = y / block_height * m_columns + column;
+    return {block < m_finished ? m_pass_end : m_pass_first,
+            std::min(m_layers.width(), (column + 1) * block_width)};
+}
+
+template <class Work> void SampleTaking::timed(const Work& work) {
+    const auto start = std::chrono::steady_clock::now();
+    work();
+    const std::chrono::duration<double> taken = std::chrono::steady_clock::now() - start;
+    if (taken.count() < 0.5 * batch_seconds)
+        m_batch = std::min(2 * m_batch, m_blocks); // small pictures never last that long
+    else if (taken.count() > 2.0 * batch_seconds && m_batch > 4)
+        m_batch /= 2;
+}
+
+void SampleTaking::renderBlocks(int begin, int end, int first_sample, int end_sample) {
+    const RenderSums sums = m_layers.sums();
+    tbb::parallel_for(begin, end, [&](int index) {
+        const FlushDenormals flush;
+        const int x = index % m_columns * block_width;
+        const int y = index / m_columns * block_height;
+        m_kernel.render_block(m_setup,
+                              {x, y, std::min(m_layers.width(), x + block_width),
+                               std::min(m_layers.height(), y + block_height)},
+                              first_sample, end_sample, sums);
+    });
+}
+
+} // namespace quarn

@@ -1,0 +1,122 @@
+#pragma once
+
+#include "engine/display/kernel/FrameSetup.h"
+
+#include <cstdint>
+
+namespace quarn {
+
+/// The beginning of a sequence of well-spread places in the unit square, by SampleSequence.
+struct SampleTable {
+    const std::uint32_t* first = nullptr;  ///< 2^log2_length numbers, in the order of reversed bits
+    const std::uint32_t* second = nullptr; ///< the same number of them
+    int log2_length = 1;
+};
+
+/// What a sample of a pixel needs places in a square for.
+enum class SampleUse : int { pixel_area, sky_dome, sun_disc };
+inline constexpr int sample_use_count = 3;
+
+/// Where the sixteen pixels of a tile stand in the sequence: each has a stretch of its own.
+struct TileSamples {
+    alignas(64) std::uint32_t order[sample_use_count][lane_count];
+    alignas(64) std::uint32_t first[sample_use_count][lane_count];
+    alignas(64) std::uint32_t second[sample_use_count][lane_count];
+};
+
+/// Finds the stretches of the tile whose upper left pixel is (x, y). Neighbouring pixels get
+/// stretches that complete each other, so that what is left of the noise is fine-grained (A. Ahmed
+/// and P. Wonka, "Screen-Space Blue-Noise Diffusion of Monte Carlo Sampling Error via Hierarchical
+/// Ordering of Pixels", ACM Transactions on Graphics 39(6), 2020).
+void startTile(int x, int y, int log2_length, TileSamples& samples);
+
+/// A sun's disc: any point of it lies at toward + x * across + y * along, with x * x + y * y <= 1.
+struct SunDisc {
+    float across[3];
+    float along[3];
+};
+
+/// Everything that the render loops need for one picture.
+struct RenderSetup {
+    FrameSetup frame; ///< what is seen directly
+    /// How surfaces look that light comes from: without the light that follows the camera.
+    FrameSetup bounce;
+    float sky_scale[3] = {1, 1, 1}; ///< from the colour of the sky to the light it sheds
+    SunDisc discs[max_suns] = {};   ///< of frame.suns
+    SampleTable samples;
+};
+
+/// What is summed up over the samples of a pixel.
+struct RenderPlane {
+    enum : int {
+        direct_r,
+        direct_g,
+        direct_b, ///< what needs no sampling, and the background
+        albedo_r,
+        albedo_g,
+        albedo_b,
+        sky_r,
+        sky_g,
+        sky_b, ///< light of the sky and of other surfaces, times albedo
+        sun_r,
+        sun_g,
+        sun_b,      ///< light of the suns, times albedo
+        sky_square, ///< square of the sky light's brightness, without albedo
+        sun_square,
+        normal_x,
+        normal_y,
+        normal_z,
+        nearness, ///< see DepthImage
+        cover,    ///< how much of the pixel surfaces and the ground fill
+        count
+    };
+};
+
+/// The sums, tile by tile in rows of tiles, and in each tile the sixteen pixels row by row.
+struct RenderSums {
+    int tile_columns = 0;
+    float* planes[RenderPlane::count] = {}; ///< aligned to 64 bytes
+};
+
+/// One row of a light filter's pass. Pointers are of whole planes of width * height numbers.
+struct FilterRow {
+    int width = 0;
+    int height = 0;
+    int y = 0;
+    int step = 1; ///< distance between the pixels that are looked at
+    const float* light[3] = {};
+    const float* variance = nullptr; ///< of the light's brightness
+    const float* normal[3] = {};     ///< unit vectors; zero where nothing is
+    const float* nearness = nullptr; ///< linear on flat surfaces
+    const float* slope_x = nullptr;  ///< its change from pixel to pixel
+    const float* slope_y = nullptr;
+    const float* cover = nullptr;
+    float nearness_share = 0.0F;     ///< how far nearness may deviate, as a share of itself
+    float nearness_tolerance = 0.0F; ///< and absolutely
+    float spread = 1.0F; ///< squared difference of brightness over variance where weights end
+    float* out[3] = {};
+    float* out_variance = nullptr;
+    float* weight = nullptr; ///< scratch
+};
+
+/// The render loops, compiled for one kind of processor. All give the same pixels.
+struct RenderKernel {
+    const char* name;
+    /// Adds the samples [first, end) of the pixels of a block to the sums.
+    void (*render_block)(const RenderSetup& setup, const PixelBlock& block, int first, int end,
+                         const RenderSums& sums);
+    /// Averages one row of pixels with those around that show the same surface.
+    void (*filter_row)(const FilterRow& row);
+    /// The colours of the sky in sixteen directions of unit length; rows are x, y, z and r, g, b.
+    void (*sky_colors)(const FrameSetup& frame, const float (&directions)[3][lane_count],
+                       float (&colors)[3][lane_count]);
+};
+
+/// The loops for the best processor that this one can stand in for.
+const RenderKernel& bestRenderKernel();
+
+extern const RenderKernel baseline_render_kernel; ///< any x86-64
+extern const RenderKernel avx2_render_kernel;     ///< x86-64-v3
+extern const RenderKernel avx512_render_kernel;   ///< x86-64-v4
+
+} // namespace quarn

@@ -1,0 +1,78 @@
+#include "ground/FileBytes.h"
+
+#include <cerrno>
+#include <cstring>
+#include <fcntl.h>
+#include <new>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace quarn {
+
+namespace {
+
+class OpenFile {
+public:
+    explicit OpenFile(const std::filesystem::path& file)
+        // Without waiting: a pipe that nobody writes to would wait for ever.
+        : m_descriptor(open(file.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC)) {}
+    ~OpenFile() {
+        if (isOpen())
+            close(m_descriptor);
+    }
+    OpenFile(const OpenFile&) = delete;
+    OpenFile& operator=(const OpenFile&) = delete;
+
+    bool isOpen() const { return m_descriptor >= 0; }
+    bool status(struct stat& status) const { return fstat(m_descriptor, &status) == 0; }
+
+    /// @return false when there are fewer bytes
+    bool readAll(std::uint8_t* bytes, std::size_t size) const {
+        while (size > 0) {
+            const ssize_t count = read(m_descriptor, bytes, size);
+            if (count < 0 && errno == EINTR)
+                continue;
+            if (count <= 0)
+                return false;
+            bytes += count;
+            size -= static_cast<std::size_t>(count);
+        }
+        return true;
+    }
+
+private:
+    int m_descriptor;
+};
+
+Error reason(int code) {
+    switch (code) {
+    case ENOENT:
+    case ENOTDIR:
+        return {"there is no such file"};
+    case EACCES:
+    case EPERM:
+        return {"there is no permission to read it"};
+    default:
+        return {std::strerror(code)};
+    }
+}
+
+} // namespace
+
+Result<FileBytes> readFileBytes(const std::filesystem::path& path) {
+    const OpenFile file(path);
+    struct stat status {};
+    if (!file.isOpen() || !file.status(status))
+        return reason(errno);
+    if (!S_ISREG(status.st_mode))
+        return Error{S_ISDIR(status.st_mode) ? "it is a folder" : "it is not an ordinary file"};
+    const auto size = static_cast<std::size_t>(status.st_size);
+    std::unique_ptr<std::uint8_t[]> bytes(new (std::nothrow) std::uint8_t[size]);
+    if (!bytes)
+        return Error{"there is too little memory for it"};
+    if (!file.readAll(bytes.get(), size))
+        return Error{"it could not be read to its end"};
+    return FileBytes(std::move(bytes), size);
+}
+
+} // namespace quarn

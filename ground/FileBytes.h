@@ -1,0 +1,31 @@
+#pragma once
+
+#include "ground/Result.h"
+
+#include <cstdint>
+#include <filesystem>
+#include <memory>
+#include <span>
+
+namespace quarn {
+
+/// The bytes of a file, read at once. They are not set before they are read, which would take as
+/// long as reading them.
+class FileBytes {
+public:
+    FileBytes(std::unique_ptr<std::uint8_t[]> bytes, std::size_t size)
+        : m_bytes(std::move(bytes)), m_size(size) {}
+
+    std::span<const std::uint8_t> bytes() const { return {m_bytes.get(), m_size}; }
+
+private:
+    std::unique_ptr<std::uint8_t[]> m_bytes;
+    std::size_t m_size;
+};
+
+/// Reads a whole file.
+/// @return an error, part of a sentence: it is missing, no ordinary file, not readable, or too
+///         large for the memory
+Result<FileBytes> readFileBytes(const std::filesystem::path& file);
+
+} // namespace quarn

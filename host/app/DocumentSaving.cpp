@@ -1,0 +1,65 @@
+#include "host/app/DocumentSaving.h"
+
+#include "ground/PathText.h"
+#include "host/app/Application.h"
+#include "host/app/FileOptionsAccess.h"
+#include "host/app/PlugInChunks.h"
+#include "host/document/Document.h"
+#include "host/document/file/DocumentFile.h"
+#include "host/document/file/FileRemainder.h"
+#include "sdk/qncore/QnZoetrixDynamicAccess.h"
+
+#include <map>
+
+namespace quarn {
+
+namespace {
+
+/// The record names the sun light of an animation by its place in the light table of the file; here
+/// it stands elsewhere, or is gone.
+void moveLightIndex(Document& document, const std::map<int, int>& indices) {
+    KM_3dmAnimationProperties record = document.properties().AnimationProperties();
+    const auto moved = indices.find(record.LightIndex());
+    record.SetLightIndex(moved == indices.end() ? LightStore::no_index : moved->second);
+    document.properties().SetAnimationProperties(record);
+}
+
+} // namespace
+
+Result<void> saveDocument(Document& document, const std::filesystem::path& file,
+                          const DocumentSaveOptions& options) {
+    DocumentContent content = document.content(options.only_selected);
+    content.version = options.version;
+    auto plug_ins =
+        plugInContents(*Application::current(), document,
+                       FileOptionsAccess::forWriting(options.only_selected, options.version,
+                                                     document.serialNumber()));
+    if (!plug_ins)
+        return Error{"Cannot save " + textFromPath(file).ToUtf8() + ": " + plug_ins.message() +
+                     "."};
+    content.plug_ins = std::move(plug_ins.value());
+    if (!options.only_selected && options.version == KM_CURRENT_ARCHIVE_VERSION)
+        content.unknown = document.fileRemainder().unknown;
+    return writeDocumentFile(content, file);
+}
+
+std::vector<std::string> openContent(Document& document, const DocumentContent& content) {
+    std::vector<std::string> warnings = document.openContent(content);
+    const auto options = FileOptionsAccess::forReading(CQuarnFileReadOptions::open_mode);
+    const PlugInReading reading =
+        readPlugInContents(*Application::current(), document, content.plug_ins, options);
+    warnings.insert(warnings.end(), reading.warnings.begin(), reading.warnings.end());
+    return warnings;
+}
+
+std::vector<std::string> importContent(Document& document, const DocumentContent& content) {
+    const std::map<int, int> light_indices = document.addContent(content);
+    const auto options = FileOptionsAccess::forReading(CQuarnFileReadOptions::import_mode);
+    const PlugInReading reading =
+        readPlugInContents(*Application::current(), document, content.plug_ins, options);
+    if (reading.hasRead(ZoetrixPlugInId))
+        moveLightIndex(document, light_indices);
+    return reading.warnings;
+}
+
+} // namespace quarn

@@ -1,3 +1,0 @@
-#define QUARN_RAY_KERNEL avx2_ray_kernel
-#define QUARN_RAY_KERNEL_NAME "avx2"
-#include "host/display/kernel/RayLoops.h"

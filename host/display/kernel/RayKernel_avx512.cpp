@@ -1,3 +1,0 @@
-#define QUARN_RAY_KERNEL avx512_ray_kernel
-#define QUARN_RAY_KERNEL_NAME "avx512"
-#include "host/display/kernel/RayLoops.h"

@@ -1,0 +1,36 @@
+#pragma once
+
+#include <filesystem>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace quarn {
+
+/// What a session is started with.
+struct SessionOptions {
+    /// Where plug-ins are looked for when they are needed, in this order.
+    std::vector<std::filesystem::path> plug_in_folders;
+    /// Folders of the host's own string tables (`<language>.json`). The tables of a plug-in
+    /// `Name.qnp` are looked for in `locale/Name` beside its file, then in `Name` beside these
+    /// folders.
+    std::vector<std::filesystem::path> locale_folders;
+    /// The user's language ("de", "ja"); empty takes it from the environment.
+    std::string language;
+    /// The user's documents folder; empty takes it from the environment, and where that knows none
+    /// there is none.
+    std::filesystem::path documents_folder;
+    /// Whether the program ends where a plug-in breaks a rule of the interface; else a line on the
+    /// error output says so and the call does nothing. Nothing: strict where the environment
+    /// variable QUARN_STRICT is set to anything but 0.
+    std::optional<bool> strict = std::nullopt;
+    /// The folder of the string tables of the program that runs the session (`<language>.json`),
+    /// for QnLocalizeString; the host's own texts go first. Empty: the program has none.
+    std::filesystem::path program_locale_folder = {};
+    /// Folders of dialog templates (`<id>.dialog.json`). Those of a plug-in `Name.qnp` are looked
+    /// for in `dialogs/Name` beside its file, then in `Name` in these folders; those of the program
+    /// itself in these folders.
+    std::vector<std::filesystem::path> dialog_folders = {};
+};
+
+} // namespace quarn

@@ -1,3 +1,0 @@
-#define QUARN_RENDER_KERNEL avx2_render_kernel
-#define QUARN_RENDER_KERNEL_NAME "avx2"
-#include "host/render/kernel/RenderLoops.h"

@@ -1,3 +1,0 @@
-#define QUARN_RENDER_KERNEL avx512_render_kernel
-#define QUARN_RENDER_KERNEL_NAME "avx512"
-#include "host/render/kernel/RenderLoops.h"

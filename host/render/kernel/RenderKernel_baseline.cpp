@@ -1,3 +1,0 @@
-#define QUARN_RENDER_KERNEL baseline_render_kernel
-#define QUARN_RENDER_KERNEL_NAME "baseline"
-#include "host/render/kernel/RenderLoops.h"

@@ -1,0 +1,19 @@
+#include "host/session/DocumentState.h"
+
+#include "host/document/Document.h"
+
+namespace quarn {
+
+std::filesystem::path documentFile(CQuarnDoc& document) {
+    return Document::of(document).file();
+}
+
+bool isModified(CQuarnDoc& document) {
+    return Document::of(document).isModified();
+}
+
+int objectCount(CQuarnDoc& document) {
+    return static_cast<int>(Document::of(document).objects().objects().size());
+}
+
+} // namespace quarn

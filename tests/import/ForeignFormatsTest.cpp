@@ -1,0 +1,119 @@
+// What the reading library hands out in its own way, format by format.
+#include "tests/import/ModelFixtures.h"
+
+#include <cmath>
+#include <gmock/gmock.h>
+#include <numbers>
+
+namespace quarn::test {
+namespace {
+
+using ::testing::IsEmpty;
+
+TEST(UpAxis, OfDxfIsZ) {
+    const TemporaryFolder folder;
+    const ImportedModel model = readOrFail(folder.write(
+        "a.dxf", "0\nSECTION\n2\nENTITIES\n0\n3DFACE\n8\nwalls\n10\n0\n20\n0\n30\n0\n11\n4\n21\n0\n"
+                 "31\n0\n12\n4\n22\n1\n32\n9\n13\n4\n23\n1\n33\n9\n0\nENDSEC\n0\nEOF\n"));
+    const KM_BoundingBox box = boundsOf(model);
+    expectNear(box.m_min, {0, 0, 0}, 1e-6);
+    expectNear(box.m_max, {4, 1, 9}, 1e-6);
+}
+
+TEST(UpAxis, OfSmdIsZ) {
+    const TemporaryFolder folder;
+    const ImportedModel model =
+        readOrFail(folder.write("a.smd", "version 1\nnodes\n0 \"root\" -1\nend\nskeleton\ntime 0\n"
+                                         "0 0 0 0 0 0 0\nend\ntriangles\nstone\n0 0 0 0 0 0 1 0 0\n"
+                                         "0 4 0 0 0 0 1 1 0\n0 4 1 9 0 0 1 1 1\nend\n"));
+    const KM_BoundingBox box = boundsOf(model);
+    expectNear(box.m_min, {0, 0, 0}, 1e-6);
+    expectNear(box.m_max, {4, 1, 9}, 1e-6);
+}
+
+TEST(VertexColours, ThatAreNothingAtAllStandForMissingOnes) {
+    const TemporaryFolder folder;
+    const std::string mesh =
+        "<mesh><vertices><vertex><coordinates><x>0</x><y>0</y><z>0</z></coordinates></vertex>"
+        "<vertex><coordinates><x>1</x><y>0</y><z>0</z></coordinates></vertex>"
+        "<vertex><coordinates><x>0</x><y>1</y><z>0</z></coordinates></vertex></vertices>"
+        "<volume><triangle><v1>0</v1><v2>1</v2><v3>2</v3></triangle></volume></mesh>";
+    const ImportedModel model =
+        readOrFail(folder.write("a.amf", "<?xml version=\"1.0\" encoding=\"UTF-8\"?><amf "
+                                         "unit=\"millimeter\"><object id=\"1\">" +
+                                             mesh + "</object></amf>"));
+    ASSERT_EQ(model.triangleCount(), 1U);
+    EXPECT_THAT(model.meshes[0].mesh->m_C, IsEmpty());
+}
+
+std::string wide(const std::string& ascii, bool big_endian) {
+    std::string bytes = big_endian ? "\xFE\xFF" : "\xFF\xFE";
+    for (const char c : ascii)
+        bytes += big_endian ? std::string{'\0', c} : std::string{c, '\0'};
+    return bytes;
+}
+
+TEST(WideText, IsReadInBothByteOrders) {
+    const TemporaryFolder folder;
+    const std::string triangle = "o roof\r\nv 0 0 0\r\nv 1 0 0\r\nv 0 1 0\r\nf 1 2 3\r\n";
+    for (const bool big_endian : {false, true}) {
+        const ImportedModel model = readOrFail(folder.write("a.obj", wide(triangle, big_endian)));
+        ASSERT_EQ(model.triangleCount(), 1U);
+        EXPECT_EQ(model.meshes[0].name.ToUtf8(), "roof");
+    }
+}
+
+TEST(WideText, KeepsCharactersBeyondSixteenBits) {
+    const TemporaryFolder folder;
+    std::string bytes = wide("o ", false);
+    bytes += std::string("\x3D\xD8\x00\xDE", 4); // U+1F600
+    bytes += std::string("\x00\xDC", 2);         // the second half of a character alone
+    bytes += wide("\nv 0 0 0\nv 1 0 0\nv 0 1 0\nf 1 2 3\n", false).substr(2);
+    const ImportedModel model = readOrFail(folder.write("a.obj", bytes));
+    ASSERT_EQ(model.meshes.size(), 1U);
+    EXPECT_EQ(model.meshes[0].name.ToUtf8(), "\xF0\x9F\x98\x80\xEF\xBF\xBD");
+}
+
+/// A torus of quadrilaterals that share their vertices, without normals.
+std::string torus() {
+    constexpr int around = 48;
+    constexpr int across = 24;
+    std::string text;
+    const auto turn = [](int i, int n) { return 2.0 * std::numbers::pi * i / n; };
+    for (int i = 0; i < around; ++i)
+        for (int j = 0; j < across; ++j) {
+            const double radius = 1.0 + 0.4 * std::cos(turn(j, across));
+            text += "v " + std::to_string(radius * std::cos(turn(i, around))) + " " +
+                    std::to_string(radius * std::sin(turn(i, around))) + " " +
+                    std::to_string(0.4 * std::sin(turn(j, across))) + "\n";
+        }
+    const auto vertex = [](int i, int j) {
+        return " " + std::to_string(i % around * across + j % across + 1);
+    };
+    for (int i = 0; i < around; ++i)
+        for (int j = 0; j < across; ++j)
+            text += "f" + vertex(i, j) + vertex(i + 1, j) + vertex(i + 1, j + 1) +
+                    vertex(i, j + 1) + "\n";
+    return text;
+}
+
+TEST(Quadrilaterals, ShareTheirVerticesAndAreSmoothWhereTheyMeet) {
+    const TemporaryFolder folder;
+    const ImportedModel model = readOrFail(folder.write("a.obj", torus()));
+    ASSERT_EQ(model.meshes.size(), 1U);
+    const KM_Mesh& mesh = *model.meshes[0].mesh;
+    EXPECT_EQ(mesh.m_F.size(), 2U * 48 * 24);
+    ASSERT_EQ(mesh.m_V.size(), 48U * 24);
+    for (std::size_t i = 0; i < mesh.m_V.size(); ++i) {
+        const KM_3fPoint& p = mesh.m_V[i];
+        const double from_axis = std::hypot(p.x, p.y);
+        // The outward normal of a torus leads away from the circle of radius 1.
+        const KM_3dVector outward((p.x - p.x / from_axis) / 0.4, (p.y - p.y / from_axis) / 0.4,
+                                  p.z / 0.4);
+        const KM_3fVector& n = mesh.m_N[i];
+        EXPECT_GT(outward.x * n.x + outward.y * n.y + outward.z * n.z, 0.99);
+    }
+}
+
+} // namespace
+} // namespace quarn::test

@@ -1,0 +1,79 @@
+#include "engine/images/ImageFile.h"
+#include "tests/import/ModelFixtures.h"
+
+#include <gmock/gmock.h>
+
+namespace quarn::test {
+namespace {
+
+using ::testing::ElementsAre;
+using ::testing::HasSubstr;
+using ::testing::SizeIs;
+
+/// Two triangles side by side with the materials "one" and "two".
+constexpr const char* two_materials =
+    "mtllib a.mtl\nv 0 0 0\nv 1 0 0\nv 0 1 0\nv 1 1 0\nvt 0 0\nvt 1 0\nvt 0 1\nvt 1 1\n"
+    "usemtl one\nf 1/1 2/2 3/3\nusemtl two\nf 2/2 4/4 3/3\n";
+
+void writePicture(const TemporaryFolder& folder, const char* name, int width,
+                  std::vector<std::uint8_t> rgba) {
+    Image picture;
+    picture.resize(width, 1);
+    picture.rgba = std::move(rgba);
+    ASSERT_TRUE(writeImageFile(folder.path() / name, picture).ok());
+}
+
+TEST(TextureReading, MissingTextureIsToldOnceHoweverManyMaterialsUseIt) {
+    const TemporaryFolder folder;
+    folder.write("a.mtl", "newmtl one\nmap_Kd gone.png\nnewmtl two\nmap_Kd -clamp on gone.png\n");
+    const ImportedModel model = readOrFail(folder.write("a.obj", two_materials));
+    EXPECT_EQ(model.triangleCount(), 2U);
+    ASSERT_THAT(model.warnings, SizeIs(1));
+    EXPECT_THAT(model.warnings[0], HasSubstr("'gone.png' was left out"));
+}
+
+TEST(TextureReading, BrokenTextureIsToldAndTheModelIsReadWithoutIt) {
+    const TemporaryFolder folder;
+    folder.write("broken.png", "\x89PNG but not really");
+    folder.write("a.mtl", "newmtl one\nmap_Kd broken.png\nnewmtl two\nKd 1 0 0\n");
+    const ImportedModel model = readOrFail(folder.write("a.obj", two_materials));
+    EXPECT_EQ(model.triangleCount(), 2U);
+    ASSERT_THAT(model.warnings, SizeIs(1));
+    EXPECT_THAT(model.warnings[0], HasSubstr("'broken.png' was left out"));
+}
+
+TEST(TextureReading, AbsolutePathOfAnotherMachineIsFoundBesideTheModelByItsName) {
+    const TemporaryFolder folder;
+    writePicture(folder, "wood.png", 1, {10, 20, 30, 255});
+    folder.write("a.mtl", "newmtl one\nmap_Kd C:\\Users\\Jo\\Textures\\wood.png\nnewmtl two\n"
+                          "map_Kd /home/jo/textures/wood.png\n");
+    const ImportedModel model = readOrFail(folder.write("a.obj", two_materials));
+    ASSERT_EQ(model.meshes.size(), 2U);
+    for (const ImportedMesh& mesh : model.meshes) {
+        ASSERT_NE(mesh.material->base_color_texture, nullptr);
+        EXPECT_THAT(mesh.material->base_color_texture->rgba, ElementsAre(10, 20, 30, 255));
+    }
+}
+
+TEST(TextureReading, OpacityMapOfAnObjCutsHolesIntoTheColours) {
+    const TemporaryFolder folder;
+    writePicture(folder, "leaf.png", 2, {10, 20, 30, 255, 40, 50, 60, 255});
+    writePicture(folder, "holes.png", 4,
+                 {255, 255, 255, 255, 255, 255, 255, 255, 0, 0, 0, 255, 0, 0, 0, 255});
+    folder.write("a.mtl",
+                 "newmtl one\nmap_Kd leaf.png\nmap_d holes.png\nnewmtl two\nmap_d holes.png\n");
+    const ImportedModel model = readOrFail(folder.write("a.obj", two_materials));
+    ASSERT_EQ(model.meshes.size(), 2U);
+    const Material& leaf = *model.meshes[0].material;
+    EXPECT_TRUE(leaf.alpha_cutout);
+    ASSERT_NE(leaf.base_color_texture, nullptr);
+    EXPECT_THAT(leaf.base_color_texture->rgba, ElementsAre(10, 20, 30, 255, 40, 50, 60, 0));
+    const Material& plain = *model.meshes[1].material;
+    EXPECT_TRUE(plain.alpha_cutout);
+    ASSERT_NE(plain.base_color_texture, nullptr);
+    EXPECT_THAT(plain.base_color_texture->rgba, ElementsAre(255, 255, 255, 255, 255, 255, 255, 255,
+                                                            255, 255, 255, 0, 255, 255, 255, 0));
+}
+
+} // namespace
+} // namespace quarn::test
