@@ -61,7 +61,7 @@ inline KM_Light afternoonSun() {
 inline quarn::SceneContent sunlit(std::shared_ptr<const KM_Mesh> mesh) {
     quarn::SceneContent content;
     content.revision = 1;
-    content.meshes.push_back({KM_CreateUuid(), std::move(mesh), nullptr, true, {}});
+    content.meshes.push_back({{std::move(mesh), nullptr, {}}, KM_CreateUuid()});
     content.lights.push_back(afternoonSun());
     return content;
 }

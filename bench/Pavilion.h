@@ -43,11 +43,8 @@ inline quarn::SceneContent pavilionContent() {
     quarn::SceneContent content;
     content.revision = 1;
     content.lights.push_back(afternoonSun());
-    for (const quarn::ImportedMesh& mesh : model.value().meshes) {
-        mesh.mesh->PadForRayTracing();
-        content.meshes.push_back(
-            {KM_CreateUuid(), mesh.mesh, mesh.material, true, mesh.world_from_mesh});
-    }
+    for (const quarn::ImportedMesh& mesh : model.value().meshes)
+        content.meshes.push_back({mesh.placed, KM_CreateUuid()});
     return content;
 }
 

@@ -183,7 +183,7 @@ Meshes meshesOfModel(const fs::path& path) {
         fail(model.message());
     Meshes meshes;
     for (const auto& mesh : model.value().meshes)
-        meshes.push_back(mesh.mesh);
+        meshes.push_back(mesh.placed.mesh);
     return meshes;
 }
 
@@ -193,7 +193,7 @@ Meshes meshesOfDocument(const fs::path& path) {
         fail(content.message());
     Meshes meshes;
     for (const auto& object : content.value().objects)
-        meshes.push_back(object.mesh);
+        meshes.push_back(object.placed.mesh);
     return meshes;
 }
 
@@ -203,7 +203,7 @@ std::string documentBytes(const fs::path& model) {
     for (const auto& mesh : meshesOfModel(model)) {
         quarn::ObjectContent object;
         object.id = KM_CreateUuid();
-        object.mesh = mesh;
+        object.placed.mesh = mesh;
         content.objects.push_back(object);
     }
     const auto bytes = quarn::encodeDocument(content);
@@ -226,7 +226,7 @@ Cost costHere(const fs::path& path) {
     quarn::SceneContent content;
     content.revision = 1;
     for (const auto& mesh : meshes)
-        content.meshes.push_back({KM_CreateUuid(), mesh, nullptr, true, {}});
+        content.meshes.push_back({{mesh, nullptr, {}}, KM_CreateUuid()});
     quarn::DisplayScene scene;
     if (!scene.update(content))
         fail("the scene was not built");

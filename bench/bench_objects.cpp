@@ -49,8 +49,7 @@ void writeBoxes(const std::filesystem::path& path, int count) {
 SceneContent contentOf(const quarn::ImportedModel& model) {
     SceneContent content;
     for (const quarn::ImportedMesh& mesh : model.meshes)
-        content.meshes.push_back(
-            {KM_CreateUuid(), mesh.mesh, mesh.material, true, mesh.world_from_mesh});
+        content.meshes.push_back({mesh.placed, KM_CreateUuid()});
     return content;
 }
 
@@ -61,7 +60,7 @@ SceneContent repeated(const SceneContent& content, int count) {
     for (int i = 0; i < count; ++i) {
         copies.meshes.push_back(content.meshes.front());
         copies.meshes.back().id = KM_CreateUuid();
-        copies.meshes.back().world_from_mesh =
+        copies.meshes.back().placed.world_from_mesh =
             KM_Xform::Translation(KM_3dVector(3.0 * (i % side), 3.0 * (i / side), 0.0));
     }
     return copies;

@@ -235,7 +235,7 @@ Result<ImportedModel> readGuarded(const fs::path& path, UpAxis up) {
 std::size_t ImportedModel::triangleCount() const {
     std::size_t count = 0;
     for (const ImportedMesh& mesh : meshes) {
-        count += mesh.mesh->m_F.size();
+        count += mesh.placed.mesh->m_F.size();
     }
     return count;
 }

@@ -1,16 +1,13 @@
 #pragma once
 
-#include "engine/scene/Material.h"
+#include "engine/scene/PlacedMesh.h"
 #include "engine/scene/UnitSystem.h"
 #include "ground/Result.h"
 #include "kelmar/KM_3dPointArray.h"
-#include "kelmar/KM_Mesh.h"
 #include "kelmar/KM_Viewport.h"
-#include "kelmar/KM_Xform.h"
 #include "kelmar/KM_wString.h"
 
 #include <filesystem>
-#include <memory>
 #include <string>
 #include <vector>
 
@@ -19,12 +16,10 @@ namespace quarn {
 /// A mesh object of a model file.
 struct ImportedMesh {
     KM_wString name; ///< as the file has it, or the file's own name; never empty
-    /// Valid, with at least one triangle and vertex normals. Objects that repeat a mesh share it.
-    std::shared_ptr<KM_Mesh> mesh;
-    std::shared_ptr<Material> material; ///< shared between meshes; null: the file gives none
-    /// Where the mesh stands; not the identity for repeated meshes and for models far from the
-    /// origin.
-    KM_Xform world_from_mesh;
+    /// The mesh is valid, with at least one triangle and vertex normals; objects that repeat a mesh
+    /// share it, as those of one material share that. The transform is not the identity for
+    /// repeated meshes and for models far from the origin.
+    PlacedMesh placed;
 };
 
 /// Line primitives of a model file that hang together, as one polyline in world coordinates. The

@@ -274,7 +274,7 @@ private:
         m_without_area += hasArea(*converted) ? 0 : 1;
         const KM_Xform world_from_mesh = shares ? placed.world_from_node : worldFromOrigin();
         m_model.meshes.push_back(
-            {nameOf(placed, mesh), std::move(converted), material.material, world_from_mesh});
+            {nameOf(placed, mesh), {std::move(converted), material.material, world_from_mesh}});
     }
 
     std::shared_ptr<KM_Mesh> sharedMesh(unsigned index, const ReadMaterial& material) {
@@ -405,7 +405,7 @@ private:
     double targetDistance(const KM_3dPoint& location, const KM_3dVector& direction) {
         if (!m_bounds.IsValid()) {
             for (const ImportedMesh& mesh : m_model.meshes) {
-                m_bounds.Union(boxOfPlaced(*mesh.mesh, mesh.world_from_mesh));
+                m_bounds.Union(mesh.placed.box());
             }
         }
         const double distance =

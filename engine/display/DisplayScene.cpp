@@ -87,17 +87,17 @@ void DisplayScene::rebuild(const SceneContent& content) {
 }
 
 void DisplayScene::addMesh(const SceneMesh& object, const MeshCache& earlier) {
-    auto& mesh = m_mesh_cache[object.mesh.get()];
+    auto& mesh = m_mesh_cache[object.placed.mesh.get()];
     if (!mesh) {
-        const auto found = earlier.find(object.mesh.get());
-        mesh =
-            found != earlier.end() ? found->second : std::make_shared<const RayMesh>(object.mesh);
+        const auto found = earlier.find(object.placed.mesh.get());
+        mesh = found != earlier.end() ? found->second
+                                      : std::make_shared<const RayMesh>(object.placed.mesh);
     }
     const bool drawable = mesh->isDrawable();
-    const bool stands = object.world_from_mesh.IsIdentity();
+    const bool stands = object.placed.world_from_mesh.IsIdentity();
     const KM_BoundingBox box = !drawable ? KM_BoundingBox()
                                : stands  ? mesh->box()
-                                         : boxOfPlaced(*object.mesh, object.world_from_mesh);
+                                         : object.placed.box();
     m_meshes.push_back({drawable ? mesh : nullptr, object.visible, KM_Xform(), box});
 }
 
@@ -110,7 +110,7 @@ void DisplayScene::choosePlaces(const SceneContent& content) {
     m_origin = nearbyOrigin(box);
     const double reach = 100.0 * box.Diagonal().Length();
     for (const SceneMesh& object : content.meshes) {
-        const KM_3dPoint own = object.world_from_mesh * KM_3dPoint::Origin;
+        const KM_3dPoint own = object.placed.world_from_mesh * KM_3dPoint::Origin;
         if (m_origin == KM_3dPoint::Origin || own == m_origin)
             break;
         if (own != KM_3dPoint::Origin && own.DistanceTo(box.Center()) < reach) {
@@ -120,7 +120,7 @@ void DisplayScene::choosePlaces(const SceneContent& content) {
     }
     const KM_Xform frame_from_world = KM_Xform::Translation(KM_3dPoint::Origin - m_origin);
     for (std::size_t i = 0; i < m_meshes.size(); ++i)
-        m_meshes[i].frame_from_mesh = frame_from_world * content.meshes[i].world_from_mesh;
+        m_meshes[i].frame_from_mesh = frame_from_world * content.meshes[i].placed.world_from_mesh;
 }
 
 std::size_t DisplayScene::meshOfSurface(std::size_t surface) const {
@@ -132,7 +132,7 @@ std::size_t DisplayScene::meshOfSurface(std::size_t surface) const {
 RaySurface DisplayScene::surfaceOf(const SceneMesh& object, const RayMesh& mesh,
                                    TextureCache& earlier) {
     static const Material default_material;
-    const Material& material = object.material ? *object.material : default_material;
+    const Material& material = object.placed.material ? *object.placed.material : default_material;
     const LinearColor albedo = linearFromColor(material.base_color);
     RaySurface surface;
     surface.triangles = mesh.mesh().m_F.data();

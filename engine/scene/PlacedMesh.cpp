@@ -1,7 +1,5 @@
 #include "engine/scene/PlacedMesh.h"
 
-#include "kelmar/KM_Mesh.h"
-
 #include <algorithm>
 #include <cmath>
 
@@ -26,8 +24,8 @@ bool keepsAxes(const KM_Xform& x) {
 
 } // namespace
 
-KM_BoundingBox boxOfPlaced(const KM_Mesh& mesh, const KM_Xform& world_from_mesh) {
-    const KM_BoundingBox own = mesh.BoundingBox();
+KM_BoundingBox PlacedMesh::box() const {
+    const KM_BoundingBox own = mesh->BoundingBox();
     if (!own.IsValid() || world_from_mesh.IsIdentity())
         return own;
     KM_BoundingBox box;
@@ -36,7 +34,7 @@ KM_BoundingBox boxOfPlaced(const KM_Mesh& mesh, const KM_Xform& world_from_mesh)
             box.Set(world_from_mesh * own.Corner(i));
         return box;
     }
-    for (const KM_3fPoint& vertex : mesh.m_V)
+    for (const KM_3fPoint& vertex : mesh->m_V)
         if (vertex.IsValid())
             box.Set(world_from_mesh * vertex.ToDouble());
     return box;

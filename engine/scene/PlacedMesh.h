@@ -1,16 +1,27 @@
 #pragma once
 
+#include "engine/scene/Material.h"
 #include "kelmar/KM_BoundingBox.h"
+#include "kelmar/KM_Mesh.h"
 #include "kelmar/KM_Xform.h"
 
-class KM_Mesh;
+#include <memory>
 
 namespace quarn {
 
-/// The box of a mesh where a transform puts it: exact, and empty for a mesh without a finite
-/// vertex. Looks at every vertex only where the transform turns the mesh.
-/// @param world_from_mesh  affine
-KM_BoundingBox boxOfPlaced(const KM_Mesh& mesh, const KM_Xform& world_from_mesh);
+/// A mesh with what it looks like and where it stands. Reader, document and ray scene share one and
+/// never change it.
+struct PlacedMesh {
+    std::shared_ptr<const KM_Mesh> mesh{};
+    std::shared_ptr<const Material> material{}; ///< null: the default material
+    /// Objects may share a mesh, and one that lies far from the origin keeps its digits by
+    /// coordinates of its own. Affine and not flattening.
+    KM_Xform world_from_mesh{};
+
+    /// The box of the mesh in the world: exact, and empty for a mesh without a finite vertex. Looks
+    /// at every vertex only where the transform turns the mesh. There must be a mesh.
+    KM_BoundingBox box() const;
+};
 
 /// A place near which single precision is enough for what lies in a box: the origin of the world
 /// unless the box lies more than a hundred times its size away from it, else a round place nearby.

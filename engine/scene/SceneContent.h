@@ -1,27 +1,21 @@
 #pragma once
 
-#include "engine/scene/Material.h"
+#include "engine/scene/PlacedMesh.h"
 #include "kelmar/KM_3dPointArray.h"
 #include "kelmar/KM_Color.h"
 #include "kelmar/KM_Light.h"
-#include "kelmar/KM_Mesh.h"
 #include "kelmar/KM_Uuid.h"
-#include "kelmar/KM_Xform.h"
 
 #include <cstdint>
-#include <memory>
 #include <vector>
 
 namespace quarn {
 
-/// A mesh object as the display pipeline sees it. The mesh is shared with the document, never
-/// copied; it must not change while a scene holds it.
+/// A mesh object as the display pipeline sees it.
 struct SceneMesh {
+    PlacedMesh placed;
     KM_UUID id;
-    std::shared_ptr<const KM_Mesh> mesh;
-    std::shared_ptr<const Material> material; ///< null: the default material
     bool visible = true;
-    KM_Xform world_from_mesh; ///< affine; objects may share a mesh
 };
 
 /// A curve object, already flattened to a polyline in world coordinates.

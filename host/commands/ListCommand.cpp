@@ -33,11 +33,11 @@ struct ObjectCounts {
     int selected = 0;
 
     void add(const DocumentObject& object) {
-        meshes += object.mesh ? 1 : 0;
-        triangles += object.mesh ? object.mesh->TriangleCount() : 0;
-        vertices += object.mesh ? object.mesh->VertexCount() : 0;
-        if (object.material)
-            materials.insert(object.material.get());
+        meshes += object.placed.mesh ? 1 : 0;
+        triangles += object.placed.mesh ? object.placed.mesh->TriangleCount() : 0;
+        vertices += object.placed.mesh ? object.placed.mesh->VertexCount() : 0;
+        if (object.placed.material)
+            materials.insert(object.placed.material.get());
         curves += object.curve ? 1 : 0;
         points += object.point ? 1 : 0;
         hidden += object.visible ? 0 : 1;
@@ -66,8 +66,8 @@ KM_wString lineOf(const DocumentObject& object, bool with_id) {
     const KM_wString id = KM_UuidToString(object.id);
     KM_wString line = nameOrId(object) + L"  ";
     line += object.curve ? object.curve->TypeName() : object.kind();
-    if (object.mesh)
-        line += L", " + counted(object.mesh->TriangleCount(), L"triangle", L"triangles");
+    if (object.placed.mesh)
+        line += L", " + counted(object.placed.mesh->TriangleCount(), L"triangle", L"triangles");
     line += object.visible ? L"" : L", hidden";
     line += object.selected ? L", selected" : L"";
     return line + (with_id && !object.name.IsEmpty() ? L"  " + id : KM_wString()) + L"\n";

@@ -53,9 +53,9 @@ ContentCounts countsOf(const ImportedModel& model) {
 ContentCounts countsOf(const DocumentContent& content) {
     ContentCounts counts;
     for (const ObjectContent& object : content.objects) {
-        counts.meshes += object.mesh ? 1 : 0;
+        counts.meshes += object.placed.mesh ? 1 : 0;
         counts.triangles +=
-            object.mesh ? static_cast<std::size_t>(object.mesh->TriangleCount()) : 0;
+            object.placed.mesh ? static_cast<std::size_t>(object.placed.mesh->TriangleCount()) : 0;
         counts.curves += object.curve ? 1 : 0;
         counts.points += object.point ? 1 : 0;
     }

@@ -10,6 +10,7 @@
 #include "host/commands/WatchedRendering.h"
 #include "host/document/DisplayModeList.h"
 #include "host/document/Document.h"
+#include "host/document/DocumentDrawing.h"
 #include "host/document/SceneChanges.h"
 #include "sdk/qncore/QnDib.h"
 #include "sdk/qncore/QnGet.h"
@@ -206,8 +207,8 @@ CQuarnCommand::result drawFrame(const Animation& animation, const FrameWish& wis
                     "DisplayMode.");
     DisplayModeAttributes attributes = drawingAttributes(*mode);
     attributes.antialiasing_level = static_cast<int>(AntialiasingLevel::capture);
-    const auto drawn = animation.view->document().draw(scene.viewport, attributes, wish.width_px,
-                                                       wish.height_px, picture, scene.changes);
+    const auto drawn = animation.view->document().drawing().draw(
+        scene.viewport, attributes, wish.width_px, wish.height_px, picture, scene.changes);
     return drawn ? CQuarnCommand::success : fail(drawn.message());
 }
 

@@ -1,6 +1,7 @@
 #include "host/commands/WatchedRendering.h"
 
 #include "host/document/Document.h"
+#include "host/document/DocumentDrawing.h"
 #include "host/front_end/FrontEnd.h"
 #include "sdk/qncore/QnPlatform.h"
 
@@ -15,7 +16,7 @@ Result<RenderEnd> renderWatched(Document& document, const KM_Viewport& viewport,
         front_end.pumpEvents(0);
         return !front_end.isInterrupted() && !front_end.isKeyDown(VK_ESCAPE);
     };
-    auto end = document.render(viewport, request, watch, picture, changes, shown);
+    auto end = document.drawing().render(viewport, request, watch, picture, changes, shown);
     front_end.pictureRendered(1.0);
     return end;
 }

@@ -1,11 +1,9 @@
 #include "host/document/Document.h"
 
 #include "engine/display/DisplayMode.h"
-#include "engine/render/Renderer.h"
+#include "host/document/DocumentDrawing.h"
 #include "host/document/DocumentList.h"
-#include "host/document/DocumentScene.h"
 #include "host/document/SavedState.h"
-#include "host/document/SceneChanges.h"
 #include "host/document/StandardViews.h"
 #include "host/document/file/FileRemainder.h"
 #include "host/front_end/FrontEnd.h"
@@ -14,7 +12,6 @@
 #include "sdk/qncore/QnLocalize.h"
 
 #include <algorithm>
-#include <new>
 #include <utility>
 
 namespace quarn {
@@ -35,7 +32,8 @@ const KM_UUID& Document::standardModeFor(const KM_Viewport& viewport) {
 
 Document::Document(DocumentList& list, unsigned int serial_number)
     : m_list(list), m_serial_number(serial_number),
-      m_file_remainder(std::make_unique<FileRemainder>()), m_properties(*this), m_face(*this) {
+      m_file_remainder(std::make_unique<FileRemainder>()),
+      m_drawing(std::make_unique<DocumentDrawing>(*this)), m_properties(*this), m_face(*this) {
     addStandardViews();
 }
 
@@ -63,7 +61,7 @@ void Document::close() {
     closeAllViews();
     m_lights.close();
     m_sun.close();
-    m_scene.reset();
+    m_drawing->release();
     if (m_render_window.isOpen())
         frontEnd().renderWindowShown({});
     m_render_window.close();
@@ -204,7 +202,7 @@ void Document::addModel(const ImportedModel& model) {
     if (m_objects.empty())
         m_units = model.units;
     for (const ImportedMesh& mesh : model.meshes)
-        m_objects.addMesh(mesh.name, mesh.mesh, mesh.material, KM_nil_uuid, mesh.world_from_mesh);
+        m_objects.addMesh(mesh.name, mesh.placed);
     for (const ImportedCurve& curve : model.curves)
         m_objects.addCurve(curve.name, std::make_unique<KM_PolylineCurve>(
                                            std::span(curve.points.Array(), curve.points.Count())));
@@ -224,30 +222,6 @@ void Document::fitTolerance() {
         m_absolute_tolerance = std::min(m_absolute_tolerance, TOLERANCE_OF_SIZE * size);
 }
 
-std::vector<KM_Light> Document::shiningLights() const {
-    std::vector<KM_Light> lights;
-    addShiningLights(SceneChanges(), lights);
-    return lights;
-}
-
-/// A light of the changes comes last, the sun in whose place it stands first.
-void Document::addShiningLights(const SceneChanges& changes, std::vector<KM_Light>& lights) const {
-    if (changes.sun) {
-        m_lights.addShiningLights(lights, changes.sun->replaced_light);
-        if (LightStore::canShine(changes.sun->light))
-            lights.push_back(changes.sun->light);
-        return;
-    }
-    if (const auto sun = m_sun.light())
-        lights.push_back(*sun);
-    m_lights.addShiningLights(lights);
-}
-
-Result<void> Document::draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode,
-                            int width_px, int height_px, Image& picture) {
-    return draw(viewport, mode, width_px, height_px, picture, SceneChanges());
-}
-
 MeshEdgeChoice Document::edgesOf(const KM_UUID& display_mode) const {
     const auto found = m_edges.find(display_mode);
     return found == m_edges.end() ? MeshEdgeChoice::standard : found->second;
@@ -258,70 +232,6 @@ void Document::setEdgesOf(const KM_UUID& display_mode, MeshEdgeChoice choice) {
         m_edges.erase(display_mode);
     else
         m_edges[display_mode] = choice;
-}
-
-Result<void> Document::updateScene(const SceneChanges& changes) {
-    if (!m_scene)
-        m_scene = std::make_unique<DocumentScene>();
-    m_shining_lights.clear();
-    addShiningLights(changes, m_shining_lights);
-    return m_scene->update(m_objects, m_shining_lights, changes.hidden);
-}
-
-/// Nothing that was half built is drawn the next time.
-Error Document::memoryLacks(const char* how, int width_px, int height_px) {
-    m_scene.reset();
-    return Error{"A picture of " + std::to_string(width_px) + " by " + std::to_string(height_px) +
-                 " pixels cannot be " + how +
-                 ": there is too little memory. Close other programs, or choose a smaller size."};
-}
-
-Result<void> Document::draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode,
-                            int width_px, int height_px, Image& picture,
-                            const SceneChanges& changes) {
-    try {
-        const auto updated = updateScene(changes);
-        if (!updated)
-            return updated;
-        return m_scene->draw(viewport, withEdges(mode, edgesOf(mode.id)), width_px, height_px,
-                             picture);
-    } catch (const std::bad_alloc&) {
-        picture = Image();
-        return memoryLacks("drawn", width_px, height_px);
-    }
-}
-
-Result<RenderEnd> Document::render(const KM_Viewport& viewport, const RenderRequest& request,
-                                   const std::function<bool(double share)>& watch, Image& picture,
-                                   const SceneChanges& changes,
-                                   const std::function<void(const Image& so_far)>& shown) {
-    try {
-        const auto updated = updateScene(changes);
-        if (!updated)
-            return updated.error();
-        return Renderer().render(m_scene->display(), viewport, request, watch, picture, shown);
-    } catch (const std::bad_alloc&) {
-        return memoryLacks("rendered", request.width_px, request.height_px);
-    }
-}
-
-Result<const DocumentScene*> Document::upToDateScene() {
-    try {
-        const auto updated = updateScene(SceneChanges());
-        if (!updated)
-            return updated.error();
-        return m_scene.get();
-    } catch (const std::bad_alloc&) {
-        m_scene.reset();
-        return Error{"There is too little memory for the scene. Close other programs."};
-    }
-}
-
-void Document::regenerate() {
-    if (!m_scene)
-        return;
-    if (const auto updated = updateScene(SceneChanges()); !updated)
-        frontEnd().print(KM_wString::FromUtf8(updated.message() + "\n").View());
 }
 
 } // namespace quarn

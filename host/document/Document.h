@@ -10,7 +10,6 @@
 #include "sdk/qncore/QnDoc.h"
 
 #include <filesystem>
-#include <functional>
 #include <map>
 #include <memory>
 #include <string>
@@ -19,19 +18,14 @@
 
 namespace quarn {
 
+class DocumentDrawing;
 class DocumentList;
-class DocumentScene;
 class FrontEnd;
 enum class MeshEdgeChoice : int;
-struct DisplayModeAttributes;
 struct DocumentContent;
 struct FileRemainder;
-struct Image;
 struct ImportedModel;
-struct RenderRequest;
 struct SavedState;
-struct SceneChanges;
-enum class RenderEnd;
 
 /// A camera that a model file brought along.
 struct NamedView {
@@ -148,30 +142,10 @@ public:
     /// @param only_selected  take the selected objects alone, without views, cameras and lights
     DocumentContent content(bool only_selected) const;
 
-    /// The lights that shine now: the sun, when it is on, and the lights of the table.
-    std::vector<KM_Light> shiningLights() const;
-
-    /// Draws all that is visible. The scene is built once for each revision of the objects and
-    /// shared by the views.
-    /// @return an error, with the picture unchanged, when the scene cannot be built or drawn; when
-    ///         memory lacks, the picture is empty
-    Result<void> draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode, int width_px,
-                      int height_px, Image& picture);
-    /// Draws the same otherwise than it is; neither the document nor what its views show changes.
-    Result<void> draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode, int width_px,
-                      int height_px, Image& picture, const SceneChanges& changes);
-    /// Renders what is visible, otherwise than it is where `changes` says so; as Renderer::render.
-    Result<RenderEnd> render(const KM_Viewport& viewport, const RenderRequest& request,
-                             const std::function<bool(double share)>& watch, Image& picture,
-                             const SceneChanges& changes,
-                             const std::function<void(const Image& so_far)>& shown = {});
-    /// The scene as it is drawn now, brought up to date. Valid until the next call that draws.
-    /// @return an error when it cannot be built
-    Result<const DocumentScene*> upToDateScene();
+    /// Draws the document.
+    DocumentDrawing& drawing() { return *m_drawing; }
     RenderWindow& renderWindow() { return m_render_window; }
     const RenderWindow& renderWindow() const { return m_render_window; }
-    /// Brings the scene up to date where it was built before.
-    void regenerate();
 
 private:
     void addStandardViews();
@@ -180,12 +154,9 @@ private:
     void addCameras(const DocumentContent& content);
     std::vector<std::string> replaceViews(const DocumentContent& content);
     void fitTolerance();
-    void addShiningLights(const SceneChanges& changes, std::vector<KM_Light>& lights) const;
     void closeNow(ViewState& view);
     void closeDueViews();
     void resizeDueFrames();
-    Result<void> updateScene(const SceneChanges& changes);
-    Error memoryLacks(const char* how, int width_px, int height_px);
 
     DocumentList& m_list;
     unsigned int m_serial_number;
@@ -210,8 +181,7 @@ private:
     ViewState* m_due_active_view = nullptr;            ///< to be active then; null: as it is
     std::vector<std::unique_ptr<ViewState>> m_closed_views;
     bool m_is_open = true;
-    std::unique_ptr<DocumentScene> m_scene; ///< null until something is drawn
-    std::vector<KM_Light> m_shining_lights; ///< in the last picture; kept for its storage
+    std::unique_ptr<DocumentDrawing> m_drawing;
     RenderWindow m_render_window;
     CQuarnDocProperties m_properties;
     CQuarnDoc m_face;

@@ -1,21 +1,20 @@
 #include "host/document/DocumentObject.h"
 
-#include "engine/scene/PlacedMesh.h"
 #include "host/border/Contract.h"
 #include "host/document/DocumentList.h"
 
 namespace quarn {
 
 const wchar_t* DocumentObject::kind() const {
-    if (mesh)
+    if (placed.mesh)
         return L"mesh";
     return curve ? L"curve" : L"point";
 }
 
 KM_BoundingBox DocumentObject::boundingBox() const {
-    if (mesh) {
+    if (placed.mesh) {
         if (!m_mesh_box)
-            m_mesh_box = boxOfPlaced(*mesh, world_from_mesh);
+            m_mesh_box = placed.box();
         return *m_mesh_box;
     }
     if (curve)

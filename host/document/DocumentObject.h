@@ -1,10 +1,8 @@
 #pragma once
 
-#include "engine/scene/Material.h"
+#include "engine/scene/PlacedMesh.h"
 #include "kelmar/KM_BoundingBox.h"
 #include "kelmar/KM_Curve.h"
-#include "kelmar/KM_Mesh.h"
-#include "kelmar/KM_Xform.h"
 #include "sdk/qncore/QnObject.h"
 
 #include <memory>
@@ -24,11 +22,7 @@ struct DocumentObject {
     bool visible = true;
     bool selected = false; ///< by a person, for the commands that work on a selection
 
-    std::shared_ptr<const KM_Mesh> mesh;      ///< shared with the ray scene, never changed
-    std::shared_ptr<const Material> material; ///< of a mesh; null: the default material
-    /// Where the mesh stands: objects may share one, and one that lies far from the origin keeps
-    /// its digits by coordinates of its own. Affine and not flattening; set before the first use.
-    KM_Xform world_from_mesh;
+    PlacedMesh placed; ///< its mesh is null in other objects; set before the first use
     std::unique_ptr<KM_Curve> curve;
     std::optional<KM_3dPoint> point;
 

@@ -45,9 +45,8 @@ void DocumentScene::takeObjects(const ObjectTable& objects) {
     m_content.points.clear();
     m_content.revision = objects.revision();
     for (const auto& object : objects.objects()) {
-        if (object->mesh)
-            m_content.meshes.push_back(
-                {object->id, object->mesh, object->material, true, object->world_from_mesh});
+        if (object->placed.mesh)
+            m_content.meshes.push_back({object->placed, object->id});
         else if (object->curve)
             m_content.curves.push_back({object->id, displayPolyline(*object->curve)});
         else if (object->point)
@@ -61,7 +60,7 @@ void DocumentScene::takeVisibility(const ObjectTable& objects, std::span<const K
     auto point = m_content.points.begin();
     for (const auto& object : objects.objects()) {
         const bool shown = object->visible && std::ranges::find(hidden, object->id) == hidden.end();
-        if (object->mesh)
+        if (object->placed.mesh)
             (mesh++)->visible = shown;
         else if (object->curve)
             (curve++)->visible = shown;

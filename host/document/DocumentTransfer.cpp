@@ -11,9 +11,7 @@ ObjectContent contentOf(const DocumentObject& object) {
     content.id = object.id;
     content.name = object.name;
     content.visible = object.visible;
-    content.mesh = object.mesh;
-    content.material = object.material;
-    content.world_from_mesh = object.world_from_mesh;
+    content.placed = object.placed;
     if (object.curve)
         content.curve.reset(object.curve->Duplicate());
     content.point = object.point;
@@ -33,9 +31,8 @@ ViewContent contentOf(const ViewState& view, bool is_active) {
 }
 
 DocumentObject& add(ObjectTable& objects, const ObjectContent& content) {
-    if (content.mesh)
-        return objects.addMesh(content.name, content.mesh, content.material, content.id,
-                               content.world_from_mesh);
+    if (content.placed.mesh)
+        return objects.addMesh(content.name, content.placed, content.id);
     if (content.curve)
         return objects.addCurve(content.name, std::unique_ptr<KM_Curve>(content.curve->Duplicate()),
                                 content.id);

@@ -14,13 +14,9 @@ KM_wString lowerCase(std::wstring_view text) {
 
 } // namespace
 
-DocumentObject& ObjectTable::addMesh(const KM_wString& name, std::shared_ptr<const KM_Mesh> mesh,
-                                     std::shared_ptr<const Material> material, const KM_UUID& id,
-                                     const KM_Xform& world_from_mesh) {
+DocumentObject& ObjectTable::addMesh(const KM_wString& name, PlacedMesh placed, const KM_UUID& id) {
     DocumentObject& object = add(name, id);
-    object.mesh = std::move(mesh);
-    object.material = std::move(material);
-    object.world_from_mesh = world_from_mesh;
+    object.placed = std::move(placed);
     return object;
 }
 

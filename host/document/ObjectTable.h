@@ -19,10 +19,8 @@ public:
     /// @param id  the id that it had in a file; a new one is made for the nil id, and for one that
     ///            another object has already
     /// @return the object; valid until it is removed
-    DocumentObject& addMesh(const KM_wString& name, std::shared_ptr<const KM_Mesh> mesh,
-                            std::shared_ptr<const Material> material,
-                            const KM_UUID& id = KM_nil_uuid,
-                            const KM_Xform& world_from_mesh = KM_Xform());
+    DocumentObject& addMesh(const KM_wString& name, PlacedMesh placed,
+                            const KM_UUID& id = KM_nil_uuid);
     DocumentObject& addCurve(const KM_wString& name, std::unique_ptr<KM_Curve> curve,
                              const KM_UUID& id = KM_nil_uuid);
     DocumentObject& addPoint(const KM_wString& name, const KM_3dPoint& point,

@@ -1,5 +1,6 @@
 #include "host/border/Border.h"
 #include "host/border/Contract.h"
+#include "host/document/DocumentDrawing.h"
 #include "host/document/DocumentList.h"
 #include "host/front_end/FrontEnd.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
@@ -67,8 +68,10 @@ bool CQuarnDoc::ShowObject(const CQuarnObjRef& object, bool) {
 }
 
 void CQuarnDoc::Regen() {
-    if (mayCallDocument(*m_document, "CQuarnDoc::Regen"))
-        m_document->regenerate();
+    if (!mayCallDocument(*m_document, "CQuarnDoc::Regen"))
+        return;
+    if (const auto updated = m_document->drawing().regenerate(); !updated)
+        m_document->frontEnd().print(KM_wString::FromUtf8(updated.message() + "\n").View());
 }
 
 // ---- CQuarnDocProperties

@@ -30,7 +30,7 @@ public:
         for (const auto& object : objects.objects()) {
             if (!object->visible)
                 continue;
-            if (object->mesh)
+            if (object->placed.mesh)
                 m_box.Union(object->boundingBox());
             else
                 visitCurveOrPoint(*object, [&](const KM_3dPoint& point) { m_box.Set(point); });
@@ -43,7 +43,7 @@ public:
         for (const auto& object : m_objects.objects()) {
             if (!object->visible)
                 continue;
-            if (!object->mesh)
+            if (!object->placed.mesh)
                 visitCurveOrPoint(*object, visit);
             else if (isSmallCopy(*object))
                 visitCorners(*object, visit);
@@ -54,26 +54,26 @@ public:
 
 private:
     bool isSmallCopy(const DocumentObject& object) const {
-        return !object.world_from_mesh.IsIdentity() && object.mesh.use_count() > 2 &&
+        return !object.placed.world_from_mesh.IsIdentity() && object.placed.mesh.use_count() > 2 &&
                object.boundingBox().Diagonal().Length() < SMALL_SHARE * m_box.Diagonal().Length();
     }
 
     template <class Visit> void visitCorners(const DocumentObject& object, Visit& visit) const {
-        const auto [found, is_new] = m_mesh_boxes.try_emplace(object.mesh.get());
+        const auto [found, is_new] = m_mesh_boxes.try_emplace(object.placed.mesh.get());
         if (is_new)
-            found->second = object.mesh->BoundingBox();
+            found->second = object.placed.mesh->BoundingBox();
         for (int corner = 0; corner < 8; ++corner)
-            visit(object.world_from_mesh * found->second.Corner(corner));
+            visit(object.placed.world_from_mesh * found->second.Corner(corner));
     }
 
     template <class Visit> static void visitVertices(const DocumentObject& object, Visit& visit) {
-        if (object.world_from_mesh.IsIdentity()) {
-            for (const KM_3fPoint& vertex : object.mesh->m_V)
+        if (object.placed.world_from_mesh.IsIdentity()) {
+            for (const KM_3fPoint& vertex : object.placed.mesh->m_V)
                 visit(vertex.ToDouble());
             return;
         }
-        for (const KM_3fPoint& vertex : object.mesh->m_V)
-            visit(object.world_from_mesh * vertex.ToDouble());
+        for (const KM_3fPoint& vertex : object.placed.mesh->m_V)
+            visit(object.placed.world_from_mesh * vertex.ToDouble());
     }
 
     template <class Visit>

@@ -4,6 +4,7 @@
 #include "host/document/CameraMove.h"
 #include "host/document/DisplayModeList.h"
 #include "host/document/Document.h"
+#include "host/document/DocumentDrawing.h"
 #include "host/front_end/FrontEnd.h"
 
 namespace quarn {
@@ -103,8 +104,8 @@ bool ViewState::draw(Image& picture, int width_px, int height_px,
 
 bool ViewState::render(Image& picture, int width_px, int height_px,
                        const CDisplayPipelineAttributes& attributes) {
-    const auto drawn =
-        m_document.draw(m_viewport, drawingAttributes(attributes), width_px, height_px, picture);
+    const auto drawn = m_document.drawing().draw(m_viewport, drawingAttributes(attributes),
+                                                 width_px, height_px, picture);
     if (!drawn)
         m_document.frontEnd().print(KM_wString::FromUtf8(drawn.message() + "\n").View());
     else

@@ -16,7 +16,7 @@ const ObjectTable* activeObjects() {
 }
 
 unsigned kindOf(const DocumentObject& object) {
-    if (object.mesh)
+    if (object.placed.mesh)
         return CQuarnGetObject::mesh_object;
     return object.curve ? CQuarnGetObject::curve_object : CQuarnGetObject::point_object;
 }

@@ -4,6 +4,7 @@
 #include "engine/display/RayPick.h"
 #include "host/document/DisplayModeList.h"
 #include "host/document/Document.h"
+#include "host/document/DocumentDrawing.h"
 #include "host/document/DocumentScene.h"
 
 #include <algorithm>
@@ -163,7 +164,7 @@ std::optional<PickedObject> objectAt(CQuarnView& view, double x_px, double y_px)
     const auto ray = rayAt(state.frameCamera(), x_px, y_px);
     if (!ray)
         return std::nullopt;
-    const auto scene = state.document().upToDateScene();
+    const auto scene = state.document().drawing().scene();
     if (!scene)
         return std::nullopt;
     const auto found = Picking(state, *scene.value(), *ray, x_px, y_px).find();
@@ -180,7 +181,7 @@ std::optional<KM_3dPoint> pointAt(CQuarnView& view, double x_px, double y_px) {
     const auto ray = rayAt(camera, x_px, y_px);
     if (!ray)
         return std::nullopt;
-    if (const auto scene = state.document().upToDateScene())
+    if (const auto scene = state.document().drawing().scene())
         if (const auto surface = firstSurface(scene.value()->display(), *ray))
             return surface->point;
     if (!ray->is_parallel || !looksAlongAxis(camera))

@@ -22,7 +22,8 @@ std::string textOf(const fs::path& path) {
 
 TEST(AtomicFile, ReplacesAFileAndKeepsItsPermissions) {
     const TempFolder folder;
-    const fs::path path = folder.write("a.txt", "old and longer");
+    const fs::path path = folder / "a.txt";
+    writeFile(path, "old and longer");
     chmod(path.c_str(), 0640);
     ASSERT_TRUE(writeFileAtomically(path, bytesOf("new"), FileSync::yes).ok());
     EXPECT_EQ(textOf(path), "new");

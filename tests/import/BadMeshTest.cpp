@@ -25,7 +25,7 @@ TEST(PlyColours, BytesAreKeptWithTheirAlpha) {
         "a.ply", ply(3, properties, 1,
                      "0 0 0 255 0 10 255\n1 0 0 20 200 30 128\n0 1 0 1 2 3 0\n3 0 1 2\n")));
     ASSERT_THAT(model.meshes, SizeIs(1));
-    const auto& colors = model.meshes[0].mesh->m_C;
+    const auto& colors = model.meshes[0].placed.mesh->m_C;
     ASSERT_THAT(colors, SizeIs(3));
     EXPECT_EQ(colors[0], (KM_Color{255, 0, 10, 255}));
     EXPECT_EQ(colors[1], (KM_Color{20, 200, 30, 128}));
@@ -40,7 +40,7 @@ TEST(PlyColours, NumbersFromNothingToOneAreSharesOfFullColour) {
         folder.write("a.ply", ply(3, properties, 1,
                                   "0 0 0 1 0 0.2\n1 0 0 0.4 0.6 0.8\n0 1 0 0 0 0\n3 0 1 2\n")));
     ASSERT_THAT(model.meshes, SizeIs(1));
-    const auto& colors = model.meshes[0].mesh->m_C;
+    const auto& colors = model.meshes[0].placed.mesh->m_C;
     ASSERT_THAT(colors, SizeIs(3));
     EXPECT_EQ(colors[0], (KM_Color{255, 0, 51, 255}));
     EXPECT_EQ(colors[1], (KM_Color{102, 153, 204, 255}));

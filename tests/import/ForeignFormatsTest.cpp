@@ -43,7 +43,7 @@ TEST(VertexColours, ThatAreNothingAtAllStandForMissingOnes) {
                                          "unit=\"millimeter\"><object id=\"1\">" +
                                              mesh + "</object></amf>"));
     ASSERT_EQ(model.triangleCount(), 1U);
-    EXPECT_THAT(model.meshes[0].mesh->m_C, IsEmpty());
+    EXPECT_THAT(model.meshes[0].placed.mesh->m_C, IsEmpty());
 }
 
 std::string wide(const std::string& ascii, bool big_endian) {
@@ -101,7 +101,7 @@ TEST(Quadrilaterals, ShareTheirVerticesAndAreSmoothWhereTheyMeet) {
     const TemporaryFolder folder;
     const ImportedModel model = readOrFail(folder.write("a.obj", torus()));
     ASSERT_EQ(model.meshes.size(), 1U);
-    const KM_Mesh& mesh = *model.meshes[0].mesh;
+    const KM_Mesh& mesh = *model.meshes[0].placed.mesh;
     EXPECT_EQ(mesh.m_F.size(), 2U * 48 * 24);
     ASSERT_EQ(mesh.m_V.size(), 48U * 24);
     for (std::size_t i = 0; i < mesh.m_V.size(); ++i) {

@@ -33,7 +33,7 @@ const ImportedMesh& onlyMesh(const ImportedModel& model) {
 
 Material readMaterial(const GltfSquare& square, const TemporaryFolder& folder) {
     const ImportedModel model = readOrFail(square.write(folder));
-    const auto material = onlyMesh(model).material;
+    const auto material = onlyMesh(model).placed.material;
     EXPECT_NE(material, nullptr);
     return material ? *material : Material();
 }
@@ -107,13 +107,13 @@ TEST_P(TextureTransforms, MoveTurnAndScaleTheTextureCoordinates) {
         std::string(one_texture) + "}]" + R"(,"extensionsUsed":["KHR_texture_transform"])";
     const ImportedModel model = readOrFail(square.write(folder));
     const ImportedMesh& mesh = onlyMesh(model);
-    ASSERT_THAT(mesh.mesh->m_T, SizeIs(4));
+    ASSERT_THAT(mesh.placed.mesh->m_T, SizeIs(4));
     for (std::size_t i = 0; i < 4; ++i) {
         const auto wanted =
             transformed(square.texture_coordinates[i], offset_u, offset_v, angle, scale_u, scale_v);
         // Ours run upward from the lower left corner. Whole repetitions show the same.
-        const double du = double{mesh.mesh->m_T[i].x} - wanted[0];
-        const double dv = double{mesh.mesh->m_T[i].y} - (1.0 - wanted[1]);
+        const double du = double{mesh.placed.mesh->m_T[i].x} - wanted[0];
+        const double dv = double{mesh.placed.mesh->m_T[i].y} - (1.0 - wanted[1]);
         EXPECT_NEAR(du, std::round(du), 1e-5) << "corner " << i;
         EXPECT_NEAR(dv, std::round(dv), 1e-5) << "corner " << i;
     }
@@ -176,7 +176,7 @@ Material objMaterial(const std::string& lines) {
     folder.write("a.mtl", "newmtl one\nKd 0.2 0.4 0.6\n" + lines + "\n");
     const ImportedModel model = readOrFail(
         folder.write("a.obj", "mtllib a.mtl\nv 0 0 0\nv 1 0 0\nv 0 1 0\nusemtl one\nf 1 2 3\n"));
-    const auto material = onlyMesh(model).material;
+    const auto material = onlyMesh(model).placed.material;
     return material ? *material : Material();
 }
 

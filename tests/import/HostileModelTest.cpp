@@ -60,8 +60,8 @@ TEST(HostileModel, TrianglesWithACoordinateThatIsNoNumberAreLeftOutWithAWarning)
     const ImportedModel model = readOrFail(hostile / "one_nan_vertex.obj");
     ASSERT_EQ(model.meshes.size(), 1U);
     EXPECT_EQ(model.triangleCount(), 1U);
-    EXPECT_EQ(model.meshes[0].mesh->VertexCount(), 3);
-    EXPECT_TRUE(model.meshes[0].mesh->IsValid());
+    EXPECT_EQ(model.meshes[0].placed.mesh->VertexCount(), 3);
+    EXPECT_TRUE(model.meshes[0].placed.mesh->IsValid());
     EXPECT_THAT(model.warnings, Contains(HasSubstr("1 of 2 triangles were left out")));
 }
 
@@ -69,8 +69,8 @@ TEST(HostileModel, NamesThatLeaveTheFolderAreNotFollowed) {
     const ImportedModel model = readOrFail(hostile / "escaping_names.obj");
     EXPECT_EQ(model.triangleCount(), 2U);
     for (const ImportedMesh& mesh : model.meshes) {
-        ASSERT_NE(mesh.material, nullptr);
-        EXPECT_EQ(mesh.material->base_color_texture, nullptr);
+        ASSERT_NE(mesh.placed.material, nullptr);
+        EXPECT_EQ(mesh.placed.material->base_color_texture, nullptr);
     }
     EXPECT_THAT(model.warnings, Contains("The texture '/etc/passwd' was left out: it lies outside "
                                          "the model's folder; copy it beside the model."));
@@ -84,7 +84,7 @@ TEST(HostileModel, MaterialFileOutsideTheFolderIsNotRead) {
         "model/a.obj", "mtllib ../secret.mtl\nv 0 0 0\nv 1 0 0\nv 0 1 0\nusemtl red\nf 1 2 3\n");
     const ImportedModel model = readOrFail(path);
     ASSERT_EQ(model.meshes.size(), 1U);
-    const auto& material = model.meshes[0].material;
+    const auto& material = model.meshes[0].placed.material;
     EXPECT_TRUE(material == nullptr || material->base_color != (KM_Color{255, 0, 0, 255}));
     EXPECT_THAT(model.warnings,
                 Contains(AllOf(HasSubstr("secret.mtl"), HasSubstr("outside the model's folder"))));
@@ -98,7 +98,7 @@ TEST(HostileModel, LinkOutOfTheFolderIsNotFollowed) {
     std::filesystem::create_symlink("../secret.mtl", folder.path() / "model/a.mtl");
     const ImportedModel model = readOrFail(path);
     ASSERT_EQ(model.meshes.size(), 1U);
-    const auto& material = model.meshes[0].material;
+    const auto& material = model.meshes[0].placed.material;
     EXPECT_TRUE(material == nullptr || material->base_color != (KM_Color{255, 0, 0, 255}));
 }
 

@@ -47,7 +47,7 @@ TEST(ModelFile, ObjStaysAsItIsWithItsPolygonsCutIntoTriangles) {
     ASSERT_EQ(model.meshes.size(), 1U);
     EXPECT_EQ(model.triangleCount(), 12U);
     EXPECT_EQ(model.meshes[0].name, L"cube");
-    EXPECT_EQ(model.meshes[0].material, nullptr);
+    EXPECT_EQ(model.meshes[0].placed.material, nullptr);
     expectNear(boundsOf(model).m_min, {0, 0, 0}, 0);
     expectNear(boundsOf(model).m_max, {1, 1, 1}, 0);
     EXPECT_THAT(model.warnings, IsEmpty());
@@ -57,7 +57,7 @@ TEST(ModelFile, SharpEdgesStaySharpWhereTheFileHasNoNormals) {
     const TemporaryFolder folder;
     const ImportedModel model = readOrFail(folder.write("cube.obj", cube));
     ASSERT_EQ(model.meshes.size(), 1U);
-    const KM_Mesh& mesh = *model.meshes[0].mesh;
+    const KM_Mesh& mesh = *model.meshes[0].placed.mesh;
     ASSERT_EQ(mesh.m_N.size(), mesh.m_V.size());
     EXPECT_EQ(mesh.VertexCount(), 24); // eight corners, each on three sides
     for (const KM_MeshTriangle& face : mesh.m_F) {
@@ -139,12 +139,12 @@ TEST(ModelFile, LinearBaseColourOfGltfBecomesSrgb) {
     const ImportedModel model =
         readOrFail(folder.write("a.gltf", gltfTriangle(R"([{"mesh":0}])", gray_half)));
     ASSERT_EQ(model.meshes.size(), 1U);
-    ASSERT_NE(model.meshes[0].material, nullptr);
+    ASSERT_NE(model.meshes[0].placed.material, nullptr);
     // 1.055 * 0.5^(1/2.4) - 0.055 = 0.7354, times 255 = 187.5
-    EXPECT_NEAR(model.meshes[0].material->base_color.r, 187.5, 0.51);
-    EXPECT_EQ(model.meshes[0].material->base_color.g, 255);
-    EXPECT_EQ(model.meshes[0].material->base_color.b, 0);
-    EXPECT_EQ(model.meshes[0].material->base_color.a, 64);
+    EXPECT_NEAR(model.meshes[0].placed.material->base_color.r, 187.5, 0.51);
+    EXPECT_EQ(model.meshes[0].placed.material->base_color.g, 255);
+    EXPECT_EQ(model.meshes[0].placed.material->base_color.b, 0);
+    EXPECT_EQ(model.meshes[0].placed.material->base_color.a, 64);
 }
 
 TEST(ModelFile, BaseColourOfObjIsSrgbAlready) {
@@ -153,9 +153,9 @@ TEST(ModelFile, BaseColourOfObjIsSrgbAlready) {
     const ImportedModel model = readOrFail(folder.write(
         "a.obj", std::string("mtllib a.mtl\n") + triangle + "usemtl paint\nf 1 2 3\n"));
     ASSERT_EQ(model.meshes.size(), 1U);
-    ASSERT_NE(model.meshes[0].material, nullptr);
-    EXPECT_EQ(model.meshes[0].material->name, L"paint");
-    EXPECT_EQ(model.meshes[0].material->base_color, (KM_Color{128, 255, 0, 255}));
+    ASSERT_NE(model.meshes[0].placed.material, nullptr);
+    EXPECT_EQ(model.meshes[0].placed.material->name, L"paint");
+    EXPECT_EQ(model.meshes[0].placed.material->base_color, (KM_Color{128, 255, 0, 255}));
 }
 
 TEST(ModelFile, MeshThatStandsTwiceIsSharedByTwoObjectsInTheirPlaces) {
@@ -165,13 +165,11 @@ TEST(ModelFile, MeshThatStandsTwiceIsSharedByTwoObjectsInTheirPlaces) {
                                R"({"mesh":0,"scale":[2,2,2],"translation":[0,5,0]}])",
                                gray_half)));
     ASSERT_EQ(model.meshes.size(), 2U);
-    const auto box = [&](std::size_t i) {
-        return boxOfPlaced(*model.meshes[i].mesh, model.meshes[i].world_from_mesh);
-    };
-    EXPECT_EQ(model.meshes[0].mesh, model.meshes[1].mesh);
+    const auto box = [&](std::size_t i) { return model.meshes[i].placed.box(); };
+    EXPECT_EQ(model.meshes[0].placed.mesh, model.meshes[1].placed.mesh);
     expectNear(box(0).m_max, {11, 0, 1}, 1e-6);
     expectNear(box(1).m_max, {2, 0, 7}, 1e-6);
-    EXPECT_EQ(model.meshes[0].material, model.meshes[1].material);
+    EXPECT_EQ(model.meshes[0].placed.material, model.meshes[1].placed.material);
 }
 
 TEST(ModelFile, MirroringTurnsTheWindingSoThatOutsideStaysOutside) {
@@ -180,7 +178,7 @@ TEST(ModelFile, MirroringTurnsTheWindingSoThatOutsideStaysOutside) {
         folder.write("a.gltf", gltfTriangle(R"([{"mesh":0,"scale":[-1,1,1]}])", gray_half)));
     ASSERT_EQ(model.meshes.size(), 1U);
     // The triangle faces +z in the file, which is -y here; a mirror across x leaves that side out.
-    const KM_Mesh& mesh = *model.meshes[0].mesh;
+    const KM_Mesh& mesh = *model.meshes[0].placed.mesh;
     ASSERT_EQ(mesh.TriangleCount(), 1);
     EXPECT_LT(faceNormal(mesh, mesh.m_F[0]).y, 0.0);
     EXPECT_FLOAT_EQ(mesh.m_N[0].y, -1.0F);
@@ -218,16 +216,17 @@ TEST(ModelFile, TextureBesideTheModelIsReadWithItsRowsFromTheTop) {
         readOrFail(folder.write("a.obj", std::string("mtllib a.mtl\n") + triangle +
                                              "vt 0 0\nvt 1 0\nvt 0 1\nusemtl m\nf 1/1 2/2 3/3\n"));
     ASSERT_EQ(model.meshes.size(), 1U);
-    ASSERT_NE(model.meshes[0].material, nullptr);
-    const auto& texture = model.meshes[0].material->base_color_texture;
+    ASSERT_NE(model.meshes[0].placed.material, nullptr);
+    const auto& texture = model.meshes[0].placed.material->base_color_texture;
     ASSERT_NE(texture, nullptr);
     EXPECT_EQ(texture->width, 1);
     EXPECT_EQ(texture->height, 2);
     EXPECT_EQ(texture->rgba, picture.rgba);
     // Black under a texture is what many programs write for "the texture alone".
-    EXPECT_EQ(model.meshes[0].material->base_color, (KM_Color{255, 255, 255, 255}));
-    ASSERT_EQ(model.meshes[0].mesh->m_T.size(), 3U);
-    EXPECT_EQ(model.meshes[0].mesh->m_T[2], KM_2fPoint(0.0F, 1.0F)); // (0,0) is the lower left
+    EXPECT_EQ(model.meshes[0].placed.material->base_color, (KM_Color{255, 255, 255, 255}));
+    ASSERT_EQ(model.meshes[0].placed.mesh->m_T.size(), 3U);
+    EXPECT_EQ(model.meshes[0].placed.mesh->m_T[2],
+              KM_2fPoint(0.0F, 1.0F)); // (0,0) is the lower left
 }
 
 TEST(ModelFile, MissingTextureIsAWarningAndTheBaseColourStays) {
@@ -236,7 +235,7 @@ TEST(ModelFile, MissingTextureIsAWarningAndTheBaseColourStays) {
     const ImportedModel model = readOrFail(
         folder.write("a.obj", std::string("mtllib a.mtl\n") + triangle + "usemtl m\nf 1 2 3\n"));
     ASSERT_EQ(model.meshes.size(), 1U);
-    EXPECT_EQ(model.meshes[0].material->base_color, (KM_Color{255, 0, 0, 255}));
+    EXPECT_EQ(model.meshes[0].placed.material->base_color, (KM_Color{255, 0, 0, 255}));
     EXPECT_THAT(model.warnings, Contains(HasSubstr("'gone.png' was left out: there is no such")));
 }
 
@@ -248,7 +247,7 @@ TEST(ModelFile, VertexColoursOfPlyAreKept) {
                  "element face 1\nproperty list uchar int vertex_indices\nend_header\n"
                  "0 0 0 255 0 0\n1 0 0 0 128 0\n0 1 0 0 0 64\n3 0 1 2\n"));
     ASSERT_EQ(model.meshes.size(), 1U);
-    const auto& colors = model.meshes[0].mesh->m_C;
+    const auto& colors = model.meshes[0].placed.mesh->m_C;
     ASSERT_EQ(colors.size(), 3U);
     EXPECT_EQ(colors[0], (KM_Color{255, 0, 0, 255}));
     EXPECT_EQ(colors[1], (KM_Color{0, 128, 0, 255}));
@@ -269,9 +268,9 @@ TEST(ModelFile, StlVerticesAtOnePlaceAreSharedAndFlatPartsSmooth) {
     const TemporaryFolder folder;
     const ImportedModel model = readOrFail(folder.write("square.STL", bytes));
     ASSERT_EQ(model.meshes.size(), 1U);
-    EXPECT_EQ(model.meshes[0].mesh->TriangleCount(), 2);
-    EXPECT_EQ(model.meshes[0].mesh->VertexCount(), 4);
-    for (const KM_3fVector& n : model.meshes[0].mesh->m_N) {
+    EXPECT_EQ(model.meshes[0].placed.mesh->TriangleCount(), 2);
+    EXPECT_EQ(model.meshes[0].placed.mesh->VertexCount(), 4);
+    for (const KM_3fVector& n : model.meshes[0].placed.mesh->m_N) {
         EXPECT_FLOAT_EQ(n.z, 1.0F);
     }
 }

@@ -35,7 +35,7 @@ inline ImportedModel readOrFail(const std::filesystem::path& path) {
 inline KM_BoundingBox boundsOf(const ImportedModel& model) {
     KM_BoundingBox bounds = KM_BoundingBox::EmptyBoundingBox;
     for (const ImportedMesh& mesh : model.meshes) {
-        bounds.Union(boxOfPlaced(*mesh.mesh, mesh.world_from_mesh));
+        bounds.Union(mesh.placed.box());
     }
     return bounds;
 }

@@ -20,7 +20,7 @@ TEST(PlacedModel, SurveyedCoordinatesKeepAllTheirDigits) {
     ASSERT_EQ(model.meshes.size(), 1U);
     expectNear(boundsOf(model).m_min, {4500012.125, 5200034.25, 100.5}, 1e-6);
     expectNear(boundsOf(model).m_max, {4500013.125, 5200035.5, 101.0}, 1e-6);
-    const KM_BoundingBox own = model.meshes[0].mesh->BoundingBox();
+    const KM_BoundingBox own = model.meshes[0].placed.mesh->BoundingBox();
     EXPECT_LT((own.Center() - KM_3dPoint::Origin).Length(), 1000.0);
     ASSERT_EQ(model.curves.size(), 1U);
     expectNear(model.curves[0].points[0], {4500012.125, 5200034.25, 100.5}, 1e-6);
@@ -32,8 +32,8 @@ TEST(PlacedModel, TrianglesThatAreNearTheOriginStandWhereTheirVerticesSay) {
     const ImportedModel model =
         readOrFail(folder.write("a.obj", "v 20000 0 0\nv -20000 0 0\nv 0 20000 0.25\nf 1 2 3\n"));
     ASSERT_EQ(model.meshes.size(), 1U);
-    EXPECT_TRUE(model.meshes[0].world_from_mesh.IsIdentity());
-    expectNear(model.meshes[0].mesh->BoundingBox().m_max, {20000, 20000, 0.25}, 0.0);
+    EXPECT_TRUE(model.meshes[0].placed.world_from_mesh.IsIdentity());
+    expectNear(model.meshes[0].placed.mesh->BoundingBox().m_max, {20000, 20000, 0.25}, 0.0);
 }
 
 TEST(PlacedModel, SurveyedModelThatIsYUpIsTurnedAsAWhole) {

@@ -30,8 +30,8 @@ TEST_P(SampleModel, HasTheTrianglesAndTheSizeThatItsFileStates) {
     expectNear(bounds.m_max, sample.high, tolerance);
     for (const ImportedMesh& mesh : model.meshes) {
         KM_wString why;
-        EXPECT_TRUE(mesh.mesh->IsValid(&why)) << why.ToUtf8();
-        EXPECT_EQ(mesh.mesh->m_N.size(), mesh.mesh->m_V.size());
+        EXPECT_TRUE(mesh.placed.mesh->IsValid(&why)) << why.ToUtf8();
+        EXPECT_EQ(mesh.placed.mesh->m_N.size(), mesh.placed.mesh->m_V.size());
         EXPECT_FALSE(mesh.name.IsEmpty());
     }
 }
@@ -59,8 +59,8 @@ TEST(SampleModels, ObjFindsItsMaterialsAndTheTexturesBesideIt) {
     const ImportedModel model = readOrFail(samples / "OBJ/spider.obj");
     EXPECT_EQ(model.meshes.size(), 19U);
     for (const ImportedMesh& mesh : model.meshes) {
-        ASSERT_NE(mesh.material, nullptr) << mesh.name.ToUtf8();
-        EXPECT_NE(mesh.material->base_color_texture, nullptr) << mesh.name.ToUtf8();
+        ASSERT_NE(mesh.placed.material, nullptr) << mesh.name.ToUtf8();
+        EXPECT_NE(mesh.placed.material->base_color_texture, nullptr) << mesh.name.ToUtf8();
     }
     EXPECT_THAT(model.warnings, ::testing::IsEmpty());
 }
@@ -69,9 +69,9 @@ TEST(SampleModels, GlbHoldsItsTextureInItself) {
     const ImportedModel model =
         readOrFail(samples / "glTF2/BoxTextured-glTF-Binary/BoxTextured.glb");
     ASSERT_EQ(model.meshes.size(), 1U);
-    ASSERT_NE(model.meshes[0].material, nullptr);
-    ASSERT_NE(model.meshes[0].material->base_color_texture, nullptr);
-    EXPECT_EQ(model.meshes[0].material->base_color_texture->width, 211);
+    ASSERT_NE(model.meshes[0].placed.material, nullptr);
+    ASSERT_NE(model.meshes[0].placed.material->base_color_texture, nullptr);
+    EXPECT_EQ(model.meshes[0].placed.material->base_color_texture->width, 211);
 }
 
 TEST(SampleModels, FbxFindsByNameWhatItStatesByThePathOfAnotherMachine) {

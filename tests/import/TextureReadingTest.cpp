@@ -50,8 +50,8 @@ TEST(TextureReading, AbsolutePathOfAnotherMachineIsFoundBesideTheModelByItsName)
     const ImportedModel model = readOrFail(folder.write("a.obj", two_materials));
     ASSERT_EQ(model.meshes.size(), 2U);
     for (const ImportedMesh& mesh : model.meshes) {
-        ASSERT_NE(mesh.material->base_color_texture, nullptr);
-        EXPECT_THAT(mesh.material->base_color_texture->rgba, ElementsAre(10, 20, 30, 255));
+        ASSERT_NE(mesh.placed.material->base_color_texture, nullptr);
+        EXPECT_THAT(mesh.placed.material->base_color_texture->rgba, ElementsAre(10, 20, 30, 255));
     }
 }
 
@@ -64,11 +64,11 @@ TEST(TextureReading, OpacityMapOfAnObjCutsHolesIntoTheColours) {
                  "newmtl one\nmap_Kd leaf.png\nmap_d holes.png\nnewmtl two\nmap_d holes.png\n");
     const ImportedModel model = readOrFail(folder.write("a.obj", two_materials));
     ASSERT_EQ(model.meshes.size(), 2U);
-    const Material& leaf = *model.meshes[0].material;
+    const Material& leaf = *model.meshes[0].placed.material;
     EXPECT_TRUE(leaf.alpha_cutout);
     ASSERT_NE(leaf.base_color_texture, nullptr);
     EXPECT_THAT(leaf.base_color_texture->rgba, ElementsAre(10, 20, 30, 255, 40, 50, 60, 0));
-    const Material& plain = *model.meshes[1].material;
+    const Material& plain = *model.meshes[1].placed.material;
     EXPECT_TRUE(plain.alpha_cutout);
     ASSERT_NE(plain.base_color_texture, nullptr);
     EXPECT_THAT(plain.base_color_texture->rgba, ElementsAre(255, 255, 255, 255, 255, 255, 255, 255,

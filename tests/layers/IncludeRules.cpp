@@ -1,7 +1,8 @@
 #include "tests/layers/IncludeRules.h"
 
+#include "tests/layers/Floors.h"
+
 #include <algorithm>
-#include <array>
 #include <fstream>
 #include <regex>
 #include <span>
@@ -13,50 +14,13 @@ namespace {
 
 namespace fs = std::filesystem;
 
-/// What the files below one place may include, quoted, besides the files of that place itself.
-struct Rule {
-    std::string_view place;                       ///< a path prefix of the including file
-    std::array<std::string_view, 8> allowed = {}; ///< path prefixes of the included file
-    bool knows_itself = true;
-    bool standard_library_only = false; ///< no `<...>` but the language's own headers
-    bool knows_cocoa = false;           ///< Objective-C++, which may use its frameworks
-};
-
 constexpr std::string_view ALL_OF_ZOETRIX = "zoetrix/";
-constexpr std::string_view UTILITIES = "zoetrix/plugin/ZoetrixUtilities.h";
 
-/// The first rule whose place matches decides, so the narrower places stand first.
-constexpr Rule RULES[] = {
-    {"kelmar/", {}, true, true},
-    {"sdk/cocoa/", {"sdk/", "kelmar/"}, true, true, true},
-    {"sdk/", {"kelmar/"}, true, true},
-    {"zoetrix/sun/VyrSun", {"zoetrix/sun/VyrSun.h"}, false, true},
-    {"zoetrix/sun/", {"sdk/", "kelmar/", UTILITIES}, true, true},
-    {"zoetrix/ui/QXTurnTableDialogController",
-     {"sdk/", "kelmar/", "zoetrix/ui/"},
-     false,
-     true,
-     true},
-    {"zoetrix/ui/", {"sdk/", "kelmar/", UTILITIES}, true, true},
-    {"zoetrix/plugin/", {"sdk/", "kelmar/", "zoetrix/paths/"}, true, true},
-    {"zoetrix/paths/", {"sdk/", "kelmar/", "zoetrix/plugin/"}, true, true},
-    {"zoetrix/commands/",
-     {"sdk/", "kelmar/", "zoetrix/plugin/", "zoetrix/paths/", "zoetrix/sun/", "zoetrix/ui/"},
-     true,
-     true},
-    {"zoetrix/", {"sdk/", "kelmar/", ALL_OF_ZOETRIX}, true, true},
-    {"vexui/", {"sdk/", "kelmar/"}, true, false},
-    {"host/cocoa/", {"sdk/", "kelmar/", "ground/Result.h", "host/front_end/"}, true, false, true},
-    {"host/", {"sdk/", "kelmar/"}, true, false},
-    {"quarn/", {"sdk/", "host/front_end/"}, true, false},
-    {"desktop/", {"sdk/", "host/front_end/"}, true, false},
-    {"examples/", {"sdk/", "kelmar/"}, true, false},
-};
-
-const Rule* ruleFor(std::string_view file) {
-    const auto rule = std::ranges::find_if(
-        RULES, [&](const Rule& candidate) { return file.starts_with(candidate.place); });
-    return rule == std::end(RULES) ? nullptr : &*rule;
+const Room* roomOf(std::string_view file) {
+    const std::span<const Room> rooms = floors();
+    const auto room = std::ranges::find_if(
+        rooms, [&](const Room& candidate) { return file.starts_with(candidate.place); });
+    return room == rooms.end() ? nullptr : &*room;
 }
 
 /// The language's own headers have neither a folder nor an ending.
@@ -121,31 +85,35 @@ std::vector<Include> includesOf(const std::string& source) {
 }
 
 bool isAllowed(const std::string& file, const Include& include) {
-    const Rule* const rule = ruleFor(file);
-    if (rule == nullptr) {
+    const Room* const room = roomOf(file);
+    if (room == nullptr) {
         return false;
     }
+    using enum Room::Libraries;
+    const bool knows_all = room->libraries == any || room->libraries == any_and_cocoa;
+    const bool knows_cocoa =
+        room->libraries == standard_and_cocoa || room->libraries == any_and_cocoa;
     if (!include.quoted && isCocoaFramework(include.path)) {
-        return rule->knows_cocoa;
+        return knows_cocoa;
     }
     if (!include.quoted) {
-        return !rule->standard_library_only || isStandardHeader(include.path);
+        return knows_all || isStandardHeader(include.path);
     }
-    if (isAboveTheFolders(include.path) || (isCocoaHeader(include.path) && !rule->knows_cocoa)) {
+    if (isAboveTheFolders(include.path) || (isCocoaHeader(include.path) && !knows_cocoa)) {
         return false;
     }
-    if (rule->knows_itself && include.path.starts_with(rule->place)) {
-        return true;
-    }
-    return std::ranges::any_of(rule->allowed, [&](std::string_view place) {
-        return !place.empty() && include.path.starts_with(place);
-    });
+    const auto leads_there = [&](std::string_view place) {
+        return include.path.starts_with(place);
+    };
+    return (room->knows_itself && leads_there(room->place)) ||
+           std::ranges::any_of(room->sees, leads_there) ||
+           std::ranges::any_of(room->neighbours, leads_there);
 }
 
 std::vector<std::string> breachesBelow(const std::filesystem::path& root) {
     std::vector<std::string> folders;
-    for (const Rule& rule : RULES) {
-        folders.push_back(topFolder(rule.place));
+    for (const Room& room : floors()) {
+        folders.push_back(topFolder(room.place));
     }
     std::ranges::sort(folders);
     folders.erase(std::unique(folders.begin(), folders.end()), folders.end());

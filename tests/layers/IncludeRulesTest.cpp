@@ -1,13 +1,18 @@
 #include "tests/layers/IncludeRules.h"
+#include "tests/layers/Floors.h"
 
+#include <algorithm>
 #include <gtest/gtest.h>
+#include <optional>
 
 namespace {
 
 using layers::breachesBelow;
+using layers::floors;
 using layers::Include;
 using layers::includesOf;
 using layers::isAllowed;
+using layers::Room;
 
 std::string listed(const std::vector<std::string>& lines) {
     std::string text;
@@ -32,8 +37,13 @@ TEST(Layers, NoSourceOfTheProjectIncludesWhatItMayNotKnow) {
 TEST(Layers, EveryBreachOfTheSampleTreeIsReported) {
     EXPECT_EQ(listed(breachesBelow(QUARN_SOURCE_DIR "/tests/layers/sample")),
               "desktop/Window.h:2: may not include host/document/Document.h\n"
+              "engine/display/Scene.h:3: may not include engine/render/Renderer.h\n"
+              "engine/display/Scene.h:4: may not include host/document/Document.h\n"
               "host/app/Loader.h:2: may not include zoetrix/plugin/ZoetrixPlugIn.h\n"
               "host/app/Loader.h:3: may not include vexui/Form.h\n"
+              "host/document/Document.h:4: may not include host/app/Loader.h\n"
+              "import/Reader.h:3: may not include engine/display/Scene.h\n"
+              "import/Reader.h:4: may not include sdk/qncore/QnDoc.h\n"
               "kelmar/KM_Shape.h:2: may not include sdk/qncore/QnDoc.h\n"
               "kelmar/KM_Shape.h:3: may not include embree3/rtcore.h\n"
               "quarn/Program.h:3: may not include host/app/Loader.h\n"
@@ -45,6 +55,57 @@ TEST(Layers, EveryBreachOfTheSampleTreeIsReported) {
               "zoetrix/paths/Path.h:3: may not include zoetrix/commands/cmdTurntable.h\n"
               "zoetrix/plugin/ZoetrixPlugIn.h:3: may not include zoetrix/ZoetrixGlobals.cpp\n"
               "zoetrix/sun/VyrSun.h:3: may not include kelmar/KM_Shape.h\n");
+}
+
+/// The row that a place belongs to, or none.
+std::optional<std::size_t> rowOf(std::string_view place) {
+    const auto rows = floors();
+    const auto row =
+        std::ranges::find_if(rows, [&](const Room& room) { return place.starts_with(room.place); });
+    if (row == rows.end())
+        return std::nullopt;
+    return static_cast<std::size_t>(row - rows.begin());
+}
+
+TEST(Layers, ARoomSeesRoomsThatStandAboveItInTheListAlone) {
+    const auto rows = floors();
+    for (std::size_t i = 0; i < rows.size(); ++i) {
+        for (const std::string_view place : rows[i].sees) {
+            if (rows[i].place.starts_with(place))
+                continue; // the wider room that it is a part of
+            const auto seen = rowOf(place);
+            ASSERT_TRUE(seen) << rows[i].place << " sees " << place;
+            EXPECT_LT(*seen, i) << rows[i].place << " sees " << place;
+            EXPECT_LE(rows[*seen].floor, rows[i].floor) << rows[i].place << " sees " << place;
+        }
+        if (i > 0)
+            EXPECT_GE(rows[i].floor, rows[i - 1].floor) << rows[i].place;
+    }
+}
+
+TEST(Layers, OnlyTheFoldersOfThePlugInHaveNeighbours) {
+    for (const Room& room : floors())
+        EXPECT_TRUE(room.neighbours.empty() || room.place.starts_with("zoetrix/")) << room.place;
+}
+
+TEST(Layers, TheLibrariesBelowTheHostKnowNoDocument) {
+    for (const std::string room :
+         {"ground", "engine/scene", "engine/images", "engine/display", "engine/render", "import"}) {
+        EXPECT_FALSE(allowsQuoted(room + "/A.cpp", "host/document/Document.h")) << room;
+        EXPECT_FALSE(allowsQuoted(room + "/A.cpp", "sdk/qncore/QnDoc.h")) << room;
+        EXPECT_TRUE(allowsQuoted(room + "/A.cpp", "kelmar/KM_Point.h")) << room;
+    }
+}
+
+TEST(Layers, ProgramsComeInByTheDoor) {
+    for (const std::string program : {"quarn", "desktop"}) {
+        EXPECT_TRUE(allowsQuoted(program + "/A.cpp", "host/session/Session.h"));
+        EXPECT_TRUE(allowsQuoted(program + "/A.cpp", "host/front_end/FrontEnd.h"));
+        EXPECT_TRUE(allowsQuoted(program + "/A.cpp", "host/cities/Cities.h"));
+        EXPECT_FALSE(allowsQuoted(program + "/A.cpp", "host/commands/HostCommands.h"));
+        EXPECT_FALSE(allowsQuoted(program + "/A.cpp", "engine/images/Image.h"));
+        EXPECT_FALSE(allowsQuoted(program + "/A.cpp", "import/ModelFile.h"));
+    }
 }
 
 TEST(Layers, CommentedOutIncludesDoNotCount) {

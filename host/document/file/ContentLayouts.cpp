@@ -23,8 +23,9 @@ enum class PixelEncoding : std::int32_t { raw = 0 };
 constexpr double UNIT_LENGTH_TOLERANCE = 1e-6;
 
 ObjectKind kindOf(const ObjectContent& object) {
-    if (object.mesh)
-        return object.world_from_mesh.IsIdentity() ? ObjectKind::mesh : ObjectKind::placed_mesh;
+    if (object.placed.mesh)
+        return object.placed.world_from_mesh.IsIdentity() ? ObjectKind::mesh
+                                                          : ObjectKind::placed_mesh;
     return object.curve ? ObjectKind::curve : ObjectKind::point;
 }
 
@@ -209,7 +210,7 @@ bool writeObject(KM_BinaryArchive& archive, const ObjectContent& object, std::in
         return archive.WriteInt(mesh) && archive.WriteInt(material);
     case ObjectKind::placed_mesh:
         return archive.WriteInt(mesh) && archive.WriteInt(material) &&
-               placeFields(FieldWriter(archive), object.world_from_mesh);
+               placeFields(FieldWriter(archive), object.placed.world_from_mesh);
     case ObjectKind::curve:
         return writeCurve(archive, *object.curve);
     case ObjectKind::point:
@@ -226,12 +227,12 @@ bool readObject(KM_BinaryArchive& archive, const SharedContent& shared, ObjectCo
         return false;
     switch (kind) {
     case ObjectKind::mesh:
-        return readShared(archive, shared.meshes, false, object.mesh) &&
-               readShared(archive, shared.materials, true, object.material);
+        return readShared(archive, shared.meshes, false, object.placed.mesh) &&
+               readShared(archive, shared.materials, true, object.placed.material);
     case ObjectKind::placed_mesh:
-        return readShared(archive, shared.meshes, false, object.mesh) &&
-               readShared(archive, shared.materials, true, object.material) &&
-               placeFields(FieldReader(archive), object.world_from_mesh);
+        return readShared(archive, shared.meshes, false, object.placed.mesh) &&
+               readShared(archive, shared.materials, true, object.placed.material) &&
+               placeFields(FieldReader(archive), object.placed.world_from_mesh);
     case ObjectKind::curve:
         object.curve = readCurve(archive);
         return object.curve != nullptr;

@@ -1,16 +1,14 @@
 #pragma once
 
 #include "engine/display/DisplayMode.h"
-#include "engine/scene/Material.h"
+#include "engine/scene/PlacedMesh.h"
 #include "engine/scene/UnitSystem.h"
 #include "host/document/RenderSettings.h"
 #include "kelmar/KM_BinaryArchive.h"
 #include "kelmar/KM_Curve.h"
 #include "kelmar/KM_Light.h"
-#include "kelmar/KM_Mesh.h"
 #include "kelmar/KM_Uuid.h"
 #include "kelmar/KM_Viewport.h"
-#include "kelmar/KM_Xform.h"
 #include "kelmar/KM_wString.h"
 
 #include <cstdint>
@@ -30,9 +28,7 @@ struct ObjectContent {
     KM_UUID id = KM_nil_uuid;
     KM_wString name;
     bool visible = true;
-    std::shared_ptr<const KM_Mesh> mesh;
-    std::shared_ptr<const Material> material; ///< of a mesh; null: the default material
-    KM_Xform world_from_mesh;                 ///< affine and not flattening
+    PlacedMesh placed; ///< its mesh is null in other objects
     std::shared_ptr<const KM_Curve> curve;
     std::optional<KM_3dPoint> point;
 };

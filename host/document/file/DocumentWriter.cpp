@@ -78,8 +78,8 @@ private:
 
     void placeShared() {
         for (const ObjectContent& object : m_content.objects) {
-            m_meshes.of(object.mesh);
-            m_materials.of(object.material);
+            m_meshes.of(object.placed.mesh);
+            m_materials.of(object.placed.material);
         }
         for (const Material* material : m_materials.things())
             m_textures.of(material->base_color_texture);
@@ -121,8 +121,8 @@ private:
     bool writeObjects() {
         for (const ObjectContent& object : m_content.objects) {
             const auto payload = [&] {
-                return writeObject(m_archive, object, m_meshes.of(object.mesh),
-                                   m_materials.of(object.material));
+                return writeObject(m_archive, object, m_meshes.of(object.placed.mesh),
+                                   m_materials.of(object.placed.material));
             };
             if (!writeChunk(chunk::OBJECT, nameOf(object), payload))
                 return false;

@@ -77,7 +77,7 @@ KM_Mesh hillMesh(int cells) {
 std::size_t addMesh(SceneContent& content, KM_Mesh mesh, KM_Color color) {
     auto material = std::make_shared<Material>();
     material->base_color = color;
-    content.meshes.push_back({KM_CreateUuid(), shared(std::move(mesh)), material, true, {}});
+    content.meshes.push_back({{shared(std::move(mesh)), material, {}}, KM_CreateUuid()});
     ++content.revision;
     return content.meshes.size() - 1;
 }

@@ -74,10 +74,10 @@ TEST(PlacedMeshDrawing, ObjectsThatShareAMeshLookLikeCopiesInTheirPlaces) {
     SceneContent copies = withFloorAndSun();
     const std::shared_ptr<const KM_Mesh> mesh = shared(knob());
     for (const KM_Xform& place : differentPlaces()) {
-        sharing.meshes.push_back({KM_CreateUuid(), mesh, nullptr, true, place});
+        sharing.meshes.push_back({{mesh, nullptr, place}, KM_CreateUuid()});
         KM_Mesh copy = knob();
         ASSERT_TRUE(copy.Transform(place));
-        copies.meshes.push_back({KM_CreateUuid(), shared(std::move(copy)), nullptr, true, {}});
+        copies.meshes.push_back({{shared(std::move(copy)), nullptr, {}}, KM_CreateUuid()});
     }
     const KM_Viewport view = perspectiveView({3.0, -16.0, 9.0}, {0.0, 0.0, 0.5});
     for (const wchar_t* const name : all_modes) {
@@ -91,8 +91,9 @@ TEST(PlacedMeshDrawing, OneMeshHasOneSearchStructureHoweverOftenItStands) {
     SceneContent content;
     const std::shared_ptr<const KM_Mesh> mesh = shared(knob());
     for (int i = 0; i < 500; ++i)
-        content.meshes.push_back({KM_CreateUuid(), mesh, nullptr, true,
-                                  KM_Xform::Translation(3.0 * (i % 25), 3.0 * (i / 25), 0.0)});
+        content.meshes.push_back(
+            {{mesh, nullptr, KM_Xform::Translation(3.0 * (i % 25), 3.0 * (i / 25), 0.0)},
+             KM_CreateUuid()});
     DisplayScene scene;
     ASSERT_TRUE(scene.update(content).ok());
     EXPECT_EQ(scene.rays().geometryCount(), 1U);
@@ -112,7 +113,7 @@ TEST(PlacedMeshDrawing, OneOfManyObjectsOfAMeshIsHiddenAndComesBack) {
     const std::shared_ptr<const KM_Mesh> mesh = shared(floorMesh(-1.0F, -1.0F, 1.0F, 1.0F, 0.0F));
     for (const double x : {-3.0, 3.0})
         content.meshes.push_back(
-            {KM_CreateUuid(), mesh, nullptr, true, KM_Xform::Translation(x, 0.0, 0.0)});
+            {{mesh, nullptr, KM_Xform::Translation(x, 0.0, 0.0)}, KM_CreateUuid()});
     DisplayScene scene;
     DisplayPipeline pipeline;
     DepthImage depth;
@@ -137,7 +138,7 @@ TEST(PlacedMeshDrawing, ModelFarFromTheOriginLooksLikeTheSameModelAtIt) {
     addMesh(here, knob());
     SceneContent there = here;
     for (SceneMesh& object : there.meshes)
-        object.world_from_mesh = KM_Xform::Translation(far);
+        object.placed.world_from_mesh = KM_Xform::Translation(far);
     for (int step = 0; step < 12; ++step) {
         const double angle = step * KM_PI / 180.0; // a slow turntable
         const KM_3dPoint eye(8.0 * std::cos(angle), 8.0 * std::sin(angle), 4.0);
@@ -157,7 +158,7 @@ TEST(PlacedMeshDrawing, CurvesAndPointsOfAFarModelStandWhereItDoes) {
     addMesh(here, floorMesh(-4.0F, -4.0F, 4.0F, 4.0F, 0.0F));
     here.curves.push_back({KM_CreateUuid(), KM_3dPointArray(), {255, 0, 0, 255}, true});
     SceneContent there = here;
-    there.meshes[0].world_from_mesh = KM_Xform::Translation(far);
+    there.meshes[0].placed.world_from_mesh = KM_Xform::Translation(far);
     for (const KM_3dPoint& p : {KM_3dPoint(-3.0, 1.0, 1.0), KM_3dPoint(3.0, -2.0, 1.0)}) {
         here.curves[0].polyline.Append(p);
         there.curves[0].polyline.Append(p + far);

@@ -25,9 +25,9 @@ double lightAt(const Image& image, int x, int y, int channel) {
 
 std::size_t addPane(SceneContent& content, KM_Mesh mesh, KM_Color color) {
     const std::size_t index = addMesh(content, std::move(mesh), color);
-    auto material = std::make_shared<Material>(*content.meshes[index].material);
+    auto material = std::make_shared<Material>(*content.meshes[index].placed.material);
     material->see_through = true;
-    content.meshes[index].material = material;
+    content.meshes[index].placed.material = material;
     return index;
 }
 
@@ -158,9 +158,9 @@ TEST(SeeThrough, APaneHasTheOpacityOfItsTexture) {
     texture->height = 1; // the left half is clear
     texture->rgba = {255, 0, 0, 0, 255, 0, 0, 255};
     texture->wrap_u = TextureWrap::clamp;
-    auto material = std::make_shared<Material>(*content.meshes[pane].material);
+    auto material = std::make_shared<Material>(*content.meshes[pane].placed.material);
     material->base_color_texture = texture;
-    content.meshes[pane].material = material;
+    content.meshes[pane].placed.material = material;
     const Image image = seen(content);
     expectLight(image, 15, 50,
                 {lightAt(wall, 15, 50, 0), lightAt(wall, 15, 50, 1), lightAt(wall, 15, 50, 2)});

@@ -148,7 +148,7 @@ TEST(SkyByTheSun, ParallelViewTowardTheSunIsNotFilledByItsDisc) {
 
 TEST(SkyByTheSun, GroundMeetsTheHorizonWithoutALine) {
     SceneContent content = boxOnFloor();
-    content.meshes[0].mesh = shared(boxMesh({-2, -2, 0}, {2, 2, 0.1}));
+    content.meshes[0].placed.mesh = shared(boxMesh({-2, -2, 0}, {2, 2, 0.1}));
     for (const double altitude : {-15.0, -6.0, 0.5, 3.0, 10.0, 45.0, 90.0})
         for (const double azimuth : {0.0, 90.0, 200.0}) {
             content.lights[0] = sunAt(altitude);

@@ -20,9 +20,9 @@ SceneContent yard() {
     addMesh(content, hillMesh(40), {150, 140, 120, 255});
     addMesh(content, sphereMesh({3, 1, 9}, 6.0F, 24), {235, 235, 225, 255});
     addMesh(content, boxMesh({-20, -6, 0}, {-10, -5.8, 12}), {120, 160, 200, 90});
-    auto glass = std::make_shared<Material>(*content.meshes.back().material);
+    auto glass = std::make_shared<Material>(*content.meshes.back().placed.material);
     glass->see_through = true;
-    content.meshes.back().material = glass;
+    content.meshes.back().placed.material = glass;
     for (int i = -6; i <= 6; ++i)
         addMesh(content, boxMesh({3.0 * i - 0.4, -25, 0}, {3.0 * i + 0.4, -24, 14}));
     SceneCurve curve;

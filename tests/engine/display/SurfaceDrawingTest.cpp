@@ -314,7 +314,7 @@ TEST(SurfaceDrawing, VertexColorsAndTexturesShowInRendered) {
     auto material = std::make_shared<Material>();
     material->base_color = {255, 255, 255, 255};
     material->base_color_texture = texture;
-    content.meshes[1].material = material;
+    content.meshes[1].placed.material = material;
     const Image image = seenFromAbove(content, L"Rendered");
     EXPECT_TRUE(isReddish(image, 30, 50));
     EXPECT_GT(image.pixel(70, 15)[2], image.pixel(70, 15)[1] + 60);
@@ -336,7 +336,7 @@ TEST(SurfaceDrawing, CutOutPartsOfASurfaceLetRaysAndSunlightPass) {
     material->base_color = red;
     material->base_color_texture = texture;
     material->alpha_cutout = true;
-    content.meshes[1].material = material;
+    content.meshes[1].placed.material = material;
     content.lights.push_back(sunLight({0.0, 0.0, -1.0}));
     const Image image = seenFromAbove(content, L"Rendered");
     EXPECT_TRUE(isReddish(image, 70, 50));

@@ -42,7 +42,7 @@ SceneContent checkeredFloor() {
     auto material = std::make_shared<Material>();
     material->base_color = {255, 255, 255, 255};
     material->base_color_texture = checker();
-    content.meshes.back().material = material;
+    content.meshes.back().placed.material = material;
     return content;
 }
 
@@ -92,7 +92,7 @@ TEST(TextureDrawing, FarCheckersAreTheMeanOfTheirColours) {
     // Half of the light of white, in sRGB.
     const std::uint8_t half = srgbByteFromLinear(0.5F);
     material->base_color = {half, half, half, 255};
-    gray.meshes[0].material = material;
+    gray.meshes[0].placed.material = material;
     DisplayScene gray_scene;
     ASSERT_TRUE(gray_scene.update(gray).ok());
     const KM_Viewport view = perspectiveView({0.3, 5.0, 1.7}, {0.3, 25.0, 0.0});

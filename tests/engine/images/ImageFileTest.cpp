@@ -207,7 +207,8 @@ private:
 
 TEST(ImageFile, FailedWriteLeavesNoFileAndKeepsTheOldOne) {
     const TempFolder folder;
-    const fs::path old = folder.write("old.bmp", "what was there");
+    const fs::path old = folder / "old.bmp";
+    writeFile(old, "what was there");
     {
         const FileSizeLimit limit(1000);
         EXPECT_FALSE(writeImageFile(old, ramp(64, 64)).ok());

@@ -96,8 +96,8 @@ TEST(RenderedPanes, ShadowsTakeTheSharedGeometrysOwnColors) {
     const std::size_t red =
         addPane(content, floorMesh(-14.0F, -4.0F, -6.0F, 4.0F, 10.0F), red_glass);
     const std::size_t blue = addPane(content, floorMesh(0.0F, 0.0F, 1.0F, 1.0F, 0.0F), blue_glass);
-    content.meshes[blue].mesh = content.meshes[red].mesh;
-    content.meshes[blue].world_from_mesh = KM_Xform::Translation(0.0, 12.0, 0.0);
+    content.meshes[blue].placed.mesh = content.meshes[red].placed.mesh;
+    content.meshes[blue].placed.world_from_mesh = KM_Xform::Translation(0.0, 12.0, 0.0);
     KM_Light sun = sunLight({1.0, 0.0, -1.0});
     sun.SetShadowIntensity(1.0);
     content.lights = {sun};
@@ -147,7 +147,7 @@ TEST(RenderedPanes, ClearGlassAndCutoutsLeaveNoTrace) {
     clear->rgba = {255, 255, 255, 0};
     holes->base_color_texture = clear;
     holes->alpha_cutout = true;
-    with_holes.meshes[sheet].material = holes;
+    with_holes.meshes[sheet].placed.material = holes;
     for (const SceneContent& content : {glazed, with_holes}) {
         const Image image = rendered(content, view, {60, 40, 16});
         int most = 0;

@@ -27,9 +27,9 @@ inline Image rendered(const SceneContent& content, const KM_Viewport& viewport,
 /// Adds a mesh of see-through material, as opaque as its colour says; gives back its index.
 inline std::size_t addPane(SceneContent& content, KM_Mesh mesh, KM_Color color) {
     const std::size_t index = addMesh(content, std::move(mesh), color);
-    auto material = std::make_shared<Material>(*content.meshes[index].material);
+    auto material = std::make_shared<Material>(*content.meshes[index].placed.material);
     material->see_through = true;
-    content.meshes[index].material = material;
+    content.meshes[index].placed.material = material;
     return index;
 }
 

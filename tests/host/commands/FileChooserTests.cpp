@@ -13,6 +13,7 @@ namespace {
 
 using testing::ElementsAre;
 using testing::HasSubstr;
+using testing::IsSupersetOf;
 
 class FileChooserTest : public HostTest {
 protected:

@@ -20,7 +20,7 @@ class ListCommandTest : public HostTest {
 protected:
     ListCommandTest() {
         ObjectTable& objects = document().objects();
-        objects.select(objects.addMesh(L"Roof", boxMesh({0, 0, 0}, {1, 1, 1}), nullptr).id);
+        objects.select(objects.addMesh(L"Roof", {boxMesh({0, 0, 0}, {1, 1, 1})}).id);
         const KM_3dPoint corners[] = {{0, 0, 0}, {5, 0, 0}};
         objects.addCurve(L"Walk", std::make_unique<KM_PolylineCurve>(corners));
         objects.setVisible(objects.addPoint(L"Mark", {9, 9, 9}).id, false);

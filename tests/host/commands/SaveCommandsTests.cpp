@@ -22,7 +22,7 @@ using testing::IsEmpty;
 class SaveCommandsTest : public HostTest {
 protected:
     SaveCommandsTest() {
-        document().objects().addMesh(L"Roof", boxMesh({0, 0, 0}, {1, 1, 1}), nullptr);
+        document().objects().addMesh(L"Roof", {boxMesh({0, 0, 0}, {1, 1, 1})});
         const KM_3dPoint corners[] = {{0, 0, 0}, {5, 0, 0}};
         document().objects().addCurve(L"Walk", std::make_unique<KM_PolylineCurve>(corners));
         document().objects().addPoint(L"Mark", {1, 2, 3});

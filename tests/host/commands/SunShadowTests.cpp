@@ -1,4 +1,5 @@
 #include "host/document/Document.h"
+#include "host/document/DocumentDrawing.h"
 #include "tests/engine/display/DisplayFixture.h"
 #include "tests/host/app/TestCommand.h"
 
@@ -10,8 +11,7 @@ class SunShadowTest : public HostTest {
 protected:
     SunShadowTest() {
         Document& document = Document::of(session.document());
-        document.objects().addMesh(L"Pole", shared(boxMesh({-0.5, -0.5, 0}, {0.5, 0.5, 3})),
-                                   nullptr);
+        document.objects().addMesh(L"Pole", {shared(boxMesh({-0.5, -0.5, 0}, {0.5, 0.5, 3}))});
     }
 
     /// The picture after a command.
@@ -20,6 +20,7 @@ protected:
         Image picture;
         const Result<void> is_drawn =
             Document::of(session.document())
+                .drawing()
                 .draw(topView(10), modeNamed(L"Rendered"), 200, 200, picture);
         EXPECT_TRUE(is_drawn);
         return picture;

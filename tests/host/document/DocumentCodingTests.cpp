@@ -121,41 +121,41 @@ TEST(DocumentCoding, MeshesWithTheirMaterialsAndTexturesComeBack) {
     EXPECT_EQ(sampleId(1), box.id);
     EXPECT_EQ(L"Kiste", box.name.View());
     EXPECT_TRUE(box.visible);
-    EXPECT_EQ(sample.objects[0].mesh->m_V, box.mesh->m_V);
-    EXPECT_EQ(sample.objects[0].mesh->m_N, box.mesh->m_N);
-    EXPECT_EQ(sample.objects[0].mesh->m_T, box.mesh->m_T);
-    EXPECT_EQ(sample.objects[0].mesh->m_C, box.mesh->m_C);
-    EXPECT_EQ(sample.objects[0].mesh->m_F, box.mesh->m_F);
-    ASSERT_TRUE(box.material);
-    EXPECT_EQ(L"Kachel", box.material->name.View());
-    EXPECT_EQ((KM_Color{1, 2, 3, 200}), box.material->base_color);
-    EXPECT_TRUE(box.material->alpha_cutout);
-    EXPECT_EQ(0.25F, box.material->alpha_cutoff);
-    const Texture& texture = *box.material->base_color_texture;
+    EXPECT_EQ(sample.objects[0].placed.mesh->m_V, box.placed.mesh->m_V);
+    EXPECT_EQ(sample.objects[0].placed.mesh->m_N, box.placed.mesh->m_N);
+    EXPECT_EQ(sample.objects[0].placed.mesh->m_T, box.placed.mesh->m_T);
+    EXPECT_EQ(sample.objects[0].placed.mesh->m_C, box.placed.mesh->m_C);
+    EXPECT_EQ(sample.objects[0].placed.mesh->m_F, box.placed.mesh->m_F);
+    ASSERT_TRUE(box.placed.material);
+    EXPECT_EQ(L"Kachel", box.placed.material->name.View());
+    EXPECT_EQ((KM_Color{1, 2, 3, 200}), box.placed.material->base_color);
+    EXPECT_TRUE(box.placed.material->alpha_cutout);
+    EXPECT_EQ(0.25F, box.placed.material->alpha_cutoff);
+    const Texture& texture = *box.placed.material->base_color_texture;
     EXPECT_EQ(2, texture.width);
     EXPECT_EQ(1, texture.height);
     EXPECT_EQ(TextureWrap::mirror, texture.wrap_u);
     EXPECT_EQ(TextureWrap::clamp, texture.wrap_v);
     EXPECT_EQ((Bytes{255, 255, 255, 255, 10, 20, 30, 128}), texture.rgba);
     EXPECT_FALSE(content.objects[1].visible);
-    EXPECT_FALSE(content.objects[1].material);
+    EXPECT_FALSE(content.objects[1].placed.material);
 }
 
 TEST(DocumentCoding, SeeThroughMaterialsComeBackAndOthersAreWrittenAsEver) {
     DocumentContent content = sampleContent();
     const Bytes before = encoded(content);
-    auto material = std::make_shared<Material>(*content.objects[0].material);
+    auto material = std::make_shared<Material>(*content.objects[0].placed.material);
     material->see_through = true;
-    content.objects[0].material = material;
-    EXPECT_TRUE(roundTrip(content).objects[0].material->see_through);
+    content.objects[0].placed.material = material;
+    EXPECT_TRUE(roundTrip(content).objects[0].placed.material->see_through);
     EXPECT_EQ(before.size() + 1, encoded(content).size());
-    EXPECT_FALSE(roundTrip(sampleContent()).objects[0].material->see_through);
+    EXPECT_FALSE(roundTrip(sampleContent()).objects[0].placed.material->see_through);
 }
 
 TEST(DocumentCoding, AMeshThatObjectsShareIsWrittenOnceAndSharedAgain) {
     const DocumentContent sample = sampleContent();
     const DocumentContent content = roundTrip(sample);
-    EXPECT_EQ(content.objects[0].mesh, content.objects[1].mesh);
+    EXPECT_EQ(content.objects[0].placed.mesh, content.objects[1].placed.mesh);
 
     DocumentContent without_second = sample;
     without_second.objects.erase(without_second.objects.begin() + 1);
@@ -186,7 +186,7 @@ TEST(DocumentCoding, CurvesOfEveryTypeComeBackToTheLastBit) {
 TEST(DocumentCoding, PointsComeBack) {
     const ObjectContent point = roundTrip(sampleContent()).objects[5];
     EXPECT_EQ(KM_3dPoint(0.1, 0.2, 0.3), point.point);
-    EXPECT_FALSE(point.mesh);
+    EXPECT_FALSE(point.placed.mesh);
     EXPECT_FALSE(point.curve);
 }
 
@@ -422,9 +422,9 @@ TEST(DocumentCoding, AnObjectNamesAMeshThatIsThere) {
 TEST(DocumentCoding, ATriangleNamesVerticesThatAreThere) {
     DocumentContent content;
     ObjectContent object = sampleContent().objects[0];
-    auto mesh = std::make_shared<KM_Mesh>(*object.mesh);
+    auto mesh = std::make_shared<KM_Mesh>(*object.placed.mesh);
     mesh->m_F[3].vi[1] = 8;
-    object.mesh = mesh;
+    object.placed.mesh = mesh;
     content.objects.push_back(object);
     expectRefused(encoded(content));
 }

@@ -35,7 +35,7 @@ inline std::shared_ptr<KM_Mesh> boxMesh(const KM_3dPoint& low, const KM_3dPoint&
 }
 
 inline void addBox(Document& document, const KM_3dPoint& low, const KM_3dPoint& high) {
-    document.objects().addMesh(L"Box", boxMesh(low, high), nullptr);
+    document.objects().addMesh(L"Box", {boxMesh(low, high)});
 }
 
 /// Keeps a record as a plug-in does, and is installed as long as it lives.

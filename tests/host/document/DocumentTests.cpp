@@ -129,7 +129,7 @@ TEST_F(DocumentTest, HidingAndShowingTellWhetherAnythingChanged) {
 
 ImportedModel boxModel(double size) {
     ImportedModel model;
-    model.meshes.push_back({L"Box", boxMesh({0, 0, 0}, {size, size, size}), nullptr});
+    model.meshes.push_back({L"Box", {boxMesh({0, 0, 0}, {size, size, size})}});
     return model;
 }
 
@@ -164,7 +164,7 @@ TEST_F(DocumentTest, AModelIsSharedAndNotCopied) {
 
     const auto& objects = document.objects().objects();
     ASSERT_EQ(objects.size(), 3U);
-    EXPECT_EQ(objects[0]->mesh.get(), model.meshes[0].mesh.get());
+    EXPECT_EQ(objects[0]->placed.mesh.get(), model.meshes[0].placed.mesh.get());
     EXPECT_EQ(objects[1]->curve->PointAtEnd(), path[2]);
     EXPECT_EQ(objects[2]->point, KM_3dPoint(5, 5, 5));
     ASSERT_EQ(document.namedViews().size(), 1U);

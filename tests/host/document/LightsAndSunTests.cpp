@@ -1,3 +1,4 @@
+#include "host/document/DocumentDrawing.h"
 #include "tests/host/document/DocumentFixtures.h"
 
 #include <limits>
@@ -79,7 +80,7 @@ TEST_F(LightTableTest, OnlyLiveLightsThatAreOnShineBesideTheSun) {
     document.lights().add(off);
     document.lights().remove(document.lights().add(sunFrom({0, 1, -1})));
 
-    const std::vector<KM_Light> lights = document.shiningLights();
+    const std::vector<KM_Light> lights = document.drawing().shiningLights();
     ASSERT_EQ(lights.size(), 2U);
     EXPECT_EQ(lights[0].Direction(), -document.sun().directionToSun());
     EXPECT_EQ(lights[1].Direction(), KM_3dVector(0, 0, -1));
@@ -125,12 +126,12 @@ TEST_F(DocumentSunTest, AChangeThatIsTakenBackIsNone) {
 }
 
 TEST_F(DocumentSunTest, ShinesOnlyWhileItIsOn) {
-    ASSERT_EQ(document.shiningLights().size(), 1U);
-    EXPECT_EQ(document.shiningLights()[0].Style(), KM_LightStyle::world_directional);
+    ASSERT_EQ(document.drawing().shiningLights().size(), 1U);
+    EXPECT_EQ(document.drawing().shiningLights()[0].Style(), KM_LightStyle::world_directional);
     document.sun().beginChange();
     document.sun().setEnabled(false);
     document.sun().endChange();
-    EXPECT_TRUE(document.shiningLights().empty());
+    EXPECT_TRUE(document.drawing().shiningLights().empty());
 }
 
 } // namespace

@@ -28,8 +28,8 @@ DocumentContent twoPlaced() {
     for (const KM_Xform& place : {quarterTurnAt(4.5e6, 5.2e6, 100.0), KM_Xform()}) {
         ObjectContent object;
         object.id = KM_CreateUuid();
-        object.mesh = mesh;
-        object.world_from_mesh = place;
+        object.placed.mesh = mesh;
+        object.placed.world_from_mesh = place;
         content.objects.push_back(std::move(object));
     }
     return content;
@@ -37,8 +37,8 @@ DocumentContent twoPlaced() {
 
 TEST(PlacedObject, BoxIsThatOfItsVerticesInTheWorld) {
     ObjectTable objects;
-    const DocumentObject& object = objects.addMesh(L"", unitTriangle(), nullptr, KM_nil_uuid,
-                                                   quarterTurnAt(4.5e6, 5.2e6, 100.0));
+    const DocumentObject& object =
+        objects.addMesh(L"", {unitTriangle(), nullptr, quarterTurnAt(4.5e6, 5.2e6, 100.0)});
     // A quarter turn carries (1, 0) to (0, 1) and (0, 1) to (-1, 0).
     EXPECT_EQ(object.boundingBox().m_min, KM_3dPoint(4.5e6 - 1.0, 5.2e6, 100.0));
     EXPECT_EQ(object.boundingBox().m_max, KM_3dPoint(4.5e6, 5.2e6 + 1.0, 100.0));
@@ -46,8 +46,7 @@ TEST(PlacedObject, BoxIsThatOfItsVerticesInTheWorld) {
 
 TEST(PlacedObject, ViewIsFittedToWhereItStands) {
     ObjectTable objects;
-    objects.addMesh(L"", unitTriangle(), nullptr, KM_nil_uuid,
-                    KM_Xform::Translation(4.5e6, 5.2e6, 100.0));
+    objects.addMesh(L"", {unitTriangle(), nullptr, KM_Xform::Translation(4.5e6, 5.2e6, 100.0)});
     KM_Viewport viewport;
     const Result<KM_Viewport> fitted = fitViewport(viewport, objects, ViewFit());
     ASSERT_TRUE(fitted.ok()) << fitted.message();
@@ -64,15 +63,15 @@ TEST(PlacedObject, ComesBackFromAFileWithItsPlaceAndStillShared) {
     ASSERT_TRUE(read.ok()) << read.message();
     ASSERT_EQ(read.value().objects.size(), 2U);
     const auto& objects = read.value().objects;
-    EXPECT_EQ(objects[0].mesh, objects[1].mesh);
-    EXPECT_EQ(objects[0].world_from_mesh, content.objects[0].world_from_mesh);
-    EXPECT_TRUE(objects[1].world_from_mesh.IsIdentity());
+    EXPECT_EQ(objects[0].placed.mesh, objects[1].placed.mesh);
+    EXPECT_EQ(objects[0].placed.world_from_mesh, content.objects[0].placed.world_from_mesh);
+    EXPECT_TRUE(objects[1].placed.world_from_mesh.IsIdentity());
 }
 
 TEST(PlacedObject, PlaceThatFlattensOrIsNoNumberIsNotWritten) {
     for (const double factor : {0.0, std::numeric_limits<double>::quiet_NaN()}) {
         DocumentContent content = twoPlaced();
-        content.objects[0].world_from_mesh = KM_Xform::Diagonal(1.0, 1.0, factor);
+        content.objects[0].placed.world_from_mesh = KM_Xform::Diagonal(1.0, 1.0, factor);
         EXPECT_FALSE(encodeDocument(content).ok()) << factor;
     }
 }

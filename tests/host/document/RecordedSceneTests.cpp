@@ -1,4 +1,5 @@
 #include "host/document/Document.h"
+#include "host/document/DocumentDrawing.h"
 #include "host/document/DocumentScene.h"
 #include "sdk/qncore/qncore.h"
 #include "tests/engine/display/DisplayFixture.h"
@@ -24,7 +25,7 @@ class RecordedScene : public HostTest, public testing::WithParamInterface<Captur
 protected:
     void SetUp() override {
         // Large enough for a scene of its own, and small ones that share one.
-        document().objects().addMesh(L"Hills", shared(hillMesh(100)), nullptr);
+        document().objects().addMesh(L"Hills", {shared(hillMesh(100))});
         for (int i = 0; i < 3; ++i)
             addBox(document(), {3.0 * i, 0.0, 0.0}, {3.0 * i + 2.0, 2.0, 4.0});
         ASSERT_EQ(run(L"ViewportSize 64 48"), CQuarnCommand::success);
@@ -36,7 +37,7 @@ protected:
 
     /// @return how often a part of the scene was prepared for rays so far
     std::size_t buildCount() {
-        const auto scene = document().upToDateScene();
+        const auto scene = document().drawing().scene();
         EXPECT_TRUE(scene.ok()) << scene.message();
         return scene.ok() ? scene.value()->display().rays().buildCount() : 0;
     }

@@ -70,14 +70,14 @@ void addObjects(std::vector<ObjectContent>& objects) {
     ObjectContent box;
     box.id = sampleId(1);
     box.name = L"Kiste";
-    box.mesh = coloredBox();
-    box.material = checkeredMaterial();
+    box.placed.mesh = coloredBox();
+    box.placed.material = checkeredMaterial();
     objects.push_back(box);
     ObjectContent same_box = box;
     same_box.id = sampleId(2);
     same_box.name = L"Kiste \u2211";
     same_box.visible = false;
-    same_box.material = nullptr;
+    same_box.placed.material = nullptr;
     objects.push_back(same_box);
     addCurves(objects);
     ObjectContent point;

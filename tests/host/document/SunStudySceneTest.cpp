@@ -26,8 +26,8 @@ void replaceLight(LightStore& lights, int& index, const KM_Light& light) {
 
 TEST(SunStudy, ThousandFramesBuildTheSceneOnce) {
     ObjectTable objects;
-    objects.addMesh(L"Hills", shared(hillMesh(80)), nullptr); // large: a scene of its own
-    objects.addMesh(L"Box", shared(boxMesh({0, 0, 0}, {3, 3, 9})), nullptr);
+    objects.addMesh(L"Hills", {shared(hillMesh(80))}); // large: a scene of its own
+    objects.addMesh(L"Box", {shared(boxMesh({0, 0, 0}, {3, 3, 9}))});
     LightStore lights;
     int index = LightStore::no_index;
     DocumentScene scene;
@@ -48,7 +48,7 @@ TEST(SunStudy, ThousandFramesBuildTheSceneOnce) {
 
 TEST(SunStudy, FramesOfAKeptSceneEqualThoseOfAFreshOne) {
     ObjectTable objects;
-    objects.addMesh(L"Box", shared(boxMesh({-1, -1, 0}, {1, 1, 4})), nullptr);
+    objects.addMesh(L"Box", {shared(boxMesh({-1, -1, 0}, {1, 1, 4}))});
     LightStore lights;
     int index = LightStore::no_index;
     DocumentScene kept;

@@ -21,7 +21,7 @@ struct Extent {
         for (const auto& object : document.objects().objects()) {
             if (!object->visible)
                 continue;
-            for (const KM_3fPoint& vertex : object->mesh->m_V)
+            for (const KM_3fPoint& vertex : object->placed.mesh->m_V)
                 add(viewport, vertex.ToDouble());
         }
     }

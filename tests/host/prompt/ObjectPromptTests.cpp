@@ -20,7 +20,7 @@ constexpr unsigned POINTS_AND_CURVES = 5;
 class ObjectPromptTest : public HostTest {
 protected:
     ObjectPromptTest() {
-        objects().addMesh(L"Roof", boxMesh({0, 0, 0}, {1, 1, 1}), nullptr);
+        objects().addMesh(L"Roof", {boxMesh({0, 0, 0}, {1, 1, 1})});
         const KM_3dPoint corners[] = {{0, 0, 0}, {5, 0, 0}};
         objects().addCurve(L"Walk", std::make_unique<KM_PolylineCurve>(corners));
         objects().addPoint(L"Mark", {1, 2, 3});

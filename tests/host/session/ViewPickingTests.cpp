@@ -25,7 +25,7 @@ protected:
     }
 
     DocumentObject& box(const wchar_t* name, const KM_3dPoint& low, const KM_3dPoint& high) {
-        return document.objects().addMesh(name, boxMesh(low, high), nullptr);
+        return document.objects().addMesh(name, {boxMesh(low, high)});
     }
 
     DocumentObject& line(const wchar_t* name, const KM_3dPoint& from, const KM_3dPoint& to) {
@@ -108,8 +108,8 @@ TEST_F(ViewPickingTest, ParallelViewsSeeWhatLiesBehindTheirCamera) {
 TEST_F(ViewPickingTest, MeshesAreHitWhereTheirTransformsPutThem) {
     const auto mesh = boxMesh({-1.0, -1.0, -1.0}, {1.0, 1.0, 1.0});
     for (const double x : {-4.0, 4.0})
-        document.objects().addMesh(x < 0 ? L"Left" : L"Right", mesh, nullptr, KM_nil_uuid,
-                                   KM_Xform::Translation({x, 0.0, 0.0}));
+        document.objects().addMesh(x < 0 ? L"Left" : L"Right",
+                                   {mesh, nullptr, KM_Xform::Translation({x, 0.0, 0.0})});
     EXPECT_EQ(nameAt(view, {-4.0, -1.0, 0.0}), L"Left");
     EXPECT_EQ(nameAt(view, {4.0, -1.0, 0.0}), L"Right");
     EXPECT_EQ(nameAt(view, {0.0, -1.0, 0.0}), L"nothing");
@@ -118,8 +118,8 @@ TEST_F(ViewPickingTest, MeshesAreHitWhereTheirTransformsPutThem) {
 
 TEST_F(ViewPickingTest, FarFromTheOriginPointsKeepTheirDigits) {
     const KM_3dPoint middle(1.0e7, -1.0e7, 50.0);
-    document.objects().addMesh(L"Far", boxMesh({-1.0, -1.0, -1.0}, {1.0, 1.0, 1.0}), nullptr,
-                               KM_nil_uuid, KM_Xform::Translation(middle - KM_3dPoint::Origin));
+    document.objects().addMesh(L"Far", {boxMesh({-1.0, -1.0, -1.0}, {1.0, 1.0, 1.0}), nullptr,
+                                        KM_Xform::Translation(middle - KM_3dPoint::Origin)});
     look(view, middle, {0.0, -20.0, 0.0});
     const KM_3dPoint on_face = middle + KM_3dVector(0.25, -1.0, 0.5);
     const auto picked = pick(view, on_face);

@@ -1,0 +1,101 @@
+#include "host/document/DocumentDrawing.h"
+
+#include "engine/render/Renderer.h"
+#include "host/document/Document.h"
+#include "host/document/DocumentScene.h"
+
+#include <new>
+#include <string>
+
+namespace quarn {
+
+DocumentDrawing::DocumentDrawing(const Document& document) : m_document(document) {}
+
+DocumentDrawing::~DocumentDrawing() = default;
+
+void DocumentDrawing::release() {
+    m_scene.reset();
+}
+
+std::vector<KM_Light> DocumentDrawing::shiningLights() const {
+    std::vector<KM_Light> lights;
+    addShiningLights(SceneChanges(), lights);
+    return lights;
+}
+
+/// A light of the changes comes last, the sun in whose place it stands first.
+void DocumentDrawing::addShiningLights(const SceneChanges& changes,
+                                       std::vector<KM_Light>& lights) const {
+    if (changes.sun) {
+        m_document.lights().addShiningLights(lights, changes.sun->replaced_light);
+        if (LightStore::canShine(changes.sun->light))
+            lights.push_back(changes.sun->light);
+        return;
+    }
+    if (const auto sun = m_document.sun().light())
+        lights.push_back(*sun);
+    m_document.lights().addShiningLights(lights);
+}
+
+Result<void> DocumentDrawing::update(const SceneChanges& changes) {
+    if (!m_scene)
+        m_scene = std::make_unique<DocumentScene>();
+    m_shining_lights.clear();
+    addShiningLights(changes, m_shining_lights);
+    return m_scene->update(m_document.objects(), m_shining_lights, changes.hidden);
+}
+
+/// Nothing that was half built is drawn the next time.
+Error DocumentDrawing::memoryLacks(const char* how, int width_px, int height_px) {
+    release();
+    return Error{"A picture of " + std::to_string(width_px) + " by " + std::to_string(height_px) +
+                 " pixels cannot be " + how +
+                 ": there is too little memory. Close other programs, or choose a smaller size."};
+}
+
+Result<void> DocumentDrawing::draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode,
+                                   int width_px, int height_px, Image& picture,
+                                   const SceneChanges& changes) {
+    try {
+        const auto updated = update(changes);
+        if (!updated)
+            return updated;
+        return m_scene->draw(viewport, withEdges(mode, m_document.edgesOf(mode.id)), width_px,
+                             height_px, picture);
+    } catch (const std::bad_alloc&) {
+        picture = Image();
+        return memoryLacks("drawn", width_px, height_px);
+    }
+}
+
+Result<RenderEnd> DocumentDrawing::render(const KM_Viewport& viewport, const RenderRequest& request,
+                                          const std::function<bool(double share)>& watch,
+                                          Image& picture, const SceneChanges& changes,
+                                          const std::function<void(const Image& so_far)>& shown) {
+    try {
+        const auto updated = update(changes);
+        if (!updated)
+            return updated.error();
+        return Renderer().render(m_scene->display(), viewport, request, watch, picture, shown);
+    } catch (const std::bad_alloc&) {
+        return memoryLacks("rendered", request.width_px, request.height_px);
+    }
+}
+
+Result<const DocumentScene*> DocumentDrawing::scene() {
+    try {
+        const auto updated = update(SceneChanges());
+        if (!updated)
+            return updated.error();
+        return m_scene.get();
+    } catch (const std::bad_alloc&) {
+        release();
+        return Error{"There is too little memory for the scene. Close other programs."};
+    }
+}
+
+Result<void> DocumentDrawing::regenerate() {
+    return m_scene ? update(SceneChanges()) : Result<void>();
+}
+
+} // namespace quarn

@@ -1,0 +1,63 @@
+#pragma once
+
+#include "ground/Result.h"
+#include "host/document/SceneChanges.h"
+
+#include <functional>
+#include <memory>
+#include <vector>
+
+class KM_Viewport;
+
+namespace quarn {
+
+class Document;
+class DocumentScene;
+struct DisplayModeAttributes;
+struct Image;
+struct RenderRequest;
+enum class RenderEnd;
+
+/// How a document is drawn. The scene is built once for each revision of the objects and shared by
+/// all views; nothing of the document changes.
+class DocumentDrawing {
+public:
+    /// @param document  must outlive the drawing
+    explicit DocumentDrawing(const Document& document);
+    ~DocumentDrawing();
+    DocumentDrawing(const DocumentDrawing&) = delete;
+    DocumentDrawing& operator=(const DocumentDrawing&) = delete;
+
+    /// Draws all that is visible, otherwise than it is where `changes` says so.
+    /// @return an error, with the picture unchanged, when the scene cannot be built or drawn; when
+    ///         memory lacks, the picture is empty
+    Result<void> draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode, int width_px,
+                      int height_px, Image& picture, const SceneChanges& changes = {});
+    /// Renders the same; as Renderer::render.
+    Result<RenderEnd> render(const KM_Viewport& viewport, const RenderRequest& request,
+                             const std::function<bool(double share)>& watch, Image& picture,
+                             const SceneChanges& changes,
+                             const std::function<void(const Image& so_far)>& shown = {});
+
+    /// The scene as it is drawn now, brought up to date. Valid until the next call.
+    /// @return an error when it cannot be built
+    Result<const DocumentScene*> scene();
+    /// Brings the scene up to date where it was built before.
+    Result<void> regenerate();
+    /// Frees the scene.
+    void release();
+
+    /// The lights that shine now: the sun, when it is on, and the lights of the table.
+    std::vector<KM_Light> shiningLights() const;
+
+private:
+    void addShiningLights(const SceneChanges& changes, std::vector<KM_Light>& lights) const;
+    Result<void> update(const SceneChanges& changes);
+    Error memoryLacks(const char* how, int width_px, int height_px);
+
+    const Document& m_document;
+    std::unique_ptr<DocumentScene> m_scene; ///< null until something is drawn
+    std::vector<KM_Light> m_shining_lights; ///< in the last picture; kept for its storage
+};
+
+} // namespace quarn

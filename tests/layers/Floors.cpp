@@ -1,0 +1,96 @@
+#include "tests/layers/Floors.h"
+
+namespace layers {
+namespace {
+
+using enum Room::Libraries;
+using Places = std::vector<std::string_view>;
+
+Places operator+(Places places, std::string_view more) {
+    places.push_back(more);
+    return places;
+}
+
+const Places INTERFACE = {"kelmar/", "sdk/"};
+const Places BELOW_IMPORT = {"kelmar/", "ground/", "engine/scene/"};
+const Places BELOW_DISPLAY = BELOW_IMPORT + "engine/images/";
+
+// The host: each of its rooms sees all that stand above it here.
+const Places BELOW_HOST = {"kelmar/",        "sdk/",           "ground/",
+                           "engine/scene/",  "engine/images/", "engine/display/",
+                           "engine/render/", "import/"};
+const Places BELOW_FRONT_END = BELOW_HOST + "host/border/";
+const Places BELOW_CITIES = BELOW_FRONT_END + "host/front_end/";
+const Places BELOW_SUN = BELOW_CITIES + "host/cities/";
+const Places BELOW_CURVES = BELOW_SUN + "host/sun/";
+const Places BELOW_DOCUMENT = BELOW_CURVES + "host/curves/";
+const Places BELOW_APP = BELOW_DOCUMENT + "host/document/";
+const Places BELOW_PROMPT = BELOW_APP + "host/app/";
+const Places BELOW_DIALOGS = BELOW_PROMPT + "host/prompt/";
+const Places BELOW_COMMANDS = BELOW_DIALOGS + "host/dialogs/";
+const Places BELOW_SESSION = BELOW_COMMANDS + "host/commands/";
+
+// What a program sees of the host: its door, what it implements itself, and the cities of the
+// world.
+const Places PROGRAM = {"sdk/", "host/session/", "host/front_end/", "host/cities/"};
+
+constexpr std::string_view UTILITIES = "zoetrix/plugin/ZoetrixUtilities.h";
+
+const Room FLOORS[] = {
+    {0, "kelmar/", {}, {}, standard},
+
+    {1, "sdk/cocoa/", INTERFACE, {}, standard_and_cocoa},
+    {1, "sdk/", {"kelmar/"}, {}, standard},
+    {1, "ground/", {"kelmar/"}},
+
+    {2, "engine/scene/", {"kelmar/", "ground/"}},
+    {2, "engine/images/", BELOW_IMPORT},
+    {2, "engine/display/", BELOW_DISPLAY},
+    {2, "engine/render/", BELOW_DISPLAY + "engine/display/"},
+
+    {3, "import/", BELOW_IMPORT},
+
+    {4, "host/border/", BELOW_HOST},
+    {4, "host/front_end/", BELOW_FRONT_END},
+    {4, "host/cities/", BELOW_CITIES},
+    {4, "host/sun/", BELOW_SUN},
+    {4, "host/curves/", BELOW_CURVES},
+    {5, "host/document/", BELOW_DOCUMENT},
+    {6, "host/app/", BELOW_APP},
+    {7, "host/prompt/", BELOW_PROMPT},
+    {8, "host/dialogs/", BELOW_DIALOGS},
+    {9, "host/commands/", BELOW_COMMANDS},
+    {10, "host/session/", BELOW_SESSION},
+    {10, "host/cocoa/", INTERFACE + "ground/Result.h" + "host/front_end/", {}, any_and_cocoa},
+
+    {11, "zoetrix/sun/VyrSun", {}, {}, standard},
+    {11, "zoetrix/sun/", INTERFACE, {UTILITIES}, standard},
+    {11,
+     "zoetrix/ui/QXTurnTableDialogController",
+     INTERFACE,
+     {"zoetrix/ui/"},
+     standard_and_cocoa,
+     false},
+    {11, "zoetrix/ui/", INTERFACE, {UTILITIES}, standard},
+    {11, "zoetrix/plugin/", INTERFACE, {"zoetrix/paths/"}, standard},
+    {11, "zoetrix/paths/", INTERFACE, {"zoetrix/plugin/"}, standard},
+    {11,
+     "zoetrix/commands/",
+     INTERFACE + "zoetrix/plugin/" + "zoetrix/paths/" + "zoetrix/sun/" + "zoetrix/ui/",
+     {},
+     standard},
+    {11, "zoetrix/", INTERFACE, {}, standard},
+
+    {11, "vexui/", INTERFACE},
+    {11, "quarn/", PROGRAM},
+    {11, "desktop/", PROGRAM},
+    {11, "examples/", INTERFACE},
+};
+
+} // namespace
+
+std::span<const Room> floors() {
+    return FLOORS;
+}
+
+} // namespace layers

@@ -1,0 +1,4 @@
+#pragma once
+#include "engine/scene/PlacedMesh.h"
+#include "engine/display/Scene.h"
+#include "sdk/qncore/QnDoc.h"
