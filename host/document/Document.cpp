@@ -225,22 +225,19 @@ void Document::fitTolerance() {
 }
 
 std::vector<KM_Light> Document::shiningLights() const {
-    std::vector<KM_Light> lights;
-    addShiningLights(SceneChanges(), lights);
+    std::vector<KM_Light> lights = m_lights.shiningLights();
+    if (const auto sun = m_sun.light())
+        lights.insert(lights.begin(), *sun);
     return lights;
 }
 
-/// A light of the changes comes last, the sun in whose place it stands first.
-void Document::addShiningLights(const SceneChanges& changes, std::vector<KM_Light>& lights) const {
-    if (changes.sun) {
-        m_lights.addShiningLights(lights, changes.sun->replaced_light);
-        if (LightStore::canShine(changes.sun->light))
-            lights.push_back(changes.sun->light);
-        return;
-    }
-    if (const auto sun = m_sun.light())
-        lights.push_back(*sun);
-    m_lights.addShiningLights(lights);
+std::vector<KM_Light> Document::shiningLights(const SceneChanges& changes) const {
+    if (!changes.sun)
+        return shiningLights();
+    std::vector<KM_Light> lights = m_lights.shiningLights(changes.sun->replaced_light);
+    if (LightStore::canShine(changes.sun->light))
+        lights.push_back(changes.sun->light);
+    return lights;
 }
 
 Result<void> Document::draw(const KM_Viewport& viewport, const DisplayModeAttributes& mode,
@@ -263,9 +260,7 @@ void Document::setEdgesOf(const KM_UUID& display_mode, MeshEdgeChoice choice) {
 Result<void> Document::updateScene(const SceneChanges& changes) {
     if (!m_scene)
         m_scene = std::make_unique<DocumentScene>();
-    m_shining_lights.clear();
-    addShiningLights(changes, m_shining_lights);
-    return m_scene->update(m_objects, m_shining_lights, changes.hidden);
+    return m_scene->update(m_objects, shiningLights(changes), changes.hidden);
 }
 
 /// Nothing that was half built is drawn the next time.

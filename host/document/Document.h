@@ -180,7 +180,7 @@ private:
     void addCameras(const DocumentContent& content);
     std::vector<std::string> replaceViews(const DocumentContent& content);
     void fitTolerance();
-    void addShiningLights(const SceneChanges& changes, std::vector<KM_Light>& lights) const;
+    std::vector<KM_Light> shiningLights(const SceneChanges& changes) const;
     void closeNow(ViewState& view);
     void closeDueViews();
     void resizeDueFrames();
@@ -211,7 +211,6 @@ private:
     std::vector<std::unique_ptr<ViewState>> m_closed_views;
     bool m_is_open = true;
     std::unique_ptr<DocumentScene> m_scene; ///< null until something is drawn
-    std::vector<KM_Light> m_shining_lights; ///< in the last picture; kept for its storage
     RenderWindow m_render_window;
     CQuarnDocProperties m_properties;
     CQuarnDoc m_face;
