@@ -15,8 +15,9 @@ struct SunSite {
 };
 
 /// Computes the apparent topocentric position of the sun without refraction: light time,
-/// aberration, precession, nutation and parallax are in it. Good to 0.005 degrees from 1800 to
-/// 2199.
+/// aberration, precession, nutation and parallax are in it. The delay of the earth's rotation is
+/// that of the 2020s in all years: by that the sun stands at most 0.005 degrees elsewhere from 1800
+/// to 2199.
 ///
 /// @param ut_day       Julian day number of the midnight that `ut_fraction` counts from, UT1
 /// @param ut_fraction  days since then; may lie outside 0 to 1

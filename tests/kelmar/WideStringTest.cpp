@@ -81,8 +81,8 @@ TEST(WideString, EveryLetterIsItsCapitalAndItsSmallLetterWhenCaseIsIgnored) {
         lower.MakeLower();
         upper.MakeUpper();
         pairs += upper == lower ? 0 : 1;
-        ASSERT_EQ(letter.CompareNoCase(lower.Array()), 0) << "character " << std::hex << code;
-        ASSERT_EQ(letter.CompareNoCase(upper.Array()), 0) << "character " << std::hex << code;
+        ASSERT_EQ(letter.CompareNoCase(lower.Array()), 0) << "character " << static_cast<int>(code);
+        ASSERT_EQ(letter.CompareNoCase(upper.Array()), 0) << "character " << static_cast<int>(code);
     }
     EXPECT_GT(pairs, 2000);
 }
