@@ -42,16 +42,15 @@ void measure(const quarn::Image& image, const char* extension, const fs::path& f
     const fs::path file = folder / (std::string("frame.") + extension);
     const fs::path plain = folder / "frame.pixels";
     const auto format = *quarn::imageFormatFor(extension);
-    quarn::ImageEncoder encoder;
     double encode_ms = 1e9;
     double write_ms = 1e9;
     double copy_ms = 1e9;
     bench::repeatFor(budget_ms, [&] {
         bench::keepBest(encode_ms, [&] {
-            if (const auto encoded = encoder.encode(image, format); !encoded)
+            if (const auto encoded = quarn::encodeImage(image, format); !encoded)
                 bench::fail(encoded.message());
         });
-        bench::keepBest(write_ms, [&] { bench::require(encoder.write(file.c_str(), image)); });
+        bench::keepBest(write_ms, [&] { bench::require(quarn::writeImageFile(file, image)); });
         bench::keepBest(copy_ms, [&] {
             bench::require(quarn::writeFileAtomically(plain, std::as_bytes(std::span(image.rgba))));
         });

@@ -1,12 +1,9 @@
 #include "ground/AtomicFile.h"
 
 #include <cerrno>
-#include <climits>
-#include <cstdio>
 #include <cstring>
 #include <fcntl.h>
 #include <string>
-#include <string_view>
 #include <sys/stat.h>
 #include <unistd.h>
 #include <utility>
@@ -14,8 +11,10 @@
 namespace quarn {
 namespace {
 
-Error cannotWrite(const char* path, const std::string& why) {
-    return {"Cannot write '" + std::string(path) + "': " + why + "."};
+namespace fs = std::filesystem;
+
+Error cannotWrite(const fs::path& path, const std::string& why) {
+    return {"Cannot write '" + path.string() + "': " + why + "."};
 }
 
 std::string adviceFor(int code) {
@@ -40,22 +39,15 @@ std::string adviceFor(int code) {
     }
 }
 
-/// The folder of a path, with the separator behind it; empty for the current one.
-std::string_view folderOf(std::string_view path) {
-    return path.substr(0, path.rfind('/') + 1);
-}
-
 /// A file under a temporary name, which goes away unless it is renamed.
 class PartFile {
 public:
-    explicit PartFile(std::string_view folder) {
+    explicit PartFile(const fs::path& folder) {
         constexpr int most_tries = 100; // of names that a killed program may have left
         for (int i = 0; i < most_tries && m_descriptor < 0; ++i) {
-            if (!setPath(folder, i)) {
-                errno = ENAMETOOLONG;
-                break;
-            }
-            m_descriptor = open(m_path, O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
+            m_path =
+                folder / (".quarn-" + std::to_string(getpid()) + "-" + std::to_string(i) + ".part");
+            m_descriptor = open(m_path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
             if (m_descriptor < 0 && errno != EEXIST) {
                 break;
             }
@@ -69,7 +61,7 @@ public:
     ~PartFile() {
         close();
         if (m_exists) {
-            unlink(m_path);
+            unlink(m_path.c_str());
         }
     }
 
@@ -103,28 +95,19 @@ public:
         return descriptor < 0 || ::close(descriptor) == 0;
     }
 
-    bool renameTo(const char* path) {
-        m_exists = rename(m_path, path) != 0;
+    bool renameTo(const fs::path& path) {
+        m_exists = rename(m_path.c_str(), path.c_str()) != 0;
         return !m_exists;
     }
 
 private:
-    /// @return false when no path can be that long
-    bool setPath(std::string_view folder, int number) {
-        const int length =
-            std::snprintf(m_path, sizeof m_path, "%.*s.quarn-%d-%d.part",
-                          static_cast<int>(folder.size()), folder.data(), getpid(), number);
-        return length > 0 && static_cast<std::size_t>(length) < sizeof m_path;
-    }
-
-    char m_path[PATH_MAX];
+    fs::path m_path;
     int m_descriptor = -1;
     bool m_exists = false;
 };
 
-bool flushFolder(std::string_view folder) {
-    const std::string path(folder.empty() ? "." : folder);
-    const int descriptor = open(path.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+bool flushFolder(const fs::path& folder) {
+    const int descriptor = open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
     if (descriptor < 0) {
         return false;
     }
@@ -135,16 +118,16 @@ bool flushFolder(std::string_view folder) {
 
 } // namespace
 
-Result<void> writeFileAtomically(const char* path, std::span<const std::byte> bytes,
+Result<void> writeFileAtomically(const fs::path& path, std::span<const std::byte> bytes,
                                  FileSync sync) {
-    const auto failure = [path] { return cannotWrite(path, adviceFor(errno)); };
+    const auto failure = [&path] { return cannotWrite(path, adviceFor(errno)); };
     struct stat present {};
-    const bool replaces = stat(path, &present) == 0;
+    const bool replaces = stat(path.c_str(), &present) == 0;
     if (replaces && !S_ISREG(present.st_mode)) {
         return cannotWrite(path, S_ISDIR(present.st_mode) ? "there is a folder of this name"
                                                           : "it is not an ordinary file");
     }
-    const std::string_view folder = folderOf(path);
+    const fs::path folder = path.has_parent_path() ? path.parent_path() : fs::path(".");
     PartFile part(folder);
     if (!part.isOpen()) {
         return failure();

@@ -13,19 +13,13 @@ enum class FileSync { no, yes };
 
 /// Writes a file so that it appears whole or not at all: the bytes go to a temporary name in the
 /// same folder, which is then renamed. A file that was there before is replaced and keeps its
-/// permissions; after a failure it is untouched, and no temporary file stays. Asks the heap for
-/// nothing, unless it fails.
+/// permissions; after a failure it is untouched, and no temporary file stays.
 ///
 /// @param path   its folder must exist; must not name anything but an ordinary file
 /// @param sync   yes also flushes the file and its folder to the disk
 /// @return an error that names the file and why it could not be written: the folder is missing, no
 ///   permission, the disk is full, ...
-Result<void> writeFileAtomically(const char* path, std::span<const std::byte> bytes,
-                                 FileSync sync = FileSync::no);
-inline Result<void> writeFileAtomically(const std::filesystem::path& path,
-                                        std::span<const std::byte> bytes,
-                                        FileSync sync = FileSync::no) {
-    return writeFileAtomically(path.c_str(), bytes, sync);
-}
+Result<void> writeFileAtomically(const std::filesystem::path& path,
+                                 std::span<const std::byte> bytes, FileSync sync = FileSync::no);
 
 } // namespace quarn

@@ -1,9 +1,9 @@
 #pragma once
 
+#include "engine/scene/SrgbCurve.h"
 #include "kelmar/KM_Color.h"
 
 #include <algorithm>
-#include <cmath>
 #include <cstdint>
 
 namespace quarn {
@@ -11,11 +11,6 @@ namespace quarn {
 /// 0 to 1 as a byte; what lies outside is moved to the limit, and what is no number counts as 0.
 inline std::uint8_t byteFromUnit(float value) {
     return value > 0.0F ? static_cast<std::uint8_t>(std::min(value, 1.0F) * 255.0F + 0.5F) : 0;
-}
-
-/// Linear light as an sRGB value, both from 0 to 1 (IEC 61966-2-1, transfer function).
-inline float srgbFromLinear(float linear) {
-    return linear <= 0.0031308F ? 12.92F * linear : 1.055F * std::pow(linear, 1.0F / 2.4F) - 0.055F;
 }
 
 /// A colour whose channels from 0 to 1 are sRGB already.

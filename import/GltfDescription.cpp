@@ -1,6 +1,7 @@
 #include "import/GltfDescription.h"
 
 #include "import/ModelFileCheck.h"
+#include "kelmar/KM_LittleEndian.h"
 
 #include <nlohmann/json.hpp>
 
@@ -8,114 +9,34 @@
 #include <array>
 #include <cstring>
 #include <fstream>
-#include <limits>
-#include <string_view>
 
 namespace quarn {
 namespace {
 
 using nlohmann::json;
 
-/// Copies JSON; texts that are longer than any name become empty ones. Takes it piece by piece.
-class WithoutLongTexts {
-public:
-    void append(std::string_view piece) {
-        while (!piece.empty()) {
-            piece.remove_prefix(m_is_inside ? appendText(piece) : appendRest(piece));
-        }
-    }
-
-    const std::string& json() const { return m_json; }
-
-private:
-    /// Up to and with the quotation mark that begins the next text.
-    std::size_t appendRest(std::string_view piece) {
-        const std::size_t quote = piece.find('"');
-        m_is_inside = quote != std::string_view::npos;
-        const std::size_t count = m_is_inside ? quote + 1 : piece.size();
-        m_json.append(piece.substr(0, count));
-        m_begin = m_json.size();
-        return count;
-    }
-
-    /// Up to and with the quotation mark that ends the text.
-    std::size_t appendText(std::string_view piece) {
-        if (m_is_escaped) {
-            m_is_escaped = false;
-            keep(piece.substr(0, 1));
-            return 1;
-        }
-        const std::size_t quote = piece.find('"');
-        const std::size_t end = std::min(quote, piece.substr(0, quote).find('\\'));
-        if (end == std::string_view::npos) {
-            keep(piece);
-            return piece.size();
-        }
-        m_is_escaped = piece[end] == '\\';
-        m_is_inside = m_is_escaped;
-        keep(piece.substr(0, end + (m_is_escaped ? 1 : 0)));
-        if (!m_is_inside) {
-            endText();
-        }
-        return end + 1;
-    }
-
-    void keep(std::string_view piece) {
-        constexpr std::size_t longest = 4096;
-        m_is_long = m_is_long || m_json.size() - m_begin + piece.size() > longest;
-        if (!m_is_long) {
-            m_json.append(piece);
-        }
-    }
-
-    void endText() {
-        if (m_is_long) {
-            m_json.resize(m_begin);
-        }
-        m_is_long = false;
-        m_json += '"';
-    }
-
-    std::string m_json;
-    std::size_t m_begin = 0;  ///< of the text
-    bool m_is_inside = false; ///< of a text
-    bool m_is_escaped = false;
-    bool m_is_long = false;
-};
-
-std::uint32_t littleEndian(const char* bytes) {
-    std::uint32_t value = 0;
-    for (int i = 3; i >= 0; --i) {
-        value = value << 8 | static_cast<unsigned char>(bytes[i]);
-    }
-    return value;
+/// Leaves out the bytes and pictures that may stand in the text.
+bool isWanted(int depth, json::parse_event_t event, json& key) {
+    const bool is_member = depth == 1 && event == json::parse_event_t::key;
+    return !is_member || (key != "buffers" && key != "images");
 }
 
-/// How many bytes of JSON begin at the file's place now; a GLB states it in its header.
-std::uint64_t textLength(std::istream& file, bool is_binary) {
-    if (!is_binary) {
-        return std::numeric_limits<std::uint64_t>::max();
-    }
-    std::array<char, 20> head{};
-    file.read(head.data(), head.size());
+/// The text part of a GLB, whose header states its length; empty for another version.
+std::string textOfGlb(std::istream& file) {
+    std::array<std::uint8_t, 20> head{};
+    file.read(reinterpret_cast<char*>(head.data()), head.size());
     const bool is_known = file.gcount() == static_cast<std::streamsize>(head.size()) &&
-                          littleEndian(&head[4]) == 2 && std::memcmp(&head[16], "JSON", 4) == 0;
-    return is_known ? littleEndian(&head[12]) : 0;
+                          kelmar::fromLittleEndian<std::uint32_t>(&head[4]) == 2 &&
+                          std::memcmp(&head[16], "JSON", 4) == 0;
+    std::string text(is_known ? kelmar::fromLittleEndian<std::uint32_t>(&head[12]) : 0, ' ');
+    file.read(text.data(), static_cast<std::streamsize>(text.size()));
+    return text;
 }
 
 json readJson(const std::filesystem::path& path) {
     std::ifstream file(path, std::ios::binary);
-    std::uint64_t left = textLength(file, modelFormat(path) == "glb");
-    std::vector<char> piece(std::size_t{1} << 18);
-    WithoutLongTexts text;
-    while (left > 0 && file) {
-        const std::uint64_t wanted = std::min<std::uint64_t>(left, piece.size());
-        file.read(piece.data(), static_cast<std::streamsize>(wanted));
-        const auto count = static_cast<std::size_t>(file.gcount());
-        text.append({piece.data(), count});
-        left -= count;
-    }
-    return json::parse(text.json(), nullptr, false);
+    return modelFormat(path) == "glb" ? json::parse(textOfGlb(file), isWanted, false)
+                                      : json::parse(file, isWanted, false);
 }
 
 /// The member of an object, or null for anything else.

@@ -1,6 +1,7 @@
 #include "import/ModelFileCheck.h"
 
 #include "import/PlyLength.h"
+#include "kelmar/KM_LittleEndian.h"
 
 #include <array>
 #include <cerrno>
@@ -18,12 +19,9 @@ constexpr std::uintmax_t largest_model_bytes = 4ULL << 30;
 constexpr std::string_view choose_model = "Choose a model file (OBJ, glTF, GLB, PLY, STL, ...).";
 constexpr std::string_view export_again = "Export the model again or restore the file.";
 
-std::uint32_t littleEndian(const char* bytes) {
-    std::uint32_t value = 0;
-    for (int i = 3; i >= 0; --i) {
-        value = value << 8 | static_cast<unsigned char>(bytes[i]);
-    }
-    return value;
+/// The number of four bytes, lowest first.
+std::uint32_t numberAt(const char* bytes) {
+    return kelmar::fromLittleEndian<std::uint32_t>(reinterpret_cast<const std::uint8_t*>(bytes));
 }
 
 /// Why the bytes of a file cannot be what its extension says; empty when nothing speaks against it.
@@ -38,7 +36,7 @@ std::string whyBadStl(std::istream& file, std::uint64_t size) {
     if (size < head.size()) {
         return "the file is cut short";
     }
-    const std::uint64_t count = littleEndian(&head[80]);
+    const std::uint64_t count = numberAt(&head[80]);
     const std::uint64_t needed = head.size() + 50 * count;
     return needed <= size ? std::string()
                           : "it claims " + std::to_string(count) + " triangles but holds only " +
@@ -54,11 +52,11 @@ std::string whyBadGlb(std::istream& file, std::uint64_t size) {
     if (file.gcount() < static_cast<std::streamsize>(head.size())) {
         return "the file is cut short";
     }
-    if (littleEndian(&head[4]) != 2) {
+    if (numberAt(&head[4]) != 2) {
         return {}; // an older layout
     }
-    const std::uint64_t whole_length = littleEndian(&head[8]);
-    const std::uint64_t text_length = littleEndian(&head[12]);
+    const std::uint64_t whole_length = numberAt(&head[8]);
+    const std::uint64_t text_length = numberAt(&head[12]);
     return whole_length <= size && head.size() + text_length <= whole_length
                ? std::string()
                : "the lengths in its header do not fit the file's length";

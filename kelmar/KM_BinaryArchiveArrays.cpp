@@ -16,63 +16,29 @@ namespace {
 constexpr std::uint64_t count_size = sizeof(std::uint64_t);
 constexpr std::uint64_t max_count = std::numeric_limits<int>::max();
 
-// The numbers that an element consists of. Numbers stand for themselves.
-template <class T> struct ScalarOf { using type = T; };
-template <> struct ScalarOf<KM_3dPoint> { using type = double; };
-template <> struct ScalarOf<KM_3fPoint> { using type = float; };
-template <> struct ScalarOf<KM_3fVector> { using type = float; };
-template <> struct ScalarOf<KM_2fPoint> { using type = float; };
-template <> struct ScalarOf<KM_Color> { using type = std::uint8_t; };
-template <> struct ScalarOf<KM_MeshTriangle> { using type = std::uint32_t; };
-
-// Elements lie in memory as they lie in the archive, but for the order of bytes in a number.
+// Elements lie in memory as they lie in the archive: numbers without gaps, lowest byte first.
 template <class T>
-constexpr bool
-    is_plain_run_of_scalars = std::is_trivially_copyable_v<T>&& std::is_standard_layout_v<T> &&
-                              sizeof(T) % sizeof(typename ScalarOf<T>::type) == 0 &&
-                              alignof(T) == alignof(typename ScalarOf<T>::type);
+constexpr bool is_plain = std::is_trivially_copyable_v<T>&& std::is_standard_layout_v<T>;
 
+static_assert(std::endian::native == std::endian::little);
 static_assert(sizeof(KM_3dPoint) == 24 && sizeof(KM_3fPoint) == 12 && sizeof(KM_3fVector) == 12);
 static_assert(sizeof(KM_2fPoint) == 8 && sizeof(KM_Color) == 4 && sizeof(KM_MeshTriangle) == 12);
-
-// The order of bytes in a number does not matter where it is the archive's own.
-constexpr bool is_little_endian = std::endian::native == std::endian::little;
 
 } // namespace
 
 template <class T> bool KM_BinaryArchive::WriteRun(std::span<const T> elements) {
-    static_assert(is_plain_run_of_scalars<T>);
-    const std::span bytes(reinterpret_cast<const std::uint8_t*>(elements.data()),
-                          elements.size_bytes());
-    if constexpr (is_little_endian)
-        return WriteBytes(bytes);
-    using Bits = kelmar::BitsOf<typename ScalarOf<T>::type>;
-    for (std::size_t at = 0; at < bytes.size(); at += sizeof(Bits)) {
-        Bits bits = 0;
-        std::memcpy(&bits, bytes.data() + at, sizeof(Bits));
-        if (!WriteBytes(kelmar::toLittleEndian(bits)))
-            return false;
-    }
-    return !HasFailed();
+    static_assert(is_plain<T>);
+    return WriteBytes(
+        {reinterpret_cast<const std::uint8_t*>(elements.data()), elements.size_bytes()});
 }
 
 template <class T> bool KM_BinaryArchive::ReadRun(std::span<T> elements) {
-    static_assert(is_plain_run_of_scalars<T>);
+    static_assert(is_plain<T>);
     std::span<const std::uint8_t> source;
     if (!ViewBytes(elements.size_bytes(), source))
         return false;
-    if (source.empty())
-        return true;
-    auto* const bytes = reinterpret_cast<std::uint8_t*>(elements.data());
-    if constexpr (is_little_endian) {
-        std::memcpy(bytes, source.data(), source.size());
-        return true;
-    }
-    using Bits = kelmar::BitsOf<typename ScalarOf<T>::type>;
-    for (std::size_t at = 0; at < source.size(); at += sizeof(Bits)) {
-        const Bits bits = kelmar::fromLittleEndian<Bits>(source.data() + at);
-        std::memcpy(bytes + at, &bits, sizeof(Bits));
-    }
+    if (!source.empty())
+        std::memcpy(elements.data(), source.data(), source.size());
     return true;
 }
 

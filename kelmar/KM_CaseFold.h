@@ -2,12 +2,12 @@
 
 namespace kelmar {
 
-/// One character to one, by tables of our own: the C library's case changes follow the locale.
+/// One character to one, as Unicode has it, whatever the locale of the program is.
 wchar_t toLower(wchar_t character);
 wchar_t toUpper(wchar_t character);
 
-/// The character that stands for all its case forms: lower case, and one form for the Greek final
-/// sigma, the micro sign and the long s, which have capitals in common with other letters.
+/// The character that stands for all its case forms: the small letter of its capital, which letters
+/// such as the Greek sigmas have in common.
 wchar_t foldCase(wchar_t character);
 
 /// White space of Unicode (property White_Space).

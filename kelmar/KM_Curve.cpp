@@ -145,10 +145,6 @@ KM_3dPoint KM_Curve::PointAtEnd() const {
     return PointAt(Domain().Max());
 }
 
-void KM_Curve::PointsAt(std::span<const double> parameters, KM_3dPoint* points) const {
-    std::ranges::transform(parameters, points, [this](double t) { return PointAt(t); });
-}
-
 bool KM_Curve::IsClosed() const {
     const KM_3dPoint start = PointAtStart();
     const KM_3dPoint end = PointAtEnd();

@@ -6,7 +6,6 @@
 #include "kelmar/KM_Interval.h"
 #include "kelmar/KM_Point.h"
 
-#include <span>
 #include <vector>
 
 class KM_Xform;
@@ -44,10 +43,6 @@ public:
 
     /// The point at the parameter; KM_3dPoint::UnsetPoint where the curve cannot be evaluated.
     virtual KM_3dPoint PointAt(double t) const = 0;
-    /// The points at many parameters, each the one that PointAt gives. Parameters that ascend cost
-    /// a NURBS curve less than so many calls of PointAt.
-    /// @param points  receives as many points as there are parameters
-    virtual void PointsAt(std::span<const double> parameters, KM_3dPoint* points) const;
     /// The derivative by the parameter, in model units per unit of parameter. At a kink it is that
     /// of the piece that begins there. KM_3dVector::UnsetVector where the curve cannot be
     /// evaluated.

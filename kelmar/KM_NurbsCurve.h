@@ -15,7 +15,7 @@
 /// Points are evaluated by the algorithm of C. de Boor, "On calculating with B-splines", Journal of
 /// Approximation Theory 6 (1972), in homogeneous coordinates; derivatives by equation 4.8 of
 /// L. Piegl and W. Tiller, The NURBS Book (2nd edition). At a knot of full multiplicity the point
-/// is the control point exactly. Evaluation asks for no memory up to degree 15.
+/// is the control point exactly.
 class KELMAR_API KM_NurbsCurve : public KM_Curve {
 public:
     /// A curve without control points: not valid until Create.
@@ -93,7 +93,6 @@ public:
     bool SetDomain(double t0, double t1) override;
     std::vector<double> SpanParameters() const override;
     KM_3dPoint PointAt(double t) const override;
-    void PointsAt(std::span<const double> parameters, KM_3dPoint* points) const override;
     KM_3dVector DerivativeAt(double t) const override;
     bool Reverse() override;
     /// A matrix with perspective changes the weights too, so the result is exact.
@@ -101,7 +100,7 @@ public:
     KM_BoundingBox BoundingBox() const override;
 
 private:
-    class Span;
+    class Triangle;
 
     int SpanAt(double t) const;
 

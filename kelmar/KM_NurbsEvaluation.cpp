@@ -7,12 +7,8 @@
 #include "kelmar/KM_NurbsCurve.h"
 
 #include <algorithm>
-#include <array>
-#include <cmath>
 
 namespace {
-
-constexpr int stack_order = 16;
 
 // A control point times its weight, and the weight. Places are relative to the span's first
 // control point: a curve far from the origin keeps its digits, a plane one its plane.
@@ -34,21 +30,6 @@ Homogeneous slope(const Homogeneous& a, const Homogeneous& b, double factor) {
     return {factor * (b.x - a.x), factor * (b.y - a.y), factor * (b.z - a.z), factor * (b.w - a.w)};
 }
 
-// Room for the control points of a span: on the stack, but for degrees that hardly anyone uses.
-class SpanPoints {
-public:
-    explicit SpanPoints(int order) {
-        if (order > stack_order)
-            m_many.resize(static_cast<std::size_t>(order));
-    }
-    Homogeneous* data() { return m_many.empty() ? m_few.data() : m_many.data(); }
-    const Homogeneous* data() const { return m_many.empty() ? m_few.data() : m_many.data(); }
-
-private:
-    std::array<Homogeneous, stack_order> m_few;
-    std::vector<Homogeneous> m_many;
-};
-
 // The knots that matter for a span must ascend, and the span must have a length.
 bool spanIsSound(const double* u, int degree) {
     for (int i = 1; i < 2 * degree; ++i) {
@@ -58,83 +39,38 @@ bool spanIsSound(const double* u, int degree) {
     return KM_IsValid(u[0]) && KM_IsValid(u[2 * degree - 1]) && u[degree - 1] < u[degree];
 }
 
-// The triangle without its last level: leaves the two points of which the curve's point is one
-// between in d[degree - 1] and d[degree].
-inline void runTriangle(Homogeneous* d, const double* u, int degree, double t) {
-    for (int r = 1; r < degree; ++r) {
-        for (int j = degree; j >= r; --j)
-            d[j] = between(d[j - 1], d[j], (t - u[j - 1]) / (u[j + degree - r] - u[j - 1]));
-    }
-}
-
-// Where the parameter lies between the ends of the span, from 0 to 1.
-double placeInSpan(const double* u, int degree, double t) {
-    return (t - u[degree - 1]) / (u[degree] - u[degree - 1]);
-}
-
-// The sum of the triangle, without the division by its weight. The degree of nearly all curves is a
-// constant here, which takes the loops apart.
-Homogeneous sumOfTriangle(const SpanPoints& control_points, SpanPoints& work, const double* u,
-                          int degree, double t) {
-    if (degree == 3) {
-        std::array<Homogeneous, 4> d;
-        std::copy_n(control_points.data(), d.size(), d.data());
-        runTriangle(d.data(), u, 3, t);
-        return between(d[2], d[3], placeInSpan(u, 3, t));
-    }
-    Homogeneous* d = work.data();
-    std::copy_n(control_points.data(), degree + 1, d);
-    runTriangle(d, u, degree, t);
-    return between(d[degree - 1], d[degree], placeInSpan(u, degree, t));
-}
-
 } // namespace
 
-// A stretch between two knots, with what its points are computed from.
-class KM_NurbsCurve::Span {
+// The triangle at a parameter but for its last level: the curve's point is one between two others.
+class KM_NurbsCurve::Triangle {
 public:
-    Span(const KM_NurbsCurve& curve, double t)
-        : m_degree(curve.Degree()), m_rational(curve.m_rational), m_control_points(curve.m_order),
-          m_work(curve.m_order) {
+    Triangle(const KM_NurbsCurve& curve, double t) : m_degree(curve.Degree()), m_t(t) {
         const int first = curve.SpanAt(t) - (m_degree - 1);
         m_knots = curve.m_knots.data() + first;
         m_points = curve.m_points.data() + first;
         m_is_sound = spanIsSound(m_knots, m_degree);
-        const double* weights = curve.m_weights.data() + first;
-        for (int j = 0; j <= m_degree; ++j) {
-            const KM_3dVector v = weights[j] * (m_points[j] - m_points[0]);
-            m_control_points.data()[j] = {v.x, v.y, v.z, weights[j]};
-        }
+        if (m_is_sound)
+            Run(curve.m_weights.data() + first);
     }
 
-    bool Holds(double t) const { return t >= m_knots[m_degree - 1] && t < m_knots[m_degree]; }
-
-    KM_3dPoint PointAt(double t) {
+    KM_3dPoint Point() const {
         if (!m_is_sound)
             return KM_3dPoint::UnsetPoint;
         // Where a whole set of knots meets, the curve passes through a control point, without
         // rounding. At the span's start the sum below already gives it.
-        if (t == m_knots[m_degree] && m_knots[2 * m_degree - 1] == t)
+        if (m_t == m_knots[m_degree] && m_knots[2 * m_degree - 1] == m_t)
             return OrUnset(m_points[m_degree]);
-        const Homogeneous sum = sumOfTriangle(m_control_points, m_work, m_knots, m_degree, t);
-        if (!m_rational)
-            return OrUnset(m_points[0] + KM_3dVector(sum.x, sum.y, sum.z));
+        const Homogeneous sum = Sum();
         if (sum.w == 0.0)
             return KM_3dPoint::UnsetPoint;
         return OrUnset(m_points[0] + KM_3dVector(sum.x / sum.w, sum.y / sum.w, sum.z / sum.w));
     }
 
-    KM_3dVector DerivativeAt(double t) {
+    KM_3dVector Derivative() const {
         if (!m_is_sound)
             return KM_3dVector::UnsetVector;
-        Homogeneous* d = m_work.data();
-        std::copy_n(m_control_points.data(), m_degree + 1, d);
-        runTriangle(d, m_knots, m_degree, t);
-        const Homogeneous& from = d[m_degree - 1];
-        const Homogeneous& to = d[m_degree];
-        const double length = m_knots[m_degree] - m_knots[m_degree - 1];
-        const Homogeneous change = slope(from, to, m_degree / length);
-        const Homogeneous sum = between(from, to, placeInSpan(m_knots, m_degree, t));
+        const Homogeneous change = slope(m_from, m_to, m_degree / SpanLength());
+        const Homogeneous sum = Sum();
         if (sum.w == 0.0)
             return KM_3dVector::UnsetVector;
         const KM_3dVector local(sum.x / sum.w, sum.y / sum.w, sum.z / sum.w);
@@ -148,13 +84,34 @@ private:
         return point.IsValid() ? point : KM_3dPoint::UnsetPoint;
     }
 
+    void Run(const double* weights) {
+        std::vector<Homogeneous> points;
+        for (int j = 0; j <= m_degree; ++j) {
+            const KM_3dVector v = weights[j] * (m_points[j] - m_points[0]);
+            points.push_back({v.x, v.y, v.z, weights[j]});
+        }
+        Homogeneous* const d = points.data();
+        const double* const u = m_knots;
+        for (int r = 1; r < m_degree; ++r) {
+            for (int j = m_degree; j >= r; --j)
+                d[j] = between(d[j - 1], d[j], (m_t - u[j - 1]) / (u[j + m_degree - r] - u[j - 1]));
+        }
+        m_from = d[m_degree - 1];
+        m_to = d[m_degree];
+    }
+
+    double SpanLength() const { return m_knots[m_degree] - m_knots[m_degree - 1]; }
+    Homogeneous Sum() const {
+        return between(m_from, m_to, (m_t - m_knots[m_degree - 1]) / SpanLength());
+    }
+
     int m_degree;
-    bool m_rational;
+    double m_t;
     bool m_is_sound;
     const double* m_knots;
     const KM_3dPoint* m_points;
-    SpanPoints m_control_points;
-    SpanPoints m_work;
+    Homogeneous m_from{};
+    Homogeneous m_to{};
 };
 
 // The last span that begins at or before the parameter and has a length; the first or last one of
@@ -175,26 +132,11 @@ int KM_NurbsCurve::SpanAt(double t) const {
 KM_3dPoint KM_NurbsCurve::PointAt(double t) const {
     if (m_order < 2 || !KM_IsValid(t))
         return KM_3dPoint::UnsetPoint;
-    return Span(*this, t).PointAt(t);
-}
-
-void KM_NurbsCurve::PointsAt(std::span<const double> parameters, KM_3dPoint* points) const {
-    for (std::size_t i = 0; i < parameters.size();) {
-        const double first = parameters[i];
-        if (m_order < 2 || !KM_IsValid(first)) {
-            points[i++] = KM_3dPoint::UnsetPoint;
-            continue;
-        }
-        Span span(*this, first);
-        do {
-            points[i] = span.PointAt(parameters[i]);
-            ++i;
-        } while (i < parameters.size() && span.Holds(parameters[i]));
-    }
+    return Triangle(*this, t).Point();
 }
 
 KM_3dVector KM_NurbsCurve::DerivativeAt(double t) const {
     if (m_order < 2 || !KM_IsValid(t))
         return KM_3dVector::UnsetVector;
-    return Span(*this, t).DerivativeAt(t);
+    return Triangle(*this, t).Derivative();
 }

@@ -31,31 +31,11 @@ void appendUtf8(std::string& bytes, char32_t code) {
     }
 }
 
-// Reads one character at `position` and moves past it. Where wchar_t has 16 bits a character may
-// take two of them.
-char32_t nextCharacter(std::wstring_view text, std::size_t& position) {
-    auto code = static_cast<char32_t>(text[position++]);
-    if constexpr (sizeof(wchar_t) == 2) {
-        code &= 0xFFFF;
-        const bool leads = code >= 0xD800 && code < 0xDC00 && position < text.size();
-        const char32_t next = leads ? static_cast<char32_t>(text[position]) & 0xFFFF : 0;
-        if (next >= 0xDC00 && next < 0xE000) {
-            ++position;
-            return 0x10000 + ((code - 0xD800) << 10) + (next - 0xDC00);
-        }
-    }
-    return isSurrogate(code) || code > 0x10FFFF ? replacement_character : code;
-}
+static_assert(sizeof(wchar_t) == 4, "a character is one wchar_t");
 
-void appendWide(std::wstring& text, char32_t code) {
-    if constexpr (sizeof(wchar_t) == 2) {
-        if (code >= 0x10000) {
-            text += static_cast<wchar_t>(0xD800 + ((code - 0x10000) >> 10));
-            text += static_cast<wchar_t>(0xDC00 + ((code - 0x10000) & 0x3FF));
-            return;
-        }
-    }
-    text += static_cast<wchar_t>(code);
+char32_t characterOf(wchar_t character) {
+    const auto code = static_cast<char32_t>(character);
+    return isSurrogate(code) || code > 0x10FFFF ? replacement_character : code;
 }
 
 // What may follow a lead byte: The Unicode Standard, table 3-7. The narrower range of the second
@@ -114,8 +94,8 @@ char32_t nextCharacter(std::string_view bytes, std::size_t& position) {
 std::string KM_wString::ToUtf8() const {
     std::string bytes;
     bytes.reserve(m_text.size());
-    for (std::size_t position = 0; position < m_text.size();)
-        appendUtf8(bytes, nextCharacter(View(), position));
+    for (const wchar_t character : m_text)
+        appendUtf8(bytes, characterOf(character));
     return bytes;
 }
 
@@ -123,6 +103,6 @@ KM_wString KM_wString::FromUtf8(std::string_view bytes) {
     KM_wString string;
     string.m_text.reserve(bytes.size());
     for (std::size_t position = 0; position < bytes.size();)
-        appendWide(string.m_text, nextCharacter(bytes, position));
+        string.m_text += static_cast<wchar_t>(nextCharacter(bytes, position));
     return string;
 }

@@ -108,6 +108,7 @@ void DisplayPipeline::makeRoom(int width, int height) {
         m_layers = std::vector<float>();
         m_edges = EdgePixels();
         m_free_sky = FreeSky();
+        m_lines = LineDrawing();
         m_held_px = 0;
         m_small_pictures = 0;
     }

@@ -65,9 +65,11 @@ FrameLight frameLight(const DirectionalLight& light) {
 }
 
 template <std::size_t capacity>
-int setLights(const LightList<capacity>& lights, FrameLight (&to)[capacity]) {
-    std::transform(lights.begin(), lights.end(), to, frameLight);
-    return static_cast<int>(lights.size());
+int setLights(const std::vector<DirectionalLight>& lights, FrameLight (&to)[capacity]) {
+    const std::size_t count = std::min(lights.size(), capacity);
+    std::transform(lights.begin(), lights.begin() + static_cast<std::ptrdiff_t>(count), to,
+                   frameLight);
+    return static_cast<int>(count);
 }
 
 void setLighting(FrameSetup& frame, const Lighting& lighting) {
@@ -141,12 +143,11 @@ Lighting clayLighting(Lighting lighting) {
         for (int i = 0; i < 3; ++i)
             ambient.slope[c][i] = sky * slope[i];
     }
-    const auto whiten = [&](DirectionalLight& light) {
-        const float white = sun * grey(light.color.r, light.color.g, light.color.b);
-        light.color = {white, white, white};
-    };
-    std::ranges::for_each(lighting.fixed, whiten);
-    std::ranges::for_each(lighting.suns, whiten);
+    for (auto* const lights : {&lighting.fixed, &lighting.suns})
+        for (DirectionalLight& light : *lights) {
+            const float white = sun * grey(light.color.r, light.color.g, light.color.b);
+            light.color = {white, white, white};
+        }
     return lighting;
 }
 

@@ -23,11 +23,10 @@ int cellOf(float place, int count) {
 
 } // namespace
 
-void LineCrowding::reset(int width, int height, PictureScratch& scratch) {
+void LineCrowding::reset(int width, int height) {
     m_columns = (width + cell_size - 1) / cell_size;
     m_rows = (height + cell_size - 1) / cell_size;
-    m_cells = scratch.takeZeroed<float>(static_cast<std::size_t>(m_columns) *
-                                        static_cast<std::size_t>(m_rows));
+    m_cells.assign(static_cast<std::size_t>(m_columns) * static_cast<std::size_t>(m_rows), 0.0F);
 }
 
 void LineCrowding::add(float x, float y, float square_pixels) {

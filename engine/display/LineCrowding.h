@@ -1,10 +1,8 @@
 #pragma once
 
-#include "engine/display/PictureScratch.h"
-
 #include <cstddef>
 #include <cstdint>
-#include <span>
+#include <vector>
 
 namespace quarn {
 
@@ -17,9 +15,8 @@ public:
     /// Lines that cover less than this part of a cell are drawn in full.
     static constexpr float sparse = 0.10F;
 
-    /// Starts anew for a picture of this size.
-    /// @param scratch  keeps the cells; must outlive their use
-    void reset(int width, int height, PictureScratch& scratch);
+    /// Starts anew for a picture of this size; keeps the storage.
+    void reset(int width, int height);
     /// Adds lines' area at a place of the picture. Different rows of cells may be filled by
     /// different threads.
     void add(float x, float y, float square_pixels);
@@ -36,7 +33,7 @@ private:
 
     int m_columns = 0;
     int m_rows = 0;
-    std::span<float> m_cells;
+    std::vector<float> m_cells;
 };
 
 } // namespace quarn

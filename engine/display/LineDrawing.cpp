@@ -230,8 +230,8 @@ void LineDrawing::addMeshLines(const Part& part, const Shared& shared, VisiblePa
 }
 
 void LineDrawing::run(const Job& job, const Shared& shared, LineBatch& batch) {
-    batch.reset(job.style, m_scratch);
-    VisibleParts visible_parts(shared.target, m_scratch);
+    batch.reset(job.style);
+    VisibleParts visible_parts(shared.target);
     const bool keeps_visible = shared.target.depth && !job.style.hidden_by_pixel;
     for (std::size_t i = job.first_part; i < job.end_part; ++i) {
         const Part& part = m_parts[i];
@@ -247,7 +247,6 @@ void LineDrawing::run(const Job& job, const Shared& shared, LineBatch& batch) {
 
 void LineDrawing::draw(const DisplayScene& scene, const CameraRays& rays,
                        const DisplayModeAttributes& mode, const LineTarget& target) {
-    m_scratch.reset();
     m_parts.clear();
     m_jobs.clear();
     listMeshes(scene, rays, mode);
@@ -271,7 +270,7 @@ void LineDrawing::draw(const DisplayScene& scene, const CameraRays& rays,
                       [&](std::size_t index) { run(m_jobs[index], shared, m_batches[index]); });
     if (mode.draws_all_edges)
         layTone(scene, rays, mode, shared.projection, target);
-    drawLines(m_batches, target, m_scratch);
+    drawLines(m_batches, target);
 }
 
 } // namespace quarn

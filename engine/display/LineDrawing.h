@@ -58,7 +58,6 @@ private:
     static void addMeshLines(const Part& part, const Shared& shared, VisibleParts* visible_parts,
                              LineBatch& batch);
 
-    PictureScratch m_scratch;
     std::vector<Part> m_parts;
     std::vector<Job> m_jobs;
     std::vector<LineBatch> m_batches;

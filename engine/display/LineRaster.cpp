@@ -6,11 +6,9 @@
 #include "engine/images/Image.h"
 
 #include <tbb/parallel_for.h>
-#include <tbb/task_arena.h>
 
 #include <algorithm>
 #include <cmath>
-#include <mutex>
 
 namespace quarn {
 
@@ -22,26 +20,9 @@ float widest(const LineStyle& style) {
 
 } // namespace
 
-void LineBatch::reset(const LineStyle& style, PictureScratch& scratch) {
-    *this = LineBatch();
+void LineBatch::reset(const LineStyle& style) {
     m_style = style;
-    m_scratch = &scratch;
-}
-
-void LineBatch::addChunk() {
-    Chunk* const chunk = m_scratch->take<Chunk>(1).data();
-    chunk->next = nullptr;
-    (m_last ? m_last->next : m_first) = chunk;
-    m_last = chunk;
-}
-
-void LineBatch::listChunks() {
-    m_chunks = m_scratch->take<Chunk*>((m_count + segments_a_chunk - 1) / segments_a_chunk);
-    Chunk* chunk = m_first;
-    for (Chunk*& listed : m_chunks) {
-        listed = chunk;
-        chunk = chunk->next;
-    }
+    m_segments.clear();
 }
 
 LineBatch::BandRange LineBatch::bandsOf(const ScreenSegment& s, int band_count) const {
@@ -54,91 +35,43 @@ LineBatch::BandRange LineBatch::bandsOf(const ScreenSegment& s, int band_count) 
 }
 
 void LineBatch::sortIntoBands(int picture_height) {
-    listChunks();
     const int band_count = (picture_height + band_height - 1) / band_height;
-    const auto bands = static_cast<std::size_t>(band_count);
-    // Begins as the number of segments in each band, moved on by two.
-    const std::span<std::uint32_t> starts = m_scratch->takeZeroed<std::uint32_t>(bands + 2);
-    const auto forEachBand = [&](std::uint32_t index, const auto& function) {
-        const BandRange range = bandsOf(segment(index), band_count);
-        for (int band = range.first; band <= range.last; ++band)
-            function(static_cast<std::size_t>(band));
-    };
-    const auto count = static_cast<std::uint32_t>(m_count);
-    for (std::uint32_t i = 0; i < count; ++i)
-        forEachBand(i, [&](std::size_t band) { ++starts[band + 2]; });
-    for (std::size_t i = 2; i < starts.size(); ++i)
-        starts[i] += starts[i - 1];
-    m_entries = m_scratch->take<std::uint32_t>(starts.back());
-    // Filling moves the start of each band on to its end, which is the next one's start.
-    for (std::uint32_t i = 0; i < count; ++i)
-        forEachBand(i, [&](std::size_t band) { m_entries[starts[band + 1]++] = i; });
-    m_starts = starts.first(bands + 1);
+    m_starts.assign(static_cast<std::size_t>(band_count) + 1, 0);
+    for (const ScreenSegment& s : m_segments) {
+        const BandRange bands = bandsOf(s, band_count);
+        for (int band = bands.first; band <= bands.last; ++band)
+            ++m_starts[static_cast<std::size_t>(band) + 1];
+    }
+    for (std::size_t i = 1; i < m_starts.size(); ++i)
+        m_starts[i] += m_starts[i - 1];
+    m_entries.resize(m_starts.back());
+    // Filling from behind turns each start into its own running end and back.
+    for (std::size_t i = m_segments.size(); i-- > 0;) {
+        const BandRange bands = bandsOf(m_segments[i], band_count);
+        for (int band = bands.first; band <= bands.last; ++band)
+            m_entries[--m_starts[static_cast<std::size_t>(band) + 1]] =
+                static_cast<std::uint32_t>(i);
+    }
+    m_starts.erase(m_starts.begin());
+    m_starts.push_back(static_cast<std::uint32_t>(m_entries.size()));
 }
 
 std::span<const std::uint32_t> LineBatch::inBand(int band) const {
     const auto index = static_cast<std::size_t>(band);
-    return m_entries.subspan(m_starts[index], m_starts[index + 1] - m_starts[index]);
+    return std::span(m_entries).subspan(m_starts[index], m_starts[index + 1] - m_starts[index]);
 }
 
 namespace {
 
-/// How much of each pixel of a band the lines of one style cover. All of it is 0 while it is not
-/// lent.
-struct BandCover {
-    struct RowRange {
-        int begin = 0;
-        int end = 0;
-    };
-    std::span<float> pixels;
-    std::span<RowRange> rows; ///< where the cover is not 0
-};
-
-/// One cover for each band that is drawn at the same time.
-class BandCovers {
-public:
-    BandCovers(PictureScratch& scratch, int width, int band_count)
-        : m_scratch(scratch),
-          m_pixels(static_cast<std::size_t>(width) * std::size_t{LineBatch::band_height}),
-          m_free(scratch.take<BandCover>(static_cast<std::size_t>(
-              std::min(band_count, tbb::this_task_arena::max_concurrency())))) {
-        for (BandCover& cover : m_free)
-            cover = make();
-        m_free_count = m_free.size();
-    }
-    BandCover lend() {
-        const std::lock_guard lock(m_mutex);
-        return m_free_count > 0 ? m_free[--m_free_count] : make();
-    }
-    void takeBack(const BandCover& cover) {
-        const std::lock_guard lock(m_mutex);
-        if (m_free_count < m_free.size())
-            m_free[m_free_count++] = cover;
-    }
-
-private:
-    BandCover make() {
-        return {m_scratch.takeZeroed<float>(m_pixels),
-                m_scratch.takeZeroed<BandCover::RowRange>(LineBatch::band_height)};
-    }
-
-    PictureScratch& m_scratch;
-    std::size_t m_pixels;
-    std::mutex m_mutex;
-    std::span<BandCover> m_free;
-    std::size_t m_free_count = 0;
-};
-
-/// One band of the picture.
+/// One band of the picture, and how much of each pixel the lines of the present style cover.
 class Band {
 public:
-    Band(const LineTarget& target, const LineCrowding& crowding, int index, BandCovers& covers)
+    Band(const LineTarget& target, const LineCrowding& crowding, int index)
         : m_target(target), m_crowding(crowding), m_top(index * LineBatch::band_height),
-          m_bottom(std::min(target.height, m_top + LineBatch::band_height)), m_covers(covers),
-          m_cover(covers.lend()), m_surfaces(target) {}
-    ~Band() { m_covers.takeBack(m_cover); }
-    Band(const Band&) = delete;
-    Band& operator=(const Band&) = delete;
+          m_bottom(std::min(target.height, m_top + LineBatch::band_height)),
+          m_cover(static_cast<std::size_t>(target.width) *
+                  static_cast<std::size_t>(m_bottom - m_top)),
+          m_rows(static_cast<std::size_t>(m_bottom - m_top)), m_surfaces(target) {}
 
     void setStyle(const LineStyle& style) {
         if (style == m_style)
@@ -151,6 +84,10 @@ public:
     void blend();
 
 private:
+    struct RowRange {
+        int begin = 0;
+        int end = 0;
+    };
     void addSteep(const ScreenSegment& s, float reach);
     void addFlat(const ScreenSegment& s, float reach);
     void cover(int x, int y, const ScreenSegment& s);
@@ -162,8 +99,8 @@ private:
     int m_top;
     int m_bottom;
     LineStyle m_style;
-    BandCovers& m_covers;
-    BandCover m_cover; ///< by the present style
+    std::vector<float> m_cover;
+    std::vector<RowRange> m_rows; ///< where the cover is not 0
     SurfaceView m_surfaces;
 };
 
@@ -230,8 +167,7 @@ void Band::cover(int x, int y, const ScreenSegment& s) {
     const float distance = std::sqrt(ex * ex + ey * ey);
     const auto row = static_cast<std::size_t>(y - m_top);
     float& covered =
-        m_cover
-            .pixels[row * static_cast<std::size_t>(m_target.width) + static_cast<std::size_t>(x)];
+        m_cover[row * static_cast<std::size_t>(m_target.width) + static_cast<std::size_t>(x)];
     const float strength = s.from.strength + t * (s.to.strength - s.from.strength);
     const float growth = s.from.growth + t * (s.to.growth - s.from.growth);
     const float width = m_style.width_px + growth * (widest(m_style) - m_style.width_px);
@@ -245,11 +181,9 @@ void Band::cover(int x, int y, const ScreenSegment& s) {
     if (amount <= covered)
         return;
     covered = amount;
-    BandCover::RowRange& range = m_cover.rows[row];
-    if (range.end == 0)
-        range = {x, x + 1};
-    else
-        range = {std::min(range.begin, x), std::max(range.end, x + 1)};
+    RowRange& range = m_rows[row];
+    range = range.end == 0 ? RowRange{x, x + 1}
+                           : RowRange{std::min(range.begin, x), std::max(range.end, x + 1)};
 }
 
 /// See-through surfaces let lines behind them through, each a part.
@@ -298,9 +232,9 @@ void Band::blend() {
         return 1.0F - m_style.crowded * (1.0F - m_crowding.strength(x, y));
     };
     for (int y = m_top; y < m_bottom; ++y) {
-        BandCover::RowRange& range = m_cover.rows[static_cast<std::size_t>(y - m_top)];
-        float* const cover = m_cover.pixels.data() + static_cast<std::size_t>(y - m_top) *
-                                                         static_cast<std::size_t>(m_target.width);
+        RowRange& range = m_rows[static_cast<std::size_t>(y - m_top)];
+        float* const cover = m_cover.data() + static_cast<std::size_t>(y - m_top) *
+                                                  static_cast<std::size_t>(m_target.width);
         std::uint32_t* const row = m_target.pixels + static_cast<std::size_t>(y) *
                                                          static_cast<std::size_t>(m_target.width);
         for (int x = range.begin; x < range.end; ++x) {
@@ -358,22 +292,20 @@ void findCrowding(std::span<const LineBatch> batches, int band, LineCrowding& cr
 
 } // namespace
 
-void drawLines(std::span<const LineBatch> batches, const LineTarget& target,
-               PictureScratch& scratch) {
+void drawLines(std::span<const LineBatch> batches, const LineTarget& target) {
     static_assert(LineCrowding::cell_size == LineBatch::band_height,
                   "each band fills a row of cells of its own");
     const int band_count = (target.height + LineBatch::band_height - 1) / LineBatch::band_height;
     LineCrowding crowding;
     if (std::any_of(batches.begin(), batches.end(),
                     [](const LineBatch& batch) { return batch.style().crowded > 0.0F; })) {
-        crowding.reset(target.width, target.height, scratch);
+        crowding.reset(target.width, target.height);
         tbb::parallel_for(0, band_count,
                           [&](int index) { findCrowding(batches, index, crowding); });
         crowding.finish();
     }
-    BandCovers covers(scratch, target.width, band_count);
     tbb::parallel_for(0, band_count, [&](int index) {
-        Band band(target, crowding, index, covers);
+        Band band(target, crowding, index);
         for (const LineBatch& batch : batches) {
             band.setStyle(batch.style());
             for (const std::uint32_t segment : batch.inBand(index))

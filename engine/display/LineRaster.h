@@ -1,12 +1,11 @@
 #pragma once
 
-#include "engine/display/PictureScratch.h"
 #include "engine/display/ScreenProjection.h"
 #include "kelmar/KM_Color.h"
 
-#include <cstddef>
 #include <cstdint>
 #include <span>
+#include <vector>
 
 namespace quarn {
 
@@ -25,30 +24,20 @@ struct LineStyle {
     friend bool operator==(const LineStyle&, const LineStyle&) = default;
 };
 
-/// Segments of one style, sorted into bands of the picture. They lie in the picture's scratch
-/// memory.
+/// Segments of one style, sorted into bands of the picture.
 class LineBatch {
 public:
     /// Rows of pixels in a band.
     static constexpr int band_height = 16;
 
-    /// Starts anew.
-    /// @param scratch  keeps the segments; must outlive their use
-    void reset(const LineStyle& style, PictureScratch& scratch);
-    void add(const ScreenSegment& segment) {
-        const std::size_t at = m_count % segments_a_chunk;
-        if (at == 0)
-            addChunk();
-        m_last->segments[at] = segment;
-        ++m_count;
-    }
+    /// Starts anew; keeps the storage.
+    void reset(const LineStyle& style);
+    void add(const ScreenSegment& segment) { m_segments.push_back(segment); }
     /// Sorts the segments into bands; call it once, after the last `add`.
     void sortIntoBands(int picture_height);
 
     const LineStyle& style() const { return m_style; }
-    const ScreenSegment& segment(std::uint32_t index) const {
-        return m_chunks[index / segments_a_chunk]->segments[index % segments_a_chunk];
-    }
+    const ScreenSegment& segment(std::uint32_t index) const { return m_segments[index]; }
     /// Indices of the segments that touch a band, in the order in which they were added.
     std::span<const std::uint32_t> inBand(int band) const;
 
@@ -57,23 +46,12 @@ private:
         int first;
         int last;
     };
-    static constexpr std::size_t segments_a_chunk = 128;
-    struct Chunk {
-        Chunk* next;
-        ScreenSegment segments[segments_a_chunk];
-    };
     BandRange bandsOf(const ScreenSegment& segment, int band_count) const;
-    void addChunk();
-    void listChunks();
 
     LineStyle m_style;
-    PictureScratch* m_scratch = nullptr;
-    std::size_t m_count = 0;
-    Chunk* m_first = nullptr;
-    Chunk* m_last = nullptr;
-    std::span<Chunk*> m_chunks;
-    std::span<std::uint32_t> m_entries;
-    std::span<std::uint32_t> m_starts;
+    std::vector<ScreenSegment> m_segments;
+    std::vector<std::uint32_t> m_entries;
+    std::vector<std::uint32_t> m_starts;
 };
 
 /// Where lines are drawn.
@@ -94,7 +72,6 @@ struct LineTarget {
 /// between 0 and 1, times the line's strength there. Lines of one style that follow each other
 /// cover a pixel as much as the one of them that covers it most, so that joints are no darker than
 /// the lines. Covers are blended in sRGB, in which thin dark lines look evenly dark.
-void drawLines(std::span<const LineBatch> batches, const LineTarget& target,
-               PictureScratch& scratch);
+void drawLines(std::span<const LineBatch> batches, const LineTarget& target);
 
 } // namespace quarn

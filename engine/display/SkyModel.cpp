@@ -212,19 +212,15 @@ Lighting studioLighting(const CameraFrame& camera) {
 
 Lighting skyLighting(std::span<const KM_Light> lights, bool casts_shadows,
                      const CameraFrame& camera) {
-    const auto is_sun = [](const KM_Light& light) {
-        return light.IsEnabled() && light.IsDirectionalLight();
-    };
-    const auto first = std::ranges::find_if(lights, is_sun);
-    if (first == lights.end())
+    std::vector<DirectionalLight> suns;
+    for (const KM_Light& light : lights)
+        if (light.IsEnabled() && light.IsDirectionalLight())
+            suns.push_back(sunOf(light, casts_shadows, camera));
+    if (suns.empty())
         return lightingWithoutSun(camera);
 
     Lighting lighting;
-    for (const KM_Light& light : lights.subspan(static_cast<std::size_t>(first - lights.begin())))
-        if (const auto sun = sunOf(light, casts_shadows, camera); is_sun(light) && isLit(sun))
-            lighting.suns.push_back(sun);
-    const DirectionalLight first_sun = sunOf(*first, casts_shadows, camera);
-    const float* toward = first_sun.toward;
+    const float* toward = suns.front().toward;
     const TimeOfDay time(toward[2]);
     lighting.sky = time.sky();
     std::copy_n(toward, 3, lighting.sky.toward_sun);
@@ -233,6 +229,7 @@ Lighting skyLighting(std::span<const KM_Light> lights, bool casts_shadows,
                                                            {0.06F, 0.06F, 0.06F},
                                                            {0.085F, 0.088F, 0.100F},
                                                            {0.105F, 0.118F, 0.150F}})));
+    std::copy_if(suns.begin(), suns.end(), std::back_inserter(lighting.suns), isLit);
     return lighting;
 }
 

@@ -1,10 +1,9 @@
 #pragma once
 
-#include "engine/display/kernel/FrameSetup.h"
 #include "engine/images/ColorSpace.h"
 
-#include <cstddef>
 #include <span>
+#include <vector>
 
 class KM_Light;
 
@@ -15,24 +14,6 @@ struct DirectionalLight {
     float toward[3] = {0.0F, 0.0F, 1.0F}; ///< unit vector to the light, world coordinates
     LinearColor color;                    ///< scene light on a white surface that faces it
     float shadow = 0.0F;                  ///< part of it that an occluder takes away, 0 to 1
-};
-
-/// The first `capacity` of the lights that are added; those beyond are passed over.
-template <std::size_t capacity> class LightList {
-public:
-    void push_back(const DirectionalLight& light) {
-        if (m_count < capacity)
-            m_lights[m_count++] = light;
-    }
-    std::size_t size() const { return m_count; }
-    DirectionalLight* begin() { return m_lights; }
-    DirectionalLight* end() { return m_lights + m_count; }
-    const DirectionalLight* begin() const { return m_lights; }
-    const DirectionalLight* end() const { return m_lights + m_count; }
-
-private:
-    DirectionalLight m_lights[capacity];
-    std::size_t m_count = 0;
 };
 
 /// Light from all sides that changes linearly with the direction in which a surface faces:
@@ -56,8 +37,8 @@ struct Sky {
 /// All the light of one picture.
 struct Lighting {
     AmbientLight ambient;
-    LightList<max_fixed_lights> fixed; ///< cast no shadows
-    LightList<max_suns> suns;          ///< cast shadows as far as their `shadow` says
+    std::vector<DirectionalLight> fixed; ///< cast no shadows
+    std::vector<DirectionalLight> suns;  ///< cast shadows as far as their `shadow` says
     Sky sky;
 };
 

@@ -44,7 +44,7 @@ int pixelOf(float place) {
 
 /// Calls function(begin, end) for each run of samples with that value.
 template <class Function>
-void forEachRun(std::span<const std::uint8_t> samples, std::uint8_t value,
+void forEachRun(const std::vector<std::uint8_t>& samples, std::uint8_t value,
                 const Function& function) {
     for (std::size_t begin = 0; begin < samples.size();) {
         std::size_t end = begin + 1;
@@ -137,9 +137,8 @@ void VisibleParts::look(const ScreenSegment& segment) {
     const float scale = length > 0.0F ? 2.0F / length : 0.0F;
     const SurfaceView::Aside aside{static_cast<int>(std::lrintf(-dy * scale)),
                                    static_cast<int>(std::lrintf(dx * scale))};
-    makeRoom(count);
-    m_seen = m_room_for_seen.first(count);
-    m_bends = m_room_for_bends.first(count);
+    m_seen.resize(count);
+    m_bends.resize(count);
     for (std::size_t i = 0; i < count; ++i) {
         const ScreenPoint place = sampleOf(segment, i);
         const int x = pixelOf(place.x);
@@ -147,14 +146,6 @@ void VisibleParts::look(const ScreenSegment& segment) {
         m_seen[i] = m_view.hides(x, y, place.nearness) ? 0 : 1;
         m_bends[i] = m_view.bendAt(x, y, aside);
     }
-}
-
-/// Twice as much as is wanted, so that a longer segment seldom needs more.
-void VisibleParts::makeRoom(std::size_t count) {
-    if (count <= m_room_for_seen.size())
-        return;
-    m_room_for_seen = m_scratch.take<std::uint8_t>(2 * count);
-    m_room_for_bends = m_scratch.take<float>(2 * count);
 }
 
 ScreenPoint VisibleParts::sampleOf(const ScreenSegment& segment, std::size_t index) const {

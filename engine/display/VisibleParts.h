@@ -3,7 +3,7 @@
 #include "engine/display/LineRaster.h"
 
 #include <cstdint>
-#include <span>
+#include <vector>
 
 namespace quarn {
 
@@ -42,9 +42,7 @@ private:
 /// of a pixel says now seen and now hidden, an edge is not drawn as a row of dots.
 class VisibleParts {
 public:
-    /// @param scratch  for what it looks at; must outlive it
-    VisibleParts(const LineTarget& target, PictureScratch& scratch)
-        : m_view(target), m_scratch(scratch) {}
+    explicit VisibleParts(const LineTarget& target) : m_view(target) {}
 
     /// Adds the visible parts of the segment. They are as strong and as wide as the surfaces beside
     /// them bend; at the joint of two surfaces that lie in one plane there are none.
@@ -52,7 +50,6 @@ public:
 
 private:
     void look(const ScreenSegment& segment);
-    void makeRoom(std::size_t count);
     void lookIntoFolds(const ScreenSegment& segment);
     bool isInFold(const ScreenSegment& segment) const;
     ScreenPoint sampleOf(const ScreenSegment& segment, std::size_t index) const;
@@ -63,11 +60,8 @@ private:
                 LineBatch& batch) const;
 
     SurfaceView m_view;
-    PictureScratch& m_scratch;
-    std::span<std::uint8_t> m_seen; ///< sample by sample, about one a pixel
-    std::span<float> m_bends;
-    std::span<std::uint8_t> m_room_for_seen;
-    std::span<float> m_room_for_bends;
+    std::vector<std::uint8_t> m_seen; ///< sample by sample, about one a pixel
+    std::vector<float> m_bends;
 };
 
 } // namespace quarn

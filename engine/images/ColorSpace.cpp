@@ -1,5 +1,7 @@
 #include "engine/images/ColorSpace.h"
 
+#include "engine/scene/SrgbCurve.h"
+
 #include <algorithm>
 #include <bit>
 #include <cmath>
@@ -10,14 +12,6 @@ namespace {
 
 constexpr float shoulder_start = 0.6F;
 constexpr float shoulder_height = 1.0F - shoulder_start;
-
-float linearFromSrgb(float value) {
-    return value <= 0.04045F ? value / 12.92F : std::pow((value + 0.055F) / 1.055F, 2.4F);
-}
-
-float srgbFromUnit(float linear) {
-    return linear <= 0.0031308F ? 12.92F * linear : 1.055F * std::pow(linear, 1.0F / 2.4F) - 0.055F;
-}
 
 std::array<float, 256> makeByteTable() {
     std::array<float, 256> table{};
@@ -62,7 +56,7 @@ float linearFromSrgbByte(std::uint8_t value) {
 }
 
 std::uint8_t srgbByteFromLinear(float linear) {
-    const float value = srgbFromUnit(std::clamp(linear, 0.0F, 1.0F));
+    const float value = srgbFromLinear(std::clamp(linear, 0.0F, 1.0F));
     return static_cast<std::uint8_t>(std::lround(255.0F * value));
 }
 

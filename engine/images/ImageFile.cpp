@@ -22,12 +22,17 @@ std::string whyNotEncodable(const ImageView& image) {
                                            : "the picture's pixels do not fit its size";
 }
 
-/// With its dot; empty for a name without one, and for one that begins with its only dot.
-std::string_view extensionOf(std::string_view path) {
-    const std::string_view name = path.substr(path.rfind('/') + 1);
-    const std::size_t dot = name.rfind('.');
-    const bool has_extension = dot != std::string_view::npos && dot > 0 && name != "..";
-    return has_extension ? name.substr(dot) : std::string_view();
+Result<void> appendFile(const ImageView& image, ImageFormat format, std::vector<std::byte>& bytes) {
+    switch (format) {
+    case ImageFormat::jpeg:
+        return encodeJpeg(image, bytes);
+    case ImageFormat::png:
+        return encodePng(image, bytes);
+    case ImageFormat::bmp:
+        return encodeBmp(image, bytes);
+    default:
+        return encodeTga(image, bytes);
+    }
 }
 
 } // namespace
@@ -48,52 +53,28 @@ std::optional<ImageFormat> imageFormatFor(std::string_view extension) {
     return found == formats.end() ? std::nullopt : std::optional(found->second);
 }
 
-struct ImageEncoder::Buffers {
-    JpegEncoder jpeg;
-    PngEncoder png;
+Result<std::vector<std::byte>> encodeImage(const ImageView& image, ImageFormat format) {
+    if (std::string why = whyNotEncodable(image); !why.empty()) {
+        return Error{std::move(why)};
+    }
     std::vector<std::byte> bytes;
-};
-
-ImageEncoder::ImageEncoder() : m_buffers(std::make_unique<Buffers>()) {}
-ImageEncoder::~ImageEncoder() = default;
-ImageEncoder::ImageEncoder(ImageEncoder&&) noexcept = default;
-ImageEncoder& ImageEncoder::operator=(ImageEncoder&&) noexcept = default;
-
-Result<std::span<const std::byte>> ImageEncoder::encode(const ImageView& image,
-                                                        ImageFormat format) {
-    if (const std::string why = whyNotEncodable(image); !why.empty()) {
-        return Error{why};
-    }
-    if (format == ImageFormat::jpeg) {
-        return m_buffers->jpeg.encode(image);
-    }
-    std::vector<std::byte>& bytes = m_buffers->bytes;
-    bytes.clear();
-    const Result<void> encoded = format == ImageFormat::png   ? m_buffers->png.encode(image, bytes)
-                                 : format == ImageFormat::bmp ? encodeBmp(image, bytes)
-                                                              : encodeTga(image, bytes);
-    if (!encoded) {
+    if (const Result<void> encoded = appendFile(image, format, bytes); !encoded) {
         return encoded.error();
     }
-    return std::span<const std::byte>(bytes);
-}
-
-Result<void> ImageEncoder::write(const char* path, const ImageView& image) {
-    const std::string_view extension = extensionOf(path);
-    const auto format = imageFormatFor(extension);
-    if (!format) {
-        return Error{"Cannot write '" + std::string(path) + "': pictures of the kind '" +
-                     std::string(extension) + "' are not known. Choose jpg, png, bmp or tga."};
-    }
-    const auto encoded = encode(image, *format);
-    if (!encoded) {
-        return Error{"Cannot write '" + std::string(path) + "': " + encoded.message() + "."};
-    }
-    return writeFileAtomically(path, encoded.value());
+    return bytes;
 }
 
 Result<void> writeImageFile(const std::filesystem::path& path, const ImageView& image) {
-    return ImageEncoder().write(path.c_str(), image);
+    const auto format = imageFormatFor(path.extension().string());
+    if (!format) {
+        return Error{"Cannot write '" + path.string() + "': pictures of the kind '" +
+                     path.extension().string() + "' are not known. Choose jpg, png, bmp or tga."};
+    }
+    const auto encoded = encodeImage(image, *format);
+    if (!encoded) {
+        return Error{"Cannot write '" + path.string() + "': " + encoded.message() + "."};
+    }
+    return writeFileAtomically(path, encoded.value());
 }
 
 } // namespace quarn

@@ -6,10 +6,10 @@
 #include <cstddef>
 #include <cstdint>
 #include <filesystem>
-#include <memory>
 #include <optional>
 #include <span>
-#include <string>
+#include <string_view>
+#include <vector>
 
 namespace quarn {
 
@@ -31,35 +31,17 @@ struct ImageView {
     ImageView(const Image& image) : ImageView(image.width, image.height, image.rgba) {}
 };
 
-/// Turns pictures into the bytes of image files. It keeps its buffers from one picture to the next,
-/// so whoever writes many frames keeps one; one thread at a time may use it.
-///
-/// All formats are written with 24 bits a pixel; opacity is left out. JPEG has quality 90 and full
-/// colour resolution. BMP and TGA are not compressed.
-class ImageEncoder {
-public:
-    ImageEncoder();
-    ~ImageEncoder();
-    ImageEncoder(ImageEncoder&&) noexcept;
-    ImageEncoder& operator=(ImageEncoder&&) noexcept;
+/// Turns a picture into the bytes of an image file. All formats are written with 24 bits a pixel;
+/// opacity is left out. JPEG has quality 90 and full colour resolution. BMP and TGA are not
+/// compressed.
+/// @return why the picture cannot be encoded, a part of a sentence: it is empty, its size and its
+///   pixels disagree, or a side is longer than the format allows (65500 for JPEG, 65535 for TGA)
+Result<std::vector<std::byte>> encodeImage(const ImageView& image, ImageFormat format);
 
-    /// @return the bytes of the file, valid until the next call on this encoder; or why the picture
-    ///   cannot be encoded, a part of a sentence: it is empty, its size and its pixels disagree, or
-    ///   a side is longer than the format allows (65500 for JPEG, 65535 for TGA)
-    Result<std::span<const std::byte>> encode(const ImageView& image, ImageFormat format);
-
-    /// Encodes and writes a picture in the format of the path's extension. The file appears whole
-    /// or not at all, and replaces one of the same name.
-    /// @return an error that names the file: unknown extension, the picture cannot be encoded, the
-    ///   folder is missing, no permission, the disk is full
-    Result<void> write(const char* path, const ImageView& image);
-
-private:
-    struct Buffers;
-    std::unique_ptr<Buffers> m_buffers;
-};
-
-/// Writes one picture, as ImageEncoder::write does.
+/// Encodes and writes a picture in the format of the path's extension. The file appears whole or
+/// not at all, and replaces one of the same name.
+/// @return an error that names the file: unknown extension, the picture cannot be encoded, the
+///   folder is missing, no permission, the disk is full
 Result<void> writeImageFile(const std::filesystem::path& path, const ImageView& image);
 
 } // namespace quarn

@@ -1,5 +1,6 @@
 #include "engine/images/JpegFormat.h"
 
+#include <memory>
 #include <turbojpeg.h>
 
 namespace quarn {
@@ -7,47 +8,39 @@ namespace {
 
 constexpr int quality = 90;
 constexpr int longest_side = 65500;
+constexpr std::uint64_t most_pixels = 500'000'000; // the buffer's size is an int
+
+struct DestroyCompressor {
+    void operator()(void* compressor) const { tjDestroy(compressor); }
+};
+struct FreeBuffer {
+    void operator()(unsigned char* buffer) const { tjFree(buffer); }
+};
 
 } // namespace
 
-JpegEncoder::~JpegEncoder() {
-    tjFree(m_buffer);
-    if (m_compressor != nullptr) {
-        tjDestroy(m_compressor);
-    }
-}
-
-bool JpegEncoder::makeRoom(const ImageView& image) {
-    const unsigned long needed = tjBufSize(image.width, image.height, TJSAMP_444);
-    if (needed > m_capacity) {
-        tjFree(m_buffer);
-        m_buffer = tjAlloc(static_cast<int>(needed));
-        m_capacity = m_buffer == nullptr ? 0 : needed;
-    }
-    return m_buffer != nullptr;
-}
-
-Result<std::span<const std::byte>> JpegEncoder::encode(const ImageView& image) {
+Result<void> encodeJpeg(const ImageView& image, std::vector<std::byte>& bytes) {
     if (image.width > longest_side || image.height > longest_side) {
         return Error{"a JPEG picture has at most 65500 pixels a side"};
     }
-    constexpr std::uint64_t most_pixels = 500'000'000; // the buffer's size is an int
     if (static_cast<std::uint64_t>(image.width) * static_cast<std::uint64_t>(image.height) >
         most_pixels) {
         return Error{"the picture is too large"};
     }
-    if (m_compressor == nullptr) {
-        m_compressor = tjInitCompress();
-    }
-    if (m_compressor == nullptr || !makeRoom(image)) {
+    unsigned long size = tjBufSize(image.width, image.height, TJSAMP_444);
+    const std::unique_ptr<void, DestroyCompressor> compressor(tjInitCompress());
+    const std::unique_ptr<unsigned char, FreeBuffer> buffer(tjAlloc(static_cast<int>(size)));
+    if (!compressor || !buffer) {
         return Error{"there is not enough memory"};
     }
-    unsigned long size = m_capacity;
-    if (tjCompress2(m_compressor, image.rgba.data(), image.width, 0, image.height, TJPF_RGBX,
-                    &m_buffer, &size, TJSAMP_444, quality, TJFLAG_NOREALLOC) != 0) {
-        return Error{tjGetErrorStr2(m_compressor)};
+    unsigned char* target = buffer.get();
+    if (tjCompress2(compressor.get(), image.rgba.data(), image.width, 0, image.height, TJPF_RGBX,
+                    &target, &size, TJSAMP_444, quality, TJFLAG_NOREALLOC) != 0) {
+        return Error{tjGetErrorStr2(compressor.get())};
     }
-    return std::span<const std::byte>(reinterpret_cast<const std::byte*>(m_buffer), size);
+    const auto* const begin = reinterpret_cast<const std::byte*>(target);
+    bytes.insert(bytes.end(), begin, begin + size);
+    return {};
 }
 
 } // namespace quarn

@@ -43,9 +43,9 @@ int begin(spng_ctx* context, const ImageView& image, std::vector<std::byte>& byt
                                        SPNG_ENCODE_PROGRESSIVE | SPNG_ENCODE_FINALIZE);
 }
 
-int encodeRows(spng_ctx* context, const ImageView& image, std::vector<std::uint8_t>& row) {
+int encodeRows(spng_ctx* context, const ImageView& image) {
     const auto width = static_cast<std::size_t>(image.width);
-    row.resize(3 * width);
+    std::vector<std::uint8_t> row(3 * width);
     const std::uint8_t* pixel = image.rgba.data();
     int failure = 0;
     for (int y = 0; y < image.height && failure == 0; ++y) {
@@ -61,16 +61,13 @@ int encodeRows(spng_ctx* context, const ImageView& image, std::vector<std::uint8
 
 } // namespace
 
-Result<void> PngEncoder::encode(const ImageView& image, std::vector<std::byte>& bytes) {
+Result<void> encodePng(const ImageView& image, std::vector<std::byte>& bytes) {
     const std::unique_ptr<spng_ctx, FreeContext> context(spng_ctx_new(SPNG_CTX_ENCODER));
     if (context == nullptr) {
         return Error{"there is not enough memory"};
     }
-    // As much as the pixels at once: what a picture compresses to differs from frame to frame.
-    bytes.reserve(3 * static_cast<std::size_t>(image.width) *
-                  static_cast<std::size_t>(image.height));
     int failure = begin(context.get(), image, bytes);
-    failure = failure ? failure : encodeRows(context.get(), image, m_row);
+    failure = failure ? failure : encodeRows(context.get(), image);
     return failure ? Result<void>(Error{spng_strerror(failure)}) : Result<void>();
 }
 

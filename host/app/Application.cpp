@@ -84,19 +84,6 @@ void Application::tell(std::string_view message) {
     print((KM_wString::FromUtf8(message) + L"\n").View());
 }
 
-const std::filesystem::path& Application::pictureFile(std::string_view file) {
-    const std::string& last = m_picture_file.native();
-    const std::size_t name = file.rfind('/') + 1;
-    const bool same_folder = name == last.rfind('/') + 1 && last.starts_with(file.substr(0, name));
-    if (same_folder && m_picture_file.has_filename()) {
-        m_picture_file.remove_filename();
-        m_picture_file /= file.substr(name);
-    } else {
-        m_picture_file = file;
-    }
-    return m_picture_file;
-}
-
 void Application::pictureWritten(const std::filesystem::path& file) {
     RunningCommand* command = m_runner.outermost();
     if (!command)

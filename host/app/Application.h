@@ -54,9 +54,6 @@ public:
     /// Shows a message of the host (UTF-8) as a line of its own.
     void tell(std::string_view message);
 
-    /// The path of a picture's file; valid until the next call. A file that lies in the same folder
-    /// as the last one costs no memory.
-    const std::filesystem::path& pictureFile(std::string_view file);
     /// To be called after a picture was written to a file: counts it for the command that runs, and
     /// tells the front end. Without a running command nothing happens.
     void pictureWritten(const std::filesystem::path& file);
@@ -86,7 +83,6 @@ private:
     std::map<HWND, std::unique_ptr<CWnd>> m_windows;
     const CDialog* m_open_dialog = nullptr;
     bool m_exit_requested = false;
-    std::filesystem::path m_picture_file;
 };
 
 } // namespace quarn

@@ -3,14 +3,11 @@
 #include "engine/images/ImageFile.h"
 #include "ground/PathText.h"
 #include "host/app/Application.h"
-#include "host/border/Contract.h"
+#include "ground/PathText.h"
+#include "engine/images/ImageFile.h"
 
 CQuarnDib::CQuarnDib() : m_image(std::make_unique<quarn::Image>()) {}
-CQuarnDib::~CQuarnDib() {
-    quarn::Application* const application = quarn::Application::current();
-    if (application && m_image && quarn::isMainThread())
-        application->documents().keepStorageOf(*m_image);
-}
+CQuarnDib::~CQuarnDib() = default;
 CQuarnDib::CQuarnDib(CQuarnDib&& other) noexcept = default;
 CQuarnDib& CQuarnDib::operator=(CQuarnDib&& other) noexcept = default;
 
@@ -33,10 +30,10 @@ bool CQuarnDib::WriteToFile(const wchar_t* path, int) const {
     quarn::Application* application = quarn::Application::forCall("CQuarnDib::WriteToFile");
     if (!application || !path || !m_image)
         return false;
-    const quarn::SystemPath file(path);
-    const auto written = application->documents().imageEncoder().write(file.c_str(), *m_image);
+    const std::filesystem::path file = quarn::pathFromText(path);
+    const auto written = quarn::writeImageFile(file, *m_image);
     if (written)
-        application->pictureWritten(application->pictureFile(file.view()));
+        application->pictureWritten(file);
     else
         application->tell(written.message());
     return written.ok();

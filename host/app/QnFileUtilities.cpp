@@ -4,8 +4,6 @@
 #include "host/app/Application.h"
 #include "host/app/DocumentsFolder.h"
 
-#include <sys/stat.h>
-
 namespace {
 
 std::string withoutSeparatorAtEnd(std::string path) {
@@ -28,17 +26,13 @@ bool CQuarnFileUtilities::GetMyDocumentsFolder(KM_wString& folder) {
 }
 
 bool CQuarnFileUtilities::DirExists(const wchar_t* path) {
-    if (!path)
-        return false;
-    struct stat status {};
-    return stat(quarn::SystemPath(path).c_str(), &status) == 0 && S_ISDIR(status.st_mode);
+    std::error_code error;
+    return path && std::filesystem::is_directory(quarn::pathFromText(path), error);
 }
 
 bool CQuarnFileUtilities::CreateDir(const wchar_t* path) {
     if (!path || !*path)
         return false;
-    if (DirExists(path)) // as it does for all frames but a recording's first
-        return true;
     const std::filesystem::path folder = quarn::pathFromText(path);
     std::error_code error;
     std::filesystem::create_directories(folder, error);

@@ -50,13 +50,9 @@ void releaseMainThread() {
     main_thread.store(std::thread::id());
 }
 
-bool isMainThread() {
-    const std::thread::id claimed = main_thread.load(std::memory_order_relaxed);
-    return claimed == std::this_thread::get_id() || claimed == std::thread::id();
-}
-
 bool isOnMainThread(const char* call) {
-    if (isMainThread())
+    const std::thread::id claimed = main_thread.load(std::memory_order_relaxed);
+    if (claimed == std::this_thread::get_id() || claimed == std::thread::id())
         return true;
     reportBreach(call, "only the main thread may call it");
     return false;

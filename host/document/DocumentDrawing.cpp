@@ -18,31 +18,25 @@ void DocumentDrawing::release() {
 }
 
 std::vector<KM_Light> DocumentDrawing::shiningLights() const {
-    std::vector<KM_Light> lights;
-    addShiningLights(SceneChanges(), lights);
+    std::vector<KM_Light> lights = m_document.lights().shiningLights();
+    if (const auto sun = m_document.sun().light())
+        lights.insert(lights.begin(), *sun);
     return lights;
 }
 
-/// A light of the changes comes last, the sun in whose place it stands first.
-void DocumentDrawing::addShiningLights(const SceneChanges& changes,
-                                       std::vector<KM_Light>& lights) const {
-    if (changes.sun) {
-        m_document.lights().addShiningLights(lights, changes.sun->replaced_light);
-        if (LightStore::canShine(changes.sun->light))
-            lights.push_back(changes.sun->light);
-        return;
-    }
-    if (const auto sun = m_document.sun().light())
-        lights.push_back(*sun);
-    m_document.lights().addShiningLights(lights);
+std::vector<KM_Light> DocumentDrawing::shiningLights(const SceneChanges& changes) const {
+    if (!changes.sun)
+        return shiningLights();
+    std::vector<KM_Light> lights = m_document.lights().shiningLights(changes.sun->replaced_light);
+    if (LightStore::canShine(changes.sun->light))
+        lights.push_back(changes.sun->light);
+    return lights;
 }
 
 Result<void> DocumentDrawing::update(const SceneChanges& changes) {
     if (!m_scene)
         m_scene = std::make_unique<DocumentScene>();
-    m_shining_lights.clear();
-    addShiningLights(changes, m_shining_lights);
-    return m_scene->update(m_document.objects(), m_shining_lights, changes.hidden);
+    return m_scene->update(m_document.objects(), shiningLights(changes), changes.hidden);
 }
 
 /// Nothing that was half built is drawn the next time.

@@ -51,13 +51,12 @@ public:
     std::vector<KM_Light> shiningLights() const;
 
 private:
-    void addShiningLights(const SceneChanges& changes, std::vector<KM_Light>& lights) const;
+    std::vector<KM_Light> shiningLights(const SceneChanges& changes) const;
     Result<void> update(const SceneChanges& changes);
     Error memoryLacks(const char* how, int width_px, int height_px);
 
     const Document& m_document;
     std::unique_ptr<DocumentScene> m_scene; ///< null until something is drawn
-    std::vector<KM_Light> m_shining_lights; ///< in the last picture; kept for its storage
 };
 
 } // namespace quarn

@@ -1,7 +1,5 @@
 #include "host/document/DocumentList.h"
 
-#include "engine/images/Image.h"
-#include "engine/images/ImageFile.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
 #include <algorithm>
@@ -20,8 +18,7 @@ unsigned int nextSerialNumber() {
 
 } // namespace
 
-DocumentList::DocumentList(FrontEnd& front_end)
-    : m_front_end(front_end), m_image_encoder(std::make_unique<ImageEncoder>()) {
+DocumentList::DocumentList(FrontEnd& front_end) : m_front_end(front_end) {
     current_list = this;
 }
 
@@ -32,18 +29,6 @@ DocumentList::~DocumentList() {
 
 DocumentList* DocumentList::current() {
     return current_list;
-}
-
-void DocumentList::keepStorageOf(Image& picture) {
-    constexpr std::size_t most_bytes = std::size_t{64} << 20;
-    const std::size_t bytes = picture.rgba.capacity();
-    if (bytes > m_picture_storage.capacity() && bytes <= most_bytes)
-        m_picture_storage.swap(picture.rgba);
-}
-
-void DocumentList::giveStorageTo(Image& picture) {
-    if (picture.rgba.capacity() == 0)
-        picture.rgba.swap(m_picture_storage);
 }
 
 Document& DocumentList::openNew() {

@@ -2,7 +2,6 @@
 
 #include "host/document/Document.h"
 
-#include <cstdint>
 #include <memory>
 #include <string>
 #include <utility>
@@ -11,8 +10,6 @@
 namespace quarn {
 
 class FrontEnd;
-class ImageEncoder;
-struct Image;
 
 /// The open documents. There is at most one list at a time: the interface finds documents by
 /// number and objects by id with no list given, so the list is known to all.
@@ -61,16 +58,6 @@ public:
 
     FrontEnd& frontEnd() const { return m_front_end; }
 
-    /// Writes picture files; kept here so that its buffers serve every frame.
-    ImageEncoder& imageEncoder() { return *m_image_encoder; }
-
-    /// Takes the storage of a picture that is no longer needed, for the next one: recording a frame
-    /// then asks for no memory. Storage of very large pictures is freed.
-    void keepStorageOf(Image& picture);
-    /// Gives a picture that has none the storage that was kept, if there is any, with whatever is
-    /// in it.
-    void giveStorageTo(Image& picture);
-
     /// Keeps a copy of the animation record as it is now: the one that a new document starts with.
     /// Called once after a plug-in that keeps a record was loaded.
     void rememberFreshRecord();
@@ -86,8 +73,6 @@ private:
     bool m_is_command_running = false;
     ViewState* m_placed_view = nullptr; ///< by the command that runs; null: none
     std::string m_unsaved_picture;
-    std::unique_ptr<ImageEncoder> m_image_encoder;
-    std::vector<std::uint8_t> m_picture_storage;
     std::unique_ptr<KM_3dmAnimationProperties> m_fresh_record;
 };
 

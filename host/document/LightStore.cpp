@@ -5,7 +5,6 @@
 #include "sdk/qncore/QnLocalize.h"
 
 #include <algorithm>
-#include <utility>
 
 namespace quarn {
 
@@ -39,10 +38,6 @@ const CQuarnLight& LightStore::at(int index) const {
 int LightStore::add(const KM_Light& light) {
     if (!canShine(light) || m_slot_count >= most_slots)
         return no_index;
-    if (m_spare) {
-        m_spare.key() = m_slot_count;
-        m_live.insert(m_live.end(), std::move(m_spare));
-    }
     m_live[m_slot_count].m_light = light;
     return m_slot_count++;
 }
@@ -52,17 +47,15 @@ void LightStore::addDeletedUpTo(int count) {
 }
 
 bool LightStore::remove(int index) {
-    auto removed = m_live.extract(index);
-    if (removed.empty())
-        return false;
-    m_spare = std::move(removed); // a sun study puts another one in its place in each frame
-    return true;
+    return m_live.erase(index) > 0;
 }
 
-void LightStore::addShiningLights(std::vector<KM_Light>& lights, int but) const {
+std::vector<KM_Light> LightStore::shiningLights(int but) const {
+    std::vector<KM_Light> lights;
     for (const auto& [index, slot] : m_live)
         if (index != but && slot.Light().IsEnabled())
             lights.push_back(slot.Light());
+    return lights;
 }
 
 } // namespace quarn

@@ -40,14 +40,8 @@ public:
     const std::map<int, CQuarnLight>& live() const { return m_live; }
 
     /// The lights that are there and switched on.
-    std::vector<KM_Light> shiningLights(int but = -1) const {
-        std::vector<KM_Light> lights;
-        addShiningLights(lights, but);
-        return lights;
-    }
-    /// Adds the lights that are there and switched on to `lights`.
     /// @param but  index of one that is left out; an index without a slot leaves out none
-    void addShiningLights(std::vector<KM_Light>& lights, int but = -1) const;
+    std::vector<KM_Light> shiningLights(int but = -1) const;
 
     /// From now on every call of a plug-in is a breach.
     void close() { m_is_open = false; }
@@ -58,7 +52,6 @@ public:
 
 private:
     std::map<int, CQuarnLight> m_live;
-    std::map<int, CQuarnLight>::node_type m_spare; ///< of the last light that was removed
     int m_slot_count = 0;
     CQuarnLight m_no_light = deletedLight();
     CQuarnLightTable m_face;

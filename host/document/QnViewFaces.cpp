@@ -110,11 +110,8 @@ CDisplayPipelineAttributes* CQuarnDisplayPipeline::CurrentDisplayAttributes() {
 
 bool CQuarnDisplayPipeline::DrawToDib(CQuarnDib& dib, int width, int height,
                                       const CDisplayPipelineAttributes& attributes) {
-    if (!mayCallView(*m_view, "CQuarnDisplayPipeline::DrawToDib"))
-        return false;
-    if (quarn::DocumentList* const list = quarn::DocumentList::current())
-        list->giveStorageTo(dib.Image());
-    return m_view->draw(dib.Image(), width, height, attributes);
+    return mayCallView(*m_view, "CQuarnDisplayPipeline::DrawToDib") &&
+           m_view->draw(dib.Image(), width, height, attributes);
 }
 
 bool CQuarnDisplayPipeline::CopyToFrameBuffer(const CQuarnDib& dib) {

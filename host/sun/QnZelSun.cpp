@@ -1,7 +1,6 @@
 #include "sdk/zel/QnZelSun.h"
 
 #include "host/sun/CalendarDay.h"
-#include "host/sun/EarthRotationDelay.h"
 #include "host/sun/SunPosition.h"
 
 #include <cmath>
@@ -17,11 +16,6 @@ constexpr double EPOCH_JULIAN_DAY = 2440587.5;
 /// Also refuses what is not a number.
 bool isWithin(double value, double limit) {
     return std::abs(value) <= limit;
-}
-
-/// With its fraction; 1 January 2000 is 2000.
-double yearOf(double julian_day) {
-    return 2000 + (julian_day - 2451544.5) / 365.2425;
 }
 
 } // namespace
@@ -75,8 +69,7 @@ void CQnZelSun::Find() const {
     const double julian_day = EPOCH_JULIAN_DAY + day->time_since_epoch().count();
     const double fraction = (m_hours - m_zone_hours) / 24;
     const quarn::SunPosition position =
-        quarn::sunPosition({m_latitude_deg, m_longitude_deg}, julian_day, fraction,
-                           quarn::earthRotationDelay_s(yearOf(julian_day + fraction)));
+        quarn::sunPosition({m_latitude_deg, m_longitude_deg}, julian_day, fraction);
     m_azimuth_deg = position.azimuth_deg;
     m_altitude_deg = position.altitude_deg;
 }

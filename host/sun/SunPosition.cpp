@@ -6,6 +6,12 @@
 namespace quarn {
 namespace {
 
+/// How far the even time of the planets' motions is ahead of the time by the earth's rotation:
+/// terrestrial time minus universal time (delta T), as it is in the 2020s. It was 14 seconds in
+/// 1800 and is expected to be some 440 in 2199 (F. Espenak and J. Meeus, Five Millennium Canon of
+/// Solar Eclipses, NASA/TP-2006-214141): the sun then stands a quarter of an arc-minute elsewhere.
+constexpr double earth_rotation_delay_s = 69.2;
+
 /// A moment of terrestrial time, in two parts so that no digits are lost.
 struct Moment {
     double day;
@@ -57,8 +63,8 @@ void naturalDirection(const Earth& earth, const eraASTROM& sky, double (&directi
 
 } // namespace
 
-SunPosition sunPosition(const SunSite& site, double ut_day, double ut_fraction, double delay_s) {
-    const Moment moment{ut_day, ut_fraction + delay_s / ERFA_DAYSEC};
+SunPosition sunPosition(const SunSite& site, double ut_day, double ut_fraction) {
+    const Moment moment{ut_day, ut_fraction + earth_rotation_delay_s / ERFA_DAYSEC};
     Earth earth(moment);
     eraASTROM sky = skyOf(site, moment, earth, eraEra00(ut_day, ut_fraction));
 

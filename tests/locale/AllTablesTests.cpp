@@ -107,12 +107,5 @@ TEST(AllTables, KeepTheFormOfTheEnglishTexts) {
     });
 }
 
-TEST(AllTables, AreWrittenAsTheirLanguagesAre) {
-    forEveryTranslation([](const Table& table, const Translation& text, const TextKey& key) {
-        for (const std::string& fault : faultsOfWriting(text))
-            ADD_FAILURE() << placeOf(table, key) << ": " << fault << ": \"" << text.local << "\"";
-    });
-}
-
 } // namespace
 } // namespace locale_rules

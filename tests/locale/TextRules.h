@@ -20,10 +20,6 @@ struct Translation {
 /// @return what is wrong, in words; empty where nothing is
 std::vector<std::string> faultsOfForm(const Translation& text);
 
-/// What a reader of the language would stumble over: broken characters, those of another script,
-/// other marks at the end, marks and brackets that are not the language's own.
-std::vector<std::string> faultsOfWriting(const Translation& text);
-
 /// The format codes of a text in their order: "%s", "%.2f", "%1"; "%%" is none.
 std::vector<std::string> formatCodes(const std::string& text);
 

@@ -5,7 +5,6 @@
 #include "kelmar/KM_Uuid.h"
 #include "kelmar/KM_wString.h"
 #include "sdk/qncore/QnCommand.h"
-#include "sdk/qncore/QnDib.h"
 
 class CQuarnDoc;
 class CQuarnView;
@@ -86,13 +85,6 @@ int PreviewAnimation(CQuarnDoc& doc, KM_3dmAnimationProperties& props, int frame
 /// @return false, whichever it was
 bool WaitAndCheckForEscapeKey(unsigned int milliseconds);
 
-/// What recording a frame needs and the next one can use again.
-struct FrameBuffers {
-    CQuarnDib picture;
-    KM_wString file_name;
-    KM_wString path;
-};
-
 /// Writes the frame that is set up now into the record's folder, which is made when needed, and
 /// appends its file name to the record's images: sequence name, frame number with at least three
 /// digits, dot, extension. Prints nothing.
@@ -101,11 +93,6 @@ struct FrameBuffers {
 /// @param view             drawn when the record does not ask for a renderer; may be null
 /// @return whether the frame was written
 bool RecordFrame(unsigned int docSerialNumber, KM_3dmAnimationProperties& props, CQuarnView* view);
-
-/// The same, for one of many frames.
-/// @param buffers  the same ones for all of them; what they hold does not matter
-bool RecordFrame(unsigned int docSerialNumber, KM_3dmAnimationProperties& props, CQuarnView* view,
-                 FrameBuffers& buffers);
 
 /// Writes the page that plays the record's images.
 ///

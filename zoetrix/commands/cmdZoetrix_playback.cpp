@@ -21,7 +21,6 @@ struct Playback {
     FrameRange frames;
     bool plays_all; ///< and puts the view back afterwards
     bool records;
-    FrameBuffers buffers;
 };
 
 int FailWith(const wchar_t* text, int id) {
@@ -63,8 +62,7 @@ template <class SetUp> void ShowFrames(Playback& playback, SetUp&& set_up) {
             set_up(*camera, *target);
         if (!playback.records)
             playback.view.Redraw();
-        else if (!RecordFrame(playback.doc.RuntimeSerialNumber(), props, &playback.view,
-                              playback.buffers))
+        else if (!RecordFrame(playback.doc.RuntimeSerialNumber(), props, &playback.view))
             return;
         WaitAndCheckForEscapeKey(1);
     }
@@ -132,7 +130,7 @@ int PreviewAnimation(CQuarnDoc& doc, KM_3dmAnimationProperties& props, int frame
     CleanExtention(extension);
     props.SetFileExtension(extension);
 
-    Playback playback{doc, props, *view, FramesToShow(props, frame), plays_all, record, {}};
+    Playback playback{doc, props, *view, FramesToShow(props, frame), plays_all, record};
     if (IsSunStudy(props))
         ShowSunStudy(playback);
     else

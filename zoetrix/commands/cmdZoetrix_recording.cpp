@@ -4,26 +4,13 @@
 #include "sdk/qncore/QnView.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 
-#include <cwchar>
-#include <iterator>
-
 namespace {
 
 constexpr int capture_antialiasing = 2;
 
-void SetFrameFileName(const KM_3dmAnimationProperties& props, KM_wString& name) {
-    wchar_t number_and_dot[16];
-    std::swprintf(number_and_dot, std::size(number_and_dot), L"%03d.", props.CurrentFrame());
-    name = props.HtmlFilename();
-    name += number_and_dot;
-    name += props.FileExtension();
-}
-
-void SetFramePath(const KM_3dmAnimationProperties& props, const KM_wString& name,
-                  KM_wString& path) {
-    path = props.FolderName();
-    path += L'/';
-    path += name;
+KM_wString FrameFileName(const KM_3dmAnimationProperties& props) {
+    return props.HtmlFilename() + KM_wString::FormatToString(L"%03d.", props.CurrentFrame()) +
+           props.FileExtension();
 }
 
 /// Renders the frame by a command of the host and writes what it rendered.
@@ -45,7 +32,7 @@ bool RenderFrame(unsigned int document, const wchar_t* render_script, const KM_w
 }
 
 /// Draws the view as it is shown, finely sampled, and writes that picture.
-bool CaptureView(CQuarnView* view, CQuarnDib& picture, const KM_wString& path) {
+bool CaptureView(CQuarnView* view, const KM_wString& path) {
     CQuarnDisplayPipeline* pipeline = view ? view->ActiveViewport().DisplayPipeline() : nullptr;
     CDisplayPipelineAttributes* attributes =
         pipeline ? pipeline->CurrentDisplayAttributes() : nullptr;
@@ -53,6 +40,7 @@ bool CaptureView(CQuarnView* view, CQuarnDib& picture, const KM_wString& path) {
         return false;
 
     attributes->m_antialiasing_level = capture_antialiasing;
+    CQuarnDib picture;
     if (!pipeline->DrawToDib(picture, pipeline->FrameWidth(), pipeline->FrameHeight(), *attributes))
         return false;
     // The scene is drawn once: what is recorded is also what is seen.
@@ -62,30 +50,23 @@ bool CaptureView(CQuarnView* view, CQuarnDib& picture, const KM_wString& path) {
 }
 
 bool CaptureFrame(unsigned int document, const KM_3dmAnimationProperties& props, CQuarnView* view,
-                  FrameBuffers& buffers) {
+                  const KM_wString& path) {
     if (props.RenderFull())
-        return RenderFrame(document, L"_Render", buffers.path, view);
+        return RenderFrame(document, L"_Render", path, view);
     if (props.RenderPreview())
-        return RenderFrame(document, L"_RenderPreview", buffers.path, view);
-    return CaptureView(view, buffers.picture, buffers.path);
+        return RenderFrame(document, L"_RenderPreview", path, view);
+    return CaptureView(view, path);
 }
 
 } // namespace
 
 bool RecordFrame(unsigned int docSerialNumber, KM_3dmAnimationProperties& props, CQuarnView* view) {
-    FrameBuffers buffers;
-    return RecordFrame(docSerialNumber, props, view, buffers);
-}
-
-bool RecordFrame(unsigned int docSerialNumber, KM_3dmAnimationProperties& props, CQuarnView* view,
-                 FrameBuffers& buffers) {
-    SetFrameFileName(props, buffers.file_name);
-    if (!StaysInsideFolder(buffers.file_name) ||
-        !CQuarnFileUtilities::CreateDir(props.FolderName()))
+    const KM_wString file_name = FrameFileName(props);
+    if (!StaysInsideFolder(file_name) || !CQuarnFileUtilities::CreateDir(props.FolderName()))
         return false;
-    SetFramePath(props, buffers.file_name, buffers.path);
-    if (!CaptureFrame(docSerialNumber, props, view, buffers))
+    const KM_wString path = props.FolderName() + L"/" + file_name;
+    if (!CaptureFrame(docSerialNumber, props, view, path))
         return false;
-    props.Images().Append(buffers.file_name);
+    props.Images().Append(file_name);
     return true;
 }

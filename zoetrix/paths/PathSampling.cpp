@@ -1,10 +1,8 @@
 #include "zoetrix/plugin/ZoetrixUtilities.h"
 
-#include <array>
 #include <cmath>
 #include <cstdint>
 #include <new>
-#include <span>
 #include <stdexcept>
 
 namespace {
@@ -41,22 +39,15 @@ ParameterSteps DivideDomain(const KM_Curve& curve, int frame_count, bool look_ah
 }
 
 void AppendPoints(const KM_Curve& curve, const ParameterSteps& steps, KM_3dPointArray& points) {
-    std::array<double, 256> parameters;
-    std::array<KM_3dPoint, parameters.size()> block;
-    for (std::int64_t next = steps.first; next < steps.last;) {
-        std::size_t count = 0;
-        while (count < parameters.size() && next < steps.last)
-            parameters[count++] = steps.ParameterAt(next++);
-        curve.PointsAt(std::span(parameters).first(count), block.data());
-        for (const KM_3dPoint& point : std::span(block).first(count)) {
-            if (!point.IsValid())
-                continue;
-            // All at once, so that a count that memory cannot hold is refused at the first point;
-            // but a curve that yields no point asks for no memory.
-            if (points.IsEmpty())
-                points.Reserve(static_cast<int>(steps.last - steps.first));
-            points.Append(point);
-        }
+    for (std::int64_t i = steps.first; i < steps.last; ++i) {
+        const KM_3dPoint point = curve.PointAt(steps.ParameterAt(i));
+        if (!point.IsValid())
+            continue;
+        // All at once, so that a count that memory cannot hold is refused at the first point; but
+        // a curve that yields no point asks for no memory.
+        if (points.IsEmpty())
+            points.Reserve(static_cast<int>(steps.last - steps.first));
+        points.Append(point);
     }
 }
 

@@ -17,13 +17,12 @@ public:
         m_pixels.assign(static_cast<std::size_t>(width * height), 0xFFFFFFFFU);
     }
     void draw(const std::vector<ScreenSegment>& segments, float line_width, float opacity = 1.0F) {
-        PictureScratch scratch;
         LineBatch batch;
-        batch.reset({{0, 0, 0, 255}, opacity, line_width}, scratch);
+        batch.reset({{0, 0, 0, 255}, opacity, line_width});
         for (const ScreenSegment& s : segments)
             batch.add(s);
         batch.sortIntoBands(m_height);
-        drawLines({&batch, 1}, {m_pixels.data(), m_width, m_height, nullptr}, scratch);
+        drawLines({&batch, 1}, {m_pixels.data(), m_width, m_height, nullptr});
     }
     /// How much of a pixel is covered, from 0 to 1.
     double cover(int x, int y) const {

@@ -162,25 +162,9 @@ TEST(ImageFile, FolderOfThatNameIsNotReplaced) {
 
 TEST(ImageFile, PictureThatDoesNotFitItsPixelsIsRefused) {
     const std::vector<std::uint8_t> few(12);
-    ImageEncoder encoder;
-    EXPECT_FALSE(encoder.encode(ImageView(2, 2, few), ImageFormat::png).ok());
-    EXPECT_FALSE(encoder.encode(ImageView(0, 0, {}), ImageFormat::jpeg).ok());
-    EXPECT_FALSE(encoder.encode(ImageView(-1, -3, few), ImageFormat::bmp).ok());
-}
-
-TEST(ImageFile, EncoderGivesTheSameBytesForTheSamePictureAgain) {
-    ImageEncoder encoder;
-    for (const ImageFormat format :
-         {ImageFormat::jpeg, ImageFormat::png, ImageFormat::bmp, ImageFormat::tga}) {
-        const auto first = encoder.encode(ramp(50, 40), format);
-        ASSERT_TRUE(first.ok());
-        const std::vector<std::byte> kept(first.value().begin(), first.value().end());
-        ASSERT_TRUE(encoder.encode(ramp(90, 90), format).ok());
-        const auto second = encoder.encode(ramp(50, 40), format);
-        ASSERT_TRUE(second.ok());
-        EXPECT_TRUE(
-            std::equal(kept.begin(), kept.end(), second.value().begin(), second.value().end()));
-    }
+    EXPECT_FALSE(encodeImage(ImageView(2, 2, few), ImageFormat::png).ok());
+    EXPECT_FALSE(encodeImage(ImageView(0, 0, {}), ImageFormat::jpeg).ok());
+    EXPECT_FALSE(encodeImage(ImageView(-1, -3, few), ImageFormat::bmp).ok());
 }
 
 /// Lets no file grow past a size while it lives, as a full disk would.
