@@ -8,6 +8,8 @@
 #include <utility>
 #include <vector>
 
+class IQnZoetrixDynamicAccess;
+
 namespace quarn {
 
 class FrontEnd;
@@ -72,7 +74,8 @@ public:
     void giveStorageTo(Image& picture);
 
     /// Keeps a copy of the animation record as it is now: the one that a new document starts with.
-    /// Called once after a plug-in that keeps a record was loaded.
+    /// Called after every load of a plug-in; does nothing unless the record is another object's
+    /// than at the last call.
     void rememberFreshRecord();
 
 private:
@@ -89,6 +92,7 @@ private:
     std::unique_ptr<ImageEncoder> m_image_encoder;
     std::vector<std::uint8_t> m_picture_storage;
     std::unique_ptr<KM_3dmAnimationProperties> m_fresh_record;
+    const IQnZoetrixDynamicAccess* m_fresh_record_access = nullptr; ///< whose it is; never called
 };
 
 } // namespace quarn
