@@ -1,6 +1,6 @@
 #include "import/MaterialReading.h"
 
-#include "import/ColorSpace.h"
+#include "import/StoredColor.h"
 #include "import/OpacityMap.h"
 #include "import/TextureDecoding.h"
 

@@ -1,6 +1,6 @@
 #include "import/MeshConversion.h"
 
-#include "import/ColorSpace.h"
+#include "import/StoredColor.h"
 #include "import/IndexTable.h"
 #include "import/VertexNormals.h"
 

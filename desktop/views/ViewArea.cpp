@@ -49,7 +49,7 @@ void ViewArea::showPicture(CQuarnView& view, const ShownPicture& picture) {
         return;
     const QString name = qtText(view.MainViewport().Name());
     if (m_context.session.isCommandRunning() && !m_drawing.isDrawing())
-        m_shown_by_command.append(name);
+        m_shown_by_command.insert(name, lookOf(view));
     if (ViewWidget* const shown = widget(name))
         shown->setPicture(picture);
 }
@@ -64,9 +64,17 @@ void ViewArea::commandEnded() {
     noteFrameSizes();
     refresh();
     m_drawing.wantAll();
-    for (const QString& name : std::as_const(m_shown_by_command))
-        m_drawing.forget(name);
+    for (auto [name, look] : m_shown_by_command.asKeyValueRange()) {
+        const CQuarnView* const view = findView(m_context.session.document(), name);
+        if (view && lookOf(*view) == look)
+            m_drawing.forget(name);
+    }
     fitFrames();
+}
+
+ViewArea::Look ViewArea::lookOf(const CQuarnView& view) {
+    const CDisplayPipelineAttributes* const mode = view.DisplayAttributes();
+    return {view.MainViewport().VP(), mode ? mode->Id() : KM_nil_uuid};
 }
 
 void ViewArea::refresh() {

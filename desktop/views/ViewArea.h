@@ -47,7 +47,7 @@ public slots:
     /// of its pictures.
     void commandStarted(const QString& line);
     /// A command has ended: shows the views that there are now, and draws those whose picture the
-    /// command did not show itself.
+    /// command did not show itself, or whose camera or display mode it changed after that.
     void commandEnded();
     /// Gives one view all the room, or, where it has it, shows all of them.
     void toggleMaximized(const QString& view_name);
@@ -72,7 +72,14 @@ private:
     QList<ViewWidget*> m_widgets; ///< in the order of the document's views
     unsigned m_document_number = 0;
     QMap<QString, QSize> m_given_sizes; ///< of frames, by the name of the view
-    QStringList m_shown_by_command;
+    /// What a picture of a view shows it with.
+    struct Look {
+        KM_Viewport camera;
+        KM_UUID display_mode;
+        friend bool operator==(const Look&, const Look&) = default;
+    };
+    static Look lookOf(const CQuarnView& view);
+    QMap<QString, Look> m_shown_by_command; ///< last, by the name of the view
     RecordedSize m_recorded_size;
 };
 

@@ -77,7 +77,30 @@ void Application::addHostCommands(std::vector<std::unique_ptr<CQuarnCommand>> co
 }
 
 void Application::print(std::wstring_view text) {
-    m_front_end.print(text);
+    if (m_withheld_text)
+        m_withheld_text->m_text += text;
+    else
+        m_front_end.print(text);
+}
+
+Application::WithheldText::WithheldText(Application& application)
+    : m_application(application), m_outer(application.m_withheld_text) {
+    m_application.m_withheld_text = this;
+}
+
+Application::WithheldText::~WithheldText() {
+    end();
+}
+
+void Application::WithheldText::show() {
+    end();
+    if (!m_text.empty())
+        m_application.print(m_text);
+}
+
+void Application::WithheldText::end() {
+    if (std::exchange(m_is_keeping, false))
+        m_application.m_withheld_text = m_outer;
 }
 
 void Application::tell(std::string_view message) {

@@ -49,8 +49,9 @@ public:
     DocumentList& documents() { return *m_documents; }
     PlugInLoader& plugIns() { return *m_plug_ins; }
 
-    /// Shows text on the command line as it stands.
+    /// Shows text on the command line as it stands; while text is withheld, keeps it.
     void print(std::wstring_view text);
+    class WithheldText;
     /// Shows a message of the host (UTF-8) as a line of its own.
     void tell(std::string_view message);
 
@@ -83,6 +84,29 @@ private:
     std::map<HWND, std::unique_ptr<CWnd>> m_windows;
     const CDialog* m_open_dialog = nullptr;
     bool m_exit_requested = false;
+    WithheldText* m_withheld_text = nullptr; ///< null while text is shown at once
+};
+
+/// Keeps what is printed while it lives. Scopes nest like blocks.
+class Application::WithheldText {
+public:
+    explicit WithheldText(Application& application);
+    /// What was not shown by then is dropped.
+    ~WithheldText();
+    WithheldText(const WithheldText&) = delete;
+    WithheldText& operator=(const WithheldText&) = delete;
+
+    /// Prints what was kept, and keeps no more.
+    void show();
+
+private:
+    friend class Application;
+    void end();
+
+    Application& m_application;
+    WithheldText* m_outer;
+    std::wstring m_text;
+    bool m_is_keeping = true;
 };
 
 } // namespace quarn

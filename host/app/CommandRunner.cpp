@@ -4,6 +4,9 @@
 #include "ground/TextLines.h"
 #include "host/app/Application.h"
 #include "host/border/Border.h"
+#include "ground/PathText.h"
+#include "ground/TextLines.h"
+#include "host/sun/MissingSun.h"
 
 namespace quarn {
 
@@ -65,10 +68,14 @@ CQuarnCommand::result CommandRunner::start(std::wstring_view line, const Command
     }
     RunningCommand running{found->command, found->english_name, origin.place, std::move(read.words),
                            origin.typed};
+    if (m_running.empty())
+        (void)takeMissingSun(); // of what was computed before
     const CQuarnCommand::result result =
         execute(running, origin, origin.interactive && !read.without_dialogs);
     if (result == CQuarnCommand::success)
         tellUnusedWords(running);
+    if (m_running.empty())
+        tellMissingSun(running);
     if (m_running.empty())
         m_application.documents().commandEnded();
     return result;
@@ -96,6 +103,12 @@ void CommandRunner::tellUnusedWords(const RunningCommand& running) {
     for (const CommandWord& word : running.words)
         words += L' ' + word.text;
     m_application.tell(utf8(running.label() + L" did not use:" + words));
+}
+
+/// A study asks for many suns; one line says why they are not there.
+void CommandRunner::tellMissingSun(const RunningCommand& running) {
+    if (const std::optional<KM_wString> why = takeMissingSun())
+        m_application.print(running.label() + L": " + std::wstring(why->View()));
 }
 
 bool CommandRunner::runFile(const std::filesystem::path& file) {

@@ -67,6 +67,7 @@ private:
     CQuarnCommand::result execute(RunningCommand& running, const CommandOrigin& origin,
                                   bool interactive);
     void tellUnusedWords(const RunningCommand& running);
+    void tellMissingSun(const RunningCommand& running);
     bool runLines(const std::vector<std::wstring>& lines, const std::wstring& file_name);
 
     Application& m_application;

@@ -116,7 +116,13 @@ PlugInLoad PlugInLoader::load(const Request& request) {
         return {Outcome::loaded_before, {}};
     if (LibraryFile::isOpen(whole_path))
         return refused(whole_path, "the program has this file open already");
-    return open(Request{whole_path, request.ignore_disabled, request.wanted_id});
+    IQnZoetrixDynamicAccess* const access_before = Zoetrix_QuarnDynamicAccess();
+    PlugInLoad opened = open(Request{whole_path, request.ignore_disabled, request.wanted_id});
+    // The objects of a refused file are gone now. One that removes its dynamic access as it goes
+    // removes whichever is installed.
+    if (!opened.ok())
+        Zoetrix_SetQuarnDynamicAccess(access_before);
+    return opened;
 }
 
 PlugInLoad PlugInLoader::open(const Request& request) {

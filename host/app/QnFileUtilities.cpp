@@ -3,6 +3,10 @@
 #include "ground/PathText.h"
 #include "host/app/Application.h"
 #include "host/app/DocumentsFolder.h"
+#include "ground/PathText.h"
+#include "sdk/qncore/QnLocalize.h"
+
+#include <sys/stat.h>
 
 namespace {
 
@@ -10,6 +14,18 @@ std::string withoutSeparatorAtEnd(std::string path) {
     while (path.size() > 1 && path.back() == '/')
         path.pop_back();
     return path;
+}
+
+void tellFolderNotMade(const std::filesystem::path& folder, const std::error_code& error) {
+    quarn::Application* const application = quarn::Application::current();
+    if (!application || !quarn::isMainThread())
+        return;
+    const KM_wString name = quarn::textFromPath(folder);
+    const KM_wString reason = KM_wString::FromUtf8(error.message());
+    application->print(
+        KM_wString::FormatToString(QnLocalizeString(L"The folder %s cannot be made: %s\n", 42111),
+                                   name.Array(), reason.Array())
+            .View());
 }
 
 } // namespace
@@ -34,7 +50,10 @@ bool CQuarnFileUtilities::CreateDir(const wchar_t* path) {
     if (!path || !*path)
         return false;
     const std::filesystem::path folder = quarn::pathFromText(path);
-    std::error_code error;
-    std::filesystem::create_directories(folder, error);
-    return std::filesystem::is_directory(folder, error);
+    std::error_code why;
+    std::filesystem::create_directories(folder, why);
+    if (std::error_code unused; std::filesystem::is_directory(folder, unused))
+        return true;
+    tellFolderNotMade(folder, why);
+    return false;
 }

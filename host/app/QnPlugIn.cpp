@@ -75,7 +75,11 @@ int CQuarnPlugIn::LoadPlugIn(const KM_UUID& id, bool quietly, bool ignore_disabl
     quarn::Application* application = quarn::Application::forCall("CQuarnPlugIn::LoadPlugIn");
     if (!application)
         return codeOf(Outcome::unknown_id);
+    quarn::Application::WithheldText text(*application);
     const quarn::PlugInLoad load = application->plugIns().loadById(id, ignore_disabled);
+    // What a plug-in prints before it refuses is a reason too.
+    if (load.ok() || !quietly)
+        text.show();
     if (!load.ok() && !quietly)
         application->tell(load.message);
     return codeOf(load.outcome);

@@ -1,5 +1,6 @@
 #include "sdk/qncore/QnTextFile.h"
 
+#include "host/app/Application.h"
 #include "ground/AtomicFile.h"
 #include "ground/PathText.h"
 #include "ground/TextEncoding.h"
@@ -23,6 +24,12 @@ bool canBeWritten(const std::filesystem::path& path) {
     const std::filesystem::path folder = parent.empty() ? "." : parent;
     return !path.filename().empty() && !std::filesystem::is_directory(path, error) &&
            std::filesystem::is_directory(folder, error) && access(folder.c_str(), W_OK) == 0;
+}
+
+void tell(const std::string& message) {
+    quarn::Application* const application = quarn::Application::current();
+    if (application && quarn::isMainThread())
+        application->tell(message);
 }
 
 } // namespace
@@ -56,5 +63,9 @@ bool CQnTextFile::Close() {
     const State closing = std::exchange(*m_state, {});
     const auto encoding = static_cast<quarn::TextEncoding>(closing.type);
     const std::string bytes = quarn::encodeTextFile(closing.text, encoding);
-    return quarn::writeFileAtomically(*closing.path, std::as_bytes(std::span(bytes))).ok();
+    const quarn::Result<void> written =
+        quarn::writeFileAtomically(*closing.path, std::as_bytes(std::span(bytes)));
+    if (!written)
+        tell(written.message());
+    return written.ok();
 }

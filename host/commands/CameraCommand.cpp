@@ -33,7 +33,7 @@ public:
             if (answer == CQuarnGet::nothing)
                 return CQuarnCommand::success;
             if (answer == CQuarnGet::string)
-                return failForWord(m_get.String(), "Location, Target, Lens, Parallel or _Enter");
+                return CQuarnCommand::failure;
             if (answer != CQuarnGet::option)
                 return m_get.CommandResult();
             const CQuarnCommand::result asked = askPart(m_get.Option()->m_option_index);

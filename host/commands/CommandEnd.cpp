@@ -9,8 +9,4 @@ CQuarnCommand::result fail(std::string_view message) {
     return CQuarnCommand::failure;
 }
 
-CQuarnCommand::result failForWord(const wchar_t* word, const char* expected) {
-    return fail("\"" + KM_wString(word).ToUtf8() + "\" is no option here. Give " + expected + ".");
-}
-
 } // namespace quarn

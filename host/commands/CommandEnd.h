@@ -11,9 +11,4 @@ namespace quarn {
 /// @return failure
 CQuarnCommand::result fail(std::string_view message);
 
-/// Tells that a word is none of a prompt's options.
-/// @param expected  the options, as the end of the sentence "Give ..."
-/// @return failure
-CQuarnCommand::result failForWord(const wchar_t* word, const char* expected);
-
 } // namespace quarn

@@ -33,7 +33,7 @@ CQuarnCommand::result runDisplayEdges(const CQuarnCommandContext& context) {
     if (answer == CQuarnGet::nothing)
         return CQuarnCommand::success;
     if (answer == CQuarnGet::string)
-        return failForWord(get.String(), "Standard, None, Features or All");
+        return CQuarnCommand::failure;
     if (answer != CQuarnGet::option)
         return get.CommandResult();
     document.setEdgesOf(mode->Id(), static_cast<MeshEdgeChoice>(get.Option()->m_option_index - 1));

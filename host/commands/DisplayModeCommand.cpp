@@ -34,6 +34,7 @@ CQuarnCommand::result runDisplayMode(const CQuarnCommandContext& context) {
     const DisplayModeList& list = DisplayModeList::instance();
     CQuarnGetOption get;
     get.SetCommandPrompt(QnLocalizeString(L"Display mode", 42030));
+    get.AcceptString();
     if (view.displayMode())
         get.SetDefaultString(view.displayMode()->LocalName());
     addModes(get);

@@ -53,7 +53,7 @@ CQuarnCommand::result runFitView(const CQuarnCommandContext& context) {
         if (answer == CQuarnGet::nothing)
             return fitActiveView(Document::of(context.Document()), fit);
         if (answer == CQuarnGet::string)
-            return failForWord(get.String(), "Turn, KeepTarget, Distance or _Enter");
+            return CQuarnCommand::failure;
         if (answer != CQuarnGet::option)
             return get.CommandResult();
         if (get.Option()->m_option_index != distance)

@@ -1,6 +1,5 @@
 #include "host/app/Application.h"
 #include "host/commands/AnimationText.h"
-#include "host/commands/CommandEnd.h"
 #include "host/commands/FollowableText.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/PointText.h"
@@ -122,7 +121,7 @@ CQuarnCommand::result askWish(ListWish& wish) {
     const int curves = get.AddCommandOption(QnLocalizeCommandOptionName(L"Curves", 42106));
     const CQuarnGet::result answer = get.GetOption();
     if (answer == CQuarnGet::string)
-        return failForWord(get.String(), "Objects, Ids or Curves");
+        return CQuarnCommand::failure;
     if (answer != CQuarnGet::option)
         return get.CommandResult();
     const int picked = get.Option()->m_option_index;

@@ -4,6 +4,7 @@
 #include "host/app/Application.h"
 #include "host/app/DocumentSaving.h"
 #include "host/commands/CommandEnd.h"
+#include "host/commands/FileNameQuestion.h"
 #include "host/document/DocumentList.h"
 #include "host/document/ViewFit.h"
 #include "host/document/file/DocumentExtension.h"
@@ -91,7 +92,7 @@ CQuarnCommand::result askUpAxis(UpAxis& up) {
     get.AddCommandOption(QnLocalizeCommandOptionName(L"Z", 0));
     const CQuarnGet::result answer = get.GetOption();
     if (answer == CQuarnGet::string)
-        return failForWord(get.String(), "ByFormat, Y or Z");
+        return CQuarnCommand::failure;
     if (answer != CQuarnGet::option)
         return get.CommandResult();
     const int picked = get.Option()->m_option_index;
@@ -101,7 +102,7 @@ CQuarnCommand::result askUpAxis(UpAxis& up) {
 
 /// Asks for the file and, where the option is picked, for the axis that points up in it.
 CQuarnCommand::result askFile(std::filesystem::path& file, UpAxis& up) {
-    CQuarnGetString get;
+    FileNameQuestion get;
     get.SetCommandPrompt(QnLocalizeString(L"Model or document file", 42050));
     get.AddCommandOption(QnLocalizeCommandOptionName(L"Up", 42051));
     CQuarnGet::result answer = get.GetString();

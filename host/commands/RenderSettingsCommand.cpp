@@ -1,4 +1,3 @@
-#include "host/commands/CommandEnd.h"
 #include "host/commands/FormAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/PictureSizePrompt.h"
@@ -22,7 +21,7 @@ public:
             if (answer == CQuarnGet::nothing)
                 return CQuarnCommand::success;
             if (answer == CQuarnGet::string)
-                return failForWord(m_get.String(), "Size, Samples or PreviewSamples");
+                return CQuarnCommand::failure;
             if (answer != CQuarnGet::option)
                 return m_get.CommandResult();
             const CQuarnCommand::result asked = askPart(m_get.Option()->m_option_index);

@@ -3,6 +3,7 @@
 #include "host/app/DocumentSaving.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileAsking.h"
+#include "host/commands/FileNameQuestion.h"
 #include "host/commands/HostCommands.h"
 #include "host/document/Document.h"
 #include "host/document/file/DocumentExtension.h"
@@ -69,7 +70,7 @@ void setFile(SaveTarget& target, const std::filesystem::path& file) {
 SaveTarget promptForTarget(const std::filesystem::path& offered) {
     SaveTarget target;
     for (;;) {
-        CQuarnGetString get;
+        FileNameQuestion get;
         const CQuarnGet::result answer = askFile(get, offered, target.version);
         target.result =
             answer == CQuarnGet::option ? askVersion(target.version) : get.CommandResult();

@@ -25,6 +25,7 @@ CQuarnCommand::result runStandardView(const CQuarnCommandContext& context) {
     ViewState& view = document.activeView();
     CQuarnGetOption get;
     get.SetCommandPrompt(QnLocalizeString(L"View direction", 42060));
+    get.AcceptString();
     for (const StandardView& standard : standardViews())
         get.AddCommandOption(QnLocalizeCommandOptionName(standard.name, standard.text_id));
     const CQuarnGet::result answer = get.GetOption();
@@ -37,8 +38,9 @@ CQuarnCommand::result runStandardView(const CQuarnCommandContext& context) {
         return get.CommandResult();
     const NamedView* named = findNamedView(document, get.String());
     if (!named)
-        return failForWord(get.String(),
-                           "Top, Front, Right, Perspective or the name of a camera of the model");
+        return fail("\"" + KM_wString(get.String()).ToUtf8() +
+                    "\" is no option here. Give Top, Front, Right, Perspective or the name of a "
+                    "camera of the model.");
     view.setViewport(named->viewport, true, true);
     return CQuarnCommand::success;
 }

@@ -145,7 +145,7 @@ CQuarnCommand::result askAndMove(DocumentSun& sun) {
     if (answer == CQuarnGet::nothing)
         return showSun(sun);
     if (answer == CQuarnGet::string)
-        return failForWord(get.String(), "On, Off, Direction, PlaceAndTime or _Enter");
+        return CQuarnCommand::failure;
     if (answer != CQuarnGet::option)
         return get.CommandResult();
     const int picked = get.Option()->m_option_index;

@@ -1,8 +1,6 @@
 #include "host/commands/SunPlacePrompt.h"
 
 #include "host/app/Application.h"
-#include "host/cities/CitySpelling.h"
-#include "host/commands/CommandEnd.h"
 #include "host/commands/NumberPrompt.h"
 #include "host/commands/WordsLeft.h"
 #include "host/prompt/NumberText.h"
@@ -139,7 +137,7 @@ private:
             if (answer == CQuarnGet::nothing)
                 return CQuarnCommand::success;
             if (answer == CQuarnGet::string)
-                return failForWord(get.String(), "TimeZone, NorthAngle or _Enter");
+                return CQuarnCommand::failure;
             if (answer != CQuarnGet::option)
                 return get.CommandResult();
             const CQuarnCommand::result asked =

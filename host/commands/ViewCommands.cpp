@@ -24,7 +24,7 @@ ViewStart askViewStart() {
     get.SetDefaultString(copy.m_local);
     const CQuarnGet::result answer = get.GetOption();
     if (answer == CQuarnGet::string)
-        return {failForWord(get.String(), "Copy, Top, Front, Right or Perspective")};
+        return {CQuarnCommand::failure};
     if (answer != CQuarnGet::option)
         return {get.CommandResult()};
     const int index = get.Option()->m_option_index;

@@ -81,8 +81,12 @@ Document* DocumentList::find(unsigned int serial_number) const {
 }
 
 void DocumentList::rememberFreshRecord() {
+    const IQnZoetrixDynamicAccess* const access = Zoetrix_QuarnDynamicAccess();
+    if (access == m_fresh_record_access)
+        return;
+    m_fresh_record_access = access;
     m_fresh_record.reset();
-    if (m_active && Zoetrix_QuarnDynamicAccess())
+    if (m_active && access)
         m_fresh_record = std::make_unique<KM_3dmAnimationProperties>(
             m_active->properties().AnimationProperties());
     if (m_active)

@@ -7,6 +7,8 @@
 #include <utility>
 #include <vector>
 
+class IQnZoetrixDynamicAccess;
+
 namespace quarn {
 
 class FrontEnd;
@@ -59,7 +61,8 @@ public:
     FrontEnd& frontEnd() const { return m_front_end; }
 
     /// Keeps a copy of the animation record as it is now: the one that a new document starts with.
-    /// Called once after a plug-in that keeps a record was loaded.
+    /// Called after every load of a plug-in; does nothing unless the record is another object's
+    /// than at the last call.
     void rememberFreshRecord();
 
 private:
@@ -74,6 +77,7 @@ private:
     ViewState* m_placed_view = nullptr; ///< by the command that runs; null: none
     std::string m_unsaved_picture;
     std::unique_ptr<KM_3dmAnimationProperties> m_fresh_record;
+    const IQnZoetrixDynamicAccess* m_fresh_record_access = nullptr; ///< whose it is; never called
 };
 
 } // namespace quarn

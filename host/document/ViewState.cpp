@@ -121,7 +121,10 @@ bool ViewState::copyToFrameBuffer(const Image& picture) {
 }
 
 void ViewState::redraw(unsigned int flags) {
-    if (!(flags & CQuarnView::show_frame_buffer) && m_mode)
+    const bool shows_what_is_there = flags & CQuarnView::show_frame_buffer;
+    if (!shows_what_is_there && m_document.frontEnd().isInterrupted())
+        return;
+    if (!shows_what_is_there && m_mode)
         render(*m_frame_buffer, m_frame_width, m_frame_height, m_current_attributes);
     ++m_show_count;
     if (m_frame_buffer->width > 0)

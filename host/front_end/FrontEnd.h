@@ -63,7 +63,7 @@ public:
     virtual void pumpEvents(unsigned milliseconds) = 0;
     /// Whether a key is down now.
     virtual bool isKeyDown(int virtual_key) = 0;
-    /// Whether the person asked the program to stop. Once true the host refuses further captures.
+    /// Whether the person asked the program to stop. While true the host draws nothing more.
     virtual bool isInterrupted() const = 0;
     /// The main window; null where there is none.
     virtual HWND mainWindow() = 0;

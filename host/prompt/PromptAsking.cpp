@@ -2,7 +2,9 @@
 
 #include "host/app/Application.h"
 #include "host/prompt/ObjectAnswer.h"
+#include "host/prompt/OptionPick.h"
 #include "host/prompt/PromptAnswer.h"
+#include "sdk/qncore/QnLocalize.h"
 
 namespace quarn {
 
@@ -61,13 +63,19 @@ KM_wString label(const RunningCommand& command) {
     return std::wstring_view(command.label());
 }
 
+/// "Clockwise, AntiClockwise"
+KM_wString optionNames(const PromptState& prompt) {
+    KM_wString names;
+    for (const PromptOption& option : prompt.options)
+        names += (names.IsEmpty() ? L"" : L", ") + option.name.m_local;
+    return names;
+}
+
 /// "SetTurntableAnimation needs an answer to "Direction" (Clockwise, AntiClockwise); none was
 /// given."
 void tellMissingAnswer(Application& application, const RunningCommand& command,
                        const PromptState& prompt) {
-    KM_wString choices;
-    for (const PromptOption& option : prompt.options)
-        choices += (choices.IsEmpty() ? L"" : L", ") + option.name.m_local;
+    KM_wString choices = optionNames(prompt);
     if (!choices.IsEmpty())
         choices = L" (" + choices + L")";
     const KM_wString message = label(command) + L" needs an answer to \"" + prompt.prompt + L"\"" +
@@ -85,6 +93,28 @@ void tellRefusal(Application& application, const RunningCommand& command, const 
                   L"\". " + message;
     }
     application.print(message.View());
+}
+
+/// Whether a word that was taken as text was meant as an option: every text of a question for an
+/// option, and one written as scripts write the English names of options of a question for text.
+bool isMistakenForOption(const PromptState& prompt, const Reply& reply) {
+    if (prompt.result != CQuarnGet::string || reply.answer.kind != Answer::Kind::text)
+        return false;
+    if (prompt.options.empty() || prompt.accepts_text || prompt.takes_points)
+        return false;
+    if (prompt.kind == Question::Kind::option)
+        return true;
+    const std::wstring_view word = reply.answer.text.View();
+    return !reply.literal && word.starts_with(L'_') &&
+           readOption(prompt, word).kind == OptionPick::Kind::none;
+}
+
+void tellNoOption(Application& application, const RunningCommand& command, const Reply& reply,
+                  const PromptState& prompt) {
+    const KM_wString message = KM_wString::FormatToString(
+        QnLocalizeString(L"\"%s\" is no option here. The options are %s.\n", 42110),
+        reply.answer.text.Array(), optionNames(prompt).Array());
+    application.print((reply.from_script ? label(command) + L": " + message : message).View());
 }
 
 CQuarnGet::result cancel(PromptState& prompt) {
@@ -116,6 +146,8 @@ CQuarnGet::result askQuestion(PromptState& prompt, const char* call) {
             return cancel(prompt);
         }
         const std::optional<KM_wString> request = takeAnswer(prompt, reply.answer, reply.literal);
+        if (!request && isMistakenForOption(prompt, reply))
+            tellNoOption(*application, *command, reply, prompt);
         if (!request)
             continue;
         tellRefusal(*application, *command, reply, prompt, *request);

@@ -47,6 +47,7 @@ struct PromptState {
     std::optional<KM_wString> default_answer;
     std::vector<PromptOption> options;
     bool takes_points = false;           ///< text is a point, written x,y,z
+    bool accepts_text = false;           ///< any text is as good an answer as an option
     double lower_limit = KM_UNSET_VALUE; ///< unset: none
     double upper_limit = KM_UNSET_VALUE; ///< unset: none
     ObjectPick objects;

@@ -80,6 +80,10 @@ CQuarnGetOption::CQuarnGetOption() {
 
 CQuarnGetOption::~CQuarnGetOption() = default;
 
+void CQuarnGetOption::AcceptString(bool accept) {
+    m_state->accepts_text = accept;
+}
+
 CQuarnGet::result CQuarnGetOption::GetOption() {
     return quarn::askQuestion(*m_state, "CQuarnGetOption::GetOption");
 }

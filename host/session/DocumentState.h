@@ -16,7 +16,7 @@ QNCORE_API std::filesystem::path documentFile(CQuarnDoc& document);
 /// when it was made, opened or saved. What was put back is no change: a curve that is hidden while
 /// an animation plays, a light that a sun study moves.
 ///
-/// These alone do not count, as nobody wants to be asked about them: cameras, which view is active,
+/// These alone do not count, so that nobody is asked to save them: cameras, which view is active,
 /// what is selected, which frame of the animation was shown last and that its view has the
 /// animation's display mode since, frame sizes that a window gives with setFrameSize. A new
 /// document, and one that a model file was opened as, is not modified; nor is one after SaveAs in

@@ -1,5 +1,7 @@
 #include "host/sun/ClockTime.h"
 
+#include "host/sun/MissingSun.h"
+#include "host/sun/SunYears.h"
 #include "sdk/zel/QnZelSun.h"
 
 #include <algorithm>
@@ -9,9 +11,6 @@
 
 namespace quarn {
 namespace {
-
-constexpr int FIRST_YEAR = 1800;
-constexpr int LAST_YEAR = 2199;
 
 Error errorFor(std::wstring_view text, const char* why) {
     return {"\"" + KM_wString(text).ToUtf8() + "\" " + why};
@@ -60,7 +59,7 @@ Result<COleDateTime> readDate(std::wstring_view text) {
     COleDateTime date;
     if (!date.SetDate(year, month, day))
         return errorFor(text, "is a date that the calendar does not have.");
-    if (year < FIRST_YEAR || year > LAST_YEAR)
+    if (!isSunYear(year))
         return errorFor(text, "is too far away: the sun is known for the years 1800 to 2199.");
     return date;
 }
@@ -100,7 +99,10 @@ std::optional<SunPosition> sunPositionAt(const SunSite& site, const ClockTime& c
     sun.SetLocalDateTime(clock.time.GetYear(), clock.time.GetMonth(), clock.time.GetDay(),
                          hours - (zone_hours - zone));
     const SunPosition position{sun.Azimuth(), sun.Altitude()};
-    return std::isfinite(position.altitude_deg) ? std::optional(position) : std::nullopt;
+    if (std::isfinite(position.altitude_deg))
+        return position;
+    (void)takeMissingSun(); // the caller knows what to tell, or only tries
+    return std::nullopt;
 }
 
 Result<WrittenTime> readDateTime(std::wstring_view text) {

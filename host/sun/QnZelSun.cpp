@@ -1,7 +1,9 @@
 #include "sdk/zel/QnZelSun.h"
 
 #include "host/sun/CalendarDay.h"
+#include "host/sun/MissingSun.h"
 #include "host/sun/SunPosition.h"
+#include "host/sun/SunYears.h"
 
 #include <cmath>
 #include <limits>
@@ -60,11 +62,12 @@ void CQnZelSun::Find() const {
     m_azimuth_deg = NOT_A_NUMBER;
     m_altitude_deg = NOT_A_NUMBER;
     const auto day = quarn::calendarDay(m_year, m_month, m_day);
-    const bool is_year = m_year >= 1800 && m_year <= 2199;
     const bool is_place = isWithin(m_latitude_deg, 90) && isWithin(m_longitude_deg, 360);
     const bool is_time = isWithin(m_zone_hours, 24) && isWithin(m_hours - 12, 12);
-    if (!day || !is_year || !is_place || !is_time)
+    if (!day || !quarn::isSunYear(m_year) || !is_place || !is_time) {
+        quarn::noteMissingSun({m_year, m_month, m_day, m_latitude_deg, m_longitude_deg});
         return;
+    }
 
     const double julian_day = EPOCH_JULIAN_DAY + day->time_since_epoch().count();
     const double fraction = (m_hours - m_zone_hours) / 24;

@@ -14,6 +14,7 @@ public:
     /// Whether a folder of this name exists. False for null and for a file.
     static bool DirExists(const wchar_t* path);
     /// Makes the folder, and those above it, where it does not exist.
-    /// @return true when the folder exists now; false when it cannot be made or the path is empty
+    /// @return true when it exists now; false, and the host tells why, when it cannot be made;
+    ///         false without a word when there is no path
     static bool CreateDir(const wchar_t* path);
 };

@@ -79,18 +79,23 @@ protected:
     std::unique_ptr<quarn::PromptState> m_state;
 };
 
-/// Asks for one of several options; any other word is handed on as text (`string`). A default that
-/// names an option picks it when Enter takes the default.
+/// Asks for one of several options; any other word is handed on as text (`string`), and told to be
+/// no option unless AcceptString was called. A default that names an option picks it when Enter
+/// takes the default.
 class QNCORE_API CQuarnGetOption : public CQuarnGet {
 public:
     CQuarnGetOption();
     ~CQuarnGetOption() override;
+    /// Whether the question takes text beside its options. Off in a new question.
+    void AcceptString(bool accept = true);
     result GetOption();
     /// The text that was typed; the default text after Enter.
     const wchar_t* String() const;
 };
 
 /// Asks for text. A word is always text; options are clicked, and written `[Name]` in a script.
+/// Where there are options, a word with "_" before it that names none of them is told to be none;
+/// in quotes it is not.
 class QNCORE_API CQuarnGetString : public CQuarnGet {
 public:
     CQuarnGetString();

@@ -76,7 +76,8 @@ public:
 
     /// Loads the plug-in with this id from the host's plug-in folders.
     ///
-    /// @param quietly      do not print why the load failed
+    /// @param quietly      do not print why the load failed, nor what the plug-in itself printed
+    ///                 meanwhile
     /// @param ignore_disabled  load it although it is marked as never to be loaded
     /// @return 0 when it was loaded now, 1 when it was loaded before, negative when it cannot be
     ///         loaded: -1 unknown id, -2 file missing or not a library, -3 exports missing,

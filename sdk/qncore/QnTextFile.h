@@ -16,20 +16,19 @@ public:
     enum class open_mode : int { write = 1 };
 
     CQnTextFile();
-    /// Closes the file; what could not be written is lost without a word. Call Close to know.
+    /// Closes the file. Call Close to know whether it could be written.
     ~CQnTextFile();
     CQnTextFile(const CQnTextFile&) = delete;
     CQnTextFile& operator=(const CQnTextFile&) = delete;
 
     /// @return false when the folder does not exist or cannot be written, the path is a folder, or
-    /// a
-    ///         file is open already
+    ///         a file is open already
     bool Open(const wchar_t* path, open_mode mode, filetype type);
     /// Adds text. @return false when no file is open
     bool WriteString(const wchar_t* text);
     /// Writes the file and puts it in its place.
-    /// @return false when no file was open, or when it cannot be written; what was at the path
-    ///         before is then untouched
+    /// @return false when no file was open, or when it cannot be written: the host tells why, and
+    ///         what was at the path before is untouched
     bool Close();
 
 private:

@@ -86,7 +86,7 @@ public:
     /// changes.
     const CDisplayPipelineAttributes* DisplayAttributes() const;
 
-    /// Draws or shows the view. @param flags  see redraw_flag
+    /// Draws or shows the view, see redraw_flag. Once a person asked to stop, nothing is drawn.
     void Redraw(unsigned int flags = draw_scene);
 
 private:

@@ -14,7 +14,8 @@
 /// taken to show universal time UT1 plus the zone; civil clocks keep within 0.9 seconds of that,
 /// during which the sun turns by at most 0.004 degrees.
 ///
-/// There is no position, and both readings are not a number, unless all of these hold:
+/// There is no position, both readings are not a number, and the host tells once in a command why,
+/// unless all of these hold:
 ///   - latitude from -90 to 90, longitude from -360 to 360
 ///   - time zone from -24 to 24
 ///   - the date is one of the Gregorian calendar (there is no 31 April), of the years 1800 to 2199

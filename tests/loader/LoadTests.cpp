@@ -10,6 +10,7 @@ namespace fs = std::filesystem;
 using testing::EndsWith;
 using testing::HasSubstr;
 using testing::Not;
+using testing::StartsWith;
 
 const KM_UUID GOOD_ID = KM_UuidFromString("0B7E9B0C-6C1E-4C5B-8C55-3A8D0C9F1A01");
 
@@ -210,6 +211,22 @@ TEST_F(LoaderTest, AMissingDialogPlugInIsToldUnlessQuiet) {
     EXPECT_EQ(printed(), "");
     EXPECT_EQ(CQuarnPlugIn::LoadPlugIn(ZelVexUiPlugInId, false, true), -2);
     EXPECT_EQ(printed(), "There is no plug-in file ZEL_VexUI.qnp.\n");
+}
+
+TEST_F(LoaderTest, WhatARefusingPlugInPrintsIsAReasonThatAQuietLoadKeepsBack) {
+    start({{folder() / "talkative"}, {}, "C", {}});
+    setenv("QUARN_TEST_FAULT", "load", 1);
+    EXPECT_EQ(CQuarnPlugIn::LoadPlugIn(ZelVexUiPlugInId, true, true), -5);
+    EXPECT_EQ(printed(), "");
+    EXPECT_EQ(CQuarnPlugIn::LoadPlugIn(ZelVexUiPlugInId, false, true), -5);
+    EXPECT_THAT(printed(), StartsWith("I look around.\nThe plug-in "));
+    EXPECT_THAT(printed(), EndsWith("its OnLoadPlugIn refused.\n"));
+}
+
+TEST_F(LoaderTest, WhatAPlugInPrintsWhileItIsLoadedIsShownAlsoByAQuietLoad) {
+    start({{folder() / "talkative"}, {}, "C", {}});
+    EXPECT_EQ(CQuarnPlugIn::LoadPlugIn(ZelVexUiPlugInId, true, true), 0);
+    EXPECT_EQ(printed(), "I look around.\n");
 }
 
 TEST_F(LoaderTest, AFileWithAnotherIdThanItsNamePromisesIsRefused) {

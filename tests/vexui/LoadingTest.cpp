@@ -7,6 +7,7 @@
 #include <fstream>
 
 using testing::HasSubstr;
+using testing::Not;
 
 namespace {
 
@@ -85,7 +86,7 @@ TEST_F(Loading, UnloadedAfterUseItLeavesNothingBehind) {
 TEST_F(Loading, WithoutQtsApplicationItRefusesAndTheCommandsSayWhatTheySayWithoutIt) {
     const auto [status, output] = outputOf("'" + ownProgram() + "' " + WITHOUT_WINDOWS);
     EXPECT_EQ(0, status) << output;
-    EXPECT_THAT(output, HasSubstr("Vex UI was not loaded: this program shows no windows.\n"));
+    EXPECT_THAT(output, Not(HasSubstr("Vex UI was not loaded"))) << "they load it quietly";
     EXPECT_THAT(output, HasSubstr("[Animation] Vex UI (ZEL_VexUI.qnp) cannot be loaded.\n"));
 }
 

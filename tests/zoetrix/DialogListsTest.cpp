@@ -2,6 +2,8 @@
 #include "zoetrix/commands/cmdZoetrix.h"
 #include "zoetrix/ui/ZoetrixDataUI.h"
 
+#include <dlfcn.h>
+
 namespace {
 
 using Names = KM_ClassArray<KM_wString>;
@@ -27,7 +29,19 @@ protected:
     DialogPlugIn() : PlugInFixture("dialogs") {}
 };
 
+/// How often the host was asked to load a plug-in by its id.
+int loads_asked_for = 0;
+
 } // namespace
+
+/// Stands before the host's own for all that this program links, and counts.
+int CQuarnPlugIn::LoadPlugIn(const KM_UUID& id, bool quietly, bool ignore_disabled) {
+    ++loads_asked_for;
+    using Load = int (*)(const KM_UUID&, bool, bool);
+    const auto load =
+        reinterpret_cast<Load>(dlsym(RTLD_NEXT, "_ZN12CQuarnPlugIn10LoadPlugInERK7KM_UUIDbb"));
+    return load(id, quietly, ignore_disabled);
+}
 
 TEST_F(DialogLists, OfferEveryChoiceInItsOrder) {
     fill(false);
@@ -135,8 +149,13 @@ TEST_F(DialogLists, MissingDialogPlugInIsPassedOverInSilenceWithoutTheFlag) {
 
 TEST_F(DialogPlugIn, IsLoadedOnceAndThenFoundLoaded) {
     EXPECT_FALSE(CQuarnPlugIn::PlugInIsLoaded(ZelVexUiPlugInId));
+    const int loads_before = loads_asked_for;
     EXPECT_TRUE(LoadVexUi(true));
+    EXPECT_EQ(loads_before + 1, loads_asked_for);
     EXPECT_TRUE(CQuarnPlugIn::PlugInIsLoaded(ZelVexUiPlugInId));
     EXPECT_TRUE(LoadVexUi(true));
+    EXPECT_TRUE(LoadVexUi(false));
+    EXPECT_EQ(loads_before + 1, loads_asked_for) << "it was loaded: nobody tries again";
     EXPECT_TRUE(front_end.messages().empty());
+    EXPECT_TRUE(printed().empty());
 }

@@ -250,6 +250,7 @@ TEST_F(FrameAccess, StaleLightIndicesDeleteNoLight) {
         EXPECT_EQ(lights.LightCount() - 1, record().LightIndex()) << stale;
         lights.DeleteLight(record().LightIndex(), true);
     }
+    EXPECT_TRUE(printed().empty()) << "of a light that is not there nothing is told";
 }
 
 TEST_F(FrameAccess, ASunThatCannotShineTakesTheLastOneAway) {

@@ -50,6 +50,17 @@ TEST_F(OneDaySun, EveryMinuteOfTheDayHasAFrame) {
     EXPECT_EQ(L"2026-06-21 23:59:00", dates().back());
 }
 
+TEST_F(OneDaySun, AYearThatTheSunIsNotKnownInIsToldOnce) {
+    ASSERT_EQ(CQuarnCommand::success, setUp(DayAnswers{.year = L"1750"}));
+    expectNoFrames(Record::one_day_sun);
+    EXPECT_EQ(L"SetOneDaySunAnimation: The sun has no position in the year 1750: it is known for "
+              L"the years 1800 to 2199\n",
+              printed());
+    front_end.clearPrinted();
+    ASSERT_EQ(CQuarnCommand::success, setUp(DayAnswers{}));
+    EXPECT_EQ(L"", printed()) << "nothing of the command before";
+}
+
 TEST_F(OneDaySun, ATimeThatTheStepsPassOverEndsTheStudyBefore) {
     ASSERT_EQ(CQuarnCommand::success,
               setUp(DayAnswers{.end_hour = L"7", .end_minute = L"59", .minutes = L"30"}));

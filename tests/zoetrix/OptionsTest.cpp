@@ -167,10 +167,18 @@ TEST_F(Options, TypedMethodWithoutUnderscoreIsIgnored) {
     EXPECT_EQ(L"Perspective", props.ViewportName().View());
 }
 
-TEST_F(Options, UnknownMethodWithUnderscoreFailsWithoutAWord) {
-    EXPECT_EQ(CQuarnCommand::failure, ask({L"png", L"_Rendered"}));
+TEST_F(Options, AFileTypeThatIsNoneIsToldAndTheOldOneStays) {
+    EXPECT_EQ(CQuarnCommand::success, ask({L"gif", L"_Enter", L"Perspective", L"_Enter"}));
+    EXPECT_EQ(L"jpg", props.FileExtension().View());
+    EXPECT_EQ(L"\"gif\" is no option here. The options are jpg, bmp, png, tga.\n", printed());
+}
+
+TEST_F(Options, UnknownMethodWithUnderscoreIsToldAndFails) {
+    EXPECT_EQ(CQuarnCommand::failure, ask({L"png", L"_ShadedViewport"}));
     EXPECT_EQ(L"png", props.FileExtension().View());
     EXPECT_EQ(L"Shaded", props.CaptureMethod().View());
+    EXPECT_THAT(printed(), testing::StartsWith(L"\"_ShadedViewport\" is no option here. "
+                                               L"The options are RenderFull, RenderPreview, "));
     EXPECT_TRUE(printed().find(L"Nothing done") == std::wstring::npos);
 }
 

@@ -138,6 +138,12 @@ TEST_F(RecordCommand, TypedFolderThatExistsIsTaken) {
     EXPECT_FALSE(std::filesystem::exists(frames));
 }
 
+TEST_F(RecordCommand, TypedFolderIsNotTakenForAnOption) {
+    std::filesystem::create_directory(folder.path() / "other");
+    EXPECT_EQ(CQuarnCommand::success, recordWith({(folder.path() / "other").wstring(), L"_Enter"}));
+    EXPECT_THAT(printed(), Not(HasSubstr(L"no option")));
+}
+
 TEST_F(RecordCommand, TypedFolderThatDoesNotExistLeavesThePreviousOne) {
     ASSERT_EQ(CQuarnCommand::success,
               recordWith({wide(folder.path() / "nowhere").View(), L"_Enter"}));
@@ -205,6 +211,7 @@ TEST_F(RecordCommand, FolderThatCannotBeMadeGivesNeitherFrameNorPage) {
     record().SetFolderName(wide(folder.path() / "file" / "frames"));
     EXPECT_EQ(CQuarnCommand::failure, recordWith({L"_Enter"}));
     EXPECT_EQ("kept", readFile(folder.path() / "file"));
+    EXPECT_THAT(printed(), HasSubstr(L"/file/frames cannot be made: Not a directory\n"));
 }
 
 TEST_F(RecordCommand, RenderThatIsCancelledStopsWithAPageOfNoFrames) {

@@ -174,6 +174,14 @@ TEST_F(Turntable, BadFrameCountsEndItWithAMessage) {
     }
 }
 
+TEST_F(Turntable, ADirectionThatIsNoneIsToldAndTheOneThatIsRememberedIsTaken) {
+    EXPECT_EQ(CQuarnCommand::success,
+              run(L"SetTurntableAnimation 4 Klockwise _Enter _Enter _Enter _Enter"));
+    EXPECT_EQ(4, record().FrameCount());
+    EXPECT_THAT(printed(), HasSubstr(L"SetTurntableAnimation: \"Klockwise\" is no option here. "
+                                     L"The options are Clockwise, AntiClockwise.\n"));
+}
+
 TEST_F(Turntable, CancelledDirectionEndsItWithAMessage) {
     record() = marked();
     EXPECT_EQ(CQuarnCommand::cancel, run(L"SetTurntableAnimation 8 _Cancel"));

@@ -4,7 +4,8 @@
 
 #include <utility>
 
-/// Tells that a command could not be finished, in which case nothing was stored. Throws nothing.
+/// Tells why a command could not be finished, in which case nothing was stored: that memory lacks,
+/// or what else went wrong. To be called while the exception is handled. Throws nothing.
 void ReportUnfinishedCommand() noexcept;
 
 /// Runs the body of a command, which returns how the command ended. What it throws (an animation

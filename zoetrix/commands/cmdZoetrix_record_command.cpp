@@ -84,6 +84,7 @@ bool AskTargetFolder(KM_wString& folder, bool interactive) {
     CQuarnGetOption prompt;
     prompt.SetCommandPrompt(QnLocalizeString(L"Press Enter to start recording", 33987));
     prompt.AcceptNothing(true);
+    prompt.AcceptString();
     while (true) {
         const int folder_option = AddOptions(prompt, folder);
         const CQuarnGet::result answer = prompt.GetOption();

@@ -152,11 +152,23 @@ TEST_F(ViewAreaTest, EmptyDocumentSaysWhereModelsComeFrom) {
 /// A frame that a command shows stays to be seen although what it showed is gone again.
 TEST_F(ViewAreaTest, PictureThatACommandShowsStaysAfterIt) {
     readSlab();
-    setUpTurntable(4);
-    run("_-PlayAnimation");
-    const QImage last_frame = view("Perspective").picture();
+    run("_-SetOneDaySunAnimation 51.5 0 0 21 6 2026 6 0 18 0 60 _Enter _Enter Perspective _Enter");
+    run("_-ViewFrameNumber 3");
+    const QImage frame = view("Perspective").picture();
     settle();
-    EXPECT_EQ(view("Perspective").picture(), last_frame);
+    EXPECT_EQ(view("Perspective").picture(), frame);
+    hostView("Perspective").Redraw();
+    EXPECT_NE(view("Perspective").picture(), frame) << "the light of the study is gone";
+}
+
+TEST_F(ViewAreaTest, LastFrameOfAPlayGoesWhenCameraAndModeAreBack) {
+    readSlab();
+    setUpTurntable(3); // in wireframe, about a view that is shaded
+    const QImage before = view("Perspective").picture();
+    run("_-PlayAnimation");
+    EXPECT_NE(view("Perspective").picture(), before);
+    settle();
+    EXPECT_EQ(view("Perspective").picture(), before);
 }
 
 } // namespace

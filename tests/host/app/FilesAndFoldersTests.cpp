@@ -5,6 +5,8 @@
 #include "tests/host/app/TestCommand.h"
 #include "tests/support/TempFolder.h"
 
+#include <gmock/gmock.h>
+
 #include <cstdlib>
 #include <fstream>
 #include <iterator>
@@ -13,6 +15,7 @@ namespace quarn::test {
 namespace {
 
 namespace fs = std::filesystem;
+using testing::HasSubstr;
 
 std::string bytesOf(const fs::path& file) {
     std::ifstream stream(file, std::ios::binary);
@@ -102,6 +105,13 @@ TEST_F(FilesAndFolders, AFolderInPlaceOfAFileCannotBeMade) {
     EXPECT_EQ(bytesOf(home / "file"), "x");
 }
 
+TEST_F(FilesAndFolders, WhyAFolderCannotBeMadeIsTold) {
+    const fs::path folder = home / "file" / "below";
+    std::ofstream(home / "file") << "x";
+    EXPECT_FALSE(CQuarnFileUtilities::CreateDir(wide(folder)));
+    EXPECT_EQ(printed(), "The folder " + folder.string() + " cannot be made: Not a directory\n");
+}
+
 TEST_F(FilesAndFolders, TheFolderChooserAnswersWithTheChoiceOrKeepsItsStart) {
     front_end.addFolderChoice(std::nullopt);
     front_end.addFolderChoice(fs::path("/chosen"));
@@ -150,6 +160,17 @@ TEST_F(FilesAndFolders, ATextFileThatIsForgottenIsClosed) {
         file.WriteString(L"text");
     }
     EXPECT_EQ(bytesOf(home / "forgotten"), "text");
+}
+
+TEST_F(FilesAndFolders, WhyATextFileCannotBeClosedIsTold) {
+    const fs::path folder = home / "gone";
+    fs::create_directory(folder);
+    CQnTextFile file;
+    ASSERT_TRUE(file.Open(wide(folder / "page.html"), open_mode::write, filetype::utf8));
+    fs::remove(folder);
+    EXPECT_FALSE(file.Close());
+    EXPECT_THAT(printed(), HasSubstr((folder / "page.html").string()));
+    EXPECT_THAT(printed(), HasSubstr("No such file or directory"));
 }
 
 TEST_F(FilesAndFolders, ATextFileNeedsAFolderAndAName) {

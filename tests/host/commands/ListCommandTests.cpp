@@ -121,7 +121,8 @@ TEST_F(ListCommandTest, EndsWithTheAnimationWhereThereIsOne) {
 
 TEST_F(ListCommandTest, AWordThatIsNoOptionIsToldAndNothingIsListed) {
     EXPECT_EQ(run(L"_-List Roof"), CQuarnCommand::failure);
-    EXPECT_EQ(printed(), "\"Roof\" is no option here. Give Objects, Ids or Curves.\n");
+    EXPECT_EQ(printed(),
+              "List: \"Roof\" is no option here. The options are Objects, Ids, Curves.\n");
 }
 
 } // namespace

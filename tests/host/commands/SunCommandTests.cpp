@@ -99,8 +99,8 @@ TEST_F(SunCommandTest, AnglesBeyondTheirLimitsAreRefused) {
     expectRefused(L"Sun Direction 361 10", "Enter a number from -360 to 360");
     expectRefused(L"Sun Direction 10 90.1", "Enter a number from -90 to 90");
     expectRefused(L"Sun Direction east 10", "\"east\" does not answer");
-    expectRefused(L"Sun Sideways", "\"Sideways\" is no option here. Give On, Off, Direction, "
-                                   "PlaceAndTime or _Enter.");
+    expectRefused(L"Sun Sideways", "\"Sideways\" is no option here. The options are On, Off, "
+                                   "Direction, PlaceAndTime.");
 }
 
 // I. Reda and A. Andreas, Solar Position Algorithm for Solar Radiation Applications
@@ -218,7 +218,7 @@ TEST_F(SunCommandTest, ATimeOrPlaceThatDoesNotExistIsToldAndChangesNothing) {
     expectRefused(L"Sun PlaceAndTime London 2026-06-21 12:00 NorthAngle 361 _Enter",
                   "Enter a number from -360 to 360");
     expectRefused(L"Sun PlaceAndTime London 2026-06-21 12:00 Sideways",
-                  "\"Sideways\" is no option here. Give TimeZone, NorthAngle or _Enter.");
+                  "\"Sideways\" is no option here. The options are TimeZone, NorthAngle.");
     expectRefused(L"_-Sun _PlaceAndTime London", "Date and time");
 }
 

@@ -127,6 +127,17 @@ TEST_F(ViewPictureTest, DrawToDibRefusesOnceInterruptedAndBadSizes) {
     EXPECT_EQ(view.drawCount(), 0U);
 }
 
+TEST_F(ViewPictureTest, RedrawOnceInterruptedDrawsNothingAndLeavesThePicture) {
+    view.face().Redraw();
+    const std::vector<std::uint8_t> shown = view.frameBuffer().rgba;
+    viewport.SetTargetAndCameraLocation({0, 0, 0}, {300, 0, 0}, true, true);
+    front_end.interrupt();
+    view.face().Redraw();
+    EXPECT_EQ(view.drawCount(), 1U);
+    EXPECT_EQ(view.showCount(), 1U);
+    EXPECT_EQ(view.frameBuffer().rgba, shown);
+}
+
 TEST_F(ViewPictureTest, OnlyAPictureOfTheFramesSizeIsCopied) {
     CQuarnDib dib;
     ASSERT_TRUE(pipeline.DrawToDib(dib, 32, 48, *pipeline.CurrentDisplayAttributes()));

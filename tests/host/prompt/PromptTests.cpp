@@ -11,6 +11,7 @@ namespace {
 
 using testing::ElementsAre;
 using testing::HasSubstr;
+using testing::StartsWith;
 
 CQuarnCommandOptionName name(const wchar_t* english, const wchar_t* local = L"") {
     return {english, *local ? local : english};
@@ -92,6 +93,39 @@ TEST_F(PromptTest, AnOptionQuestionHandsOtherWordsOnAsText) {
     EXPECT_EQ(result, CQuarnGet::string);
     EXPECT_EQ(text, L"/tmp/my frames");
     EXPECT_EQ(picked, 0);
+}
+
+TEST_F(PromptTest, AWordThatIsNoOptionIsToldWithTheOptionsNames) {
+    ask<CQuarnGetOption>(L"Klockwise", twoDirections);
+    EXPECT_EQ(result, CQuarnGet::string) << "it is handed on";
+    EXPECT_EQ(text, L"Klockwise");
+    EXPECT_EQ(printed(), "Ask: \"Klockwise\" is no option here. The options are "
+                         "Uhrzeigersinn, Gegensinn.\n");
+}
+
+TEST_F(PromptTest, APersonIsToldThatAWordIsNoOption) {
+    front_end.addAnswer(L"Klockwise");
+    ask<CQuarnGetOption>(L"", twoDirections);
+    EXPECT_EQ(text, L"Klockwise");
+    EXPECT_THAT(printed(), StartsWith("\"Klockwise\" is no option here."));
+}
+
+TEST_F(PromptTest, AnOptionQuestionThatTakesTextTellsNothing) {
+    ask<CQuarnGetOption>(L"/tmp/frames", [](CQuarnGetOption& get) {
+        twoDirections(get);
+        get.AcceptString();
+    });
+    EXPECT_EQ(text, L"/tmp/frames");
+    EXPECT_EQ(printed(), "");
+}
+
+TEST_F(PromptTest, ADefaultThatIsNoOptionIsNotToldWhenEnterTakesIt) {
+    ask<CQuarnGetOption>(L"_Enter", [](CQuarnGetOption& get) {
+        twoDirections(get);
+        get.SetDefaultString(L"gif");
+    });
+    EXPECT_EQ(text, L"gif");
+    EXPECT_EQ(printed(), "");
 }
 
 TEST_F(PromptTest, AnOptionWithoutAToggleTakesNoValue) {
@@ -184,6 +218,21 @@ TEST_F(PromptTest, AWordAtATextQuestionIsTextAlsoWhenItNamesAnOption) {
         EXPECT_EQ(result, CQuarnGet::string);
         EXPECT_EQ(text, word);
     }
+}
+
+TEST_F(PromptTest, AWordLikeAnEnglishOptionOfATextQuestionIsToldToBeNone) {
+    ask<CQuarnGetString>(L"_ShadedViewport",
+                         [](CQuarnGetString& get) { get.AddCommandOption(name(L"Shaded")); });
+    EXPECT_EQ(text, L"_ShadedViewport") << "it is handed on";
+    EXPECT_EQ(printed(), "Ask: \"_ShadedViewport\" is no option here. The options are Shaded.\n");
+}
+
+TEST_F(PromptTest, OtherWordsOfATextQuestionAreNoMistakenOptions) {
+    for (const wchar_t* word : {L"_Shaded", L"Garden", L"\"_Garden\""})
+        ask<CQuarnGetString>(word,
+                             [](CQuarnGetString& get) { get.AddCommandOption(name(L"Shaded")); });
+    ask<CQuarnGetString>(L"_Garden", [](CQuarnGetString&) {});
+    EXPECT_EQ(printed(), "");
 }
 
 TEST_F(PromptTest, AnOptionOfATextQuestionIsClickedInBrackets) {
