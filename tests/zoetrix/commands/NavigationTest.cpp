@@ -170,6 +170,8 @@ TEST_F(Navigation, OneFrameLeavesOneNumber) {
     setUpCameraFrames(1);
     EXPECT_EQ(CQuarnCommand::success, run(L"ViewFrameNumber 0"));
     EXPECT_EQ(CQuarnCommand::cancel, run(L"ViewFrameNumber 1"));
+    EXPECT_EQ(CQuarnCommand::cancel, run(L"ViewFrameNumber -1"));
+    EXPECT_EQ(0, record().CurrentFrame());
 }
 
 TEST_F(Navigation, FailedShowingStoresNothing) {

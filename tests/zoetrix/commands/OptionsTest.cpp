@@ -47,16 +47,6 @@ protected:
     GermanOptions() : Options("de") {}
 };
 
-KM_UUID modeNamed(const wchar_t* english_name) {
-    KM_SimpleArray<const CDisplayPipelineAttributes*> modes;
-    CQuarnDisplayAttrsMgr::GetDisplayAttrsList(modes);
-    for (const CDisplayPipelineAttributes* mode : modes)
-        if (mode->EnglishName() == english_name)
-            return mode->Id();
-    ADD_FAILURE() << "no such mode";
-    return KM_nil_uuid;
-}
-
 using Texts = std::vector<std::wstring>;
 
 /// A display mode as a host of other modes would have it, for as long as the object lives.
@@ -172,6 +162,32 @@ TEST_F(Options, UnknownMethodWithUnderscoreFailsWithoutAWord) {
     EXPECT_EQ(L"png", props.FileExtension().View());
     EXPECT_EQ(L"Shaded", props.CaptureMethod().View());
     EXPECT_TRUE(printed().find(L"Nothing done") == std::wstring::npos);
+}
+
+TEST_F(Options, AnUnderscoreAloneIsAnUnknownMethod) {
+    EXPECT_EQ(CQuarnCommand::failure, ask({L"png", L"_"}));
+    EXPECT_EQ(L"Shaded", props.CaptureMethod().View());
+    EXPECT_TRUE(printed().find(L"Nothing done") == std::wstring::npos);
+    EXPECT_EQ(2U, front_end.questions().size());
+}
+
+TEST_F(Options, WithoutAnyModeToFallBackOnTheyFailWithoutAWord) {
+    const ChangedMode rendered(L"Rendered");
+    const ChangedMode clay(L"Clay");
+    for (const ChangedMode* mode : {&rendered, &clay})
+        (*mode)->m_uses_document_lights = (*mode)->m_casts_shadows = false;
+    props.SetRenderPreview(true);
+    EXPECT_EQ(CQuarnCommand::failure, ask({L"png"}, true));
+    EXPECT_EQ(L"", printed());
+    EXPECT_EQ(1U, front_end.questions().size()) << "the method is not asked for";
+    EXPECT_EQ(L"png", props.FileExtension().View());
+    EXPECT_EQ(L"Shaded", props.CaptureMethod().View());
+    EXPECT_EQ(some_mode, props.DisplayMode());
+    EXPECT_TRUE(props.RenderPreview());
+    // A render method needs no mode.
+    props.SetCaptureMethod(L"RenderFull");
+    EXPECT_EQ(CQuarnCommand::success, ask({L"_Enter", L"_Enter", L"_Enter", L"_Enter"}, true));
+    EXPECT_EQ(L"RenderFull", props.CaptureMethod().View());
 }
 
 TEST_F(Options, MethodThatIsGoneBecomesTheFirstModeByNameOnly) {

@@ -325,6 +325,17 @@ TEST_F(PathCommand, InvalidNameIsRepairedAndTold) {
     EXPECT_TRUE(front_end.messages().empty());
 }
 
+TEST_F(PathCommand, InvalidNameIsLeftAloneWhenAnOptionIsCancelled) {
+    for (const wchar_t* name : {L"a<b>", L""}) {
+        record().SetHtmlFilename(name);
+        front_end.clearPrinted();
+        EXPECT_EQ(CQuarnCommand::cancel,
+                  run(L"SetPathAnimation rail spot 2 _Enter _Enter _Enter _Cancel"));
+        EXPECT_EQ(L"Invalid name. Nothing done\n", printed());
+        EXPECT_EQ(name, record().HtmlFilename().View());
+    }
+}
+
 TEST_F(PathCommand, NameThatCannotBeRepairedEndsIt) {
     for (const std::wstring& name : {std::wstring(), std::wstring(256, L'a')}) {
         record().SetHtmlFilename(name.c_str());

@@ -123,6 +123,39 @@ TEST_P(PathDialog, SelectionsOutsideTheirListsChangeNothing) {
     }
 }
 
+TEST_P(PathDialog, EachSelectionIsMeasuredAgainstItsOwnList) {
+    ASSERT_EQ(CQuarnCommand::success, run(L"AddView Side Front"));
+    record().SetFileExtension(L"bmp");
+    // Behind the last file type and the last capture method, but not behind the last of five views.
+    entered.file_type = 4;
+    entered.method = 9;
+    entered.viewport = 4;
+    ASSERT_EQ(CQuarnCommand::success, confirm());
+    EXPECT_EQ(L"bmp", record().FileExtension().View());
+    EXPECT_EQ(L"Shaded", record().CaptureMethod().View());
+    EXPECT_EQ(L"Side", record().ViewportName().View());
+    entered.file_type = 3;
+    entered.method = 8;
+    entered.viewport = 5;
+    ASSERT_EQ(CQuarnCommand::success, confirm());
+    EXPECT_EQ(L"tga", record().FileExtension().View());
+    EXPECT_EQ(L"Clay", record().CaptureMethod().View());
+    EXPECT_EQ(L"Side", record().ViewportName().View());
+}
+
+TEST_P(PathDialog, RenderMethodsThatAreKeptAreKnownInAnyCase) {
+    entered.method = -1;
+    for (const wchar_t* method : {L"renderFULL", L"renderPREVIEW"}) {
+        record().SetCaptureMethod(method);
+        record().SetRenderFull(false);
+        record().SetRenderPreview(true);
+        ASSERT_EQ(CQuarnCommand::success, confirm());
+        EXPECT_TRUE(record().RenderFull());
+        EXPECT_FALSE(record().RenderPreview());
+        EXPECT_EQ(method, record().CaptureMethod().View());
+    }
+}
+
 TEST_P(PathDialog, FrameCountsBelowOneCannotBeDivided) {
     for (const int frames : {0, -5}) {
         entered.frames = frames;
@@ -134,11 +167,11 @@ TEST_P(PathDialog, FrameCountsBelowOneCannotBeDivided) {
 }
 
 TEST_P(PathDialog, ClosedUnconfirmedLeavesEverythingAsItWas) {
-    entered = {.file_type = 2, .method = 0, .viewport = 1, .name = "Other", .confirmed = false};
+    entered = {.file_type = 2, .method = 0, .viewport = 1, .name = "a<b", .confirmed = false};
     EXPECT_EQ(CQuarnCommand::cancel, confirm());
     EXPECT_EQ("path", shownDialog());
     expectRecordUntouched();
-    EXPECT_TRUE(front_end.messages().empty());
+    EXPECT_TRUE(front_end.messages().empty()) << "a name that is given up is not repaired";
 }
 
 TEST_P(PathDialog, InvalidNameIsRepairedAndToldInABox) {

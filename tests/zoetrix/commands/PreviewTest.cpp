@@ -15,11 +15,14 @@ namespace {
 constexpr const char* two_rails =
     "v 0 0 0\nv 10 0 0\nv 0 0 5\nv 0 4 5\no rail\nl 1 2\no gaze\nl 3 4\n";
 
+int regenerations = 0;
+
 class Preview : public PlugInFixture {
 protected:
     void SetUp() override {
         placeCamera(L"Perspective", {30.0, 40.0, 50.0}, {1.0, 2.0, 3.0});
         ASSERT_EQ(CQuarnCommand::success, run(L"ViewportSize 64 48"));
+        front_end.clearPrinted();
     }
 
     int preview(int frame) { return PreviewAnimation(doc(), record(), frame, false); }
@@ -99,6 +102,32 @@ protected:
 };
 
 } // namespace
+
+// The plug-in's calls of CQuarnDoc::Regen come here, and go on to the host.
+extern "C" void __real__ZN9CQuarnDoc5RegenEv(CQuarnDoc* doc);
+extern "C" void __wrap__ZN9CQuarnDoc5RegenEv(CQuarnDoc* doc) {
+    ++regenerations;
+    __real__ZN9CQuarnDoc5RegenEv(doc);
+}
+
+TEST_F(Preview, EveryShowingEndsWithARegenerationOfTheDocument) {
+    const auto regenerationsOf = [this](int frame, bool record_frames) {
+        regenerations = 0;
+        front_end.while_waiting = [] { EXPECT_EQ(0, regenerations) << "before the last frame"; };
+        EXPECT_EQ(CQuarnCommand::success, PreviewAnimation(doc(), record(), frame, record_frames));
+        front_end.while_waiting = nullptr;
+        return regenerations;
+    };
+    followBothRails();
+    record().SetFolderName(wide(folder.path()));
+    EXPECT_EQ(1, regenerationsOf(-1, false));
+    EXPECT_EQ(1, regenerationsOf(1, false));
+    EXPECT_EQ(1, regenerationsOf(-1, true));
+    setUpCameraFrames(2);
+    EXPECT_EQ(1, regenerationsOf(-1, false)) << "also where no curve was hidden";
+    setUpSunFrames(2);
+    EXPECT_EQ(1, regenerationsOf(0, false));
+}
 
 TEST_F(Preview, RecordsWithoutAsManyPointsAsFramesAreRefused) {
     const auto expect_refused = [this] {
@@ -181,6 +210,29 @@ TEST_F(Preview, WholePlayReturnsTheViewToCameraProjectionAndMode) {
     EXPECT_EQ(CQuarnDisplayAttrsMgr::RenderedModeId(), modeOf(L"Perspective"));
     EXPECT_EQ(2, record().CurrentFrame());
     EXPECT_EQ(30U, front_end.waited_ms());
+}
+
+TEST_F(Preview, WholePlayShowsEveryFrameInTheAnimationsMode) {
+    const KM_UUID rendered = CQuarnDisplayAttrsMgr::RenderedModeId();
+    const KM_UUID wireframe = CQuarnDisplayAttrsMgr::WireframeModeId();
+    const KM_UUID x_ray = modeNamed(L"X-Ray");
+    const auto seen = [this](const KM_UUID& mode) {
+        EXPECT_TRUE(view(L"Perspective").MainViewport().SetDisplayMode(mode));
+        std::vector<KM_UUID> modes;
+        front_end.while_waiting = [&] { modes.push_back(modeOf(L"Perspective")); };
+        EXPECT_EQ(CQuarnCommand::success, preview(-1));
+        front_end.while_waiting = nullptr;
+        EXPECT_EQ(mode, modeOf(L"Perspective"));
+        return modes;
+    };
+    setUpCameraFrames(3);
+    record().SetDisplayMode(x_ray);
+    EXPECT_THAT(seen(rendered), testing::ElementsAre(x_ray, x_ray, x_ray, x_ray));
+    record().SetDisplayMode(KM_nil_uuid);
+    EXPECT_THAT(seen(rendered), testing::ElementsAre(wireframe, wireframe, wireframe, wireframe));
+    setUpSunFrames(3);
+    record().SetDisplayMode(x_ray);
+    EXPECT_THAT(seen(wireframe), testing::ElementsAre(rendered, rendered, rendered, rendered));
 }
 
 TEST_F(Preview, WholePlayReturnsARolledCameraRolled) {
@@ -394,6 +446,7 @@ TEST_F(Preview, SunStudyLeavesTheOtherLightsOfTheDocument) {
             EXPECT_EQ(1, liveLights()) << stale;
         }
     }
+    EXPECT_EQ(L"", printed()) << "that there was no light to delete is not told";
 }
 
 TEST_F(Preview, EscapeShortensThePauseAndDoesNotStop) {

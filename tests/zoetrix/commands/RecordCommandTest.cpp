@@ -46,12 +46,14 @@ public:
 /// Puts a program into PATH that stands in for the desktop's opener and notes what it opens.
 class OpenerInPath {
 public:
-    explicit OpenerInPath(const std::filesystem::path& folder)
+    /// @param exit_code  what the program ends with; other than 0 says that it could open nothing
+    explicit OpenerInPath(const std::filesystem::path& folder, int exit_code = 0)
         : m_journal(folder / "opened.txt"), m_path(std::getenv("PATH")) {
         const std::filesystem::path program = folder / "bin" / "xdg-open";
         std::filesystem::create_directory(program.parent_path());
         writeFile(m_journal, "");
-        writeFile(program, "#!/bin/sh\necho \"$1\" >> '" + m_journal.string() + "'\n");
+        writeFile(program, "#!/bin/sh\necho \"$1\" >> '" + m_journal.string() + "'\nexit " +
+                               std::to_string(exit_code) + "\n");
         std::filesystem::permissions(program, std::filesystem::perms::owner_all);
         setenv("PATH", program.parent_path().c_str(), 1);
     }
@@ -172,10 +174,43 @@ TEST_F(RecordCommand, InteractiveFolderOptionOpensTheChooser) {
     expectThreeFramesAndThePageIn(other);
 }
 
+TEST_F(RecordCommand, ChooserSaysWhatItIsForAndBeginsInTheTargetFolderOfNow) {
+    const std::filesystem::path other = folder.path() / "other";
+    front_end.addFolderChoice(std::nullopt);
+    front_end.addFolderChoice(other);
+    front_end.addFolderChoice(std::nullopt);
+    answer({L"TargetFolder", L"TargetFolder", L"TargetFolder", L"_Cancel"});
+    EXPECT_EQ(CQuarnCommand::failure, session->runCommand(L"RecordAnimation", true));
+    const auto& questions = front_end.folderQuestions();
+    ASSERT_EQ(3U, questions.size());
+    for (const auto& question : questions) {
+        EXPECT_EQ(L"Quarn Animation", question.title);
+        EXPECT_EQ(L"Browse for Folder", question.message);
+    }
+    EXPECT_EQ(frames, questions[0].start_folder);
+    EXPECT_EQ(frames, questions[1].start_folder) << "nothing was chosen";
+    EXPECT_EQ(other, questions[2].start_folder);
+}
+
 TEST_F(RecordCommand, EmptyTargetFolderFailsWithoutAWord) {
     record().SetFolderName(L"");
+    record().Images().Append(L"before.jpg");
     EXPECT_EQ(CQuarnCommand::failure, recordWith({L"_Enter"}));
-    EXPECT_THAT(images(), IsEmpty());
+    EXPECT_EQ(L"", printed());
+    EXPECT_THAT(images(), ElementsAre(L"before.jpg"));
+    EXPECT_THAT(files(), IsEmpty());
+}
+
+TEST_F(RecordCommand, PageThatCannotBeWrittenFailsWithoutAWordAndStoresNothing) {
+    std::filesystem::create_directories(frames / "Walk.html");
+    record().Images().Append(L"before.jpg");
+    const std::vector<std::uint8_t> before = bytesOf(record());
+    EXPECT_EQ(CQuarnCommand::failure, recordWith({L"RunAnimation=Yes", L"_Enter"}));
+    EXPECT_EQ(L"", printed());
+    EXPECT_TRUE(before == bytesOf(record()));
+    // The frames were written before.
+    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk000.jpg", "Walk001.jpg", "Walk002.jpg"));
+    EXPECT_EQ(CQuarnCommand::failure, recordWith({L"RunAnimation=No", L"_Cancel"}));
 }
 
 TEST_F(RecordCommand, PlaybackThatFailsStoresNothing) {
@@ -309,6 +344,29 @@ TEST_F(RecordCommand, RunSwitchIsRememberedUntilItIsTurnedOff) {
     EXPECT_EQ(page + page, opener.opened());
 }
 
+TEST_F(RecordCommand, RunSwitchIsTheSameForTheNextDocument) {
+    const OpenerInPath opener(folder.path());
+    EXPECT_EQ(CQuarnCommand::failure, recordWith({L"RunAnimation=Yes", L"_Cancel"}));
+    ASSERT_EQ(CQuarnCommand::success, run(L"_-New"));
+    setUpCameraFrames(1);
+    record().SetFolderName(wide(frames));
+    ASSERT_EQ(CQuarnCommand::success, run(L"ViewportSize 32 24"));
+    ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
+    EXPECT_EQ((frames / "Walk.html").string() + "\n", opener.opened());
+    EXPECT_EQ(CQuarnCommand::failure, recordWith({L"RunAnimation=No", L"_Cancel"}));
+}
+
+TEST_F(RecordCommand, PageThatCannotBeOpenedIsARecordingAllTheSame) {
+    const OpenerInPath opener(folder.path(), 4);
+    ASSERT_EQ(CQuarnCommand::success, recordWith({L"RunAnimation=Yes", L"_Enter"}));
+    EXPECT_EQ((frames / "Walk.html").string() + "\n", opener.opened());
+    EXPECT_THAT(printed(), HasSubstr(L"cannot be opened"));
+    expectThreeFramesAndThePageIn(frames);
+    EXPECT_THAT(images(), ElementsAre(L"Walk000.jpg", L"Walk001.jpg", L"Walk002.jpg"));
+    EXPECT_EQ(2, record().CurrentFrame());
+    EXPECT_EQ(CQuarnCommand::failure, recordWith({L"RunAnimation=No", L"_Cancel"}));
+}
+
 TEST_F(RecordCommand, PageWhosePathHasAQuoteIsNotOpened) {
     const OpenerInPath opener(folder.path());
     record().SetHtmlFilename(L"a\"b");
@@ -337,7 +395,23 @@ TEST_F(RecordCommand, InterruptedRecordingKeepsItsFramesAndWritesThePage) {
     session.reset();
 }
 
-TEST_F(RecordCommand, SunStudyIsRecordedWithoutTheCurvesAndLeavesNoLight) {
+TEST_F(RecordCommand, CurvesThatASunStudyNamesStayInItsPictures) {
+    importObj("v -2 -2 1\nv 2 -2 1\no rail\nl 1 2\n");
+    setUpSunFrames(1);
+    record().SetFileExtension(L"bmp");
+    record().SetCameraPathId(objectId(L"rail"));
+    record().SetTargetPathId(objectId(L"rail"));
+    front_end.while_waiting = [this] { EXPECT_FALSE(isHidden(L"rail")); };
+    ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
+    front_end.while_waiting = nullptr;
+    const std::string with_curve = readFile(frames / "Walk000.bmp");
+    ASSERT_TRUE(doc().HideObject(CQuarnObjRef(objectId(L"rail")), false));
+    ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
+    EXPECT_TRUE(isHidden(L"rail")) << "what a person hid stays hidden";
+    EXPECT_NE(with_curve, readFile(frames / "Walk000.bmp"));
+}
+
+TEST_F(RecordCommand, SunStudyIsRecordedWithItsDatesAndLeavesNoLight) {
     setUpSunFrames(3);
     for (int k = 0; k < 3; ++k)
         record().Dates().Append(KM_wString::FormatToString(L"Day %d", k));

@@ -220,6 +220,55 @@ TEST_F(SunDialog, SelectionsOutsideTheirListsChangeNothing) {
     }
 }
 
+TEST_F(SunDialog, EachSelectionIsMeasuredAgainstItsOwnList) {
+    ASSERT_EQ(CQuarnCommand::success, run(L"AddView Side Front"));
+    const auto choose = [](int file_type, int method, int viewport) {
+        return [=](Entered& entered) {
+            entered.file_type = file_type;
+            entered.method = method;
+            entered.viewport = viewport;
+        };
+    };
+    const auto prepare = [this] {
+        record().SetFileExtension(L"bmp");
+        record().SetCaptureMethod(L"Shaded");
+        record().SetViewportName(L"Top");
+    };
+    // Behind the last file type and the last of the methods that show a sun, but not behind the
+    // last of five views.
+    prepare();
+    inBoth(choose(4, 4, 4), [&] {
+        EXPECT_EQ(L"bmp", record().FileExtension().View());
+        EXPECT_EQ(L"Shaded", record().CaptureMethod().View());
+        EXPECT_EQ(L"Side", record().ViewportName().View());
+        prepare();
+    });
+    inBoth(choose(3, 3, 5), [&] {
+        EXPECT_EQ(L"tga", record().FileExtension().View());
+        EXPECT_EQ(L"Clay", record().CaptureMethod().View());
+        EXPECT_EQ(L"Top", record().ViewportName().View());
+        prepare();
+    });
+}
+
+TEST_F(SunDialog, RenderMethodsThatAreKeptAreKnownInAnyCase) {
+    for (const wchar_t* method : {L"renderFULL", L"renderPREVIEW"}) {
+        const auto prepare = [this, method] {
+            record().SetCaptureMethod(method);
+            record().SetRenderFull(false);
+            record().SetRenderPreview(true);
+        };
+        prepare();
+        inBoth([](Entered& entered) { entered.method = -1; },
+               [&] {
+                   EXPECT_TRUE(record().RenderFull());
+                   EXPECT_FALSE(record().RenderPreview());
+                   EXPECT_EQ(method, record().CaptureMethod().View());
+                   prepare();
+               });
+    }
+}
+
 TEST_F(SunDialog, NamesAreTakenAsTheyAre) {
     for (const std::string& name : {std::string("a<b>%s"), std::string(), std::string(300, 'a')}) {
         inBoth([&name](Entered& entered) { entered.name = name; },

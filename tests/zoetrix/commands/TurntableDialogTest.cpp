@@ -121,6 +121,48 @@ TEST_F(TurntableDialog, SelectionsOutsideTheirListsChangeNothing) {
     }
 }
 
+TEST_F(TurntableDialog, EachSelectionIsMeasuredAgainstItsOwnList) {
+    ASSERT_EQ(CQuarnCommand::success, run(L"AddView Side Front"));
+    record().SetFileExtension(L"bmp");
+    // Behind the last file type and the last capture method, but not behind the last of five views.
+    entered = {.file_type = 4, .method = 9, .viewport = 4};
+    ASSERT_EQ(CQuarnCommand::success, confirm());
+    EXPECT_EQ(L"bmp", record().FileExtension().View());
+    EXPECT_EQ(L"Shaded", record().CaptureMethod().View());
+    EXPECT_EQ(L"Side", record().ViewportName().View());
+    entered = {.file_type = 3, .method = 8, .viewport = 5};
+    ASSERT_EQ(CQuarnCommand::success, confirm());
+    EXPECT_EQ(L"tga", record().FileExtension().View());
+    EXPECT_EQ(L"Clay", record().CaptureMethod().View());
+    EXPECT_EQ(L"Side", record().ViewportName().View());
+}
+
+TEST_F(TurntableDialog, RenderMethodsThatAreKeptAreKnownInAnyCase) {
+    entered.method = -1;
+    record().SetCaptureMethod(L"renderFULL");
+    ASSERT_EQ(CQuarnCommand::success, confirm());
+    EXPECT_TRUE(record().RenderFull());
+    EXPECT_FALSE(record().RenderPreview());
+    record().SetCaptureMethod(L"renderPREVIEW");
+    ASSERT_EQ(CQuarnCommand::success, confirm());
+    EXPECT_FALSE(record().RenderFull());
+    EXPECT_TRUE(record().RenderPreview());
+    EXPECT_EQ(L"renderPREVIEW", record().CaptureMethod().View());
+}
+
+TEST_F(TurntableDialog, IsNotOpenedForACameraAboveItsTarget) {
+    KM_Viewport camera = view(L"Perspective").MainViewport().VP();
+    ASSERT_TRUE(camera.SetCameraDirection({0.0, 1.0, -5.0}));
+    ASSERT_TRUE(camera.SetCameraLocation({2.0, 0.0, 9.0}));
+    ASSERT_TRUE(camera.SetTargetPoint({2.0, 0.0, 0.0}));
+    ASSERT_TRUE(view(L"Perspective").MainViewport().SetVP(camera, true, true));
+    forgetDialog();
+    EXPECT_EQ(CQuarnCommand::failure, confirm());
+    EXPECT_EQ("", shownDialog());
+    EXPECT_EQ(L"Failed to create valid camera path in this view. Nothing done\n", printed());
+    expectRecordUntouched();
+}
+
 TEST_F(TurntableDialog, ChoosesTheDirectionBothWays) {
     ASSERT_EQ(CQuarnCommand::success, runAtCommandLine(L"4", L"AntiClockwise"));
     const KM_3dPointArray anticlockwise = record().CameraPoints();
@@ -142,9 +184,10 @@ TEST_F(TurntableDialog, ChoosesTheDirectionBothWays) {
 }
 
 TEST_F(TurntableDialog, ClosedUnconfirmedLeavesEverythingAsItWas) {
-    entered = {.file_type = 2, .direction = 1, .confirmed = false};
+    entered = {.file_type = 2, .direction = 1, .name = "a<b", .confirmed = false};
     EXPECT_EQ(CQuarnCommand::cancel, confirm());
     expectRecordUntouched();
+    EXPECT_TRUE(front_end.messages().empty()) << "a name that is given up is not repaired";
     entered = {};
     ASSERT_EQ(CQuarnCommand::success, confirm());
     EXPECT_TRUE(shownInDialog().ends_with("@0")) << shownInDialog();

@@ -1,5 +1,7 @@
 #include "tests/zoetrix/fixtures/TurntableFixture.h"
 
+#include <cmath>
+
 using testing::HasSubstr;
 
 namespace {
@@ -22,6 +24,12 @@ protected:
         EXPECT_EQ(L"jpg", record().FileExtension().View());
         EXPECT_TRUE(record().CameraPoints().IsEmpty());
         EXPECT_TRUE(record().TargetPoints().IsEmpty());
+    }
+
+    /// That the record holds four frames, the first a quarter of the turn to the right of the eye.
+    void expectAnticlockwise() {
+        ASSERT_EQ(4, record().CameraPoints().Count());
+        EXPECT_TRUE(near(record().CameraPoints()[0], KM_3dPoint(6.0, -3.0, 3.0), 1e-12));
     }
 };
 
@@ -63,6 +71,28 @@ TEST_F(Turntable, AntiClockwiseTakesTheSamePlacesTheOtherWayRound) {
     EXPECT_TRUE(near(points[1], KM_3dPoint(-1.0, -4.0, 3.0), 1e-12));
     EXPECT_TRUE(near(points[2], KM_3dPoint(-2.0, 3.0, 3.0), 1e-12));
     EXPECT_TRUE(near(points[3], eye, 0.0));
+}
+
+TEST_F(Turntable, ThreeFramesStandAtThirdsOfTheCirclesParameterNotOfItsAngle) {
+    // A quarter of the circle is a rational curve of degree 2 with the weights 1, w, 1, where w is
+    // the cosine of 45 degrees. A third of the turn is a third of the second quarter; there, at
+    // u = 1/3, the weights are (1-u)^2 = 4/9, 2u(1-u)w = 4w/9 and u^2 = 1/9, so that the place is
+    // a times the quarter's begin plus b times its end with
+    const double w = std::sqrt(0.5);
+    const double a = (4.0 + 4.0 * w) / (5.0 + 4.0 * w);
+    const double b = (1.0 + 4.0 * w) / (5.0 + 4.0 * w);
+    // From the centre the eye stands at (3, 4), and the quarters begin at (3, 4), (-4, 3), (-3, -4)
+    // and (4, -3). Two thirds of the turn are two thirds of the third quarter, which mirrors it.
+    ASSERT_EQ(CQuarnCommand::success, runAtCommandLine(L"3", L"_Enter"));
+    const KM_3dPointArray points = record().CameraPoints();
+    ASSERT_EQ(3, points.Count());
+    EXPECT_TRUE(
+        near(points[0], centre + a * KM_3dVector(-4, 3, 0) + b * KM_3dVector(-3, -4, 0), 1e-12));
+    EXPECT_TRUE(
+        near(points[1], centre + b * KM_3dVector(-3, -4, 0) + a * KM_3dVector(4, -3, 0), 1e-12));
+    EXPECT_TRUE(near(points[2], eye, 0.0));
+    // At equal angles the first would be elsewhere.
+    EXPECT_GT(std::abs(angleOf(points[0]) - 2.0 * KM_PI / 3.0), 0.01);
 }
 
 TEST_F(Turntable, NoFrameIsRepeated) {
@@ -139,6 +169,17 @@ TEST_F(Turntable, RadiusOfExactlyTheToleranceIsEnough) {
     EXPECT_EQ(CQuarnCommand::success, runAtCommandLine(L"4", L"_Enter"));
 }
 
+TEST_F(Turntable, RadiusIsMeasuredAgainstTheToleranceOfTheDocument) {
+    // A model of a thousandth of a unit has a tolerance of 10^-6 of its diagonal.
+    importObj("v 0 0 0\nv 0.001 0 0\nv 0.001 0.001 0.001\nf 1 2 3\n");
+    const double tolerance = 1e-9 * std::sqrt(3.0);
+    ASSERT_NEAR(doc().AbsoluteTolerance(), tolerance, 1e-15);
+    placeCamera(L"Perspective", {0.0, 1e-6, 1e-6}, {0.0, 0.0, 0.0});
+    EXPECT_EQ(CQuarnCommand::success, runAtCommandLine(L"4", L"_Enter"));
+    placeCamera(L"Perspective", {0.0, 0.9 * tolerance, 1e-6}, {0.0, 0.0, 0.0});
+    EXPECT_EQ(CQuarnCommand::failure, run(L"SetTurntableAnimation"));
+}
+
 TEST_F(Turntable, ViewWithoutTargetFails) {
     KM_Viewport camera = view(L"Perspective").MainViewport().VP();
     ASSERT_TRUE(camera.SetTargetPoint(KM_3dPoint::UnsetPoint));
@@ -208,6 +249,29 @@ TEST_F(Turntable, CommandLineNeverReturnsToClockwise) {
     EXPECT_EQ(anticlockwise, record().CameraPoints());
     ASSERT_EQ(CQuarnCommand::success, runAtCommandLine(L"4", L"_Enter"));
     EXPECT_EQ(anticlockwise, record().CameraPoints());
+}
+
+TEST_F(Turntable, DirectionIsRememberedWhenALaterQuestionIsNotAnswered) {
+    ASSERT_EQ(CQuarnCommand::cancel,
+              run(L"SetTurntableAnimation 8 AntiClockwise _png _Shaded Perspective _Cancel"));
+    ASSERT_EQ(CQuarnCommand::success, runAtCommandLine(L"4", L"_Enter"));
+    expectAnticlockwise();
+}
+
+TEST_F(Turntable, DirectionIsRememberedForTheNextDocument) {
+    ASSERT_EQ(CQuarnCommand::success, runAtCommandLine(L"4", L"AntiClockwise"));
+    ASSERT_EQ(CQuarnCommand::success, run(L"_-New"));
+    placeCamera(L"Perspective", eye, target);
+    ASSERT_EQ(CQuarnCommand::success, runAtCommandLine(L"4", L"_Enter"));
+    expectAnticlockwise();
+}
+
+TEST_F(Turntable, EnterKeepsTheRememberedDirectionThoughClockwiseIsShown) {
+    ASSERT_EQ(CQuarnCommand::success, runAtCommandLine(L"4", L"AntiClockwise"));
+    ASSERT_EQ(CQuarnCommand::success, runAtCommandLine(L"4", L"_Enter"));
+    const std::vector<quarn::Question>& questions = front_end.questions();
+    EXPECT_EQ(L"Clockwise", questions.at(questions.size() - 5).default_answer->View());
+    expectAnticlockwise();
 }
 
 TEST_F(Turntable, HundredThousandFramesAreDivided) {

@@ -76,6 +76,14 @@ TEST_F(CameraPlacement, CoincidentAndInvalidPointsFailAndLeaveTheResultAlone) {
     EXPECT_TRUE(before == placed);
 }
 
+TEST_F(CameraPlacement, RefusedUpFailsAndLeavesTheResultAlone) {
+    // Rolled by 30 degrees the up is that of the old camera; along it there is nothing to look at.
+    lookRolled(KM_PI / 6.0);
+    const KM_Viewport before = placed;
+    EXPECT_FALSE(place(KM_3dPoint::Origin + 5.0 * viewport().VP().CameraY(), KM_3dPoint::Origin));
+    EXPECT_TRUE(before == placed);
+}
+
 TEST_F(CameraPlacement, OffsetAboveTheTinyOneIsEnough) {
     look({0.0, 1.0, 0.0}, {0.0, 0.0, 1.0});
     EXPECT_TRUE(place({0.0, 3e-10, 0.0}, KM_3dPoint::Origin));

@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <chrono>
+#include <cmath>
 #include <limits>
 
 namespace {
@@ -30,6 +31,9 @@ KM_Light lightShining(const KM_3dVector& direction) {
     light.SetDirection(direction);
     return light;
 }
+
+/// The up of a camera that looks along +Y, rolled by 30 degrees.
+const KM_3dVector up_at_30_degrees(0.5, 0.0, std::sqrt(0.75));
 
 } // namespace
 
@@ -133,6 +137,23 @@ TEST_F(FrameAccess, CameraInItsTargetFails) {
     EXPECT_FALSE(viewAt(2));
 }
 
+TEST_F(FrameAccess, FrameWhoseCameraCannotBePlacedFails) {
+    setUpCameraFrames(5);
+    record().CameraPoints()[0] = KM_3dPoint::UnsetPoint;
+    record().TargetPoints()[1] = KM_3dPoint::UnsetPoint;
+    record().CameraPoints()[2].x = std::numeric_limits<double>::quiet_NaN();
+    // A camera that is rolled by 30 degrees takes no direction along its rolled up.
+    KM_Viewport rolled = view(L"Perspective").MainViewport().VP();
+    ASSERT_TRUE(rolled.SetCameraDirection({0.0, 1.0, 0.0}));
+    ASSERT_TRUE(rolled.SetCameraUp(up_at_30_degrees));
+    ASSERT_TRUE(view(L"Perspective").MainViewport().SetVP(rolled, true, true));
+    record().CameraPoints()[3] = KM_3dPoint::Origin;
+    record().TargetPoints()[3] = KM_3dPoint::Origin + 5.0 * rolled.CameraY();
+    for (int frame = 1; frame <= 4; ++frame)
+        EXPECT_FALSE(viewAt(frame)) << frame;
+    EXPECT_TRUE(viewAt(5));
+}
+
 TEST_F(FrameAccess, SunStudiesNeverMoveTheCamera) {
     setUpSunFrames(2);
     for (const auto type :
@@ -199,6 +220,20 @@ TEST_F(FrameAccess, PathIsRefreshedOnlyWhenBothOfItsCurvesAreNamed) {
     EXPECT_TRUE(near(camera.TargetPoint(), KM_3dPoint(0.0, 4.0, 5.0), 1e-6));
 }
 
+TEST_F(FrameAccess, SunStudyThatNamesCurvesTakesItsStoredSuns) {
+    importObj("v 0 0 0\nv 10 0 0\nv 0 0 5\nv 0 4 5\no rail\nl 1 2\no gaze\nl 3 4\n");
+    for (const auto type :
+         {KM_3dmAnimationProperties::one_day_sun, KM_3dmAnimationProperties::seasonal_sun}) {
+        setUpSunFrames(2);
+        record().SetCaptureType(type);
+        record().SetCameraPathId(objectId(L"rail"));
+        record().SetTargetPathId(objectId(L"gaze"));
+        ASSERT_TRUE(sunAt(2));
+        EXPECT_TRUE(near(light.Location(), sunOfFrame(1), 0.0));
+        EXPECT_TRUE(near(light.Direction(), KM_3dPoint::Origin - sunOfFrame(1), 0.0));
+    }
+}
+
 TEST_F(FrameAccess, FrameThatTheRefreshTookAwayFails) {
     importObj("v 0 0 0\nv 10 0 0\no rail\nl 1 2\n");
     setUpCameraFrames(8);
@@ -250,6 +285,7 @@ TEST_F(FrameAccess, StaleLightIndicesDeleteNoLight) {
         EXPECT_EQ(lights.LightCount() - 1, record().LightIndex()) << stale;
         lights.DeleteLight(record().LightIndex(), true);
     }
+    EXPECT_EQ(L"", printed()) << "that there was no light to delete is not told";
 }
 
 TEST_F(FrameAccess, ASunThatCannotShineTakesTheLastOneAway) {

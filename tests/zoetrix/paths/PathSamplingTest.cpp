@@ -97,6 +97,15 @@ TEST(PathSampling, OneFrameIsTheStartPointWhateverTheFlags) {
     }
 }
 
+TEST(PathSampling, OneFrameIsTheStartPointEvenWhereTheCurveHasNone) {
+    ParameterCurve line(3.0, 10.0, false);
+    line.gap_from = 3.0;
+    line.gap_to = 5.0;
+    const Division division = divide(line, 1, false, true);
+    EXPECT_TRUE(division.ok);
+    EXPECT_EQ(Parameters({KM_UNSET_VALUE}), division.parameters);
+}
+
 TEST(PathSampling, OpenCurveIsDividedFromEndToEnd) {
     const ParameterCurve line(0.0, 10.0, false);
     for (const bool is_camera : {false, true})

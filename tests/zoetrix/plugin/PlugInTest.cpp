@@ -1,4 +1,5 @@
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
+#include "tests/kelmar/FilledRecord.h"
 #include "tests/zoetrix/fixtures/PlugInFixture.h"
 #include "zoetrix/commands/cmdFlyThru.h"
 #include "zoetrix/commands/cmdOneDaySun.h"
@@ -9,6 +10,7 @@
 #include "zoetrix/plugin/ZoetrixPlugIn.h"
 #include "zoetrix/plugin/ZoetrixUtilities.h"
 
+#include <cstdlib>
 #include <regex>
 #include <type_traits>
 
@@ -28,14 +30,41 @@ extern CCommandTurntableAnimation theTurntableAnimationCommand;
 extern "C" unsigned int QuarnPlugInSdkVersion();
 extern "C" unsigned int QuarnPlugInSdkServiceRelease();
 extern "C" const wchar_t* QuarnPlugInUpdateURL();
+extern "C" const wchar_t* QuarnPlugInDeveloperOrganization();
+extern "C" const wchar_t* QuarnPlugInDeveloperAddress();
+extern "C" const wchar_t* QuarnPlugInDeveloperCountry();
+extern "C" const wchar_t* QuarnPlugInDeveloperPhone();
+extern "C" const wchar_t* QuarnPlugInDeveloperFax();
 extern "C" const wchar_t* QuarnPlugInDeveloperEmail();
 extern "C" const wchar_t* QuarnPlugInDeveloperWebsite();
 
-using testing::HasSubstr;
-
 namespace {
 
-class PlugIn : public PlugInFixture {};
+class PlugIn : public PlugInFixture {
+protected:
+    /// Starts the host anew, without the plug-in.
+    void restart() {
+        session.reset();
+        session = std::make_unique<quarn::Session>(front_end, quarn::SessionOptions());
+    }
+};
+
+class SpanishPlugIn : public PlugInFixture {
+protected:
+    SpanishPlugIn() : PlugInFixture("", "es") {}
+};
+
+/// A user without a home, of whom no documents folder is known, for as long as the object lives.
+class Homeless {
+public:
+    Homeless() : m_home(std::getenv("HOME") ? std::getenv("HOME") : "") { unsetenv("HOME"); }
+    ~Homeless() { setenv("HOME", m_home.c_str(), 1); }
+    Homeless(const Homeless&) = delete;
+    Homeless& operator=(const Homeless&) = delete;
+
+private:
+    std::string m_home;
+};
 
 struct ExpectedCommand {
     CQuarnCommand& command;
@@ -85,10 +114,15 @@ TEST_F(PlugIn, ExportsAnswerTheInterfaceVersionTwice) {
     EXPECT_EQ(2353819966U, QuarnPlugInSdkServiceRelease());
 }
 
-TEST_F(PlugIn, ContactsUseTheReservedDomain) {
-    EXPECT_THAT(QuarnPlugInUpdateURL(), HasSubstr(L"quarn.example"));
-    EXPECT_THAT(QuarnPlugInDeveloperEmail(), HasSubstr(L"@quarn.example"));
-    EXPECT_THAT(QuarnPlugInDeveloperWebsite(), HasSubstr(L"quarn.example"));
+TEST_F(PlugIn, ContactsTellWhereToUpdateAndWhoMadeIt) {
+    EXPECT_STREQ(L"https://quarn.example/download", QuarnPlugInUpdateURL());
+    EXPECT_STREQ(L"Quarn", QuarnPlugInDeveloperOrganization());
+    EXPECT_STREQ(L"1 Example Street", QuarnPlugInDeveloperAddress());
+    EXPECT_STREQ(L"Example Country", QuarnPlugInDeveloperCountry());
+    EXPECT_STREQ(L"+1 555 0100", QuarnPlugInDeveloperPhone());
+    EXPECT_STREQ(L"+1 555 0101", QuarnPlugInDeveloperFax());
+    EXPECT_STREQ(L"zoetrix@quarn.example", QuarnPlugInDeveloperEmail());
+    EXPECT_STREQ(L"https://quarn.example/zoetrix", QuarnPlugInDeveloperWebsite());
 }
 
 TEST_F(PlugIn, TwelveCommandsHaveTheirNamesAndIds) {
@@ -118,7 +152,7 @@ TEST_F(PlugIn, RegistersItsDynamicAccessWhileLoaded) {
     EXPECT_EQ(nullptr, Zoetrix_QuarnDynamicAccess());
 }
 
-TEST_F(PlugIn, KeepsOneRecordAndItsLastValueAfterUnloading) {
+TEST_F(PlugIn, StoresWhatADocumentIsGiven) {
     KM_3dmAnimationProperties changed = ZoetrixPlugIn().AnimationProperties(doc());
     changed.SetFrameCount(37);
     doc().Properties().SetAnimationProperties(changed);
@@ -129,20 +163,57 @@ TEST_F(PlugIn, KeepsOneRecordAndItsLastValueAfterUnloading) {
     EXPECT_EQ(100, other.AnimationProperties(doc()).FrameCount());
 }
 
-TEST_F(PlugIn, LoadingGivesTheRecordItsStartingValuesAndNothingElse) {
+TEST_F(PlugIn, KeepsItsLastRecordAfterUnloadingForWhateverDocument) {
+    record() = filledRecord();
+    const KM_3dmAnimationProperties* kept = &ZoetrixPlugIn().AnimationProperties(doc());
+    restart();
+    EXPECT_EQ(kept, &ZoetrixPlugIn().AnimationProperties(doc()));
+    expectFilled(record());
+    ASSERT_EQ(CQuarnCommand::success, run(L"_-New"));
+    EXPECT_EQ(kept, &ZoetrixPlugIn().AnimationProperties(doc()));
+    expectFilled(record());
+}
+
+TEST_F(PlugIn, LoadingGivesTheRecordItsStartingValues) {
     const KM_3dmAnimationProperties& props = record();
     EXPECT_EQ(L"Wireframe", props.CaptureMethod().View());
     EXPECT_EQ(L"Animation", props.HtmlFilename().View());
     EXPECT_EQ((wide(folder.path()) + L"/Animation").View(), props.FolderName().View());
-    EXPECT_EQ(KM_3dmAnimationProperties::none, props.CaptureType());
-    EXPECT_EQ(100, props.FrameCount());
-    EXPECT_EQ(L"jpg", props.FileExtension().View());
 }
 
-TEST_F(PlugIn, DocumentsFolderThatIsGoneLeavesTheFolderEmpty) {
+TEST_F(PlugIn, StartingValuesAreGivenToThreeFieldsAndNoOther) {
+    KM_3dmAnimationProperties props = filledRecord();
+    CZoetrixUtilities::InitializeAnimationProperties(props);
+    KM_3dmAnimationProperties expected = filledRecord();
+    expected.SetCaptureMethod(L"Wireframe");
+    expected.SetHtmlFilename(L"Animation");
+    expected.SetFolderName(wide(folder.path()) + L"/Animation");
+    EXPECT_TRUE(bytesOf(expected) == bytesOf(props));
+}
+
+TEST_F(PlugIn, DocumentsFolderThatIsGoneLeavesTheFolderAsItIs) {
     std::filesystem::remove_all(folder.path());
+    for (const wchar_t* before : {L"", L"/tmp/out"}) {
+        KM_3dmAnimationProperties props;
+        props.SetFolderName(before);
+        CZoetrixUtilities::InitializeAnimationProperties(props);
+        EXPECT_EQ(L"Animation", props.HtmlFilename().View());
+        EXPECT_EQ(before, props.FolderName().View());
+    }
+}
+
+TEST_F(PlugIn, UnknownDocumentsFolderLeavesTheFolderAsItIs) {
+    const Homeless nobody;
+    restart();
     KM_3dmAnimationProperties props;
     CZoetrixUtilities::InitializeAnimationProperties(props);
     EXPECT_EQ(L"Animation", props.HtmlFilename().View());
     EXPECT_TRUE(props.FolderName().IsEmpty());
+}
+
+TEST_F(SpanishPlugIn, StartsWithTheNamesOfTheUsersLanguage) {
+    EXPECT_STREQ(L"Zoetrix", ZoetrixPlugIn().PlugInName());
+    EXPECT_EQ(L"Alámbrico", record().CaptureMethod().View());
+    EXPECT_EQ(L"Animación", record().HtmlFilename().View());
+    EXPECT_EQ((wide(folder.path()) + L"/Animación").View(), record().FolderName().View());
 }

@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cfenv>
 #include <chrono>
 #include <cmath>
 #include <limits>
@@ -14,6 +15,7 @@
 namespace {
 
 constexpr double not_a_number = std::numeric_limits<double>::quiet_NaN();
+constexpr double infinite = std::numeric_limits<double>::infinity();
 
 // J. Meeus, Astronomical Algorithms (2nd edition), example 25.a: 13 October 1992 at 0 hours.
 constexpr double day_of_example = 2448908.5;
@@ -39,6 +41,15 @@ public:
     int changes = 0;
     bool was_modified = false;
     bool was_fast_modified = false;
+};
+
+/// Has the processor round up for as long as the object lives.
+class RoundingUp {
+public:
+    RoundingUp() { std::fesetround(FE_UPWARD); }
+    ~RoundingUp() { std::fesetround(FE_TONEAREST); }
+    RoundingUp(const RoundingUp&) = delete;
+    RoundingUp& operator=(const RoundingUp&) = delete;
 };
 
 CVyrSun sunOfExample(double latitude, double longitude) {
@@ -186,8 +197,8 @@ TEST(VyrSun, DatesAndTimesOutOfRangeChangeNothing) {
     EXPECT_FALSE(sun.SetLocalDateTime(2026, 0, 1, 12.0));
     EXPECT_FALSE(sun.SetLocalDateTime(2026, 13, 1, 12.0));
     EXPECT_FALSE(sun.SetLocalDateTime(2026, 1, 0, 12.0));
-    EXPECT_FALSE(sun.SetLocalDateTime(2026, 1, 1, -0.0001));
-    EXPECT_FALSE(sun.SetLocalDateTime(2026, 1, 1, 24.0001));
+    EXPECT_FALSE(sun.SetLocalDateTime(2026, 1, 1, std::nextafter(0.0, -1.0)));
+    EXPECT_FALSE(sun.SetLocalDateTime(2026, 1, 1, std::nextafter(24.0, 25.0)));
     EXPECT_FALSE(sun.SetLocalDateTime(2026, 1, 1, not_a_number));
     EXPECT_FALSE(sun.SetLocalDateTime(2199, 12, 31, 24.0));
     EXPECT_EQ(sun.LocalJulianDay(), before);
@@ -209,21 +220,23 @@ TEST(VyrSun, TheFirstAndTheLastMomentAreAccepted) {
     EXPECT_EQ(sun.LocalJulianDay(), 2524593.499999999);
 }
 
-TEST(VyrSun, PlacesAndZonesAreAcceptedUpToTheirEnds) {
+TEST(VyrSun, PlacesAndZonesAreAcceptedUpToTheirEndsAndNotAHairBeyond) {
     CVyrSun sun;
-    EXPECT_TRUE(sun.SetLatitude(-90.0));
-    EXPECT_TRUE(sun.SetLatitude(90.0));
-    EXPECT_FALSE(sun.SetLatitude(-90.0001));
-    EXPECT_FALSE(sun.SetLatitude(90.0001));
-    EXPECT_FALSE(sun.SetLatitude(not_a_number));
-    EXPECT_TRUE(sun.SetLongitude(-180.0));
-    EXPECT_TRUE(sun.SetLongitude(180.0));
-    EXPECT_FALSE(sun.SetLongitude(-180.0001));
-    EXPECT_FALSE(sun.SetLongitude(180.0001));
-    EXPECT_TRUE(sun.SetTimeZoneHours(-12.0));
-    EXPECT_TRUE(sun.SetTimeZoneHours(13.0));
-    EXPECT_FALSE(sun.SetTimeZoneHours(-12.0001));
-    EXPECT_FALSE(sun.SetTimeZoneHours(13.0001));
+    const struct {
+        bool (CVyrSun::*set)(double);
+        double least;
+        double greatest;
+    } setters[] = {{&CVyrSun::SetLatitude, -90.0, 90.0},
+                   {&CVyrSun::SetLongitude, -180.0, 180.0},
+                   {&CVyrSun::SetTimeZoneHours, -12.0, 13.0}};
+    for (const auto& [set, least, greatest] : setters) {
+        EXPECT_TRUE((sun.*set)(least));
+        EXPECT_TRUE((sun.*set)(greatest));
+        EXPECT_FALSE((sun.*set)(std::nextafter(least, -infinite)));
+        EXPECT_FALSE((sun.*set)(std::nextafter(greatest, infinite)));
+        EXPECT_FALSE((sun.*set)(infinite));
+        EXPECT_FALSE((sun.*set)(not_a_number));
+    }
     EXPECT_EQ(sun.TimeZoneHours(), 13.0);
 }
 
@@ -265,6 +278,17 @@ TEST(VyrSun, TheSameValueTwiceIsOneChange) {
     EXPECT_TRUE(sun.SetLongitude(0.0));
     EXPECT_TRUE(sun.SetTimeZoneHours(0.0));
     EXPECT_TRUE(sun.SetDaylightSavingMinutes(0));
+    EXPECT_EQ(sun.changes, 1);
+    EXPECT_FALSE(sun.IsModified());
+    EXPECT_FALSE(sun.IsFastModified());
+}
+
+TEST(VyrSun, TheSameDateAndJulianDayTwiceAreOneChange) {
+    WatchedSun sun;
+    ASSERT_TRUE(sun.SetLocalDateTime(2000, 1, 1, 12.0));
+    sun.Settle();
+    EXPECT_TRUE(sun.SetLocalDateTime(2000, 1, 1, 12.0));
+    EXPECT_TRUE(sun.SetLocalJulianDay(2451545.0)) << "noon of that day";
     EXPECT_EQ(sun.changes, 1);
     EXPECT_FALSE(sun.IsModified());
     EXPECT_FALSE(sun.IsFastModified());
@@ -378,6 +402,26 @@ TEST(VyrSun, TheFastAltitudeFollowsThePlace) {
     ASSERT_TRUE(sun.SetLongitude(151.0));
     EXPECT_FALSE(sun.IsFastModified());
     EXPECT_NEAR(sun.FastAltitude(), 54.80385693958284, 1e-8);
+}
+
+TEST(VyrSun, TheFastAltitudeComputesWhatDependsOnTheDateOnceForAllPlaces) {
+    // What is computed while the processor rounds up differs in its last digits from what is
+    // computed as usual, and the sidereal time of some hundred million degrees has lost the digits
+    // that would hide it.
+    CVyrSun usual = sunOfExample(40.0, -75.0);
+    CVyrSun rounded_up = usual;
+    usual.FastAltitude();
+    double after_usual_terms = 0.0;
+    double after_rounded_terms = 0.0;
+    {
+        const RoundingUp rounding;
+        ASSERT_TRUE(usual.SetLatitude(-33.0));
+        ASSERT_TRUE(rounded_up.SetLatitude(-33.0));
+        after_usual_terms = usual.FastAltitude();
+        after_rounded_terms = rounded_up.FastAltitude();
+    }
+    EXPECT_NE(after_usual_terms, after_rounded_terms);
+    EXPECT_NEAR(after_usual_terms, after_rounded_terms, 1e-5);
 }
 
 TEST(VyrSun, TheFastAltitudeFollowsTheTime) {

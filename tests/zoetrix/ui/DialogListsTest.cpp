@@ -2,6 +2,8 @@
 #include "zoetrix/commands/cmdZoetrix.h"
 #include "zoetrix/ui/ZoetrixDataUI.h"
 
+#include <cstdlib>
+
 namespace {
 
 using Names = KM_ClassArray<KM_wString>;
@@ -25,6 +27,13 @@ protected:
 class DialogPlugIn : public PlugInFixture {
 protected:
     DialogPlugIn() : PlugInFixture("dialogs") {}
+};
+
+/// A dialog plug-in that is as the environment says.
+class OddDialogPlugIn : public PlugInFixture {
+protected:
+    OddDialogPlugIn() : PlugInFixture("no-dialogs") {}
+    ~OddDialogPlugIn() override { unsetenv("QUARN_DIALOG_PLUG_IN"); }
 };
 
 } // namespace
@@ -116,7 +125,15 @@ TEST_F(DialogLists, UnderstandNoExtension) {
     EXPECT_EQ(0, lists.EVF(L"", &data));
     EXPECT_EQ(0, lists.EVF(L"Anything", &data));
     EXPECT_EQ(0, lists.EVF(nullptr, nullptr));
-    EXPECT_EQ(QuarnApp().MainWnd(), lists.Parent());
+}
+
+TEST_F(DialogLists, StandBeforeTheMainWindowWhereThereIsOne) {
+    const CZoetrixDataUI lists;
+    EXPECT_EQ(nullptr, lists.Parent());
+    int window = 0;
+    front_end.main_window = reinterpret_cast<HWND>(&window);
+    EXPECT_EQ(front_end.main_window, lists.Parent());
+    front_end.main_window = nullptr;
 }
 
 TEST_F(DialogLists, MissingDialogPlugInIsToldWithAWarning) {
@@ -131,6 +148,26 @@ TEST_F(DialogLists, MissingDialogPlugInIsPassedOverInSilenceWithoutTheFlag) {
     EXPECT_FALSE(LoadVexUi(false));
     EXPECT_TRUE(front_end.messages().empty());
     EXPECT_TRUE(printed().empty());
+}
+
+TEST_F(OddDialogPlugIn, IsLoadedAlsoWhenItIsMarkedAsNeverToBeLoaded) {
+    setenv("QUARN_DIALOG_PLUG_IN", "disabled", 1);
+    EXPECT_TRUE(LoadVexUi(true));
+    EXPECT_TRUE(CQuarnPlugIn::PlugInIsLoaded(ZelVexUiPlugInId));
+    EXPECT_TRUE(front_end.messages().empty());
+}
+
+TEST_F(OddDialogPlugIn, ThatRefusesIsToldLikeAMissingOne) {
+    setenv("QUARN_DIALOG_PLUG_IN", "refuses", 1);
+    EXPECT_FALSE(LoadVexUi(false));
+    EXPECT_TRUE(front_end.messages().empty());
+    EXPECT_FALSE(LoadVexUi(true));
+    ASSERT_EQ(1U, front_end.messages().size());
+    EXPECT_EQ(L"Vex UI (ZEL_VexUI.qnp) cannot be loaded.", front_end.messages()[0].text);
+    EXPECT_EQ(L"", printed()) << "the host was asked to load it quietly";
+    EXPECT_EQ(CQuarnCommand::failure, session->runCommand(L"SetTurntableAnimation", true));
+    EXPECT_EQ(2U, front_end.messages().size());
+    EXPECT_EQ(KM_3dmAnimationProperties::none, record().CaptureType());
 }
 
 TEST_F(DialogPlugIn, IsLoadedOnceAndThenFoundLoaded) {
