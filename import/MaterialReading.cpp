@@ -1,7 +1,7 @@
 #include "import/MaterialReading.h"
 
-#include "import/StoredColor.h"
 #include "import/OpacityMap.h"
+#include "import/StoredColor.h"
 #include "import/TextureDecoding.h"
 
 #include <assimp/GltfMaterial.h>

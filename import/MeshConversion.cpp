@@ -1,7 +1,7 @@
 #include "import/MeshConversion.h"
 
-#include "import/StoredColor.h"
 #include "import/IndexTable.h"
+#include "import/StoredColor.h"
 #include "import/VertexNormals.h"
 
 #include <assimp/mesh.h>

@@ -4,8 +4,6 @@
 #include "ground/TextLines.h"
 #include "host/app/Application.h"
 #include "host/border/Border.h"
-#include "ground/PathText.h"
-#include "ground/TextLines.h"
 #include "host/sun/MissingSun.h"
 
 namespace quarn {

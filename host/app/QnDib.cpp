@@ -3,8 +3,6 @@
 #include "engine/images/ImageFile.h"
 #include "ground/PathText.h"
 #include "host/app/Application.h"
-#include "ground/PathText.h"
-#include "engine/images/ImageFile.h"
 
 CQuarnDib::CQuarnDib() : m_image(std::make_unique<quarn::Image>()) {}
 CQuarnDib::~CQuarnDib() = default;

@@ -3,7 +3,6 @@
 #include "ground/PathText.h"
 #include "host/app/Application.h"
 #include "host/app/DocumentsFolder.h"
-#include "ground/PathText.h"
 #include "sdk/qncore/QnLocalize.h"
 
 #include <sys/stat.h>

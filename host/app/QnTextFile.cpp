@@ -1,9 +1,9 @@
 #include "sdk/qncore/QnTextFile.h"
 
-#include "host/app/Application.h"
 #include "ground/AtomicFile.h"
 #include "ground/PathText.h"
 #include "ground/TextEncoding.h"
+#include "host/app/Application.h"
 
 #include <unistd.h>
 

@@ -78,6 +78,10 @@ const std::vector<DialogTemplate>& ScriptedFrontEnd::dialogs() const {
     return m_dialogs;
 }
 
+const std::vector<ScriptedFrontEnd::FolderQuestion>& ScriptedFrontEnd::folderQuestions() const {
+    return m_folder_questions;
+}
+
 const std::vector<ScriptedFrontEnd::LocationQuestion>& ScriptedFrontEnd::locationQuestions() const {
     return m_location_questions;
 }
@@ -105,7 +109,9 @@ int ScriptedFrontEnd::showMessage(std::wstring_view text, std::wstring_view titl
 }
 
 std::optional<std::filesystem::path>
-ScriptedFrontEnd::chooseFolder(std::wstring_view, std::wstring_view, const std::filesystem::path&) {
+ScriptedFrontEnd::chooseFolder(std::wstring_view title, std::wstring_view message,
+                               const std::filesystem::path& start_folder) {
+    m_folder_questions.push_back({std::wstring(title), std::wstring(message), start_folder});
     return next(m_folder_choices).value_or(std::nullopt);
 }
 

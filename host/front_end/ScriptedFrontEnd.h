@@ -46,6 +46,13 @@ public:
     const std::vector<Message>& messages() const;
     /// The forms of the dialogs made so far, also of those that nobody answered.
     const std::vector<DialogTemplate>& dialogs() const;
+    struct FolderQuestion {
+        std::wstring title;
+        std::wstring message;
+        std::filesystem::path start_folder;
+    };
+    /// What chooseFolder was asked so far.
+    const std::vector<FolderQuestion>& folderQuestions() const;
     struct LocationQuestion {
         std::wstring title;
         Place start;
@@ -84,6 +91,7 @@ private:
     std::vector<Question> m_questions;
     std::vector<Message> m_messages;
     std::vector<DialogTemplate> m_dialogs;
+    std::vector<FolderQuestion> m_folder_questions;
     std::vector<LocationQuestion> m_location_questions;
     std::vector<FileQuestion> m_file_questions;
     unsigned long long m_waited_ms = 0;

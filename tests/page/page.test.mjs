@@ -1,8 +1,8 @@
 import assert from 'node:assert/strict';
 import { join } from 'node:path';
 import { after, afterEach, before, beforeEach, describe, it } from 'node:test';
-import { FRAME_DELAY_MS, openRecorded, recordTurntable, screenshotFolder, startBrowser }
-    from './recorded-page.mjs';
+import { FRAME_DELAY_MS, openRecorded, recordNothing, recordTurntable, screenshotFolder,
+         startBrowser } from './recorded-page.mjs';
 
 const FRAMES = 6;
 
@@ -179,6 +179,33 @@ describe('The page of an animation of one frame', () => {
             await opened.first.click();
             assert.equal(await opened.shownFrame(), 0);
             assert.equal(await opened.caption(), '1');
+            assert.deepEqual(opened.mistakes, []);
+        } finally {
+            await browser.close();
+            recording.remove();
+        }
+    });
+});
+
+describe('The page of a recording without pictures', () => {
+    it('stands still with nothing to show, whatever is pressed', async () => {
+        const recording = recordNothing({ name: 'Nothing' });
+        const browser = await startBrowser();
+        try {
+            const opened = await openRecorded(browser, recording.address);
+            assert.equal(await opened.page.title(), 'Nothing');
+            assert.equal(await opened.page.evaluate(() => ImageCount), 0);
+            for (const loops of [false, true]) {
+                await opened.loop.setChecked(loops);
+                for (const button of [opened.first, opened.previous, opened.next, opened.last,
+                                      opened.toggle]) {
+                    await button.click();
+                    await opened.play(3);
+                    assert.equal(await opened.toggle.innerText(), 'Start');
+                    assert.equal(await opened.caption(), '');
+                }
+            }
+            assert.equal(await opened.page.locator('#animated_image').getAttribute('src'), null);
             assert.deepEqual(opened.mistakes, []);
         } finally {
             await browser.close();

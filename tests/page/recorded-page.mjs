@@ -1,6 +1,6 @@
 // Records small animations with the built program, and opens their pages in the browser.
 import { spawnSync } from 'node:child_process';
-import { mkdtempSync, rmSync, writeFileSync } from 'node:fs';
+import { mkdirSync, mkdtempSync, rmSync, writeFileSync } from 'node:fs';
 import { tmpdir } from 'node:os';
 import { join } from 'node:path';
 import { pathToFileURL } from 'node:url';
@@ -51,6 +51,28 @@ function record(command, options, { name, width = 320, height = 180 }) {
 
 export function recordTurntable({ frames, ...common }) {
     return record('turntable', ['--frames', String(frames)], common);
+}
+
+// A turntable whose first frame cannot be written, as a folder of its name is in the way: the page of
+// a recording without a single picture.
+export function recordNothing({ name }) {
+    const folder = mkdtempSync(join(tmpdir(), 'quarn-page-'));
+    const out = join(folder, 'out');
+    mkdirSync(join(out, `${name}000.jpg`), { recursive: true });
+    writeFileSync(join(folder, 'house.obj'), house());
+    writeFileSync(join(folder, 'script.txt'), [
+        `_-AnimationName "${name}"`,
+        '_-SetTurntableAnimation 3 _Enter _Enter _Enter _Enter _Enter',
+        `_-RecordAnimation "${out}" _Enter`,
+    ].join('\n') + '\n');
+    const run = spawnSync(process.env.QUARN_PROGRAM,
+        ['run', join(folder, 'script.txt'), join(folder, 'house.obj'), '--language', 'en'],
+        { encoding: 'utf8' });
+    if (run.status !== 0) throw new Error(`quarn ended with ${run.status}: ${run.stderr}`);
+    return {
+        address: pathToFileURL(join(out, `${name}.html`)).href,
+        remove: () => rmSync(folder, { recursive: true, force: true }),
+    };
 }
 
 // The sun over Athens, from one time to another, every so many minutes.

@@ -1,5 +1,6 @@
 #include "desktop/dialogs/FormWindow.h"
 #include "desktop/dialogs/FieldMark.h"
+#include "desktop/dialogs/LocationDialog.h"
 #include "tests/desktop/dialogs/DialogDriver.h"
 
 #include <gtest/gtest.h>
@@ -346,6 +347,38 @@ TEST_F(FormWindowTest, SecondFormOpensBeforeTheFirstAndBothAreAnswered) {
         EXPECT_TRUE(form.isVisible());
         press(form, "ok");
     });
+    EXPECT_EQ(m_told.confirmations, 1);
+}
+
+TEST_F(FormWindowTest, PlaceIsChosenBeforeTheFormAndWrittenIntoItsField) {
+    m_window->setText(1, L"48.14");
+    std::vector<std::optional<Place>> chosen;
+    m_told.when_clicked = [&] {
+        chosen.push_back(askPlace(&m_owner, L"Set Animation Location", {48.14, 11.58}));
+        if (chosen.back())
+            m_window->setText(1, L"12.35");
+    };
+    run([&](QWidget& form) {
+        onceShown("location", [](QWidget& picker) { press(picker, "cancel"); });
+        press(form, "control2");
+        EXPECT_EQ(part<QLineEdit>(form, "control1").text(), "48.14");
+        onceShown("location", [](QWidget& picker) {
+            auto& latitude = part<QLineEdit>(picker, "latitude");
+            EXPECT_EQ(latitude.text(), "48.14");
+            latitude.setFocus();
+            latitude.selectAll();
+            QTest::keyClicks(&latitude, "12.3456");
+            press(picker, "ok");
+        });
+        press(form, "control2");
+        EXPECT_TRUE(form.isVisible());
+        EXPECT_EQ(part<QLineEdit>(form, "control1").text(), "12.35");
+        press(form, "ok");
+    });
+    ASSERT_EQ(chosen.size(), 2U);
+    EXPECT_FALSE(chosen[0]);
+    ASSERT_TRUE(chosen[1]);
+    EXPECT_EQ(chosen[1]->latitude_deg, 12.3456);
     EXPECT_EQ(m_told.confirmations, 1);
 }
 

@@ -120,6 +120,10 @@ TEST_F(FilesAndFolders, TheFolderChooserAnswersWithTheChoiceOrKeepsItsStart) {
     EXPECT_STREQ(dialog.GetPathName(), L"/start");
     EXPECT_EQ(dialog.DoModal(), 1);
     EXPECT_STREQ(dialog.GetPathName(), L"/chosen");
+    ASSERT_EQ(front_end.folderQuestions().size(), 2U);
+    EXPECT_EQ(front_end.folderQuestions()[0].title, L"Title");
+    EXPECT_EQ(front_end.folderQuestions()[0].message, L"Message");
+    EXPECT_EQ(front_end.folderQuestions()[0].start_folder, fs::path("/start"));
 }
 
 // ---- Text files

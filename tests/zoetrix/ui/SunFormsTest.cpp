@@ -30,6 +30,31 @@ protected:
         return was_told ? lastMessage() : L"";
     }
 
+    /// The form of a dialog, in which a control that takes dates and times takes texts, so that
+    /// what it holds is refused as the date that it is not.
+    quarn::DialogTemplate formRefusing(Dialog& dialog, int control) {
+        confirm(dialog);
+        quarn::DialogTemplate refusing = front_end.dialogs().back();
+        for (quarn::DialogControl& candidate : refusing.controls)
+            if (candidate.id == control && (candidate.kind == quarn::DialogControl::Kind::date ||
+                                            candidate.kind == quarn::DialogControl::Kind::time))
+                candidate.kind = quarn::DialogControl::Kind::text;
+        return refusing;
+    }
+    /// The controls whose members are not any more as form() made them, in the order of exchange.
+    std::vector<int> changed(const Dialog& dialog) const {
+        const std::pair<int, bool> members[] = {
+            {6004, dialog.m_latitude != latitude},     {6005, dialog.m_longitude != longitude},
+            {6006, dialog.m_north_angle != north},     {6009, dialog.m_text != L"note"},
+            {6000, dialog.m_first_date_time != first}, {6001, dialog.m_second_date_time != second},
+            {6002, dialog.m_third_date_time != third}, {6010, dialog.m_frame_step != 15}};
+        std::vector<int> controls;
+        for (const auto& [control, is_changed] : members)
+            if (is_changed)
+                controls.push_back(control);
+        return controls;
+    }
+
     double latitude = 47.5;
     double longitude = 19.05;
     double north = 30.0;
@@ -214,18 +239,34 @@ TYPED_TEST(SunForms, LocationIsKeptWhenTheFormIsClosedAfterwards) {
 }
 
 TYPED_TEST(SunForms, FieldsAreExchangedInTheirOrderUntilOneIsRefused) {
-    TypeParam dialog = this->form();
-    this->show(dialog, [](FormWindow& window) {
-        window.type(6004, L"1");
-        window.type(6005, L"2");
-        window.type(6006, L"x");
-        window.type(6009, L"not read");
-        window.pressOk();
-    });
-    EXPECT_EQ(1.0, dialog.m_latitude);
-    EXPECT_EQ(2.0, dialog.m_longitude);
-    EXPECT_EQ(30.0, dialog.m_north_angle);
-    EXPECT_EQ(L"note", dialog.m_text.View());
+    const std::vector<int> order = {6004, 6005, 6006, 6009, 6000, 6001, 6002, 6010};
+    for (auto refused = order.begin(); refused != order.end(); ++refused) {
+        if (*refused == 6009)
+            continue; // Every text is taken.
+        TypeParam dialog = this->form();
+        FormWindow window(this->formRefusing(dialog, *refused), [&](FormWindow& shown) {
+            for (const int control : order)
+                EXPECT_TRUE(shown.type(control, control == *refused ? L"x" : L"7") ||
+                            shown.choose(control, COleDateTime(2027, 1, 2, 4, 5, 6)));
+            shown.pressOk();
+        });
+        EXPECT_EQ(2, dialog.DoModalIn(window));
+        EXPECT_EQ(std::vector<int>(order.begin(), refused), this->changed(dialog)) << *refused;
+    }
+}
+
+TYPED_TEST(SunForms, EachNumberIsMeasuredBeforeTheNextOneIsRead) {
+    const std::vector<int> order = {6004, 6005, 6006};
+    for (std::size_t k = 0; k < order.size(); ++k) {
+        TypeParam dialog = this->form();
+        this->show(dialog, [&](FormWindow& window) {
+            window.type(order[k], L"999");
+            window.type(k + 1 < order.size() ? order[k + 1] : 6010, L"x");
+            window.pressOk();
+            EXPECT_EQ(order[k], window.focusedControl());
+        });
+        EXPECT_EQ(0U, this->lastMessage().find(L"Enter a number between")) << k;
+    }
 }
 
 TEST_F(OneDayForm, AsksForADayAndTwoTimes) {
