@@ -1,4 +1,4 @@
-#include "tests/support/AllocationCount.h"
+#include "tests/support/HeldMemory.h"
 #include "tests/zoetrix/fixtures/RecordingFixture.h"
 
 #include <algorithm>
