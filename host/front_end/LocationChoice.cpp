@@ -1,6 +1,5 @@
 #include "host/front_end/LocationChoice.h"
 
-#include "host/sun/CityList.h"
 #include "kelmar/KM_wString.h"
 
 #include <algorithm>

@@ -1,4 +1,4 @@
-#include "host/sun/CityList.h"
+#include "host/front_end/Cities.h"
 #include "host/sun/CityAliases.h"
 #include "host/sun/CitySpelling.h"
 
