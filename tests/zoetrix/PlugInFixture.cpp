@@ -30,7 +30,10 @@ quarn::SessionOptions optionsFor(const std::filesystem::path& folder, const std:
     quarn::SessionOptions options;
     if (!plug_ins.empty())
         options.plug_in_folders.push_back(std::filesystem::path(TEST_PLUGIN_DIR) / plug_ins);
-    options.locale_folders.push_back(std::filesystem::path(QUARN_SOURCE_DIR) / "zoetrix/locale");
+    // The plug-in's objects are part of this program, and so are its texts.
+    const std::filesystem::path sources = QUARN_SOURCE_DIR;
+    options.locale_folders.push_back(sources / "host/locale");
+    options.program_locale_folder = sources / "zoetrix/locale";
     options.language = language;
     options.documents_folder = folder;
     return options;
