@@ -1,6 +1,7 @@
 #include "import/Utf16Text.h"
 
 #include "import/ModelFileCheck.h"
+#include "kelmar/KM_wString.h"
 
 #include <algorithm>
 #include <array>
@@ -12,62 +13,22 @@
 namespace quarn {
 namespace {
 
-constexpr char32_t replacement = 0xFFFD;
-
 bool isTextFormat(std::string_view format) {
     constexpr std::array<std::string_view, 12> formats{
         "obj", "dae", "xml", "irr", "irrmesh", "ase", "ac", "amf", "x3d", "xgl", "off", "nff"};
     return std::find(formats.begin(), formats.end(), format) != formats.end();
 }
 
-void appendUtf8(char32_t c, std::string& text) {
-    const auto byte = [&text](char32_t bits) { text += static_cast<char>(bits); };
-    const auto tail = [&byte, c](int shift) { byte(0x80 | (c >> shift & 0x3F)); };
-    if (c < 0x80) {
-        byte(c);
-    } else if (c < 0x800) {
-        byte(0xC0 | c >> 6);
-        tail(0);
-    } else if (c < 0x10000) {
-        byte(0xE0 | c >> 12);
-        tail(6);
-        tail(0);
-    } else {
-        byte(0xF0 | c >> 18);
-        tail(12);
-        tail(6);
-        tail(0);
-    }
+/// Joins the two halves of a character beyond 16 bits (Unicode 15.0, section 3.9, D91). A half
+/// alone stays as it is, which is no character.
+void appendUnit(std::wstring& text, wchar_t unit) {
+    const bool is_low = unit >= 0xDC00 && unit < 0xE000;
+    const bool is_second = is_low && !text.empty() && text.back() >= 0xD800 && text.back() < 0xDC00;
+    if (is_second)
+        text.back() = 0x10000 + ((text.back() - 0xD800) << 10) + (unit - 0xDC00);
+    else
+        text += unit;
 }
-
-/// Joins the two halves of characters beyond 16 bits; a half alone becomes the replacement
-/// character (Unicode 15.0, section 3.9, D91).
-class Utf16Reading {
-public:
-    void append(char32_t unit) {
-        const bool is_low = unit >= 0xDC00 && unit < 0xE000;
-        if (m_high != 0) {
-            appendUtf8(is_low ? 0x10000 + ((m_high - 0xD800) << 10) + (unit - 0xDC00) : replacement,
-                       m_text);
-        }
-        const bool was_joined = m_high != 0 && is_low;
-        m_high = unit >= 0xD800 && unit < 0xDC00 ? unit : 0;
-        if (!was_joined && m_high == 0) {
-            appendUtf8(is_low ? replacement : unit, m_text);
-        }
-    }
-
-    std::string text() {
-        if (m_high != 0) {
-            appendUtf8(replacement, m_text);
-        }
-        return std::move(m_text);
-    }
-
-private:
-    std::string m_text;
-    char32_t m_high = 0; ///< a first half that waits for its second
-};
 
 /// An XML file states its encoding once more; what is handed on is no longer true to it.
 void correctDeclaration(std::string& text) {
@@ -94,14 +55,14 @@ std::optional<std::string> utf8OfWideFile(const std::filesystem::path& path) {
     if (!(is_big || is_little) || !isTextFormat(modelFormat(path))) {
         return std::nullopt;
     }
-    Utf16Reading reading;
+    std::wstring wide;
     std::array<unsigned char, 2> bytes{};
     while (file.read(reinterpret_cast<char*>(bytes.data()), bytes.size())) {
-        const char32_t first = bytes[0];
-        const char32_t second = bytes[1];
-        reading.append(is_big ? first << 8 | second : second << 8 | first);
+        const int first = bytes[0];
+        const int second = bytes[1];
+        appendUnit(wide, is_big ? first << 8 | second : second << 8 | first);
     }
-    std::string text = reading.text();
+    std::string text = KM_wString(wide).ToUtf8();
     correctDeclaration(text);
     return text;
 }

@@ -13,9 +13,9 @@ class KM_BinaryArchive;
 /// The animation that is set up in a document: what kind it is, where camera and target are in
 /// every frame, date and place of a sun study, how frames are drawn and where recordings go.
 ///
-/// A plain value: copies are deep. It can be played when FrameCount() is above 0 and both point
-/// arrays hold exactly FrameCount() points. Setters store what they are given; nothing is checked.
-/// References that getters return live as long as the record and follow its changes.
+/// A plain value: copies are deep. Setters store what they are given; nothing is checked, so ask
+/// IsPlayable before frames are shown. References that getters return live as long as the record
+/// and follow its changes.
 class KELMAR_API KM_3dmAnimationProperties {
 public:
     /// What moves. Documents store the values.
@@ -56,6 +56,19 @@ public:
     ///         damaged, has a newer major layout, or holds what no record can: an unknown capture
     ///         type, a coordinate that is not finite, a bool other than 0 and 1, ill-formed UTF-8
     bool Read(KM_BinaryArchive& archive);
+
+    /// Whether the sun moves, and not the camera: the study of a day or of a season.
+    bool IsSunStudy() const;
+    /// Whether there is an animation to show: at least one frame, and as many camera and target
+    /// points as frames.
+    bool IsPlayable() const;
+    /// Whether the frame points come from curves of the document: of a path both camera and target
+    /// have one, of a flythrough the camera has. A path of one curve and a point stays as it was
+    /// set up.
+    bool FollowsCurves() const;
+    /// Ids of the curves that are followed, the camera's first. They are hidden while frames are
+    /// shown. Empty when the record does not follow curves.
+    KM_SimpleArray<KM_UUID> FollowedCurves() const;
 
     /// Kind of animation that is set up. Default: none.
     CaptureTypes CaptureType() const { return m_capture_type; }

@@ -1,6 +1,7 @@
 #include "quarn/AnimationName.h"
 
 #include "quarn/Words.h"
+#include "sdk/qncore/QnAnimationName.h"
 
 #include <algorithm>
 
@@ -15,7 +16,7 @@ constexpr std::string_view FORBIDDEN_IN_ADDRESSES = "#%";
 constexpr std::size_t LONGEST_NAME = LONGEST_FILE_NAME - 14;
 
 bool isForbidden(char c) {
-    return FORBIDDEN_IN_NAMES.find(c) != std::string_view::npos ||
+    return QnIsForbiddenInNames(static_cast<unsigned char>(c)) ||
            FORBIDDEN_IN_ADDRESSES.find(c) != std::string_view::npos || hasControlCharacter({&c, 1});
 }
 

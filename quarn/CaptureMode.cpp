@@ -13,29 +13,22 @@ namespace {
 
 const std::array<std::string, 2> RENDER_METHODS{"RenderFull", "RenderPreview"};
 
-/// The name without the characters that an option cannot hold, in lower case.
+/// What two spellings of a name have in common.
 std::string comparable(std::string_view name) {
-    std::string cleaned = lowerCase(name);
-    std::erase_if(
-        cleaned, [](char c) { return std::string_view("_ -,").find(c) != std::string_view::npos; });
-    return cleaned;
+    return lowerCase(QnCleanedModeName(KM_wString::FromUtf8(name)).ToUtf8());
 }
 
 struct CaptureMode {
     std::string name;   ///< as a person reads it
     std::string option; ///< as the prompt knows it
-    bool suits_sun_studies;
+    bool draws_sun_studies;
 };
 
+/// The prompt offers sun studies every mode in which they can be seen, but their frames are drawn
+/// in the rendered mode whichever was picked.
 CaptureMode displayMode(const CDisplayPipelineAttributes& mode) {
-    const std::string name = mode.EnglishName().ToUtf8();
-    // The prompt calls these two by names of its own. It offers sun studies other modes with lights
-    // too, but the frames of a study are drawn in the rendered mode whichever was picked.
-    if (comparable(name) == "rendered")
-        return {name, "_RenderedViewport", true};
-    if (comparable(name) == "xray")
-        return {name, "_XRay", false};
-    return {name, "_" + name, false};
+    return {mode.EnglishName().ToUtf8(), "_" + QnCaptureOptionName(mode).m_english.ToUtf8(),
+            mode.Id() == CQuarnDisplayAttrsMgr::RenderedModeId()};
 }
 
 std::vector<CaptureMode> captureModes() {
@@ -67,14 +60,14 @@ bool isRendered(std::string_view option) {
 bool suitsSunStudies(std::string_view option) {
     for (const CaptureMode& mode : captureModes())
         if (mode.option == option)
-            return mode.suits_sun_studies;
+            return mode.draws_sun_studies;
     return false;
 }
 
 std::string captureModeNames(CaptureSubject subject) {
     std::string names;
     for (const CaptureMode& mode : captureModes())
-        if (subject != CaptureSubject::moving_sun || mode.suits_sun_studies)
+        if (subject != CaptureSubject::moving_sun || mode.draws_sun_studies)
             names += (names.empty() ? "" : ", ") + mode.name;
     return names;
 }

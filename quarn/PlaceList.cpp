@@ -3,6 +3,7 @@
 #include "host/cities/Cities.h"
 #include "quarn/StudySite.h"
 #include "quarn/Words.h"
+#include "sdk/zel/QnZone.h"
 
 #include <algorithm>
 #include <array>
@@ -12,23 +13,6 @@
 namespace quarn::program {
 
 namespace {
-
-bool contains(std::string_view text, const std::string& wanted) {
-    return lowerCase(text).find(wanted) != std::string::npos;
-}
-
-/// Those that have the text in their name or country, else those that may be meant by it.
-std::vector<const City*> citiesFor(const std::string& typed) {
-    const std::string wanted = lowerCase(typed);
-    std::vector<const City*> found;
-    for (const City& city : cities())
-        if (contains(city.name, wanted) || contains(city.country, wanted))
-            found.push_back(&city);
-    if (!found.empty())
-        return found;
-    const City* const city = findCity(typed);
-    return city ? std::vector{city} : citiesLike(typed);
-}
 
 using Row = std::array<std::wstring, 6>;
 
@@ -43,14 +27,18 @@ std::wstring coordinate(double degrees, wchar_t positive, wchar_t negative) {
            (degrees < 0.0 ? negative : positive);
 }
 
+std::wstring zoneText(double longitude_deg) {
+    return std::wstring(QnZoneText(60 * QnZoneOfLongitude(longitude_deg)).View());
+}
+
 Row rowOf(const City& city) {
     const double longitude_deg = city.longitude_deg;
     return {wideText(city.name),
             wideText(city.country),
             coordinate(city.latitude_deg, L'N', L'S'),
             coordinate(longitude_deg, L'E', L'W'),
-            wideText(zoneText(zoneHours(longitude_deg))),
-            wideText(zoneText(zoneHours(eastwardLongitude(longitude_deg))))};
+            zoneText(longitude_deg),
+            zoneText(eastwardLongitude(longitude_deg))};
 }
 
 std::string table(const std::vector<Row>& rows) {
@@ -71,7 +59,7 @@ std::string table(const std::vector<Row>& rows) {
 } // namespace
 
 Outcome listPlaces(const PlacesOptions& options) {
-    const std::vector<const City*> found = citiesFor(options.text);
+    const std::vector<const City*> found = citiesOf(options.text);
     if (found.empty())
         return Outcome::failure("no place is called anything like \"" + options.text +
                                 "\"; --latitude and --longitude take every place on earth.");

@@ -1,5 +1,7 @@
 #include "quarn/StudyClock.h"
 
+#include "sdk/zel/QnZone.h"
+
 namespace quarn::program {
 
 namespace {
@@ -9,10 +11,14 @@ std::string placeNote(const StudySite& site) {
     return name + latitudeText(site.latitude_deg) + ", " + longitudeText(site.longitude_deg);
 }
 
+std::string zoneText(int hours) {
+    return QnZoneText(60 * hours).ToUtf8();
+}
+
 /// A western place counted eastward is a day ahead of its own hours.
 std::string zoneNote(const SunStudyRequest& request) {
     const double longitude_deg = studyLongitude(request);
-    const int hours = zoneHours(longitude_deg);
+    const int hours = QnZoneOfLongitude(longitude_deg);
     const std::string note = "Clock: " + zoneText(hours) + ", the whole hours of longitude " +
                              longitudeText(longitude_deg) + ", without daylight saving";
     if (longitude_deg == request.site.longitude_deg)
@@ -23,7 +29,7 @@ std::string zoneNote(const SunStudyRequest& request) {
 std::string firstFrameNote(const SunStudyRequest& request) {
     const COleDateTime& start = request.start;
     COleDateTime universal = start;
-    universal += COleDateTimeSpan(0, -zoneHours(studyLongitude(request)), 0, 0);
+    universal += COleDateTimeSpan(0, -QnZoneOfLongitude(studyLongitude(request)), 0, 0);
     const bool is_same_date = dateText(universal) == dateText(start);
     return "First frame: " + dateText(start) + " " + timeOfDayText(start) + " = " +
            (is_same_date ? "" : dateText(universal) + " ") + timeOfDayText(universal) + " UTC";

@@ -9,30 +9,13 @@ namespace quarn::program {
 
 namespace {
 
-constexpr std::size_t MOST_SUGGESTIONS = 3;
-
-std::string fullName(const City& city) {
-    return std::string(city.name) + ", " + std::string(city.country);
-}
-
-/// "did you mean Athens, Greece or Accra, Ghana?"
-std::string suggestions(const std::string& typed) {
-    const std::vector<const City*> cities = citiesLike(typed);
-    const std::size_t count = std::min(cities.size(), MOST_SUGGESTIONS);
-    std::string text;
-    for (std::size_t i = 0; i < count; ++i)
-        text += (i == 0 ? "did you mean " : i + 1 == count ? " or " : "; ") + fullName(*cities[i]);
-    return text.empty() ? "quarn places lists those that are known." : text + "?";
-}
-
 void takePlace(const std::string& typed, StudySite& site, FirstMistake& mistake) {
     const City* const city = findCity(typed);
     if (!city) {
-        mistake.note("--place \"" + typed + "\" is not the name of one place; " +
-                     suggestions(typed));
+        mistake.note("--place: " + whyNoCity(typed) + " quarn places lists those that are known.");
         return;
     }
-    site.place = fullName(*city);
+    site.place = nameWithCountry(*city);
     site.latitude_deg = city->latitude_deg;
     site.longitude_deg = city->longitude_deg;
 }
@@ -83,16 +66,6 @@ double eastwardLongitude(double longitude_deg) {
     // A billionth of a degree is a tenth of a millimetre; what the sum rounds off is less.
     constexpr double BILLION = 1e9;
     return std::round((longitude_deg + 360.0) * BILLION) / BILLION;
-}
-
-int zoneHours(double longitude_deg) {
-    return static_cast<int>(longitude_deg * 24.0 / 360.0);
-}
-
-std::string zoneText(int hours) {
-    if (hours == 0)
-        return "UTC";
-    return (hours > 0 ? "UTC+" : "UTC") + std::to_string(hours);
 }
 
 std::string latitudeText(double latitude_deg) {

@@ -22,12 +22,6 @@ StudySite checkSite(const SiteOptions& options, FirstMistake& mistake);
 /// The longitude as the command of a seasonal study takes it: 0 to 360, eastward.
 double eastwardLongitude(double longitude_deg);
 
-/// The zone that a sun study takes a place to be in: the whole hours of its longitude, rounded
-/// toward zero. No border and no daylight saving enters.
-int zoneHours(double longitude_deg);
-
-/// "UTC", "UTC-7", "UTC+16"
-std::string zoneText(int hours);
 /// "37.98 N", "105.1786 W"
 std::string latitudeText(double latitude_deg);
 std::string longitudeText(double longitude_deg);

@@ -35,22 +35,6 @@ bool isOnEarth(const Place& place) {
     return std::abs(place.latitude_deg) <= 90.0 && std::abs(place.longitude_deg) <= 180.0;
 }
 
-/// "Athens, Greece; Accra, Ghana".
-std::string namesOf(const std::vector<const City*>& cities) {
-    std::string names;
-    for (const City* const city : cities)
-        names += (names.empty() ? "" : "; ") + std::string(city->name) + ", " +
-                 std::string(city->country);
-    return names;
-}
-
-std::wstring whyNoCity(const std::string& typed) {
-    const std::vector<const City*> like = citiesLike(typed);
-    const std::string hint = like.empty() ? "Type a latitude and a longitude, as in 51.5 -0.12."
-                                          : "Is it one of these: " + namesOf(like) + "?";
-    return wideText("No one city is called \"" + typed + "\". " + hint);
-}
-
 } // namespace
 
 std::variant<Place, std::wstring> placeFromText(std::wstring_view text) {
@@ -65,7 +49,7 @@ std::variant<Place, std::wstring> placeFromText(std::wstring_view text) {
     const City* const city = findCity(typed);
     if (city)
         return Place{city->latitude_deg, city->longitude_deg};
-    return whyNoCity(typed);
+    return wideText(whyNoCity(typed) + " A latitude and a longitude do as well, as in 51.5 -0.12.");
 }
 
 std::wstring textFromPlace(const Place& place) {

@@ -40,8 +40,6 @@ std::string tripleText(const Triple& point);
 /// In ASCII letters alone.
 std::string lowerCase(std::string_view ascii);
 
-/// The characters that a file name must not hold, because one system or another forbids them.
-inline constexpr std::string_view FORBIDDEN_IN_NAMES = "\\|/:*?\"<>";
 /// The longest name of a file, in bytes, that common file systems take.
 inline constexpr std::size_t LONGEST_FILE_NAME = 255;
 

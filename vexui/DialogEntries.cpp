@@ -1,16 +1,16 @@
 #include "sdk/vexui/VexUi.h"
 #include "vexui/DialogRun.h"
-#include "vexui/forms/CameraForm.h"
+#include "vexui/forms/CameraAnimationForm.h"
 #include "vexui/forms/DayForm.h"
 #include "vexui/forms/SeasonForm.h"
 
 // The dialogs that the host looks up by name.
 
-using vexui::CameraForm;
+using vexui::CameraAnimationForm;
 
 QN_PLUGIN_ENTRY bool ZelVexUiTurnTable(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) {
     const auto make = [&](QWidget* owner) {
-        return new CameraForm(CameraForm::Kind::turntable, lists, record, owner);
+        return new CameraAnimationForm(CameraAnimationForm::Kind::turntable, lists, record, owner);
     };
     return vexui::runForm(make, lists, record);
 }
@@ -18,7 +18,7 @@ QN_PLUGIN_ENTRY bool ZelVexUiTurnTable(IZoetrixDataUI& lists, KM_3dmAnimationPro
 QN_PLUGIN_ENTRY bool ZelVexUiPathAnimation(IZoetrixDataUI& lists,
                                            KM_3dmAnimationProperties& record) {
     const auto make = [&](QWidget* owner) {
-        return new CameraForm(CameraForm::Kind::path, lists, record, owner);
+        return new CameraAnimationForm(CameraAnimationForm::Kind::path, lists, record, owner);
     };
     return vexui::runForm(make, lists, record);
 }

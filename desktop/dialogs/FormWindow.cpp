@@ -1,7 +1,7 @@
 #include "desktop/dialogs/FormWindow.h"
 
 #include "desktop/Texts.h"
-#include "desktop/dialogs/ComboBoxList.h"
+#include "desktop/dialogs/ComboBoxControl.h"
 #include "desktop/dialogs/DialogOwner.h"
 #include "desktop/dialogs/FormDialog.h"
 #include "desktop/dialogs/FormField.h"
@@ -97,7 +97,7 @@ void FormWindow::setDateTime(int control, const COleDateTime& value) {
 
 std::unique_ptr<IQnComboBoxControl> FormWindow::comboBox(int control) {
     auto* const box = qobject_cast<QComboBox*>(field(control));
-    return box ? std::make_unique<ComboBoxList>(box) : nullptr;
+    return box ? std::make_unique<ComboBoxControl>(box) : nullptr;
 }
 
 void FormWindow::focus(int control) {

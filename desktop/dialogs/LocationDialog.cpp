@@ -1,7 +1,7 @@
 #include "desktop/dialogs/LocationDialog.h"
 
 #include "desktop/Texts.h"
-#include "desktop/dialogs/CityTable.h"
+#include "desktop/dialogs/CityTableModel.h"
 #include "desktop/dialogs/DialogOwner.h"
 #include "desktop/dialogs/FieldMark.h"
 #include "desktop/dialogs/PlaceText.h"
@@ -105,7 +105,7 @@ QLayout* LocationDialog::citiesSide() {
     m_search->setAccessibleName(m_search->placeholderText());
     m_search->setClearButtonEnabled(true);
     m_search->installEventFilter(this);
-    m_cities = new CityTable(this);
+    m_cities = new CityTableModel(this);
     m_table = new QTableView(this);
     m_table->setObjectName("cities");
     m_table->setAccessibleName(localized(L"Cities", 45312));

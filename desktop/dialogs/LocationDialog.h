@@ -16,7 +16,7 @@ class QTableView;
 
 namespace quarn::desktop {
 
-class CityTable;
+class CityTableModel;
 class WorldMap;
 
 /// Lets a person choose a place by its coordinates, among cities, or on a map of the world. What is
@@ -53,7 +53,7 @@ private:
     void showHovered(const std::optional<Place>& place);
 
     LocationChoice m_choice;
-    CityTable* m_cities = nullptr;
+    CityTableModel* m_cities = nullptr;
     QLineEdit* m_search = nullptr;
     QTableView* m_table = nullptr;
     QLineEdit* m_latitude = nullptr;

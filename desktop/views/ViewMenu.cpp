@@ -18,13 +18,6 @@ struct Direction {
 constexpr Direction DIRECTIONS[] = {
     {L"Top", 45010}, {L"Front", 45011}, {L"Right", 45012}, {L"Perspective", 45013}};
 
-/// A mode's English name as an option: those hold letters and digits only.
-QString optionOf(const CDisplayPipelineAttributes& mode) {
-    QString name = qtText(mode.EnglishName());
-    name.removeIf([](QChar character) { return QString("_ -,").contains(character); });
-    return name;
-}
-
 } // namespace
 
 ViewMenu::ViewMenu(ViewContext context, ViewWidget& widget)
@@ -62,7 +55,9 @@ void ViewMenu::addModes(QMenu& menu) {
         QAction& action = addChoice(menu, *group, qtText(mode.LocalName()),
                                     current && current->Id() == mode.Id());
         connect(&action, &QAction::triggered, this,
-                [this, option = optionOf(mode)] { run("_-DisplayMode _" + option); });
+                [this, option = qtText(QnCleanedModeName(mode.EnglishName()))] {
+                    run("_-DisplayMode _" + option);
+                });
     }
 }
 

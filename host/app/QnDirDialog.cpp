@@ -3,13 +3,6 @@
 #include "ground/PathText.h"
 #include "host/app/Application.h"
 
-namespace {
-
-constexpr int CHOSEN = 1;
-constexpr int NOT_CHOSEN = 2;
-
-} // namespace
-
 CQuarnUiDirDialog::CQuarnUiDirDialog(const wchar_t* title, const wchar_t* message,
                                      const wchar_t* start_folder, CWnd* parent)
     : m_title(title), m_message(message), m_path(start_folder), m_parent(parent) {}
@@ -17,11 +10,11 @@ CQuarnUiDirDialog::CQuarnUiDirDialog(const wchar_t* title, const wchar_t* messag
 int CQuarnUiDirDialog::DoModal() {
     quarn::Application* application = quarn::Application::forCall("CQuarnUiDirDialog::DoModal");
     if (!application)
-        return NOT_CHOSEN;
+        return QnDialogGivenUp;
     const auto chosen = application->frontEnd().chooseFolder(m_title.View(), m_message.View(),
                                                              quarn::pathFromText(m_path.View()));
     if (!chosen)
-        return NOT_CHOSEN;
+        return QnDialogGivenUp;
     m_path = quarn::textFromPath(*chosen);
-    return CHOSEN;
+    return QnDialogConfirmed;
 }

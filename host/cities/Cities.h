@@ -3,6 +3,7 @@
 #include "sdk/qncore/QnExport.h"
 
 #include <span>
+#include <string>
 #include <string_view>
 #include <vector>
 
@@ -40,5 +41,20 @@ QNCORE_API const City* findCity(std::string_view name);
 /// @param name  UTF-8; what follows a comma is not looked at
 /// @return at most five, valid for ever; none where nothing is like it
 QNCORE_API std::vector<const City*> citiesLike(std::string_view name);
+
+/// The cities that somebody may mean who has typed so much of a name.
+///
+/// @param typed  UTF-8: the beginning of a city's name, of another name of it, of a word of it or
+///               of its country; behind a comma the beginning of its country
+/// @return those found by their name, then by a word, then by the country, each in the order of
+///         cities(); where there is none, as citiesLike; for an empty text all cities
+QNCORE_API std::vector<const City*> citiesOf(std::string_view typed);
+
+/// "Athens, Greece", as findCity takes it; UTF-8.
+QNCORE_API std::string nameWithCountry(const City& city);
+
+/// What to tell about a name that findCity does not take: sentences that say whether no city or
+/// several have the name, and which ones may be meant; UTF-8.
+QNCORE_API std::string whyNoCity(std::string_view name);
 
 } // namespace quarn

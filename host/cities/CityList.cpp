@@ -1,4 +1,4 @@
-#include "host/cities/CityList.h"
+#include "host/cities/Cities.h"
 #include "host/cities/CityAliases.h"
 #include "host/cities/CitySpelling.h"
 

@@ -80,6 +80,14 @@ void suggest(std::vector<Suggestion>& suggestions, const City* city, std::option
         same->distance = std::min(same->distance, *distance);
 }
 
+/// "Birmingham, United Kingdom; Birmingham, United States".
+std::string namesOf(const std::vector<const City*>& cities) {
+    std::string names;
+    for (const City* city : cities)
+        names += (names.empty() ? "" : "; ") + nameWithCountry(*city);
+    return names;
+}
+
 } // namespace
 
 const City* findCity(std::string_view name) {
@@ -112,6 +120,23 @@ std::vector<const City*> citiesLike(std::string_view name) {
             result.push_back(suggestion.city);
     }
     return result;
+}
+
+std::string nameWithCountry(const City& city) {
+    return std::string(city.name) + ", " + std::string(city.country);
+}
+
+std::string whyNoCity(std::string_view name) {
+    const std::string quoted = "\"" + std::string(name) + "\"";
+    const std::vector<const City*> like = citiesLike(name);
+    std::vector<const City*> same = like;
+    std::erase_if(same,
+                  [&](const City* city) { return comparedName(city->name) != comparedName(name); });
+    if (same.size() > 1)
+        return "Several cities are called " + quoted + ": " + namesOf(same) +
+               ". Give the country too.";
+    const std::string none = "There is no city " + quoted + " in the list.";
+    return like.empty() ? none : none + " Is it one of these: " + namesOf(like) + "?";
 }
 
 } // namespace quarn

@@ -1,5 +1,7 @@
 #include "host/cities/CitySpelling.h"
 
+#include "kelmar/KM_wString.h"
+
 #include <algorithm>
 #include <vector>
 
@@ -21,77 +23,62 @@ constexpr std::string_view PLAIN_LETTERS = "aaaaaa?ceeeeiiii"
                                            "uuuuwwyyyzzzzzzs";
 static_assert(PLAIN_LETTERS.size() == 0x180 - 0xC0);
 
-/// One character of two bytes at the beginning of a text; 0 when there is none.
-unsigned twoByteCharacter(std::string_view text) {
-    if (text.size() < 2)
-        return 0;
-    const unsigned lead = static_cast<unsigned char>(text[0]);
-    const unsigned tail = static_cast<unsigned char>(text[1]);
-    const bool is_one = lead >= 0xC2 && lead <= 0xDF && (tail & 0xC0U) == 0x80;
-    return is_one ? (lead & 0x1FU) << 6U | (tail & 0x3FU) : 0;
-}
-
-std::string_view doubleLetter(unsigned character) {
+std::wstring doubleLetter(wchar_t character) {
     switch (character) {
     case 0xC6:
     case 0xE6:
-        return "ae";
+        return L"ae";
     case 0x152:
     case 0x153:
-        return "oe";
+        return L"oe";
     case 0xDF:
-        return "ss";
+        return L"ss";
     case 0xDE:
     case 0xFE:
-        return "th";
+        return L"th";
     default:
-        return "";
+        return {};
     }
 }
 
-/// What stands for a character of two bytes, which may be nothing.
-std::string plainLetters(unsigned character, std::string_view bytes) {
-    if (character >= 0x300 && character < 0x370) // an accent on the letter before it
-        return "";
-    if (character == 0x218 || character == 0x219)
-        return "s";
-    if (character == 0x21A || character == 0x21B)
-        return "t";
-    if (character == 0x2BB || character == 0x2BC || character < 0xC0) // apostrophes and marks
-        return "";
-    if (character >= 0x180)
-        return std::string(bytes);
-    const char plain = PLAIN_LETTERS[character - 0xC0];
-    return plain == '?' ? std::string(doubleLetter(character)) : std::string(1, plain);
+/// An accent on the letter before it, an apostrophe, a quotation mark or a dash.
+bool isMark(wchar_t character) {
+    return character < 0xC0 || character == 0x2BB || character == 0x2BC ||
+           (character >= 0x300 && character < 0x370) || (character >= 0x2010 && character < 0x2020);
 }
 
-/// An apostrophe, a quotation mark or a dash of typography: U+2010 to U+201F.
-bool isTypographicMark(std::string_view text) {
-    return text.starts_with("\xE2\x80") && text.size() > 2 && text[2] >= '\x90' &&
-           text[2] <= '\x9F';
+/// What stands for a character that is not of ASCII, which may be nothing.
+std::wstring plainLetters(wchar_t character) {
+    if (isMark(character))
+        return {};
+    if (character == 0x218 || character == 0x219)
+        return L"s";
+    if (character == 0x21A || character == 0x21B)
+        return L"t";
+    if (character >= 0x180)
+        return {character};
+    const char plain = PLAIN_LETTERS[static_cast<std::size_t>(character - 0xC0)];
+    return plain == '?' ? doubleLetter(character) : std::wstring{static_cast<wchar_t>(plain)};
+}
+
+std::wstring comparedCharacter(wchar_t character) {
+    if (character >= 0x80)
+        return plainLetters(character);
+    if (character >= L'A' && character <= L'Z')
+        return {static_cast<wchar_t>(character - L'A' + L'a')};
+    const bool stays =
+        (character >= L'a' && character <= L'z') || (character >= L'0' && character <= L'9');
+    return stays ? std::wstring{character} : std::wstring{};
 }
 
 } // namespace
 
 std::string comparedName(std::string_view name) {
-    std::string result;
-    while (!name.empty()) {
-        std::size_t length = 1;
-        const char letter = name.front();
-        if (const unsigned character = twoByteCharacter(name)) {
-            length = 2;
-            result += plainLetters(character, name.substr(0, length));
-        } else if (isTypographicMark(name)) {
-            length = 3;
-        } else if (letter >= 'A' && letter <= 'Z') {
-            result += static_cast<char>(letter - 'A' + 'a');
-        } else if ((letter >= 'a' && letter <= 'z') || (letter >= '0' && letter <= '9') ||
-                   (static_cast<unsigned char>(letter) & 0x80U)) {
-            result += letter;
-        }
-        name.remove_prefix(length);
-    }
-    return result;
+    const KM_wString written = KM_wString::FromUtf8(name);
+    std::wstring compared;
+    for (const wchar_t character : written.View())
+        compared += comparedCharacter(character);
+    return KM_wString(compared).ToUtf8();
 }
 
 int lettersApart(std::string_view one, std::string_view other) {

@@ -8,7 +8,7 @@ namespace quarn {
 /// A name as it is compared: small letters and digits alone. Accents of the Latin letters are
 /// dropped, whether they stand in the letter or follow it; blanks and ASCII marks too. Characters
 /// of other scripts stay as they are.
-/// @param name  UTF-8; bytes that are none stay as they are
+/// @param name  UTF-8
 std::string comparedName(std::string_view name);
 
 /// How many letters must be changed, put in, left out or swapped with their neighbour to turn one

@@ -1,6 +1,5 @@
 #include "host/cities/LocationChoice.h"
 
-#include "host/cities/CityList.h"
 #include "kelmar/KM_wString.h"
 
 #include <algorithm>

@@ -81,10 +81,9 @@ Result<void> loadWindow(QXDialogController* controller, const CQuarnDialog& dial
 }
 
 int runWindow(QXDialogController* controller, const BoundKeys& keys, CQuarnDialog& dialog) {
-    constexpr int CONFIRMED = 1;
     CocoaDialogWindow window(controller, keys);
     const int result = dialog.DoModalIn(window);
-    if (result != CONFIRMED) {
+    if (result != QnDialogConfirmed) {
         keys.putBack();
     }
     return result;

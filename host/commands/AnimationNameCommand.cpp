@@ -1,6 +1,7 @@
 #include "host/commands/CommandEnd.h"
 #include "host/commands/HostCommands.h"
 #include "host/document/Document.h"
+#include "sdk/qncore/QnAnimationName.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
@@ -10,13 +11,9 @@ namespace quarn {
 
 namespace {
 
-/// A name of this many characters or more is refused by the commands that record.
-constexpr int TOO_LONG = 256;
-
 bool isForbidden(wchar_t character) {
-    constexpr std::wstring_view FORBIDDEN = L"\\|/:*?\"<>";
     const bool is_control = character < 32 || (character >= 127 && character < 160);
-    return is_control || FORBIDDEN.find(character) != std::wstring_view::npos;
+    return is_control || QnIsForbiddenInNames(character);
 }
 
 bool isFolderName(std::wstring_view name) {
@@ -30,9 +27,9 @@ std::string whyRefused(const KM_wString& name) {
     const std::wstring_view text = name.View();
     if (trimmed.IsEmpty())
         return "The name of an animation cannot be empty.";
-    if (name.Length() >= TOO_LONG)
-        return "The name of an animation has at most 255 characters, not " +
-               std::to_string(name.Length()) + ".";
+    if (name.Length() > QnLongestAnimationName)
+        return "The name of an animation has at most " + std::to_string(QnLongestAnimationName) +
+               " characters, not " + std::to_string(name.Length()) + ".";
     if (std::any_of(text.begin(), text.end(), isForbidden))
         return "The name of an animation becomes part of file names: it cannot hold "
                "\\ | / : * ? \" < > or control characters.";

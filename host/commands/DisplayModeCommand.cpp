@@ -8,16 +8,10 @@ namespace quarn {
 
 namespace {
 
-/// A mode's name as an option: options hold letters and digits only.
-KM_wString optionText(KM_wString name) {
-    for (const wchar_t character : {L'_', L' ', L'-', L','})
-        name.Remove(character);
-    return name;
-}
-
 void addModes(CQuarnGetOption& get) {
     for (const CDisplayPipelineAttributes& mode : DisplayModeList::instance().modes())
-        get.AddCommandOption({optionText(mode.EnglishName()), optionText(mode.LocalName())});
+        get.AddCommandOption(
+            {QnCleanedModeName(mode.EnglishName()), QnCleanedModeName(mode.LocalName())});
 }
 
 std::string modeNames() {

@@ -16,9 +16,9 @@ std::optional<CQuarnCommand::result> askInForm(const CQuarnCommandContext& conte
     if (!mayAskInForm(context))
         return std::nullopt;
     const std::optional<int> ended = DialogState::of(form).showWhereThereAreDialogs();
-    if (ended == DialogState::CONFIRMED)
+    if (ended == QnDialogConfirmed)
         return CQuarnCommand::success;
-    return ended == DialogState::GIVEN_UP ? std::optional(CQuarnCommand::cancel) : std::nullopt;
+    return ended == QnDialogGivenUp ? std::optional(CQuarnCommand::cancel) : std::nullopt;
 }
 
 void exchangeWhole(CQnDialogExchange& exchange, int control, int& number, int least, int greatest) {

@@ -1,4 +1,5 @@
 #include "host/app/Application.h"
+#include "host/commands/CommandEnd.h"
 #include "host/commands/FileAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/WordsLeft.h"
@@ -37,11 +38,9 @@ CQuarnCommand::result runHelp(const CQuarnCommandContext&) {
     if (get.GetString() != CQuarnGet::string)
         return get.CommandResult();
     const RegisteredCommand* entry = application.commands().find(get.String());
-    if (!entry) {
-        application.tell("Unknown command: " + KM_wString(get.String()).ToUtf8() +
-                         ". Type Help for the list.");
-        return CQuarnCommand::failure;
-    }
+    if (!entry)
+        return fail("Unknown command: " + KM_wString(get.String()).ToUtf8() +
+                    ". Type Help for the list.");
     printLine(application, *entry);
     return CQuarnCommand::success;
 }
@@ -54,11 +53,10 @@ CQuarnCommand::result runLoadPlugIn(const CQuarnCommandContext& context) {
     if (asked != CQuarnCommand::success)
         return asked;
     const PlugInLoad load = application.plugIns().load(file);
-    if (load.ok())
-        application.tell("Loaded " + file.filename().string() + ".");
-    else
-        application.tell(load.message);
-    return load.ok() ? CQuarnCommand::success : CQuarnCommand::failure;
+    if (!load.ok())
+        return fail(load.message);
+    application.tell("Loaded " + file.filename().string() + ".");
+    return CQuarnCommand::success;
 }
 
 } // namespace quarn

@@ -41,16 +41,6 @@ struct FrameScene {
     SceneChanges changes;
 };
 
-bool isSunStudy(const KM_3dmAnimationProperties& record) {
-    return record.CaptureType() == KM_3dmAnimationProperties::one_day_sun ||
-           record.CaptureType() == KM_3dmAnimationProperties::seasonal_sun;
-}
-
-bool hasFrames(const KM_3dmAnimationProperties& record) {
-    return record.FrameCount() >= 1 && record.CameraPoints().Count() == record.FrameCount() &&
-           record.TargetPoints().Count() == record.FrameCount();
-}
-
 Result<ViewState*> viewOf(const KM_3dmAnimationProperties& record, const Document& document) {
     KM_wString name = record.ViewportName();
     name.TrimLeftAndRight();
@@ -73,7 +63,7 @@ Result<Animation> storedAnimation(Document& document) {
     if (!record)
         return Error{"The animation cannot be read: " + record.message()};
     animation.record = record.value();
-    if (!hasFrames(*animation.record))
+    if (!animation.record->IsPlayable())
         return Error{"The document has no animation. Set one up, or open a document that has one."};
     const auto view = viewOf(*animation.record, document);
     if (!view)
@@ -157,17 +147,6 @@ Result<FrameScene> sunAtFrame(const Animation& animation, int frame) {
     return scene;
 }
 
-/// The curves that a camera follows are not part of the picture.
-std::vector<KM_UUID> hiddenPaths(const KM_3dmAnimationProperties& record) {
-    const KM_UUID camera_path = record.CameraPathId();
-    const KM_UUID target_path = record.TargetPathId();
-    if (record.CaptureType() == KM_3dmAnimationProperties::flythrough)
-        return {camera_path};
-    const bool follows_both = record.CaptureType() == KM_3dmAnimationProperties::path &&
-                              !KM_UuidIsNil(camera_path) && !KM_UuidIsNil(target_path);
-    return follows_both ? std::vector{camera_path, target_path} : std::vector<KM_UUID>();
-}
-
 Result<FrameScene> cameraAtFrame(const Animation& animation, int frame) {
     FrameScene scene;
     const auto found = acrossBorder([&] {
@@ -178,7 +157,8 @@ Result<FrameScene> cameraAtFrame(const Animation& animation, int frame) {
         return Error{"The camera of frame " + std::to_string(frame) +
                      " cannot be placed: its point and its target must be two different points. "
                      "Set the animation up again."};
-    scene.changes.hidden = hiddenPaths(*animation.record);
+    for (const KM_UUID& curve : animation.record->FollowedCurves())
+        scene.changes.hidden.push_back(curve);
     return scene;
 }
 
@@ -191,7 +171,7 @@ void fitToPicture(KM_Viewport& viewport, const ViewState& view, const FrameWish&
 /// What the animation is recorded with; the view's own mode where the record's is none of the
 /// host's; null when there is neither.
 const CDisplayPipelineAttributes* recordedMode(const Animation& animation) {
-    const KM_UUID id = isSunStudy(*animation.record) ? rendered_mode_id
+    const KM_UUID id = animation.record->IsSunStudy() ? rendered_mode_id
                        : KM_UuidIsNil(animation.record->DisplayMode())
                            ? wireframe_mode_id
                            : animation.record->DisplayMode();
@@ -226,8 +206,8 @@ CQuarnCommand::result renderFrame(const Animation& animation, const FrameWish& w
 }
 
 CQuarnCommand::result saveFrame(const Animation& animation, const FrameWish& wish) {
-    auto scene = isSunStudy(*animation.record) ? sunAtFrame(animation, wish.frame)
-                                               : cameraAtFrame(animation, wish.frame);
+    auto scene = animation.record->IsSunStudy() ? sunAtFrame(animation, wish.frame)
+                                                : cameraAtFrame(animation, wish.frame);
     if (!scene)
         return fail(scene.message());
     fitToPicture(scene.value().viewport, *animation.view, wish);

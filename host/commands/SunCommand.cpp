@@ -11,6 +11,7 @@
 #include "host/sun/SunDirection.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
+#include "sdk/zel/QnZone.h"
 
 #include <cmath>
 
@@ -60,11 +61,10 @@ CQuarnCommand::result moveByAngles(DocumentSun& sun) {
 KM_wString whereAndWhen(const SunWish& wish, const SunPosition& position) {
     KM_wString text;
     if (wish.city)
-        text += KM_wString::FromUtf8(std::string(wish.city->name) + ", " +
-                                     std::string(wish.city->country) + ": ");
+        text += KM_wString::FromUtf8(nameWithCountry(*wish.city) + ": ");
     text += L"latitude " + angleText(wish.site.latitude_deg) + L", longitude " +
             angleText(wish.site.longitude_deg) + L"\n";
-    text += wish.clock.time.Format() + L" " + zoneText(wish.clock.zone_minutes) + L" is " +
+    text += wish.clock.time.Format() + L" " + QnZoneText(wish.clock.zone_minutes) + L" is " +
             universalTime(wish.clock).Format() + L" universal time\n";
     return text + L"azimuth " + azimuthText(position.azimuth_deg) + L" from north, altitude " +
            angleText(position.altitude_deg) + L"\n";
@@ -92,7 +92,7 @@ PlaceAndTime placeAndTimeOf(const KM_3dmAnimationProperties& record) {
     PlaceAndTime study;
     study.site = {record.Latitude(), record.Longitude()};
     study.clock.time = {record.StartYear(), record.StartMonth(), record.StartDay(), 12, 0, 0};
-    study.clock.zone_minutes = zoneOfLongitude(record.Longitude());
+    study.clock.zone_minutes = 60 * QnZoneOfLongitude(record.Longitude());
     study.north_angle_deg = record.NorthAngle();
     return study;
 }

@@ -6,6 +6,7 @@
 #include "host/sun/SunDirection.h"
 #include "sdk/qncore/QnLocalize.h"
 #include "sdk/qncore/QnLocationDialog.h"
+#include "sdk/zel/QnZone.h"
 
 #include <algorithm>
 #include <cmath>
@@ -88,7 +89,7 @@ void SunForm::exchangePlaceAndTime(CQnDialogExchange& exchange) {
 /// The zone of the longitude is an empty field, so that it follows when the place is changed.
 void SunForm::exchangeZone(CQnDialogExchange& exchange) {
     int& zone_minutes = m_entered.clock.zone_minutes;
-    const int usual_minutes = zoneOfLongitude(m_entered.site.longitude_deg);
+    const int usual_minutes = 60 * QnZoneOfLongitude(m_entered.site.longitude_deg);
     if (!exchange.IsStoring()) {
         SetDlgItemText(zone_id, zone_minutes == usual_minutes ? KM_wString()
                                                               : numberText(zone_minutes / 60.0));

@@ -5,6 +5,7 @@
 #include "host/commands/WordsLeft.h"
 #include "host/prompt/NumberText.h"
 #include "sdk/qncore/QnGet.h"
+#include "sdk/zel/QnZone.h"
 
 #include <cmath>
 
@@ -30,30 +31,6 @@ template <class Take> CQuarnCommand::result askText(const wchar_t* prompt, Take 
     }
 }
 
-/// "Birmingham, United Kingdom; Birmingham, United States".
-std::string namesOf(const std::vector<const City*>& cities) {
-    std::string names;
-    for (const City* city : cities)
-        names += (names.empty() ? "" : "; ") + std::string(city->name) + ", " +
-                 std::string(city->country);
-    return names;
-}
-
-std::string whyNoCity(const std::string& name) {
-    const std::vector<const City*> like = citiesLike(name);
-    std::vector<const City*> same = like;
-    std::erase_if(same,
-                  [&](const City* city) { return comparedName(city->name) != comparedName(name); });
-    if (same.size() > 1)
-        return "Several cities are called \"" + name + "\": " + namesOf(same) +
-               ". Give the country too, in double quotes.";
-    std::string text = "There is no city \"" + name + "\" in the list.";
-    if (!like.empty())
-        text += " Is it one of these: " + namesOf(like) +
-                "? A name with blanks stands in double quotes.";
-    return text + " Any place can be given by its latitude and longitude.";
-}
-
 class PlaceQuestion {
 public:
     explicit PlaceQuestion(SunWish& wish) : m_wish(wish), m_is_line(hasWordsLeft()) {}
@@ -64,7 +41,7 @@ public:
             asked = askTime();
         if (asked != CQuarnCommand::success)
             return asked;
-        m_wish.clock.zone_minutes = zoneOfLongitude(m_wish.site.longitude_deg);
+        m_wish.clock.zone_minutes = 60 * QnZoneOfLongitude(m_wish.site.longitude_deg);
         return askZoneAndNorth();
     }
 
@@ -95,7 +72,8 @@ private:
         const std::string name = KM_wString(text).ToUtf8();
         m_wish.city = findCity(name);
         if (!m_wish.city)
-            return Error{whyNoCity(name)};
+            return Error{whyNoCity(name) + " A name with blanks stands in double quotes. Any place "
+                                           "can be given by its latitude and longitude."};
         m_wish.site = {m_wish.city->latitude_deg, m_wish.city->longitude_deg};
         return {};
     }

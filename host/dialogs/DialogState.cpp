@@ -64,17 +64,17 @@ int DialogState::show() {
                                                     42411),
                                    form.title.Array())
             .ToUtf8());
-    return NOT_SHOWN;
+    return QnDialogNotShown;
 }
 
 std::optional<int> DialogState::showWhereThereAreDialogs() {
     Application* application = Application::forCall("CDialog::DoModal");
     if (!application || !mayOpen(*application))
-        return NOT_SHOWN;
+        return QnDialogNotShown;
     Result<DialogTemplate> read = readForm(*application);
     if (!read) {
         application->tell(read.message());
-        return NOT_SHOWN;
+        return QnDialogNotShown;
     }
     form = std::move(read.value());
     const auto made = application->frontEnd().makeDialog(form, parent ? parent->m_hWnd : nullptr);
@@ -90,7 +90,7 @@ Result<DialogTemplate> DialogState::readForm(Application& application) const {
 int DialogState::showIn(DialogWindow& shown_window) {
     Application* application = Application::forCall("CQuarnDialog::DoModalIn");
     if (!application || !mayOpen(*application))
-        return NOT_SHOWN;
+        return QnDialogNotShown;
     Result<DialogTemplate> read = readForm(*application);
     form = read ? std::move(read.value()) : DialogTemplate{};
     form.controls.clear();
@@ -106,7 +106,7 @@ int DialogState::runIn(Application& application, DialogWindow& shown_window) {
         shown_window.focus(form.controls.front().id);
     if (!result)
         shown_window.run(*this);
-    return result.value_or(GIVEN_UP);
+    return result.value_or(QnDialogGivenUp);
 }
 
 void DialogState::end(int how) {
@@ -142,7 +142,7 @@ void DialogState::call(const char* name, const std::function<void()>& operation)
     Application::current()->tell(std::string(name) + " of the dialog " +
                                  std::to_string(template_id) +
                                  " stopped with an error: " + called.message() + ".");
-    end(NOT_SHOWN);
+    end(QnDialogNotShown);
 }
 
 AttachedComboBoxes::AttachedComboBoxes(const DialogState& state, DialogWindow& window) {

@@ -16,10 +16,6 @@ class Application;
 
 /// What a dialog is while it is open and before: the parts of a CDialog that plug-ins do not see.
 struct DialogState final : DialogEvents {
-    static constexpr int CONFIRMED = 1;
-    static constexpr int GIVEN_UP = 2;
-    static constexpr int NOT_SHOWN = -1;
-
     DialogState(CDialog& owner, int id, CWnd* parent_window)
         : dialog(owner), template_id(id), parent(parent_window) {}
 

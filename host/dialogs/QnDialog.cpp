@@ -77,11 +77,11 @@ int CDialog::OnInitDialog() {
 
 void CDialog::OnOK() {
     if (UpdateData(true))
-        EndDialog(DialogState::CONFIRMED);
+        EndDialog(QnDialogConfirmed);
 }
 
 void CDialog::OnCancel() {
-    EndDialog(DialogState::GIVEN_UP);
+    EndDialog(QnDialogGivenUp);
 }
 
 void CDialog::OnButton(int) {}

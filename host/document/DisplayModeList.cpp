@@ -8,8 +8,7 @@ namespace quarn {
 
 namespace {
 
-/// The texts by which the modes are named in the string tables. Commands of plug-ins look some of
-/// them up by the same numbers and compare, so these must not change.
+/// The texts by which the modes are named in the string tables.
 constexpr struct {
     const wchar_t* english_name;
     int text_id;
@@ -36,13 +35,9 @@ CDisplayPipelineAttributes attributesOf(const DisplayModeAttributes& mode) {
     return attributes;
 }
 
-/// The name as an option can be called: lower case, without the characters that options lack.
-KM_wString plainName(std::wstring_view name) {
-    KM_wString plain(name);
-    for (const wchar_t character : {L'_', L' ', L'-', L','})
-        plain.Remove(character);
-    plain.MakeLower();
-    return plain;
+/// Whether a name that somebody gave is this one, as options compare.
+bool isNamed(const KM_wString& cleaned, const KM_wString& name) {
+    return cleaned.CompareNoCase(QnCleanedModeName(name)) == 0;
 }
 
 } // namespace
@@ -70,12 +65,10 @@ const CDisplayPipelineAttributes* DisplayModeList::find(const KM_UUID& id) const
 }
 
 const CDisplayPipelineAttributes* DisplayModeList::findByName(std::wstring_view name) const {
-    const KM_wString wanted = plainName(name);
-    if (wanted == L"renderedviewport")
-        return find(rendered_mode_id);
+    const KM_wString wanted = QnCleanedModeName(KM_wString(name));
     for (const CDisplayPipelineAttributes& mode : m_modes)
-        if (plainName(mode.EnglishName().View()) == wanted ||
-            plainName(mode.LocalName().View()) == wanted)
+        if (isNamed(wanted, mode.EnglishName()) || isNamed(wanted, mode.LocalName()) ||
+            isNamed(wanted, QnCaptureOptionName(mode).m_english))
             return &mode;
     return nullptr;
 }
@@ -92,6 +85,15 @@ DisplayModeAttributes drawingAttributes(const CDisplayPipelineAttributes& attrib
 }
 
 } // namespace quarn
+
+CQuarnCommandOptionName QnCaptureOptionName(const CDisplayPipelineAttributes& mode) {
+    const KM_wString name = QnCleanedModeName(mode.LocalName());
+    if (quarn::isNamed(name, QnLocalizeString(L"Rendered", 19746)))
+        return {L"RenderedViewport", QnLocalizeString(L"RenderedViewport", 19747)};
+    if (quarn::isNamed(name, QnLocalizeString(L"X-Ray", 20120)))
+        return {L"XRay", QnLocalizeString(L"XRay", 20121)};
+    return {mode.EnglishName(), name};
+}
 
 int CQuarnDisplayAttrsMgr::GetDisplayAttrsList(
     KM_SimpleArray<const CDisplayPipelineAttributes*>& list) {

@@ -11,16 +11,10 @@ namespace quarn {
 
 namespace {
 
-bool canPlay(const KM_3dmAnimationProperties& record) {
-    return record.FrameCount() > 0 && record.CameraPoints().Count() == record.FrameCount() &&
-           record.TargetPoints().Count() == record.FrameCount();
-}
-
 AnimationState stateOf(const KM_3dmAnimationProperties& record) {
     AnimationState state;
-    state.can_play = canPlay(record);
-    state.is_sun_study = record.CaptureType() == KM_3dmAnimationProperties::one_day_sun ||
-                         record.CaptureType() == KM_3dmAnimationProperties::seasonal_sun;
+    state.can_play = record.IsPlayable();
+    state.is_sun_study = record.IsSunStudy();
     if (state.can_play) {
         state.frame_count = record.FrameCount();
         state.current_frame = std::clamp(record.CurrentFrame(), 0, state.frame_count - 1);

@@ -7,7 +7,6 @@
 #include <algorithm>
 #include <array>
 #include <cmath>
-#include <cstdlib>
 
 namespace quarn {
 namespace {
@@ -65,17 +64,6 @@ Result<COleDateTime> readDate(std::wstring_view text) {
 }
 
 } // namespace
-
-int zoneOfLongitude(double longitude_deg) {
-    return static_cast<int>(longitude_deg / 15) * 60;
-}
-
-KM_wString zoneText(int zone_minutes) {
-    const int size = std::abs(zone_minutes);
-    const KM_wString hours =
-        KM_wString::FormatToString(L"UTC%c%d", zone_minutes < 0 ? L'-' : L'+', size / 60);
-    return size % 60 == 0 ? hours : hours + KM_wString::FormatToString(L":%02d", size % 60);
-}
 
 COleDateTime universalTime(const ClockTime& clock) {
     COleDateTime time = clock.time;

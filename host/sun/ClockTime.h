@@ -15,14 +15,6 @@ struct ClockTime {
     int zone_minutes = 0; ///< what the clocks are ahead of universal time
 };
 
-/// The zone that follows from a longitude, as in sun studies: whole hours, longitude / 15 without
-/// its fraction. The clocks of a country may show another one, and daylight saving.
-/// @return minutes ahead of universal time
-int zoneOfLongitude(double longitude_deg);
-
-/// "UTC+1", "UTC-3:30", "UTC+0".
-KM_wString zoneText(int zone_minutes);
-
 /// What clocks of universal time show at the same moment.
 COleDateTime universalTime(const ClockTime& clock);
 

@@ -3,6 +3,7 @@
 #include "kelmar/KM_wString.h"
 #include "sdk/qncore/QnComboBox.h"
 #include "sdk/qncore/QnDateTime.h"
+#include "sdk/qncore/QnDialogResult.h"
 #include "sdk/qncore/QnExport.h"
 #include "sdk/qncore/QnWnd.h"
 
@@ -43,9 +44,10 @@ public:
     virtual const CQnRuntimeClass* GetRuntimeClass() const;
 
     /// Shows the dialog and waits until it is closed.
-    /// @return 1 when it was confirmed, 2 when it was not; -1, after a message, when it cannot be
-    ///         shown: there is nobody to show it to, the template is missing or wrong, another
-    ///         dialog of this host is open already, or an operation of it threw
+    /// @return as EndDialog was told, by the base QnDialogConfirmed or QnDialogGivenUp;
+    ///         QnDialogNotShown, after a message, when it cannot be shown: there is nobody to show
+    ///         it to, the template is missing or wrong, another dialog of this host is open
+    ///         already, or an operation of it threw
     int DoModal();
 
     int TemplateId() const;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "kelmar/KM_wString.h"
+#include "sdk/qncore/QnDialogResult.h"
 #include "sdk/qncore/QnExport.h"
 #include "sdk/qncore/QnWnd.h"
 
@@ -14,7 +15,8 @@ public:
     CQuarnUiDirDialog(const wchar_t* title, const wchar_t* message, const wchar_t* start_folder,
                       CWnd* parent);
 
-    /// @return 1 when a folder was chosen; 2 when not, also where nobody can choose one
+    /// @return QnDialogConfirmed when a folder was chosen; QnDialogGivenUp when not, also where
+    ///         nobody can choose one
     int DoModal();
 
     /// The chosen folder; the start folder before one was chosen.

@@ -4,6 +4,7 @@
 #include "kelmar/KM_Uuid.h"
 #include "kelmar/KM_wString.h"
 #include "sdk/qncore/QnExport.h"
+#include "sdk/qncore/QnLocalize.h"
 
 /// What a display mode looks like. A value: a copy may be changed and drawn with.
 class QNCORE_API CDisplayPipelineAttributes {
@@ -15,6 +16,12 @@ public:
     const KM_wString& EnglishName() const { return m_english_name; }
     const KM_wString& LocalName() const { return m_local_name; }
 
+    /// Whether a sun study can be seen in this mode: it draws surfaces, and the document's lights
+    /// or their shadows on them.
+    bool ShowsSunStudies() const {
+        return m_mode_kind == shaded && (m_uses_document_lights || m_casts_shadows);
+    }
+
     KM_UUID m_id = KM_nil_uuid;
     KM_wString m_english_name;
     KM_wString m_local_name;
@@ -23,6 +30,18 @@ public:
     bool m_casts_shadows = false;        ///< directional lights cast shadows
     int m_antialiasing_level = 1;        ///< 0 off, 1 screen, 2 capture
 };
+
+/// A mode's name as an option can hold it: without "_", " ", "-" and ",".
+inline KM_wString QnCleanedModeName(KM_wString name) {
+    for (const wchar_t character : {L'_', L' ', L'-', L','})
+        name.Remove(character);
+    return name;
+}
+
+/// The name by which the commands that set up animations offer a mode. The rendered and the x-ray
+/// mode, known by their local names, are "RenderedViewport" and "XRay" in either language's form;
+/// another mode has its English name as it stands, and its local name cleaned.
+QNCORE_API CQuarnCommandOptionName QnCaptureOptionName(const CDisplayPipelineAttributes& mode);
 
 /// The display modes of the host.
 class QNCORE_API CQuarnDisplayAttrsMgr {

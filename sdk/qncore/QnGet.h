@@ -56,9 +56,8 @@ public:
     /// `option`.
     ///
     /// @param current   the value shown first
-    /// @param variable  set to `current` now, changed by each pick; must outlive the question or
-    /// its
-    ///                  next ClearCommandOptions. May be null.
+    /// @param variable  set to `current` now, changed by each pick; may be null. Must outlive the
+    ///                  question, or its next ClearCommandOptions.
     /// @return its index, from 1, or 0 when the name is empty or there already
     int AddCommandOptionToggle(const CQuarnCommandOptionName& name,
                                const CQuarnCommandOptionValue& off_value,
@@ -175,10 +174,9 @@ public:
     ///                 with none given is `nothing`, with AcceptNothing(true)
     /// @param maximum  the question ends by itself when so many were given, so 1 and 1 is one pick;
     ///                 0 or less: only Enter ends it. Less than the minimum counts as the minimum
-    /// @return `object` when objects were given. Picking an option ends the question; asked again
-    /// it
-    ///         goes on with the objects that were given before. After `cancel` and `nothing` there
-    ///         are none
+    /// @return `object` when objects were given. Picking an option ends the question; when asked
+    ///         again it goes on with the objects that were given before. After `cancel` and
+    ///         `nothing` there are none
     result GetObjects(int minimum = 1, int maximum = 1);
 
     /// How many objects were given.

@@ -21,8 +21,8 @@ public:
     CQnTextFile(const CQnTextFile&) = delete;
     CQnTextFile& operator=(const CQnTextFile&) = delete;
 
-    /// @return false when the folder does not exist or cannot be written, the path is a folder, or
-    ///         a file is open already
+    /// @return false when the folder does not exist or cannot be written, when the path is a
+    ///         folder, or when a file is open already
     bool Open(const wchar_t* path, open_mode mode, filetype type);
     /// Adds text. @return false when no file is open
     bool WriteString(const wchar_t* text);

@@ -2,11 +2,13 @@
 
 /// The host's whole programming interface.
 
+#include "sdk/qncore/QnAnimationName.h"
 #include "sdk/qncore/QnApp.h"
 #include "sdk/qncore/QnComboBox.h"
 #include "sdk/qncore/QnCommand.h"
 #include "sdk/qncore/QnDateTime.h"
 #include "sdk/qncore/QnDialog.h"
+#include "sdk/qncore/QnDialogResult.h"
 #include "sdk/qncore/QnDib.h"
 #include "sdk/qncore/QnDirDialog.h"
 #include "sdk/qncore/QnDisplayAttributes.h"

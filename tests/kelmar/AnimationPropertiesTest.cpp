@@ -3,6 +3,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <initializer_list>
 #include <type_traits>
 #include <utility>
 
@@ -99,4 +101,79 @@ TEST(AnimationProperties, PointsOfAConstRecordCanBeReadButNotChanged) {
     const Record record = filledRecord();
     EXPECT_EQ(record.CameraPoints().Count(), 1);
     EXPECT_EQ(record.TargetPoints().Count(), 1);
+}
+
+namespace {
+
+constexpr KM_UUID rail{0x11111111, 0x2222, 0x3333, {1, 2, 3, 4, 5, 6, 7, 8}};
+constexpr KM_UUID gaze{0x44444444, 0x5555, 0x6666, {8, 7, 6, 5, 4, 3, 2, 1}};
+
+Record following(Record::CaptureTypes type, const KM_UUID& camera_path,
+                 const KM_UUID& target_path) {
+    Record record;
+    record.SetCaptureType(type);
+    record.SetCameraPathId(camera_path);
+    record.SetTargetPathId(target_path);
+    return record;
+}
+
+void expectFollowed(const Record& record, std::initializer_list<KM_UUID> curves) {
+    EXPECT_EQ(record.FollowsCurves(), curves.size() > 0);
+    const KM_SimpleArray<KM_UUID> followed = record.FollowedCurves();
+    EXPECT_TRUE(std::equal(followed.begin(), followed.end(), curves.begin(), curves.end()));
+}
+
+} // namespace
+
+TEST(AnimationProperties, SunStudiesAreThoseOfADayAndOfASeason) {
+    const std::pair<Record::CaptureTypes, bool> kinds[] = {
+        {Record::path, false},       {Record::turntable, false},   {Record::flythrough, false},
+        {Record::one_day_sun, true}, {Record::seasonal_sun, true}, {Record::none, false}};
+    for (const auto& [kind, is_sun_study] : kinds) {
+        Record record;
+        record.SetCaptureType(kind);
+        EXPECT_EQ(record.IsSunStudy(), is_sun_study) << kind;
+    }
+}
+
+TEST(AnimationProperties, ARecordIsPlayableWithOneCameraAndOneTargetPointForEachFrame) {
+    Record record;
+    EXPECT_FALSE(record.IsPlayable());
+    record.SetFrameCount(1);
+    record.CameraPoints().Append(KM_3dPoint(1, 2, 3));
+    EXPECT_FALSE(record.IsPlayable()) << "without a target";
+    record.TargetPoints().Append(KM_3dPoint(0, 0, 0));
+    EXPECT_TRUE(record.IsPlayable());
+    record.TargetPoints().Append(KM_3dPoint(0, 0, 0));
+    EXPECT_FALSE(record.IsPlayable()) << "with a target too many";
+    record.CameraPoints().Append(KM_3dPoint(1, 2, 3));
+    EXPECT_FALSE(record.IsPlayable()) << "with a point of each too many";
+    record.SetFrameCount(2);
+    EXPECT_TRUE(record.IsPlayable());
+}
+
+TEST(AnimationProperties, NothingIsPlayableWithoutAFrame) {
+    for (const int frame_count : {0, -1}) {
+        Record record;
+        record.SetFrameCount(frame_count);
+        EXPECT_FALSE(record.IsPlayable()) << frame_count;
+    }
+}
+
+TEST(AnimationProperties, APathFollowsItsCurvesWhereCameraAndTargetHaveOne) {
+    expectFollowed(following(Record::path, rail, gaze), {rail, gaze});
+    expectFollowed(following(Record::path, rail, KM_nil_uuid), {});
+    expectFollowed(following(Record::path, KM_nil_uuid, gaze), {});
+}
+
+TEST(AnimationProperties, AFlythroughFollowsTheCurveOfItsCameraAlone) {
+    expectFollowed(following(Record::flythrough, rail, KM_nil_uuid), {rail});
+    expectFollowed(following(Record::flythrough, rail, gaze), {rail});
+    expectFollowed(following(Record::flythrough, KM_nil_uuid, gaze), {});
+}
+
+TEST(AnimationProperties, WhatMovesOtherwiseFollowsNoCurve) {
+    for (const auto type :
+         {Record::turntable, Record::one_day_sun, Record::seasonal_sun, Record::none})
+        expectFollowed(following(type, rail, gaze), {});
 }

@@ -220,8 +220,10 @@ TEST(SunStudySite, UnknownPlacesGetSuggestions) {
     const auto at = [](const char* place) {
         return day({"--date", "2026-06-21", "--place", place});
     };
-    expectRefusal(at("Lodnon"), {"--place", "Lodnon", "did you mean London, United Kingdom?"});
-    expectRefusal(at("Birmingham"), {"Birmingham, United Kingdom or Birmingham, United States?"});
+    expectRefusal(at("Lodnon"),
+                  {"--place", "Lodnon", "Is it one of these: London, United Kingdom?"});
+    expectRefusal(at("Birmingham"),
+                  {"Birmingham, United Kingdom; Birmingham, United States. Give the country"});
     expectRefusal(at("Xyzzyxyzzy"), {"Xyzzyxyzzy", "quarn places"});
     expectRefusal(at(""), {"--place"});
     EXPECT_THAT(scriptOf(at("birmingham, usa")),
@@ -363,6 +365,8 @@ TEST(Places, AreListedWithCoordinatesAndZones) {
 TEST(Places, AreFoundByWhatTheyMayBeCalled) {
     EXPECT_THAT(run({"places", "sao paulo"}).out, HasSubstr("São Paulo"));
     EXPECT_THAT(run({"places", "Lodnon"}).out, HasSubstr("London"));
+    EXPECT_THAT(run({"places", "München"}).out, HasSubstr("Munich"));
+    EXPECT_THAT(run({"places", "uk"}).out, HasSubstr("Birmingham"));
     const Ended none = run({"places", "Xyzzyxyzzy"});
     EXPECT_EQ(none.exit_code, 1);
     EXPECT_THAT(none.err, HasSubstr("Xyzzyxyzzy"));

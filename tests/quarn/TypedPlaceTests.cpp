@@ -84,7 +84,8 @@ TEST(TypedPlace, ThatNoCityIsCalledIsRefusedWithThoseThatMayBeMeant) {
     EXPECT_THAT(program::utf8Text(read(L"Lodnon")), HasSubstr("London, United Kingdom"));
     EXPECT_THAT(program::utf8Text(read(L"Birmingham")), HasSubstr("Birmingham, United States"));
     EXPECT_THAT(program::utf8Text(read(L"qqqqqqqqqqqq")), HasSubstr("as in 51.5 -0.12"));
-    EXPECT_THAT(program::utf8Text(read(L"51.5")), HasSubstr("No one city is called \"51.5\""));
+    EXPECT_THAT(program::utf8Text(read(L"51.5")),
+                HasSubstr("There is no city \"51.5\" in the list."));
 }
 
 TEST_F(LocationAtThePrompt, IsAskedWithTheTitleAndThePlaceThatIsThere) {

@@ -1,6 +1,6 @@
 #include "vexui/forms/DayForm.h"
 
-#include "vexui/Texts.h"
+#include "vexui/LocalText.h"
 
 #include <QDateEdit>
 #include <QFormLayout>
@@ -21,7 +21,7 @@ QString clockText(const QDateTime& moment) {
 
 DayForm::DayForm(const IZoetrixDataUI& lists, const KM_3dmAnimationProperties& record,
                  QWidget* owner)
-    : SunForm("dayForm", localText(L"One-Day Sun Study", 44003), owner) {
+    : SunStudyForm("dayForm", localText(L"One-Day Sun Study", 44003), owner) {
     addPlace(record);
     QFormLayout& section = addTimes();
     m_date = &addDate(
@@ -44,7 +44,7 @@ DayForm::DayForm(const IZoetrixDataUI& lists, const KM_3dmAnimationProperties& r
     finishWith(lists, record);
 }
 
-SunForm::Span DayForm::span() const {
+SunStudyForm::Span DayForm::span() const {
     return {QDateTime(m_date->date(), m_start->time(), Qt::UTC),
             QDateTime(m_date->date(), m_end->time(), Qt::UTC)};
 }

@@ -1,11 +1,11 @@
 #pragma once
 
-#include "vexui/forms/SunForm.h"
+#include "vexui/forms/SunStudyForm.h"
 
 namespace vexui {
 
 /// The form of a sun study of one day.
-class DayForm final : public SunForm {
+class DayForm final : public SunStudyForm {
 public:
     DayForm(const IZoetrixDataUI& lists, const KM_3dmAnimationProperties& record, QWidget* owner);
 

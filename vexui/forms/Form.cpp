@@ -1,6 +1,6 @@
 #include "vexui/forms/Form.h"
 
-#include "vexui/Texts.h"
+#include "vexui/LocalText.h"
 #include "vexui/forms/CountField.h"
 #include "vexui/forms/FirstChoices.h"
 

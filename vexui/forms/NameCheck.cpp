@@ -1,6 +1,7 @@
 #include "vexui/forms/NameCheck.h"
 
-#include "vexui/Texts.h"
+#include "sdk/qncore/QnAnimationName.h"
+#include "vexui/LocalText.h"
 
 #include <algorithm>
 
@@ -8,10 +9,8 @@ namespace vexui {
 
 namespace {
 
-constexpr int longest_name = 255;
-
 bool isBad(QChar character) {
-    return QLatin1String("\\|/:*?\"<>").contains(character);
+    return QnIsForbiddenInNames(character.unicode());
 }
 
 /// Line breaks and all else that shows nothing and that no file's name should hold.
@@ -25,10 +24,10 @@ bool isControl(QChar character) {
 QString nameFault(const QString& name, BadCharacters bad_characters) {
     if (name.trimmed().isEmpty())
         return localText(L"Enter a name.", 44075);
-    const auto length = name.toStdWString().size();
-    if (length > longest_name)
+    const auto length = static_cast<int>(name.toStdWString().size());
+    if (length > QnLongestAnimationName)
         return localText(L"The name has %1 characters; %2 are the most.", 44076)
-            .arg(QString::number(length), QString::number(longest_name));
+            .arg(QString::number(length), QString::number(QnLongestAnimationName));
     if (std::any_of(name.begin(), name.end(), isControl))
         return localText(L"The name holds a line break or another invisible character.", 44077);
     const bool is_refused = bad_characters == BadCharacters::refused;

@@ -2,7 +2,8 @@
 
 #include "sdk/qncore/QnLocalize.h"
 #include "sdk/qncore/QnLocationDialog.h"
-#include "vexui/Texts.h"
+#include "sdk/zel/QnZone.h"
+#include "vexui/LocalText.h"
 #include "vexui/forms/NumberField.h"
 
 #include <QLabel>
@@ -13,8 +14,6 @@ namespace vexui {
 
 namespace {
 
-constexpr int location_chosen = 1;
-
 /// The same longitude from -180 to 180 degrees.
 double inRange(double longitude) {
     return std::abs(longitude) <= 180.0 ? longitude : std::remainder(longitude, 360.0);
@@ -24,15 +23,6 @@ double inRange(double longitude) {
 double rounded(double degrees) {
     constexpr double parts = 10000.0;
     return std::round(degrees * parts) / parts;
-}
-
-/// The zone by which the plug-in reckons the sun: a whole hour for every full 15 degrees.
-QString zoneAt(double longitude) {
-    const int hours = static_cast<int>(longitude / 15.0);
-    const QString utc = QString::fromLatin1("UTC");
-    if (hours == 0)
-        return utc;
-    return utc + (hours > 0 ? QChar(u'+') : QChar(0x2212)) + QString::number(std::abs(hours));
 }
 
 } // namespace
@@ -47,7 +37,7 @@ void PlaceFields::choose() const {
     double chosen_latitude = latitude->number().value_or(0.0);
     double chosen_longitude = longitude->number().value_or(0.0);
     if (QnShowLocationDialog(QnLocalizeString(L"Set Animation Location", 34509), chosen_latitude,
-                             chosen_longitude) != location_chosen)
+                             chosen_longitude) != QnDialogConfirmed)
         return;
     latitude->setNumber(rounded(chosen_latitude));
     longitude->setNumber(rounded(inRange(chosen_longitude)));
@@ -56,7 +46,7 @@ void PlaceFields::choose() const {
 void PlaceFields::tellZone() const {
     const std::optional<double> degrees = longitude->number();
     zone->setText(degrees ? localText(L"Times are those of %1, without daylight saving.", 44110)
-                                .arg(zoneAt(*degrees))
+                                .arg(toQt(QnZoneText(60 * QnZoneOfLongitude(*degrees))))
                           : QString());
 }
 

@@ -1,6 +1,6 @@
 #include "vexui/forms/SeasonForm.h"
 
-#include "vexui/Texts.h"
+#include "vexui/LocalText.h"
 
 #include <QDateEdit>
 #include <QFormLayout>
@@ -21,7 +21,7 @@ QString dateText(const QDateTime& moment) {
 
 SeasonForm::SeasonForm(const IZoetrixDataUI& lists, const KM_3dmAnimationProperties& record,
                        QWidget* owner)
-    : SunForm("seasonForm", localText(L"Seasonal Sun Study", 44004), owner) {
+    : SunStudyForm("seasonForm", localText(L"Seasonal Sun Study", 44004), owner) {
     addPlace(record);
     QFormLayout& section = addTimes();
     m_start = &addDate(section,
@@ -44,7 +44,7 @@ SeasonForm::SeasonForm(const IZoetrixDataUI& lists, const KM_3dmAnimationPropert
     finishWith(lists, record);
 }
 
-SunForm::Span SeasonForm::span() const {
+SunStudyForm::Span SeasonForm::span() const {
     return {QDateTime(m_start->date(), m_time->time(), Qt::UTC),
             QDateTime(m_end->date(), m_time->time(), Qt::UTC)};
 }

@@ -1,11 +1,11 @@
 #pragma once
 
-#include "vexui/forms/SunForm.h"
+#include "vexui/forms/SunStudyForm.h"
 
 namespace vexui {
 
 /// The form of a sun study at one time of day, over many days.
-class SeasonForm final : public SunForm {
+class SeasonForm final : public SunStudyForm {
 public:
     SeasonForm(const IZoetrixDataUI& lists, const KM_3dmAnimationProperties& record,
                QWidget* owner);

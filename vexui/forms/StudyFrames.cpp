@@ -1,6 +1,6 @@
 #include "vexui/forms/StudyFrames.h"
 
-#include "vexui/Texts.h"
+#include "vexui/LocalText.h"
 
 #include <QLocale>
 

@@ -3,7 +3,7 @@
 #include "sdk/qncore/QnDoc.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLocalize.h"
-#include "zoetrix/commands/CommandEnd.h"
+#include "zoetrix/commands/EndWith.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 
 #include <cstdlib>

@@ -12,7 +12,8 @@
 /// Which renderer "RenderPreview" stands for when it is chosen in a dialog.
 enum class PreviewRenders {
     preview,
-    full, ///< as "RenderFull" does; stored animations of paths and sun studies rely on it
+    full, ///< the full renderer, in paths and sun studies: their frames take as long as with
+          ///< "RenderFull"
 };
 
 /// Finds the entry point of a dialog, once the dialog plug-in is loaded.

@@ -7,14 +7,11 @@
 
 /// A display mode as the set-up commands offer it.
 struct DisplayModeChoice {
-    /// The local name without "_", " ", "-" and ",", so that it can be an option's name; the
-    /// rendered and the x-ray mode have names of their own.
-    KM_wString local_name;
-    /// The English name as the host has it; the rendered and the x-ray mode's are as above.
+    KM_wString local_name; ///< as QnCaptureOptionName has them
     KM_wString english_name;
     KM_UUID id;
 };
 
 /// The host's display modes in its order.
-/// @param sun_filter  only shaded modes that use the document's lights or cast shadows
+/// @param sun_filter  only those in which a sun study can be seen
 std::vector<DisplayModeChoice> ListDisplayModes(bool sun_filter);

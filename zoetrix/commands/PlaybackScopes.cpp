@@ -17,26 +17,23 @@ KM_UUID DisplayModeOf(const CQuarnView& view) {
 
 } // namespace
 
-HiddenPaths::HiddenPaths(CQuarnDoc& doc, const KM_3dmAnimationProperties& props)
-    : m_doc(doc), m_camera_path(props.CameraPathId()), m_target_path(props.TargetPathId()) {}
-
 HiddenPaths::~HiddenPaths() {
     if (!m_shows_again)
         return;
-    if (m_camera_hidden)
-        Show(m_camera_path);
-    if (m_target_hidden)
-        Show(m_target_path);
+    for (const CQuarnObjRef& path : m_hidden) {
+        if (path.Object())
+            m_doc.ShowObject(path, false);
+    }
     m_doc.Regen();
 }
 
-bool HiddenPaths::Hide(const CQuarnObjRef& path) {
-    return path.Object() && m_doc.HideObject(path, false);
-}
-
-void HiddenPaths::Show(const CQuarnObjRef& path) {
-    if (path.Object())
-        m_doc.ShowObject(path, false);
+void HiddenPaths::Hide(const KM_SimpleArray<KM_UUID>& curves) {
+    for (const KM_UUID& id : curves) {
+        const CQuarnObjRef path(id);
+        m_hidden.push_back(path);
+        if (!path.Object() || !m_doc.HideObject(path, false))
+            m_hidden.pop_back();
+    }
 }
 
 SavedDisplayMode::SavedDisplayMode(CQuarnView& view, bool restores)

@@ -6,32 +6,28 @@
 #include "sdk/qncore/QnObject.h"
 #include "sdk/qncore/QnView.h"
 
+#include <vector>
+
 // What showing frames changes for a while. Each of these puts its part back at the end of its
 // scope, however that is left.
 
-/// The curves that camera and target follow. What is hidden stays so unless
-/// ShowAgainAtEnd was called.
+/// The curves that camera and target follow. What is hidden stays so unless ShowAgainAtEnd was
+/// called.
 class HiddenPaths {
 public:
-    HiddenPaths(CQuarnDoc& doc, const KM_3dmAnimationProperties& props);
+    explicit HiddenPaths(CQuarnDoc& doc) : m_doc(doc) {}
     ~HiddenPaths();
     HiddenPaths(const HiddenPaths&) = delete;
     HiddenPaths& operator=(const HiddenPaths&) = delete;
 
-    void HideCameraPath() { m_camera_hidden = Hide(m_camera_path); }
-    void HideTargetPath() { m_target_hidden = Hide(m_target_path); }
+    /// @param curves  ids of objects; those that are gone, or hidden already, are passed over
+    void Hide(const KM_SimpleArray<KM_UUID>& curves);
     /// From here on the end of the scope shows what was hidden, and rebuilds the views.
     void ShowAgainAtEnd() { m_shows_again = true; }
 
 private:
-    bool Hide(const CQuarnObjRef& path);
-    void Show(const CQuarnObjRef& path);
-
     CQuarnDoc& m_doc;
-    CQuarnObjRef m_camera_path;
-    CQuarnObjRef m_target_path;
-    bool m_camera_hidden = false; ///< by this object, not before
-    bool m_target_hidden = false;
+    std::vector<CQuarnObjRef> m_hidden; ///< by this object, not before
     bool m_shows_again = false;
 };
 

@@ -3,7 +3,7 @@
 #include "sdk/qncore/QnDoc.h"
 #include "sdk/qncore/QnLocalize.h"
 #include "zoetrix/commands/CommandGuard.h"
-#include "zoetrix/commands/SunStudy.h"
+#include "zoetrix/commands/SunStudySetUp.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 #include "zoetrix/plugin/ZoetrixPlugIn.h"
 

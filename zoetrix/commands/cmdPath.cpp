@@ -6,8 +6,8 @@
 #include "sdk/qncore/QnLocalize.h"
 #include "zoetrix/commands/CameraDialog.h"
 #include "zoetrix/commands/CameraSetUp.h"
-#include "zoetrix/commands/CommandEnd.h"
 #include "zoetrix/commands/CommandGuard.h"
+#include "zoetrix/commands/EndWith.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 #include "zoetrix/plugin/ZoetrixPlugIn.h"
 #include "zoetrix/plugin/ZoetrixUtilities.h"
@@ -42,25 +42,29 @@ bool Recognise(Followed& followed) {
     return point != nullptr;
 }
 
-int AskCamera(const KM_3dmAnimationProperties& props, Followed& camera) {
-    const int asked = AskForPath(
-        QnLocalizeString(
-            L"Select camera path curve or point. Press Enter to select last camera path", 40301),
-        points_and_curves, props.CameraPathId(), camera.object);
-    if (asked == CQuarnCommand::success && Recognise(camera))
-        return CQuarnCommand::success;
-    return EndWith(L"Failed to select camera path or point. Nothing done\n", 40302,
-                   asked == CQuarnCommand::success ? CQuarnCommand::failure : asked);
-}
+/// The question for what camera or target follows, and what is told where nothing comes of it.
+struct FollowQuestion {
+    const wchar_t* prompt;
+    int prompt_id;
+    const wchar_t* failure;
+    int failure_id;
+};
 
-int AskTarget(const KM_3dmAnimationProperties& props, Followed& target) {
-    const int asked = AskForPath(
-        QnLocalizeString(
-            L"Select target path curve or point. Press Enter to select last target path", 40303),
-        points_and_curves, props.TargetPathId(), target.object);
-    if (asked == CQuarnCommand::success && Recognise(target))
+constexpr FollowQuestion camera_question = {
+    L"Select camera path curve or point. Press Enter to select last camera path", 40301,
+    L"Failed to select camera path or point. Nothing done\n", 40302};
+constexpr FollowQuestion target_question = {
+    L"Select target path curve or point. Press Enter to select last target path", 40303,
+    L"Failed to select target path or point. Nothing done\n", 40304};
+
+/// Asks for one curve or point.
+/// @param last_id  names the object that Enter takes
+int AskFollowed(const FollowQuestion& question, const KM_UUID& last_id, Followed& followed) {
+    const int asked = AskForPath(QnLocalizeString(question.prompt, question.prompt_id),
+                                 points_and_curves, last_id, followed.object);
+    if (asked == CQuarnCommand::success && Recognise(followed))
         return CQuarnCommand::success;
-    return EndWith(L"Failed to select target path or point. Nothing done\n", 40304,
+    return EndWith(question.failure, question.failure_id,
                    asked == CQuarnCommand::success ? CQuarnCommand::failure : asked);
 }
 
@@ -123,9 +127,11 @@ int SetFramePoints(const Paths& paths, int frame_count, KM_3dmAnimationPropertie
 int SetUpPath(CQuarnDoc& doc, bool interactive) {
     KM_3dmAnimationProperties props = ZoetrixPlugIn().AnimationProperties(doc);
     Paths paths;
-    if (const int ended = AskCamera(props, paths.camera); ended != CQuarnCommand::success)
+    if (const int ended = AskFollowed(camera_question, props.CameraPathId(), paths.camera);
+        ended != CQuarnCommand::success)
         return ended;
-    if (const int ended = AskTarget(props, paths.target); ended != CQuarnCommand::success)
+    if (const int ended = AskFollowed(target_question, props.TargetPathId(), paths.target);
+        ended != CQuarnCommand::success)
         return ended;
 
     // Between two points nothing moves.

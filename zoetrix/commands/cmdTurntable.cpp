@@ -10,8 +10,8 @@
 #include "sdk/qncore/QnView.h"
 #include "zoetrix/commands/CameraDialog.h"
 #include "zoetrix/commands/CameraSetUp.h"
-#include "zoetrix/commands/CommandEnd.h"
 #include "zoetrix/commands/CommandGuard.h"
+#include "zoetrix/commands/EndWith.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 #include "zoetrix/plugin/ZoetrixPlugIn.h"
 #include "zoetrix/plugin/ZoetrixUtilities.h"
@@ -84,7 +84,8 @@ bool GetActiveEye(Eye& eye) {
 // ---- At the command line
 
 /// Asks for the direction. Only "AntiClockwise" changes what is remembered: "Clockwise" keeps it,
-/// as Enter does, and stored scripts rely on it.
+/// as Enter does. So after one anticlockwise turntable the next ones turn anticlockwise too,
+/// whatever is picked here; the dialog can turn them back.
 int AskDirection() {
     CQuarnGetOption prompt;
     prompt.SetCommandPrompt(QnLocalizeString(L"Direction", 40007));

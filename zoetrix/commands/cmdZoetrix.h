@@ -62,10 +62,6 @@ bool CanBeQuotedInScript(const KM_wString& path);
 
 // ---- Showing and recording frames
 
-/// Whether the record holds an animation that can be shown: at least one frame, and as many camera
-/// and target points as frames.
-bool IsPlayable(const KM_3dmAnimationProperties& props);
-
 /// Shows frames of the animation in the viewport that the record names. A sun study moves a light
 /// of its own and keeps the document's sun off meanwhile; every other animation moves the camera.
 /// Curves that the camera or the target follows are hidden meanwhile. A frame without points moves

@@ -1,3 +1,4 @@
+#include "sdk/qncore/QnAnimationName.h"
 #include "sdk/qncore/QnApp.h"
 #include "sdk/qncore/QnDoc.h"
 #include "sdk/qncore/QnView.h"
@@ -5,14 +6,8 @@
 #include "zoetrix/plugin/ZoetrixUtilities.h"
 
 #include <algorithm>
-#include <string_view>
 
 namespace {
-
-constexpr std::wstring_view invalid_file_characters = L"\\|/:*?\"<>";
-
-/// Names of this length and above are refused.
-constexpr int refused_name_length = 256;
 
 bool IsControlCharacter(wchar_t character) {
     const auto code = static_cast<unsigned long>(character);
@@ -62,14 +57,14 @@ void CleanExtention(KM_wString& ext) {
 }
 
 bool IsValidFileName(KM_wString name) {
-    if (name.IsEmpty() || name.Length() >= refused_name_length)
+    if (name.IsEmpty() || name.Length() > QnLongestAnimationName)
         return false;
-    return name.View().find_first_of(invalid_file_characters) == std::wstring_view::npos;
+    return std::ranges::none_of(name.View(), QnIsForbiddenInNames);
 }
 
 int ReplaceInvalidFileChar(KM_wString& name) {
     int replaced = 0;
-    for (const wchar_t character : invalid_file_characters)
+    for (const wchar_t character : QnForbiddenInNames)
         replaced += name.Replace(character, L'_');
     return replaced;
 }

@@ -1,8 +1,8 @@
-#include "sdk/qncore/QnApp.h"
 #include "sdk/qncore/QnDoc.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLocalize.h"
 #include "zoetrix/commands/CommandGuard.h"
+#include "zoetrix/commands/EndWith.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 #include "zoetrix/plugin/ZoetrixPlugIn.h"
 
@@ -15,11 +15,6 @@ constexpr const wchar_t* nothing_to_view =
     L"No animation is currently set. There is nothing to view\n";
 constexpr const wchar_t* no_frame_to_view =
     L"No animation is currently set. There is no frame to view\n";
-
-int FailWith(const wchar_t* text, int id) {
-    QuarnApp().Print(QnLocalizeString(text, id));
-    return CQuarnCommand::failure;
-}
 
 /// Shows one frame, or all for a negative one, and remembers the frame shown last.
 int Show(CQuarnDoc& doc, KM_3dmAnimationProperties& props, int frame) {
@@ -35,8 +30,8 @@ template <class FrameOf>
 int ShowFrame(CQuarnDoc& doc, const wchar_t* no_animation, int no_animation_id,
               FrameOf&& frame_of) {
     KM_3dmAnimationProperties props = ZoetrixPlugIn().AnimationProperties(doc);
-    if (!IsPlayable(props))
-        return FailWith(no_animation, no_animation_id);
+    if (!props.IsPlayable())
+        return EndWith(no_animation, no_animation_id, CQuarnCommand::failure);
     return Show(doc, props, frame_of(props));
 }
 
@@ -68,18 +63,16 @@ int AskFrame(const KM_3dmAnimationProperties& props, int& frame) {
     prompt.SetLowerLimit(0, true);
     prompt.SetUpperLimit(props.FrameCount() - 1, true);
     prompt.GetNumber();
-    if (prompt.CommandResult() != CQuarnCommand::success) {
-        FailWith(L"Invalid number of frames. Nothing done\n", 16783);
-        return prompt.CommandResult();
-    }
+    if (prompt.CommandResult() != CQuarnCommand::success)
+        return EndWith(L"Invalid number of frames. Nothing done\n", 16783, prompt.CommandResult());
     frame = std::abs(prompt.Number());
     return CQuarnCommand::success;
 }
 
 int ShowAskedFrame(CQuarnDoc& doc) {
     KM_3dmAnimationProperties props = ZoetrixPlugIn().AnimationProperties(doc);
-    if (!IsPlayable(props))
-        return FailWith(no_frame_to_view, 16781);
+    if (!props.IsPlayable())
+        return EndWith(no_frame_to_view, 16781, CQuarnCommand::failure);
     int frame = 0;
     if (const int ended = AskFrame(props, frame); ended != CQuarnCommand::success)
         return ended;

@@ -2,8 +2,8 @@
 #include "sdk/qncore/QnDoc.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnView.h"
-#include "zoetrix/commands/CommandEnd.h"
 #include "zoetrix/commands/DisplayModeChoices.h"
+#include "zoetrix/commands/EndWith.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 #include "zoetrix/plugin/ZoetrixUtilities.h"
 

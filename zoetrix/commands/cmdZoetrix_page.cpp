@@ -5,11 +5,6 @@
 
 namespace {
 
-bool ShowsDates(const KM_3dmAnimationProperties& props) {
-    return props.CaptureType() == KM_3dmAnimationProperties::one_day_sun ||
-           props.CaptureType() == KM_3dmAnimationProperties::seasonal_sun;
-}
-
 KM_wString Heading(const KM_wString& name) {
     return KM_wString(L"<HTML>\n <HEAD>\n  <TITLE>") + name +
            L"</TITLE>\n </HEAD>\n <BODY onLoad=\"Load()\">\n <FONT FACE=VERDANA SIZE=2><B>" + name;
@@ -39,7 +34,7 @@ KM_wString PictureAndButtons() {
 }
 
 KM_wString LoopAndCounterBoxes() {
-    // The doubled quote behind the loop box's ID is how pages have always been written.
+    // The second quote behind the loop box's ID is part of the page's text. Browsers pass over it.
     KM_wString page = L"  <FONT SIZE=1>\n"
                       L"  <BR><BR>&nbsp;&nbsp;&nbsp;<INPUT ID=\"checkLoop\""
                       L"\" TYPE=\"checkbox\" style=\"width:13;height:13;\">";
@@ -77,7 +72,7 @@ KM_wString StyleAndImages(KM_3dmAnimationProperties& props) {
             L"  \tImages[i] = new Image();\n\n"
             L"  var currentImageIndex = 0;\n"
             L"  bDisplayDate = ";
-    page += KM_wString::FormatToString(L"%d;\n\n", ShowsDates(props) ? 1 : 0);
+    page += KM_wString::FormatToString(L"%d;\n\n", props.IsSunStudy() ? 1 : 0);
     page += KM_wString::FormatToString(L"  var Dates = new Array(%d);\n", dates.Count());
     for (int i = 0; i < images.Count(); ++i)
         page += KM_wString::FormatToString(L"Images[%d].src = \"", i) + images[i] + L"\"\n";

@@ -1,6 +1,6 @@
 #include "sdk/qncore/QnApp.h"
-#include "sdk/qncore/QnLocalize.h"
 #include "sdk/qncore/QnPlatform.h"
+#include "zoetrix/commands/EndWith.h"
 #include "zoetrix/commands/PlaybackScopes.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 #include "zoetrix/plugin/ZoetrixUtilities.h"
@@ -23,29 +23,12 @@ struct Playback {
     bool records;
 };
 
-int FailWith(const wchar_t* text, int id) {
-    QuarnApp().Print(QnLocalizeString(text, id));
-    return CQuarnCommand::failure;
-}
-
-bool IsSunStudy(const KM_3dmAnimationProperties& props) {
-    return props.CaptureType() == KM_3dmAnimationProperties::one_day_sun ||
-           props.CaptureType() == KM_3dmAnimationProperties::seasonal_sun;
-}
-
 /// Takes the frame points from the curves as they are now, and hides the curves.
 void FollowAndHidePaths(KM_3dmAnimationProperties& props, HiddenPaths& paths) {
-    const bool has_camera_path = !KM_UuidIsNil(props.CameraPathId());
-    const bool has_target_path = !KM_UuidIsNil(props.TargetPathId());
-    if (props.CaptureType() == KM_3dmAnimationProperties::path && has_camera_path &&
-        has_target_path) {
-        CZoetrixUtilities::ResetAnimation(props);
-        paths.HideCameraPath();
-        paths.HideTargetPath();
-    } else if (props.CaptureType() == KM_3dmAnimationProperties::flythrough && has_camera_path) {
-        CZoetrixUtilities::ResetAnimation(props);
-        paths.HideCameraPath();
-    }
+    if (!props.FollowsCurves())
+        return;
+    CZoetrixUtilities::ResetAnimation(props);
+    paths.Hide(props.FollowedCurves());
 }
 
 /// Shows every frame of the playback.
@@ -103,25 +86,22 @@ FrameRange FramesToShow(const KM_3dmAnimationProperties& props, int frame) {
 
 } // namespace
 
-bool IsPlayable(const KM_3dmAnimationProperties& props) {
-    return props.FrameCount() >= 1 && props.CameraPoints().Count() == props.FrameCount() &&
-           props.TargetPoints().Count() == props.FrameCount();
-}
-
 int PreviewAnimation(CQuarnDoc& doc, KM_3dmAnimationProperties& props, int frame, bool record) {
-    if (!IsPlayable(props))
-        return FailWith(L"No animation is currently set. There is nothing to view\n", 16773);
+    if (!props.IsPlayable())
+        return EndWith(L"No animation is currently set. There is nothing to view\n", 16773,
+                       CQuarnCommand::failure);
 
-    HiddenPaths paths(doc, props);
+    HiddenPaths paths(doc);
     FollowAndHidePaths(props, paths);
 
     KM_wString view_name = props.ViewportName();
     view_name.TrimLeftAndRight();
     if (view_name.IsEmpty())
-        return FailWith(L"Invalid view name. Nothing done\n", 16774);
+        return EndWith(L"Invalid view name. Nothing done\n", 16774, CQuarnCommand::failure);
     CQuarnView* view = CZoetrixUtilities::FindQuarnViewByName(doc, view_name, true);
     if (!view)
-        return FailWith(L"Unable to find viewport to play animation\n", 16775);
+        return EndWith(L"Unable to find viewport to play animation\n", 16775,
+                       CQuarnCommand::failure);
 
     paths.ShowAgainAtEnd();
     const bool plays_all = frame < 0;
@@ -131,7 +111,7 @@ int PreviewAnimation(CQuarnDoc& doc, KM_3dmAnimationProperties& props, int frame
     props.SetFileExtension(extension);
 
     Playback playback{doc, props, *view, FramesToShow(props, frame), plays_all, record};
-    if (IsSunStudy(props))
+    if (props.IsSunStudy())
         ShowSunStudy(playback);
     else
         ShowCameraAnimation(playback);

@@ -4,6 +4,7 @@
 #include "sdk/qncore/QnFileUtilities.h"
 #include "sdk/qncore/QnGet.h"
 #include "zoetrix/commands/CommandGuard.h"
+#include "zoetrix/commands/EndWith.h"
 #include "zoetrix/commands/cmdZoetrix.h"
 #include "zoetrix/plugin/ZoetrixPlugIn.h"
 
@@ -24,8 +25,7 @@ void ChooseFolderInDialog(KM_wString& folder) {
     CQuarnUiDirDialog chooser(QnLocalizeString(L"Quarn Animation", 19763),
                               QnLocalizeString(L"Browse for Folder", 19762), folder,
                               CWnd::FromHandle(QuarnApp().MainWnd()));
-    constexpr int confirmed = 1;
-    if (chooser.DoModal() == confirmed)
+    if (chooser.DoModal() == QnDialogConfirmed)
         folder = chooser.GetPathName();
     else
         Print(L"No valid folder was set\n", 26225);
@@ -107,10 +107,9 @@ void OpenPage(unsigned int document, const KM_wString& path) {
 
 int Record(CQuarnDoc& doc, bool interactive) {
     KM_3dmAnimationProperties props = ZoetrixPlugIn().AnimationProperties(doc);
-    if (!IsPlayable(props)) {
-        Print(L"No animation is currently set. There is nothing to record\n", 16784);
-        return CQuarnCommand::failure;
-    }
+    if (!props.IsPlayable())
+        return EndWith(L"No animation is currently set. There is nothing to record\n", 16784,
+                       CQuarnCommand::failure);
     KM_wString folder = props.FolderName();
     if (!AskTargetFolder(folder, interactive) || folder.IsEmpty())
         return CQuarnCommand::failure;

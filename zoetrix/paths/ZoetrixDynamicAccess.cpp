@@ -13,22 +13,6 @@ bool HasFrame(const KM_3dmAnimationProperties& rec, int frame) {
     return frame >= 1 && frame <= rec.CameraPoints().Count() && frame <= rec.TargetPoints().Count();
 }
 
-bool FollowsCurves(const KM_3dmAnimationProperties& rec) {
-    switch (rec.CaptureType()) {
-    case KM_3dmAnimationProperties::path:
-        return !KM_UuidIsNil(rec.CameraPathId()) && !KM_UuidIsNil(rec.TargetPathId());
-    case KM_3dmAnimationProperties::flythrough:
-        return !KM_UuidIsNil(rec.CameraPathId());
-    default:
-        return false;
-    }
-}
-
-bool IsSunStudy(const KM_3dmAnimationProperties& rec) {
-    return rec.CaptureType() == KM_3dmAnimationProperties::seasonal_sun ||
-           rec.CaptureType() == KM_3dmAnimationProperties::one_day_sun;
-}
-
 /// A frame's two points and the view that they belong to.
 struct FramePoints {
     CQuarnView* view = nullptr;
@@ -44,7 +28,7 @@ std::optional<FramePoints> PointsAtFrame(CQuarnDoc& doc, const KM_3dmAnimationPr
         return std::nullopt;
 
     std::optional<KM_3dmAnimationProperties> refreshed;
-    if (FollowsCurves(rec))
+    if (rec.FollowsCurves())
         CZoetrixUtilities::ResetAnimation(refreshed.emplace(rec));
     const KM_3dmAnimationProperties& current = refreshed ? *refreshed : rec;
 
@@ -82,7 +66,7 @@ bool CZoetrixDynamicAccess::AnimatedViewAtFrame(CQuarnDoc& doc,
                                                 const KM_3dmAnimationProperties& rec, int frame,
                                                 KM_Viewport& out) {
     const std::optional<FramePoints> points = PointsAtFrame(doc, rec, frame);
-    if (!points || IsSunStudy(rec))
+    if (!points || rec.IsSunStudy())
         return false;
 
     const CQuarnViewport& viewport = points->view->ActiveViewport();
@@ -93,7 +77,7 @@ bool CZoetrixDynamicAccess::AnimatedViewAtFrame(CQuarnDoc& doc,
 bool CZoetrixDynamicAccess::AnimatedSunAtFrame(CQuarnDoc& doc, const KM_3dmAnimationProperties& rec,
                                                int frame, KM_Light& light) {
     const std::optional<FramePoints> points = PointsAtFrame(doc, rec, frame);
-    if (!points || !IsSunStudy(rec))
+    if (!points || !rec.IsSunStudy())
         return false;
 
     light.SetStyle(KM_LightStyle::world_directional);

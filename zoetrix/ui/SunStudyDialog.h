@@ -1,19 +1,11 @@
 #pragma once
 
-#include "kelmar/KM_Array.h"
-#include "kelmar/KM_wString.h"
 #include "sdk/qncore/QnDateTime.h"
-#include "sdk/qncore/QnDialog.h"
-#include "zoetrix/ui/ComboBoxList.h"
+#include "zoetrix/ui/AnimationDialog.h"
 
 /// What the forms of both sun studies are: place, dates and times, step, file type, capture method
-/// and viewport, with a button for the host's location picker. A form stands by itself: whoever
-/// shows it hands it the lists, and reads the members after DoModal returned 1.
-///
-/// When the form is filled a selection that is not below the count of its list becomes 0. The
-/// viewport selection is measured against the count of the file types, and stored choices depend on
-/// that.
-class CSunStudyDialog : public CQuarnDialog {
+/// and viewport, with a button for the host's location picker.
+class CSunStudyDialog : public CAnimationDialog {
 public:
     /// Controls of the templates.
     enum control_id : int {
@@ -25,9 +17,6 @@ public:
         north_angle_id = 6006,
         text_id = 6009,
         frame_step_id = 6010,
-        file_type_id = 6011,
-        capture_id = 6012,
-        viewport_id = 6013,
         location_button_id = 6015,
     };
 
@@ -46,9 +35,6 @@ public:
     COleDateTime m_third_date_time;
     KM_wString m_text; ///< what it means is the caller's
     int m_frame_step;
-    ComboBoxList m_file_type;
-    ComboBoxList m_capture;
-    ComboBoxList m_viewport;
 
 protected:
     CSunStudyDialog(int template_id, double latitude, double longitude, double north_angle,
@@ -60,8 +46,5 @@ protected:
                     int frame_step, CWnd* parent);
 
     void DoDataExchange(CQnDialogExchange& exchange) override;
-    int OnInitDialog() override;
-    void OnOK() override;
-    void OnCancel() override;
     void OnButton(int control) override;
 };

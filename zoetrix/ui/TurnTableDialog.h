@@ -1,18 +1,10 @@
 #pragma once
 
-#include "kelmar/KM_Array.h"
-#include "kelmar/KM_wString.h"
-#include "sdk/qncore/QnDialog.h"
-#include "zoetrix/ui/ComboBoxList.h"
+#include "zoetrix/ui/AnimationDialog.h"
 
 /// The plug-in's own form of a turntable animation: frame count, direction, file type, capture
-/// method, viewport and name. It stands by itself: whoever shows it hands it the lists, and reads
-/// the members after DoModal returned 1.
-///
-/// When the form is filled a selection that is not below the count of its list becomes 0. The
-/// viewport selection is measured against the count of the file types, and stored choices depend on
-/// that.
-class CTurnTableDialog : public CQuarnDialog {
+/// method, viewport and name.
+class CTurnTableDialog : public CAnimationDialog {
 public:
     static const CQnRuntimeClass ClassRecord;
 
@@ -21,9 +13,6 @@ public:
         template_id = 6004,
         frame_count_id = 6005,
         name_id = 6009,
-        file_type_id = 6011,
-        capture_id = 6012,
-        viewport_id = 6013,
         direction_id = 6014,
     };
 
@@ -43,15 +32,11 @@ public:
     const wchar_t* ControllerName() const override;
 
     int m_frame_count;
-    ComboBoxList m_direction;
-    ComboBoxList m_file_type;
-    ComboBoxList m_capture;
-    ComboBoxList m_viewport;
+    DialogList m_direction;
     KM_wString m_name;
 
 protected:
     void DoDataExchange(CQnDialogExchange& exchange) override;
     int OnInitDialog() override;
     void OnOK() override;
-    void OnCancel() override;
 };

@@ -279,6 +279,21 @@ TEST(Cities, NothingIsSuggestedForWhatIsLikeNoName) {
     EXPECT_TRUE(suggestionsFor(", France").empty());
 }
 
+TEST(Cities, ANameThatIsNotTakenIsToldWithThoseThatMayBeMeant) {
+    EXPECT_EQ(whyNoCity("Lodnon"),
+              "There is no city \"Lodnon\" in the list. Is it one of these: London, United "
+              "Kingdom?");
+    EXPECT_EQ(whyNoCity("Birmingham"),
+              "Several cities are called \"Birmingham\": Birmingham, United Kingdom; Birmingham, "
+              "United States. Give the country too.");
+    EXPECT_EQ(whyNoCity("Xqzzwvk"), "There is no city \"Xqzzwvk\" in the list.");
+}
+
+TEST(Cities, NameAndCountryTogetherFindEveryCity) {
+    for (const City& city : cities())
+        EXPECT_EQ(findCity(nameWithCountry(city)), &city) << city.name;
+}
+
 // By hand: one swap; one change and one letter more; all letters put in.
 TEST(CitySpelling, CountsTheLettersThatDiffer) {
     EXPECT_EQ(lettersApart("lodnon", "london"), 1);

@@ -207,5 +207,40 @@ TEST(DisplayModeListTest, FindsModesByAnyFormOfTheirName) {
     EXPECT_EQ(list.findByName(L""), nullptr);
 }
 
+const CDisplayPipelineAttributes& modeNamed(const wchar_t* name) {
+    return *DisplayModeList::instance().findByName(name);
+}
+
+TEST(DisplayModeListTest, OffersTheRenderedAndTheXRayModeUnderNamesOfTheirOwn) {
+    EXPECT_EQ(QnCaptureOptionName(modeNamed(L"Rendered")).m_english.ToUtf8(), "RenderedViewport");
+    EXPECT_EQ(QnCaptureOptionName(modeNamed(L"X-Ray")).m_english.ToUtf8(), "XRay");
+    EXPECT_EQ(QnCaptureOptionName(modeNamed(L"Clay")).m_english.ToUtf8(), "Clay");
+}
+
+TEST(DisplayModeListTest, KnowsTheCaptureOptionOfAModeByItsLocalName) {
+    CDisplayPipelineAttributes mode;
+    mode.m_english_name = L"House, style_1";
+    mode.m_local_name = L"Haus - Stil_1, neu";
+    const CQuarnCommandOptionName own = QnCaptureOptionName(mode);
+    EXPECT_EQ(own.m_english.ToUtf8(), "House, style_1");
+    EXPECT_EQ(own.m_local.ToUtf8(), "HausStil1neu");
+    mode.m_local_name = L"REN_dered";
+    EXPECT_EQ(QnCaptureOptionName(mode).m_english.ToUtf8(), "RenderedViewport");
+}
+
+TEST(DisplayModeListTest, ShowsSunStudiesInShadedModesWithTheDocumentsLightsOrShadows) {
+    const auto shows = [](int kind, bool lights, bool shadows) {
+        CDisplayPipelineAttributes mode;
+        mode.m_mode_kind = kind;
+        mode.m_uses_document_lights = lights;
+        mode.m_casts_shadows = shadows;
+        return mode.ShowsSunStudies();
+    };
+    EXPECT_TRUE(shows(CDisplayPipelineAttributes::shaded, true, false));
+    EXPECT_TRUE(shows(CDisplayPipelineAttributes::shaded, false, true));
+    EXPECT_FALSE(shows(CDisplayPipelineAttributes::shaded, false, false));
+    EXPECT_FALSE(shows(CDisplayPipelineAttributes::wireframe, true, true));
+}
+
 } // namespace
 } // namespace quarn::test

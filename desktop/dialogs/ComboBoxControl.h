@@ -8,9 +8,9 @@
 namespace quarn::desktop {
 
 /// The list of a combo box. Once the combo box is gone it is empty, and changes do nothing.
-class ComboBoxList final : public IQnComboBoxControl {
+class ComboBoxControl final : public IQnComboBoxControl {
 public:
-    explicit ComboBoxList(QComboBox* box) : m_box(box) {}
+    explicit ComboBoxControl(QComboBox* box) : m_box(box) {}
 
     void Reset() override;
     int Count() const override;

@@ -1,4 +1,4 @@
-#include "desktop/dialogs/CityTable.h"
+#include "desktop/dialogs/CityTableModel.h"
 
 #include "desktop/Texts.h"
 #include "desktop/dialogs/PlaceText.h"
@@ -16,31 +16,31 @@ QString qtName(std::string_view utf8) {
 
 } // namespace
 
-void CityTable::show(std::span<const City* const> cities) {
+void CityTableModel::show(std::span<const City* const> cities) {
     beginResetModel();
     m_cities.assign(cities.begin(), cities.end());
     endResetModel();
 }
 
-const City* CityTable::cityAt(int row) const {
+const City* CityTableModel::cityAt(int row) const {
     return row >= 0 && row < std::ssize(m_cities) ? m_cities[static_cast<std::size_t>(row)]
                                                   : nullptr;
 }
 
-int CityTable::rowOf(const City* city) const {
+int CityTableModel::rowOf(const City* city) const {
     const auto found = std::ranges::find(m_cities, city);
     return found == m_cities.end() ? -1 : static_cast<int>(found - m_cities.begin());
 }
 
-int CityTable::rowCount(const QModelIndex& parent) const {
+int CityTableModel::rowCount(const QModelIndex& parent) const {
     return parent.isValid() ? 0 : static_cast<int>(m_cities.size());
 }
 
-int CityTable::columnCount(const QModelIndex& parent) const {
+int CityTableModel::columnCount(const QModelIndex& parent) const {
     return parent.isValid() ? 0 : column_count;
 }
 
-QVariant CityTable::data(const QModelIndex& index, int role) const {
+QVariant CityTableModel::data(const QModelIndex& index, int role) const {
     const City* const city = cityAt(index.row());
     if (!city || role != Qt::DisplayRole)
         return {};
@@ -54,7 +54,7 @@ QVariant CityTable::data(const QModelIndex& index, int role) const {
     }
 }
 
-QVariant CityTable::headerData(int section, Qt::Orientation orientation, int role) const {
+QVariant CityTableModel::headerData(int section, Qt::Orientation orientation, int role) const {
     if (orientation == Qt::Horizontal && role == Qt::TextAlignmentRole)
         return QVariant(Qt::AlignLeft | Qt::AlignVCenter);
     if (orientation != Qt::Horizontal || role != Qt::DisplayRole)

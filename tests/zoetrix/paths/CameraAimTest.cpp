@@ -8,7 +8,7 @@ namespace {
 
 constexpr double tolerance = 1e-12;
 
-class CameraPlacement : public PlugInFixture {
+class CameraAim : public PlugInFixture {
 protected:
     CQuarnViewport& viewport() { return view(L"Perspective").MainViewport(); }
 
@@ -37,7 +37,7 @@ protected:
 
 } // namespace
 
-TEST_F(CameraPlacement, LevelCameraStaysLevel) {
+TEST_F(CameraAim, LevelCameraStaysLevel) {
     look({0.0, 1.0, 0.0}, {0.0, 0.0, 1.0});
     ASSERT_TRUE(place({3.0, 4.0, 0.0}, {0.0, 0.0, 0.0}));
     EXPECT_TRUE(near(placed.CameraLocation(), KM_3dPoint(0.0, 0.0, 0.0), 0.0));
@@ -46,7 +46,7 @@ TEST_F(CameraPlacement, LevelCameraStaysLevel) {
     EXPECT_TRUE(near(placed.CameraY(), KM_3dVector(0.0, 0.0, 1.0), tolerance));
 }
 
-TEST_F(CameraPlacement, FrameHasXToTheRightYUpAndZTowardTheCamera) {
+TEST_F(CameraAim, FrameHasXToTheRightYUpAndZTowardTheCamera) {
     look({0.0, 1.0, 0.0}, {0.0, 0.0, 1.0});
     // The direction is (0, 3, -4) / 5 = (0, 0.6, -0.8). X = direction x (0, 0, 1) / 0.6 = (1, 0,
     // 0); Z = (0, -0.6, 0.8); Y = Z x X = (0, 0.8, 0.6).
@@ -57,14 +57,14 @@ TEST_F(CameraPlacement, FrameHasXToTheRightYUpAndZTowardTheCamera) {
     EXPECT_TRUE(near(placed.CameraDirection(), KM_3dVector(0.0, 3.0, -4.0), 0.0));
 }
 
-TEST_F(CameraPlacement, WorldsZIsTheUpWhereItFits) {
+TEST_F(CameraAim, WorldsZIsTheUpWhereItFits) {
     // Level, but tilted by 45 degrees: its own up is (0, 1, 1) / sqrt(2) and is not taken over.
     look({0.0, 1.0, -1.0}, {0.0, 1.0, 1.0});
     ASSERT_TRUE(place({3.0, 4.0, 0.0}, {0.0, 0.0, 0.0}));
     EXPECT_TRUE(near(placed.CameraUp(), KM_3dVector(0.0, 0.0, 1.0), 0.0));
 }
 
-TEST_F(CameraPlacement, CoincidentAndInvalidPointsFailAndLeaveTheResultAlone) {
+TEST_F(CameraAim, CoincidentAndInvalidPointsFailAndLeaveTheResultAlone) {
     const double nan = std::numeric_limits<double>::quiet_NaN();
     const KM_Viewport before = placed;
     const KM_3dPoint here(1.0, 2.0, 3.0);
@@ -76,7 +76,7 @@ TEST_F(CameraPlacement, CoincidentAndInvalidPointsFailAndLeaveTheResultAlone) {
     EXPECT_TRUE(before == placed);
 }
 
-TEST_F(CameraPlacement, RefusedUpFailsAndLeavesTheResultAlone) {
+TEST_F(CameraAim, RefusedUpFailsAndLeavesTheResultAlone) {
     // Rolled by 30 degrees the up is that of the old camera; along it there is nothing to look at.
     lookRolled(KM_PI / 6.0);
     const KM_Viewport before = placed;
@@ -84,12 +84,12 @@ TEST_F(CameraPlacement, RefusedUpFailsAndLeavesTheResultAlone) {
     EXPECT_TRUE(before == placed);
 }
 
-TEST_F(CameraPlacement, OffsetAboveTheTinyOneIsEnough) {
+TEST_F(CameraAim, OffsetAboveTheTinyOneIsEnough) {
     look({0.0, 1.0, 0.0}, {0.0, 0.0, 1.0});
     EXPECT_TRUE(place({0.0, 3e-10, 0.0}, KM_3dPoint::Origin));
 }
 
-TEST_F(CameraPlacement, RollOfThirtyDegreesIsKept) {
+TEST_F(CameraAim, RollOfThirtyDegreesIsKept) {
     const double roll = KM_PI / 6.0;
     for (const double signed_roll : {roll, -roll}) {
         lookRolled(signed_roll);
@@ -100,7 +100,7 @@ TEST_F(CameraPlacement, RollOfThirtyDegreesIsKept) {
     }
 }
 
-TEST_F(CameraPlacement, RollTurnsAboutTheOldLineOfSight) {
+TEST_F(CameraAim, RollTurnsAboutTheOldLineOfSight) {
     lookRolled(KM_PI / 6.0);
     // World Z rolled about the old line of sight (Y) is (1/2, 0, sqrt(3)/2); the new direction is
     // X, and the picture's up is what of that vector is perpendicular to X.
@@ -109,7 +109,7 @@ TEST_F(CameraPlacement, RollTurnsAboutTheOldLineOfSight) {
     EXPECT_TRUE(near(placed.CameraY(), KM_3dVector(0.0, 0.0, 1.0), 1e-12));
 }
 
-TEST_F(CameraPlacement, RollOfThirtyDegreesTiltsWorldsUpInTheNewPicture) {
+TEST_F(CameraAim, RollOfThirtyDegreesTiltsWorldsUpInTheNewPicture) {
     lookRolled(KM_PI / 6.0);
     // A new direction that is the old one tilted down: (0, 3, -4) / 5. World Z rolled about the old
     // line of sight, u = (1/2, 0, sqrt(3)/2), less its part along the direction, which is
@@ -122,7 +122,7 @@ TEST_F(CameraPlacement, RollOfThirtyDegreesTiltsWorldsUpInTheNewPicture) {
     EXPECT_TRUE(near(placed.CameraY(), up / std::sqrt(0.52), 1e-12));
 }
 
-TEST_F(CameraPlacement, RollOfAMillionthIsNone) {
+TEST_F(CameraAim, RollOfAMillionthIsNone) {
     for (const double none : {0.99e-6, -0.99e-6}) {
         lookRolled(none);
         ASSERT_TRUE(place({0.0, 5.0, 0.0}, {0.0, 0.0, 0.0}));
@@ -136,7 +136,7 @@ TEST_F(CameraPlacement, RollOfAMillionthIsNone) {
     }
 }
 
-TEST_F(CameraPlacement, ARolledCameraThatTurnsStraightDownIsRolledFromItsOldUp) {
+TEST_F(CameraAim, ARolledCameraThatTurnsStraightDownIsRolledFromItsOldUp) {
     lookRolled(KM_PI / 6.0);
     // World Z lies along the direction, so the old up is taken, 30 degrees from Z toward X, and
     // rolled by the 30 degrees that the old camera had: 60 degrees, (sqrt(3)/2, 0, 1/2). Seen
@@ -146,14 +146,14 @@ TEST_F(CameraPlacement, ARolledCameraThatTurnsStraightDownIsRolledFromItsOldUp) 
     EXPECT_TRUE(near(placed.CameraY(), KM_3dVector(1.0, 0.0, 0.0), 1e-12));
 }
 
-TEST_F(CameraPlacement, LookingStraightDownKeepsTheOldUp) {
+TEST_F(CameraAim, LookingStraightDownKeepsTheOldUp) {
     look({0.0, 0.0, -1.0}, {0.0, 1.0, 0.0});
     ASSERT_TRUE(place({5.0, 5.0, 0.0}, {5.0, 5.0, 9.0}));
     EXPECT_TRUE(near(placed.CameraY(), KM_3dVector(0.0, 1.0, 0.0), tolerance));
     EXPECT_TRUE(near(placed.CameraZ(), KM_3dVector(0.0, 0.0, 1.0), tolerance));
 }
 
-TEST_F(CameraPlacement, TurningStraightDownKeepsTheOldUpAsItIs) {
+TEST_F(CameraAim, TurningStraightDownKeepsTheOldUpAsItIs) {
     // The camera looks down at 45 degrees; its up is (0, 1, 1) / sqrt(2). Turned as the direction
     // is, it would be (0, 1, 0); as it fits unturned, it stays.
     look({0.0, 1.0, -1.0}, {0.0, 0.0, 1.0});
@@ -163,7 +163,7 @@ TEST_F(CameraPlacement, TurningStraightDownKeepsTheOldUpAsItIs) {
     EXPECT_TRUE(near(placed.CameraY(), KM_3dVector(0.0, 1.0, 0.0), tolerance));
 }
 
-TEST_F(CameraPlacement, OldUpTurnsWithTheDirectionWhereItWouldLieAlongIt) {
+TEST_F(CameraAim, OldUpTurnsWithTheDirectionWhereItWouldLieAlongIt) {
     // A level camera that looks along +Y turns to look straight down: its up, Z, lies along the new
     // direction; turned as the direction was, about the X axis, it is +Y.
     look({0.0, 1.0, 0.0}, {0.0, 0.0, 1.0});
@@ -174,7 +174,7 @@ TEST_F(CameraPlacement, OldUpTurnsWithTheDirectionWhereItWouldLieAlongIt) {
     EXPECT_TRUE(near(placed.CameraY(), KM_3dVector(0.0, -1.0, 0.0), tolerance));
 }
 
-TEST_F(CameraPlacement, LockedUpFlattensTheDirection) {
+TEST_F(CameraAim, LockedUpFlattensTheDirection) {
     look({0.0, 1.0, 0.0}, {0.0, 0.0, 1.0}, true);
     ASSERT_TRUE(place({3.0, 4.0, 5.0}, {0.0, 0.0, 0.0}));
     EXPECT_TRUE(near(placed.CameraDirection(), KM_3dVector(3.0, 4.0, 0.0), tolerance));
@@ -182,7 +182,7 @@ TEST_F(CameraPlacement, LockedUpFlattensTheDirection) {
     EXPECT_TRUE(near(placed.TargetPoint(), KM_3dPoint(3.0, 4.0, 5.0), 0.0));
 }
 
-TEST_F(CameraPlacement, LockedUpThatIsNotTheWorldsStaysAndKeepsNoRoll) {
+TEST_F(CameraAim, LockedUpThatIsNotTheWorldsStaysAndKeepsNoRoll) {
     // Up is (0, 0.6, 0.8) and the camera looks along (0, 0.8, -0.6). The way to the target,
     // (1, 0, 5), has 5 * 0.8 = 4 along the up: (1, 0, 5) - 4 (0, 0.6, 0.8) = (1, -2.4, 1.8).
     look({0.0, 0.8, -0.6}, {0.0, 0.6, 0.8}, true);
@@ -193,13 +193,13 @@ TEST_F(CameraPlacement, LockedUpThatIsNotTheWorldsStaysAndKeepsNoRoll) {
     EXPECT_TRUE(placed.CameraUpIsLocked());
 }
 
-TEST_F(CameraPlacement, ARolledLockedUpStaysRolled) {
+TEST_F(CameraAim, ARolledLockedUpStaysRolled) {
     look({0.0, 1.0, 0.0}, {0.5, 0.0, std::sqrt(0.75)}, true);
     ASSERT_TRUE(place({0.0, 7.0, 0.0}, {0.0, 0.0, 0.0}));
     EXPECT_TRUE(near(placed.CameraY(), KM_3dVector(0.5, 0.0, std::sqrt(0.75)), tolerance));
 }
 
-TEST_F(CameraPlacement, LockedUpKeepsTheOldDirectionTowardATargetAlongIt) {
+TEST_F(CameraAim, LockedUpKeepsTheOldDirectionTowardATargetAlongIt) {
     look({0.0, 2.0, 0.0}, {0.0, 0.0, 1.0}, true);
     // Straight along it, and so nearly that what is left in the plane counts as nothing.
     for (const double beside : {0.0, 1e-10}) {
@@ -209,7 +209,7 @@ TEST_F(CameraPlacement, LockedUpKeepsTheOldDirectionTowardATargetAlongIt) {
     }
 }
 
-TEST_F(CameraPlacement, TheLiveViewportStaysAsItIs) {
+TEST_F(CameraAim, TheLiveViewportStaysAsItIs) {
     look({0.0, 1.0, 0.0}, {0.0, 0.0, 1.0});
     const KM_Viewport before = viewport().VP();
     ASSERT_TRUE(place({9.0, 9.0, 9.0}, {0.0, 0.0, 0.0}));

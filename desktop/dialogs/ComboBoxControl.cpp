@@ -1,20 +1,20 @@
-#include "desktop/dialogs/ComboBoxList.h"
+#include "desktop/dialogs/ComboBoxControl.h"
 
 #include "desktop/Texts.h"
 
 namespace quarn::desktop {
 
-void ComboBoxList::Reset() {
+void ComboBoxControl::Reset() {
     if (m_box)
         m_box->clear();
 }
 
-int ComboBoxList::Count() const {
+int ComboBoxControl::Count() const {
     return m_box ? m_box->count() : 0;
 }
 
 /// The box would select the first entry by itself; only Select does.
-void ComboBoxList::Insert(int index, const wchar_t* text) {
+void ComboBoxControl::Insert(int index, const wchar_t* text) {
     if (!m_box || !text)
         return;
     const bool had_none = m_box->currentIndex() < 0;
@@ -23,12 +23,12 @@ void ComboBoxList::Insert(int index, const wchar_t* text) {
         m_box->setCurrentIndex(-1);
 }
 
-void ComboBoxList::Select(int index) {
+void ComboBoxControl::Select(int index) {
     if (m_box)
         m_box->setCurrentIndex(index >= 0 && index < m_box->count() ? index : -1);
 }
 
-int ComboBoxList::Selection() const {
+int ComboBoxControl::Selection() const {
     return m_box ? m_box->currentIndex() : -1;
 }
 

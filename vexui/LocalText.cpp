@@ -1,4 +1,4 @@
-#include "vexui/Texts.h"
+#include "vexui/LocalText.h"
 
 #include "sdk/qncore/QnLocalize.h"
 

@@ -10,7 +10,7 @@
 namespace quarn::desktop {
 
 /// Cities as a table: name, country, coordinates.
-class CityTable final : public QAbstractTableModel {
+class CityTableModel final : public QAbstractTableModel {
 public:
     using QAbstractTableModel::QAbstractTableModel;
 

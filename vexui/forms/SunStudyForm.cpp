@@ -1,6 +1,6 @@
-#include "vexui/forms/SunForm.h"
+#include "vexui/forms/SunStudyForm.h"
 
-#include "vexui/Texts.h"
+#include "vexui/LocalText.h"
 #include "vexui/forms/CountField.h"
 #include "vexui/forms/NumberField.h"
 
@@ -54,17 +54,17 @@ void takeEnd(const QDateTime& end, KM_3dmAnimationProperties& record) {
 
 } // namespace
 
-SunForm::SunForm(const char* name, const QString& title, QWidget* owner)
+SunStudyForm::SunStudyForm(const char* name, const QString& title, QWidget* owner)
     : Form(name, title, owner) {}
 
 // ---- Fields
 
-void SunForm::addNumber(QFormLayout& section, const Caption& caption, NumberField& field) {
+void SunStudyForm::addNumber(QFormLayout& section, const Caption& caption, NumberField& field) {
     addField(section, caption, field);
     connect(&field, &QLineEdit::textChanged, this, [this] { review(); });
 }
 
-void SunForm::addPlace(const KM_3dmAnimationProperties& record) {
+void SunStudyForm::addPlace(const KM_3dmAnimationProperties& record) {
     m_place.zone = new QLabel(this);
     m_place.zone->setObjectName(QString::fromLatin1("zone"));
     m_place.zone->setTextFormat(Qt::PlainText);
@@ -94,7 +94,7 @@ void SunForm::addPlace(const KM_3dmAnimationProperties& record) {
     check(*m_place.north_angle, [this] { return m_place.northAngleFault(); });
 }
 
-void SunForm::addChooser(QFormLayout& section) {
+void SunStudyForm::addChooser(QFormLayout& section) {
     auto* button = new QPushButton(localText(L"C&hoose Place...", 44028), this);
     button->setObjectName(QString::fromLatin1("choosePlace"));
     button->setToolTip(localText(L"Find the place in a table of cities or on a map", 44048));
@@ -104,14 +104,14 @@ void SunForm::addChooser(QFormLayout& section) {
     addToTabOrder(*button);
 }
 
-QFormLayout& SunForm::addTimes() {
+QFormLayout& SunStudyForm::addTimes() {
     QFormLayout& section = addSection(localText(L"Time", 44009));
     section.addRow(m_place.zone);
     return section;
 }
 
-QDateEdit& SunForm::addDate(QFormLayout& section, const Caption& caption, int year, int month,
-                            int day) {
+QDateEdit& SunStudyForm::addDate(QFormLayout& section, const Caption& caption, int year, int month,
+                                 int day) {
     auto* field = new QDateEdit(this);
     field->setDisplayFormat(QString::fromLatin1("yyyy-MM-dd"));
     field->setCalendarPopup(true);
@@ -122,7 +122,8 @@ QDateEdit& SunForm::addDate(QFormLayout& section, const Caption& caption, int ye
     return *field;
 }
 
-QTimeEdit& SunForm::addTime(QFormLayout& section, const Caption& caption, int hour, int minute) {
+QTimeEdit& SunStudyForm::addTime(QFormLayout& section, const Caption& caption, int hour,
+                                 int minute) {
     auto* field = new QTimeEdit(nearestTime(hour, minute), this);
     field->setDisplayFormat(QString::fromLatin1("HH:mm"));
     addField(section, caption, *field);
@@ -130,31 +131,32 @@ QTimeEdit& SunForm::addTime(QFormLayout& section, const Caption& caption, int ho
     return *field;
 }
 
-void SunForm::addStep(QFormLayout& section, const Caption& caption, int step, int longest,
-                      const QString& fault) {
+void SunStudyForm::addStep(QFormLayout& section, const Caption& caption, int step, int longest,
+                           const QString& fault) {
     m_step = new CountField(0, longest, this);
     m_step->setValue(magnitude(step));
     addCount(section, caption, *m_step);
     check(*m_step, [this, fault] { return m_step->count().value_or(-1) < 0 ? fault : QString(); });
 }
 
-void SunForm::finishWith(const IZoetrixDataUI& lists, const KM_3dmAnimationProperties& record) {
+void SunStudyForm::finishWith(const IZoetrixDataUI& lists,
+                              const KM_3dmAnimationProperties& record) {
     m_recording = addRecording(lists, record, BadCharacters::refused);
     finish([this] { return outcome(); });
 }
 
 // ---- What comes out
 
-int SunForm::step() const {
+int SunStudyForm::step() const {
     return m_step->count().value_or(0);
 }
 
-void SunForm::review() {
+void SunStudyForm::review() {
     m_place.tellZone();
     Form::review();
 }
 
-Outcome SunForm::outcome() const {
+Outcome SunStudyForm::outcome() const {
     const Span study = span();
     const StudyFrames frames = studyFrames(study.start, study.end, stepInSeconds());
     if (frames.count == 0)
@@ -167,7 +169,7 @@ Outcome SunForm::outcome() const {
     return {momentsText(study.start, frames)};
 }
 
-void SunForm::takeInto(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) const {
+void SunStudyForm::takeInto(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) const {
     m_recording.takeInto(lists, record);
     m_place.takeInto(record);
     const Span study = span();

@@ -13,7 +13,7 @@ class CountField;
 class NumberField;
 
 /// What the forms of both sun studies have in common: place, time, step, and recording.
-class SunForm : public Form {
+class SunStudyForm : public Form {
 public:
     /// Writes the selections, the name, the place, and start, end and step of the study.
     void takeInto(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) const override;
@@ -25,7 +25,7 @@ protected:
         QDateTime end;
     };
 
-    SunForm(const char* name, const QString& title, QWidget* owner);
+    SunStudyForm(const char* name, const QString& title, QWidget* owner);
 
     void addPlace(const KM_3dmAnimationProperties& record);
     /// A section for the times, with the zone they are of.

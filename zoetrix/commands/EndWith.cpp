@@ -1,4 +1,4 @@
-#include "zoetrix/commands/CommandEnd.h"
+#include "zoetrix/commands/EndWith.h"
 
 #include "sdk/qncore/QnApp.h"
 #include "sdk/qncore/QnLocalize.h"

@@ -1,6 +1,6 @@
-#include "vexui/forms/CameraForm.h"
+#include "vexui/forms/CameraAnimationForm.h"
 
-#include "vexui/Texts.h"
+#include "vexui/LocalText.h"
 #include "vexui/forms/CountField.h"
 #include "vexui/forms/StudyFrames.h"
 
@@ -16,26 +16,27 @@ namespace {
 
 constexpr int most_frames = 1'000'000;
 
-const char* nameOf(CameraForm::Kind kind) {
-    return kind == CameraForm::Kind::turntable ? "turntableForm" : "pathForm";
+const char* nameOf(CameraAnimationForm::Kind kind) {
+    return kind == CameraAnimationForm::Kind::turntable ? "turntableForm" : "pathForm";
 }
 
-QString titleOf(CameraForm::Kind kind) {
-    return kind == CameraForm::Kind::turntable ? localText(L"Turntable Animation", 44001)
-                                               : localText(L"Path Animation", 44002);
+QString titleOf(CameraAnimationForm::Kind kind) {
+    return kind == CameraAnimationForm::Kind::turntable ? localText(L"Turntable Animation", 44001)
+                                                        : localText(L"Path Animation", 44002);
 }
 
 } // namespace
 
-CameraForm::CameraForm(Kind kind, const IZoetrixDataUI& lists,
-                       const KM_3dmAnimationProperties& record, QWidget* owner)
+CameraAnimationForm::CameraAnimationForm(Kind kind, const IZoetrixDataUI& lists,
+                                         const KM_3dmAnimationProperties& record, QWidget* owner)
     : Form(nameOf(kind), titleOf(kind), owner), m_kind(kind) {
     addMotion(lists, record);
     m_recording = addRecording(lists, record, BadCharacters::replaced);
     finish([this] { return outcome(); });
 }
 
-void CameraForm::addMotion(const IZoetrixDataUI& lists, const KM_3dmAnimationProperties& record) {
+void CameraAnimationForm::addMotion(const IZoetrixDataUI& lists,
+                                    const KM_3dmAnimationProperties& record) {
     QFormLayout& section = addSection(localText(L"Camera", 44007));
     m_frames = new CountField(1, most_frames, this);
     m_frames->setValue(std::max(record.FrameCount(), 1));
@@ -51,14 +52,14 @@ void CameraForm::addMotion(const IZoetrixDataUI& lists, const KM_3dmAnimationPro
                                 lists.DirectionList(), lists.DirectionListSelection());
 }
 
-QString CameraForm::frameFault() const {
+QString CameraAnimationForm::frameFault() const {
     const std::optional<int> count = m_frames->count();
     if (!count)
         return localText(L"Enter the number of frames.", 44070);
     return *count < 1 ? localText(L"An animation has at least 1 frame.", 44071) : QString();
 }
 
-Outcome CameraForm::outcome() const {
+Outcome CameraAnimationForm::outcome() const {
     const int count = m_frames->count().value_or(1);
     if (const QString warning = nameWarning(m_recording.nameText()); !warning.isEmpty())
         return {warning, true};
@@ -67,7 +68,7 @@ Outcome CameraForm::outcome() const {
     return {framesText(count)};
 }
 
-QString CameraForm::framesText(int count) const {
+QString CameraAnimationForm::framesText(int count) const {
     const QString number = QLocale().toString(count);
     if (m_kind == Kind::path)
         return count == 1 ? localText(L"1 frame.", 44100)
@@ -80,7 +81,7 @@ QString CameraForm::framesText(int count) const {
         .arg(number, degrees);
 }
 
-void CameraForm::takeInto(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) const {
+void CameraAnimationForm::takeInto(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) const {
     m_recording.takeInto(lists, record);
     record.SetFrameCount(m_frames->count().value_or(1));
     if (m_directions && m_directions->count() > 0)

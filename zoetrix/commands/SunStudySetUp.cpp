@@ -1,4 +1,4 @@
-#include "zoetrix/commands/SunStudy.h"
+#include "zoetrix/commands/SunStudySetUp.h"
 
 #include "sdk/qncore/QnCommand.h"
 #include "sdk/qncore/QnGet.h"

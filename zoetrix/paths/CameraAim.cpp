@@ -78,7 +78,7 @@ bool SetTargetAndCameraLocation(const CQuarnViewport& view_vp, KM_3dPoint target
         KM_3dVector up;
         if (!SetFittingUp(viewport, old, direction, up))
             return false;
-        // The roll turns about the old line of sight, not the new one; stored results rely on it.
+        // The roll turns about the old line of sight, not the new one.
         if (std::fabs(roll) > smallest_roll) {
             up = KM_Xform::Rotation(roll, -old.direction, camera) * up;
             if (!viewport.SetCameraUp(up))
