@@ -5,7 +5,7 @@
 // pictures themselves is what remains when edges are as good as they can be.
 
 #include "bench/Hills.h"
-#include "bench/Pavilion.h"
+#include "bench/PavilionScene.h"
 #include "bench/SteadyTurntable.h"
 #include "bench/Timing.h"
 #include "engine/display/DisplayMode.h"

@@ -1,7 +1,7 @@
 // Milliseconds that a frame's picture takes to be encoded and written, as a recording does it,
 // beside writing its pixels into a file as they are. The picture is the example model in Rendered.
 
-#include "bench/Pavilion.h"
+#include "bench/PavilionScene.h"
 #include "bench/SteadyTurntable.h"
 #include "bench/Timing.h"
 #include "engine/display/DisplayMode.h"

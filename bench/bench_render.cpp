@@ -2,7 +2,7 @@
 // pictures of few samples are from one of 4096, as the root of the mean squared difference of
 // their bytes (0 to 255).
 
-#include "bench/Pavilion.h"
+#include "bench/PavilionScene.h"
 #include "engine/display/DisplayScene.h"
 #include "engine/render/Renderer.h"
 #include "kelmar/KM_Viewport.h"

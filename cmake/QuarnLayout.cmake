@@ -11,8 +11,11 @@ set(CMAKE_LIBRARY_OUTPUT_DIRECTORY "${PROJECT_BINARY_DIR}/${QUARN_LIB_FOLDER}")
 set(CMAKE_BUILD_RPATH_USE_ORIGIN ON)
 
 if(NOT DEFINED CMAKE_CXX_COMPILER_LAUNCHER)
-    find_program(QUARN_CCACHE ccache)
-    mark_as_advanced(QUARN_CCACHE)
+    # Looked for once: a folder that began without it would be built anew if it came later.
+    if(NOT DEFINED CACHE{QUARN_CCACHE})
+        find_program(QUARN_CCACHE ccache)
+        mark_as_advanced(QUARN_CCACHE)
+    endif()
     if(QUARN_CCACHE)
         set(CMAKE_CXX_COMPILER_LAUNCHER "${QUARN_CCACHE}")
     endif()

@@ -1,8 +1,8 @@
 #include "desktop/animation/AnimationBar.h"
 
-#include "desktop/Texts.h"
 #include "desktop/animation/ProgressRow.h"
-#include "desktop/window/CommandStarter.h"
+#include "desktop/command_line/CommandStarter.h"
+#include "desktop/locale/Texts.h"
 #include "host/session/Session.h"
 #include "sdk/qncore/QnView.h"
 

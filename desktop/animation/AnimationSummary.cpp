@@ -1,7 +1,7 @@
 #include "desktop/animation/AnimationSummary.h"
 
-#include "desktop/Texts.h"
 #include "desktop/documents/StartedLine.h"
+#include "desktop/locale/Texts.h"
 
 #include <system_error>
 

@@ -1,6 +1,6 @@
 #include "desktop/animation/ProgressRow.h"
 
-#include "desktop/Texts.h"
+#include "desktop/locale/Texts.h"
 
 #include <QHBoxLayout>
 

@@ -1,6 +1,6 @@
 #include "desktop/animation/RecordingPace.h"
 
-#include "desktop/Texts.h"
+#include "desktop/locale/Texts.h"
 
 #include <cmath>
 

@@ -1,6 +1,6 @@
 #include "desktop/command_line/CommandEdit.h"
 
-#include "desktop/Texts.h"
+#include "desktop/locale/Texts.h"
 
 #include <QKeyEvent>
 #include <QScreen>

@@ -1,6 +1,6 @@
 #include "desktop/command_line/CommandPane.h"
 
-#include "desktop/Texts.h"
+#include "desktop/locale/Texts.h"
 
 #include <QEvent>
 #include <QPointer>

@@ -1,6 +1,6 @@
 #include "desktop/command_line/OutputPane.h"
 
-#include "desktop/Texts.h"
+#include "desktop/locale/Texts.h"
 
 #include <QFontDatabase>
 #include <QScrollBar>

@@ -1,9 +1,9 @@
 #include "desktop/dialogs/Choosers.h"
 
-#include "desktop/Texts.h"
 #include "desktop/dialogs/DialogOwner.h"
 #include "desktop/dialogs/FileBrowser.h"
 #include "desktop/dialogs/MessageBox.h"
+#include "desktop/locale/Texts.h"
 
 #include <QDir>
 #include <QFileInfo>

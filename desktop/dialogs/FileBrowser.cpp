@@ -1,7 +1,7 @@
 #include "desktop/dialogs/FileBrowser.h"
 
-#include "desktop/Texts.h"
 #include "desktop/dialogs/MessageBox.h"
+#include "desktop/locale/Texts.h"
 
 #include <QDialogButtonBox>
 #include <QDir>

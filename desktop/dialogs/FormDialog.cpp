@@ -1,8 +1,8 @@
 #include "desktop/dialogs/FormDialog.h"
 
-#include "desktop/Texts.h"
 #include "desktop/dialogs/FormField.h"
 #include "desktop/dialogs/Mnemonics.h"
+#include "desktop/locale/Texts.h"
 
 #include <QDialogButtonBox>
 #include <QFormLayout>

@@ -1,10 +1,10 @@
 #include "desktop/dialogs/FormWindow.h"
 
-#include "desktop/Texts.h"
 #include "desktop/dialogs/ComboBoxControl.h"
 #include "desktop/dialogs/DialogOwner.h"
 #include "desktop/dialogs/FormDialog.h"
 #include "desktop/dialogs/FormField.h"
+#include "desktop/locale/Texts.h"
 
 #include <QEventLoop>
 #include <QPointer>

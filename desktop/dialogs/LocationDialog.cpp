@@ -1,11 +1,11 @@
 #include "desktop/dialogs/LocationDialog.h"
 
-#include "desktop/Texts.h"
 #include "desktop/dialogs/CityTableModel.h"
 #include "desktop/dialogs/DialogOwner.h"
 #include "desktop/dialogs/FieldMark.h"
 #include "desktop/dialogs/PlaceText.h"
 #include "desktop/dialogs/WorldMap.h"
+#include "desktop/locale/Texts.h"
 
 #include <QHBoxLayout>
 #include <QHeaderView>

@@ -1,8 +1,8 @@
 #include "desktop/dialogs/WorldMap.h"
 
-#include "desktop/Texts.h"
 #include "desktop/dialogs/MapDrawing.h"
 #include "desktop/dialogs/PlaceText.h"
+#include "desktop/locale/Texts.h"
 
 #include <QKeyEvent>
 #include <QMouseEvent>

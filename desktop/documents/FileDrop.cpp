@@ -1,9 +1,9 @@
 #include "desktop/documents/FileDrop.h"
 
-#include "desktop/Texts.h"
+#include "desktop/command_line/CommandStarter.h"
 #include "desktop/documents/StartedLine.h"
 #include "desktop/documents/UnsavedChanges.h"
-#include "desktop/window/CommandStarter.h"
+#include "desktop/locale/Texts.h"
 
 #include <QDragEnterEvent>
 #include <QDropEvent>

@@ -1,6 +1,6 @@
 #include "desktop/documents/StartedLine.h"
 
-#include "desktop/Texts.h"
+#include "desktop/locale/Texts.h"
 
 namespace quarn::desktop {
 

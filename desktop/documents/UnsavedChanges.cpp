@@ -1,8 +1,8 @@
 #include "desktop/documents/UnsavedChanges.h"
 
-#include "desktop/Texts.h"
+#include "desktop/command_line/CommandStarter.h"
 #include "desktop/documents/StartedLine.h"
-#include "desktop/window/CommandStarter.h"
+#include "desktop/locale/Texts.h"
 #include "host/session/DocumentState.h"
 
 #include <QMessageBox>

@@ -1,9 +1,9 @@
 #include "desktop/documents/WindowClosing.h"
 
-#include "desktop/Texts.h"
 #include "desktop/command_line/CommandPane.h"
+#include "desktop/command_line/CommandStarter.h"
 #include "desktop/documents/UnsavedChanges.h"
-#include "desktop/window/CommandStarter.h"
+#include "desktop/locale/Texts.h"
 
 #include <QMessageBox>
 #include <QPushButton>

@@ -1,8 +1,8 @@
 #include "desktop/menus/CommandMenus.h"
 
-#include "desktop/Texts.h"
 #include "desktop/animation/AnimationSummary.h"
-#include "desktop/window/CommandStarter.h"
+#include "desktop/command_line/CommandStarter.h"
+#include "desktop/locale/Texts.h"
 
 #include <algorithm>
 

@@ -1,6 +1,6 @@
 #include "desktop/views/OpenViews.h"
 
-#include "desktop/Texts.h"
+#include "desktop/locale/Texts.h"
 #include "host/session/ViewFrame.h"
 
 namespace quarn::desktop {

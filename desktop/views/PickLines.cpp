@@ -1,6 +1,6 @@
 #include "desktop/views/PickLines.h"
 
-#include "desktop/Texts.h"
+#include "desktop/locale/Texts.h"
 
 namespace quarn::desktop {
 

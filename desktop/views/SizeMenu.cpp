@@ -1,6 +1,6 @@
 #include "desktop/views/SizeMenu.h"
 
-#include "desktop/Texts.h"
+#include "desktop/locale/Texts.h"
 
 namespace quarn::desktop {
 

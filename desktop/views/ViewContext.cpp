@@ -1,7 +1,7 @@
 #include "desktop/views/ViewContext.h"
 
 #include "desktop/command_line/CommandPane.h"
-#include "desktop/window/CommandStarter.h"
+#include "desktop/command_line/CommandStarter.h"
 
 namespace quarn::desktop {
 

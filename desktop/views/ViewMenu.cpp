@@ -1,10 +1,10 @@
 #include "desktop/views/ViewMenu.h"
 
-#include "desktop/Texts.h"
+#include "desktop/command_line/CommandStarter.h"
+#include "desktop/locale/Texts.h"
 #include "desktop/views/OpenViews.h"
 #include "desktop/views/SizeMenu.h"
 #include "desktop/views/ViewWidget.h"
-#include "desktop/window/CommandStarter.h"
 #include "host/session/ViewFrame.h"
 
 namespace quarn::desktop {

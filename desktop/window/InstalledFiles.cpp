@@ -1,6 +1,6 @@
 #include "desktop/window/InstalledFiles.h"
 
-#include "desktop/Texts.h"
+#include "desktop/locale/Texts.h"
 
 #include <QCoreApplication>
 

@@ -1,8 +1,8 @@
 #include "desktop/window/MainWindow.h"
 
-#include "desktop/Texts.h"
 #include "desktop/animation/AnimationBar.h"
 #include "desktop/command_line/CommandPane.h"
+#include "desktop/command_line/CommandStarter.h"
 #include "desktop/dialogs/Choosers.h"
 #include "desktop/dialogs/FormWindow.h"
 #include "desktop/dialogs/LocationDialog.h"
@@ -11,10 +11,10 @@
 #include "desktop/documents/RecentFiles.h"
 #include "desktop/documents/UnsavedChanges.h"
 #include "desktop/documents/WindowClosing.h"
+#include "desktop/locale/Texts.h"
 #include "desktop/menus/CommandMenus.h"
 #include "desktop/render/RenderPictureWindow.h"
 #include "desktop/views/ViewArea.h"
-#include "desktop/window/CommandStarter.h"
 #include "desktop/window/WindowActions.h"
 #include "host/session/DocumentState.h"
 

@@ -15,7 +15,7 @@ namespace quarn {
 namespace {
 
 /// Pixels of a task's block; neighbouring rays share what they read of the scene.
-constexpr int block_width = EdgeMarks::block_width;
+constexpr int block_width = PixelMarks::block_width;
 constexpr int block_height = 32;
 
 /// After so many pictures of less than a quarter of the pixels the buffers of a large one go.
@@ -106,7 +106,7 @@ void DisplayPipeline::makeRoom(int width, int height) {
         m_objects = std::vector<std::uint32_t>();
         m_depth = DepthImage();
         m_layers = std::vector<float>();
-        m_edges = EdgePixels();
+        m_marked = MarkedPixels();
         m_free_sky = FreeSky();
         m_lines = LineDrawing();
         m_held_px = 0;
@@ -137,17 +137,18 @@ void DisplayPipeline::drawSurfaces(FrameSetup& frame, const DisplayModeAttribute
     FrameSetup again = frame;
     again.layer_nearness = nullptr;
     again.nearness = nullptr;
-    m_edges.begin(frame, level == 1 ? 4 : 8, blocks.count());
+    m_marked.begin(frame, level == 1 ? 4 : 8, blocks.count());
     blocks.forEach([&](const PixelBlock& block, std::size_t index) {
         m_kernel->trace_block(frame, block);
-        m_edges.refineInside(again, *m_kernel, block, index);
+        m_marked.refineInside(again, *m_kernel, block, index);
     });
-    blocks.forEach(
-        [&](const PixelBlock& block, std::size_t) { m_edges.findAcross(again, *m_kernel, block); });
+    blocks.forEach([&](const PixelBlock& block, std::size_t) {
+        m_marked.findAcross(again, *m_kernel, block);
+    });
     blocks.forEach([&](const PixelBlock& block, std::size_t index) {
-        m_edges.refineBorder(again, *m_kernel, block, index);
+        m_marked.refineBorder(again, *m_kernel, block, index);
     });
-    m_smoothed = m_edges.count();
+    m_smoothed = m_marked.count();
 }
 
 } // namespace quarn

@@ -1,9 +1,9 @@
 #pragma once
 
 #include "engine/display/DisplayMode.h"
-#include "engine/display/EdgePixels.h"
 #include "engine/display/FreeSky.h"
 #include "engine/display/LineDrawing.h"
+#include "engine/display/MarkedPixels.h"
 #include "engine/images/Image.h"
 #include "ground/Result.h"
 
@@ -55,7 +55,7 @@ private:
     std::vector<std::uint32_t> m_objects;
     DepthImage m_depth;
     std::vector<float> m_layers;
-    EdgePixels m_edges;
+    MarkedPixels m_marked;
     FreeSky m_free_sky;
     LineDrawing m_lines;
     std::size_t m_smoothed = 0;

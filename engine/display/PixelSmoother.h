@@ -9,7 +9,7 @@
 
 namespace quarn {
 
-/// How many edge pixels share a packet of rays, and how many rays each has in it.
+/// How many marked pixels share a packet of rays, and how many rays each has in it.
 inline constexpr int pixels_a_packet = 4;
 inline constexpr int rays_a_pixel = lane_count / pixels_a_packet;
 
@@ -29,7 +29,7 @@ struct LinearSum {
     std::uint32_t mean(const SrgbTables& srgb) const;
 };
 
-/// An edge pixel and what its rays have seen so far.
+/// A marked pixel and what its rays have seen so far.
 struct SampledPixel {
     int x = 0;
     int y = 0;

@@ -50,9 +50,13 @@ void releaseMainThread() {
     main_thread.store(std::thread::id());
 }
 
-bool isOnMainThread(const char* call) {
+bool isMainThread() {
     const std::thread::id claimed = main_thread.load(std::memory_order_relaxed);
-    if (claimed == std::this_thread::get_id() || claimed == std::thread::id())
+    return claimed == std::this_thread::get_id() || claimed == std::thread::id();
+}
+
+bool isOnMainThread(const char* call) {
+    if (isMainThread())
         return true;
     reportBreach(call, "only the main thread may call it");
     return false;

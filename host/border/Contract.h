@@ -32,7 +32,9 @@ void reportBreach(std::string_view call, std::string_view rule);
 void claimMainThread();
 /// Allows every thread again.
 void releaseMainThread();
-/// Whether the calling thread is the main thread, or none was claimed; a breach elsewhere.
+/// Whether the calling thread is the main thread, or none was claimed.
+bool isMainThread();
+/// The same for a call of the interface: a breach elsewhere.
 bool isOnMainThread(const char* call);
 /// Whether a call on a view stands on the main thread and the view is open; a breach otherwise.
 /// @param view  whatever knows by isOpen() whether it is; not asked on another thread

@@ -1,5 +1,6 @@
 #include "host/app/Application.h"
 #include "host/commands/CommandEnd.h"
+#include "host/commands/DesktopOpener.h"
 #include "host/commands/FileAsking.h"
 #include "host/commands/HostCommands.h"
 #include "sdk/qncore/QnLocalize.h"

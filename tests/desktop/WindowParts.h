@@ -1,8 +1,8 @@
 #pragma once
 
-#include "desktop/Texts.h"
+#include "desktop/command_line/CommandStarter.h"
 #include "desktop/front_end/DesktopFrontEnd.h"
-#include "desktop/window/CommandStarter.h"
+#include "desktop/locale/Texts.h"
 #include "host/session/Session.h"
 #include "tests/support/TempFolder.h"
 

@@ -1,8 +1,8 @@
 #include "vexui/forms/CameraAnimationForm.h"
 
-#include "vexui/LocalText.h"
 #include "vexui/forms/CountField.h"
 #include "vexui/forms/StudyFrames.h"
+#include "vexui/locale/LocalText.h"
 
 #include <QComboBox>
 #include <QFormLayout>

@@ -1,8 +1,8 @@
 #include "vexui/forms/Form.h"
 
-#include "vexui/LocalText.h"
 #include "vexui/forms/CountField.h"
 #include "vexui/forms/FirstChoices.h"
+#include "vexui/locale/LocalText.h"
 
 #include <QComboBox>
 #include <QDialogButtonBox>

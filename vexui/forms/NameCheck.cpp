@@ -1,7 +1,7 @@
 #include "vexui/forms/NameCheck.h"
 
 #include "sdk/qncore/QnAnimationName.h"
-#include "vexui/LocalText.h"
+#include "vexui/locale/LocalText.h"
 
 #include <algorithm>
 

@@ -3,8 +3,8 @@
 #include "sdk/qncore/QnLocalize.h"
 #include "sdk/qncore/QnLocationDialog.h"
 #include "sdk/zel/QnZone.h"
-#include "vexui/LocalText.h"
 #include "vexui/forms/NumberField.h"
+#include "vexui/locale/LocalText.h"
 
 #include <QLabel>
 

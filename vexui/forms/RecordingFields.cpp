@@ -1,6 +1,6 @@
 #include "vexui/forms/RecordingFields.h"
 
-#include "vexui/LocalText.h"
+#include "vexui/locale/LocalText.h"
 
 #include <QComboBox>
 #include <QLineEdit>

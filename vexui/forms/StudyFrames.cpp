@@ -1,6 +1,6 @@
 #include "vexui/forms/StudyFrames.h"
 
-#include "vexui/LocalText.h"
+#include "vexui/locale/LocalText.h"
 
 #include <QLocale>
 

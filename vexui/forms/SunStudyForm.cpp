@@ -1,8 +1,8 @@
 #include "vexui/forms/SunStudyForm.h"
 
-#include "vexui/LocalText.h"
 #include "vexui/forms/CountField.h"
 #include "vexui/forms/NumberField.h"
+#include "vexui/locale/LocalText.h"
 
 #include <QDateEdit>
 #include <QFormLayout>

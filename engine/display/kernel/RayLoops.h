@@ -1,8 +1,8 @@
 // The ray loops. Each RayKernel_*.cpp includes this once, with its own processor's flags.
 
 #include "engine/display/DisplayTable.h"
-#include "engine/display/kernel/EdgeSteps.h"
 #include "engine/display/kernel/LayeredShading.h"
+#include "engine/display/kernel/PixelSteps.h"
 #include "engine/display/kernel/SeeThroughShading.h"
 #include "engine/display/kernel/SkyLoops.h"
 

@@ -1,5 +1,5 @@
+#include "desktop/command_line/CommandStarter.h"
 #include "desktop/render/PictureSheet.h"
-#include "desktop/window/CommandStarter.h"
 #include "tests/desktop/window/WindowFixture.h"
 
 #include <QElapsedTimer>

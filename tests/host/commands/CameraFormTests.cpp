@@ -1,5 +1,5 @@
 #include "host/commands/CameraForm.h"
-#include "tests/host/commands/FormFixture.h"
+#include "tests/host/commands/HostFormFixture.h"
 
 namespace quarn::test {
 namespace {

@@ -1,6 +1,6 @@
 #include "host/commands/RenderSettingsForm.h"
 #include "host/commands/ViewportSizeForm.h"
-#include "tests/host/commands/FormFixture.h"
+#include "tests/host/commands/HostFormFixture.h"
 #include "tests/support/TempFolder.h"
 
 namespace quarn::test {

@@ -1,6 +1,6 @@
 #include "host/commands/SunForm.h"
 #include "host/sun/SunDirection.h"
-#include "tests/host/commands/FormFixture.h"
+#include "tests/host/commands/HostFormFixture.h"
 
 namespace quarn::test {
 namespace {

@@ -11,7 +11,7 @@ namespace quarn {
 /// Which pixels of a picture differ visibly from one of their four neighbours, in colour or object
 /// (every visible step of normal or depth brings one of both with it). Pixels are compared as the
 /// rays left them: a block is looked at before any pixel of it or next to it is smoothed.
-class EdgeMarks {
+class PixelMarks {
 public:
     /// Blocks begin at multiples of this, and are as wide but at the picture's right side.
     static constexpr int block_width = 64;
@@ -19,7 +19,7 @@ public:
     /// Makes room for a picture; keeps its memory for the next one.
     void resize(int width, int height);
 
-    /// Marks the edge pixels among the pixels of a block, which has just been traced. Different
+    /// Marks those among the pixels of a block, which has just been traced. Different
     /// blocks may be looked at by different threads at the same time.
     void markInside(const FrameSetup& frame, const RayKernel& kernel, const PixelBlock& block);
 

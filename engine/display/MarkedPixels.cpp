@@ -1,4 +1,4 @@
-#include "engine/display/EdgePixels.h"
+#include "engine/display/MarkedPixels.h"
 
 #include "engine/display/PixelSmoother.h"
 
@@ -27,14 +27,14 @@ std::array<PixelBlock, 4> borderOf(const PixelBlock& block, const PixelBlock& in
 
 } // namespace
 
-void EdgePixels::begin(const FrameSetup& frame, int rays_per_pixel, std::size_t block_count) {
+void MarkedPixels::begin(const FrameSetup& frame, int rays_per_pixel, std::size_t block_count) {
     m_twice = rays_per_pixel > rays_a_pixel;
     m_marks.resize(frame.width, frame.height);
     m_counts.assign(block_count, 0);
 }
 
-void EdgePixels::refineInside(const FrameSetup& frame, const RayKernel& kernel,
-                              const PixelBlock& block, std::size_t index) {
+void MarkedPixels::refineInside(const FrameSetup& frame, const RayKernel& kernel,
+                                const PixelBlock& block, std::size_t index) {
     m_marks.markInside(frame, kernel, block);
     PixelSmoother smoother(frame, kernel, m_twice);
     m_marks.forEach(insideOf(block, frame), [&](int x, int y) { smoother.add(x, y); });
@@ -42,8 +42,8 @@ void EdgePixels::refineInside(const FrameSetup& frame, const RayKernel& kernel,
     m_counts[index] += smoother.count();
 }
 
-void EdgePixels::refineBorder(const FrameSetup& frame, const RayKernel& kernel,
-                              const PixelBlock& block, std::size_t index) {
+void MarkedPixels::refineBorder(const FrameSetup& frame, const RayKernel& kernel,
+                                const PixelBlock& block, std::size_t index) {
     PixelSmoother smoother(frame, kernel, m_twice);
     for (const PixelBlock& side : borderOf(block, insideOf(block, frame)))
         m_marks.forEach(side, [&](int x, int y) { smoother.add(x, y); });
@@ -51,7 +51,7 @@ void EdgePixels::refineBorder(const FrameSetup& frame, const RayKernel& kernel,
     m_counts[index] += smoother.count();
 }
 
-std::size_t EdgePixels::count() const {
+std::size_t MarkedPixels::count() const {
     return std::accumulate(m_counts.begin(), m_counts.end(), std::size_t{0});
 }
 

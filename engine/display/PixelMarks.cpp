@@ -1,4 +1,4 @@
-#include "engine/display/EdgeMarks.h"
+#include "engine/display/PixelMarks.h"
 
 namespace quarn {
 
@@ -11,13 +11,13 @@ std::size_t offset(const FrameSetup& frame, int x, int y) {
 
 } // namespace
 
-void EdgeMarks::resize(int width, int height) {
+void PixelMarks::resize(int width, int height) {
     m_columns = static_cast<std::size_t>((width + block_width - 1) / block_width);
     m_rows.resize(m_columns * static_cast<std::size_t>(height));
 }
 
-void EdgeMarks::markInside(const FrameSetup& frame, const RayKernel& kernel,
-                           const PixelBlock& block) {
+void PixelMarks::markInside(const FrameSetup& frame, const RayKernel& kernel,
+                            const PixelBlock& block) {
     const int width = block.x_end - block.x_begin;
     std::uint64_t from_above = 0;
     for (int y = block.y_begin; y < block.y_end; ++y) {
@@ -31,8 +31,8 @@ void EdgeMarks::markInside(const FrameSetup& frame, const RayKernel& kernel,
     }
 }
 
-void EdgeMarks::markAcross(const FrameSetup& frame, const RayKernel& kernel,
-                           const PixelBlock& block) {
+void PixelMarks::markAcross(const FrameSetup& frame, const RayKernel& kernel,
+                            const PixelBlock& block) {
     const int width = block.x_end - block.x_begin;
     const auto compare_rows = [&](int y, int other) {
         rowOfBlock(block.x_begin, y) |= kernel.find_steps(

@@ -44,7 +44,7 @@ double distance(const Image& image, int x, int y, const std::array<int, 3>& colo
     return sum / 3.0;
 }
 
-TEST(EdgeSmoothing, MoreRaysComeNearerToAPictureOf64RaysAPixel) {
+TEST(PixelSmoothing, MoreRaysComeNearerToAPictureOf64RaysAPixel) {
     const SceneContent content = boxAndBall();
     constexpr int width = 240;
     constexpr int height = 180;
@@ -89,7 +89,7 @@ std::size_t edgePixelsOf(const Image& image) {
     return count;
 }
 
-TEST(EdgeSmoothing, FindsEveryVisibleStepWhateverTheSizeOfThePicture) {
+TEST(PixelSmoothing, FindsEveryVisibleStepWhateverTheSizeOfThePicture) {
     SceneContent content;
     addMesh(content, boxMesh({-3, -3, 0}, {0, 0, 4}), {200, 10, 10, 255}); // unlike all behind it
     content.lights.push_back(sunLight({0.8, 0.4, -0.5}));
@@ -110,7 +110,7 @@ TEST(EdgeSmoothing, FindsEveryVisibleStepWhateverTheSizeOfThePicture) {
         }
 }
 
-TEST(EdgeSmoothing, ThePictureIsTheSameForAnyNumberOfThreads) {
+TEST(PixelSmoothing, ThePictureIsTheSameForAnyNumberOfThreads) {
     const SceneContent content = boxAndBall();
     for (const int level : {1, 2}) {
         Image first;
@@ -125,7 +125,7 @@ TEST(EdgeSmoothing, ThePictureIsTheSameForAnyNumberOfThreads) {
     }
 }
 
-TEST(EdgeSmoothing, EvenPicturesAreLeftAlone) {
+TEST(PixelSmoothing, EvenPicturesAreLeftAlone) {
     SceneContent content;
     addMesh(content, floorMesh(-100, -100, 100, 100, 0.0F));
     content.lights.push_back(sunLight({0.8, 0.4, -0.5}));

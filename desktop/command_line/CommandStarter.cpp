@@ -1,7 +1,7 @@
-#include "desktop/window/CommandStarter.h"
+#include "desktop/command_line/CommandStarter.h"
 
-#include "desktop/Texts.h"
 #include "desktop/front_end/DesktopFrontEnd.h"
+#include "desktop/locale/Texts.h"
 
 namespace quarn::desktop {
 

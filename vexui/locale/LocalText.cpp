@@ -1,4 +1,4 @@
-#include "vexui/LocalText.h"
+#include "vexui/locale/LocalText.h"
 
 #include "sdk/qncore/QnLocalize.h"
 

@@ -1,4 +1,4 @@
-#include "engine/display/EdgeMarks.h"
+#include "engine/display/PixelMarks.h"
 
 #include <gtest/gtest.h>
 
@@ -12,7 +12,7 @@ constexpr std::uint32_t grey = 0xFF808080U;
 constexpr int block_height = 32;
 
 /// A picture of one grey object, in blocks.
-class EdgeMarksTest : public testing::TestWithParam<const RayKernel*> {
+class PixelMarksTest : public testing::TestWithParam<const RayKernel*> {
 protected:
     void paint(int width, int height) {
         m_pixels.assign(static_cast<std::size_t>(width) * static_cast<std::size_t>(height), grey);
@@ -27,7 +27,7 @@ protected:
 
     /// What is marked, row by row.
     std::vector<std::pair<int, int>> marked() {
-        EdgeMarks marks;
+        PixelMarks marks;
         marks.resize(m_frame.width, m_frame.height);
         forEachBlock([&](const PixelBlock& b) { marks.markInside(m_frame, *GetParam(), b); });
         forEachBlock([&](const PixelBlock& b) { marks.markAcross(m_frame, *GetParam(), b); });
@@ -49,8 +49,8 @@ private:
     }
     template <class Function> void forEachBlock(const Function& function) const {
         for (int y = 0; y < m_frame.height; y += block_height)
-            for (int x = 0; x < m_frame.width; x += EdgeMarks::block_width)
-                function(PixelBlock{x, y, std::min(m_frame.width, x + EdgeMarks::block_width),
+            for (int x = 0; x < m_frame.width; x += PixelMarks::block_width)
+                function(PixelBlock{x, y, std::min(m_frame.width, x + PixelMarks::block_width),
                                     std::min(m_frame.height, y + block_height)});
     }
 
@@ -59,13 +59,13 @@ private:
     FrameSetup m_frame;
 };
 
-TEST_P(EdgeMarksTest, APixelOfAnotherColourIsMarkedWithItsFourNeighbours) {
+TEST_P(PixelMarksTest, APixelOfAnotherColourIsMarkedWithItsFourNeighbours) {
     paint(100, 50);
     pixel(20, 10) = 0xFF8080A0U;
     EXPECT_EQ(marked(), (Places{{20, 9}, {19, 10}, {20, 10}, {21, 10}, {20, 11}}));
 }
 
-TEST_P(EdgeMarksTest, AStepOfColourCountsFromFifteenOn) {
+TEST_P(PixelMarksTest, AStepOfColourCountsFromFifteenOn) {
     paint(100, 50);
     pixel(20, 10) = grey + 14;
     pixel(40, 10) = grey - (14U << 16);
@@ -75,13 +75,13 @@ TEST_P(EdgeMarksTest, AStepOfColourCountsFromFifteenOn) {
     EXPECT_EQ(marked().size(), 10U);
 }
 
-TEST_P(EdgeMarksTest, AnotherObjectOfTheSameColourIsAnEdge) {
+TEST_P(PixelMarksTest, AnotherObjectOfTheSameColourIsAnEdge) {
     paint(100, 50);
     object(70, 20) = 2;
     EXPECT_EQ(marked(), (Places{{70, 19}, {69, 20}, {70, 20}, {71, 20}, {70, 21}}));
 }
 
-TEST_P(EdgeMarksTest, AnEdgeBetweenTwoBlocksIsMarkedOnBothSides) {
+TEST_P(PixelMarksTest, AnEdgeBetweenTwoBlocksIsMarkedOnBothSides) {
     paint(130, 64);
     pixel(63, 31) = 0xFF000000U; // the last of its block both ways
     EXPECT_EQ(marked(), (Places{{63, 30}, {62, 31}, {63, 31}, {64, 31}, {63, 32}}));
@@ -90,7 +90,7 @@ TEST_P(EdgeMarksTest, AnEdgeBetweenTwoBlocksIsMarkedOnBothSides) {
     EXPECT_EQ(marked(), (Places{{64, 31}, {63, 32}, {64, 32}, {65, 32}, {64, 33}}));
 }
 
-TEST_P(EdgeMarksTest, TheEndsOfOneRowAndTheNextAreNoNeighbours) {
+TEST_P(PixelMarksTest, TheEndsOfOneRowAndTheNextAreNoNeighbours) {
     paint(67, 3);
     pixel(66, 0) = 0xFF000000U;
     EXPECT_EQ(marked(), (Places{{65, 0}, {66, 0}, {66, 1}}));
@@ -99,12 +99,12 @@ TEST_P(EdgeMarksTest, TheEndsOfOneRowAndTheNextAreNoNeighbours) {
     EXPECT_EQ(marked(), (Places{{0, 0}, {0, 1}, {1, 1}, {0, 2}}));
 }
 
-TEST_P(EdgeMarksTest, APictureOfOnePixelHasNoEdge) {
+TEST_P(PixelMarksTest, APictureOfOnePixelHasNoEdge) {
     paint(1, 1);
     EXPECT_EQ(marked(), Places{});
 }
 
-TEST_P(EdgeMarksTest, PicturesOfAnyWidthAreLookedAtWhole) {
+TEST_P(PixelMarksTest, PicturesOfAnyWidthAreLookedAtWhole) {
     for (int width = 1; width < 140; ++width) {
         paint(width, 2);
         for (int x = 0; x < width; ++x)
@@ -123,7 +123,7 @@ std::vector<const RayKernel*> kernelsOfThisProcessor() {
     return kernels;
 }
 
-INSTANTIATE_TEST_SUITE_P(Kernels, EdgeMarksTest, testing::ValuesIn(kernelsOfThisProcessor()),
+INSTANTIATE_TEST_SUITE_P(Kernels, PixelMarksTest, testing::ValuesIn(kernelsOfThisProcessor()),
                          [](const auto& kernel) { return std::string(kernel.param->name); });
 
 } // namespace

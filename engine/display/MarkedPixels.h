@@ -1,6 +1,6 @@
 #pragma once
 
-#include "engine/display/EdgeMarks.h"
+#include "engine/display/PixelMarks.h"
 
 #include <cstdint>
 #include <vector>
@@ -12,7 +12,7 @@ namespace quarn {
 ///
 /// A block is smoothed as soon as it is traced, while what its rays met of the scene is still at
 /// hand; but for the pixels along its border, which wait until the blocks next to it are traced.
-class EdgePixels {
+class MarkedPixels {
 public:
     /// Begins a picture, of which `frame.objects` will be filled too.
     /// @param rays_per_pixel  how many more rays: 4, or 8, of which the last four are shot only
@@ -39,7 +39,7 @@ public:
 
 private:
     bool m_twice = false;
-    EdgeMarks m_marks;
+    PixelMarks m_marks;
     std::vector<std::size_t> m_counts; ///< by block
 };
 
