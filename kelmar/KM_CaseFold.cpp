@@ -1,8 +1,8 @@
 #include "kelmar/KM_CaseFold.h"
 
+#include <clocale>
 #include <cstdint>
-#include <locale.h>
-#include <wctype.h>
+#include <cwctype>
 
 namespace kelmar {
 namespace {

@@ -8,7 +8,7 @@ namespace {
 /// What is held is looked at while the host waits, once or more for every frame.
 class LongRecording : public RecordingFixture {
 protected:
-    static constexpr int frame_count = 400;
+    static constexpr int frame_count = 200;
 
     /// Records what is set up.
     void expectSteadyMemory(const wchar_t* format) {
