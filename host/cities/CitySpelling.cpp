@@ -61,24 +61,43 @@ std::wstring plainLetters(wchar_t character) {
     return plain == '?' ? doubleLetter(character) : std::wstring{static_cast<wchar_t>(plain)};
 }
 
-std::wstring comparedCharacter(wchar_t character) {
-    if (character >= 0x80)
-        return plainLetters(character);
-    if (character >= L'A' && character <= L'Z')
-        return {static_cast<wchar_t>(character - L'A' + L'a')};
-    const bool stays =
-        (character >= L'a' && character <= L'z') || (character >= L'0' && character <= L'9');
-    return stays ? std::wstring{character} : std::wstring{};
+bool isAscii(char letter) {
+    return (static_cast<unsigned char>(letter) & 0x80U) == 0;
+}
+
+void appendAscii(std::string_view letters, std::string& compared) {
+    for (const char letter : letters) {
+        if (letter >= 'A' && letter <= 'Z')
+            compared += static_cast<char>(letter - 'A' + 'a');
+        else if ((letter >= 'a' && letter <= 'z') || (letter >= '0' && letter <= '9'))
+            compared += letter;
+    }
+}
+
+void appendOthers(std::string_view characters, std::string& compared) {
+    if (characters.empty())
+        return;
+    const KM_wString written = KM_wString::FromUtf8(characters);
+    std::wstring plain;
+    for (const wchar_t character : written.View())
+        plain += plainLetters(character);
+    compared += KM_wString(plain).ToUtf8();
 }
 
 } // namespace
 
 std::string comparedName(std::string_view name) {
-    const KM_wString written = KM_wString::FromUtf8(name);
-    std::wstring compared;
-    for (const wchar_t character : written.View())
-        compared += comparedCharacter(character);
-    return KM_wString(compared).ToUtf8();
+    std::string compared;
+    while (!name.empty()) {
+        const auto other = std::ranges::find_if_not(name, isAscii);
+        const auto ascii = static_cast<std::size_t>(other - name.begin());
+        const auto end =
+            static_cast<std::size_t>(std::find_if(other, name.end(), isAscii) - name.begin());
+        appendAscii(name.substr(0, ascii), compared);
+        appendOthers(name.substr(ascii, end - ascii), compared);
+        name.remove_prefix(end);
+    }
+    return compared;
 }
 
 int lettersApart(std::string_view one, std::string_view other) {
