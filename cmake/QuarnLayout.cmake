@@ -17,6 +17,8 @@ if(NOT DEFINED CMAKE_CXX_COMPILER_LAUNCHER)
         mark_as_advanced(QUARN_CCACHE)
     endif()
     if(QUARN_CCACHE)
-        set(CMAKE_CXX_COMPILER_LAUNCHER "${QUARN_CCACHE}")
+        # It keeps precompiled headers too, if it may trust their names and times.
+        set(CMAKE_CXX_COMPILER_LAUNCHER
+            "${CMAKE_COMMAND}" -E env CCACHE_SLOPPINESS=pch_defines,time_macros "${QUARN_CCACHE}")
     endif()
 endif()

@@ -34,6 +34,21 @@ const Places BELOW_SESSION = BELOW_COMMANDS + "host/commands/";
 // world.
 const Places PROGRAM = {"sdk/", "host/session/", "host/front_end/", "host/cities/"};
 
+const Places BELOW_TERMINAL = PROGRAM + "quarn/words/";
+const Places BELOW_CONSOLE_SESSION = BELOW_TERMINAL + "quarn/terminal/";
+const Places BELOW_SCRIPTS = BELOW_CONSOLE_SESSION + "quarn/session/";
+const Places BELOW_RUNS = BELOW_SCRIPTS + "quarn/scripts/";
+const Places BELOW_REPORTS = BELOW_RUNS + "quarn/runs/";
+const Places BELOW_CONSOLE = BELOW_REPORTS + "quarn/reports/";
+const Places BELOW_ARGUMENTS = BELOW_CONSOLE + "quarn/console/";
+
+const Places BELOW_PORT = PROGRAM + "desktop/locale/";
+const Places BELOW_STARTER = BELOW_PORT + "desktop/front_end/";
+const Places BELOW_BARS = BELOW_STARTER + "desktop/command_line/";
+const Places BELOW_WINDOW = BELOW_BARS + "desktop/dialogs/" + "desktop/render/" +
+                            "desktop/documents/" + "desktop/animation/" + "desktop/menus/" +
+                            "desktop/views/";
+
 constexpr std::string_view UTILITIES = "zoetrix/plugin/ZoetrixUtilities.h";
 
 const Room FLOORS[] = {
@@ -79,11 +94,38 @@ const Room FLOORS[] = {
      INTERFACE + "zoetrix/plugin/" + "zoetrix/paths/" + "zoetrix/sun/" + "zoetrix/ui/",
      {},
      standard},
-    {11, "zoetrix/", INTERFACE, {}, standard},
+    {11,
+     "zoetrix/ZoetrixGlobals.cpp",
+     INTERFACE + "zoetrix/plugin/" + "zoetrix/commands/",
+     {},
+     standard},
 
-    {11, "vexui/", INTERFACE},
-    {11, "quarn/", PROGRAM},
-    {11, "desktop/", PROGRAM},
+    {11, "vexui/locale/", INTERFACE},
+    {11, "vexui/forms/", INTERFACE + "vexui/locale/"},
+    {11, "vexui/", INTERFACE + "vexui/locale/" + "vexui/forms/"},
+
+    {11, "quarn/words/", PROGRAM},
+    {11, "quarn/terminal/", BELOW_TERMINAL},
+    {11, "quarn/session/", BELOW_CONSOLE_SESSION},
+    {11, "quarn/scripts/", BELOW_SCRIPTS},
+    {11, "quarn/runs/", BELOW_RUNS},
+    {11, "quarn/reports/", BELOW_REPORTS},
+    {11, "quarn/console/", BELOW_CONSOLE},
+    {11, "quarn/arguments/", BELOW_ARGUMENTS},
+    {11, "quarn/main.cpp", BELOW_ARGUMENTS + "quarn/arguments/"},
+
+    {11, "desktop/locale/", PROGRAM},
+    {11, "desktop/front_end/", BELOW_PORT},
+    {11, "desktop/command_line/", BELOW_STARTER},
+    {11, "desktop/dialogs/", BELOW_STARTER},
+    {11, "desktop/render/", BELOW_STARTER},
+    {11, "desktop/documents/", BELOW_BARS},
+    {11, "desktop/animation/", BELOW_BARS + "desktop/documents/"},
+    {11, "desktop/menus/", BELOW_BARS + "desktop/animation/"},
+    {11, "desktop/views/", BELOW_BARS + "desktop/documents/"},
+    {11, "desktop/window/", BELOW_WINDOW},
+    {11, "desktop/main.cpp", BELOW_WINDOW + "desktop/window/"},
+
     {11, "examples/", INTERFACE},
 };
 
