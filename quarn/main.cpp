@@ -1,13 +1,13 @@
-#include "quarn/CameraPath.h"
-#include "quarn/CommandLine.h"
-#include "quarn/Console.h"
-#include "quarn/CurveReport.h"
-#include "quarn/ModelReport.h"
-#include "quarn/PlaceList.h"
-#include "quarn/ScriptRun.h"
-#include "quarn/SingleFrame.h"
-#include "quarn/SunStudy.h"
-#include "quarn/Turntable.h"
+#include "quarn/arguments/ProgramArguments.h"
+#include "quarn/console/Console.h"
+#include "quarn/reports/CurveReport.h"
+#include "quarn/reports/ModelReport.h"
+#include "quarn/reports/PlaceList.h"
+#include "quarn/runs/CameraPath.h"
+#include "quarn/runs/ScriptRun.h"
+#include "quarn/runs/SingleFrame.h"
+#include "quarn/runs/SunStudy.h"
+#include "quarn/runs/Turntable.h"
 
 #include <cstdio>
 #include <exception>

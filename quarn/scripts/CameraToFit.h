@@ -1,0 +1,20 @@
+#pragma once
+
+#include "quarn/words/Words.h"
+
+#include <string>
+
+namespace quarn::program {
+
+/// The host command that lets the camera look at a point from a direction; FitView, which comes
+/// after it, keeps that direction and finds the distance.
+///
+/// @param azimuth_deg    of the camera about the target, counter-clockwise from the X axis
+/// @param elevation_deg  of the camera above the horizon through the target, -89 to 89
+std::string cameraToBeFitted(const Triple& target, double azimuth_deg, double elevation_deg);
+
+/// Reads a multiple of the fitted distance that was typed.
+/// @return nothing for what FitView does not take
+std::optional<double> distanceFactor(std::string_view typed);
+
+} // namespace quarn::program

@@ -1,0 +1,35 @@
+#pragma once
+
+#include "quarn/arguments/ProgramArguments.h"
+#include "quarn/words/FirstMistake.h"
+
+#include <optional>
+#include <string>
+
+namespace quarn::program {
+
+/// Where on the earth a model stands, and how it is turned there: every value is checked.
+struct StudySite {
+    std::string place;    ///< "Athens, Greece"; empty where coordinates were typed
+    double latitude_deg;  ///< north positive, -90 to 90
+    double longitude_deg; ///< east positive, -180 to 180
+    double north_deg;     ///< clockwise from the model's Y axis
+};
+
+/// Checks what was typed, before anything runs.
+StudySite checkSite(const SiteOptions& options, FirstMistake& mistake);
+
+/// The longitude as the command of a seasonal study takes it: 0 to 360, eastward.
+double eastwardLongitude(double longitude_deg);
+
+/// The zone that a sun study takes a place to be in: the whole hours of its longitude, rounded
+/// toward zero. No border and no daylight saving enters.
+int zoneHours(double longitude_deg);
+
+/// "UTC", "UTC-7", "UTC+16"
+std::string zoneText(int hours);
+/// "37.98 N", "105.1786 W"
+std::string latitudeText(double latitude_deg);
+std::string longitudeText(double longitude_deg);
+
+} // namespace quarn::program
