@@ -4,7 +4,6 @@
 #include "quarn/console/LineEditor.h"
 #include "quarn/console/PlainLines.h"
 #include "quarn/console/TerminalFrontEnd.h"
-#include "quarn/session/HostSession.h"
 #include "quarn/session/Interruption.h"
 
 #include <unistd.h>
@@ -81,16 +80,16 @@ std::unique_ptr<LineSource> openLines() {
 
 } // namespace
 
-Outcome runConsole(const ConsoleOptions& options) {
+Outcome runConsole(const std::filesystem::path& model, const CommonOptions& common) {
     watchForInterruption();
     const std::unique_ptr<LineSource> lines = openLines();
     // What opening tells is told once, by the outcome, when it fails.
-    TerminalFrontEnd front_end(*lines, printsFor(options.common));
-    HostSession host(front_end, options.common);
+    TerminalFrontEnd front_end(*lines, printsFor(common));
+    HostSession host(front_end, common);
     if (const auto trouble = host.loadAnimationPlugIn())
         return *trouble;
-    if (!options.model.empty())
-        if (const auto trouble = host.readModel(options.model))
+    if (!model.empty())
+        if (const auto trouble = host.readModel(model))
             return *trouble;
     front_end.showWords();
     if (lines->isTerminal())

@@ -3,9 +3,10 @@
 #include "quarn/console/PromptText.h"
 #include "quarn/session/Interruption.h"
 #include "quarn/terminal/Columns.h"
+#include "quarn/terminal/ShownText.h"
+#include "quarn/terminal/Utf8Scope.h"
 #include "quarn/words/Words.h"
 
-#include <clocale>
 #include <csignal>
 #include <cstdio>
 #include <sys/ioctl.h>
@@ -26,27 +27,6 @@ volatile std::sig_atomic_t g_is_screen_stale = 0;
 extern "C" void noteStaleScreen(int) {
     g_is_screen_stale = 1;
 }
-
-/// While it lives, the editor writes its wide characters as UTF-8 whatever the environment says;
-/// numbers and sorting are left alone.
-class Utf8Scope {
-public:
-    Utf8Scope()
-        : m_locale(newlocale(LC_CTYPE_MASK, "C.UTF-8", nullptr)),
-          m_before(m_locale ? uselocale(m_locale) : nullptr) {}
-    ~Utf8Scope() {
-        if (!m_locale)
-            return;
-        uselocale(m_before);
-        freelocale(m_locale);
-    }
-    Utf8Scope(const Utf8Scope&) = delete;
-    Utf8Scope& operator=(const Utf8Scope&) = delete;
-
-private:
-    locale_t m_locale;
-    locale_t m_before;
-};
 
 void watchScreen() {
     struct sigaction action = {};
@@ -114,7 +94,7 @@ LineEditor::LineEditor() : m_commands(makeHistory()), m_answers(makeHistory()) {
 LineRead LineEditor::read(const std::wstring& prompt, LineUse use, const Completer& completer) {
     const Utf8Scope utf8;
     EditLine* const editor = m_editor.get();
-    m_prompt = showAllButLastLine(wrappedPrompt(prompt, terminalWidth()));
+    m_prompt = showAllButLastLine(wrappedPrompt(shownText(prompt), terminalWidth()));
     m_completer = &completer;
     m_is_interrupted = false;
     g_is_screen_stale = 0;
@@ -215,7 +195,7 @@ void LineEditor::showCandidates(const Completion& completion) const {
     std::vector<std::wstring> names;
     for (const Completion::Candidate& candidate : completion.candidates) {
         if (names.size() < MOST_SHOWN)
-            names.push_back(candidate.shown);
+            names.push_back(shownText(candidate.shown));
     }
     std::string text = inColumns(names, terminalWidth());
     if (const std::size_t more = completion.candidates.size() - names.size())

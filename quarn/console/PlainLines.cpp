@@ -1,6 +1,7 @@
 #include "quarn/console/PlainLines.h"
 
 #include "quarn/session/Interruption.h"
+#include "quarn/terminal/ShownText.h"
 #include "quarn/words/Words.h"
 
 #include <cstdio>
@@ -9,7 +10,8 @@ namespace quarn::program {
 
 namespace {
 
-void show(const std::string& text) {
+void show(const std::string& words) {
+    const std::string text = shownText(words);
     std::fwrite(text.data(), 1, text.size(), stdout);
     std::fflush(stdout);
 }

@@ -1,20 +1,19 @@
 #include "quarn/reports/CurveReport.h"
 
-#include "quarn/session/HostSession.h"
 #include "quarn/session/Interruption.h"
 
 namespace quarn::program {
 
-Outcome reportCurves(const CurvesOptions& options) {
+Outcome reportCurves(const std::filesystem::path& model, const CommonOptions& common) {
     watchForInterruption();
-    ConsoleFrontEnd front_end(printsFor(options.common));
-    HostSession host(front_end, options.common);
-    if (const auto trouble = host.readModel(options.model))
+    ConsoleFrontEnd front_end(printsFor(common));
+    HostSession host(front_end, common);
+    if (const auto trouble = host.readModel(model))
         return *trouble;
     front_end.keepWords();
     if (const auto trouble = host.run("_-List _Curves"))
         return *trouble;
-    return Outcome::success(front_end.keptWords());
+    return Outcome::success(front_end.takeKeptWords());
 }
 
 } // namespace quarn::program

@@ -1,11 +1,10 @@
 #pragma once
 
-#include "quarn/arguments/ProgramArguments.h"
-#include "quarn/words/Outcome.h"
+#include "quarn/session/HostSession.h"
 
 namespace quarn::program {
 
 /// `quarn curves`: reads a model file and lists what a camera can follow in it.
-Outcome reportCurves(const CurvesOptions& options);
+Outcome reportCurves(const std::filesystem::path& model, const CommonOptions& common);
 
 } // namespace quarn::program

@@ -1,6 +1,5 @@
 #include "quarn/reports/ModelReport.h"
 
-#include "quarn/session/HostSession.h"
 #include "quarn/session/Interruption.h"
 #include "quarn/words/Words.h"
 
@@ -50,18 +49,18 @@ std::string fileReport(const std::filesystem::path& model,
 
 } // namespace
 
-Outcome reportModel(const ModelOptions& options) {
+Outcome reportModel(const std::filesystem::path& model, const CommonOptions& common) {
     watchForInterruption();
-    ConsoleFrontEnd front_end(printsFor(options.common));
-    HostSession host(front_end, options.common);
+    ConsoleFrontEnd front_end(printsFor(common));
+    HostSession host(front_end, common);
     const auto start = std::chrono::steady_clock::now();
-    if (const auto trouble = host.readModel(options.model))
+    if (const auto trouble = host.readModel(model))
         return *trouble;
     const auto read_time = std::chrono::steady_clock::now() - start;
     front_end.keepWords();
     if (const auto trouble = host.run("_-List _Objects"))
         return *trouble;
-    return Outcome::success(fileReport(options.model, read_time) + front_end.keptWords());
+    return Outcome::success(fileReport(model, read_time) + front_end.takeKeptWords());
 }
 
 } // namespace quarn::program

@@ -1,11 +1,10 @@
 #pragma once
 
-#include "quarn/arguments/ProgramArguments.h"
-#include "quarn/words/Outcome.h"
+#include "quarn/session/HostSession.h"
 
 namespace quarn::program {
 
 /// `quarn info`: reads a model file and tells what is in it.
-Outcome reportModel(const ModelOptions& options);
+Outcome reportModel(const std::filesystem::path& model, const CommonOptions& common);
 
 } // namespace quarn::program

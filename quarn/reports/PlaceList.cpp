@@ -70,10 +70,10 @@ std::string table(const std::vector<Row>& rows) {
 
 } // namespace
 
-Outcome listPlaces(const PlacesOptions& options) {
-    const std::vector<const City*> found = citiesFor(options.text);
+Outcome listPlaces(const std::string& text) {
+    const std::vector<const City*> found = citiesFor(text);
     if (found.empty())
-        return Outcome::failure("no place is called anything like \"" + options.text +
+        return Outcome::failure("no place is called anything like \"" + text +
                                 "\"; --latitude and --longitude take every place on earth.");
     std::vector<Row> rows = {{L"place", L"country", L"latitude", L"longitude", L"day", L"season"}};
     for (const City* const city : found)

@@ -1,7 +1,6 @@
 #include "quarn/runs/Recording.h"
 
 #include "quarn/runs/OutputFolder.h"
-#include "quarn/session/HostSession.h"
 #include "quarn/session/Interruption.h"
 
 #include <cstdio>
@@ -104,11 +103,11 @@ Outcome runRecording(const RecordingRequest& request, const RecordingScript& scr
 } // namespace
 
 Outcome recordOrShow(const RecordingRequest& request, const AnimationLines& lines,
-                     const RecordingOptions& options) {
+                     const ScriptUse& use) {
     const RecordingScript script = composeRecording(request, lines);
-    if (options.shows_script)
+    if (use.is_only_shown)
         return Outcome::success(scriptText(script));
-    return runRecording(request, script, options.common);
+    return runRecording(request, script, use.common);
 }
 
 } // namespace quarn::program

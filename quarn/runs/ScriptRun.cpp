@@ -1,29 +1,26 @@
 #include "quarn/runs/ScriptRun.h"
 
-#include "quarn/session/HostSession.h"
 #include "quarn/session/Interruption.h"
 
 namespace quarn::program {
 
-Outcome runScript(const ScriptOptions& options) {
+Outcome runScript(const std::filesystem::path& script, const std::filesystem::path& model,
+                  const CommonOptions& common) {
     watchForInterruption();
     ConsoleFrontEnd front_end(ConsoleFrontEnd::Prints::shown);
-    HostSession host(front_end, options.common);
+    HostSession host(front_end, common);
     if (const auto trouble = host.loadAnimationPlugIn())
         return *trouble;
-    if (!options.model.empty())
-        if (const auto trouble = host.readModel(options.model))
+    if (!model.empty())
+        if (const auto trouble = host.readModel(model))
             return *trouble;
     front_end.beginRecording(0);
-    const bool is_done = host.session().runScriptFile(options.script);
+    const std::optional<std::string> trouble = host.session().runScriptFile(script);
     front_end.clearProgress();
     if (isInterruptionRequested())
         return stopped("Stopped; " + std::to_string(front_end.framesWritten()) +
                        " frames were written.");
-    if (is_done)
-        return Outcome::success("");
-    const std::string words = front_end.lastWords();
-    return Outcome::failure(words.empty() ? options.script + " was not run to its end." : words);
+    return trouble ? Outcome::failure(*trouble) : Outcome::success("");
 }
 
 } // namespace quarn::program

@@ -8,9 +8,6 @@ namespace quarn::program {
 
 namespace {
 
-constexpr double NEAREST_DISTANCE = 0.01; // as the command FitView takes them
-constexpr double FARTHEST_DISTANCE = 1000.0;
-
 constexpr double radians(double degrees) {
     return degrees * std::numbers::pi / 180.0;
 }
@@ -31,12 +28,6 @@ Triple cameraLocation(const Triple& target, double azimuth_deg, double elevation
 std::string cameraToBeFitted(const Triple& target, double azimuth_deg, double elevation_deg) {
     return "_-Camera _Location " + tripleText(cameraLocation(target, azimuth_deg, elevation_deg)) +
            " _Target " + tripleText(target) + " _Enter";
-}
-
-std::optional<double> distanceFactor(std::string_view typed) {
-    const std::optional<double> factor = realNumber(typed);
-    const bool is_good = factor && *factor >= NEAREST_DISTANCE && *factor <= FARTHEST_DISTANCE;
-    return is_good ? factor : std::nullopt;
 }
 
 } // namespace quarn::program

@@ -13,8 +13,4 @@ namespace quarn::program {
 /// @param elevation_deg  of the camera above the horizon through the target, -89 to 89
 std::string cameraToBeFitted(const Triple& target, double azimuth_deg, double elevation_deg);
 
-/// Reads a multiple of the fitted distance that was typed.
-/// @return nothing for what FitView does not take
-std::optional<double> distanceFactor(std::string_view typed);
-
 } // namespace quarn::program

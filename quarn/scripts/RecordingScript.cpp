@@ -1,7 +1,5 @@
 #include "quarn/scripts/RecordingScript.h"
 
-#include "quarn/scripts/CaptureMode.h"
-
 namespace quarn::program {
 
 namespace {
@@ -10,7 +8,7 @@ namespace {
 std::string samplesAnswer(const RecordingRequest& request) {
     if (request.samples == 0)
         return "";
-    const bool is_preview = request.capture_option == "_RenderPreview";
+    const bool is_preview = request.mode.option == "_RenderPreview";
     return (is_preview ? " _PreviewSamples " : " _Samples ") + std::to_string(request.samples);
 }
 
@@ -29,7 +27,7 @@ RecordingScript composeRecording(const RecordingRequest& request, const Animatio
     set_up.insert(set_up.end(), lines.preparing.begin(), lines.preparing.end());
     set_up.push_back("_-AnimationName \"" + request.name + "\"");
     set_up.push_back(lines.setting_up);
-    if (isRendered(request.capture_option))
+    if (request.mode.is_rendered)
         set_up.push_back("_-RenderSettings _Size " + size + samplesAnswer(request) + " _Enter");
     if (!request.document.empty())
         script.saving = "_-SaveAs " + quotedPath(request.document);
@@ -38,7 +36,7 @@ RecordingScript composeRecording(const RecordingRequest& request, const Animatio
 }
 
 std::string sharedAnswers(const RecordingRequest& request) {
-    return "_" + request.format + " " + request.capture_option + " _Enter _Enter";
+    return "_" + request.format + " " + request.mode.option + " _Enter _Enter";
 }
 
 std::string scriptText(const RecordingScript& script) {

@@ -1,23 +1,23 @@
 #pragma once
 
-#include "quarn/arguments/ProgramArguments.h"
-#include "quarn/words/FirstMistake.h"
+#include "host/front_end/Cities.h"
 
-#include <optional>
 #include <string>
 
 namespace quarn::program {
 
-/// Where on the earth a model stands, and how it is turned there: every value is checked.
+/// Where on the earth a model stands, and how it is turned there.
 struct StudySite {
-    std::string place;    ///< "Athens, Greece"; empty where coordinates were typed
-    double latitude_deg;  ///< north positive, -90 to 90
-    double longitude_deg; ///< east positive, -180 to 180
-    double north_deg;     ///< clockwise from the model's Y axis
+    std::string place;          ///< "Athens, Greece"; empty where coordinates were typed
+    double latitude_deg = 0.0;  ///< north positive, -90 to 90
+    double longitude_deg = 0.0; ///< east positive, -180 to 180
+    double north_deg = 0.0;     ///< clockwise from the model's Y axis
 };
 
-/// Checks what was typed, before anything runs.
-StudySite checkSite(const SiteOptions& options, FirstMistake& mistake);
+/// "Athens, Greece"
+std::string fullName(const City& city);
+/// What to tell of a name that is no city's: "did you mean Athens, Greece or Accra, Ghana?"
+std::string placeSuggestions(const std::string& typed);
 
 /// The longitude as the command of a seasonal study takes it: 0 to 360, eastward.
 double eastwardLongitude(double longitude_deg);

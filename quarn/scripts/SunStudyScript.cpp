@@ -42,7 +42,7 @@ std::string seasonal(const SunStudyRequest& request) {
 AnimationLines sunStudyLines(const SunStudyRequest& request) {
     const bool is_one_day = request.kind == SunStudyRequest::Kind::one_day;
     AnimationLines lines;
-    lines.preparing = request.view_lines;
+    lines.preparing = linesFor(request.view, isDocument(request.recording.model));
     lines.setting_up = (is_one_day ? oneDay(request) : seasonal(request)) +
                        numbers({request.step}) + sharedAnswers(request.recording);
     lines.notes = studyNotes(request);

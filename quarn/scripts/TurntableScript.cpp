@@ -25,9 +25,10 @@ std::string fitView(const TurntableRequest& request) {
 } // namespace
 
 AnimationLines turntableLines(const TurntableRequest& request) {
-    const std::string answers = std::to_string(request.recording.frames) +
-                                (request.is_clockwise ? " _Clockwise " : " _AntiClockwise ") +
-                                sharedAnswers(request.recording);
+    const std::string answers =
+        std::to_string(request.recording.frames) +
+        (request.direction == "clockwise" ? " _Clockwise " : " _AntiClockwise ") +
+        sharedAnswers(request.recording);
     return {{camera(request), fitView(request)}, "_-SetTurntableAnimation " + answers};
 }
 

@@ -1,6 +1,7 @@
 #include "quarn/session/ConsoleFrontEnd.h"
 
 #include "quarn/session/Interruption.h"
+#include "quarn/terminal/ShownText.h"
 #include "quarn/words/Words.h"
 
 #include <cmath>
@@ -76,11 +77,12 @@ void ConsoleFrontEnd::print(std::wstring_view text) {
     rememberWords(bytes);
     if (m_keeps_words)
         m_kept_words += bytes;
-    if (m_prints == Prints::hidden)
+    if (m_keeps_words || m_prints == Prints::hidden || bytes.empty())
         return;
     m_progress.clear();
-    std::fwrite(bytes.data(), 1, bytes.size(), stdout);
-    m_is_inside_line = bytes.empty() ? m_is_inside_line : !bytes.ends_with('\n');
+    const std::string shown = shownText(bytes);
+    std::fwrite(shown.data(), 1, shown.size(), stdout);
+    m_is_inside_line = !bytes.ends_with('\n');
 }
 
 void ConsoleFrontEnd::endLine() {
@@ -98,7 +100,8 @@ Answer ConsoleFrontEnd::ask(const Question&) {
 int ConsoleFrontEnd::showMessage(std::wstring_view text, std::wstring_view title, unsigned) {
     m_progress.clear();
     std::fflush(stdout);
-    std::fprintf(stderr, "%s: %s\n", utf8Text(title).c_str(), trimmed(utf8Text(text)).c_str());
+    std::fprintf(stderr, "%s: %s\n", shownText(utf8Text(title)).c_str(),
+                 shownText(trimmed(utf8Text(text))).c_str());
     return 1;
 }
 

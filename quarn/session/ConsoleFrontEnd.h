@@ -39,9 +39,8 @@ public:
     /// From now on everything that is printed is shown.
     void showWords() { m_prints = Prints::shown; }
     bool hidesWords() const { return m_prints == Prints::hidden; }
-    /// From now on everything that is printed is kept.
+    /// From now on what is printed is kept, and not shown.
     void keepWords() { m_keeps_words = true; }
-    const std::string& keptWords() const { return m_kept_words; }
     /// What was kept; from now on nothing is.
     std::string takeKeptWords();
 

@@ -2,6 +2,7 @@
 
 #include "quarn/session/InstalledTree.h"
 #include "quarn/session/Interruption.h"
+#include "quarn/terminal/ShownText.h"
 #include "quarn/words/Words.h"
 
 #include <cstdio>
@@ -26,7 +27,7 @@ void tellDefects(const std::string& words, const std::string& model) {
     std::string defect;
     std::getline(stream, defect);
     for (std::string next; std::getline(stream, next); defect = next)
-        std::fprintf(stderr, "quarn: %s: %s\n", model.c_str(), defect.c_str());
+        std::fprintf(stderr, "quarn: %s: %s\n", model.c_str(), shownText(defect).c_str());
 }
 
 } // namespace
@@ -55,24 +56,23 @@ std::optional<Outcome> HostSession::run(const std::string& line) {
 }
 
 std::optional<Outcome> HostSession::readModel(const std::filesystem::path& model) {
-    if (const auto refusal = whyPathIsRefused("the model's path", model))
-        return Outcome::misuse(*refusal);
-    std::optional<Outcome> trouble = runReading(readingLine(model), model);
-    m_front_end.clearProgress();
-    return trouble;
+    return runReading(readingLine(model), model);
 }
 
 std::optional<Outcome> HostSession::runReading(const std::string& line,
                                                const std::filesystem::path& model) {
     m_front_end.showStep("reading " + model.filename().native());
     m_front_end.keepWords();
-    std::optional<Outcome> trouble = run(line);
+    const std::optional<Outcome> trouble = run(line);
     const std::string words = m_front_end.takeKeptWords();
-    if (!trouble && m_front_end.hidesWords()) {
-        m_front_end.clearProgress();
+    m_front_end.clearProgress();
+    if (trouble)
+        return trouble;
+    if (m_front_end.hidesWords())
         tellDefects(words, model.filename().native());
-    }
-    return trouble;
+    else
+        m_front_end.print(wideText(words));
+    return std::nullopt;
 }
 
 ConsoleFrontEnd::Prints printsFor(const CommonOptions& common) {

@@ -1,12 +1,18 @@
 #pragma once
 
 #include "host/front_end/Session.h"
-#include "quarn/arguments/ProgramArguments.h"
 #include "quarn/session/ConsoleFrontEnd.h"
+#include "quarn/words/Outcome.h"
 
 #include <optional>
 
 namespace quarn::program {
+
+/// How a person wants the host to be run.
+struct CommonOptions {
+    bool is_verbose = false;
+    std::string language; ///< empty: the environment's
+};
 
 /// The host as this program runs it: with the files that are installed beside the program.
 class HostSession {

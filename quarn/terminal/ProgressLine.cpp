@@ -1,5 +1,7 @@
 #include "quarn/terminal/ProgressLine.h"
 
+#include "quarn/terminal/ShownText.h"
+
 #include <unistd.h>
 
 namespace quarn::program {
@@ -10,7 +12,7 @@ ProgressLine::ProgressLine(std::FILE* stream)
 void ProgressLine::show(std::string_view text) {
     if (!m_is_terminal)
         return;
-    std::fprintf(m_stream, "\r%.*s\x1b[K", static_cast<int>(text.size()), text.data());
+    std::fprintf(m_stream, "\r%s\x1b[K", shownText(text).c_str());
     std::fflush(m_stream);
     m_is_shown = true;
 }

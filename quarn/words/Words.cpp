@@ -60,17 +60,6 @@ std::optional<PixelSize> pixelSize(std::string_view word) {
     return PixelSize{*width, *height};
 }
 
-std::optional<PixelSize> pictureSize(std::string_view word) {
-    const std::optional<PixelSize> size = pixelSize(word);
-    const auto is_good = [](int side_px) { return side_px >= 1 && side_px <= LARGEST_SIDE_PX; };
-    return size && is_good(size->width_px) && is_good(size->height_px) ? size : std::nullopt;
-}
-
-std::string sizeMistake(const std::string& word) {
-    return "--size must be WIDTHxHEIGHT such as 1280x720, each from 1 to " +
-           std::to_string(LARGEST_SIDE_PX) + ", not \"" + word + "\".";
-}
-
 std::string numberText(double value) {
     std::array<char, 32> text;
     const double no_negative_zero = value == 0.0 ? 0.0 : value;
@@ -129,7 +118,8 @@ bool isDocument(const std::filesystem::path& file) {
 std::string readingLine(const std::filesystem::path& model, const std::string& up) {
     if (isDocument(model))
         return "_-Open " + quotedPath(model);
-    return "_-Import " + (up.empty() ? "" : "[Up] _" + up + " ") + quotedPath(model);
+    const std::string axis = up.empty() ? "" : up == "y" ? "[Up] _Y " : "[Up] _Z ";
+    return "_-Import " + axis + quotedPath(model);
 }
 
 std::string quotedPath(const std::filesystem::path& path) {

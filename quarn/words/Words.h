@@ -26,13 +26,6 @@ std::optional<Triple> triple(std::string_view word);
 /// Reads "widthxheight".
 std::optional<PixelSize> pixelSize(std::string_view word);
 
-/// The longest side of a picture, in pixels.
-inline constexpr int LARGEST_SIDE_PX = 16384;
-/// Reads a size that a picture can have.
-std::optional<PixelSize> pictureSize(std::string_view word);
-/// What to tell about a word that is none.
-std::string sizeMistake(const std::string& word);
-
 /// The shortest text that reads back as exactly this number; the decimal mark is a point.
 std::string numberText(double value);
 std::string tripleText(const Triple& point);
@@ -65,7 +58,7 @@ std::optional<std::string> whyPathIsRefused(std::string_view subject,
 bool isDocument(const std::filesystem::path& file);
 
 /// The host command that opens a document, or reads a model file into the document that is there.
-/// @param up  the axis that points up in a model file; empty: by its format
+/// @param up  the axis that points up in a model file, "y" or "z"; empty: by its format
 std::string readingLine(const std::filesystem::path& model, const std::string& up = "");
 
 /// The path as one word of a script, which no prompt takes for an option.

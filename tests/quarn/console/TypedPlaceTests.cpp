@@ -50,7 +50,7 @@ protected:
         front_end.keepWords();
         const auto chosen = front_end.chooseLocation(L"Set Animation Location", {51.5, -0.12});
         prompts = typed.prompts;
-        told = front_end.keptWords();
+        told = front_end.takeKeptWords();
         return chosen;
     }
 
