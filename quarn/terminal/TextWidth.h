@@ -5,10 +5,8 @@
 
 namespace quarn::program {
 
-/// The columns that a text takes on a terminal: two for each East Asian wide or fullwidth
-/// character, none for a combining mark, one for any other.
-///
-/// Unicode Standard Annex #11, East Asian Width; neutral and ambiguous characters count as narrow.
+/// The columns that a text takes on a terminal, as the C library counts them: two for each wide
+/// character of East Asia, none for a combining or a control character.
 std::size_t textWidth(std::wstring_view text);
 
 } // namespace quarn::program

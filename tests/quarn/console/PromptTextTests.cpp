@@ -1,6 +1,5 @@
 #include "quarn/console/PromptText.h"
 #include "quarn/terminal/Columns.h"
-#include "quarn/terminal/TextWidth.h"
 
 #include <gtest/gtest.h>
 
@@ -9,7 +8,6 @@ namespace {
 
 using program::inColumns;
 using program::promptText;
-using program::textWidth;
 using program::wrappedPrompt;
 
 Question questionOf(Question::Kind kind) {
@@ -40,21 +38,12 @@ TEST(Columns, GoDownFirstAndFillTheWidth) {
     EXPECT_EQ(inColumns({}, 80), "");
 }
 
-TEST(TextWidth, EastAsianCharactersTakeTwoColumnsAndCombiningMarksNone) {
-    EXPECT_EQ(textWidth(L""), 0U);
-    EXPECT_EQ(textWidth(L"größe … “a”"), 11U);
-    EXPECT_EQ(textWidth(L"线框"), 4U);
-    EXPECT_EQ(textWidth(L"ワイヤー（Y軸）、"), 17U); // eight wide and one narrow
-    EXPECT_EQ(textWidth(L"ﾜｲﾔ"), 3U);                // halfwidth forms
-    EXPECT_EQ(textWidth(L"한글"), 4U);
-    EXPECT_EQ(textWidth(L"o\u0308"), 1U);
-    EXPECT_EQ(textWidth(L"\U00020000"), 2U);
-}
-
 TEST(Columns, WideNamesStandUnderEachOther) {
     // Two columns of 6 and a gap of 2 make 14.
     EXPECT_EQ(inColumns({L"线框", L"abc", L"半透明", L"d"}, 14), "线框    半透明\nabc     d\n");
     EXPECT_EQ(inColumns({L"线框", L"abc", L"半透明"}, 13), "线框\nabc\n半透明\n");
+    // A mark over a letter takes no column of its own, a halfwidth letter takes one.
+    EXPECT_EQ(inColumns({L"o\u0308", L"abc", L"ﾜｲﾔ", L"d"}, 8), "o\u0308    ﾜｲﾔ\nabc  d\n");
 }
 
 TEST(PromptText, WideWordsBreakWhereTheirColumnsDo) {
