@@ -57,8 +57,8 @@ eye height stands 1.6 above the floor of a model in metres. A line "degree 3" be
 point makes a smooth curve of them, which passes near the points; a line "closed" a round tour.
 
 Examples:
-  quarn curves town.obj
-  quarn flythrough town.obj --path "Main street" --even-speed --frames 300 --out out/street
+  quarn curves town.quarn
+  quarn flythrough town.quarn --path "Main street" --even-speed --frames 300 --out out/street
   quarn flythrough house.glb --camera-curve walk.txt --even-speed --frames 240 --out out/walk
   quarn flythrough house.glb --camera-curve walk.txt --frames 240 --out out --save walk.quarn)";
 
@@ -68,7 +68,7 @@ where it stays. The curves are not in the pictures; the horizon stays level. qua
 --help tells what a curve file holds.
 
 Examples:
-  quarn path town.obj --camera "Roof line" --target Fountain --frames 240 --out out/roofs
+  quarn path town.quarn --camera "Roof line" --target Fountain --frames 240 --out out/roofs
   quarn path part.stl --camera-curve arc.txt --target-point 0,0,12 --frames 120 --out out/part
   quarn path hall.glb --camera-point 2,-4,1.6 --target-curve frieze.json --frames 90 --out out)";
 
@@ -126,7 +126,10 @@ Example:
   quarn curves town.obj)";
 
 inline constexpr const char* FRAME_FOOTER = R"(
-The frame is drawn as the recording draws it; at the view's own size it is the same file.
+The frame is drawn as the recording draws it; at the view's own size it is the same file, but for two
+cases: where the camera stands straight above or below its target, and in a view with a tilted
+horizon. A recording levels the horizon; a single frame keeps it tilted, and fails where the view
+takes no direction for it as pointing up.
 
 Examples:
   quarn frame house.quarn --number 0 --out first.jpg
@@ -137,12 +140,15 @@ A script holds one host command a line; the words after a command's name answer 
 Blank lines and lines that start with # are skipped. The first command that fails ends the run.
 
 Example (steps.txt):
-  _-StandardView _Top
-  _-FitView _Enter
+  # a turntable of the model that is read first; the folder out must be there
+  _-StandardView _Perspective
+  _-FitView _Turn=Yes _Enter
   _-SetTurntableAnimation 36 _Clockwise _png _Shaded _Enter _Enter
   _-RecordAnimation _TargetFolder "out" _Enter
 
-The command Help lists every command.)";
+  quarn run steps.txt house.glb
+
+The command Help lists every command; quarn turntable ... --show-script prints a whole script.)";
 
 inline constexpr const char* CONSOLE_FOOTER = R"(
 A command asks for what it needs: "Number of frames <100>: ". What stands in < > is the answer of
@@ -163,7 +169,7 @@ is piped in is read as if it were typed; there lines that start with # are skipp
 Example:
   quarn console house.glb
   Command: SetTurntableAnimation 36 Clockwise
-  File type <jpg> ( jpg png bmp tga ):)";
+  File type <jpg> ( jpg bmp png tga ):)";
 
 inline constexpr const char* INFO_FOOTER = R"(
 Example:

@@ -47,7 +47,7 @@ void replaceLines(const std::filesystem::path& file, const std::vector<std::stri
         std::filesystem::remove(beside, error);
 }
 
-/// The folder is the user's alone, as the rules for such folders ask.
+/// The folder is the user's alone.
 void makeFolder(const std::filesystem::path& folder) {
     std::error_code error;
     if (std::filesystem::create_directories(folder, error))

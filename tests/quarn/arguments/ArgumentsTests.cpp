@@ -81,6 +81,23 @@ TEST(Arguments, UnknownOptionIsNamed) {
     expectRefusal(run({"info", "house.obj", "--frames", "3"}), {"unknown option --frames"});
 }
 
+TEST(Arguments, MisspelledOptionIsNamedBeforeTheOneThatIsMissing) {
+    expectRefusal(turntable({"--frame", "3", "--out", "out"}), {"unknown option --frame "});
+    expectRefusal(turntable({"--frames", "none", "--uot", "out"}), {"unknown option --uot "});
+}
+
+TEST(Arguments, HelpHelpsWhateverElseIsTyped) {
+    const std::string help = run({"turntable", "--help"}).out;
+    for (const std::vector<std::string>& mistake :
+         {std::vector<std::string>{"--frames", "none"}, {"--frame", "3"}, {"--mode", "Cubist"}}) {
+        std::vector<std::string> arguments = {"turntable", "--help"};
+        arguments.insert(arguments.end(), mistake.begin(), mistake.end());
+        const Ended ended = run(arguments);
+        EXPECT_EQ(ended.exit_code, 0) << ended.err;
+        EXPECT_EQ(ended.out, help);
+    }
+}
+
 TEST(Arguments, LeftOverWordIsNamed) {
     expectRefusal(wholeTurntable({"tree.obj"}), {"unexpected argument tree.obj"});
     expectRefusal(run({"run", "a.txt", "b.obj", "c.obj"}), {"unexpected argument c.obj"});

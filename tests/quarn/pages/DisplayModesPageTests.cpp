@@ -8,20 +8,7 @@
 namespace quarn::test {
 namespace {
 
-using testing::PrintToString;
-using testing::SizeIs;
-
 constexpr const char* PAGE = "docs/display-modes.md";
-
-TEST(DisplayModesPage, EveryRecordingOnItIsTaken) {
-    const auto recordings = commandsOn(PAGE, {"turntable", "day"});
-    EXPECT_THAT(recordings, SizeIs(3));
-    for (std::vector<std::string> arguments : recordings) {
-        arguments.push_back("--show-script");
-        const Ended ended = run(arguments);
-        EXPECT_EQ(ended.exit_code, 0) << PrintToString(arguments) << "\n" << ended.err;
-    }
-}
 
 TEST(DisplayModesPage, EdgesChosenByItsScriptAreInTheFramesRecordedLater) {
     const Studio studio;

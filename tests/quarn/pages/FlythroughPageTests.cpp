@@ -8,7 +8,6 @@
 namespace quarn::test {
 namespace {
 
-using testing::PrintToString;
 using testing::SizeIs;
 
 constexpr const char* PAGE = "docs/flythrough.md";
@@ -29,16 +28,6 @@ TEST(FlythroughPage, CurveFileOnItCanBeFlownAlong) {
     const Ended ended = run(start);
     EXPECT_EQ(ended.exit_code, 0) << ended.err;
     EXPECT_THAT(filesIn(studio / "walk"), SizeIs(4));
-}
-
-TEST(FlythroughPage, EveryRecordingOnItIsTaken) {
-    const auto recordings = commandsOn(PAGE, {"flythrough", "path"});
-    EXPECT_THAT(recordings, SizeIs(6));
-    for (std::vector<std::string> arguments : recordings) {
-        arguments.push_back("--show-script");
-        const Ended ended = run(arguments);
-        EXPECT_EQ(ended.exit_code, 0) << PrintToString(arguments) << "\n" << ended.err;
-    }
 }
 
 } // namespace

@@ -30,13 +30,6 @@ std::vector<std::string> notesOf(const std::vector<std::string>& arguments) {
     return notes;
 }
 
-TEST(SunStudiesPage, EveryRecordingOnItIsTaken) {
-    const auto recordings = commandsOn(PAGE, {"day", "season"});
-    EXPECT_THAT(recordings, SizeIs(7));
-    for (const std::vector<std::string>& arguments : recordings)
-        shownScript(arguments);
-}
-
 TEST(SunStudiesPage, PlacesOnItAreThoseThatAreListed) {
     const auto questions = commandsOn(PAGE, {"places"});
     ASSERT_THAT(questions, SizeIs(1));

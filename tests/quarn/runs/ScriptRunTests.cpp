@@ -36,7 +36,7 @@ TEST_F(ScriptRun, EndsAtAModelThatCannotBeRead) {
     EXPECT_EQ(ended.exit_code, 1);
     EXPECT_THAT(linesOf(ended.err), SizeIs(1));
     EXPECT_THAT(ended.err, HasSubstr("missing.obj"));
-    EXPECT_THAT(ended.out, Not(HasSubstr("meshes")));
+    EXPECT_THAT(ended.out, IsEmpty());
 }
 
 TEST_F(ScriptRun, TellsThatTheScriptIsMissing) {
@@ -65,6 +65,32 @@ TEST_F(ScriptRun, StopsAtTheFirstCommandThatFails) {
     EXPECT_EQ(ended.exit_code, 1);
     EXPECT_THAT(ended.err, HasSubstr("steps.txt, line 2"));
     EXPECT_THAT(ended.out, Not(HasSubstr("house.obj")));
+}
+
+TEST_F(ScriptRun, TellsOnceWhatEndedIt) {
+    const Ended command = runScript("_-List\n_-Turnip\n");
+    EXPECT_EQ(command.err, "quarn: steps.txt, line 2: _-Turnip: failed.\n");
+    EXPECT_THAT(command.out, HasSubstr("Unknown command: Turnip."));
+    EXPECT_THAT(command.out, Not(HasSubstr("line 2")));
+    const Ended missing = run({"run", "/nowhere/steps.txt"});
+    EXPECT_THAT(missing.out, IsEmpty());
+    EXPECT_EQ(missing.err, "quarn: There is no file /nowhere/steps.txt.\n");
+}
+
+TEST_F(ScriptRun, OfAFileThatIsNoTextRefusesItInOneLine) {
+    writeFile(m_studio / "model.glb", std::string("glTF\2\0\0\0\x9B\x1B[2J\n_-List\n", 21));
+    Start start;
+    start.folder = m_studio.path();
+    start.arguments = {"run", "model.glb"};
+    const Ended binary = run(start);
+    EXPECT_EQ(binary.exit_code, 1);
+    EXPECT_THAT(binary.out, IsEmpty());
+    EXPECT_THAT(linesOf(binary.err), SizeIs(1));
+    EXPECT_THAT(binary.err, HasSubstr("model.glb is no script: line 1 holds control characters"));
+}
+
+TEST_F(ScriptRun, ShowsTheWordsOfTheModelThatItReads) {
+    EXPECT_THAT(runScript("", {"house.obj"}).out, HasSubstr("house.obj: 2 objects"));
 }
 
 TEST_F(ScriptRun, NamesTheAnswerThatIsMissing) {

@@ -161,6 +161,68 @@ TEST_F(SingleFrame, IsTheFileThatTheRecordingWrote) {
     EXPECT_GT(readFile(*s_studio / "out/house003.png").size(), 500u);
 }
 
+// ---- What help says of frames that are other pictures than those of the recording
+
+TEST(SingleFrameHelp, NamesTheViewsWhoseFramesAreOtherPictures) {
+    const std::string help = run({"frame", "--help"}).out;
+    EXPECT_THAT(help, HasSubstr("straight above or below its target"));
+    EXPECT_THAT(help, HasSubstr("tilted\nhorizon"));
+    EXPECT_THAT(help, HasSubstr("takes no direction for it as pointing up"));
+}
+
+/// Which of the frames 0, 1, ... of a document are the files that its recording wrote.
+std::vector<bool> sameFrames(const Studio& studio, const std::string& document,
+                             const std::vector<std::string>& recorded) {
+    std::vector<bool> same;
+    for (std::size_t i = 0; i < recorded.size(); ++i) {
+        const Ended ended = run(inStudio(
+            studio, {"frame", document, "--number", std::to_string(i), "--out", "single.png"}));
+        EXPECT_EQ(ended.exit_code, 0) << ended.err;
+        same.push_back(readFile(studio / "single.png") == readFile(studio / recorded[i]));
+    }
+    return same;
+}
+
+TEST(SingleFrameOfACamera, StraightAboveItsTargetIsAnotherPictureThanTheRecorded) {
+    const Studio studio;
+    writeFile(studio / "arc.txt", "-5 0 5\n0 0 8\n5 0 5\n");
+    const Ended recorded =
+        run(inStudio(studio, {"path", "house.obj", "--camera-curve", "arc.txt", "--target-point",
+                              "0,0,0", "--frames", "3", "--size", "64x48", "--format", "png",
+                              "--out", "arc", "--save", "arc"}));
+    ASSERT_EQ(recorded.exit_code, 0) << recorded.err;
+    EXPECT_THAT(sameFrames(studio, "arc.quarn",
+                           {"arc/house000.png", "arc/house001.png", "arc/house002.png"}),
+                ElementsAre(true, false, true));
+}
+
+TEST(SingleFrameOfACamera, WithATiltedHorizonIsAnotherPictureThanTheRecorded) {
+    // A camera that is rolled by 30 degrees, at (0, 1, 20) with Y up.
+    const std::string tilted =
+        R"({"asset":{"version":"2.0"},"scene":0,"scenes":[{"nodes":[0,1]}],)"
+        R"("nodes":[{"name":"Roof","mesh":0},{"name":"Tilted","camera":0,)"
+        R"("translation":[0,1,20],"rotation":[0,0,0.258819,0.965926]}],)"
+        R"("cameras":[{"type":"perspective","perspective":{"yfov":0.8,"znear":0.1}}],)"
+        R"("meshes":[{"primitives":[{"attributes":{"POSITION":0}}]}],)"
+        R"("accessors":[{"bufferView":0,"componentType":5126,"count":3,"type":"VEC3",)"
+        R"("min":[0,0,0],"max":[4,4,3]}],"bufferViews":[{"buffer":0,"byteLength":36}],)"
+        R"("buffers":[{"byteLength":36,"uri":"data:application/octet-stream;base64,)"
+        R"(AAAAAAAAAAAAAAAAAACAQAAAAAAAAAAAAAAAAAAAgEAAAEBA"}]})";
+    const Studio studio;
+    writeFile(studio / "tilted.gltf", tilted);
+    std::filesystem::create_directory(studio / "tilted");
+    writeFile(studio / "steps.txt",
+              "_-ViewportSize 64 48\n_-StandardView Tilted\n"
+              "_-SetTurntableAnimation 3 _Clockwise _png _Shaded _Enter _Enter\n"
+              "_-AnimationName T\n_-SaveAs tilted.quarn\n"
+              "_-RecordAnimation _TargetFolder tilted _Enter\n");
+    const Ended recorded = run(inStudio(studio, {"run", "steps.txt", "tilted.gltf"}));
+    ASSERT_EQ(recorded.exit_code, 0) << recorded.err;
+    EXPECT_THAT(sameFrames(studio, "tilted.quarn",
+                           {"tilted/T000.png", "tilted/T001.png", "tilted/T002.png"}),
+                Not(ElementsAre(true, true, true)));
+}
+
 TEST_F(SingleFrame, HasTheSizeThatIsAskedFor) {
     const Ended ended = frame({"--number", "2", "--size", "200x100", "--out", "wide.bmp"});
     ASSERT_EQ(ended.exit_code, 0) << ended.err;

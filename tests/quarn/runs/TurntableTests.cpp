@@ -1,8 +1,10 @@
 #include "tests/quarn/Pictures.h"
 #include "tests/quarn/Studio.h"
 
+#include <algorithm>
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <tuple>
 
 namespace quarn::test {
 namespace {
@@ -54,6 +56,51 @@ TEST(Turntable, OfOneFrameIsOnePicture) {
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     EXPECT_THAT(ended.out, HasSubstr("1 frame and out/house.html"));
     EXPECT_THAT(filesIn(studio / "out"), ElementsAre("house.html", "house000.jpg"));
+}
+
+/// The middle of all that is red, from 0 at the left to 1 at the right.
+double middleOfRed(const Picture& picture) {
+    double sum = 0.0;
+    int count = 0;
+    const std::size_t row_bytes = static_cast<std::size_t>(picture.width_px) * 3;
+    for (std::size_t i = 0; i + 2 < picture.bytes.size(); i += 3) {
+        const auto [blue, green, red] =
+            std::tuple(picture.bytes[i], picture.bytes[i + 1], picture.bytes[i + 2]);
+        if (red < 64 || red < 2 * std::max(blue, green))
+            continue;
+        sum += static_cast<double>(i % row_bytes) / static_cast<double>(row_bytes);
+        ++count;
+    }
+    return count > 0 ? sum / count : -1.0;
+}
+
+/// Seen from above and turning clockwise, what is in front goes to the left: past six o'clock comes
+/// seven.
+TEST(TurntableDirection, IsTheWayThatTheModelSeemsToTurn) {
+    const Studio studio;
+    // A grey plate, and a red post on it on the side of the first camera, at (0.5, -0.87).
+    writeFile(studio / "post.mtl", "newmtl grey\nKd 0.5 0.5 0.5\nnewmtl red\nKd 1 0 0\n");
+    writeFile(studio / "post.obj", "mtllib post.mtl\nv -2 -2 0\nv 2 -2 0\nv 2 2 0\nv -2 2 0\n"
+                                   "usemtl grey\nf 1 2 3\nf 1 3 4\n"
+                                   "v 0.4 -0.97 0\nv 0.6 -0.77 0\nv 0.5 -0.87 1.5\nv 0.4 -0.77 0\n"
+                                   "usemtl red\nf 5 6 7\nf 6 8 7\nf 8 5 7\n");
+    for (const std::string direction : {"clockwise", "anticlockwise"}) {
+        const Ended ended =
+            run(studio.turntableOf("post.obj", 12,
+                                   {"--direction", direction, "--mode", "Shaded", "--format", "bmp",
+                                    "--size", "160x120", "--out", direction}));
+        ASSERT_EQ(ended.exit_code, 0) << ended.err;
+        // The first frame is a step on; the last one is where the camera stood.
+        const double at_start = middleOfRed(readBitmap(studio / (direction + "/post011.bmp")));
+        const double a_step_on = middleOfRed(readBitmap(studio / (direction + "/post000.bmp")));
+        ASSERT_GT(at_start, 0.0);
+        if (direction == "clockwise")
+            EXPECT_LT(a_step_on, at_start - 0.03);
+        else
+            EXPECT_GT(a_step_on, at_start + 0.03);
+    }
+    EXPECT_THAT(run({"turntable", "--help"}).out,
+                HasSubstr("Way that the model seems to turn, seen from above"));
 }
 
 TEST(Turntable, PageListsThePicturesInTheirOrder) {
