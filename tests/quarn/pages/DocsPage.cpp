@@ -9,14 +9,10 @@
 
 namespace quarn::test {
 
-namespace {
-
 std::string withoutIndent(const std::string& line) {
     const std::size_t first = line.find_first_not_of(' ');
     return first == std::string::npos ? std::string() : line.substr(first);
 }
-
-} // namespace
 
 std::vector<std::vector<std::string>> fencedBlocks(const std::string& page) {
     std::vector<std::vector<std::string>> blocks;

@@ -5,6 +5,8 @@
 
 namespace quarn::test {
 
+std::string withoutIndent(const std::string& line);
+
 /// The lines of every fenced block of a page, without their indent, one list for each block.
 /// @param page  its path from the project's root
 std::vector<std::vector<std::string>> fencedBlocks(const std::string& page);

@@ -2,6 +2,7 @@
 
 #include "tests/quarn/Pictures.h"
 #include "tests/quarn/ProgramRun.h"
+#include "tests/quarn/pages/DocsPage.h"
 
 #include <algorithm>
 #include <regex>
@@ -12,28 +13,24 @@ namespace {
 
 const std::filesystem::path ROOT = QUARN_SOURCE_DIR;
 
-std::string withoutIndent(const std::string& line) {
-    const std::size_t first = line.find_first_not_of(' ');
-    return first == std::string::npos ? std::string() : line.substr(first);
+bool isPage(const std::string& source) {
+    return source.ends_with(".md");
 }
 
-/// The fenced lines of a page without their indent, or all lines of a help text.
+/// The fenced lines of a page, or all lines of a help text, without their indent.
 std::vector<std::string> plainLines(const std::string& source) {
-    const bool is_page = source.ends_with(".md");
-    bool is_inside = !is_page;
     std::vector<std::string> lines;
-    for (const std::string& line : linesOf(printedText(source))) {
-        const std::string text = withoutIndent(line);
-        if (is_page && text.starts_with("```"))
-            is_inside = !is_inside;
-        else if (is_inside)
-            lines.push_back(text);
-    }
+    if (!isPage(source))
+        for (const std::string& line : linesOf(printedText(source)))
+            lines.push_back(withoutIndent(line));
+    else
+        for (const auto& block : fencedBlocks(source))
+            lines.insert(lines.end(), block.begin(), block.end());
     return lines;
 }
 
 std::vector<std::string> inlineCode(const std::string& source) {
-    if (!source.ends_with(".md"))
+    if (!isPage(source))
         return {};
     static const std::regex code("`([^`\n]+)`");
     const std::string text = printedText(source);
