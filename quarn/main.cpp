@@ -1,13 +1,5 @@
-#include "quarn/CameraPath.h"
-#include "quarn/CommandLine.h"
-#include "quarn/Console.h"
-#include "quarn/CurveReport.h"
-#include "quarn/ModelReport.h"
-#include "quarn/PlaceList.h"
-#include "quarn/ScriptRun.h"
-#include "quarn/SingleFrame.h"
-#include "quarn/SunStudy.h"
-#include "quarn/Turntable.h"
+#include "quarn/arguments/ProgramArguments.h"
+#include "quarn/terminal/ShownText.h"
 
 #include <cstdio>
 #include <exception>
@@ -16,47 +8,9 @@ namespace {
 
 using namespace quarn::program;
 
-Outcome answer(const Outcome& outcome) {
-    return outcome;
-}
-Outcome answer(const TurntableOptions& options) {
-    return recordTurntable(options);
-}
-Outcome answer(const FlythroughOptions& options) {
-    return recordFlythrough(options);
-}
-Outcome answer(const PathOptions& options) {
-    return recordPath(options);
-}
-Outcome answer(const DayOptions& options) {
-    return recordDay(options);
-}
-Outcome answer(const SeasonOptions& options) {
-    return recordSeason(options);
-}
-Outcome answer(const PlacesOptions& options) {
-    return listPlaces(options);
-}
-Outcome answer(const CurvesOptions& options) {
-    return reportCurves(options);
-}
-Outcome answer(const ScriptOptions& options) {
-    return runScript(options);
-}
-Outcome answer(const ModelOptions& options) {
-    return reportModel(options);
-}
-Outcome answer(const ConsoleOptions& options) {
-    return runConsole(options);
-}
-Outcome answer(const FrameOptions& options) {
-    return writeSingleFrame(options);
-}
-
 Outcome runProgram(int argument_count, char** arguments) {
     try {
-        return std::visit([](const auto& request) { return answer(request); },
-                          readCommandLine(argument_count, arguments));
+        return runArguments(argument_count, arguments);
     } catch (const std::exception& error) {
         return Outcome::failure(std::string("cannot go on: ") + error.what());
     }
@@ -65,7 +19,8 @@ Outcome runProgram(int argument_count, char** arguments) {
 void tell(const std::string& text, std::FILE* stream) {
     if (text.empty())
         return;
-    std::fputs(text.c_str(), stream);
+    std::fflush(stdout); // what was printed before stands before it
+    std::fputs(shownText(text).c_str(), stream);
     if (text.back() != '\n')
         std::fputc('\n', stream);
 }

@@ -23,7 +23,10 @@ void CommandStarter::start(const QString& line) {
 bool CommandStarter::startScript(const QString& file) {
     bool has_succeeded = false;
     runBetween(file, [&] {
-        has_succeeded = m_session.runScriptFile(nativePath(file));
+        const std::optional<std::string> trouble = m_session.runScriptFile(nativePath(file));
+        has_succeeded = !trouble;
+        if (trouble)
+            m_front_end.print(KM_wString::FromUtf8(*trouble + "\n").View());
         return has_succeeded ? CQuarnCommand::success : CQuarnCommand::failure;
     });
     return has_succeeded;

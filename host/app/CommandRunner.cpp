@@ -6,6 +6,8 @@
 #include "host/border/Border.h"
 #include "host/sun/MissingSun.h"
 
+#include <algorithm>
+
 namespace quarn {
 
 namespace {
@@ -18,6 +20,15 @@ const char* wordFor(CQuarnCommand::result result) {
 
 std::string utf8(std::wstring_view text) {
     return KM_wString(text).ToUtf8();
+}
+
+/// The number of the first line with a control character other than a tab, from 1; 0: none has one.
+std::size_t lineThatIsNoText(const std::vector<std::wstring>& lines) {
+    const auto is_control = [](wchar_t c) { return (c < 0x20 && c != L'\t') || c == 0x7F; };
+    for (std::size_t index = 0; index < lines.size(); ++index)
+        if (std::ranges::any_of(lines[index], is_control))
+            return index + 1;
+    return 0;
 }
 
 bool isSkipped(std::wstring_view line) {
@@ -109,35 +120,32 @@ void CommandRunner::tellMissingSun(const RunningCommand& running) {
         m_application.print(running.label() + L": " + std::wstring(why->View()));
 }
 
-bool CommandRunner::runFile(const std::filesystem::path& file) {
+std::optional<std::string> CommandRunner::runFile(const std::filesystem::path& file) {
     const Result<std::vector<std::wstring>> lines = readTextLines(file);
-    if (lines)
-        return runLines(lines.value(), std::wstring(textFromPath(file.filename()).View()));
-    m_application.tell(lines.message());
-    return false;
+    if (!lines)
+        return lines.message();
+    if (const std::size_t number = lineThatIsNoText(lines.value()))
+        return textFromPath(file).ToUtf8() + " is no script: line " + std::to_string(number) +
+               " holds control characters. A script is a text file with a command on each line.";
+    return runLines(lines.value(), std::wstring(textFromPath(file.filename()).View()));
 }
 
-bool CommandRunner::runLines(const std::vector<std::wstring>& lines,
-                             const std::wstring& file_name) {
+std::optional<std::string> CommandRunner::runLines(const std::vector<std::wstring>& lines,
+                                                   const std::wstring& file_name) {
     for (std::size_t index = 0; index < lines.size(); ++index) {
         if (isSkipped(lines[index]))
             continue;
         const std::wstring place = file_name + L", line " + std::to_wstring(index + 1);
-        if (m_application.frontEnd().isInterrupted()) {
-            m_application.tell("Stopped before " + utf8(place) + ".");
-            return false;
-        }
+        if (m_application.frontEnd().isInterrupted())
+            return "Stopped before " + utf8(place) + ".";
         CQuarnDoc& document = m_application.documents().active()->face();
         const CQuarnCommand::result result = run(lines[index], {&document, false, place});
-        if (result != CQuarnCommand::success) {
-            m_application.tell(utf8(place) + ": " + utf8(lines[index]) + ": " + wordFor(result) +
-                               ".");
-            return false;
-        }
+        if (result != CQuarnCommand::success)
+            return utf8(place) + ": " + utf8(lines[index]) + ": " + wordFor(result) + ".";
         if (m_application.isExitRequested())
-            return true;
+            return std::nullopt;
     }
-    return true;
+    return std::nullopt;
 }
 
 } // namespace quarn

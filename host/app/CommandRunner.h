@@ -5,6 +5,7 @@
 
 #include <deque>
 #include <filesystem>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -55,7 +56,7 @@ public:
     CQuarnCommand::result runNested(std::wstring_view line, const CommandOrigin& origin);
 
     /// Runs a script file; as Session::runScriptFile.
-    bool runFile(const std::filesystem::path& file);
+    std::optional<std::string> runFile(const std::filesystem::path& file);
 
     /// The command that runs now, or null. Valid until it ends.
     RunningCommand* current() const { return m_running.empty() ? nullptr : m_running.back(); }
@@ -68,7 +69,8 @@ private:
                                   bool interactive);
     void tellUnusedWords(const RunningCommand& running);
     void tellMissingSun(const RunningCommand& running);
-    bool runLines(const std::vector<std::wstring>& lines, const std::wstring& file_name);
+    std::optional<std::string> runLines(const std::vector<std::wstring>& lines,
+                                        const std::wstring& file_name);
 
     Application& m_application;
     std::vector<RunningCommand*> m_running;

@@ -154,9 +154,11 @@ Result<FrameScene> cameraAtFrame(const Animation& animation, int frame) {
                                                      *animation.record, frame + 1, scene.viewport);
     });
     if (!found || !found.value())
-        return Error{"The camera of frame " + std::to_string(frame) +
-                     " cannot be placed: its point and its target must be two different points. "
-                     "Set the animation up again."};
+        return Error{
+            "The camera of frame " + std::to_string(frame) +
+            " cannot be placed: its point and its target must be two different points, and "
+            "the view needs a direction for it that points up. Set the animation up again, "
+            "in a view with a level horizon."};
     for (const KM_UUID& curve : animation.record->FollowedCurves())
         scene.changes.hidden.push_back(curve);
     return scene;

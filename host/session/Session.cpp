@@ -44,7 +44,7 @@ std::vector<CommandName> Session::commandNames() const {
     return names;
 }
 
-bool Session::runScriptFile(const std::filesystem::path& file) {
+std::optional<std::string> Session::runScriptFile(const std::filesystem::path& file) {
     return m_state->application.runner().runFile(file);
 }
 

@@ -54,9 +54,10 @@ public:
     std::vector<CommandName> commandNames() const;
 
     /// Runs a script file: one command line per line; blank lines and lines that start with "#" are
-    /// skipped. Stops at the first command that does not succeed, and tells its line.
-    /// @return true when every command succeeded
-    bool runScriptFile(const std::filesystem::path& file);
+    /// skipped. Stops at the first command that does not succeed.
+    /// @return nothing when every command succeeded; else one sentence, not told yet: which line
+    ///         ended the script, or why the file is none
+    std::optional<std::string> runScriptFile(const std::filesystem::path& file);
 
     /// The active document; there is always one. Valid until another one is opened.
     CQuarnDoc& document();

@@ -34,13 +34,8 @@ const Places BELOW_SESSION = BELOW_COMMANDS + "host/commands/";
 // world.
 const Places PROGRAM = {"sdk/", "host/session/", "host/front_end/", "host/cities/"};
 
-const Places BELOW_TERMINAL = PROGRAM + "quarn/words/";
-const Places BELOW_CONSOLE_SESSION = BELOW_TERMINAL + "quarn/terminal/";
-const Places BELOW_SCRIPTS = BELOW_CONSOLE_SESSION + "quarn/session/";
-const Places BELOW_RUNS = BELOW_SCRIPTS + "quarn/scripts/";
-const Places BELOW_REPORTS = BELOW_RUNS + "quarn/runs/";
-const Places BELOW_CONSOLE = BELOW_REPORTS + "quarn/reports/";
-const Places BELOW_ARGUMENTS = BELOW_CONSOLE + "quarn/console/";
+const Places BELOW_SESSIONS = PROGRAM + "quarn/words/" + "quarn/terminal/";
+const Places BELOW_RUNS = PROGRAM + "quarn/words/" + "quarn/session/" + "quarn/scripts/";
 
 const Places BELOW_PORT = PROGRAM + "desktop/locale/";
 const Places BELOW_STARTER = BELOW_PORT + "desktop/front_end/";
@@ -104,15 +99,15 @@ const Room FLOORS[] = {
     {11, "vexui/forms/", INTERFACE + "vexui/locale/"},
     {11, "vexui/", INTERFACE + "vexui/locale/" + "vexui/forms/"},
 
-    {11, "quarn/words/", PROGRAM},
-    {11, "quarn/terminal/", BELOW_TERMINAL},
-    {11, "quarn/session/", BELOW_CONSOLE_SESSION},
-    {11, "quarn/scripts/", BELOW_SCRIPTS},
+    {11, "quarn/words/", {"sdk/"}},
+    {11, "quarn/terminal/", {"quarn/words/"}},
+    {11, "quarn/session/", BELOW_SESSIONS},
+    {11, "quarn/scripts/", PROGRAM + "quarn/words/"},
     {11, "quarn/runs/", BELOW_RUNS},
-    {11, "quarn/reports/", BELOW_REPORTS},
-    {11, "quarn/console/", BELOW_CONSOLE},
-    {11, "quarn/arguments/", BELOW_ARGUMENTS},
-    {11, "quarn/main.cpp", BELOW_ARGUMENTS + "quarn/arguments/"},
+    {11, "quarn/reports/", BELOW_RUNS},
+    {11, "quarn/console/", BELOW_SESSIONS + "quarn/session/"},
+    {11, "quarn/arguments/", BELOW_RUNS + "quarn/runs/" + "quarn/reports/" + "quarn/console/"},
+    {11, "quarn/main.cpp", {"quarn/arguments/", "quarn/terminal/"}},
 
     {11, "desktop/locale/", PROGRAM},
     {11, "desktop/front_end/", BELOW_PORT},

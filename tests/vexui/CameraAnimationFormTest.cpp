@@ -24,7 +24,22 @@ TEST_F(CameraForms, TheTurntableShowsTheListsAndTheRecord) {
         EXPECT_EQ("Rendered", textIn(form, "captureMethod"));
         EXPECT_EQ("Perspective", textIn(form, "viewport"));
         EXPECT_EQ("Walk", textIn(form, "name"));
-        EXPECT_EQ("36 frames; the camera turns by 10° from each to the next.", lineOf(form));
+        EXPECT_EQ("36 frames; the camera turns by about 10° from each to the next.", lineOf(form));
+        EXPECT_EQ("Which way the model seems to turn, seen from above",
+                  field<QWidget>(form, "direction").toolTip().toStdString());
+        form.reject();
+    }));
+}
+
+TEST_F(CameraForms, TheTurnFromFrameToFrameHasNoMoreDigitsThanAllOfThemShare) {
+    EXPECT_FALSE(openTurntable([](QDialog& form) {
+        for (const auto& [count, degrees] : {std::pair("7", "51"), std::pair("100", "3.6"),
+                                             std::pair("1000", "0.36"), std::pair("2", "180")}) {
+            typeInto(form, "frames", count);
+            EXPECT_NE(lineOf(form).find(std::string("by about ") + degrees + "°"),
+                      std::string::npos)
+                << lineOf(form);
+        }
         form.reject();
     }));
 }

@@ -312,7 +312,8 @@ TEST_F(FormBehaviour, AGermanFormIsGerman) {
     openTurntable([](QDialog& form) {
         EXPECT_EQ("Drehteller-Animation", form.windowTitle().toStdString());
         EXPECT_EQ("Abbrechen", field<QPushButton>(form, "cancel").text().toStdString());
-        EXPECT_EQ("36 Bilder; die Kamera dreht sich von einem zum nächsten um 10°.", lineOf(form));
+        EXPECT_EQ("36 Bilder; die Kamera dreht sich von einem zum nächsten um etwa 10°.",
+                  lineOf(form));
         EXPECT_EQ("Bilder", field<QWidget>(form, "frames").accessibleName().toStdString());
         form.reject();
     });

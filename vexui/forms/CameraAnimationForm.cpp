@@ -25,6 +25,13 @@ QString titleOf(CameraAnimationForm::Kind kind) {
                                                         : localText(L"Path Animation", 44002);
 }
 
+/// The steps are even in the circle's parameter, so that their angles differ by some percent: more
+/// digits than these would be those of no step.
+QString meanStepText(double degrees) {
+    return degrees < 1.0 ? QLocale().toString(degrees, 'g', 2)
+                         : QLocale().toString(degrees, 'f', degrees < 10.0 ? 1 : 0);
+}
+
 } // namespace
 
 CameraAnimationForm::CameraAnimationForm(Kind kind, const IZoetrixDataUI& lists,
@@ -46,10 +53,11 @@ void CameraAnimationForm::addMotion(const IZoetrixDataUI& lists,
              *m_frames);
     check(*m_frames, [this] { return frameFault(); });
     if (m_kind == Kind::turntable)
-        m_directions = &addList(section,
-                                {"direction", localText(L"&Direction:", 44021),
-                                 localText(L"Which way the camera turns, seen from above", 44041)},
-                                lists.DirectionList(), lists.DirectionListSelection());
+        m_directions =
+            &addList(section,
+                     {"direction", localText(L"&Direction:", 44021),
+                      localText(L"Which way the model seems to turn, seen from above", 44041)},
+                     lists.DirectionList(), lists.DirectionListSelection());
 }
 
 QString CameraAnimationForm::frameFault() const {
@@ -75,10 +83,8 @@ QString CameraAnimationForm::framesText(int count) const {
                           : localText(L"%1 frames along the path.", 44101).arg(number);
     if (count == 1)
         return localText(L"1 frame: the view as it is.", 44102);
-    constexpr int digits = 4;
-    const QString degrees = QLocale().toString(360.0 / count, 'g', digits);
-    return localText(L"%1 frames; the camera turns by %2° from each to the next.", 44103)
-        .arg(number, degrees);
+    return localText(L"%1 frames; the camera turns by about %2° from each to the next.", 44103)
+        .arg(number, meanStepText(360.0 / count));
 }
 
 void CameraAnimationForm::takeInto(IZoetrixDataUI& lists, KM_3dmAnimationProperties& record) const {

@@ -19,7 +19,7 @@ using testing::HasSubstr;
 class CommandRunnerTest : public HostTest {
 protected:
     /// Writes a script and runs it.
-    bool runScript(const std::string& bytes) {
+    std::optional<std::string> runScript(const std::string& bytes) {
         const TempFolder folder;
         const std::filesystem::path file = folder / "steps.txt";
         std::ofstream(file, std::ios::binary) << bytes;
@@ -177,15 +177,15 @@ TEST_F(CommandRunnerTest, NoScriptRunsOutsideACommandOrInADocumentThatIsNotOpen)
 // ---- Script files
 
 TEST_F(CommandRunnerTest, AScriptFileSkipsBlankLinesCommentsAndTheByteOrderMark) {
-    EXPECT_TRUE(runScript("\xEF\xBB\xBFGood\r\n\n  # a remark\n   \nGood"));
+    EXPECT_EQ(runScript("\xEF\xBB\xBFGood\r\n\n  # a remark\n   \nGood"), std::nullopt);
     EXPECT_EQ(good_runs, 2);
     EXPECT_EQ(printed(), "");
 }
 
 TEST_F(CommandRunnerTest, AScriptFileStopsAtTheFirstCommandThatFailsAndTellsItsLine) {
-    EXPECT_FALSE(runScript("Good\n\nBad\nGood\n"));
+    EXPECT_EQ(runScript("Good\n\nBad\nGood\n"), "steps.txt, line 3: Bad: failed.");
     EXPECT_EQ(good_runs, 1);
-    EXPECT_EQ(printed(), "steps.txt, line 3: Bad: failed.\n");
+    EXPECT_EQ(printed(), "");
 }
 
 TEST_F(CommandRunnerTest, ABadAnswerInAScriptFileIsToldWithItsLineAndNeverAnswersTheNextQuestion) {
@@ -202,17 +202,26 @@ TEST_F(CommandRunnerTest, ABadAnswerInAScriptFileIsToldWithItsLineAndNeverAnswer
         return CQuarnCommand::success;
     });
     add(two);
-    EXPECT_FALSE(runScript("Good\nTwo 0 Walk\n"));
+    EXPECT_EQ(runScript("Good\nTwo 0 Walk\n"), "steps.txt, line 2: Two 0 Walk: was cancelled.");
     EXPECT_EQ(second, L"untouched");
     EXPECT_EQ(printed(),
               "steps.txt, line 2: Two: \"0\" does not answer \"Number of frames\". Enter "
-              "a number of at least 1.\n"
-              "steps.txt, line 2: Two 0 Walk: was cancelled.\n");
+              "a number of at least 1.\n");
 }
 
 TEST_F(CommandRunnerTest, AMissingScriptFileIsTold) {
-    EXPECT_FALSE(session.runScriptFile("no/such/file.txt"));
-    EXPECT_EQ(printed(), "There is no file no/such/file.txt.\n");
+    EXPECT_EQ(session.runScriptFile("no/such/file.txt"), "There is no file no/such/file.txt.");
+    EXPECT_EQ(printed(), "");
+}
+
+TEST_F(CommandRunnerTest, AFileThatIsNoTextIsNoScriptAndRunsNothing) {
+    for (const char* line : {"Bad \x1B[2J", "glTF\x02", "a\x7F"}) {
+        const std::optional<std::string> trouble = runScript(std::string("Good\n") + line + "\n");
+        ASSERT_TRUE(trouble) << line;
+        EXPECT_THAT(*trouble, HasSubstr("steps.txt is no script: line 2 holds control characters"));
+    }
+    EXPECT_EQ(good_runs, 0);
+    EXPECT_EQ(runScript("\tGood\t\r\n"), std::nullopt);
 }
 
 TEST_F(CommandRunnerTest, AnInterruptedScriptFileStopsBeforeItsNextLine) {
@@ -221,14 +230,13 @@ TEST_F(CommandRunnerTest, AnInterruptedScriptFileStopsBeforeItsNextLine) {
         return CQuarnCommand::success;
     });
     add(stop);
-    EXPECT_FALSE(runScript("Stop\nGood\n"));
+    EXPECT_EQ(runScript("Stop\nGood\n"), "Stopped before steps.txt, line 2.");
     EXPECT_EQ(good_runs, 0);
-    EXPECT_EQ(printed(), "Stopped before steps.txt, line 2.\n");
 }
 
 TEST_F(CommandRunnerTest, ExitEndsAScriptFileWithSuccess) {
     EXPECT_FALSE(session.isExitRequested());
-    EXPECT_TRUE(runScript("Exit\nBad\n"));
+    EXPECT_EQ(runScript("Exit\nBad\n"), std::nullopt);
     EXPECT_TRUE(session.isExitRequested());
 }
 

@@ -109,6 +109,8 @@ TEST_F(SaveFrameTest, APlugInThatThrowsIsAFrameThatCannotBePlaced) {
     keeper.throws = true;
     EXPECT_EQ(save(L"0"), CQuarnCommand::failure);
     EXPECT_THAT(printed(), HasSubstr("The camera of frame 0 cannot be placed"));
+    EXPECT_THAT(printed(), HasSubstr("two different points"));
+    EXPECT_THAT(printed(), HasSubstr("a direction for it that points up"));
     EXPECT_FALSE(std::filesystem::exists(file));
 }
 

@@ -1,0 +1,178 @@
+#pragma once
+
+namespace quarn::program {
+
+inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
+
+  quarn turntable MODEL --frames N --out DIR   record a turntable as pictures and a page
+  quarn flythrough MODEL --path NAME --frames N --out DIR
+                                               record a walk along a curve, looking ahead
+  quarn path MODEL --camera NAME --target NAME --frames N --out DIR
+                                               record a camera that follows one curve and looks
+                                               along another, or at a point
+  quarn day MODEL --place NAME --date DATE --out DIR
+                                               record the sun and the shadows through one day
+  quarn season MODEL --place NAME --from DATE --to DATE --out DIR
+                                               record those of one time of day through the seasons
+  quarn places [TEXT]                          list the cities that a sun study knows by name
+  quarn curves MODEL                           list what a camera can follow
+  quarn frame DOC --number K --out FILE        write one frame of a saved animation
+  quarn run SCRIPT [MODEL]                     run a script of host commands
+  quarn console [MODEL]                        type host commands
+  quarn info MODEL                             tell what a model file holds
+
+A MODEL may be a .quarn document too. quarn --help and quarn COMMAND --help tell more.
+)";
+
+inline constexpr const char* PROGRAM_FOOTER = R"(
+Examples:
+  quarn turntable house.glb --frames 120 --out out/house --save house.quarn
+  quarn flythrough house.glb --camera-curve walk.txt --even-speed --frames 240 --out out/walk
+  quarn day house.glb --place Athens --date 2026-06-21 --every 10 --out out/sun
+  quarn frame house.quarn --number 60 --out middle.png
+  quarn info house.glb
+  quarn run steps.txt house.glb
+  quarn console house.glb
+
+Exit codes: 0 done, 1 failed, 2 arguments that make no sense, 130 stopped with Ctrl-C (143 by
+a request to terminate). Ctrl-C lets the picture that is being recorded be finished and writes the
+page; a second Ctrl-C ends the program at once.)";
+
+inline constexpr const char* TURNTABLE_FOOTER = R"(
+The model is framed so that it fills the pictures well during the whole turn. The pictures are
+named NAME000, NAME001, ... and NAME.html plays them in a browser.
+
+Examples:
+  quarn turntable house.glb --frames 120 --out out/house
+  quarn turntable part.stl --frames 36 --out out --mode Shaded --format png --size 640x480
+  quarn turntable town.obj --frames 240 --out out --elevation 35 --distance 0.8 --name Town
+  quarn turntable town.obj --frames 240 --out out --show-script > town.txt)";
+
+inline constexpr const char* FLYTHROUGH_FOOTER = R"(
+The camera runs along the curve from its start and looks in every picture at the place where the
+next one is taken; the horizon stays level. The curve itself is not in the pictures.
+
+A curve file holds a point a line, as X Y Z or X,Y,Z, in the model's units with Z up; a camera at
+eye height stands 1.6 above the floor of a model in metres. A line "degree 3" before the first
+point makes a smooth curve of them, which passes near the points; a line "closed" a round tour.
+
+Examples:
+  quarn curves town.quarn
+  quarn flythrough town.quarn --path "Main street" --even-speed --frames 300 --out out/street
+  quarn flythrough house.glb --camera-curve walk.txt --even-speed --frames 240 --out out/walk
+  quarn flythrough house.glb --camera-curve walk.txt --frames 240 --out out --save walk.quarn)";
+
+inline constexpr const char* PATH_FOOTER = R"(
+Camera and target run through their curves in the same number of pictures; either may be a point,
+where it stays. The curves are not in the pictures; the horizon stays level. quarn flythrough
+--help tells what a curve file holds.
+
+Examples:
+  quarn path town.quarn --camera "Roof line" --target Fountain --frames 240 --out out/roofs
+  quarn path part.stl --camera-curve arc.txt --target-point 0,0,12 --frames 120 --out out/part
+  quarn path hall.glb --camera-point 2,-4,1.6 --target-curve frieze.json --frames 90 --out out)";
+
+inline constexpr const char* DAY_FOOTER = R"(
+A picture is taken at --from, and every so many minutes later until --to; both may be in the night.
+Every picture of the page shows its date and time.
+
+Examples:
+  quarn day house.glb --place Athens --date 2026-06-21 --from 04:00 --to 19:00 --out out/sun
+  quarn day house.obj --latitude 51.5 --longitude -0.12 --north 12 --date 2026-12-21 --out out/dec
+  quarn day site.quarn --place "Mexico City" --date 2026-03-20 --view Top --out out/plan
+)";
+
+inline constexpr const char* SEASON_FOOTER = R"(
+A picture is taken on the date of --from, and every so many days later until that of --to, always
+at the same time by the clock. Every picture of the page shows its date and time.
+
+Examples:
+  quarn season house.glb --place Athens --from 2026-01-01 --to 2026-12-31 --at 11:00 --out out/year
+  quarn season yard.obj --place Sydney --from 2026-06-21 --to 2026-12-21 --every 1 --out out/spring
+
+In the west: a seasonal study counts longitudes eastward from 0 to 360, and its clock with them.
+105.18 W is 254.82 E, on UTC+16, where 12:00 on 22 March is 20:00 UTC on the 21st: that is the hour
+of UTC-8 with the next day's date, while quarn day has UTC-7 there. For the sun that quarn day shows
+at 12:00 give --at 11:00 (on the multiples of 15 degrees, such as 105 W, both show the same hour).
+)";
+
+/// Follows the footers of the two sun studies.
+inline constexpr const char* SITE_FOOTER = R"(
+North: the sun stands as if the model's Y axis pointed north. --north 30 says that north lies 30
+degrees clockwise from the Y axis, as seen from above.
+
+Clock: the zone is the longitude divided by 15, cut to whole hours toward zero. Borders and daylight
+saving do not count, so clocks on the wall differ, most of all in summer:
+  Athens, 23.73 E   here UTC+1, on the wall UTC+3: for 14:30 give 12:30
+  Berlin, 13.41 E   here UTC,   on the wall UTC+2: for 14:30 give 12:30
+  Madrid,  3.7 W    here UTC,   on the wall UTC+2: for 14:30 give 12:30
+  London,  0.13 W   here UTC,   on the wall UTC+1: for 14:30 give 13:30
+The zone and the universal time of the first picture are told before the recording begins. Seconds
+are always 0.)";
+
+inline constexpr const char* PLACES_FOOTER = R"(
+The last two columns tell the zone of the clock in quarn day and in quarn season; quarn season
+--help explains why they differ in the west.
+
+Examples:
+  quarn places
+  quarn places spain)";
+
+inline constexpr const char* CURVES_FOOTER = R"(
+A line tells the name (the id, where there is none), the kind, the length in the model's units,
+whether it is closed, and the number of points that define it.
+
+Example:
+  quarn curves town.obj)";
+
+inline constexpr const char* FRAME_FOOTER = R"(
+The frame is drawn as the recording draws it; at the view's own size it is the same file, but for two
+cases: where the camera stands straight above or below its target, and in a view with a tilted
+horizon. A recording levels the horizon; a single frame keeps it tilted, and fails where the view
+takes no direction for it as pointing up.
+
+Examples:
+  quarn frame house.quarn --number 0 --out first.jpg
+  quarn frame house.quarn --number 60 --size 3840x2160 --out middle.png)";
+
+inline constexpr const char* RUN_FOOTER = R"(
+A script holds one host command a line; the words after a command's name answer its questions.
+Blank lines and lines that start with # are skipped. The first command that fails ends the run.
+
+Example (steps.txt):
+  # a turntable of the model that is read first; the folder out must be there
+  _-StandardView _Perspective
+  _-FitView _Turn=Yes _Enter
+  _-SetTurntableAnimation 36 _Clockwise _png _Shaded _Enter _Enter
+  _-RecordAnimation _TargetFolder "out" _Enter
+
+  quarn run steps.txt house.glb
+
+The command Help lists every command; quarn turntable ... --show-script prints a whole script.)";
+
+inline constexpr const char* CONSOLE_FOOTER = R"(
+A command asks for what it needs: "Number of frames <100>: ". What stands in < > is the answer of
+an empty line; what stands in ( ) are options, picked by typing their names (in a question for
+text as they stand there, with their brackets). Answers may also follow the command's name on its
+line; the command asks for those that are missing, and again for one that does not fit.
+
+  Tab        completes names of commands, options, objects and files
+  Up, Down   call back earlier lines; those of earlier runs are kept in
+             $XDG_STATE_HOME/quarn/history or else ~/.local/state/quarn/history
+  Ctrl-C     cancels the command that asks; ends a recording after the current picture (a second
+             one, while a command is at work, ends the program at once)
+  Ctrl-D     ends the program where a command is asked for, as Exit does; nothing is saved then
+
+An empty line where a command is asked for does nothing; Up and Enter repeat the last command. What
+is piped in is read as if it were typed; there lines that start with # are skipped.
+
+Example:
+  quarn console house.glb
+  Command: SetTurntableAnimation 36 Clockwise
+  File type <jpg> ( jpg bmp png tga ):)";
+
+inline constexpr const char* INFO_FOOTER = R"(
+Example:
+  quarn info house.glb)";
+
+} // namespace quarn::program

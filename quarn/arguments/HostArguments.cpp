@@ -1,0 +1,88 @@
+// The commands that read a file and let the host work on it.
+#include "quarn/arguments/Readings.h"
+#include "quarn/arguments/RecordingArguments.h"
+#include "quarn/arguments/Subcommands.h"
+#include "quarn/console/Console.h"
+#include "quarn/reports/CurveReport.h"
+#include "quarn/reports/ModelReport.h"
+#include "quarn/runs/ScriptRun.h"
+#include "quarn/runs/SingleFrame.h"
+
+namespace quarn::program {
+
+namespace {
+
+/// What is read first, and how the host is run.
+struct FileWish {
+    std::filesystem::path model;
+    CommonOptions common;
+};
+
+CLI::Option* addModel(CLI::App& command, FileWish& wish, const std::string& description) {
+    return OptionAdder(command)("MODEL", wish.model, "", scriptWord("the model's path"),
+                                description);
+}
+
+Action addReport(CLI::App& command,
+                 Outcome (*report)(const std::filesystem::path&, const CommonOptions&)) {
+    const auto wish = std::make_shared<FileWish>();
+    addModel(command, *wish, "The model file or document")->required();
+    addCommonOptions(command, wish->common);
+    return [=] { return report(wish->model, wish->common); };
+}
+
+Reading<std::filesystem::path> savedDocument() {
+    using Path = std::filesystem::path;
+    return [](const std::string&, const std::string& word) -> std::variant<Path, Refusal> {
+        if (const auto refusal = whyPathIsRefused("the document's path", word))
+            return Refusal{*refusal};
+        if (!isDocument(word))
+            return Refusal{word + " is no document: give the .quarn file that --save wrote."};
+        return Path(word);
+    };
+}
+
+} // namespace
+
+Action addCurves(CLI::App& command) {
+    return addReport(command, &reportCurves);
+}
+
+Action addInfo(CLI::App& command) {
+    return addReport(command, &reportModel);
+}
+
+Action addFrame(CLI::App& command) {
+    const auto asked = std::make_shared<Asked<FrameRequest>>();
+    FrameRequest& request = asked->request;
+    const OptionAdder add(command);
+    add("DOC", request.document, "", savedDocument(), "The document, a .quarn file")->required();
+    add("--number", request.number, "K", wholeNumberFrom(0), "The frame, from 0 as in file names")
+        ->required();
+    add("--size", request.size, "WxH", sizeOfPicture(),
+        "Size of the picture in pixels (default: the view's)");
+    add("--out", request.file, "FILE", scriptWord("the path of --out"),
+        "The picture: .jpg, .png, .bmp or .tga")
+        ->required();
+    addShowScript(command, asked->use.is_only_shown);
+    addCommonOptions(command, asked->use.common);
+    return [asked] { return writeSingleFrame(asked->request, asked->use); };
+}
+
+Action addRun(CLI::App& command) {
+    const auto wish = std::make_shared<FileWish>();
+    const auto script = std::make_shared<std::string>();
+    command.add_option("SCRIPT", *script, "The script file")->type_name("")->required();
+    addModel(command, *wish, "A model file or document to read first");
+    addCommonOptions(command, wish->common);
+    return [=] { return runScript(*script, wish->model, wish->common); };
+}
+
+Action addConsole(CLI::App& command) {
+    const auto wish = std::make_shared<FileWish>();
+    addModel(command, *wish, "A model file or document to read first");
+    addCommonOptions(command, wish->common);
+    return [=] { return runConsole(wish->model, wish->common); };
+}
+
+} // namespace quarn::program

@@ -1,0 +1,113 @@
+#include "quarn/arguments/Readings.h"
+
+#include <algorithm>
+
+namespace quarn::program {
+
+namespace {
+
+constexpr int FIRST_YEAR = 1800; // as the host's sun takes them
+
+/// A reading that knows one reason to refuse a word.
+/// @param read  nothing for a word that is not as demanded
+template <class Value>
+Reading<Value> reading(const std::string& demand,
+                       const std::function<std::optional<Value>(const std::string&)>& read) {
+    return [=](const std::string& option, const std::string& word) {
+        const std::optional<Value> value = read(word);
+        return value ? std::variant<Value, Refusal>(*value) : mustBe(option, demand, word);
+    };
+}
+
+std::string ofUnit(const std::string& unit) {
+    return unit.empty() ? "" : " of " + unit;
+}
+
+/// "a, b or c"
+std::string alternatives(const std::vector<std::string>& words) {
+    std::string text;
+    for (std::size_t i = 0; i < words.size(); ++i)
+        text += (i == 0 ? "" : i + 1 == words.size() ? " or " : ", ") + words[i];
+    return text;
+}
+
+} // namespace
+
+Refusal mustBe(const std::string& option, const std::string& demand, const std::string& word) {
+    return {option + " must be " + demand + ", not \"" + word + "\"."};
+}
+
+Reading<int> wholeNumberFrom(int low, std::optional<int> high, const std::string& unit) {
+    const std::string demand = "a whole number" + ofUnit(unit) + " from " + std::to_string(low) +
+                               (high ? " to " + std::to_string(*high) : "");
+    return reading<int>(demand, [=](const std::string& word) {
+        const std::optional<int> number = wholeNumber(word);
+        return number && *number >= low && (!high || *number <= *high) ? number : std::nullopt;
+    });
+}
+
+Reading<double> numberFrom(double low, double high, const std::string& unit) {
+    const std::string demand =
+        "a number" + ofUnit(unit) + " from " + numberText(low) + " to " + numberText(high);
+    return reading<double>(demand, [=](const std::string& word) {
+        const std::optional<double> number = realNumber(word);
+        return number && *number >= low && *number <= high ? number : std::nullopt;
+    });
+}
+
+Reading<Triple> point() {
+    return reading<Triple>("three numbers X,Y,Z without blanks",
+                           [](const std::string& word) { return triple(word); });
+}
+
+Reading<PixelSize> sizeOfPicture() {
+    constexpr int LARGEST_SIDE_PX = 16384;
+    const auto is_good = [](int side_px) { return side_px >= 1 && side_px <= LARGEST_SIDE_PX; };
+    return reading<PixelSize>(
+        "WIDTHxHEIGHT such as 1280x720, each from 1 to " + std::to_string(LARGEST_SIDE_PX),
+        [=](const std::string& word) {
+            const std::optional<PixelSize> size = pixelSize(word);
+            return size && is_good(size->width_px) && is_good(size->height_px) ? size
+                                                                               : std::nullopt;
+        });
+}
+
+Reading<std::string> oneOf(const std::vector<std::string>& words) {
+    return reading<std::string>(
+        alternatives(words), [=](const std::string& word) -> std::optional<std::string> {
+            const auto found = std::ranges::find(words, lowerCase(word));
+            return found == words.end() ? std::nullopt : std::optional(*found);
+        });
+}
+
+Reading<std::string> scriptWord(const std::string& subject) {
+    return [=](const std::string&, const std::string& word) -> std::variant<std::string, Refusal> {
+        if (const auto refusal = whyPathIsRefused(subject, word))
+            return Refusal{*refusal};
+        return word;
+    };
+}
+
+Reading<COleDateTime> dateUntil(int last_year) {
+    return [=](const std::string& option,
+               const std::string& word) -> std::variant<COleDateTime, Refusal> {
+        const std::optional<COleDateTime> date = isoDate(word);
+        if (!date)
+            return mustBe(option, "a date such as 2026-06-21", word);
+        if (!date->IsValid())
+            return mustBe(option, "a day of the calendar", word);
+        if (date->GetYear() < FIRST_YEAR || date->GetYear() > last_year)
+            return mustBe(option,
+                          "in the years " + std::to_string(FIRST_YEAR) + " to " +
+                              std::to_string(last_year),
+                          word);
+        return *date;
+    };
+}
+
+Reading<ClockTime> timeOfDay() {
+    return reading<ClockTime>("a time from 00:00 to 23:59",
+                              [](const std::string& word) { return clockTime(word); });
+}
+
+} // namespace quarn::program

@@ -1,0 +1,33 @@
+#pragma once
+
+#include "quarn/arguments/OptionAdder.h"
+#include "quarn/words/DateWords.h"
+
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace quarn::program {
+
+/// "--frames must be a whole number from 1, not "x"."
+Refusal mustBe(const std::string& option, const std::string& demand, const std::string& word);
+
+/// @param high  nothing: as large as a number can be
+/// @param unit  what is counted; empty: nothing
+Reading<int> wholeNumberFrom(int low, std::optional<int> high = {}, const std::string& unit = "");
+Reading<double> numberFrom(double low, double high, const std::string& unit = "");
+Reading<Triple> point();
+Reading<PixelSize> sizeOfPicture();
+
+/// One of these words in any case; the value is in lower case, as they are.
+Reading<std::string> oneOf(const std::vector<std::string>& words);
+
+/// A name or a path that a script can hold.
+/// @param subject  what it is, for the message: "the name of --hide"
+Reading<std::string> scriptWord(const std::string& subject);
+
+/// A day of the calendar from the first year that sun studies know.
+Reading<COleDateTime> dateUntil(int last_year);
+Reading<ClockTime> timeOfDay();
+
+} // namespace quarn::program

@@ -1,0 +1,117 @@
+#include "quarn/arguments/RecordingArguments.h"
+
+#include "quarn/arguments/Readings.h"
+#include "quarn/words/AnimationName.h"
+
+namespace quarn::program {
+
+namespace {
+
+Reading<CaptureMode> modeFor(CaptureSubject subject) {
+    return [=](const std::string& option,
+               const std::string& word) -> std::variant<CaptureMode, Refusal> {
+        const std::string choice = "; " + option + " takes " + captureModeNames(subject) + ".";
+        const std::optional<CaptureMode> mode = captureMode(word);
+        if (!mode)
+            return Refusal{"unknown display mode \"" + word + "\"" + choice};
+        if (subject == CaptureSubject::moving_sun && !mode->suits_sun_studies)
+            return Refusal{"sun studies are not recorded in the display mode \"" + word + "\"" +
+                           choice};
+        return *mode;
+    };
+}
+
+Reading<std::string> animationName() {
+    return [](const std::string&, const std::string& word) -> std::variant<std::string, Refusal> {
+        if (const auto refusal = whyNameIsRefused(word))
+            return Refusal{*refusal};
+        return word;
+    };
+}
+
+/// A file to save a document in; its extension may be left out.
+Reading<std::filesystem::path> documentFile() {
+    using Path = std::filesystem::path;
+    return [](const std::string& option, const std::string& word) -> std::variant<Path, Refusal> {
+        if (const auto refusal = whyPathIsRefused("the path of " + option, word))
+            return Refusal{*refusal};
+        Path file = word;
+        if (!file.has_filename())
+            return Refusal{option + " must name a file, not \"" + word + "\"."};
+        if (!file.has_extension())
+            file += ".quarn";
+        if (!isDocument(file))
+            return Refusal{option + " must name a file that ends in .quarn, not \"" + word + "\"."};
+        return file;
+    };
+}
+
+void addHidden(CLI::App& command, std::vector<std::string>& hidden) {
+    command.add_option("--hide", hidden, "Leave out this object; may be given again")
+        ->type_name("NAME")
+        ->expected(1)
+        ->take_all()
+        ->each([](const std::string& name) {
+            if (const auto refusal = whyPathIsRefused("the name of --hide", name))
+                throw CLI::ValidationError(*refusal);
+        });
+}
+
+} // namespace
+
+void addCommonOptions(CLI::App& command, CommonOptions& common) {
+    command.add_flag("--verbose", common.is_verbose, "Show what the host's commands print");
+    command.add_option("--language", common.language,
+                       "Language of texts, such as de or ja (default: the environment's)");
+}
+
+void addShowScript(CLI::App& command, bool& is_only_shown) {
+    command.add_flag("--show-script", is_only_shown,
+                     "Print the host commands that would be run, and run nothing");
+}
+
+void addModelAndFolder(const OptionAdder& add, RecordingRequest& request) {
+    add("MODEL", request.model, "", scriptWord("the model's path"),
+        "The model file: OBJ, glTF, GLB, PLY, STL, ...; or a document")
+        ->required();
+    add("--out", request.folder, "DIR", scriptWord("the path of --out"),
+        "Folder for the pictures and the page")
+        ->required();
+    add("--up", request.up_axis, "AXIS", oneOf({"y", "z"}),
+        "Axis that points up in the file, y or z (default: y for glTF and such, z for OBJ, PLY, "
+        "STL)");
+}
+
+void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse& use,
+                         CaptureSubject subject) {
+    const OptionAdder add(command);
+    add("--size", request.size, "WxH", sizeOfPicture(), "Size of a picture in pixels", "1280x720");
+    add("--mode", request.mode, "NAME", modeFor(subject),
+        "Display mode: " + captureModeNames(subject), "Rendered");
+    add("--samples", request.samples, "N", wholeNumberFrom(1, 16384),
+        "With RenderFull or RenderPreview: how often each pixel is looked at, 1 to 16384 (default: "
+        "64 and 8, or the document's own)");
+    add("--format", request.format, "NAME", oneOf({"jpg", "png", "bmp", "tga"}),
+        "jpg, png, bmp or tga", "jpg");
+    addHidden(command, request.hidden);
+    add("--name", request.name, "NAME", animationName(),
+        "Name of the animation (default: the model file's)");
+    add("--save", request.document, "DOC", documentFile(),
+        "Keep the document with its animation in this .quarn file, before recording");
+    addShowScript(command, use.is_only_shown);
+    addCommonOptions(command, use.common);
+}
+
+std::optional<std::string> settle(RecordingRequest& request) {
+    if (!request.up_axis.empty() && isDocument(request.model))
+        return "--up is for model files; a document knows its axes.";
+    if (request.samples > 0 && !request.mode.is_rendered)
+        return "--samples is for rendered pictures: with it --mode must be RenderFull or "
+               "RenderPreview, not \"" +
+               request.mode.name + "\".";
+    if (request.name.empty())
+        request.name = animationNameFor(request.model);
+    return std::nullopt;
+}
+
+} // namespace quarn::program

@@ -1,0 +1,94 @@
+#include "quarn/console/HistoryFile.h"
+
+#include "quarn/words/Words.h"
+
+#include <cstdlib>
+#include <fcntl.h>
+#include <fstream>
+#include <unistd.h>
+
+namespace quarn::program {
+
+namespace {
+
+/// A folder that a variable of the environment names; empty when it names none, or only one that
+/// depends on where the program was started.
+std::filesystem::path folderOf(const char* variable) {
+    const char* const value = std::getenv(variable);
+    const std::filesystem::path folder = value ? value : "";
+    return folder.is_absolute() ? folder : std::filesystem::path();
+}
+
+std::vector<std::string> readLines(const std::filesystem::path& file) {
+    std::vector<std::string> lines;
+    std::ifstream stream(file, std::ios::binary);
+    for (std::string line; std::getline(stream, line);) {
+        if (!line.empty())
+            lines.push_back(line);
+    }
+    return lines;
+}
+
+/// Makes the file hold these lines alone. The new one takes the old one's place when it is whole.
+void replaceLines(const std::filesystem::path& file, const std::vector<std::string>& lines) {
+    std::string beside = file.native() + "-XXXXXX";
+    const int descriptor = mkstemp(beside.data());
+    if (descriptor < 0)
+        return;
+    close(descriptor);
+    std::ofstream stream(beside, std::ios::binary);
+    for (const std::string& line : lines)
+        stream << line << '\n';
+    stream.close();
+    std::error_code error;
+    if (stream)
+        std::filesystem::rename(beside, file, error);
+    if (!stream || error)
+        std::filesystem::remove(beside, error);
+}
+
+/// The folder is the user's alone.
+void makeFolder(const std::filesystem::path& folder) {
+    std::error_code error;
+    if (std::filesystem::create_directories(folder, error))
+        std::filesystem::permissions(folder, std::filesystem::perms::owner_all, error);
+}
+
+} // namespace
+
+HistoryFile::HistoryFile(std::filesystem::path file) : m_file(std::move(file)) {}
+
+std::vector<std::wstring> HistoryFile::load() const {
+    std::vector<std::string> lines = readLines(m_file);
+    if (lines.size() > LINES_KEPT) {
+        lines.erase(lines.begin(), lines.end() - LINES_KEPT);
+        replaceLines(m_file, lines);
+    }
+    std::vector<std::wstring> texts;
+    texts.reserve(lines.size());
+    for (const std::string& line : lines)
+        texts.push_back(wideText(line));
+    return texts;
+}
+
+void HistoryFile::append(std::wstring_view line) const {
+    if (m_file.empty())
+        return;
+    makeFolder(m_file.parent_path());
+    const int descriptor = open(m_file.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0600);
+    if (descriptor < 0)
+        return;
+    const std::string bytes = utf8Text(line) + "\n";
+    [[maybe_unused]] const ssize_t written = write(descriptor, bytes.data(), bytes.size());
+    close(descriptor);
+}
+
+std::filesystem::path historyPath() {
+    if (const std::filesystem::path state = folderOf("XDG_STATE_HOME"); !state.empty())
+        return state / "quarn" / "history";
+    if (const std::filesystem::path home = folderOf("HOME"); !home.empty())
+        return home / ".local" / "state" / "quarn" / "history";
+    return {};
+}
+
+} // namespace quarn::program

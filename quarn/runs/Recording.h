@@ -1,0 +1,21 @@
+#pragma once
+
+#include "quarn/scripts/RecordingScript.h"
+#include "quarn/session/HostSession.h"
+#include "quarn/words/Outcome.h"
+
+namespace quarn::program {
+
+/// What becomes of a script that was composed.
+struct ScriptUse {
+    bool is_only_shown = false;
+    CommonOptions common;
+};
+
+/// Composes the script of a recording, and runs it or, where it is only to be shown, returns it.
+///
+/// @param lines  the commands of this kind of animation
+Outcome recordOrShow(const RecordingRequest& request, const AnimationLines& lines,
+                     const ScriptUse& use);
+
+} // namespace quarn::program

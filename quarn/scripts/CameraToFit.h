@@ -1,0 +1,16 @@
+#pragma once
+
+#include "quarn/words/Words.h"
+
+#include <string>
+
+namespace quarn::program {
+
+/// The host command that lets the camera look at a point from a direction; FitView, which comes
+/// after it, keeps that direction and finds the distance.
+///
+/// @param azimuth_deg    of the camera about the target, counter-clockwise from the X axis
+/// @param elevation_deg  of the camera above the horizon through the target, -89 to 89
+std::string cameraToBeFitted(const Triple& target, double azimuth_deg, double elevation_deg);
+
+} // namespace quarn::program

@@ -1,0 +1,32 @@
+#pragma once
+
+#include "quarn/scripts/CaptureMode.h"
+#include "quarn/words/Words.h"
+
+#include <filesystem>
+#include <string>
+#include <vector>
+
+namespace quarn::program {
+
+/// What every recording needs, whatever moves in it.
+struct RecordingRequest {
+    std::filesystem::path model;
+    std::string up_axis; ///< "y", "z" or, by the format, empty
+    std::filesystem::path folder;
+    std::string name; ///< of the animation, its pictures and its page; UTF-8
+    int frames = 0;
+    PixelSize size{};
+    CaptureMode mode;
+    int samples = 0;    ///< of each pixel, by the render method; 0: as the document has it
+    std::string format; ///< "jpg", "png", "bmp" or "tga"
+    std::vector<std::string> hidden; ///< names of objects; UTF-8
+    std::filesystem::path document;  ///< to save, a .quarn file; empty: none
+};
+
+/// The path of the page that the recording writes.
+inline std::filesystem::path pagePath(const RecordingRequest& request) {
+    return request.folder / (request.name + ".html");
+}
+
+} // namespace quarn::program

@@ -1,0 +1,55 @@
+#include "quarn/scripts/RecordingScript.h"
+
+namespace quarn::program {
+
+namespace {
+
+/// Each render method has its own number of samples.
+std::string samplesAnswer(const RecordingRequest& request) {
+    if (request.samples == 0)
+        return "";
+    const bool is_preview = request.mode.option == "_RenderPreview";
+    return (is_preview ? " _PreviewSamples " : " _Samples ") + std::to_string(request.samples);
+}
+
+} // namespace
+
+RecordingScript composeRecording(const RecordingRequest& request, const AnimationLines& lines) {
+    RecordingScript script;
+    script.notes = lines.notes;
+    script.reading = readingLine(request.model, request.up_axis);
+    std::vector<std::string>& set_up = script.set_up;
+    for (const std::string& name : request.hidden)
+        set_up.push_back("_-Hide \"" + name + "\"");
+    const std::string size =
+        std::to_string(request.size.width_px) + " " + std::to_string(request.size.height_px);
+    set_up.push_back("_-ViewportSize " + size);
+    set_up.insert(set_up.end(), lines.preparing.begin(), lines.preparing.end());
+    set_up.push_back("_-AnimationName \"" + request.name + "\"");
+    set_up.push_back(lines.setting_up);
+    if (request.mode.is_rendered)
+        set_up.push_back("_-RenderSettings _Size " + size + samplesAnswer(request) + " _Enter");
+    if (!request.document.empty())
+        script.saving = "_-SaveAs " + quotedPath(request.document);
+    script.recording = "_-RecordAnimation _TargetFolder " + quotedPath(request.folder) + " _Enter";
+    return script;
+}
+
+std::string sharedAnswers(const RecordingRequest& request) {
+    return "_" + request.format + " " + request.mode.option + " _Enter _Enter";
+}
+
+std::string scriptText(const RecordingScript& script) {
+    std::string text;
+    for (const std::string& note : script.notes)
+        text += "# " + note + "\n";
+    text += script.reading + "\n";
+    for (const std::string& line : script.set_up)
+        text += line + "\n";
+    text += "# The folder must be there before the recording starts.\n";
+    if (script.saving)
+        text += *script.saving + "\n";
+    return text + script.recording;
+}
+
+} // namespace quarn::program

@@ -1,0 +1,36 @@
+#pragma once
+
+#include "quarn/scripts/RecordingRequest.h"
+
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace quarn::program {
+
+/// The host commands of one kind of animation: one line each, in UTF-8.
+struct AnimationLines {
+    std::vector<std::string> preparing; ///< what is needed before: the camera, curves
+    std::string setting_up;             ///< the command that sets the animation up
+    std::vector<std::string> notes{};   ///< what a person is told before it is recorded
+};
+
+/// The host commands of a whole recording.
+struct RecordingScript {
+    std::vector<std::string> notes;  ///< for a person
+    std::string reading;             ///< of the model file
+    std::vector<std::string> set_up; ///< from the model to the animation
+    /// Keeps the document before the recording begins, so that one which is stopped keeps it too.
+    std::optional<std::string> saving;
+    std::string recording; ///< this and `saving` need the folder to be there
+};
+
+RecordingScript composeRecording(const RecordingRequest& request, const AnimationLines& lines);
+
+/// The answers to what every set-up command asks at its end: format, capture mode, view and name.
+std::string sharedAnswers(const RecordingRequest& request);
+
+/// The script as a person reads it, or runs it again with `quarn run`.
+std::string scriptText(const RecordingScript& script);
+
+} // namespace quarn::program

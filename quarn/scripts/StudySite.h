@@ -1,0 +1,22 @@
+#pragma once
+
+#include <string>
+
+namespace quarn::program {
+
+/// Where on the earth a model stands, and how it is turned there.
+struct StudySite {
+    std::string place;          ///< "Athens, Greece"; empty where coordinates were typed
+    double latitude_deg = 0.0;  ///< north positive, -90 to 90
+    double longitude_deg = 0.0; ///< east positive, -180 to 180
+    double north_deg = 0.0;     ///< clockwise from the model's Y axis
+};
+
+/// The longitude as the command of a seasonal study takes it: 0 to 360, eastward.
+double eastwardLongitude(double longitude_deg);
+
+/// "37.98 N", "105.1786 W"
+std::string latitudeText(double latitude_deg);
+std::string longitudeText(double longitude_deg);
+
+} // namespace quarn::program

@@ -1,0 +1,21 @@
+#pragma once
+
+#include "quarn/scripts/RecordingScript.h"
+
+#include <optional>
+
+namespace quarn::program {
+
+/// A turntable that is to be recorded.
+struct TurntableRequest {
+    RecordingRequest recording;
+    std::string direction;      ///< that the model seems to turn in: "clockwise", "anticlockwise"
+    double elevation_deg = 0.0; ///< of the camera above the horizon through its target
+    std::optional<double> distance_factor;
+    std::optional<Triple> target;
+};
+
+/// The host commands that frame the model and set a turntable up.
+AnimationLines turntableLines(const TurntableRequest& request);
+
+} // namespace quarn::program

@@ -1,0 +1,78 @@
+#pragma once
+
+#include "host/front_end/FrontEnd.h"
+#include "quarn/terminal/FramePace.h"
+#include "quarn/terminal/ProgressLine.h"
+
+#include <string>
+
+namespace quarn::program {
+
+/// The front end of a program that nobody answers: it shows what it is told to show, keeps the last
+/// words of the host for error messages, and shows how far a recording is.
+class ConsoleFrontEnd : public FrontEnd {
+public:
+    enum class Prints {
+        hidden, ///< only remembered
+        shown,  ///< on the standard output
+    };
+    explicit ConsoleFrontEnd(Prints prints);
+
+    /// Shows what the program is busy with, where a person can see it go away again.
+    void showStep(std::string_view text) { m_progress.show(text); }
+    void clearProgress() { m_progress.clear(); }
+    /// Makes what is shown next begin a line.
+    void endLine();
+
+    /// A recording of this many pictures begins: counts from 0 again, and forgets the last words.
+    void beginRecording(int frames);
+    int framesWritten() const { return m_frames_written; }
+
+    /// The last line that the host printed since forgetLastWords; UTF-8, empty when there is none.
+    /// During a recording: since the last picture.
+    std::string lastWords() const;
+    /// The last two lines, as one: the host tells why an answer cannot be taken, and then the
+    /// command how it ends.
+    std::string closingWords() const;
+    void forgetLastWords();
+
+    /// From now on everything that is printed is shown.
+    void showWords() { m_prints = Prints::shown; }
+    bool hidesWords() const { return m_prints == Prints::hidden; }
+    /// From now on what is printed is kept, and not shown.
+    void keepWords() { m_keeps_words = true; }
+    /// What was kept; from now on nothing is.
+    std::string takeKeptWords();
+
+    void print(std::wstring_view text) override;
+    Answer ask(const Question& question) override;
+    int showMessage(std::wstring_view text, std::wstring_view title, unsigned flags) override;
+    std::optional<std::filesystem::path>
+    chooseFolder(std::wstring_view title, std::wstring_view message,
+                 const std::filesystem::path& start_folder) override;
+    void pumpEvents(unsigned milliseconds) override;
+    bool isKeyDown(int virtual_key) override;
+    bool isInterrupted() const override;
+    HWND mainWindow() override;
+    void frameWritten(const std::filesystem::path& file, int written, int total) override;
+    void pictureRendered(double share) override;
+
+private:
+    void rememberWords(std::string_view text);
+    bool isProgressDue();
+
+    Prints m_prints;
+    ProgressLine m_progress;
+    FramePace m_pace;
+    FramePace::Clock::time_point m_next_progress;
+    std::string m_last_line;
+    std::string m_line_before; ///< the last one
+    std::string m_open_line;   ///< printed so far without a line break
+    bool m_keeps_words = false;
+    std::string m_kept_words;
+    bool m_is_inside_line = false; ///< the last text shown did not end its line
+    int m_frames_written = 0;
+    int m_frames_expected = 0;
+};
+
+} // namespace quarn::program

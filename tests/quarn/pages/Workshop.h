@@ -1,0 +1,28 @@
+#pragma once
+
+#include "tests/quarn/ProgramRun.h"
+
+namespace quarn::test {
+
+/// A folder with every file that the commands of the pages and of the help texts name: small models
+/// with curves, documents with an animation, curve files, a script.
+class Workshop {
+public:
+    Workshop();
+
+    /// Runs the program in the folder.
+    Ended run(const std::vector<std::string>& arguments, const std::string& input = "") const;
+
+    std::filesystem::path operator/(const std::filesystem::path& name) const {
+        return m_folder / name;
+    }
+
+private:
+    void writeModels() const;
+    void writeCurves() const;
+    void writeDocuments() const;
+
+    TempFolder m_folder;
+};
+
+} // namespace quarn::test
