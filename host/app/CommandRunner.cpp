@@ -99,6 +99,8 @@ CQuarnCommand::result CommandRunner::execute(RunningCommand& running, const Comm
     const Result<CQuarnCommand::result> ended =
         acrossBorder([&] { return running.command->RunCommand(context); });
     m_running.pop_back();
+    if (ended && ended.value() == CQuarnCommand::failure)
+        m_application.print(running.likely_mistake.View());
     if (ended)
         return ended.value();
     m_application.tell(utf8(running.label()) + " stopped with an error: " + ended.message());

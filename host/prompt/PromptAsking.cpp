@@ -109,12 +109,19 @@ bool isMistakenForOption(const PromptState& prompt, const Reply& reply) {
            readOption(prompt, word).kind == OptionPick::Kind::none;
 }
 
-void tellNoOption(Application& application, const RunningCommand& command, const Reply& reply,
+/// Tells that a word is no option. A question for text may understand more names than it offers, so
+/// there the command decides.
+void tellNoOption(Application& application, RunningCommand& command, const Reply& reply,
                   const PromptState& prompt) {
-    const KM_wString message = KM_wString::FormatToString(
+    KM_wString message = KM_wString::FormatToString(
         QnLocalizeString(L"\"%s\" is no option here. The options are %s.\n", 42110),
         reply.answer.text.Array(), optionNames(prompt).Array());
-    application.print((reply.from_script ? label(command) + L": " + message : message).View());
+    if (reply.from_script)
+        message = label(command) + L": " + message;
+    if (prompt.kind == Question::Kind::option)
+        application.print(message.View());
+    else
+        command.likely_mistake = message;
 }
 
 CQuarnGet::result cancel(PromptState& prompt) {
@@ -134,6 +141,7 @@ CQuarnGet::result askQuestion(PromptState& prompt, const char* call) {
         reportBreach(call, "questions may be asked while a command runs");
         return prompt.result;
     }
+    command->likely_mistake.Empty();
     if (takeSelection(prompt.objects)) {
         prompt.result = CQuarnGet::object;
         prompt.command_result = CQuarnCommand::success;

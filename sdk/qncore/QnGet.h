@@ -93,8 +93,8 @@ public:
 };
 
 /// Asks for text. A word is always text; options are clicked, and written `[Name]` in a script.
-/// Where there are options, a word with "_" before it that names none of them is told to be none;
-/// in quotes it is not.
+/// Where there are options, a word with "_" before it that names none of them is told to be none
+/// if the command fails at it; in quotes it is not.
 class QNCORE_API CQuarnGetString : public CQuarnGet {
 public:
     CQuarnGetString();

@@ -220,18 +220,38 @@ TEST_F(PromptTest, AWordAtATextQuestionIsTextAlsoWhenItNamesAnOption) {
     }
 }
 
-TEST_F(PromptTest, AWordLikeAnEnglishOptionOfATextQuestionIsToldToBeNone) {
-    ask<CQuarnGetString>(L"_ShadedViewport",
-                         [](CQuarnGetString& get) { get.AddCommandOption(name(L"Shaded")); });
+TEST_F(PromptTest, AWordLikeAnEnglishOptionOfATextQuestionIsToldToBeNoneWhenTheCommandFailsAtIt) {
+    CQuarnCommand::result ending = CQuarnCommand::success;
+    TestCommand choose(L"Choose", [&](const CQuarnCommandContext&) {
+        CQuarnGetString get;
+        get.AddCommandOption(name(L"Shaded"));
+        get.GetString();
+        text = get.String();
+        return ending;
+    });
+    add(choose);
+    run(L"Choose _ShadedViewport");
     EXPECT_EQ(text, L"_ShadedViewport") << "it is handed on";
-    EXPECT_EQ(printed(), "Ask: \"_ShadedViewport\" is no option here. The options are Shaded.\n");
+    EXPECT_EQ(printed(), "") << "the command understood it";
+    ending = CQuarnCommand::failure;
+    for (const wchar_t* line : {L"Choose _Shaded", L"Choose Garden", L"Choose \"_Garden\""})
+        run(line);
+    EXPECT_EQ(printed(), "");
+    run(L"Choose _ShadedViewport");
+    EXPECT_EQ(printed(),
+              "Choose: \"_ShadedViewport\" is no option here. The options are Shaded.\n");
 }
 
-TEST_F(PromptTest, OtherWordsOfATextQuestionAreNoMistakenOptions) {
-    for (const wchar_t* word : {L"_Shaded", L"Garden", L"\"_Garden\""})
-        ask<CQuarnGetString>(word,
-                             [](CQuarnGetString& get) { get.AddCommandOption(name(L"Shaded")); });
-    ask<CQuarnGetString>(L"_Garden", [](CQuarnGetString&) {});
+TEST_F(PromptTest, AMistakeThatACommandWentOnFromIsNotToldWhenItFailsLater) {
+    TestCommand choose(L"Choose", [&](const CQuarnCommandContext&) {
+        CQuarnGetString get;
+        get.AddCommandOption(name(L"Shaded"));
+        get.GetString();
+        get.GetString();
+        return CQuarnCommand::failure;
+    });
+    add(choose);
+    run(L"Choose _ShadedViewport Garden");
     EXPECT_EQ(printed(), "");
 }
 

@@ -163,12 +163,10 @@ TEST_F(Options, AFileTypeThatIsNoneIsToldAndTheOldOneStays) {
     EXPECT_EQ(L"\"gif\" is no option here. The options are jpg, bmp, png, tga.\n", printed());
 }
 
-TEST_F(Options, UnknownMethodWithUnderscoreIsToldAndFails) {
-    EXPECT_EQ(CQuarnCommand::failure, ask({L"png", L"_ShadedViewport"}));
+TEST_F(Options, UnknownMethodWithUnderscoreFailsWithoutAWord) {
+    EXPECT_EQ(CQuarnCommand::failure, ask({L"png", L"_Rendered"}));
     EXPECT_EQ(L"png", props.FileExtension().View());
     EXPECT_EQ(L"Shaded", props.CaptureMethod().View());
-    EXPECT_THAT(printed(), testing::StartsWith(L"\"_ShadedViewport\" is no option here. "
-                                               L"The options are RenderFull, RenderPreview, "));
     EXPECT_TRUE(printed().find(L"Nothing done") == std::wstring::npos);
 }
 
@@ -333,4 +331,5 @@ TEST_F(GermanOptions, ScriptsInEnglishStillWork) {
     EXPECT_EQ(CQuarnCommand::success, askMethod(L"_RenderFull"));
     EXPECT_EQ(L"RendernVoll", props.CaptureMethod().View());
     EXPECT_TRUE(props.RenderFull());
+    EXPECT_EQ(L"", printed());
 }

@@ -223,6 +223,13 @@ TEST_F(Turntable, ADirectionThatIsNoneIsToldAndTheOneThatIsRememberedIsTaken) {
                                      L"The options are Clockwise, AntiClockwise.\n"));
 }
 
+TEST_F(Turntable, ACaptureMethodThatIsNoneEndsItAndIsTold) {
+    EXPECT_EQ(CQuarnCommand::failure,
+              run(L"SetTurntableAnimation 4 _Enter _jpg _ShadedViewport _Enter _Enter"));
+    EXPECT_THAT(printed(), HasSubstr(L"SetTurntableAnimation: \"_ShadedViewport\" is no option "
+                                     L"here. The options are RenderFull, RenderPreview, "));
+}
+
 TEST_F(Turntable, CancelledDirectionEndsItWithAMessage) {
     record() = marked();
     EXPECT_EQ(CQuarnCommand::cancel, run(L"SetTurntableAnimation 8 _Cancel"));
