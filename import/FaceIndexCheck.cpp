@@ -1,6 +1,6 @@
 #include "import/FaceIndexCheck.h"
 
-#include "import/LineWords.h"
+#include "import/LineReader.h"
 #include "import/ModelFileCheck.h"
 #include "import/PlyHeader.h"
 
@@ -124,7 +124,7 @@ private:
 
 class PlyCheck {
 public:
-    PlyCheck(TextLines& lines, const PlyHeader& header)
+    PlyCheck(LineReader& lines, const PlyHeader& header)
         : m_lines(lines), m_header(header), m_faces(vertexCount(header)) {}
 
     std::string why() {
@@ -207,7 +207,7 @@ private:
                             : std::string();
     }
 
-    TextLines& m_lines;
+    LineReader& m_lines;
     const PlyHeader& m_header;
     FaceCheck m_faces;
 };
@@ -220,7 +220,7 @@ std::string whyBadPlyIndices(const std::filesystem::path& path) {
     if (!header || !header->text) {
         return {};
     }
-    TextLines lines(path);
+    LineReader lines(path);
     for (std::string_view line; lines.next(line) && !line.starts_with("end_header");) {
     }
     return PlyCheck(lines, *header).why();
@@ -302,7 +302,7 @@ private:
         return {};
     }
 
-    TextLines m_lines;
+    LineReader m_lines;
     LineWords m_words{std::string_view()};
 };
 

@@ -47,7 +47,7 @@ TEST_F(ModelCommandsTest, TheAxisThatPointsUpInTheFileIsAnOption) {
 
 TEST_F(ModelCommandsTest, AnUnknownAxisIsToldAndNothingIsRead) {
     EXPECT_EQ(runOn(L"_-Import [Up] _X", triangle), CQuarnCommand::failure);
-    EXPECT_THAT(printed(), HasSubstr("Give ByFormat, Y or Z"));
+    EXPECT_THAT(printed(), HasSubstr("\"_X\" is no option here. The options are ByFormat, Y, Z."));
     EXPECT_TRUE(document().objects().empty());
 }
 

@@ -9,9 +9,9 @@
 namespace quarn {
 
 /// Hands out the lines of a text file one after the other, fast, with little memory.
-class TextLines {
+class LineReader {
 public:
-    explicit TextLines(const std::filesystem::path& path);
+    explicit LineReader(const std::filesystem::path& path);
 
     /// @param line  receives the next line without its line break; valid until the next call
     /// @return false at the end of the file

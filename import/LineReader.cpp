@@ -1,4 +1,4 @@
-#include "import/LineWords.h"
+#include "import/LineReader.h"
 
 #include <cstring>
 
@@ -8,10 +8,10 @@ namespace {
 constexpr std::size_t first_size = std::size_t{1} << 18;
 }
 
-TextLines::TextLines(const std::filesystem::path& path)
+LineReader::LineReader(const std::filesystem::path& path)
     : m_file(path, std::ios::binary), m_bytes(first_size) {}
 
-bool TextLines::next(std::string_view& line) {
+bool LineReader::next(std::string_view& line) {
     std::size_t searched = m_at;
     while (true) {
         const void* const found = std::memchr(&m_bytes[0] + searched, '\n', m_end - searched);
@@ -36,7 +36,7 @@ bool TextLines::next(std::string_view& line) {
 }
 
 /// Moves what is left of the line to the front; a line that fills all of the memory gets more.
-void TextLines::readMore() {
+void LineReader::readMore() {
     const std::size_t known = m_end - m_at;
     std::memmove(&m_bytes[0], &m_bytes[0] + m_at, known);
     if (known == m_bytes.size()) {
