@@ -38,7 +38,7 @@ int main() {
     quarn::ScriptedFrontEnd front_end;
     quarn::DocumentList list(front_end);
     quarn::Document& document = list.openNew();
-    document.objects().addMesh(L"Hills", bench::makeHills(708), nullptr);
+    document.objects().addMesh(L"Hills", {bench::makeHills(708)});
     CQuarnView& view = document.activeView().face();
     int at = 0;
     const auto pick = [&] {

@@ -1,6 +1,6 @@
 #include "desktop/command_line/CommandStarter.h"
 #include "desktop/documents/StartedLine.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 #include "desktop/window/Arguments.h"
 #include "desktop/window/InstalledFiles.h"
 #include "desktop/window/Language.h"

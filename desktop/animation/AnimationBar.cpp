@@ -2,7 +2,7 @@
 
 #include "desktop/animation/ProgressRow.h"
 #include "desktop/command_line/CommandStarter.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 #include "host/session/Session.h"
 #include "sdk/qncore/QnView.h"
 

@@ -1,7 +1,7 @@
 #include "desktop/animation/AnimationSummary.h"
 
 #include "desktop/documents/StartedLine.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <system_error>
 

@@ -1,6 +1,6 @@
 #include "desktop/animation/ProgressRow.h"
 
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QHBoxLayout>
 

@@ -1,6 +1,6 @@
 #include "desktop/command_line/CommandEdit.h"
 
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QKeyEvent>
 #include <QScreen>

@@ -1,6 +1,6 @@
 #include "desktop/command_line/CommandPane.h"
 
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QEvent>
 #include <QPointer>

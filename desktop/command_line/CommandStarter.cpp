@@ -1,7 +1,7 @@
 #include "desktop/command_line/CommandStarter.h"
 
 #include "desktop/front_end/DesktopFrontEnd.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 namespace quarn::desktop {
 

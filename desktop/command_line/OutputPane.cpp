@@ -1,6 +1,6 @@
 #include "desktop/command_line/OutputPane.h"
 
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QFontDatabase>
 #include <QScrollBar>

@@ -1,7 +1,7 @@
 #include "desktop/command_line/PromptStrip.h"
 
 #include "desktop/command_line/FlowLayout.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 #include "host/session/Completion.h"
 
 #include <QHBoxLayout>

@@ -3,7 +3,7 @@
 #include "desktop/dialogs/DialogOwner.h"
 #include "desktop/dialogs/FileBrowser.h"
 #include "desktop/dialogs/MessageBox.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QDir>
 #include <QFileInfo>

@@ -1,7 +1,7 @@
 #include "desktop/dialogs/CityTableModel.h"
 
 #include "desktop/dialogs/PlaceText.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <algorithm>
 

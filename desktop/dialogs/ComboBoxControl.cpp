@@ -1,6 +1,6 @@
 #include "desktop/dialogs/ComboBoxControl.h"
 
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 namespace quarn::desktop {
 

@@ -1,7 +1,7 @@
 #include "desktop/dialogs/FileBrowser.h"
 
 #include "desktop/dialogs/MessageBox.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QDialogButtonBox>
 #include <QDir>

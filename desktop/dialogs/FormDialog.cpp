@@ -2,7 +2,7 @@
 
 #include "desktop/dialogs/FormField.h"
 #include "desktop/dialogs/Mnemonics.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QDialogButtonBox>
 #include <QFormLayout>

@@ -2,7 +2,7 @@
 
 #include "desktop/dialogs/FieldMark.h"
 #include "desktop/dialogs/Mnemonics.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QComboBox>
 #include <QDateEdit>

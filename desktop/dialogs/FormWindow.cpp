@@ -4,7 +4,7 @@
 #include "desktop/dialogs/DialogOwner.h"
 #include "desktop/dialogs/FormDialog.h"
 #include "desktop/dialogs/FormField.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QEventLoop>
 #include <QPointer>

@@ -5,7 +5,7 @@
 #include "desktop/dialogs/FieldMark.h"
 #include "desktop/dialogs/PlaceText.h"
 #include "desktop/dialogs/WorldMap.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QHBoxLayout>
 #include <QHeaderView>

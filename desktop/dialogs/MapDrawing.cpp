@@ -1,7 +1,7 @@
 #include "desktop/dialogs/MapDrawing.h"
 
 #include "desktop/dialogs/Coastlines.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QLinearGradient>
 

@@ -1,7 +1,7 @@
 #include "desktop/dialogs/MessageBox.h"
 
 #include "desktop/dialogs/DialogOwner.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QMessageBox>
 #include <QPointer>

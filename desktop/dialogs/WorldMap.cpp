@@ -2,7 +2,7 @@
 
 #include "desktop/dialogs/MapDrawing.h"
 #include "desktop/dialogs/PlaceText.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QKeyEvent>
 #include <QMouseEvent>

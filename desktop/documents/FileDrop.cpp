@@ -3,7 +3,7 @@
 #include "desktop/command_line/CommandStarter.h"
 #include "desktop/documents/StartedLine.h"
 #include "desktop/documents/UnsavedChanges.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QDragEnterEvent>
 #include <QDropEvent>

@@ -2,7 +2,7 @@
 
 #include "desktop/command_line/CommandStarter.h"
 #include "desktop/documents/StartedLine.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 #include "host/session/DocumentState.h"
 
 #include <QMessageBox>

@@ -1,6 +1,6 @@
 #include "desktop/render/RenderPictureWindow.h"
 
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 #include "desktop/render/PictureSheet.h"
 
 #include <QAction>

@@ -1,6 +1,6 @@
 #include "desktop/views/OpenViews.h"
 
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 #include "host/session/ViewFrame.h"
 
 namespace quarn::desktop {

@@ -1,6 +1,6 @@
 #include "desktop/views/SizeMenu.h"
 
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 namespace quarn::desktop {
 

@@ -1,7 +1,7 @@
 #include "desktop/views/ViewMenu.h"
 
 #include "desktop/command_line/CommandStarter.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 #include "desktop/views/OpenViews.h"
 #include "desktop/views/SizeMenu.h"
 #include "desktop/views/ViewWidget.h"

@@ -2,7 +2,7 @@
 
 #include "desktop/command_line/CommandPane.h"
 #include "desktop/command_line/CommandStarter.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 #include "desktop/views/OpenViews.h"
 #include "desktop/views/PickLines.h"
 #include "desktop/views/ViewDrawing.h"

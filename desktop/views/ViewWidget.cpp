@@ -1,6 +1,6 @@
 #include "desktop/views/ViewWidget.h"
 
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 #include "desktop/views/PicturePlace.h"
 
 #include <QPainter>

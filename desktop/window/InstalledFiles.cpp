@@ -1,6 +1,6 @@
 #include "desktop/window/InstalledFiles.h"
 
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 
 #include <QCoreApplication>
 

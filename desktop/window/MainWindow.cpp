@@ -11,7 +11,7 @@
 #include "desktop/documents/RecentFiles.h"
 #include "desktop/documents/UnsavedChanges.h"
 #include "desktop/documents/WindowClosing.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 #include "desktop/menus/CommandMenus.h"
 #include "desktop/render/RenderPictureWindow.h"
 #include "desktop/views/ViewArea.h"

@@ -1,7 +1,7 @@
 #include "desktop/window/WindowActions.h"
 
 #include "desktop/animation/AnimationBar.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 #include "desktop/menus/CommandMenus.h"
 #include "desktop/views/SizeMenu.h"
 #include "desktop/views/ViewArea.h"

@@ -34,7 +34,7 @@ struct RunningCommand {
     std::deque<CommandWord> words; ///< the answers that are left
     bool typed = false;            ///< as in CommandOrigin
     int pictures_written = 0;
-    KM_wString likely_mistake; ///< in its last answer; told when the command fails at it
+    KM_wString likely_mistake{}; ///< in its last answer; told when the command fails at it
 
     /// What messages about its answers begin with: its place and its name.
     std::wstring label() const;

@@ -1,4 +1,5 @@
 // The recordings whose sun moves, and the places that they know.
+#include "host/cities/Cities.h"
 #include "quarn/arguments/Readings.h"
 #include "quarn/arguments/RecordingArguments.h"
 #include "quarn/arguments/Subcommands.h"

@@ -48,7 +48,7 @@ std::optional<CaptureMode> captureMode(std::string_view name) {
 std::string captureModeNames(CaptureSubject subject) {
     std::string names;
     for (const CaptureMode& mode : captureModes())
-        if (subject != CaptureSubject::moving_sun || mode.draws_sun_studies)
+        if (subject != CaptureSubject::moving_sun || mode.suits_sun_studies)
             names += (names.empty() ? "" : ", ") + mode.name;
     return names;
 }

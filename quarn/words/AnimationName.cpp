@@ -1,6 +1,7 @@
 #include "quarn/words/AnimationName.h"
 
 #include "quarn/words/Words.h"
+#include "sdk/qncore/QnAnimationName.h"
 
 #include <algorithm>
 

@@ -31,11 +31,6 @@ quarn::SessionOptions optionsFor(const std::string& language) {
 
 NSAutoreleasePool* startedPool() {
     NSAutoreleasePool* const pool = [[NSAutoreleasePool alloc] init];
-    // GNUstep's own title bar, since no window manager runs here; and no icon of the program.
-    NSDictionary* const settings =
-        [NSDictionary dictionaryWithObjectsAndKeys:@"NO", @"GSX11HandlesWindowDecorations", @"YES",
-                                                   @"GSSuppressAppIcon", nil];
-    [[NSUserDefaults standardUserDefaults] registerDefaults:settings];
     [NSApplication sharedApplication];
     return pool;
 }

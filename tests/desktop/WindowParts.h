@@ -2,7 +2,7 @@
 
 #include "desktop/command_line/CommandStarter.h"
 #include "desktop/front_end/DesktopFrontEnd.h"
-#include "desktop/locale/Texts.h"
+#include "desktop/texts/Texts.h"
 #include "host/session/Session.h"
 #include "tests/support/TempFolder.h"
 

@@ -87,7 +87,9 @@ TEST(Exports, TheGeometryToolkitShowsWhatItsHeadersDeclare) {
 TEST(Exports, TheHostShowsItsInterfaceAndThePublishedFrontEnd) {
     const std::string interface =
         declarationsBelow(QUARN_SOURCE_DIR "/sdk") + declarationsBelow(QUARN_SOURCE_DIR "/kelmar");
-    const std::string front_end = declarationsBelow(QUARN_SOURCE_DIR "/host/front_end");
+    std::string front_end;
+    for (const std::string room : {"front_end", "session", "cities"})
+        front_end += declarationsBelow(QUARN_SOURCE_DIR "/host/" + room);
     ASSERT_FALSE(exportedSymbols(QNCORE_LIBRARY).empty());
     EXPECT_EQ(strangersIn(QNCORE_LIBRARY,
                           [&](const auto& symbol) {

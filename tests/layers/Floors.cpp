@@ -37,7 +37,7 @@ const Places PROGRAM = {"sdk/", "host/session/", "host/front_end/", "host/cities
 const Places BELOW_SESSIONS = PROGRAM + "quarn/words/" + "quarn/terminal/";
 const Places BELOW_RUNS = PROGRAM + "quarn/words/" + "quarn/session/" + "quarn/scripts/";
 
-const Places BELOW_PORT = PROGRAM + "desktop/locale/";
+const Places BELOW_PORT = PROGRAM + "desktop/texts/";
 const Places BELOW_STARTER = BELOW_PORT + "desktop/front_end/";
 const Places BELOW_BARS = BELOW_STARTER + "desktop/command_line/";
 const Places BELOW_WINDOW = BELOW_BARS + "desktop/dialogs/" + "desktop/render/" +
@@ -95,9 +95,9 @@ const Room FLOORS[] = {
      {},
      standard},
 
-    {11, "vexui/locale/", INTERFACE},
-    {11, "vexui/forms/", INTERFACE + "vexui/locale/"},
-    {11, "vexui/", INTERFACE + "vexui/locale/" + "vexui/forms/"},
+    {11, "vexui/texts/", INTERFACE},
+    {11, "vexui/forms/", INTERFACE + "vexui/texts/"},
+    {11, "vexui/", INTERFACE + "vexui/texts/" + "vexui/forms/"},
 
     {11, "quarn/words/", {"sdk/"}},
     {11, "quarn/terminal/", {"quarn/words/"}},
@@ -109,7 +109,7 @@ const Room FLOORS[] = {
     {11, "quarn/arguments/", BELOW_RUNS + "quarn/runs/" + "quarn/reports/" + "quarn/console/"},
     {11, "quarn/main.cpp", {"quarn/arguments/", "quarn/terminal/"}},
 
-    {11, "desktop/locale/", PROGRAM},
+    {11, "desktop/texts/", PROGRAM},
     {11, "desktop/front_end/", BELOW_PORT},
     {11, "desktop/command_line/", BELOW_STARTER},
     {11, "desktop/dialogs/", BELOW_STARTER},

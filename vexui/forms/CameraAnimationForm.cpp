@@ -2,7 +2,7 @@
 
 #include "vexui/forms/CountField.h"
 #include "vexui/forms/StudyFrames.h"
-#include "vexui/locale/LocalText.h"
+#include "vexui/texts/LocalText.h"
 
 #include <QComboBox>
 #include <QFormLayout>

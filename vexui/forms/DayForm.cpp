@@ -1,6 +1,6 @@
 #include "vexui/forms/DayForm.h"
 
-#include "vexui/locale/LocalText.h"
+#include "vexui/texts/LocalText.h"
 
 #include <QDateEdit>
 #include <QFormLayout>

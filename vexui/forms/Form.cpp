@@ -2,7 +2,7 @@
 
 #include "vexui/forms/CountField.h"
 #include "vexui/forms/FirstChoices.h"
-#include "vexui/locale/LocalText.h"
+#include "vexui/texts/LocalText.h"
 
 #include <QComboBox>
 #include <QDialogButtonBox>

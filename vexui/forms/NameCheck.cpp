@@ -1,7 +1,7 @@
 #include "vexui/forms/NameCheck.h"
 
 #include "sdk/qncore/QnAnimationName.h"
-#include "vexui/locale/LocalText.h"
+#include "vexui/texts/LocalText.h"
 
 #include <algorithm>
 

@@ -4,7 +4,7 @@
 #include "sdk/qncore/QnLocationDialog.h"
 #include "sdk/zel/QnZone.h"
 #include "vexui/forms/NumberField.h"
-#include "vexui/locale/LocalText.h"
+#include "vexui/texts/LocalText.h"
 
 #include <QLabel>
 

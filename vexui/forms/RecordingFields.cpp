@@ -1,6 +1,6 @@
 #include "vexui/forms/RecordingFields.h"
 
-#include "vexui/locale/LocalText.h"
+#include "vexui/texts/LocalText.h"
 
 #include <QComboBox>
 #include <QLineEdit>

@@ -1,6 +1,6 @@
 #include "vexui/forms/StudyFrames.h"
 
-#include "vexui/locale/LocalText.h"
+#include "vexui/texts/LocalText.h"
 
 #include <QLocale>
 

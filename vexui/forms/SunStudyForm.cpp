@@ -2,7 +2,7 @@
 
 #include "vexui/forms/CountField.h"
 #include "vexui/forms/NumberField.h"
-#include "vexui/locale/LocalText.h"
+#include "vexui/texts/LocalText.h"
 
 #include <QDateEdit>
 #include <QFormLayout>

@@ -27,7 +27,6 @@ const std::map<std::string, std::string> NOT_RUN = {
     {"build/release/bin/quarn-desktop model.glb", "a window; its tests are desktop_window_tests"},
     {"quarn console --language <language>", "a person chooses the language"},
     {"quarn flythrough --camera-curve walk.txt", "names an option of a command in a sentence"},
-    {"quarn turntable model.glb", "names the first step of a recording in a sentence"},
     {"quarn turntable ... --show-script", "names an option of a command in a sentence"},
 };
 

@@ -3,6 +3,7 @@
 #include "zoetrix/ui/ZoetrixDataUI.h"
 
 #include <cstdlib>
+#include <dlfcn.h>
 
 namespace {
 

@@ -1,4 +1,4 @@
-#include "vexui/locale/LocalText.h"
+#include "vexui/texts/LocalText.h"
 
 #include "sdk/qncore/QnLocalize.h"
 
