@@ -1,7 +1,7 @@
 #include "desktop/render/RenderPictureWindow.h"
 
-#include "desktop/texts/Texts.h"
 #include "desktop/render/PictureSheet.h"
+#include "desktop/texts/Texts.h"
 
 #include <QAction>
 #include <QActionGroup>

@@ -1,8 +1,8 @@
 #include "desktop/window/WindowActions.h"
 
 #include "desktop/animation/AnimationBar.h"
-#include "desktop/texts/Texts.h"
 #include "desktop/menus/CommandMenus.h"
+#include "desktop/texts/Texts.h"
 #include "desktop/views/SizeMenu.h"
 #include "desktop/views/ViewArea.h"
 #include "desktop/window/MainWindow.h"

@@ -21,7 +21,7 @@ std::vector<Include> includesOf(const std::string& source);
 ///
 /// @param file     the including file, relative to the project root, with `/` as separator
 /// @param include  one of its includes
-/// @return true where the dependency rules of CONTRIBUTING.md allow it; a quoted path must be
+/// @return true where the floors (Floors.h) allow it; a quoted path must be
 ///         relative to the project root
 bool isAllowed(const std::string& file, const Include& include);
 
