@@ -22,7 +22,8 @@ struct CQuarnCommandOptionValue {
 /// @param id       the text's fixed number in the string tables; 0 is never looked up
 /// @return a text that stays valid until the program ends; for id 0, or an id that no table holds,
 ///         `english` itself, and so on another thread than the main one, which is a breach of the
-///         interface. Strings, option names and option values are separate tables.
+///         interface, and where the table's text takes other arguments of KM_wString::Format than
+///         `english` does. Strings, option names and option values are separate tables.
 QNCORE_API const wchar_t* QnLocalizeString(const wchar_t* english, int id);
 
 /// An option name with its local form; as QnLocalizeString otherwise.

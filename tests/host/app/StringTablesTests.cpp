@@ -143,6 +143,18 @@ TEST(Localize, ATextIsLookedUpByItsNumberAndFallsBackToEnglish) {
     EXPECT_STREQ(QnLocalizeCommandOptionValue(english, 0).m_local, L"Seven");
 }
 
+TEST(Localize, ATextThatAsksForOtherArgumentsThanTheEnglishOneIsLeftOut) {
+    const auto tables_folder = folder("greedy_table");
+    writeTable(tables_folder / "de.json",
+               R"({"strings": {"7": "%s %s %s", "8": "%s", "9": "%d"}})");
+    ScriptedFrontEnd front_end;
+    Session session(front_end, {{}, {tables_folder}, "de", {}});
+    EXPECT_STREQ(QnLocalizeString(L"%s is open", 7), L"%s is open");
+    EXPECT_STREQ(QnLocalizeString(L"%ls is open", 8), L"%s");
+    EXPECT_STREQ(QnLocalizeString(L"%s is open", 9), L"%s is open");
+    EXPECT_STREQ(QnLocalizeString(L"is open", 8), L"is open");
+}
+
 TEST(Localize, AMalformedHostTableIsToldAndTheHostStartsInEnglish) {
     const auto tables_folder = folder("bad_host_table");
     writeTable(tables_folder / "de.json", "{ not json");
