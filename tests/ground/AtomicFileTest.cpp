@@ -4,8 +4,13 @@
 #include "tests/support/TempFolder.h"
 
 #include <gmock/gmock.h>
+
+#include <fcntl.h>
 #include <iterator>
+#include <linux/fs.h>
+#include <sys/ioctl.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 namespace quarn::test {
 namespace {
@@ -120,6 +125,43 @@ TEST(AtomicFile, SomebodyElsesFileThatThisUserMayNotWriteIsProtected) {
                writeFileAtomically(path, bytesOf("new"), Protection::overridden).ok();
     }));
     EXPECT_EQ(readFile(path), "new");
+}
+
+/// A file that the system lets nobody change, root neither, as long as this lives.
+class ImmutableFile {
+public:
+    explicit ImmutableFile(const fs::path& path)
+        : m_file(open(path.c_str(), O_RDONLY | O_CLOEXEC)) {
+        m_is_set = setFlags(FS_IMMUTABLE_FL);
+    }
+    ~ImmutableFile() {
+        setFlags(0);
+        close(m_file);
+    }
+    ImmutableFile(const ImmutableFile&) = delete;
+    ImmutableFile& operator=(const ImmutableFile&) = delete;
+    bool isSet() const { return m_is_set; }
+
+private:
+    bool setFlags(int flags) const { return ioctl(m_file, FS_IOC_SETFLAGS, &flags) == 0; }
+    int m_file;
+    bool m_is_set = false;
+};
+
+TEST(AtomicFile, FileThatTheSystemLetsNobodyReplaceIsToldAndStays) {
+    const TempFolder folder;
+    const fs::path path = folder / "a.txt";
+    writeFile(path, "old");
+    {
+        const ImmutableFile immutable(path);
+        if (!immutable.isSet())
+            GTEST_SKIP() << "the disk, or this user, cannot protect a file so";
+        const auto written = writeFileAtomically(path, bytesOf("new"), Protection::overridden);
+        ASSERT_FALSE(written.ok());
+        EXPECT_THAT(written.message(), HasSubstr("the system does not let it be replaced"));
+    }
+    EXPECT_EQ(readFile(path), "old");
+    EXPECT_EQ(std::distance(fs::directory_iterator(folder.path()), fs::directory_iterator()), 1);
 }
 
 // ---- Folders that cannot be flushed
