@@ -2,6 +2,8 @@
 
 #include "desktop/texts/Texts.h"
 
+#include <QStringList>
+
 namespace quarn::desktop {
 
 namespace {
