@@ -1,21 +1,19 @@
 #include "ground/AtomicFile.h"
 
+#include "ground/FileLinks.h"
+#include "ground/FileRights.h"
+#include "ground/PartFile.h"
+
 #include <cerrno>
 #include <cstring>
 #include <fcntl.h>
-#include <string>
 #include <sys/stat.h>
 #include <unistd.h>
-#include <utility>
 
 namespace quarn {
 namespace {
 
 namespace fs = std::filesystem;
-
-Error cannotWrite(const fs::path& path, const std::string& why) {
-    return {"Cannot write '" + path.string() + "': " + why + "."};
-}
 
 std::string adviceFor(int code) {
     switch (code) {
@@ -39,111 +37,109 @@ std::string adviceFor(int code) {
     }
 }
 
-/// A file under a temporary name, which goes away unless it is renamed.
-class PartFile {
-public:
-    explicit PartFile(const fs::path& folder) {
-        constexpr int most_tries = 100; // of names that a killed program may have left
-        for (int i = 0; i < most_tries && m_descriptor < 0; ++i) {
-            m_path =
-                folder / (".quarn-" + std::to_string(getpid()) + "-" + std::to_string(i) + ".part");
-            m_descriptor = open(m_path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
-            if (m_descriptor < 0 && errno != EEXIST) {
-                break;
-            }
-        }
-        m_exists = m_descriptor >= 0;
-    }
+/// Where the bytes go.
+struct Target {
+    fs::path asked; ///< as the caller names it, perhaps a link
+    fs::path file;
+    struct stat present {};
+    bool replaces = false;
 
-    PartFile(const PartFile&) = delete;
-    PartFile& operator=(const PartFile&) = delete;
-
-    ~PartFile() {
-        close();
-        if (m_exists) {
-            unlink(m_path.c_str());
-        }
-    }
-
-    bool isOpen() const { return m_descriptor >= 0; }
-
-    void setPermissionsOf(const struct stat& file) const {
-        if (fchmod(m_descriptor, file.st_mode & 07777) != 0) {
-            return; // a file system without permissions; the content counts
-        }
-    }
-
-    bool write(std::span<const std::byte> bytes) const {
-        while (!bytes.empty()) {
-            const ssize_t written = ::write(m_descriptor, bytes.data(), bytes.size());
-            if (written < 0 && errno == EINTR) {
-                continue;
-            }
-            if (written <= 0) {
-                return false;
-            }
-            bytes = bytes.subspan(static_cast<std::size_t>(written));
-        }
-        return true;
-    }
-
-    bool flushToDisk() const { return fsync(m_descriptor) == 0; }
-
-    /// False where the last bytes could not be written.
-    bool close() {
-        const int descriptor = std::exchange(m_descriptor, -1);
-        return descriptor < 0 || ::close(descriptor) == 0;
-    }
-
-    bool renameTo(const fs::path& path) {
-        m_exists = rename(m_path.c_str(), path.c_str()) != 0;
-        return !m_exists;
-    }
-
-private:
-    fs::path m_path;
-    int m_descriptor = -1;
-    bool m_exists = false;
+    fs::path folder() const { return file.has_parent_path() ? file.parent_path() : fs::path("."); }
 };
 
-bool flushFolder(const fs::path& folder) {
+Error cannotWrite(const fs::path& path, const std::string& why) {
+    return {"Cannot write '" + path.string() + "': " + why + "."};
+}
+
+Error cannotWrite(const Target& target, const std::string& why) {
+    const bool is_link = target.file != target.asked;
+    return cannotWrite(target.asked,
+                       is_link ? "it is a link to '" + target.file.string() + "': " + why : why);
+}
+
+Result<Target> targetOf(const fs::path& path, Protection protection) {
+    Target target{path, path};
+    target.replaces = stat(path.c_str(), &target.present) == 0;
+    const mode_t mode = target.present.st_mode;
+    if (target.replaces && !S_ISREG(mode))
+        return cannotWrite(path, S_ISDIR(mode) ? "there is a folder of this name"
+                                               : "it is not an ordinary file");
+    Result<fs::path> file = fileBehindLinks(path);
+    if (!file)
+        return cannotWrite(path, file.message());
+    target.file = std::move(file.value());
+    if (target.replaces && protection == Protection::respected && isWriteProtected(target.file))
+        return cannotWrite(target,
+                           "it is write-protected; allow writing to it or choose another name");
+    return target;
+}
+
+enum class Flush { no, yes };
+
+Result<void> write(const Target& target, std::span<const std::byte> bytes, Flush flush) {
+    constexpr mode_t of_new_files = 0666; // less what the user's mask takes away
+    constexpr mode_t of_nobody_else = 0600;
+    PartFile part(target.folder(), target.replaces ? of_nobody_else : of_new_files);
+    if (part.isOpen() && target.replaces)
+        takeOverRights(target.file, target.present, part.descriptor());
+    const bool wrote = part.isOpen() && part.write(bytes) &&
+                       (flush == Flush::no || part.flushToDisk()) && part.close();
+    if (!wrote)
+        return cannotWrite(target, adviceFor(errno));
+    if (part.renameTo(target.file))
+        return {};
+    const bool is_forbidden = errno == EPERM || errno == EACCES;
+    return cannotWrite(target, target.replaces && is_forbidden
+                                   ? "the system does not let it be replaced; choose another name"
+                                   : adviceFor(errno));
+}
+
+/// @return why it could not be done; empty when it was
+std::string flushFolder(const fs::path& folder) {
     const int descriptor = open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-    if (descriptor < 0) {
-        return false;
-    }
+    if (descriptor < 0)
+        return std::strerror(errno);
+    // On some disks folders need no flushing, and on others they cannot change.
     const bool flushed = fsync(descriptor) == 0 || errno == EINVAL || errno == EROFS;
+    const std::string why = flushed ? "" : std::strerror(errno);
     close(descriptor);
-    return flushed;
+    return why;
 }
 
 } // namespace
 
 Result<void> writeFileAtomically(const fs::path& path, std::span<const std::byte> bytes,
-                                 FileSync sync) {
-    const auto failure = [&path] { return cannotWrite(path, adviceFor(errno)); };
-    struct stat present {};
-    const bool replaces = stat(path.c_str(), &present) == 0;
-    if (replaces && !S_ISREG(present.st_mode)) {
-        return cannotWrite(path, S_ISDIR(present.st_mode) ? "there is a folder of this name"
-                                                          : "it is not an ordinary file");
+                                 Protection protection) {
+    const Result<Target> target = targetOf(path, protection);
+    return target ? write(target.value(), bytes, Flush::no) : target.error();
+}
+
+Result<WrittenFile> writeFileToDisk(const fs::path& path, std::span<const std::byte> bytes,
+                                    Protection protection) {
+    const Result<Target> target = targetOf(path, protection);
+    if (!target)
+        return target.error();
+    const fs::path folder = target.value().folder();
+    removeLeftParts(folder);
+    if (const Result<void> written = write(target.value(), bytes, Flush::yes); !written)
+        return written.error();
+    const std::string trouble = flushFolder(folder);
+    if (trouble.empty())
+        return WrittenFile();
+    return WrittenFile{"'" + path.string() +
+                       "' is written, but its folder could not be flushed to the disk (" + trouble +
+                       "): if the machine stops within moments, the file of before may be back."};
+}
+
+bool isWriteProtected(const fs::path& path) {
+    struct stat status {};
+    if (stat(path.c_str(), &status) != 0 || !S_ISREG(status.st_mode))
+        return false;
+    if (geteuid() == 0) {
+        const mode_t wanted = status.st_uid == 0 ? S_IWUSR : S_IWUSR | S_IWGRP | S_IWOTH;
+        return (status.st_mode & wanted) == 0;
     }
-    const fs::path folder = path.has_parent_path() ? path.parent_path() : fs::path(".");
-    PartFile part(folder);
-    if (!part.isOpen()) {
-        return failure();
-    }
-    if (replaces) {
-        part.setPermissionsOf(present);
-    }
-    const bool wrote =
-        part.write(bytes) && (sync == FileSync::no || part.flushToDisk()) && part.close();
-    if (!wrote || !part.renameTo(path)) {
-        return failure();
-    }
-    if (sync == FileSync::yes && !flushFolder(folder)) {
-        return failure();
-    }
-    return {};
+    return faccessat(AT_FDCWD, path.c_str(), W_OK, AT_EACCESS) != 0 && errno == EACCES;
 }
 
 } // namespace quarn

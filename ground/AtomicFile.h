@@ -5,21 +5,50 @@
 #include <cstddef>
 #include <filesystem>
 #include <span>
+#include <string>
 
 namespace quarn {
 
-/// Whether a written file must be on the disk, and not only on its way there, before the call ends.
-enum class FileSync { no, yes };
+/// Whether a file that is protected from writing keeps what it holds, or is replaced all the same.
+enum class Protection { respected, overridden };
 
 /// Writes a file so that it appears whole or not at all: the bytes go to a temporary name in the
-/// same folder, which is then renamed. A file that was there before is replaced and keeps its
-/// permissions; after a failure it is untouched, and no temporary file stays.
+/// same folder, which is then renamed. After a failure a file that was there before is untouched,
+/// and no temporary file stays.
 ///
-/// @param path   its folder must exist; must not name anything but an ordinary file
-/// @param sync   yes also flushes the file and its folder to the disk
+/// A path that is a symbolic link means the file that it leads to (fileBehindLinks): the links
+/// stay, and a file that is not there yet is made.
+///
+/// A file that was there before keeps its permissions, owner, group, access list and the user's own
+/// attributes. Where the owner or the group cannot be kept, nobody has more rights than before; the
+/// rights to run a program as its owner or group are never kept. Other hard links go on naming the
+/// former content: a file that several names share cannot be replaced whole.
+///
+/// @param path        the folder must exist; must not name anything but an ordinary file
+/// @param protection  whether isWriteProtected keeps the file from being replaced
 /// @return an error that names the file and why it could not be written: the folder is missing, no
-///   permission, the disk is full, ...
+///   permission, write-protected, the disk is full, the links lead nowhere, ...
 Result<void> writeFileAtomically(const std::filesystem::path& path,
-                                 std::span<const std::byte> bytes, FileSync sync = FileSync::no);
+                                 std::span<const std::byte> bytes,
+                                 Protection protection = Protection::respected);
+
+/// A file that stands written.
+struct WrittenFile {
+    /// A sentence for the person where it is not sure that the file is on the disk; else empty.
+    std::string warning;
+};
+
+/// Writes a file as writeFileAtomically does, and has it on the disk, and not only on its way
+/// there, before the call ends. What programs of this machine that have ended left behind in the
+/// folder under temporary names is removed.
+/// @return as writeFileAtomically; where the folder alone could not be flushed to the disk the file
+///   is written, with a warning
+Result<WrittenFile> writeFileToDisk(const std::filesystem::path& path,
+                                    std::span<const std::byte> bytes,
+                                    Protection protection = Protection::respected);
+
+/// Whether the file that a path leads to is there and protected from writing by this user. Root may
+/// write everything: to it a file is protected that nobody may write, or its own that it may not.
+bool isWriteProtected(const std::filesystem::path& path);
 
 } // namespace quarn

@@ -4,6 +4,7 @@
 #include <cstring>
 #include <fcntl.h>
 #include <new>
+#include <string>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -59,7 +60,7 @@ Error reason(int code) {
 
 } // namespace
 
-Result<FileBytes> readFileBytes(const std::filesystem::path& path) {
+Result<FileBytes> readFileBytes(const std::filesystem::path& path, std::size_t most_bytes) {
     const OpenFile file(path);
     struct stat status {};
     if (!file.isOpen() || !file.status(status))
@@ -67,6 +68,8 @@ Result<FileBytes> readFileBytes(const std::filesystem::path& path) {
     if (!S_ISREG(status.st_mode))
         return Error{S_ISDIR(status.st_mode) ? "it is a folder" : "it is not an ordinary file"};
     const auto size = static_cast<std::size_t>(status.st_size);
+    if (size > most_bytes)
+        return Error{"it has more than " + std::to_string(most_bytes) + " bytes"};
     std::unique_ptr<std::uint8_t[]> bytes(new (std::nothrow) std::uint8_t[size]);
     if (!bytes)
         return Error{"there is too little memory for it"};

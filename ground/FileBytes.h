@@ -4,6 +4,7 @@
 
 #include <cstdint>
 #include <filesystem>
+#include <limits>
 #include <memory>
 #include <span>
 
@@ -24,8 +25,10 @@ private:
 };
 
 /// Reads a whole file.
-/// @return an error, part of a sentence: it is missing, no ordinary file, not readable, or too
-///         large for the memory
-Result<FileBytes> readFileBytes(const std::filesystem::path& file);
+/// @param most_bytes  a longer file is not read
+/// @return an error, part of a sentence: it is missing, no ordinary file, not readable, too long,
+///         or too large for the memory
+Result<FileBytes> readFileBytes(const std::filesystem::path& file,
+                                std::size_t most_bytes = std::numeric_limits<std::size_t>::max());
 
 } // namespace quarn

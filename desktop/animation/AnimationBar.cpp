@@ -58,6 +58,7 @@ void AnimationBar::buildControls() {
     m_row->addWidget(m_number);
     m_date = new QLabel(this);
     m_date->setObjectName("frameDate");
+    m_date->setTextFormat(Qt::PlainText);
     m_row->addWidget(m_date);
 
     m_record = addButton(

@@ -1,6 +1,7 @@
 #include "desktop/command_line/PromptStrip.h"
 
 #include "desktop/command_line/FlowLayout.h"
+#include "desktop/texts/PlainTip.h"
 #include "desktop/texts/Texts.h"
 #include "host/session/Completion.h"
 
@@ -86,7 +87,7 @@ void PromptStrip::setQuestion(const Question& question) {
     m_prompt->setText(promptHtml(question));
     m_ok->setToolTip(
         has_default && !question.accepts_nothing
-            ? localized(L"Takes %1 (Enter)", 45107).arg(qtText(*question.default_answer))
+            ? plainTip(localized(L"Takes %1 (Enter)", 45107).arg(qtText(*question.default_answer)))
             : localized(L"Goes on (Enter)", 45108));
     showObjects(question);
     showOptions(question);
@@ -105,7 +106,7 @@ void PromptStrip::showOptions(const Question& question) {
     }
     for (const QuestionOption& option : question.options) {
         auto* const button = new QPushButton(plainCaption(shortened(optionText(option))));
-        button->setToolTip(optionText(option));
+        button->setToolTip(plainTip(optionText(option)));
         button->setObjectName("option_" + qtText(option.english_name));
         const QString answer = optionAnswer(question.kind, option);
         connect(button, &QPushButton::clicked, this, [this, answer] { emit answered(answer); });

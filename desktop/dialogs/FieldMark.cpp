@@ -1,5 +1,7 @@
 #include "desktop/dialogs/FieldMark.h"
 
+#include "desktop/texts/PlainTip.h"
+
 #include <QAction>
 #include <QLineEdit>
 #include <QPainter>
@@ -58,7 +60,7 @@ void markField(QLineEdit& field, const QString& why) {
     if (!mark)
         mark = addMark(field);
     mark->setText(why);
-    mark->setToolTip(why);
+    mark->setToolTip(plainTip(why));
     field.setAccessibleDescription(why);
 }
 

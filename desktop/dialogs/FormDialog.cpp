@@ -2,6 +2,7 @@
 
 #include "desktop/dialogs/FormField.h"
 #include "desktop/dialogs/Mnemonics.h"
+#include "desktop/texts/PlainTip.h"
 #include "desktop/texts/Texts.h"
 
 #include <QDialogButtonBox>
@@ -23,8 +24,9 @@ QStringList labelsOf(const DialogTemplate& form) {
 
 QLabel* makeLabel(const QString& text, const DialogControl& control, QWidget* field) {
     auto* const label = new QLabel(text, field->parentWidget());
+    label->setTextFormat(Qt::PlainText);
     label->setBuddy(field);
-    label->setToolTip(qtText(control.hint));
+    label->setToolTip(plainTip(qtText(control.hint)));
     return label;
 }
 

@@ -2,6 +2,7 @@
 
 #include "desktop/dialogs/FieldMark.h"
 #include "desktop/dialogs/Mnemonics.h"
+#include "desktop/texts/PlainTip.h"
 #include "desktop/texts/Texts.h"
 
 #include <QComboBox>
@@ -121,7 +122,7 @@ void showTime(QTimeEdit& field, const QTime& time) {
 QWidget* makeField(const DialogControl& control, QWidget* parent) {
     QWidget* const field = makeWidget(control, parent);
     field->setObjectName(QString("control%1").arg(control.id));
-    field->setToolTip(qtText(control.hint));
+    field->setToolTip(plainTip(qtText(control.hint)));
     field->setAccessibleName(withoutMnemonic(qtText(control.label)));
     return field;
 }

@@ -56,6 +56,7 @@ UnsavedChanges::Choice UnsavedChanges::askPerson() {
                     localized(L"Save the changes to %1?", 45252).arg(nameOf(m_session.document())),
                     QMessageBox::NoButton, &m_window);
     box.setObjectName("unsavedChanges");
+    box.setTextFormat(Qt::PlainText);
     box.setInformativeText(localized(L"Without saving they are lost.", 45253));
     QPushButton* const save = box.addButton(localized(L"&Save", 45254), QMessageBox::AcceptRole);
     QPushButton* const discard =

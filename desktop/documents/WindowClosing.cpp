@@ -34,6 +34,7 @@ bool WindowClosing::askToStop() {
                     localized(L"%1 has not finished.", 45257).arg(name), QMessageBox::NoButton,
                     &m_window);
     box.setObjectName("commandRuns");
+    box.setTextFormat(Qt::PlainText);
     QPushButton* const stop =
         box.addButton(localized(L"&Stop it and close", 45258), QMessageBox::AcceptRole);
     QPushButton* const go_on =

@@ -159,7 +159,7 @@ void MainWindow::showTitle() {
     CQuarnDoc& document = m_session.document();
     const std::filesystem::path file = documentFile(document);
     const QString name = file.empty() ? localized(L"New document", 45022) : qtText(file.filename());
-    setWindowTitle(name + "[*] – Quarn");
+    setWindowTitle(QString(name).replace("[*]", "[*][*]") + "[*] – Quarn"); // the mark of changes
     setWindowModified(isModified(document));
     setWindowFilePath(file.empty() ? QString() : qtText(file));
 }

@@ -64,7 +64,8 @@ Result<std::vector<std::byte>> encodeImage(const ImageView& image, ImageFormat f
     return bytes;
 }
 
-Result<void> writeImageFile(const std::filesystem::path& path, const ImageView& image) {
+Result<void> writeImageFile(const std::filesystem::path& path, const ImageView& image,
+                            Protection protection) {
     const auto format = imageFormatFor(path.extension().string());
     if (!format) {
         return Error{"Cannot write '" + path.string() + "': pictures of the kind '" +
@@ -74,7 +75,7 @@ Result<void> writeImageFile(const std::filesystem::path& path, const ImageView& 
     if (!encoded) {
         return Error{"Cannot write '" + path.string() + "': " + encoded.message() + "."};
     }
-    return writeFileAtomically(path, encoded.value());
+    return writeFileAtomically(path, encoded.value(), protection);
 }
 
 } // namespace quarn

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/images/Image.h"
+#include "ground/AtomicFile.h"
 #include "ground/Result.h"
 
 #include <cstddef>
@@ -40,8 +41,10 @@ Result<std::vector<std::byte>> encodeImage(const ImageView& image, ImageFormat f
 
 /// Encodes and writes a picture in the format of the path's extension. The file appears whole or
 /// not at all, and replaces one of the same name.
+/// @param protection  whether a file that is protected from writing is left alone
 /// @return an error that names the file: unknown extension, the picture cannot be encoded, the
-///   folder is missing, no permission, the disk is full
-Result<void> writeImageFile(const std::filesystem::path& path, const ImageView& image);
+///   folder is missing, no permission, write-protected, the disk is full
+Result<void> writeImageFile(const std::filesystem::path& path, const ImageView& image,
+                            Protection protection = Protection::respected);
 
 } // namespace quarn

@@ -44,6 +44,13 @@ std::wstring RunningCommand::label() const {
     return place.empty() ? own_name : place + L": " + own_name;
 }
 
+std::wstring RunningCommand::wordsLeft() const {
+    std::wstring left;
+    for (const CommandWord& word : words)
+        left += (left.empty() ? L"" : L" ") + word.text;
+    return left;
+}
+
 CQuarnCommand::result CommandRunner::run(std::wstring_view line, const CommandOrigin& origin) {
     if (const RunningCommand* running = outermost()) {
         m_application.tell(running->name.ToUtf8() + " is running; wait until it has ended.");
@@ -111,12 +118,8 @@ CQuarnCommand::result CommandRunner::execute(RunningCommand& running, const Comm
 }
 
 void CommandRunner::tellUnusedWords(const RunningCommand& running) {
-    if (running.words.empty())
-        return;
-    std::wstring words;
-    for (const CommandWord& word : running.words)
-        words += L' ' + word.text;
-    m_application.tell(utf8(running.label() + L" did not use:" + words));
+    if (!running.words.empty())
+        m_application.tell(utf8(running.label() + L" did not use: " + running.wordsLeft()));
 }
 
 /// A study asks for many suns; one line says why they are not there.

@@ -38,6 +38,8 @@ struct RunningCommand {
 
     /// What messages about its answers begin with: its place and its name.
     std::wstring label() const;
+    /// The answers that are left, with blanks between them.
+    std::wstring wordsLeft() const;
 };
 
 /// Runs command lines. Commands nest only as scripts of the command that runs.

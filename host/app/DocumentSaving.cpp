@@ -40,7 +40,12 @@ Result<void> saveDocument(Document& document, const std::filesystem::path& file,
     content.plug_ins = std::move(plug_ins.value());
     if (!options.only_selected && options.version == KM_CURRENT_ARCHIVE_VERSION)
         content.unknown = document.fileRemainder().unknown;
-    return writeDocumentFile(content, file);
+    const auto written = writeDocumentFile(content, file, options.protection);
+    if (!written)
+        return written.error();
+    if (!written.value().warning.empty())
+        Application::current()->tell(written.value().warning);
+    return {};
 }
 
 std::vector<std::string> openContent(Document& document, const DocumentContent& content) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "ground/AtomicFile.h"
 #include "ground/Result.h"
 #include "host/document/file/DocumentContent.h"
 
@@ -17,11 +18,14 @@ struct DocumentSaveOptions {
     int version = KM_CURRENT_ARCHIVE_VERSION;
     /// Only the selected objects, without views, cameras and lights.
     bool only_selected = false;
+    /// Whether a file that is protected from writing is left alone.
+    Protection protection = Protection::respected;
 };
 
 /// Writes a document file with what the document holds and what plug-ins keep in it. The file
 /// appears whole and on the disk, or not at all; a file that was there before stays whole until
-/// then. The document does not change, nor does it remember the file.
+/// then. The document does not change, nor does it remember the file. Where it is not sure that the
+/// file is on the disk, the application tells so.
 /// @return an error that names the file, what could not be written, and why
 Result<void> saveDocument(Document& document, const std::filesystem::path& file,
                           const DocumentSaveOptions& options = {});

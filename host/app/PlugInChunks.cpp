@@ -1,9 +1,12 @@
 #include "host/app/PlugInChunks.h"
 
 #include "host/app/Application.h"
+#include "host/app/RecordNames.h"
 #include "host/border/Border.h"
 #include "host/document/file/FileRemainder.h"
 #include "sdk/qncore/QnFileOptions.h"
+#include "sdk/qncore/QnLocalize.h"
+#include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
 #include <algorithm>
 
@@ -69,6 +72,14 @@ Result<void> read(CQuarnPlugIn& plug_in, Document& document, const PlugInContent
     return done.value() ? Result<void>() : Error{"it is damaged, or of a newer version"};
 }
 
+std::string cleanedNamesText() {
+    return KM_wString(QnLocalizeString(L"The animation of the file had names or dates with "
+                                       L"characters that file names and pages must not hold. \"_\" "
+                                       L"stands in their place.",
+                                       42553))
+        .ToUtf8();
+}
+
 /// The plug-in of a chunk; null when it cannot be found.
 CQuarnPlugIn* plugInFor(Application& application, const KM_UUID& id) {
     if (!application.plugIns().isLoaded(id))
@@ -123,6 +134,8 @@ PlugInReading readPlugInContents(Application& application, Document& document,
                                    " keeps in the file cannot be read: " + done.message() +
                                    ". The rest of the file is there.");
     }
+    if (reading.hasRead(ZoetrixPlugInId) && cleanRecordNames(document))
+        reading.warnings.push_back(cleanedNamesText());
     return reading;
 }
 

@@ -25,8 +25,9 @@ Result<std::vector<PlugInContent>> plugInContents(Application& application, Docu
 
 /// How plug-ins took what they keep in a file.
 struct PlugInReading {
-    std::vector<KM_UUID> read_by;      ///< the plug-ins that read theirs
-    std::vector<std::string> warnings; ///< what could not be read, in sentences for the person
+    std::vector<KM_UUID> read_by; ///< the plug-ins that read theirs
+    std::vector<std::string>
+        warnings; ///< what could not be taken over, in sentences for the person
 
     bool hasRead(const KM_UUID& plug_in_id) const {
         return std::ranges::find(read_by, plug_in_id) != read_by.end();
@@ -35,7 +36,8 @@ struct PlugInReading {
 
 /// Hands each plug-in what it keeps in a file. A plug-in that is not loaded is loaded, where it can
 /// be found. Of a file that was opened the document keeps what a plug-in cannot read; it keeps what
-/// nobody is there to read of every file, but for an imported one not in place of its own.
+/// nobody is there to read of every file, but for an imported one not in place of its own. The
+/// names of an animation that was read are cleaned (cleanRecordNames), which is a warning.
 PlugInReading readPlugInContents(Application& application, Document& document,
                                  const std::vector<PlugInContent>& contents,
                                  const CQuarnFileReadOptions& options);

@@ -1,6 +1,8 @@
 #include "sdk/qncore/QnTextFile.h"
 
 #include "ground/AtomicFile.h"
+#include "ground/FileLinks.h"
+#include "ground/PartFile.h"
 #include "ground/PathText.h"
 #include "ground/TextEncoding.h"
 #include "host/app/Application.h"
@@ -18,10 +20,15 @@ struct CQnTextFile::State {
 
 namespace {
 
-bool canBeWritten(const std::filesystem::path& path) {
+std::filesystem::path folderOf(const std::filesystem::path& file) {
+    return file.has_parent_path() ? file.parent_path() : ".";
+}
+
+bool canBeWritten(const std::filesystem::path& asked) {
+    const quarn::Result<std::filesystem::path> file = quarn::fileBehindLinks(asked);
+    const std::filesystem::path path = file ? file.value() : asked; // closing tells what is wrong
     std::error_code error;
-    const std::filesystem::path parent = path.parent_path();
-    const std::filesystem::path folder = parent.empty() ? "." : parent;
+    const std::filesystem::path folder = folderOf(path);
     return !path.filename().empty() && !std::filesystem::is_directory(path, error) &&
            std::filesystem::is_directory(folder, error) && access(folder.c_str(), W_OK) == 0;
 }
@@ -77,6 +84,8 @@ bool CQnTextFile::Close() {
     const State closing = std::exchange(*m_state, {});
     const auto encoding = static_cast<quarn::TextEncoding>(closing.type);
     const std::string bytes = quarn::encodeTextFile(closing.text, encoding);
+    // A page comes once behind its pictures; those are written without a look around.
+    quarn::removeLeftParts(folderOf(*closing.path));
     const quarn::Result<void> written =
         quarn::writeFileAtomically(*closing.path, std::as_bytes(std::span(bytes)));
     noteEnd(*closing.path, written);

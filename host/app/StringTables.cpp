@@ -1,5 +1,6 @@
 #include "host/app/StringTables.h"
 
+#include "ground/FileBytes.h"
 #include "kelmar/KM_wString.h"
 
 #include <nlohmann/json.hpp>
@@ -7,15 +8,18 @@
 #include <algorithm>
 #include <charconv>
 #include <cstdlib>
-#include <fstream>
-#include <iterator>
 #include <set>
+#include <span>
 
 namespace quarn {
 
 namespace {
 
-constexpr const char* SPACE_NAMES[] = {"strings", "option_names", "option_values"};
+/// More than any language has, and little enough to be read at once.
+constexpr std::size_t MOST_BYTES = 1 << 24;
+
+constexpr std::array<const char*, std::tuple_size_v<TextTable>> SPACE_NAMES = {
+    "strings", "option_names", "option_values"};
 
 /// The interface promises that a text lives as long as the program, also when its plug-in is gone.
 const wchar_t* keepForever(std::wstring_view text) {
@@ -43,8 +47,8 @@ bool readId(const std::string& text, int& id) {
     return error == std::errc() && stop == end && id > 0;
 }
 
-Result<std::map<int, const wchar_t*>> readSpace(const nlohmann::json& texts) {
-    std::map<int, const wchar_t*> read;
+Result<std::map<int, std::wstring>> readSpace(const nlohmann::json& texts) {
+    std::map<int, std::wstring> read;
     if (!texts.is_object())
         return Error{"its texts are not in an object"};
     for (const auto& [key, text] : texts.items()) {
@@ -53,9 +57,17 @@ Result<std::map<int, const wchar_t*>> readSpace(const nlohmann::json& texts) {
             return Error{"\"" + key + "\" is no text number"};
         if (!text.is_string())
             return Error{"text " + key + " is no string"};
-        read[id] = keepForever(KM_wString::FromUtf8(text.get_ref<const std::string&>()).View());
+        read[id] = KM_wString::FromUtf8(text.get_ref<const std::string&>()).View();
     }
     return read;
+}
+
+Result<TextTable> readFile(const std::filesystem::path& file) {
+    const Result<FileBytes> read = readFileBytes(file, MOST_BYTES);
+    if (!read)
+        return read.error();
+    const std::span<const std::uint8_t> bytes = read.value().bytes();
+    return readTextTable({reinterpret_cast<const char*>(bytes.data()), bytes.size()});
 }
 
 std::filesystem::path findTable(const std::vector<std::filesystem::path>& folders,
@@ -86,6 +98,23 @@ std::vector<std::string> wantedLanguages(std::string_view language) {
     return languages;
 }
 
+Result<TextTable> readTextTable(std::string_view json) {
+    const nlohmann::json parsed = nlohmann::json::parse(json, nullptr, false);
+    if (!parsed.is_object())
+        return Error{"it is no JSON object"};
+    TextTable table;
+    for (std::size_t space = 0; space < table.size(); ++space) {
+        const auto found = parsed.find(SPACE_NAMES[space]);
+        if (found == parsed.end())
+            continue;
+        Result<std::map<int, std::wstring>> texts = readSpace(*found);
+        if (!texts)
+            return texts.error();
+        table[space] = std::move(texts.value());
+    }
+    return table;
+}
+
 StringTables::StringTables(std::string_view language) : m_languages(wantedLanguages(language)) {}
 
 Result<void> StringTables::load(const std::string& owner,
@@ -94,35 +123,18 @@ Result<void> StringTables::load(const std::string& owner,
     const std::filesystem::path file = findTable(folders, m_languages);
     if (file.empty())
         return {};
-    Result<Table> table = read(file);
-    if (!table)
-        return Error{"The string table " + file.string() + " was left out: " + table.message()};
-    table.value().owner = owner;
-    m_tables.push_back(std::move(table.value()));
+    const Result<TextTable> read = readFile(file);
+    if (!read)
+        return Error{"The string table " + file.string() + " was left out: " + read.message()};
+    Table& table = m_tables.emplace_back(Table{owner, {}});
+    for (std::size_t space = 0; space < table.texts.size(); ++space)
+        for (const auto& [id, text] : read.value()[space])
+            table.texts[space][id] = keepForever(text);
     return {};
 }
 
 void StringTables::remove(const std::string& owner) {
     std::erase_if(m_tables, [&](const Table& table) { return table.owner == owner; });
-}
-
-Result<StringTables::Table> StringTables::read(const std::filesystem::path& file) const {
-    std::ifstream stream(file, std::ios::binary);
-    const std::string bytes{std::istreambuf_iterator<char>(stream), {}};
-    const nlohmann::json parsed = nlohmann::json::parse(bytes, nullptr, false);
-    if (!parsed.is_object())
-        return Error{"it is no JSON object"};
-    Table table;
-    for (std::size_t space = 0; space < std::size(SPACE_NAMES); ++space) {
-        const auto found = parsed.find(SPACE_NAMES[space]);
-        if (found == parsed.end())
-            continue;
-        Result<Texts> texts = readSpace(*found);
-        if (!texts)
-            return texts.error();
-        table.texts[space] = std::move(texts.value());
-    }
-    return table;
 }
 
 const wchar_t* StringTables::find(TextSpace space, int id) const {

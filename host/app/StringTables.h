@@ -2,6 +2,7 @@
 
 #include "ground/Result.h"
 
+#include <array>
 #include <filesystem>
 #include <map>
 #include <string>
@@ -18,6 +19,13 @@ enum class TextSpace { strings, option_names, option_values };
 /// LC_ALL, LC_MESSAGES or LANG, the first that is set. "C" and "POSIX", and what is no language
 /// name, give none.
 std::vector<std::string> wantedLanguages(std::string_view language);
+
+/// The texts of one table: for each TextSpace in its order, number to text.
+using TextTable = std::array<std::map<int, std::wstring>, 3>;
+
+/// Reads the text of a table file, which StringTables describes.
+/// @return an error, part of a sentence, when it is no string table
+Result<TextTable> readTextTable(std::string_view json);
 
 /// The texts of the user's language: one table for the host and one for each plug-in.
 ///
@@ -44,9 +52,8 @@ private:
     using Texts = std::map<int, const wchar_t*>;
     struct Table {
         std::string owner;
-        Texts texts[3];
+        std::array<Texts, std::tuple_size_v<TextTable>> texts;
     };
-    Result<Table> read(const std::filesystem::path& file) const;
 
     std::vector<std::string> m_languages;
     std::vector<Table> m_tables;

@@ -12,8 +12,7 @@ namespace quarn {
 namespace {
 
 bool isForbidden(wchar_t character) {
-    const bool is_control = character < 32 || (character >= 127 && character < 160);
-    return is_control || QnIsForbiddenInNames(character);
+    return QnIsControlCharacter(character) || QnIsForbiddenInNames(character);
 }
 
 bool isFolderName(std::wstring_view name) {

@@ -9,4 +9,8 @@ CQuarnCommand::result fail(std::string_view message) {
     return CQuarnCommand::failure;
 }
 
+CQuarnCommand::result fail(const KM_wString& message) {
+    return fail(message.ToUtf8());
+}
+
 } // namespace quarn

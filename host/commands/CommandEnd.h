@@ -1,5 +1,6 @@
 #pragma once
 
+#include "kelmar/KM_wString.h"
 #include "sdk/qncore/QnCommand.h"
 
 #include <string_view>
@@ -10,5 +11,7 @@ namespace quarn {
 /// @param message  UTF-8, a sentence without a line break at its end
 /// @return failure
 CQuarnCommand::result fail(std::string_view message);
+/// The same in the user's language.
+CQuarnCommand::result fail(const KM_wString& message);
 
 } // namespace quarn

@@ -141,7 +141,7 @@ CQuarnCommand::result askFile(const CQuarnCommandContext& context, FileUse use,
         file = pathFromText(get.String());
     else if (get.CommandResult() == CQuarnCommand::success)
         return CQuarnCommand::nothing;
-    return get.CommandResult();
+    return isSaving(use) && tellWordsBehindFile() ? CQuarnCommand::failure : get.CommandResult();
 }
 
 } // namespace quarn

@@ -34,7 +34,8 @@ FileChoice chooseFile(const CQuarnCommandContext& context, FileUse use,
 /// Asks for a file, with a chooser or at a prompt.
 /// @param prompt  in the user's language
 /// @param file    receives the file after success
-/// @return cancel when the chooser was closed; else as the prompt ended
+/// @return cancel when the chooser was closed; failure where the file is to be written and words
+///         of the line are left behind it; else as the prompt ended
 CQuarnCommand::result askFile(const CQuarnCommandContext& context, FileUse use,
                               const wchar_t* prompt, std::filesystem::path& file);
 

@@ -5,6 +5,7 @@
 #include "host/commands/FileAsking.h"
 #include "host/commands/FileNameQuestion.h"
 #include "host/commands/HostCommands.h"
+#include "host/commands/WordsLeft.h"
 #include "host/document/Document.h"
 #include "host/document/file/DocumentExtension.h"
 #include "host/prompt/NumberText.h"
@@ -19,6 +20,8 @@ struct SaveTarget {
     CQuarnCommand::result result = CQuarnCommand::success;
     std::filesystem::path file; ///< absolute
     int version = KM_CURRENT_ARCHIVE_VERSION;
+    /// Whether a file that is protected from writing is replaced too.
+    bool overwrite = false;
 };
 
 /// The document file that a path names: a name without an ending gets that of documents.
@@ -48,11 +51,18 @@ CQuarnCommand::result askVersion(int& version) {
     return get.CommandResult();
 }
 
-/// Asks for the file, once, with an option for the version.
-CQuarnGet::result askFile(CQuarnGetString& get, const std::filesystem::path& offered, int version) {
-    const KM_wString shown = numberText(version);
+constexpr int VERSION_OPTION = 1;
+
+/// Asks for the file, once, with options for the version and for replacing a protected file.
+CQuarnGet::result askFile(CQuarnGetString& get, const std::filesystem::path& offered,
+                          SaveTarget& target) {
+    const KM_wString shown = numberText(target.version);
     get.SetCommandPrompt(QnLocalizeString(L"Document file", 42104));
     get.AddCommandOption(QnLocalizeCommandOptionName(L"Version", 42103), {shown, shown});
+    get.AddCommandOptionToggle(QnLocalizeCommandOptionName(L"Overwrite", 42550),
+                               QnLocalizeCommandOptionValue(L"No", 42001),
+                               QnLocalizeCommandOptionValue(L"Yes", 42002), target.overwrite,
+                               &target.overwrite);
     if (!offered.empty())
         get.SetDefaultString(textFromPath(offered));
     return get.GetString();
@@ -71,14 +81,18 @@ SaveTarget promptForTarget(const std::filesystem::path& offered) {
     SaveTarget target;
     for (;;) {
         FileNameQuestion get;
-        const CQuarnGet::result answer = askFile(get, offered, target.version);
-        target.result =
-            answer == CQuarnGet::option ? askVersion(target.version) : get.CommandResult();
+        const CQuarnGet::result answer = askFile(get, offered, target);
+        const bool is_version =
+            answer == CQuarnGet::option && get.Option()->m_option_index == VERSION_OPTION;
+        target.result = is_version ? askVersion(target.version) : get.CommandResult();
         if (target.result != CQuarnCommand::success)
             return target;
         if (answer != CQuarnGet::string)
             continue;
-        setFile(target, pathFromText(get.String()));
+        if (tellWordsBehindFile())
+            target.result = CQuarnCommand::failure;
+        else
+            setFile(target, pathFromText(get.String()));
         return target;
     }
 }
@@ -97,8 +111,22 @@ SaveTarget askTarget(const CQuarnCommandContext& context, FileUse use,
     return target;
 }
 
+/// Tells what can be done where a protected file was not replaced.
+/// @param command  the one that can replace it
+CQuarnCommand::result failAtProtection(const std::filesystem::path& file, const wchar_t* command) {
+    return fail(KM_wString::FormatToString(
+        QnLocalizeString(L"%s is write-protected and was not replaced. Save under another name, or "
+                         L"replace it all the same with _-%s [Overwrite=Yes] \"%s\"",
+                         42551),
+        textFromPath(file.filename()).Array(), command, textFromPath(file).Array()));
+}
+
 CQuarnCommand::result save(Document& document, const SaveTarget& target, bool only_selected) {
-    const auto saved = saveDocument(document, target.file, {target.version, only_selected});
+    if (!target.overwrite && isWriteProtected(target.file))
+        return failAtProtection(target.file, only_selected ? L"SaveSelected" : L"SaveAs");
+    const Protection protection = target.overwrite ? Protection::overridden : Protection::respected;
+    const auto saved =
+        saveDocument(document, target.file, {target.version, only_selected, protection});
     if (!saved)
         return fail(saved.message());
     Application::current()->tell("Saved " + textFromPath(target.file.filename()).ToUtf8() + ".");
@@ -130,6 +158,10 @@ CQuarnCommand::result runSave(const CQuarnCommandContext& context) {
     Document& document = Document::of(context.Document());
     if (document.file().empty())
         return saveWhole(document, askTarget(context, FileUse::save, {}));
+    if (hasWordsLeft())
+        return fail(QnLocalizeString(L"The document has a file, so Save takes no name. Save under "
+                                     L"another name with SaveAs.",
+                                     42552));
     SaveTarget target;
     target.file = document.file();
     return saveWhole(document, target);

@@ -1,12 +1,13 @@
 #include "host/dialogs/DialogTemplates.h"
 
+#include "ground/FileBytes.h"
+
 #include <nlohmann/json.hpp>
 
 #include <algorithm>
 #include <array>
-#include <fstream>
+#include <cstdint>
 #include <initializer_list>
-#include <iterator>
 #include <limits>
 #include <optional>
 #include <string>
@@ -21,7 +22,7 @@ using Json = nlohmann::json;
 using Kind = DialogControl::Kind;
 
 /// More than any form has, and little enough to be read at once.
-constexpr std::uintmax_t MOST_BYTES = 1 << 20;
+constexpr std::size_t MOST_BYTES = 1 << 20;
 constexpr std::size_t MOST_CONTROLS = 200;
 
 /// OK and Cancel have these ids in every dialog.
@@ -180,39 +181,25 @@ private:
     const StringTables& m_texts;
 };
 
-Result<std::string> readBytes(const std::filesystem::path& file) {
-    std::error_code error;
-    const std::uintmax_t size = std::filesystem::file_size(file, error);
-    if (error)
-        return Error{"it cannot be read (" + error.message() + ")"};
-    if (size > MOST_BYTES)
-        return Error{"it has more than " + std::to_string(MOST_BYTES) + " bytes"};
-    std::ifstream stream(file, std::ios::binary);
-    std::string bytes{std::istreambuf_iterator<char>(stream), {}};
-    if (!stream)
-        return Error{"it cannot be read; look whether you may open it"};
-    return bytes;
-}
-
-Result<Json> parse(const std::string& bytes) {
+Result<Json> parse(std::string_view text) {
     try {
-        return Json::parse(bytes);
+        return Json::parse(text);
     } catch (const Json::parse_error& fault) {
-        const auto end =
-            bytes.begin() + static_cast<std::ptrdiff_t>(std::min(fault.byte, bytes.size()));
+        const std::string_view before = text.substr(0, fault.byte);
         return Error{"it is no JSON from line " +
-                     std::to_string(1 + std::count(bytes.begin(), end, '\n')) + " on"};
+                     std::to_string(1 + std::ranges::count(before, '\n')) + " on"};
+    } catch (const Json::exception&) {
+        return Error{"it has a number that is too large"};
     }
 }
 
 Result<DialogTemplate> readChecked(const std::filesystem::path& file, const StringTables& texts) {
-    const Result<std::string> bytes = readBytes(file);
-    if (!bytes)
-        return bytes.error();
-    const Result<Json> root = parse(bytes.value());
-    if (!root)
-        return root.error();
-    Result<DialogTemplate> form = TemplateReader(texts).read(root.value());
+    const Result<FileBytes> read = readFileBytes(file, MOST_BYTES);
+    if (!read)
+        return read.error();
+    const std::span<const std::uint8_t> bytes = read.value().bytes();
+    Result<DialogTemplate> form =
+        readDialogTemplateText({reinterpret_cast<const char*>(bytes.data()), bytes.size()}, texts);
     if (form && fileName(form.value().id) != file.filename().string())
         return Error{"its \"id\" is " + std::to_string(form.value().id) +
                      ", which is not that of the file's name"};
@@ -244,6 +231,11 @@ Result<DialogTemplate> findDialogTemplate(int id, std::span<const std::filesyste
     }
     return Error{"There is no dialog template " + fileName(id) + " in " + searched +
                  ". Install the plug-in with all its files."};
+}
+
+Result<DialogTemplate> readDialogTemplateText(std::string_view json, const StringTables& texts) {
+    const Result<Json> root = parse(json);
+    return root ? TemplateReader(texts).read(root.value()) : root.error();
 }
 
 Result<DialogTemplate> readDialogTemplate(const std::filesystem::path& file,

@@ -6,6 +6,7 @@
 
 #include <filesystem>
 #include <span>
+#include <string_view>
 #include <vector>
 
 namespace quarn {
@@ -29,5 +30,9 @@ Result<DialogTemplate> findDialogTemplate(int id, std::span<const std::filesyste
 /// in it.
 Result<DialogTemplate> readDialogTemplate(const std::filesystem::path& file,
                                           const StringTables& texts);
+
+/// The same for the text of such a file, whose name is not looked at.
+/// @return an error, part of a sentence, that names the place in the text
+Result<DialogTemplate> readDialogTemplateText(std::string_view json, const StringTables& texts);
 
 } // namespace quarn

@@ -1,5 +1,6 @@
 #include "quarn/console/HistoryFile.h"
 
+#include "ground/AtomicFile.h"
 #include "quarn/words/Words.h"
 
 #include <cstdlib>
@@ -29,22 +30,12 @@ std::vector<std::string> readLines(const std::filesystem::path& file) {
     return lines;
 }
 
-/// Makes the file hold these lines alone. The new one takes the old one's place when it is whole.
+/// Makes the file hold these lines alone.
 void replaceLines(const std::filesystem::path& file, const std::vector<std::string>& lines) {
-    std::string beside = file.native() + "-XXXXXX";
-    const int descriptor = mkstemp(beside.data());
-    if (descriptor < 0)
-        return;
-    close(descriptor);
-    std::ofstream stream(beside, std::ios::binary);
+    std::string bytes;
     for (const std::string& line : lines)
-        stream << line << '\n';
-    stream.close();
-    std::error_code error;
-    if (stream)
-        std::filesystem::rename(beside, file, error);
-    if (!stream || error)
-        std::filesystem::remove(beside, error);
+        bytes += line + '\n';
+    (void)writeFileAtomically(file, std::as_bytes(std::span(bytes)));
 }
 
 /// The folder is the user's alone.

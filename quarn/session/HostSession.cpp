@@ -28,7 +28,8 @@ void tellDefects(const std::string& words, const std::string& model) {
     std::string defect;
     std::getline(stream, defect);
     for (std::string next; std::getline(stream, next); defect = next)
-        std::fprintf(stderr, "quarn: %s: %s\n", model.c_str(), shownText(defect).c_str());
+        std::fprintf(stderr, "quarn: %s: %s\n", shownText(model).c_str(),
+                     shownText(defect).c_str());
 }
 
 } // namespace

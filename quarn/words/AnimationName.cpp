@@ -10,14 +10,14 @@ namespace quarn::program {
 namespace {
 
 /// A browser reads these as parts of an address and would not find the pictures.
-constexpr std::string_view FORBIDDEN_IN_ADDRESSES = "#%";
+constexpr std::wstring_view FORBIDDEN_IN_ADDRESSES = L"#%";
 
 /// Ten digits of a frame number, a point and an extension follow the name.
 constexpr std::size_t LONGEST_NAME = LONGEST_FILE_NAME - 14;
 
-bool isForbidden(char c) {
-    return QnIsForbiddenInNames(static_cast<unsigned char>(c)) ||
-           FORBIDDEN_IN_ADDRESSES.find(c) != std::string_view::npos || hasControlCharacter({&c, 1});
+bool isForbidden(wchar_t c) {
+    return QnIsForbiddenInNames(c) || FORBIDDEN_IN_ADDRESSES.find(c) != std::wstring_view::npos ||
+           QnIsControlCharacter(c);
 }
 
 /// Cuts text in UTF-8 between two characters.
@@ -35,11 +35,12 @@ void cutTo(std::size_t length, std::string& text) {
 std::optional<std::string> whyNameIsRefused(const std::string& name) {
     if (name.find_first_not_of(" \t") == std::string::npos)
         return "--name must not be empty.";
-    if (hasControlCharacter(name))
+    const std::wstring text = wideText(name);
+    if (std::ranges::any_of(text, QnIsControlCharacter))
         return "--name must not hold line breaks or other control characters.";
-    const auto forbidden = std::find_if(name.begin(), name.end(), isForbidden);
-    if (forbidden != name.end())
-        return "--name must not hold " + std::string(1, *forbidden) +
+    const auto forbidden = std::ranges::find_if(text, isForbidden);
+    if (forbidden != text.end())
+        return "--name must not hold " + utf8Text({&*forbidden, 1}) +
                "; the characters \\ | / : * ? \" < > # % cannot stand in the name of an animation.";
     if (!isUtf8(name))
         return "--name must be text in UTF-8.";
@@ -50,8 +51,9 @@ std::optional<std::string> whyNameIsRefused(const std::string& name) {
 }
 
 std::string animationNameFor(const std::filesystem::path& model) {
-    std::string name = model.stem().native();
-    std::replace_if(name.begin(), name.end(), isForbidden, '_');
+    std::wstring text = wideText(model.stem().native());
+    std::ranges::replace_if(text, isForbidden, L'_');
+    std::string name = utf8Text(text);
     cutTo(LONGEST_NAME, name);
     return name.find_first_not_of(" \t") == std::string::npos ? "Animation" : name;
 }

@@ -106,7 +106,8 @@ const Room FLOORS[] = {
     {11, "quarn/scripts/", PROGRAM + "quarn/words/"},
     {11, "quarn/runs/", BELOW_RUNS},
     {11, "quarn/reports/", BELOW_RUNS},
-    {11, "quarn/console/", BELOW_SESSIONS + "quarn/session/"},
+    {11, "quarn/console/",
+     BELOW_SESSIONS + "quarn/session/" + "ground/AtomicFile.h" + "ground/Result.h"},
     {11, "quarn/arguments/", BELOW_RUNS + "quarn/runs/" + "quarn/reports/" + "quarn/console/"},
     {11, "quarn/main.cpp", {"quarn/arguments/", "quarn/terminal/"}},
 

@@ -1,15 +1,17 @@
 // Records small animations with the built program, and opens their pages in the browser.
 import { spawnSync } from 'node:child_process';
-import { mkdirSync, mkdtempSync, rmSync, writeFileSync } from 'node:fs';
+import { mkdirSync, mkdtempSync, readdirSync, rmSync, writeFileSync } from 'node:fs';
 import { tmpdir } from 'node:os';
 import { join } from 'node:path';
-import { pathToFileURL } from 'node:url';
+import { fileURLToPath, pathToFileURL } from 'node:url';
 import { chromium } from 'playwright-core';
 
 const BROWSER_OPTIONS = [
     '--no-sandbox', '--disable-dev-shm-usage', '--disable-gpu', '--disable-background-networking',
     '--disable-component-update', '--disable-sync', '--no-first-run',
 ];
+
+const HOSTILE = fileURLToPath(new URL('../data/hostile', import.meta.url));
 
 // The page shows the next frame after this time.
 export const FRAME_DELAY_MS = 75;
@@ -51,6 +53,23 @@ function record(command, options, { name, width = 320, height = 180 }) {
 
 export function recordTurntable({ frames, ...common }) {
     return record('turntable', ['--frames', String(frames)], common);
+}
+
+// The animation that a document of tests/data/hostile holds. Its page is the only one in the folder.
+export function recordHostile(document) {
+    const folder = mkdtempSync(join(tmpdir(), 'quarn-page-'));
+    const out = join(folder, 'out');
+    mkdirSync(out);
+    writeFileSync(join(folder, 'script.txt'), `_-RecordAnimation _TargetFolder "${out}" _Enter\n`);
+    const run = spawnSync(process.env.QUARN_PROGRAM,
+        ['run', join(folder, 'script.txt'), join(HOSTILE, document), '--language', 'en'],
+        { encoding: 'utf8' });
+    if (run.status !== 0) throw new Error(`quarn ended with ${run.status}: ${run.stderr}`);
+    const pages = readdirSync(out).filter((name) => name.endsWith('.html'));
+    return {
+        address: pathToFileURL(join(out, pages[0])).href,
+        remove: () => rmSync(folder, { recursive: true, force: true }),
+    };
 }
 
 // A turntable whose first frame cannot be written, as a folder of its name is in the way: the page of

@@ -9,11 +9,6 @@
 
 namespace {
 
-bool IsControlCharacter(wchar_t character) {
-    const auto code = static_cast<unsigned long>(character);
-    return code < 0x20 || (code >= 0x7F && code < 0xA0);
-}
-
 bool IsLineBreak(wchar_t character) {
     return (character >= L'\n' && character <= L'\r') || character == L'\u0085' ||
            character == L'\u2028' || character == L'\u2029';
@@ -71,7 +66,7 @@ int ReplaceInvalidFileChar(KM_wString& name) {
 
 bool StaysInsideFolder(const KM_wString& name) {
     return std::ranges::none_of(name.View(), [](wchar_t character) {
-        return character == L'/' || character == L'\\' || IsControlCharacter(character);
+        return character == L'/' || character == L'\\' || QnIsControlCharacter(character);
     });
 }
 

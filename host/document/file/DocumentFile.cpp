@@ -1,6 +1,5 @@
 #include "host/document/file/DocumentFile.h"
 
-#include "ground/AtomicFile.h"
 #include "ground/FileBytes.h"
 #include "ground/PathText.h"
 #include "host/document/file/DocumentCoding.h"
@@ -17,11 +16,12 @@ Error cannot(const char* verb, const std::filesystem::path& file, const std::str
 
 } // namespace
 
-Result<void> writeDocumentFile(const DocumentContent& content, const std::filesystem::path& file) {
+Result<WrittenFile> writeDocumentFile(const DocumentContent& content,
+                                      const std::filesystem::path& file, Protection protection) {
     const auto bytes = encodeDocument(content);
     if (!bytes)
         return cannot("save", file, bytes.message());
-    return writeFileAtomically(file, std::as_bytes(std::span(bytes.value())), FileSync::yes);
+    return writeFileToDisk(file, std::as_bytes(std::span(bytes.value())), protection);
 }
 
 Result<DocumentContent> readDocumentFile(const std::filesystem::path& file) {

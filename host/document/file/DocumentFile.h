@@ -1,5 +1,6 @@
 #pragma once
 
+#include "ground/AtomicFile.h"
 #include "ground/Result.h"
 #include "host/document/file/DocumentContent.h"
 
@@ -9,8 +10,11 @@ namespace quarn {
 
 /// Writes a document file. It appears whole and on the disk, or not at all; a file that was there
 /// before stays whole until then.
-/// @return an error that names the file, what could not be written, and why
-Result<void> writeDocumentFile(const DocumentContent& content, const std::filesystem::path& file);
+/// @param protection  whether a file that is protected from writing is left alone
+/// @return as writeFileToDisk; an error names the file, what could not be written, and why
+Result<WrittenFile> writeDocumentFile(const DocumentContent& content,
+                                      const std::filesystem::path& file,
+                                      Protection protection = Protection::respected);
 
 /// Reads a document file whole and checks it.
 /// @return an error that names the file and tells what is wrong with it

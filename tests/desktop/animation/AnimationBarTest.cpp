@@ -200,6 +200,19 @@ TEST_F(AnimationBarTest, SunStudiesShowTheDateOfTheirFrame) {
     EXPECT_NE(part<QLabel>(bar, "frameDate").text(), first);
 }
 
+TEST_F(AnimationBarTest, ADateIsShownAsItIsStoredAndNotAsAPage) {
+    run("_SetOneDaySunAnimation 51 0 0 21 6 2026 6 0 8 0 30 _jpg _RenderedViewport Perspective "
+        "_Enter");
+    KM_3dmAnimationProperties changed = record();
+    changed.Dates()[0] = L"<b>Noon</b>";
+    session.document().Properties().SetAnimationProperties(changed);
+    run("_ViewportSize 16 16");
+    bar.refresh();
+    click(button("firstFrame"));
+    EXPECT_EQ(part<QLabel>(bar, "frameDate").text(), "<b>Noon</b>");
+    EXPECT_EQ(part<QLabel>(bar, "frameDate").textFormat(), Qt::PlainText);
+}
+
 TEST(RecordingPaceTest, TellsTheTimeThatIsLeft) {
     using std::chrono::seconds;
     const RecordingPace::Clock::time_point begin{};

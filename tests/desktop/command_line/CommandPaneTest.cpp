@@ -207,6 +207,26 @@ TEST_F(CommandPaneTest, EnterTakesTheDefault) {
     EXPECT_EQ(questions.size(), 2);
 }
 
+TEST_F(CommandPaneTest, TipsShowWhatADocumentHoldsAsTextAndNotAsAPage) {
+    setUpTurntable(2);
+    KM_3dmAnimationProperties changed = record();
+    changed.SetFolderName(L"<img src=a>");
+    changed.SetHtmlFilename(L"<img src=b>");
+    session.document().Properties().SetAnimationProperties(changed);
+    QString of_option;
+    QString of_default;
+    answering("_RecordAnimation", {[&] {
+                  of_option = button("option_TargetFolder").toolTip();
+                  pane.cancelQuestion();
+              }});
+    answering("_AnimationName", {[&] {
+                  of_default = button("promptOk").toolTip();
+                  pane.cancelQuestion();
+              }});
+    EXPECT_TRUE(of_option.contains("TargetFolder = &lt;img src=a&gt;")) << of_option.toStdString();
+    EXPECT_TRUE(of_default.contains("&lt;img src=b&gt;")) << of_default.toStdString();
+}
+
 TEST_F(CommandPaneTest, AToggleChangesWhenItIsClicked) {
     setUpTurntable(2);
     const auto caption = [&] { return button("option_RunAnimation").text(); };

@@ -112,6 +112,21 @@ TEST_F(FormWindowTest, ShowsWhatIsWrittenAndReadsWhatIsTyped) {
     EXPECT_EQ(m_told.refusals, 0);
 }
 
+TEST(FormWindow, ShowsLabelsAndHintsAsTheyAreWrittenAndNotAsPages) {
+    const auto window = makeFormWindow(
+        {7002, L"Hints", {{1, Kind::text, L"<b>Name</b>", L"<img src=a>", false}}}, nullptr);
+    Told told(*window);
+    onceShown("form7002", [&](QWidget& form) {
+        const auto labels = form.findChildren<QLabel*>();
+        ASSERT_EQ(labels.size(), 1);
+        EXPECT_EQ(labels[0]->textFormat(), Qt::PlainText);
+        EXPECT_TRUE(labels[0]->toolTip().contains("&lt;img src=a&gt;"));
+        EXPECT_TRUE(part(form, "control1").toolTip().contains("&lt;img src=a&gt;"));
+        form.close();
+    });
+    window->run(told);
+}
+
 TEST_F(FormWindowTest, EnterConfirmsFromAnyField) {
     for (const char* control :
          {"control1", "control3", "control4", "control5", "control6", "control7"}) {

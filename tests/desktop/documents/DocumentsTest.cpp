@@ -56,6 +56,7 @@ protected:
             auto* const box = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
             ASSERT_TRUE(box) << "nothing was asked";
             asked = box->text();
+            EXPECT_EQ(box->textFormat(), Qt::PlainText) << "a file's name may look like a page";
             for (QAbstractButton* button : box->buttons()) {
                 if (button->objectName() == name)
                     button->click();

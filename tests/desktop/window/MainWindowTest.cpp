@@ -36,6 +36,13 @@ TEST_F(MainWindowTest, TitleNamesTheDocumentAndMarksChanges) {
     EXPECT_TRUE(window.isWindowModified());
 }
 
+TEST_F(MainWindowTest, TitleShowsTheMarkOfChangesOfANameAsItIs) {
+    run("_-SaveAs \"" + qtText(folder / "slab[*].quarn") + '"');
+    run("_-Point 1,2,3");
+    EXPECT_TRUE(window.windowTitle().startsWith("slab[*][*].quarn[*]"))
+        << window.windowTitle().toStdString();
+}
+
 TEST_F(MainWindowTest, TypedCommandIsRunAndItsWordsStandInTheOutput) {
     QTest::keyClicks(&window.commandPane().line(), "List");
     QTest::keyClick(&window.commandPane().line(), Qt::Key_Return);

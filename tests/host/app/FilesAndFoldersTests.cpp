@@ -1,3 +1,4 @@
+#include "ground/ProcessIdentity.h"
 #include "host/app/DocumentsFolder.h"
 #include "sdk/qncore/QnDirDialog.h"
 #include "sdk/qncore/QnFileUtilities.h"
@@ -8,6 +9,8 @@
 #include <cstdlib>
 #include <fstream>
 #include <iterator>
+#include <sys/wait.h>
+#include <unistd.h>
 
 namespace quarn::test {
 namespace {
@@ -172,6 +175,42 @@ TEST_F(FilesAndFolders, WhyATextFileCannotBeClosedIsTold) {
     EXPECT_FALSE(file.Close());
     EXPECT_EQ(printed(), "Cannot write '" + (folder / "page.html").string() +
                              "': its folder does not exist.\n");
+}
+
+TEST_F(FilesAndFolders, ATextFileThroughALinkGoesWhereTheLinkLeads) {
+    fs::create_directory(home / "there");
+    fs::create_symlink("there/page.html", home / "page.html");
+    CQnTextFile file;
+    ASSERT_TRUE(file.Open(wide(home / "page.html"), open_mode::write, filetype::utf8));
+    file.WriteString(L"text");
+    ASSERT_TRUE(file.Close());
+    EXPECT_TRUE(fs::is_symlink(home / "page.html"));
+    EXPECT_EQ(bytesOf(home / "there" / "page.html"), "text");
+}
+
+TEST_F(FilesAndFolders, AWriteProtectedTextFileStaysAndIsTold) {
+    const fs::path path = home / "page.html";
+    std::ofstream(path) << "old";
+    fs::permissions(path, fs::perms::owner_read);
+    CQnTextFile file;
+    ASSERT_TRUE(file.Open(wide(path), open_mode::write, filetype::utf8));
+    EXPECT_FALSE(file.Close());
+    EXPECT_NE(printed().find("page.html': it is write-protected"), std::string::npos) << printed();
+    EXPECT_EQ(bytesOf(path), "old");
+}
+
+TEST_F(FilesAndFolders, ATextFileTakesAwayWhatAnEndedProgramLeftBesideIt) {
+    const pid_t ended = fork();
+    if (ended == 0)
+        _exit(0);
+    int status = 0;
+    ASSERT_EQ(waitpid(ended, &status, 0), ended);
+    const fs::path left = home / (".quarn-" + hostName() + "-" + std::to_string(ended) + "-0.part");
+    std::ofstream(left) << "half a picture";
+    CQnTextFile file;
+    ASSERT_TRUE(file.Open(wide(home / "page.html"), open_mode::write, filetype::utf8));
+    ASSERT_TRUE(file.Close());
+    EXPECT_FALSE(fs::exists(left));
 }
 
 TEST_F(FilesAndFolders, ATextFileNeedsAFolderAndAName) {

@@ -120,6 +120,16 @@ TEST(StringTables, AMalformedTableIsLeftOutWhole) {
     }
 }
 
+TEST(StringTables, ATableLongerThanAnyLanguageIsLeftOut) {
+    const auto tables_folder = folder("long");
+    writeTable(tables_folder / "de.json", R"({"strings": {"7": "Sieben"}})");
+    std::filesystem::resize_file(tables_folder / "de.json", (1 << 24) + 1);
+    StringTables tables("de");
+    const Result<void> loaded = tables.load("host", {tables_folder});
+    ASSERT_FALSE(loaded);
+    EXPECT_THAT(loaded.message(), HasSubstr("de.json was left out: it has more than 16777216"));
+}
+
 TEST(StringTables, NoTableAtAllIsNoFault) {
     StringTables tables("de");
     EXPECT_TRUE(tables.load("host", {folder("empty"), "no/such/folder"}));

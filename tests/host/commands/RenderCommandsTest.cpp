@@ -64,6 +64,24 @@ TEST_F(RenderCommandsTest, SavingTellsWhatIsWrongWithTheFile) {
     EXPECT_TRUE(window().isOpen());
 }
 
+TEST_F(RenderCommandsTest, AWriteProtectedPictureIsNotReplaced) {
+    ASSERT_EQ(run(L"_Render"), CQuarnCommand::success);
+    writeFile(folder / "a.png", "old");
+    std::filesystem::permissions(folder / "a.png", std::filesystem::perms::owner_read);
+    EXPECT_EQ(save(folder / "a.png"), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("a.png': it is write-protected"));
+    EXPECT_EQ(readFile(folder / "a.png"), "old");
+}
+
+TEST_F(RenderCommandsTest, ANameWithBlanksWithoutQuotesIsToldAndNothingIsWritten) {
+    ASSERT_EQ(run(L"_Render"), CQuarnCommand::success);
+    const std::wstring name = (folder / "my").wstring() + L".png house.png";
+    EXPECT_EQ(run((L"_-SaveRenderWindowAs " + name).c_str()), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("Nothing was written: behind the name of the file stands "
+                                     "\"house.png\"."));
+    EXPECT_TRUE(std::filesystem::is_empty(folder.path()));
+}
+
 TEST_F(RenderCommandsTest, EscapeCancelsAndKeepsTheEarlierPicture) {
     ASSERT_EQ(run(L"_RenderPreview"), CQuarnCommand::success);
     const auto earlier = window().picture.rgba;

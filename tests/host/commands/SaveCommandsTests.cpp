@@ -2,6 +2,7 @@
 #include "host/document/file/DocumentFile.h"
 #include "tests/host/app/TestCommand.h"
 #include "tests/host/document/DocumentFixtures.h"
+#include "tests/support/OtherUser.h"
 #include "tests/support/TempFolder.h"
 
 #include <gmock/gmock.h>
@@ -129,7 +130,8 @@ TEST_F(SaveCommandsTest, SaveAsksForTheFileOnceAndRemembersIt) {
     EXPECT_EQ(read("house.quarn").objects.size(), 2U);
     run(L"New");
     EXPECT_EQ(run(L"_-Save"), CQuarnCommand::cancel) << "a new document has no file";
-    EXPECT_THAT(printed(), HasSubstr("Save needs an answer to \"Document file\" (Version)"));
+    EXPECT_THAT(printed(),
+                HasSubstr("Save needs an answer to \"Document file\" (Version, Overwrite)"));
 }
 
 TEST_F(SaveCommandsTest, SaveAsMovesTheDocumentToTheOtherFileAndOffersIt) {
@@ -143,6 +145,93 @@ TEST_F(SaveCommandsTest, SaveAsMovesTheDocumentToTheOtherFileAndOffersIt) {
     front_end.addAnswer(L"_Enter");
     ASSERT_EQ(run(L"SaveAs"), CQuarnCommand::success);
     EXPECT_EQ(*front_end.questions().back().default_answer, textFromPath(folder / "two.QUARN"));
+}
+
+TEST_F(SaveCommandsTest, ThroughALinkTheFileBehindItIsSaved) {
+    runOn(L"_-SaveAs", "house.quarn");
+    std::filesystem::create_symlink("house.quarn", folder / "link.quarn");
+    run(L"New");
+    document().objects().addPoint(L"Mark", {1, 2, 3});
+    ASSERT_EQ(runOn(L"_-SaveAs", "link.quarn"), CQuarnCommand::success);
+    EXPECT_TRUE(std::filesystem::is_symlink(folder / "link.quarn"));
+    EXPECT_EQ(read("house.quarn").objects.size(), 1U);
+    EXPECT_THAT(filesOfFolder(), ElementsAre("house.quarn", "link.quarn"));
+}
+
+// ---- Protected files
+
+TEST_F(SaveCommandsTest, AWriteProtectedDocumentIsReplacedOnlyWithOverwrite) {
+    runOn(L"_-SaveAs", "house.quarn");
+    std::filesystem::permissions(folder / "house.quarn", std::filesystem::perms::owner_read);
+    run(L"_-Delete Roof");
+    const std::string other =
+        "with _-SaveAs [Overwrite=Yes] \"" + (folder / "house.quarn").string();
+    for (const wchar_t* line : {L"_-Save", L"_-SaveAs _Enter"}) {
+        front_end.clearPrinted();
+        EXPECT_EQ(run(line), CQuarnCommand::failure);
+        EXPECT_THAT(printed(), HasSubstr("house.quarn is write-protected and was not replaced."));
+        EXPECT_THAT(printed(), HasSubstr(other));
+    }
+    EXPECT_EQ(read("house.quarn").objects.size(), 3U);
+    EXPECT_TRUE(document().isModified());
+
+    EXPECT_EQ(runOn(L"_-SaveAs [Overwrite=No]", "house.quarn"), CQuarnCommand::failure);
+    EXPECT_EQ(runOn(L"_-SaveAs [Overwrite=Yes]", "house.quarn"), CQuarnCommand::success);
+    EXPECT_EQ(read("house.quarn").objects.size(), 2U);
+    EXPECT_FALSE(document().isModified());
+}
+
+TEST_F(SaveCommandsTest, SelectedObjectsReplaceAProtectedDocumentOnlyWithOverwrite) {
+    writeFile(folder / "part.quarn", "old");
+    std::filesystem::permissions(folder / "part.quarn", std::filesystem::perms::owner_read);
+    run(L"_-Select Roof");
+    EXPECT_EQ(runOn(L"_-SaveSelected", "part.quarn"), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("with _-SaveSelected [Overwrite=Yes]"));
+    EXPECT_EQ(readFile(folder / "part.quarn"), "old");
+    EXPECT_EQ(runOn(L"_-SaveSelected [Overwrite]", "part.quarn"), CQuarnCommand::success);
+    EXPECT_EQ(read("part.quarn").objects.size(), 1U);
+}
+
+TEST_F(SaveCommandsTest, InAFolderThatCannotBeFlushedTheDocumentIsSavedWithAWarning) {
+    const std::filesystem::path box = folder / "box"; // whose files nobody may list
+    std::filesystem::create_directory(box);
+    if (isRoot()) {
+        std::filesystem::permissions(folder.path(), std::filesystem::perms::all);
+        ASSERT_EQ(chown(box.c_str(), NOBODY, NOBODY), 0);
+    }
+    std::filesystem::permissions(box, std::filesystem::perms::owner_write |
+                                          std::filesystem::perms::owner_exec);
+    EXPECT_TRUE(runAsOrdinaryUser([this] {
+        return runOn(L"_-SaveAs", "box/house.quarn") == CQuarnCommand::success &&
+               printed().find("could not be flushed to the disk") != std::string::npos &&
+               printed().find("Saved house.quarn.") != std::string::npos &&
+               !document().isModified();
+    }));
+    std::filesystem::permissions(box, std::filesystem::perms::owner_all);
+    EXPECT_EQ(read("box/house.quarn").objects.size(), 3U);
+}
+
+// ---- Words behind the name
+
+TEST_F(SaveCommandsTest, ANameWithBlanksWithoutQuotesIsToldAndNothingIsWritten) {
+    run(L"_-Select Roof");
+    const std::wstring name = L" " + (folder / "my").wstring() + L" green house.quarn";
+    for (const wchar_t* command : {L"_-SaveAs", L"_-Save", L"_-SaveSelected", L"SaveAs"}) {
+        front_end.clearPrinted();
+        EXPECT_EQ(run((command + name).c_str()), CQuarnCommand::failure);
+        EXPECT_EQ(printed(), "Nothing was written: behind the name of the file stands \"green "
+                             "house.quarn\". Put a name with blanks in double quotes.\n");
+    }
+    EXPECT_THAT(filesOfFolder(), IsEmpty());
+    EXPECT_TRUE(document().file().empty());
+}
+
+TEST_F(SaveCommandsTest, SaveOfADocumentThatHasAFileTakesNoName) {
+    runOn(L"_-SaveAs", "house.quarn");
+    run(L"_-Delete Roof");
+    EXPECT_EQ(runOn(L"_-Save", "other.quarn"), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("Save takes no name. Save under another name with SaveAs."));
+    EXPECT_EQ(read("house.quarn").objects.size(), 3U);
 }
 
 TEST_F(SaveCommandsTest, ARelativeNameIsMadeAbsolute) {

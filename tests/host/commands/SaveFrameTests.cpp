@@ -83,6 +83,22 @@ TEST_F(SaveFrameTest, AsksTheObjectForTheFrameCountedFromOne) {
     EXPECT_TRUE(std::filesystem::exists(file));
 }
 
+TEST_F(SaveFrameTest, ANameWithBlanksWithoutQuotesIsToldAndNothingIsWritten) {
+    FrameKeeper keeper;
+    EXPECT_EQ(save((L"1 " + (folder / "my.bmp").wstring()).c_str()), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("Nothing was written: behind the name of the file stands"));
+    EXPECT_TRUE(std::filesystem::is_empty(folder.path()));
+}
+
+TEST_F(SaveFrameTest, AWriteProtectedPictureIsNotReplaced) {
+    FrameKeeper keeper;
+    writeFile(file, "old");
+    std::filesystem::permissions(file, std::filesystem::perms::owner_read);
+    EXPECT_EQ(save(L"1"), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("frame.bmp': it is write-protected"));
+    EXPECT_EQ(readFile(file), "old");
+}
+
 TEST_F(SaveFrameTest, WhatTheViewsShowStays) {
     FrameKeeper keeper;
     addBox(view().document(), {-5, -5, 0}, {5, 5, 5});

@@ -138,6 +138,7 @@ TEST_F(DialogTemplateFile, WithWrongNumbersIsRefused) {
     EXPECT_THAT(faultWith("31", "2"), HasSubstr("OK and Cancel are 1 and 2"));
     EXPECT_THAT(faultWith("31", "99999999999"), HasSubstr("control 1: \"id\""));
     EXPECT_THAT(faultWith("31", "18446744073709551615"), HasSubstr("control 1: \"id\""));
+    EXPECT_THAT(faultWith("31", "1e999"), HasSubstr("it has a number that is too large"));
     EXPECT_THAT(faultWith("32", "31"), HasSubstr("control 2 has the id 31, as one before it"));
     EXPECT_THAT(faultWith("90001", "\"90001\""), HasSubstr("the \"id\" of \"title\""));
     EXPECT_THAT(faultWith("90003", "0"), HasSubstr("the \"id\" of \"hint\""));

@@ -191,7 +191,8 @@ TEST(Arguments, ForbiddenCharacterInTheNameIsShown) {
     for (const char character : std::string("\\|/:*?\"<>#%"))
         expectRefusal(wholeTurntable({"--name", std::string("a") + character + "b"}),
                       {std::string("--name must not hold ") + character + ";"});
-    expectRefusal(wholeTurntable({"--name", "a\nb"}), {"--name must not hold line breaks"});
+    for (const char* name : {"a\nb", "a\u009Bb", "a\u2028b"})
+        expectRefusal(wholeTurntable({"--name", name}), {"--name must not hold line breaks"});
     expectRefusal(wholeTurntable({"--name", ""}), {"--name must not be empty"});
     expectRefusal(wholeTurntable({"--name", "  "}), {"--name must not be empty"});
     expectRefusal(wholeTurntable({"--name", "a\xFF"}), {"UTF-8"});

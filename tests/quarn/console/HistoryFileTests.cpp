@@ -65,6 +65,18 @@ TEST(HistoryFile, WithoutAFolderIsEmpty) {
     }
 }
 
+TEST(HistoryFile, ThatIsALinkStaysOneWhenItForgets) {
+    const TempFolder folder;
+    std::string text;
+    for (std::size_t i = 0; i <= HistoryFile::LINES_KEPT; ++i)
+        text += "Line\n";
+    writeFile(folder / "kept elsewhere", text);
+    std::filesystem::create_symlink("kept elsewhere", folder / "history");
+    EXPECT_THAT(HistoryFile(folder / "history").load(), SizeIs(HistoryFile::LINES_KEPT));
+    EXPECT_TRUE(std::filesystem::is_symlink(folder / "history"));
+    EXPECT_EQ(readFile(folder / "kept elsewhere").size(), 5 * HistoryFile::LINES_KEPT);
+}
+
 TEST(HistoryFile, ForgetsTheOldestLines) {
     const TempFolder folder;
     std::string text;

@@ -51,6 +51,19 @@ TEST(ControlCharacters, OfAModelNeverReachTheTerminal) {
     }
 }
 
+TEST(ControlCharacters, OfAModelsFileNameNeverReachTheTerminal) {
+    const Studio studio;
+    writeFile(studio / "a\u009B2J.obj", "v 0 0 0\nv 1 0 0\nv 0 1 0\nv nan 0 0\nf 1 2 3\nf 1 2 4\n");
+    Start start;
+    start.folder = studio.path();
+    start.arguments = {"turntable", "a\u009B2J.obj", "--frames", "1",
+                       "--size",    "8x8",           "--out",    "out"};
+    const Ended ended = run(start);
+    EXPECT_TRUE(std::filesystem::exists(studio / "out" / "a_2J000.jpg")) << ended.err;
+    EXPECT_THAT(ended.err, HasSubstr("quarn: a\\x9B2J.obj: "));
+    EXPECT_THAT(ended.err + ended.out, Not(HasSubstr("\u009B")));
+}
+
 TEST(ControlCharacters, OfWhatIsTypedNeverReachTheTerminal) {
     const Studio studio;
     Start start;

@@ -1,3 +1,4 @@
+#include "host/session/DocumentState.h"
 #include "kelmar/KM_BinaryArchive.h"
 #include "kelmar/KM_LittleEndian.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
@@ -7,7 +8,9 @@
 #include <cstring>
 #include <limits>
 
+using quarn::isModified;
 using testing::HasSubstr;
+using testing::Not;
 
 namespace {
 
@@ -213,6 +216,76 @@ TEST_F(StoredDocument, StoredFrameNumbersFarOutsideAreSurvived) {
             run(command);
         EXPECT_EQ(3, record().FrameCount());
     }
+}
+
+// ---- Names that a page would hold as they are
+
+TEST_F(StoredDocument, NamesThatNoFileHoldsAreCleanedWhenTheyAreOpenedAndThatIsToldOnce) {
+    setUpCameraFrames(2);
+    record().SetHtmlFilename(L"</TITLE>\\|/:*?\"<>\n\x7F\x85\u2028\u2029 & 'Haus 日'");
+    record().SetFileExtension(L"j/g");
+    record().Images().Append(L"a000.jpg");
+    record().Images().Append(L"\";b()//.jpg");
+    save();
+    for (const wchar_t* command : {L"_-Open \"", L"_-Import \""}) {
+        record() = Record();
+        front_end.clearPrinted();
+        ASSERT_EQ(CQuarnCommand::success, run(command + file() + L"\""));
+        EXPECT_EQ(L"__TITLE_"
+                  L"_________"
+                  L"_____"
+                  L" & 'Haus 日'",
+                  record().HtmlFilename());
+        EXPECT_EQ(L"j_g", record().FileExtension());
+        ASSERT_EQ(2, record().Images().Count());
+        EXPECT_EQ(L"a000.jpg", record().Images()[0]);
+        EXPECT_EQ(L"_;b()__.jpg", record().Images()[1]);
+        EXPECT_EQ(2, record().FrameCount());
+        const std::wstring said = printed();
+        const std::wstring told = L"The animation of the file had names or dates with characters";
+        EXPECT_THAT(said, HasSubstr(told));
+        EXPECT_EQ(said.find(told), said.rfind(told)) << "told once";
+    }
+}
+
+TEST_F(StoredDocument, LabelsLoseWhatEndsAStringOrAScriptAndNothingElse) {
+    setUpSunFrames(5);
+    const wchar_t* const stored[] = {L"2026-06-21 14:00:00", L"21/6/2026 | 2 o'clock * & more?",
+                                     L"\";x();\"", L"</SCRIPT>\u2028\u2029\r\n", L"ends \\"};
+    const wchar_t* const opened[] = {stored[0], stored[1], L"_;x();_", L"_/SCRIPT_____", L"ends _"};
+    record().Dates().SetCount(0);
+    for (const wchar_t* label : stored)
+        record().Dates().Append(label);
+    save();
+    record() = Record();
+    ASSERT_EQ(CQuarnCommand::success, open());
+    ASSERT_EQ(5, record().Dates().Count());
+    for (int i = 0; i < 5; ++i)
+        EXPECT_EQ(opened[i], record().Dates()[i]);
+}
+
+TEST_F(StoredDocument, OurOwnStudyComesBackAsItWasWithoutAWord) {
+    ASSERT_EQ(CQuarnCommand::success,
+              run(L"_-SetOneDaySunAnimation 51 0 0 21 6 2026 6 0 8 0 30 _jpg "
+                  L"_RenderedViewport Perspective _Enter"));
+    const Record study(record());
+    ASSERT_FALSE(record().Dates().IsEmpty());
+    save();
+    const std::string saved = readFile(folder / "a.quarn");
+    front_end.clearPrinted();
+    ASSERT_EQ(CQuarnCommand::success, open());
+    EXPECT_THAT(printed(), Not(HasSubstr(L"stands in their place")));
+    ASSERT_EQ(CQuarnCommand::success, run(L"_-Save"));
+    EXPECT_EQ(saved, readFile(folder / "a.quarn"));
+}
+
+TEST_F(StoredDocument, ACleanedDocumentWantsNoSaving) {
+    setUpCameraFrames(2);
+    record().SetHtmlFilename(L"<b>");
+    save();
+    ASSERT_EQ(CQuarnCommand::success, open());
+    EXPECT_EQ(L"_b_", record().HtmlFilename());
+    EXPECT_FALSE(isModified(doc()));
 }
 
 TEST_F(StoredDocument, AViewNameThatNoLongerExistsIsTold) {
