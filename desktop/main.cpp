@@ -28,7 +28,9 @@ void openFile(MainWindow& window, const QString& file) {
 int runWindow(QApplication& application, const Arguments& arguments) {
     const Language language(arguments.language);
     DesktopFrontEnd front_end;
-    quarn::Session session(front_end, sessionOptions(arguments.language.toStdString()));
+    quarn::SessionOptions options = sessionOptions(arguments.language.toStdString());
+    options.overwrites = arguments.overwrites;
+    quarn::Session session(front_end, std::move(options));
     const quarn::PlugInLoad load = session.loadPlugIn(plugInFolder() / "Zoetrix.qnp");
     MainWindow window(session, front_end);
     window.restoreLayout();

@@ -55,4 +55,9 @@ std::uint64_t freeMemory() {
     return std::min({freeInMachine(), freeInGroup(), freeInProcess()});
 }
 
+std::string gigabyteText(std::uint64_t bytes) {
+    const std::uint64_t tenths = (bytes * 10 + (1ULL << 29)) >> 30;
+    return std::to_string(tenths / 10) + "." + std::to_string(tenths % 10) + " GB";
+}
+
 } // namespace quarn

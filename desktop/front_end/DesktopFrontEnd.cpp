@@ -128,6 +128,11 @@ void DesktopFrontEnd::frameWritten(const std::filesystem::path& file, int writte
     breatheWhenDue();
 }
 
+void DesktopFrontEnd::recordingEnded(const RecordingReport& report) {
+    if (m_parts.recording_ended)
+        m_parts.recording_ended(report);
+}
+
 void DesktopFrontEnd::pictureRendered(double share) {
     if (m_parts.picture_rendered)
         m_parts.picture_rendered(share);

@@ -31,6 +31,7 @@ struct FrontEndParts {
     std::function<std::unique_ptr<DialogWindow>(const DialogTemplate& form, QWidget* owner)>
         make_dialog;
     std::function<void(const std::filesystem::path& file, int written, int total)> frame_written;
+    std::function<void(const RecordingReport& report)> recording_ended;
     std::function<void(double share)> picture_rendered;
     std::function<void(CQuarnView& view, const ShownPicture& picture)> view_shown;
     std::function<void(const ShownPicture& picture)> render_window_shown;
@@ -67,6 +68,7 @@ public:
     bool isInterrupted() const override;
     HWND mainWindow() override;
     void frameWritten(const std::filesystem::path& file, int written, int total) override;
+    void recordingEnded(const RecordingReport& report) override;
     void pictureRendered(double share) override;
     void viewShown(CQuarnView& view, const ShownPicture& picture) override;
     void renderWindowShown(const ShownPicture& picture) override;

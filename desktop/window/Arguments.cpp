@@ -26,8 +26,11 @@ Arguments readArguments(const QStringList& arguments) {
     const QCommandLineOption script("run-script", "Runs the command lines of a file in the window.",
                                     "script");
     const QCommandLineOption exit(
-        "exit", "Ends when the script has ended: with 0, or with 1 where a command failed.");
-    parser.addOptions({help, version, language, script, exit});
+        "exit", "Ends when the script has ended: with 0, or with 1 where a command failed or "
+                "a recording lacks pictures.");
+    const QCommandLineOption overwrite(
+        "overwrite", "Recordings replace files that no recording of their name wrote.");
+    parser.addOptions({help, version, language, overwrite, script, exit});
 
     Arguments read;
     const bool is_good = parser.parse(arguments);
@@ -42,6 +45,7 @@ Arguments readArguments(const QStringList& arguments) {
     read.file = parser.positionalArguments().value(0);
     read.language = parser.value(language);
     read.script = parser.value(script);
+    read.overwrites = parser.isSet(overwrite);
     read.wants_exit = parser.isSet(exit);
     return read;
 }

@@ -10,6 +10,7 @@ struct Arguments {
     QString file;            ///< model or document to open; may be empty
     QString language;        ///< empty: the environment's
     QString script;          ///< command lines to run in the window; may be empty
+    bool overwrites = false; ///< as SessionOptions has it
     bool wants_exit = false; ///< ends when the script has
     QString answer;          ///< printed instead of opening a window: help or the version
     QString mistake;         ///< why the arguments cannot be taken; then nothing else counts

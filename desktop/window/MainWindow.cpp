@@ -1,6 +1,7 @@
 #include "desktop/window/MainWindow.h"
 
 #include "desktop/animation/AnimationBar.h"
+#include "desktop/animation/RecordingText.h"
 #include "desktop/command_line/CommandPane.h"
 #include "desktop/command_line/CommandStarter.h"
 #include "desktop/dialogs/Choosers.h"
@@ -135,6 +136,7 @@ FrontEndParts MainWindow::parts() {
     parts.frame_written = [this](const std::filesystem::path& file, int written, int total) {
         m_animation->frameWritten(file, written, total);
     };
+    parts.recording_ended = [this](const RecordingReport& report) { noteRecording(report); };
     parts.picture_rendered = [this](double share) { showRenderProgress(share); };
     parts.view_shown = [this](CQuarnView& view, const ShownPicture& picture) {
         m_views->showPicture(view, picture);
@@ -186,12 +188,21 @@ void MainWindow::showRenderProgress(double share) {
         renderWindow().showProgress(share);
 }
 
+/// The command that records succeeds wherever it came to its page; what counts is what there is.
+void MainWindow::noteRecording(const RecordingReport& report) {
+    const QString text = recordingText(report);
+    m_pane->print(wideText(text + '\n').View());
+    tell(text);
+    m_lacks_pictures = m_lacks_pictures || !report.isComplete();
+}
+
 void MainWindow::tell(const QString& message) {
     statusBar()->showMessage(message, MESSAGE_MS);
 }
 
 void MainWindow::runScript(const QString& file, bool wants_exit) {
-    const bool has_succeeded = m_starter->startScript(file);
+    m_lacks_pictures = false;
+    const bool has_succeeded = m_starter->startScript(file) && !m_lacks_pictures;
     if (wants_exit) // without the question about changes that closing the window asks
         QTimer::singleShot(0, qApp, [=] { QCoreApplication::exit(has_succeeded ? 0 : 1); });
 }

@@ -58,6 +58,7 @@ private:
     RenderPictureWindow& renderWindow();
     void showTitle();
     void saveLayout();
+    void noteRecording(const RecordingReport& report);
     void tell(const QString& message);
 
     Session& m_session;
@@ -73,6 +74,7 @@ private:
     FileDrop* m_file_drop;
     RenderPictureWindow* m_render_window = nullptr;
     QDockWidget* m_command_dock = nullptr;
+    bool m_lacks_pictures = false; ///< a recording since the script began
 };
 
 } // namespace quarn::desktop

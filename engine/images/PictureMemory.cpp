@@ -15,11 +15,6 @@ std::int64_t pixelsOf(int width_px, int height_px) {
     return std::int64_t{width_px} * height_px;
 }
 
-std::string inGigabytes(std::uint64_t bytes) {
-    const std::uint64_t tenths = (bytes * 10 + (1ULL << 29)) >> 30;
-    return std::to_string(tenths / 10) + "." + std::to_string(tenths % 10) + " GB";
-}
-
 } // namespace
 
 std::uint64_t pictureBytes(int width_px, int height_px) {
@@ -41,7 +36,7 @@ Result<void> checkPictureMemory(int width_px, int height_px, std::int64_t held_p
         return {};
     return Error{"A picture of " + std::to_string(width_px) + " by " + std::to_string(height_px) +
                  " pixels cannot be drawn: there is too little memory. It needs " +
-                 inGigabytes(needed) + ", and " + inGigabytes(free_bytes) +
+                 gigabyteText(needed) + ", and " + gigabyteText(free_bytes) +
                  " are free. Close other programs, or choose a smaller size."};
 }
 

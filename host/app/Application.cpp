@@ -107,7 +107,13 @@ void Application::tell(std::string_view message) {
     print((KM_wString::FromUtf8(message) + L"\n").View());
 }
 
+bool Application::mayWrite(const std::filesystem::path& file) const {
+    return !m_recording || m_recording->mayWrite(file);
+}
+
 void Application::pictureWritten(const std::filesystem::path& file) {
+    if (m_recording)
+        m_recording->fileWritten(file);
     RunningCommand* command = m_runner.outermost();
     if (!command)
         return;

@@ -8,6 +8,7 @@
 #include "host/document/DocumentList.h"
 #include "host/front_end/FrontEnd.h"
 #include "host/front_end/SessionOptions.h"
+#include "host/recording/RunningRecording.h"
 
 #include <filesystem>
 #include <map>
@@ -55,9 +56,19 @@ public:
     /// Shows a message of the host (UTF-8) as a line of its own.
     void tell(std::string_view message);
 
+    /// Whether a picture or a page may be written to a file now: a recording that runs leaves files
+    /// of others alone, and has told so then.
+    bool mayWrite(const std::filesystem::path& file) const;
     /// To be called after a picture was written to a file: counts it for the command that runs, and
     /// tells the front end. Without a running command nothing happens.
     void pictureWritten(const std::filesystem::path& file);
+
+    /// The recording of a whole animation that runs now, or null. RecordingScope begins and ends
+    /// it.
+    RunningRecording* recording() const { return m_recording.get(); }
+    void setRecording(std::unique_ptr<RunningRecording> recording) {
+        m_recording = std::move(recording);
+    }
 
     /// The window object for a window; null for a null window.
     CWnd* windowFor(HWND window);
@@ -81,6 +92,7 @@ private:
     CommandRunner m_runner;
     std::unique_ptr<DocumentList> m_documents;
     std::unique_ptr<PlugInLoader> m_plug_ins;
+    std::unique_ptr<RunningRecording> m_recording;
     std::map<HWND, std::unique_ptr<CWnd>> m_windows;
     const CDialog* m_open_dialog = nullptr;
     bool m_exit_requested = false;

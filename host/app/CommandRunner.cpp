@@ -3,6 +3,7 @@
 #include "ground/PathText.h"
 #include "ground/TextLines.h"
 #include "host/app/Application.h"
+#include "host/app/RecordingScope.h"
 #include "host/border/Border.h"
 #include "host/sun/MissingSun.h"
 
@@ -103,8 +104,10 @@ CQuarnCommand::result CommandRunner::execute(RunningCommand& running, const Comm
     if (m_running.empty())
         m_application.documents().commandStarted();
     m_running.push_back(&running);
-    const Result<CQuarnCommand::result> ended =
-        acrossBorder([&] { return running.command->RunCommand(context); });
+    const Result<CQuarnCommand::result> ended = acrossBorder([&] {
+        const RecordingScope recording(m_application, *running.command, *origin.document);
+        return running.command->RunCommand(context);
+    });
     m_running.pop_back();
     if (ended && ended.value() == CQuarnCommand::failure)
         m_application.print(running.likely_mistake.View());

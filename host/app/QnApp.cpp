@@ -49,8 +49,12 @@ bool CQuarnApp::RunScript(unsigned int document_serial_number, const wchar_t* sc
 }
 
 void CQuarnApp::Wait(unsigned int milliseconds) const {
-    if (quarn::Application* application = quarn::Application::forCall("CQuarnApp::Wait"))
-        application->frontEnd().pumpEvents(milliseconds);
+    quarn::Application* application = quarn::Application::forCall("CQuarnApp::Wait");
+    if (!application)
+        return;
+    application->frontEnd().pumpEvents(milliseconds);
+    if (quarn::RunningRecording* recording = application->recording())
+        recording->beat();
 }
 
 HWND CQuarnApp::MainWnd() const {

@@ -29,6 +29,8 @@ bool CQuarnDib::WriteToFile(const wchar_t* path, int) const {
     if (!application || !path || !m_image)
         return false;
     const std::filesystem::path file = quarn::pathFromText(path);
+    if (!application->mayWrite(file))
+        return false;
     const auto written = quarn::writeImageFile(file, *m_image);
     if (written)
         application->pictureWritten(file);

@@ -15,6 +15,15 @@ std::string withoutSeparatorAtEnd(std::string path) {
     return path;
 }
 
+/// A recording makes sure of its folder before each picture: before the first is drawn it is seen
+/// whether all of them may be written.
+bool mayBeRecordedInto(const std::filesystem::path& folder) {
+    quarn::Application* const application = quarn::Application::current();
+    quarn::RunningRecording* const recording =
+        application && quarn::isMainThread() ? application->recording() : nullptr;
+    return !recording || recording->begin(folder);
+}
+
 void tellFolderNotMade(const std::filesystem::path& folder, const std::error_code& error) {
     quarn::Application* const application = quarn::Application::current();
     if (!application || !quarn::isMainThread())
@@ -52,7 +61,7 @@ bool CQuarnFileUtilities::CreateDir(const wchar_t* path) {
     std::error_code why;
     std::filesystem::create_directories(folder, why);
     if (std::error_code unused; std::filesystem::is_directory(folder, unused))
-        return true;
+        return mayBeRecordedInto(folder);
     tellFolderNotMade(folder, why);
     return false;
 }

@@ -33,10 +33,24 @@ bool canBeWritten(const std::filesystem::path& asked) {
            std::filesystem::is_directory(folder, error) && access(folder.c_str(), W_OK) == 0;
 }
 
-void tell(const std::string& message) {
-    quarn::Application* const application = quarn::Application::current();
-    if (application && quarn::isMainThread())
-        application->tell(message);
+/// The application, where it can be told something; else null.
+quarn::Application* applicationHere() {
+    return quarn::isMainThread() ? quarn::Application::current() : nullptr;
+}
+
+bool mayWrite(const std::filesystem::path& file) {
+    const quarn::Application* const application = applicationHere();
+    return !application || application->mayWrite(file);
+}
+
+void noteEnd(const std::filesystem::path& file, const quarn::Result<void>& written) {
+    quarn::Application* const application = applicationHere();
+    if (!application)
+        return;
+    if (!written)
+        application->tell(written.message());
+    else if (quarn::RunningRecording* recording = application->recording())
+        recording->fileWritten(file);
 }
 
 } // namespace
@@ -51,7 +65,7 @@ bool CQnTextFile::Open(const wchar_t* path, open_mode mode, filetype type) {
     if (m_state->path || !path || mode != open_mode::write)
         return false;
     const std::filesystem::path file = quarn::pathFromText(path);
-    if (!canBeWritten(file))
+    if (!canBeWritten(file) || !mayWrite(file))
         return false;
     *m_state = {file, type, {}};
     return true;
@@ -74,7 +88,6 @@ bool CQnTextFile::Close() {
     quarn::removeLeftParts(folderOf(*closing.path));
     const quarn::Result<void> written =
         quarn::writeFileAtomically(*closing.path, std::as_bytes(std::span(bytes)));
-    if (!written)
-        tell(written.message());
+    noteEnd(*closing.path, written);
     return written.ok();
 }

@@ -66,6 +66,10 @@ CQuarnCommand::result runSaveRenderWindowAs(const CQuarnCommandContext& context)
         askFile(context, FileUse::save_rendering, QnLocalizeString(L"Image file", 42201), file);
     if (asked != CQuarnCommand::success)
         return asked;
+    if (!Application::current()->mayWrite(file)) {
+        document.list().noteUnsavedPicture("The picture was not written.");
+        return CQuarnCommand::failure;
+    }
     const auto written = writeImageFile(file, window.picture);
     document.list().noteUnsavedPicture(written ? std::string() : written.message());
     if (!written)

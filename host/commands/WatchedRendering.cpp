@@ -1,5 +1,6 @@
 #include "host/commands/WatchedRendering.h"
 
+#include "host/app/Application.h"
 #include "host/document/Document.h"
 #include "host/document/DocumentDrawing.h"
 #include "host/front_end/FrontEnd.h"
@@ -14,6 +15,8 @@ Result<RenderEnd> renderWatched(Document& document, const KM_Viewport& viewport,
     const auto watch = [&](double share) {
         front_end.pictureRendered(share);
         front_end.pumpEvents(0);
+        if (RunningRecording* const recording = Application::current()->recording())
+            recording->beat();
         return !front_end.isInterrupted() && !front_end.isKeyDown(VK_ESCAPE);
     };
     auto end = document.drawing().render(viewport, request, watch, picture, changes, shown);

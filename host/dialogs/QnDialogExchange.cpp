@@ -1,6 +1,7 @@
 #include "host/app/Application.h"
 #include "host/dialogs/DialogState.h"
 #include "host/front_end/HeadlessDialogWindow.h"
+#include "host/prompt/FrameCountAnswer.h"
 #include "host/prompt/NumberText.h"
 #include "host/prompt/UsersNumber.h"
 #include "sdk/qncore/QnDialog.h"
@@ -22,6 +23,11 @@ bool begins(CQnDialogExchange& exchange, int control) {
         return false;
     exchange.SetLastControl(control);
     return true;
+}
+
+std::optional<KM_wString> refusedFrameCount(int number) {
+    quarn::Application* application = quarn::Application::forCall("DDX_Text");
+    return application ? quarn::refuseFrameCount(*application, number) : std::nullopt;
 }
 
 /// What a control shows; the part that it does not show is taken from `kept`.
@@ -80,10 +86,12 @@ void DDX_Text(CQnDialogExchange& exchange, int control, int& value) {
         return;
     }
     const auto number = quarn::readWholeNumber(exchange.Window().text(control));
-    if (number)
-        value = *number;
-    else
+    if (!number)
         exchange.Fail(control, QnLocalizeString(L"Enter a whole number", 42413));
+    else if (const auto refusal = refusedFrameCount(*number))
+        exchange.Fail(control, refusal->Array());
+    else
+        value = *number;
 }
 
 void DDX_Text(CQnDialogExchange& exchange, int control, KM_wString& value) {

@@ -8,6 +8,8 @@ DialogWindow::~DialogWindow() = default;
 
 FrontEnd::~FrontEnd() = default;
 
+void FrontEnd::recordingEnded(const RecordingReport&) {}
+
 void FrontEnd::pictureRendered(double) {}
 
 std::unique_ptr<DialogWindow> FrontEnd::makeDialog(const DialogTemplate&, HWND) {

@@ -3,6 +3,7 @@
 #include "host/front_end/DialogTemplate.h"
 #include "host/front_end/DialogWindow.h"
 #include "host/front_end/FrontEndChoices.h"
+#include "host/front_end/RecordingReport.h"
 #include "kelmar/KM_wString.h"
 #include "sdk/qncore/QnExport.h"
 #include "sdk/qncore/QnWnd.h"
@@ -71,6 +72,9 @@ public:
     /// @param written  pictures of this recording so far, from 1
     /// @param total    frames of the animation; 0 when that is not known
     virtual void frameWritten(const std::filesystem::path& file, int written, int total) = 0;
+    /// Told once the command that records an animation has ended, also where it recorded nothing in
+    /// a folder that it had. Shows nothing unless it is overridden.
+    virtual void recordingEnded(const RecordingReport& report);
     /// Told some times a second while a picture is rendered. Shows nothing unless it is overridden.
     /// @param share  how much of the picture is done, from 0 to 1; 1 comes last, however it ended
     virtual void pictureRendered(double share);

@@ -90,6 +90,10 @@ const std::vector<FileQuestion>& ScriptedFrontEnd::fileQuestions() const {
     return m_file_questions;
 }
 
+const std::vector<RecordingReport>& ScriptedFrontEnd::recordings() const {
+    return m_recordings;
+}
+
 unsigned long long ScriptedFrontEnd::waited_ms() const {
     return m_waited_ms;
 }
@@ -133,6 +137,10 @@ HWND ScriptedFrontEnd::mainWindow() {
 }
 
 void ScriptedFrontEnd::frameWritten(const std::filesystem::path&, int, int) {}
+
+void ScriptedFrontEnd::recordingEnded(const RecordingReport& report) {
+    m_recordings.push_back(report);
+}
 
 std::unique_ptr<DialogWindow> ScriptedFrontEnd::makeDialog(const DialogTemplate& form, HWND) {
     m_dialogs.push_back(form);

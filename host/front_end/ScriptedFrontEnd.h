@@ -61,6 +61,8 @@ public:
     const std::vector<LocationQuestion>& locationQuestions() const;
     /// What chooseFile was asked so far.
     const std::vector<FileQuestion>& fileQuestions() const;
+    /// What became of the recordings so far.
+    const std::vector<RecordingReport>& recordings() const;
     /// How many milliseconds of waiting were asked for.
     unsigned long long waited_ms() const;
 
@@ -75,6 +77,7 @@ public:
     bool isInterrupted() const override;
     HWND mainWindow() override;
     void frameWritten(const std::filesystem::path& file, int written, int total) override;
+    void recordingEnded(const RecordingReport& report) override;
     /// @return null when no script is queued
     std::unique_ptr<DialogWindow> makeDialog(const DialogTemplate& form, HWND owner) override;
     std::optional<Place> chooseLocation(std::wstring_view title, const Place& start) override;
@@ -94,6 +97,7 @@ private:
     std::vector<FolderQuestion> m_folder_questions;
     std::vector<LocationQuestion> m_location_questions;
     std::vector<FileQuestion> m_file_questions;
+    std::vector<RecordingReport> m_recordings;
     unsigned long long m_waited_ms = 0;
     bool m_interrupted = false;
 };

@@ -1,6 +1,7 @@
 #include "host/prompt/PromptAsking.h"
 
 #include "host/app/Application.h"
+#include "host/prompt/FrameCountAnswer.h"
 #include "host/prompt/ObjectAnswer.h"
 #include "host/prompt/OptionPick.h"
 #include "host/prompt/PromptAnswer.h"
@@ -124,6 +125,21 @@ void tellNoOption(Application& application, RunningCommand& command, const Reply
         command.likely_mistake = message;
 }
 
+/// Takes an answer, if also the memory that it would ask for is there.
+/// @return as takeAnswer
+std::optional<KM_wString> takeReply(Application& application, const Reply& reply,
+                                    PromptState& prompt) {
+    std::optional<KM_wString> request = takeAnswer(prompt, reply.answer, reply.literal);
+    const bool is_count =
+        prompt.kind == Question::Kind::integer && prompt.result == CQuarnGet::number;
+    if (request || !is_count)
+        return request;
+    request = refuseFrameCount(application, prompt.whole_number);
+    if (request)
+        prompt.result = CQuarnGet::no_result;
+    return request;
+}
+
 CQuarnGet::result cancel(PromptState& prompt) {
     takeAnswer(prompt, {Answer::Kind::cancel, {}}, false);
     return prompt.result;
@@ -153,7 +169,7 @@ CQuarnGet::result askQuestion(PromptState& prompt, const char* call) {
             tellMissingAnswer(*application, *command, prompt);
             return cancel(prompt);
         }
-        const std::optional<KM_wString> request = takeAnswer(prompt, reply.answer, reply.literal);
+        const std::optional<KM_wString> request = takeReply(*application, reply, prompt);
         if (!request && isMistakenForOption(prompt, reply))
             tellNoOption(*application, *command, reply, prompt);
         if (!request)

@@ -40,7 +40,8 @@ page; a second Ctrl-C ends the program at once.)";
 
 inline constexpr const char* TURNTABLE_FOOTER = R"(
 The model is framed so that it fills the pictures well during the whole turn. The pictures are
-named NAME000, NAME001, ... and NAME.html plays them in a browser.
+named NAME000, NAME001, ... and NAME.html plays them in a browser. NAME.recording beside them says
+which files are the recording's: others are not replaced without --overwrite.
 
 Examples:
   quarn turntable house.glb --frames 120 --out out/house
@@ -137,7 +138,8 @@ Examples:
 
 inline constexpr const char* RUN_FOOTER = R"(
 A script holds one host command a line; the words after a command's name answer its questions.
-Blank lines and lines that start with # are skipped. The first command that fails ends the run.
+Blank lines and lines that start with # are skipped. The first command that fails ends the run. A
+recording that lacks pictures at its end is a failure too, told when the script has ended.
 
 Example (steps.txt):
   # a turntable of the model that is read first; the folder out must be there

@@ -74,6 +74,7 @@ Action addRun(CLI::App& command) {
     const auto script = std::make_shared<std::string>();
     command.add_option("SCRIPT", *script, "The script file")->type_name("")->required();
     addModel(command, *wish, "A model file or document to read first");
+    addOverwrite(command, wish->common);
     addCommonOptions(command, wish->common);
     return [=] { return runScript(*script, wish->model, wish->common); };
 }
@@ -81,6 +82,7 @@ Action addRun(CLI::App& command) {
 Action addConsole(CLI::App& command) {
     const auto wish = std::make_shared<FileWish>();
     addModel(command, *wish, "A model file or document to read first");
+    addOverwrite(command, wish->common);
     addCommonOptions(command, wish->common);
     return [=] { return runConsole(wish->model, wish->common); };
 }

@@ -70,6 +70,11 @@ void addShowScript(CLI::App& command, bool& is_only_shown) {
                      "Print the host commands that would be run, and run nothing");
 }
 
+void addOverwrite(CLI::App& command, CommonOptions& common) {
+    command.add_flag("--overwrite", common.overwrites,
+                     "Replace files that a recording of this name did not write");
+}
+
 void addModelAndFolder(const OptionAdder& add, RecordingRequest& request) {
     add("MODEL", request.model, "", scriptWord("the model's path"),
         "The model file: OBJ, glTF, GLB, PLY, STL, ...; or a document")
@@ -98,6 +103,7 @@ void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse
         "Name of the animation (default: the model file's)");
     add("--save", request.document, "DOC", documentFile(),
         "Keep the document with its animation in this .quarn file, before recording");
+    addOverwrite(command, use.common);
     addShowScript(command, use.is_only_shown);
     addCommonOptions(command, use.common);
 }

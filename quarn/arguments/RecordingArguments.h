@@ -17,6 +17,8 @@ template <class Request> struct Asked {
 /// What every command takes that runs the host.
 void addCommonOptions(CLI::App& command, CommonOptions& common);
 void addShowScript(CLI::App& command, bool& is_only_shown);
+/// What every command takes that may record.
+void addOverwrite(CLI::App& command, CommonOptions& common);
 
 /// What goes in and out, which a person looks for first.
 void addModelAndFolder(const OptionAdder& add, RecordingRequest& request);

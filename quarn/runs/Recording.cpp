@@ -1,5 +1,6 @@
 #include "quarn/runs/Recording.h"
 
+#include "host/session/RecordingCheck.h"
 #include "quarn/runs/OutputFolder.h"
 #include "quarn/session/Interruption.h"
 
@@ -11,54 +12,58 @@ namespace {
 
 using Clock = std::chrono::steady_clock;
 
-std::string frameCountText(int frames) {
-    return std::to_string(frames) + (frames == 1 ? " frame" : " frames");
-}
-
 /// What became of the recording, once the command that records has ended.
 class RecordingEnd {
 public:
-    RecordingEnd(const RecordingRequest& request, ConsoleFrontEnd& front_end)
-        : m_request(request), m_written(front_end.framesWritten()),
-          m_reason(front_end.lastWords()) {}
+    RecordingEnd(const RecordingRequest& request, const ConsoleFrontEnd& front_end)
+        : m_request(request), m_end(endOf(request, front_end)) {}
 
-    Outcome outcome(bool command_succeeded, Clock::duration taken) const {
-        const bool is_complete = m_written == m_request.frames;
+    Outcome outcome(Clock::duration taken) const {
+        const bool is_complete = m_end.report.isComplete();
         if (!is_complete && isInterruptionRequested())
-            return stopped(interruptedText(command_succeeded));
+            return stopped(interruptedText(m_end.report));
         if (!is_complete)
-            return Outcome::failure(incompleteText());
-        if (!command_succeeded)
+            return Outcome::failure(incompleteText(m_end));
+        if (!m_end.report.has_page)
             return Outcome::failure("all frames were written, but the page " + page() +
                                     " could not be" + reasonText() + ".");
         const double seconds = std::chrono::duration<double>(taken).count();
-        return Outcome::success(frameCountText(m_written) + " and " + page() + " in " +
-                                timeText(seconds));
+        const std::string left_over = leftOverText(m_end.report);
+        return Outcome::success(frameCountText(m_end.report.there) + " and " + page() + " in " +
+                                timeText(seconds) + (left_over.empty() ? "" : "\n" + left_over));
     }
 
 private:
+    /// A recording that never began in its folder tells why in its last words alone.
+    static EndedRecording endOf(const RecordingRequest& request, const ConsoleFrontEnd& front_end) {
+        if (!front_end.recordings().empty())
+            return front_end.recordings().back();
+        RecordingReport report;
+        report.folder = request.folder;
+        report.page = pagePath(request);
+        report.expected = request.frames;
+        return {report, front_end.lastWords()};
+    }
+
     std::string page() const { return pagePath(m_request).native(); }
-    std::string reasonText() const { return m_reason.empty() ? "" : ": " + m_reason; }
-
-    std::string countText() const {
-        return std::to_string(m_written) + " of " + frameCountText(m_request.frames);
-    }
-
-    std::string interruptedText(bool is_page_there) const {
-        const std::string text = "Stopped after " + countText();
-        return text + (is_page_there ? "; " + page() + " plays what is there."
-                                     : "; the page " + page() + " could not be written.");
-    }
-
-    std::string incompleteText() const {
-        return "only " + countText() + " were written to " + m_request.folder.native() +
-               (m_reason.empty() ? ". Is there space left?" : reasonText());
+    std::string reasonText() const {
+        return m_end.last_words.empty() ? "" : ": " + m_end.last_words;
     }
 
     const RecordingRequest& m_request;
-    int m_written;
-    std::string m_reason;
+    EndedRecording m_end;
 };
+
+/// What cannot come to its end is not begun: reading the model may take long.
+std::optional<Outcome> refuse(const RecordingRequest& request, bool overwrites) {
+    if (const auto refusal = whyTooManyFrames(request.frames))
+        return Outcome::failure(*refusal);
+    const RecordingTarget target{request.folder, request.name, request.format, request.frames,
+                                 overwrites};
+    if (const auto refusal = whyRecordingIsRefused(target))
+        return Outcome::failure(*refusal);
+    return std::nullopt;
+}
 
 Outcome record(const RecordingRequest& request, const RecordingScript& script, HostSession& host,
                Clock::time_point start) {
@@ -71,9 +76,9 @@ Outcome record(const RecordingRequest& request, const RecordingScript& script, H
         return stopped("Stopped before anything was recorded.");
     ConsoleFrontEnd& front_end = host.frontEnd();
     front_end.beginRecording(request.frames);
-    const auto trouble = host.run(script.recording);
+    (void)host.run(script.recording); // what counts is what there is
     front_end.clearProgress();
-    return RecordingEnd(request, front_end).outcome(!trouble, Clock::now() - start);
+    return RecordingEnd(request, front_end).outcome(Clock::now() - start);
 }
 
 /// At once, so that they can be read while the recording runs.
@@ -87,9 +92,11 @@ Outcome runRecording(const RecordingRequest& request, const RecordingScript& scr
                      const CommonOptions& common) {
     const Clock::time_point start = Clock::now();
     watchForInterruption();
-    tellNotes(script);
     ConsoleFrontEnd front_end(printsFor(common));
     HostSession host(front_end, common);
+    if (const auto refusal = refuse(request, common.overwrites))
+        return *refusal;
+    tellNotes(script);
     if (const auto trouble = host.loadAnimationPlugIn())
         return *trouble;
     if (const auto trouble = host.runReading(script.reading, request.model))

@@ -4,6 +4,27 @@
 
 namespace quarn::program {
 
+namespace {
+
+int framesWritten(const ConsoleFrontEnd& front_end) {
+    int frames = 0;
+    for (const EndedRecording& recording : front_end.recordings())
+        frames += recording.report.written;
+    return frames;
+}
+
+/// The command that records succeeds wherever it came to its page; what counts is what there is.
+/// @param trouble  what ended the script; nothing where it came to its end
+Outcome outcomeOf(const std::optional<std::string>& trouble, const ConsoleFrontEnd& front_end) {
+    std::string told = trouble.value_or("");
+    for (const EndedRecording& recording : front_end.recordings())
+        if (!recording.report.isComplete())
+            told += (told.empty() ? "" : "\nquarn: ") + incompleteText(recording);
+    return told.empty() ? Outcome::success("") : Outcome::failure(told);
+}
+
+} // namespace
+
 Outcome runScript(const std::filesystem::path& script, const std::filesystem::path& model,
                   const CommonOptions& common) {
     watchForInterruption();
@@ -18,9 +39,8 @@ Outcome runScript(const std::filesystem::path& script, const std::filesystem::pa
     const std::optional<std::string> trouble = host.session().runScriptFile(script);
     front_end.clearProgress();
     if (isInterruptionRequested())
-        return stopped("Stopped; " + std::to_string(front_end.framesWritten()) +
-                       " frames were written.");
-    return trouble ? Outcome::failure(*trouble) : Outcome::success("");
+        return stopped("Stopped; " + frameCountText(framesWritten(front_end)) + " were written.");
+    return outcomeOf(trouble, front_end);
 }
 
 } // namespace quarn::program

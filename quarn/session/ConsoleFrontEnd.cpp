@@ -136,6 +136,19 @@ void ConsoleFrontEnd::frameWritten(const std::filesystem::path&, int written, in
         m_progress.show(m_pace.text());
 }
 
+/// What a person sees of everything that is printed says what became of a recording too; it is not
+/// the host's words.
+void ConsoleFrontEnd::recordingEnded(const RecordingReport& report) {
+    m_recordings.push_back({report, lastWords()});
+    if (m_prints == Prints::hidden)
+        return;
+    endLine();
+    const bool is_stopped = isInterruptionRequested() && !report.isComplete();
+    const std::string shown =
+        shownText(is_stopped ? interruptedText(report) : endText(m_recordings.back())) + "\n";
+    std::fwrite(shown.data(), 1, shown.size(), stdout);
+}
+
 bool ConsoleFrontEnd::isProgressDue() {
     const auto now = FramePace::Clock::now();
     if (now < m_next_progress)

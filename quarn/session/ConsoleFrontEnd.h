@@ -1,10 +1,12 @@
 #pragma once
 
 #include "host/front_end/FrontEnd.h"
+#include "quarn/session/RecordingText.h"
 #include "quarn/terminal/FramePace.h"
 #include "quarn/terminal/ProgressLine.h"
 
 #include <string>
+#include <vector>
 
 namespace quarn::program {
 
@@ -27,6 +29,8 @@ public:
     /// A recording of this many pictures begins: counts from 0 again, and forgets the last words.
     void beginRecording(int frames);
     int framesWritten() const { return m_frames_written; }
+    /// The recordings that have ended, in their order.
+    const std::vector<EndedRecording>& recordings() const { return m_recordings; }
 
     /// The last line that the host printed since forgetLastWords; UTF-8, empty when there is none.
     /// During a recording: since the last picture.
@@ -55,6 +59,7 @@ public:
     bool isInterrupted() const override;
     HWND mainWindow() override;
     void frameWritten(const std::filesystem::path& file, int written, int total) override;
+    void recordingEnded(const RecordingReport& report) override;
     void pictureRendered(double share) override;
 
 private:
@@ -73,6 +78,7 @@ private:
     bool m_is_inside_line = false; ///< the last text shown did not end its line
     int m_frames_written = 0;
     int m_frames_expected = 0;
+    std::vector<EndedRecording> m_recordings;
 };
 
 } // namespace quarn::program

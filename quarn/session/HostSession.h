@@ -11,7 +11,8 @@ namespace quarn::program {
 /// How a person wants the host to be run.
 struct CommonOptions {
     bool is_verbose = false;
-    std::string language; ///< empty: the environment's
+    std::string language;    ///< empty: the environment's
+    bool overwrites = false; ///< as SessionOptions has it
 };
 
 /// The host as this program runs it: with the files that are installed beside the program.

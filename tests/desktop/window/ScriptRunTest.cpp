@@ -34,5 +34,14 @@ TEST(ScriptRun, FailedCommandIsSeenInTheExitCode) {
     EXPECT_EQ(exitCodeOf("_-Line 0,0,0 1,1,1\n_-NoSuchCommand\n"), 1);
 }
 
+TEST(ScriptRun, RecordingThatWroteNothingIsSeenInTheExitCode) {
+    // Pictures of such a name have more letters than the name of a file may have; the page has not.
+    const std::string lines =
+        "_-ViewportSize 20 20\n_-AnimationName " + std::string(250, 'a') +
+        "\n_-SetTurntableAnimation 2 _Clockwise _png _Wireframe _Enter _Enter\n"
+        "_-RecordAnimation _Enter\n";
+    EXPECT_EQ(exitCodeOf(lines.c_str()), 1);
+}
+
 } // namespace
 } // namespace quarn::desktop

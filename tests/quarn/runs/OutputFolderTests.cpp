@@ -51,11 +51,15 @@ TEST(OutputFolder, ThatTakesNoFilesIsTold) {
     EXPECT_THAT(ended.err, HasSubstr("cannot write into the output folder /proc/self"));
 }
 
+/// The page, and the file that tells of the recording.
+bool isBesidePictures(const std::string& name) {
+    return name.ends_with(".html") || name.ends_with(".recording");
+}
+
 /// Every picture that is there is whole, and no half of a file stands beside them.
 void expectWholePicturesOnly(const std::filesystem::path& folder) {
     for (const std::string& name : filesIn(folder))
-        EXPECT_TRUE(name.ends_with(".html") || readPictureHeader(folder / name).has_value())
-            << name;
+        EXPECT_TRUE(isBesidePictures(name) || readPictureHeader(folder / name).has_value()) << name;
 }
 
 /// The count k of "only k of n frames were written".
@@ -69,7 +73,7 @@ int framesTold(const std::string& message, int total) {
 int picturesIn(const std::filesystem::path& folder) {
     int count = 0;
     for (const std::string& name : filesIn(folder))
-        count += !name.ends_with(".html");
+        count += !isBesidePictures(name);
     return count;
 }
 

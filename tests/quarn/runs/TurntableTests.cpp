@@ -24,8 +24,9 @@ TEST_P(FormatOfPictures, IsTheOneThatWasAskedFor) {
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     EXPECT_THAT(ended.err, IsEmpty());
     EXPECT_THAT(ended.out, MatchesRegex("3 frames and out/house\\.html in [0-9.]+ s\n"));
-    EXPECT_THAT(filesIn(studio / "out"), ElementsAre("house.html", "house000." + format,
-                                                     "house001." + format, "house002." + format));
+    EXPECT_THAT(filesIn(studio / "out"),
+                ElementsAre("house.html", "house.recording", "house000." + format,
+                            "house001." + format, "house002." + format));
     for (int frame = 0; frame < 3; ++frame) {
         const auto header =
             readPictureHeader(studio / ("out/house00" + std::to_string(frame) + "." + format));
@@ -55,7 +56,8 @@ TEST(Turntable, OfOneFrameIsOnePicture) {
     const Ended ended = run(studio.turntable(1));
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     EXPECT_THAT(ended.out, HasSubstr("1 frame and out/house.html"));
-    EXPECT_THAT(filesIn(studio / "out"), ElementsAre("house.html", "house000.jpg"));
+    EXPECT_THAT(filesIn(studio / "out"),
+                ElementsAre("house.html", "house.recording", "house000.jpg"));
 }
 
 /// The middle of all that is red, from 0 at the left to 1 at the right.
@@ -182,8 +184,9 @@ TEST(Turntable, RunAgainReplacesItsFilesAndLeavesOthers) {
     ASSERT_EQ(run(studio.turntable(3, {"--mode", "Rendered"})).exit_code, 0);
     EXPECT_THAT(readFile(studio / "out/house001.jpg"), Not(shaded));
     EXPECT_EQ(readFile(studio / "out/notes.txt"), "mine");
-    EXPECT_THAT(filesIn(studio / "out"), ElementsAre("house.html", "house000.jpg", "house001.jpg",
-                                                     "house002.jpg", "notes.txt"));
+    EXPECT_THAT(filesIn(studio / "out"),
+                ElementsAre("house.html", "house.recording", "house000.jpg", "house001.jpg",
+                            "house002.jpg", "notes.txt"));
 }
 
 TEST(Turntable, SameModelGivesTheSamePictures) {
@@ -201,7 +204,8 @@ TEST(Turntable, PathsMayHoldBlanksAndLettersOfAnyLanguage) {
                                                {"--out", "neue Bilder/hier drin"}));
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     EXPECT_THAT(filesIn(studio / "neue Bilder/hier drin"),
-                ElementsAre("mein Häuschen.html", "mein Häuschen000.jpg", "mein Häuschen001.jpg"));
+                ElementsAre("mein Häuschen.html", "mein Häuschen.recording", "mein Häuschen000.jpg",
+                            "mein Häuschen001.jpg"));
     EXPECT_THAT(readFile(studio / "neue Bilder/hier drin/mein Häuschen.html"),
                 HasSubstr("<TITLE>mein Häuschen</TITLE>"));
 }
@@ -212,7 +216,8 @@ TEST(Turntable, NamesThatAnswerPromptsStayNames) {
     std::filesystem::create_directory(studio / "_Cancel");
     const Ended ended = run(studio.turntableOf("_Enter.obj", 1, {"--out", "_Cancel"}));
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
-    EXPECT_THAT(filesIn(studio / "_Cancel"), ElementsAre("_Enter.html", "_Enter000.jpg"));
+    EXPECT_THAT(filesIn(studio / "_Cancel"),
+                ElementsAre("_Enter.html", "_Enter.recording", "_Enter000.jpg"));
 }
 
 TEST(Turntable, RecordsTheSameInALocaleWithADecimalComma) {
@@ -254,7 +259,8 @@ TEST(Turntable, ShownScriptRunsAsItIs) {
     start.arguments = {"run", "steps.txt"};
     const Ended ended = run(start);
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
-    EXPECT_THAT(filesIn(studio / "out"), ElementsAre("house.html", "house000.png", "house001.png"));
+    EXPECT_THAT(filesIn(studio / "out"),
+                ElementsAre("house.html", "house.recording", "house000.png", "house001.png"));
 }
 
 } // namespace

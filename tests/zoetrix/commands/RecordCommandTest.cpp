@@ -81,7 +81,8 @@ TEST_F(RecordCommand, WithoutAnimationThereIsNothingToRecord) {
 
 TEST_F(RecordCommand, EnterRecordsIntoTheStoredFolder) {
     ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
-    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk000.jpg", "Walk001.jpg", "Walk002.jpg"));
+    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk.recording", "Walk000.jpg", "Walk001.jpg",
+                                     "Walk002.jpg"));
     expectThreeFramesAndThePageIn(frames);
     EXPECT_THAT(images(), ElementsAre(L"Walk000.jpg", L"Walk001.jpg", L"Walk002.jpg"));
     EXPECT_EQ(2, record().CurrentFrame());
@@ -215,7 +216,8 @@ TEST_F(RecordCommand, PageThatCannotBeWrittenFailsWithoutAWordAndStoresNothing) 
     EXPECT_EQ(L"", printed());
     EXPECT_TRUE(before == bytesOf(record()));
     // The frames were written before.
-    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk000.jpg", "Walk001.jpg", "Walk002.jpg"));
+    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk.recording", "Walk000.jpg", "Walk001.jpg",
+                                     "Walk002.jpg"));
     EXPECT_EQ(CQuarnCommand::failure, recordWith({L"RunAnimation=No", L"_Cancel"}));
 }
 
@@ -254,7 +256,7 @@ TEST_F(RecordCommand, RenderThatIsCancelledStopsWithAPageOfNoFrames) {
     record().SetRenderFull(true);
     front_end.setKeyDown(VK_ESCAPE, true);
     ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
-    EXPECT_THAT(files(), ElementsAre("Walk.html"));
+    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk.recording"));
     EXPECT_THAT(readFile(frames / "Walk.html"), HasSubstr("var ImageCount = 0;"));
     EXPECT_THAT(images(), IsEmpty());
     EXPECT_EQ(0, record().CurrentFrame());
@@ -312,7 +314,7 @@ TEST_F(RecordCommand, RenderedPictureThatCannotBeSavedEndsTheRecording) {
     record().SetRenderPreview(true);
     std::filesystem::create_directories(frames / "Walk001.jpg");
     ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
-    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk000.jpg", "Walk001.jpg"));
+    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk.recording", "Walk000.jpg", "Walk001.jpg"));
     EXPECT_TRUE(std::filesystem::is_directory(frames / "Walk001.jpg"));
     // A picture that was rendered counts; the next one is not begun.
     EXPECT_THAT(images(), ElementsAre(L"Walk000.jpg", L"Walk001.jpg"));
@@ -323,6 +325,53 @@ TEST_F(RecordCommand, RenderedPictureThatCannotBeSavedEndsTheRecording) {
     std::filesystem::remove(frames / "Walk001.jpg");
     ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
     expectThreeFramesAndThePageIn(frames);
+}
+
+TEST_F(RecordCommand, RenderedPicturesThatWereNotSavedAreNotCounted) {
+    renderSmall();
+    record().SetRenderPreview(true);
+    std::filesystem::create_directories(frames / "Walk001.jpg");
+    ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
+    ASSERT_EQ(1U, front_end.recordings().size());
+    const quarn::RecordingReport& report = front_end.recordings()[0];
+    EXPECT_EQ(3, report.expected);
+    EXPECT_EQ(1, report.written);
+    EXPECT_EQ(1, report.there);
+    EXPECT_TRUE(report.has_page);
+    EXPECT_EQ(frames / "Walk.html", report.page);
+}
+
+TEST_F(RecordCommand, PictureOfAnotherOriginIsLeftAloneAndNothingIsRecordedBesideIt) {
+    std::filesystem::create_directories(frames);
+    writeFile(frames / "Walk001.jpg", "a texture");
+    for (const bool renders : {false, true}) {
+        renderSmall();
+        record().SetRenderPreview(renders);
+        EXPECT_EQ(CQuarnCommand::failure, recordWith({L"_Enter"}));
+        EXPECT_THAT(files(), ElementsAre("Walk001.jpg"));
+        EXPECT_EQ("a texture", readFile(frames / "Walk001.jpg"));
+        EXPECT_THAT(printed(), HasSubstr(L"/Walk001.jpg is not replaced: no recording named Walk "
+                                         L"wrote it."));
+        EXPECT_EQ(0, front_end.recordings().back().written);
+    }
+}
+
+TEST_F(RecordCommand, FilesOfAnotherOriginMayBeSavedOverByCommandsThatNameThem) {
+    renderSmall();
+    writeFile(folder.path() / "Walk000.jpg", "mine");
+    ASSERT_EQ(CQuarnCommand::success, run(L"RenderPreview"));
+    EXPECT_EQ(CQuarnCommand::success,
+              run(L"SaveRenderWindowAs \"" + wide(folder.path() / "Walk000.jpg") + L"\""));
+    EXPECT_TRUE(isJpeg(folder.path() / "Walk000.jpg"));
+}
+
+TEST_F(RecordCommand, NotesWhatIsRecorded) {
+    ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
+    const std::string noted = readFile(frames / "Walk.recording");
+    for (const char* part :
+         {"\"kind\": \"turntable\"", "\"frames\": 3", "\"width_px\": 64", "\"height_px\": 48",
+          "\"mode\": \"Rendered\"", "\"extension\": \"jpg\"", "\"state\": \"ended\""})
+        EXPECT_THAT(noted, HasSubstr(part));
 }
 
 TEST_F(RecordCommand, NamesThatLeaveTheFolderGiveNeitherFrameNorPage) {
@@ -380,7 +429,8 @@ TEST_F(RecordCommand, PageWhosePathHasAQuoteIsNotOpened) {
     ASSERT_EQ(CQuarnCommand::success, recordWith({L"RunAnimation=Yes", L"_Enter"}));
     EXPECT_THAT(printed(), Not(HasSubstr(L"_Run \"")));
     EXPECT_EQ("", opener.opened());
-    EXPECT_THAT(files(), ElementsAre("a\"b.html", "a\"b000.jpg", "a\"b001.jpg", "a\"b002.jpg"));
+    EXPECT_THAT(files(), ElementsAre("a\"b.html", "a\"b.recording", "a\"b000.jpg", "a\"b001.jpg",
+                                     "a\"b002.jpg"));
     ASSERT_EQ(CQuarnCommand::success, recordWith({L"RunAnimation=No", L"_Enter"}));
 }
 
@@ -396,7 +446,7 @@ TEST_F(RecordCommand, InterruptedRecordingKeepsItsFramesAndWritesThePage) {
     setUpCameraFrames(10);
     record().SetFolderName(wide(frames));
     EXPECT_EQ(CQuarnCommand::success, session->runCommand(L"RecordAnimation _Enter"));
-    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk000.jpg", "Walk001.jpg"));
+    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk.recording", "Walk000.jpg", "Walk001.jpg"));
     EXPECT_THAT(readFile(frames / "Walk.html"), HasSubstr("var ImageCount = 2;"));
     EXPECT_EQ(2, record().Images().Count());
     session.reset();

@@ -1,0 +1,173 @@
+#include "host/recording/RecordingFile.h"
+
+#include "ground/AtomicFile.h"
+#include "ground/FileBytes.h"
+#include "ground/PathText.h"
+#include "sdk/qncore/QnLocalize.h"
+
+#include <limits>
+#include <nlohmann/json.hpp>
+
+namespace quarn {
+
+namespace {
+
+using json = nlohmann::json;
+
+constexpr const char* format_name = "quarn-recording";
+constexpr int format_version = 1;
+
+// ---- To JSON
+
+json jsonOf(const FrameSet& frames) {
+    json ranges = json::array();
+    for (const FrameSet::Range& range : frames.ranges())
+        ranges.push_back({range.first, range.last});
+    return ranges;
+}
+
+json jsonOf(const PicturesByExtension& pictures) {
+    json object = json::object();
+    for (const auto& [extension, frames] : pictures)
+        object[extension] = jsonOf(frames);
+    return object;
+}
+
+json jsonOf(const RecordingSettings& settings) {
+    return {{"kind", settings.kind},         {"frames", settings.frames},
+            {"width_px", settings.width_px}, {"height_px", settings.height_px},
+            {"mode", settings.mode},         {"extension", settings.extension}};
+}
+
+json jsonOf(const RecordingFile& recording) {
+    json object = {{"format", format_name},
+                   {"version", format_version},
+                   {"name", recording.animation},
+                   {"state", recording.is_running ? "recording" : "ended"},
+                   {"writer",
+                    {{"host", recording.writer.host},
+                     {"pid", recording.writer.pid},
+                     {"started", recording.writer.started}}},
+                   {"settings", jsonOf(recording.settings)},
+                   {"written", jsonOf(recording.written)},
+                   {"owns_page", recording.owns_page},
+                   {"earlier", jsonOf(recording.earlier)}};
+    if (recording.is_running)
+        object["lease_until_unix_s"] = recording.lease_until_s;
+    return object;
+}
+
+// ---- From JSON. What has another type than it should throws, which ends in parseRecording.
+
+int intOf(const json& value) {
+    const auto number = value.get<std::int64_t>();
+    if (number < 0 || number > std::numeric_limits<int>::max())
+        throw std::out_of_range("number");
+    return static_cast<int>(number);
+}
+
+FrameSet framesOf(const json& ranges) {
+    FrameSet frames;
+    for (const json& range : ranges) {
+        const int first = intOf(range.at(0));
+        const int last = intOf(range.at(1));
+        if (first > last)
+            throw std::out_of_range("range");
+        frames.add(FrameSet::Range{first, last});
+    }
+    return frames;
+}
+
+PicturesByExtension picturesOf(const json& object) {
+    PicturesByExtension pictures;
+    for (const auto& [extension, frames] : object.items())
+        pictures[extension] = framesOf(frames);
+    return pictures;
+}
+
+RecordingSettings settingsOf(const json& object) {
+    return {object.at("kind"),
+            intOf(object.at("frames")),
+            intOf(object.at("width_px")),
+            intOf(object.at("height_px")),
+            object.at("mode"),
+            object.at("extension")};
+}
+
+RecordingFile recordingOf(const json& object) {
+    RecordingFile recording;
+    recording.animation = object.at("name");
+    recording.is_running = object.at("state") == "recording";
+    const json& writer = object.at("writer");
+    recording.writer = {writer.at("host"), intOf(writer.at("pid")),
+                        writer.at("started").get<std::uint64_t>()};
+    if (recording.is_running)
+        recording.lease_until_s = object.at("lease_until_unix_s").get<std::int64_t>();
+    recording.settings = settingsOf(object.at("settings"));
+    recording.written = framesOf(object.at("written"));
+    recording.owns_page = object.at("owns_page");
+    recording.earlier = picturesOf(object.at("earlier"));
+    return recording;
+}
+
+Error notARecording(const std::filesystem::path& file) {
+    return {KM_wString::FormatToString(
+                QnLocalizeString(L"%s does not tell of a recording, so it cannot be seen which "
+                                 L"pictures may be replaced. Move that file away, record into "
+                                 L"another folder or under another name, or start the program with "
+                                 L"--overwrite.",
+                                 42533),
+                textFromPath(file).Array())
+                .ToUtf8()};
+}
+
+Error ofALaterVersion(const std::filesystem::path& file) {
+    return {KM_wString::FormatToString(
+                QnLocalizeString(L"%s was written by a later version of the program. Record with "
+                                 L"that one, into another folder or under another name.",
+                                 42534),
+                textFromPath(file).Array())
+                .ToUtf8()};
+}
+
+Result<std::optional<RecordingFile>> parseRecording(std::string_view text,
+                                                    const std::filesystem::path& file) {
+    try {
+        const json object = json::parse(text);
+        if (object.at("format") != format_name)
+            return notARecording(file);
+        if (object.at("version").get<int>() > format_version)
+            return ofALaterVersion(file);
+        return std::optional(recordingOf(object));
+    } catch (const json::exception&) {
+        return notARecording(file);
+    } catch (const std::out_of_range&) {
+        return notARecording(file);
+    }
+}
+
+} // namespace
+
+Result<std::optional<RecordingFile>> readRecordingFile(const std::filesystem::path& file) {
+    std::error_code error;
+    if (!std::filesystem::exists(std::filesystem::symlink_status(file, error)))
+        return std::optional<RecordingFile>();
+    const Result<FileBytes> read = readFileBytes(file);
+    if (!read)
+        return notARecording(file);
+    const auto bytes = read.value().bytes();
+    return parseRecording({reinterpret_cast<const char*>(bytes.data()), bytes.size()}, file);
+}
+
+Result<void> writeRecordingFile(const std::filesystem::path& file, const RecordingFile& recording) {
+    const std::string text =
+        jsonOf(recording).dump(2, ' ', false, json::error_handler_t::replace) + "\n";
+    return writeFileAtomically(file, std::as_bytes(std::span(text)));
+}
+
+bool isRecordedElsewhere(const RecordingFile& recording, std::int64_t now_s) {
+    return recording.is_running && recording.writer != currentProcess() &&
+           !hasEnded(recording.writer) && now_s < recording.lease_until_s;
+}
+
+} // namespace quarn

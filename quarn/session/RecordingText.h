@@ -1,0 +1,34 @@
+#pragma once
+
+#include "host/front_end/RecordingReport.h"
+
+#include <string>
+
+namespace quarn::program {
+
+/// A recording that has ended.
+struct EndedRecording {
+    RecordingReport report;
+    /// What the host told last since the last picture: why there are no more. UTF-8.
+    std::string last_words;
+};
+
+/// "1 frame", "12 frames"
+std::string frameCountText(int frames);
+
+/// What a recording lacks, as a sentence: how many of its pictures were written, how many are
+/// there, and what its page shows then.
+std::string incompleteText(const EndedRecording& recording);
+
+/// What a recording that a person stopped has written, and whether its page plays that.
+std::string interruptedText(const RecordingReport& report);
+
+/// "out still holds 5 pictures of an earlier recording: house005.jpg, ..."; empty where it does
+/// not.
+std::string leftOverText(const RecordingReport& report);
+
+/// What a whole recording has written: "3 frames were written to out; out/house.html plays them."
+/// and what is left over there; for every other one incompleteText.
+std::string endText(const EndedRecording& recording);
+
+} // namespace quarn::program

@@ -1,0 +1,109 @@
+#include "host/recording/RecordingFile.h"
+
+#include "tests/support/TempFolder.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+namespace quarn::test {
+namespace {
+
+using testing::HasSubstr;
+
+RecordingFile sample() {
+    RecordingFile recording;
+    recording.animation = "Häuschen \"2\"";
+    recording.is_running = true;
+    recording.writer = {"host-1", 4711, 123456789012345ULL};
+    recording.lease_until_s = 1795320936;
+    recording.settings = {"turntable", 150, 1280, 720, "Rendered", "jpg"};
+    recording.written = FrameSet::firstOf(44);
+    recording.written.add(50);
+    recording.owns_page = true;
+    recording.earlier["png"] = FrameSet::firstOf(12);
+    return recording;
+}
+
+class RecordingFileOnDisk : public testing::Test {
+protected:
+    const TempFolder folder;
+    const std::filesystem::path file = folder / "house.recording";
+};
+
+TEST_F(RecordingFileOnDisk, ReadsBackWhatWasWritten) {
+    RecordingFile recording = sample();
+    ASSERT_TRUE(writeRecordingFile(file, recording).ok());
+    ASSERT_TRUE(readRecordingFile(file).ok());
+    EXPECT_EQ(readRecordingFile(file).value(), recording);
+    recording.is_running = false;
+    recording.lease_until_s = 0;
+    ASSERT_TRUE(writeRecordingFile(file, recording).ok());
+    EXPECT_EQ(readRecordingFile(file).value(), recording);
+}
+
+TEST_F(RecordingFileOnDisk, ThatIsMissingIsNoRecordingAndNoError) {
+    const auto read = readRecordingFile(file);
+    ASSERT_TRUE(read.ok());
+    EXPECT_FALSE(read.value());
+}
+
+TEST_F(RecordingFileOnDisk, ThatIsSomethingElseIsToldWithItsName) {
+    ASSERT_TRUE(writeRecordingFile(file, sample()).ok());
+    const std::string good = readFile(file);
+    const auto replaced = [&](const std::string& part, const std::string& by) {
+        std::string text = good;
+        text.replace(text.find(part), part.size(), by);
+        return text;
+    };
+    for (const std::string& text :
+         {std::string(), std::string("my notes"), std::string("[]"), std::string("{}"),
+          std::string(100000, '['), good.substr(0, good.size() / 2),
+          replaced("quarn-recording", "another"), replaced("4711", "-4711"),
+          replaced("4711", "\"4711\""), replaced("150", "15000000000"), replaced("\"jpg\"", "7"),
+          replaced("4711", "1e300")}) {
+        writeFile(file, text);
+        const auto read = readRecordingFile(file);
+        ASSERT_FALSE(read.ok()) << text;
+        EXPECT_THAT(read.message(), HasSubstr(file.string()));
+        EXPECT_THAT(read.message(), HasSubstr("--overwrite"));
+    }
+}
+
+TEST_F(RecordingFileOnDisk, OfALaterVersionIsToldAsThat) {
+    ASSERT_TRUE(writeRecordingFile(file, sample()).ok());
+    std::string text = readFile(file);
+    text.replace(text.find("\"version\": 1"), 12, "\"version\": 2");
+    writeFile(file, text);
+    const auto read = readRecordingFile(file);
+    ASSERT_FALSE(read.ok());
+    EXPECT_THAT(read.message(), HasSubstr("later version"));
+}
+
+TEST_F(RecordingFileOnDisk, MayHoldFieldsThatALaterStepAdds) {
+    ASSERT_TRUE(writeRecordingFile(file, sample()).ok());
+    std::string text = readFile(file);
+    text.insert(1, "\"checksums\": {\"house000.jpg\": \"abc\"},");
+    writeFile(file, text);
+    EXPECT_EQ(readRecordingFile(file).value(), sample());
+}
+
+TEST(RecordedElsewhere, OnlyWhileTheLeaseOfAnotherLivingProcessLasts) {
+    constexpr std::int64_t now_s = 1000;
+    RecordingFile recording = sample();
+    recording.writer = {"another-machine", 1, 0};
+    recording.lease_until_s = now_s + 1;
+    EXPECT_TRUE(isRecordedElsewhere(recording, now_s));
+    EXPECT_FALSE(isRecordedElsewhere(recording, now_s + 1)) << "the lease has run out";
+    recording.writer = {hostName(), 1, 0};
+    EXPECT_TRUE(isRecordedElsewhere(recording, now_s)) << "the first process of a machine lives";
+    recording.writer = {hostName(), 1, 987654321};
+    EXPECT_FALSE(isRecordedElsewhere(recording, now_s)) << "another one has its number";
+    recording.writer = currentProcess();
+    EXPECT_FALSE(isRecordedElsewhere(recording, now_s)) << "this process";
+    recording.writer = {"another-machine", 1, 0};
+    recording.is_running = false;
+    EXPECT_FALSE(isRecordedElsewhere(recording, now_s)) << "it has ended";
+}
+
+} // namespace
+} // namespace quarn::test
