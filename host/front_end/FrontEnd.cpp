@@ -8,6 +8,10 @@ DialogWindow::~DialogWindow() = default;
 
 FrontEnd::~FrontEnd() = default;
 
+void FrontEnd::warn(std::wstring_view text) {
+    print(std::wstring(text) + L"\n");
+}
+
 void FrontEnd::pictureRendered(double) {}
 
 std::unique_ptr<DialogWindow> FrontEnd::makeDialog(const DialogTemplate&, HWND) {
