@@ -10,6 +10,7 @@
 #include <array>
 #include <cmath>
 #include <cstdint>
+#include <limits>
 #include <span>
 #include <utility>
 #include <vector>
@@ -265,8 +266,7 @@ bool hasArea(const KM_Mesh& mesh) {
 }
 
 bool isUsableCoordinate(double coordinate) {
-    constexpr double largest = 1e15;
-    return std::isfinite(coordinate) && std::abs(coordinate) <= largest;
+    return std::abs(coordinate) <= double{std::numeric_limits<float>::max()};
 }
 
 } // namespace quarn

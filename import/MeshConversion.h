@@ -37,8 +37,8 @@ void completeMesh(KM_Mesh& mesh);
 /// False when the corners of each triangle lie on a line or at one place, but for rounding.
 bool hasArea(const KM_Mesh& mesh);
 
-/// True for a coordinate that can be drawn: a number, and small enough that distances between such
-/// numbers do not overflow.
+/// True for a coordinate that a mesh can hold: a number of single precision. Whether it can be
+/// drawn is another question, see engine/scene/DrawableRange.h.
 bool isUsableCoordinate(double coordinate);
 
 } // namespace quarn

@@ -75,7 +75,8 @@ Result<void> DisplayPipeline::draw(const DisplayScene& scene, const KM_Viewport&
     image.resize(width, height);
     // Pixels are written as whole 32-bit words; the storage is aligned for them.
     frame.pixels = reinterpret_cast<std::uint32_t*>(image.rgba.data());
-    const bool has_lines = LineDrawing::hasLines(scene, mode);
+    const bool has_lines =
+        scene.canBeSeenBy(viewport, width, height) && LineDrawing::hasLines(scene, mode);
     const bool hides_lines = has_lines && frame.scene && !mode.shows_hidden_lines;
     DepthImage* const depth_used = depth ? depth : (hides_lines ? &m_depth : nullptr);
     if (depth_used) {

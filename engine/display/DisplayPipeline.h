@@ -30,7 +30,8 @@ public:
     explicit DisplayPipeline(const RayKernel& kernel) : m_kernel(&kernel) {}
 
     /// Draws `scene` as `viewport` sees it. The camera's opening is fitted to the picture's aspect,
-    /// the smaller half angle stays.
+    /// the smaller half angle stays. A camera that is out of range sees the background alone, see
+    /// DisplayScene::canBeSeenBy.
     ///
     /// @param width, height  pixels, 1 to max_size_px; the viewport's own screen size does not
     /// count

@@ -2,9 +2,11 @@
 
 #include "engine/display/MipTexture.h"
 #include "engine/images/ColorSpace.h"
+#include "engine/scene/DrawableRange.h"
 #include "engine/scene/PlacedMesh.h"
 
 #include <algorithm>
+#include <limits>
 #include <utility>
 
 namespace quarn {
@@ -20,13 +22,29 @@ KM_BoundingBox boxOf(const KM_3dPointArray& points) {
     return box;
 }
 
+bool canBeShown(const SceneCurve& curve) {
+    return curve.polyline.Count() > 0;
+}
+
+bool canBeShown(const ScenePoint& point) {
+    return point.location.IsValid();
+}
+
 /// @return true when an object was shown or hidden
 template <class Object>
 bool takeVisibility(const std::vector<Object>& from, std::vector<Object>& to) {
     bool changed = false;
-    for (std::size_t i = 0; i < to.size(); ++i)
-        changed |= std::exchange(to[i].visible, from[i].visible) != from[i].visible;
+    for (std::size_t i = 0; i < to.size(); ++i) {
+        const bool visible = from[i].visible && canBeShown(to[i]);
+        changed |= std::exchange(to[i].visible, visible) != visible;
+    }
     return changed;
+}
+
+/// The greatest distance of a corner from the origin, along an axis.
+double greatestCoordinate(const KM_BoundingBox& box) {
+    return std::max({std::abs(box.m_min.x), std::abs(box.m_min.y), std::abs(box.m_min.z),
+                     std::abs(box.m_max.x), std::abs(box.m_max.y), std::abs(box.m_max.z)});
 }
 
 } // namespace
@@ -44,7 +62,7 @@ Result<void> DisplayScene::update(const SceneContent& content) {
     if (error.empty())
         return {};
     clear();
-    return Error{"The scene cannot be drawn: " + error + ". Close other programs or hide objects."};
+    return Error{error};
 }
 
 bool DisplayScene::canKeep(const SceneContent& content) const {
@@ -57,6 +75,7 @@ void DisplayScene::clear() {
     m_meshes.clear();
     m_curves.clear();
     m_points.clear();
+    m_out_of_range.clear();
     m_rays.build({});
     updateBoxes();
 }
@@ -65,9 +84,11 @@ void DisplayScene::rebuild(const SceneContent& content) {
     const MeshCache earlier_meshes = std::exchange(m_mesh_cache, {});
     TextureCache earlier_textures = std::exchange(m_texture_cache, {});
     m_meshes.clear();
+    m_out_of_range.clear();
     for (const SceneMesh& object : content.meshes)
         addMesh(object, earlier_meshes);
     choosePlaces(content);
+    dropMeshesBeyondReach(content);
     std::vector<RayScene::Member> members;
     m_member_of_mesh.clear();
     for (std::size_t i = 0; i < m_meshes.size(); ++i) {
@@ -79,8 +100,7 @@ void DisplayScene::rebuild(const SceneContent& content) {
                                object.visible, object.frame_from_mesh});
     }
     m_rays.build(std::move(members));
-    m_curves = content.curves;
-    m_points = content.points;
+    takeLines(content);
     m_revision = content.revision;
     m_built = true;
     updateBoxes();
@@ -93,11 +113,11 @@ void DisplayScene::addMesh(const SceneMesh& object, const MeshCache& earlier) {
         mesh = found != earlier.end() ? found->second
                                       : std::make_shared<const RayMesh>(object.placed.mesh);
     }
-    const bool drawable = mesh->isDrawable();
-    const bool stands = object.placed.world_from_mesh.IsIdentity();
-    const KM_BoundingBox box = !drawable ? KM_BoundingBox()
-                               : stands  ? mesh->box()
-                                         : object.placed.box();
+    const bool drawable =
+        mesh->isDrawable() && isInDrawableRange(mesh->box(), object.placed.world_from_mesh);
+    if (!drawable && (mesh->isDrawable() || !mesh->isInRange()))
+        m_out_of_range.push_back(object.id);
+    const KM_BoundingBox box = drawable ? object.placed.box(mesh->box()) : KM_BoundingBox();
     m_meshes.push_back({drawable ? mesh : nullptr, object.visible, KM_Xform(), box});
 }
 
@@ -121,6 +141,52 @@ void DisplayScene::choosePlaces(const SceneContent& content) {
     const KM_Xform frame_from_world = KM_Xform::Translation(KM_3dPoint::Origin - m_origin);
     for (std::size_t i = 0; i < m_meshes.size(); ++i)
         m_meshes[i].frame_from_mesh = frame_from_world * content.meshes[i].placed.world_from_mesh;
+}
+
+/// A mesh of a very small scale cannot stand beside a very large one: in its own coordinates rays
+/// that start there would be out of range.
+void DisplayScene::dropMeshesBeyondReach(const SceneContent& content) {
+    const KM_3dVector from_world = KM_3dPoint::Origin - m_origin;
+    double size = 0.0;
+    for (const MeshObject& object : m_meshes)
+        if (object.mesh)
+            size = std::max(size, greatestCoordinate({object.box.m_min + from_world,
+                                                      object.box.m_max + from_world}));
+    m_reach = std::numeric_limits<double>::infinity();
+    for (std::size_t i = 0; i < m_meshes.size(); ++i) {
+        MeshObject& object = m_meshes[i];
+        if (!object.mesh)
+            continue;
+        const double reach = reachOfRays(object.mesh->box(), object.frame_from_mesh);
+        if (reach >= rays_start_within * size) {
+            m_reach = std::min(m_reach, reach);
+            continue;
+        }
+        m_out_of_range.push_back(content.meshes[i].id);
+        object.mesh = nullptr;
+    }
+}
+
+void DisplayScene::takeLines(const SceneContent& content) {
+    m_curves = content.curves;
+    for (SceneCurve& curve : m_curves)
+        if (!isInDrawableRange(curve.polyline)) {
+            m_out_of_range.push_back(curve.id);
+            curve.polyline.Empty();
+            curve.visible = false;
+        }
+    m_points = content.points;
+    for (ScenePoint& point : m_points)
+        if (!isInDrawableRange(point.location)) {
+            m_out_of_range.push_back(point.id);
+            point.location = KM_3dPoint::UnsetPoint;
+            point.visible = false;
+        }
+}
+
+bool DisplayScene::canBeSeenBy(const KM_Viewport& camera, int width_px, int height_px) const {
+    return isInDrawableRange(camera, width_px, height_px,
+                             {m_origin, m_box.Diagonal().Length(), m_reach});
 }
 
 std::size_t DisplayScene::meshOfSurface(std::size_t surface) const {

@@ -5,10 +5,13 @@
 #include "ground/Result.h"
 #include "kelmar/KM_BoundingBox.h"
 
+#include <cmath>
 #include <map>
 #include <memory>
 #include <span>
 #include <vector>
+
+class KM_Viewport;
 
 namespace quarn {
 
@@ -25,7 +28,8 @@ public:
 
     /// Takes over what changed since the last call: everything when the revision is new, else the
     /// lights and what is shown or hidden. Meshes stay shared with the document. A mesh with
-    /// indices outside its vertices or arrays of different lengths is not drawn.
+    /// indices outside its vertices or arrays of different lengths is not drawn, nor is an object
+    /// that is out of range, see DrawableRange.h.
     /// @return an error when the ray scene cannot be built; then the scene is empty
     Result<void> update(const SceneContent& content);
 
@@ -37,6 +41,12 @@ public:
     /// Where the coordinates of the ray scene and of `MeshObject` begin: they are those of the
     /// world, less this point, so that models far from the origin keep their digits.
     const KM_3dPoint& origin() const { return m_origin; }
+
+    /// Whether a picture of the scene can be taken; others show the background.
+    bool canBeSeenBy(const KM_Viewport& camera, int width_px, int height_px) const;
+
+    /// The objects that are never drawn, because they are out of range.
+    std::span<const KM_UUID> outOfRange() const { return m_out_of_range; }
 
     /// A mesh object for drawing its lines; `mesh` is null when it cannot be drawn.
     struct MeshObject {
@@ -50,6 +60,7 @@ public:
     std::span<const MeshObject> meshes() const { return m_meshes; }
     /// The mesh object that a surface of the ray scene belongs to, as an index in `meshes`.
     std::size_t meshOfSurface(std::size_t surface) const;
+    /// Curves and points that are out of range have no polyline and no place, and are hidden.
     std::span<const SceneCurve> curves() const { return m_curves; }
     std::span<const ScenePoint> points() const { return m_points; }
     std::span<const KM_Light> lights() const { return m_lights; }
@@ -68,6 +79,8 @@ private:
     void updateBoxes();
     void addMesh(const SceneMesh& object, const MeshCache& earlier);
     void choosePlaces(const SceneContent& content);
+    void dropMeshesBeyondReach(const SceneContent& content);
+    void takeLines(const SceneContent& content);
     void clear();
     RaySurface surfaceOf(const SceneMesh& object, const RayMesh& mesh, TextureCache& earlier);
     const MipTexture* textureOf(const Material& material, TextureCache& earlier);
@@ -81,8 +94,10 @@ private:
     std::vector<std::size_t> m_member_of_mesh; ///< index in the ray scene; none: no_member
     std::vector<SceneCurve> m_curves;
     std::vector<ScenePoint> m_points;
+    std::vector<KM_UUID> m_out_of_range;
     std::vector<KM_Light> m_lights;
     KM_3dPoint m_origin;
+    double m_reach = HUGE_VAL; ///< how far from the origin rays may start
     KM_BoundingBox m_box;
     KM_BoundingBox m_surface_box;
 };

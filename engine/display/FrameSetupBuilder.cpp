@@ -49,11 +49,22 @@ CameraRays raysIn(const DisplayScene& scene, const KM_Viewport& viewport, int wi
         return cameraRays(viewport, width, height, scene.boundingBox());
     const KM_3dVector from_world = KM_3dPoint::Origin - scene.origin();
     KM_Viewport moved = viewport;
+    moved.SetCameraLocationLock(false); // a person's lock is about the world
     moved.SetCameraLocation(viewport.CameraLocation() + from_world);
     KM_BoundingBox box;
     for (int i = 0; i < 8 && scene.boundingBox().IsValid(); ++i)
         box.Set(scene.boundingBox().Corner(i) + from_world);
     return cameraRays(moved, width, height, box);
+}
+
+/// Rays of a picture that shows the background alone: they look where the camera looks, with the
+/// opening of a usual lens, from the origin.
+CameraRays raysToBackground(const KM_Viewport& viewport, int width, int height) {
+    KM_Viewport camera;
+    camera.SetCameraLocation(KM_3dPoint::Origin);
+    camera.SetCameraDirection(-viewport.CameraZ());
+    camera.SetCameraUp(viewport.CameraY());
+    return cameraRays(camera, width, height, KM_BoundingBox());
 }
 
 FrameLight frameLight(const DirectionalLight& light) {
@@ -179,8 +190,10 @@ FrameSetup makeFrameSetup(const DisplayScene& scene, const KM_Viewport& viewport
     FrameSetup frame;
     frame.width = width;
     frame.height = height;
-    frame.rays = raysIn(scene, viewport, width, height);
-    if (mode.surface_style != SurfaceStyle::none)
+    const bool is_seen = scene.canBeSeenBy(viewport, width, height);
+    frame.rays = is_seen ? raysIn(scene, viewport, width, height)
+                         : raysToBackground(viewport, width, height);
+    if (is_seen && mode.surface_style != SurfaceStyle::none)
         setScene(frame, scene);
     setStyle(frame, mode.surface_style, scene.rays().hasSeeThrough());
     const CameraFrame camera{frame.rays.camera_x, frame.rays.camera_y, frame.rays.camera_z};

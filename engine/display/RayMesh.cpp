@@ -2,6 +2,7 @@
 
 #include "engine/display/MeshEdges.h"
 #include "engine/display/PackedNormal.h"
+#include "engine/scene/DrawableRange.h"
 
 #include <tbb/blocked_range.h>
 #include <tbb/parallel_for.h>
@@ -36,7 +37,8 @@ template <class Function> void forAll(std::size_t count, const Function& functio
 } // namespace
 
 RayMesh::RayMesh(std::shared_ptr<const KM_Mesh> mesh) : m_mesh(std::move(mesh)) {
-    m_drawable = m_mesh && canBeDrawn(*m_mesh);
+    m_in_range = !m_mesh || isInDrawableRange(*m_mesh);
+    m_drawable = m_mesh && m_in_range && canBeDrawn(*m_mesh);
     if (!m_drawable)
         return;
     m_box = m_mesh->BoundingBox();

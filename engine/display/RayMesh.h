@@ -22,9 +22,11 @@ public:
     RayMesh(const RayMesh&) = delete;
     RayMesh& operator=(const RayMesh&) = delete;
 
-    /// False when an index names no vertex or the optional arrays do not fit: such a mesh is not
-    /// drawn.
+    /// False when an index names no vertex, the optional arrays do not fit or a vertex is out of
+    /// range: such a mesh is not drawn.
     bool isDrawable() const { return m_drawable; }
+    /// False when there is a mesh and one of its vertices is out of range.
+    bool isInRange() const { return m_in_range; }
     const KM_Mesh& mesh() const { return *m_mesh; }
     const KM_BoundingBox& box() const { return m_box; }
     /// Three a triangle, or null when the mesh has no normals.
@@ -41,6 +43,7 @@ private:
     std::shared_ptr<const KM_Mesh> m_mesh;
     KM_BoundingBox m_box;
     bool m_drawable = false;
+    bool m_in_range = true;
     std::vector<std::uint32_t> m_corner_normals;
     std::vector<KM_3fPoint> m_padded_copy; ///< empty when the mesh's own vertices are padded
     mutable std::unique_ptr<MeshEdges> m_edges;

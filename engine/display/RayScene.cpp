@@ -4,9 +4,11 @@
 
 #include <algorithm>
 #include <array>
+#include <cmath>
 #include <numeric>
 #include <set>
 #include <string>
+#include <utility>
 
 namespace quarn {
 
@@ -32,21 +34,41 @@ std::array<float, 12> columnsOf(const KM_Xform& x) {
 
 SurfacePlace placeOf(const KM_Xform& x) {
     SurfacePlace place{};
+    double cofactors[3][3];
+    double largest = 0.0;
     for (int i = 0; i < 3; ++i)
         for (int j = 0; j < 3; ++j) {
             const auto at = [&](int row, int column) {
                 return x.m_xform[(i + row) % 3][(j + column) % 3];
             };
             place.linear[i][j] = static_cast<float>(x.m_xform[i][j]);
-            place.cofactors[i][j] = static_cast<float>(at(1, 1) * at(2, 2) - at(1, 2) * at(2, 1));
+            cofactors[i][j] = at(1, 1) * at(2, 2) - at(1, 2) * at(2, 1);
+            largest = std::max(largest, std::abs(cofactors[i][j]));
         }
+    const int exponent = std::ilogb(largest); // powers of two leave all digits as they are
+    for (int i = 0; i < 3; ++i)
+        for (int j = 0; j < 3; ++j)
+            place.cofactors[i][j] = static_cast<float>(std::ldexp(cofactors[i][j], -exponent));
+    place.area_scale = std::ldexp(1.0F, exponent);
     return place;
 }
 
-void noteError(void* note, RTCError, const char* message) {
+/// What the library could not do, in words for the person and with what may help.
+std::string sentenceFor(RTCError error, const char* message) {
+    if (error == RTC_ERROR_UNSUPPORTED_CPU)
+        return "The scene cannot be drawn: the ray tracing library does not run on this processor.";
+    if (error == RTC_ERROR_OUT_OF_MEMORY || !message)
+        return "The scene cannot be drawn: there is too little memory. Close other programs or "
+               "hide "
+               "objects.";
+    return "The scene cannot be drawn: " + std::string(message) +
+           ". Close other programs or hide objects.";
+}
+
+void noteError(void* note, RTCError error, const char* message) {
     auto& text = *static_cast<std::string*>(note);
     if (text.empty())
-        text = message ? message : "unknown error";
+        text = sentenceFor(error, message);
 }
 
 /// Spreads 10 bits so that two free bits follow each.
@@ -80,20 +102,25 @@ void setEnabled(RTCGeometry geometry, bool enabled) {
 
 } // namespace
 
-RayScene::RayScene() : m_error(std::make_shared<std::string>()), m_device(rtcNewDevice(nullptr)) {
+RayScene::RayScene() : m_error(std::make_shared<std::string>()) {}
+
+/// A processor that the library runs on lacks nothing but memory, or threads, which take some.
+void RayScene::startLibrary() {
     if (m_device)
+        return;
+    m_error->clear();
+    m_device = RayDevice(rtcNewDevice(nullptr));
+    if (m_device) {
         rtcSetDeviceErrorFunction(m_device.get(), noteError, m_error.get());
-    else
-        *m_error = "the ray tracing library cannot start on this processor";
+        return;
+    }
+    const RTCError error = rtcGetDeviceError(nullptr);
+    *m_error =
+        sentenceFor(error == RTC_ERROR_UNSUPPORTED_CPU ? error : RTC_ERROR_OUT_OF_MEMORY, nullptr);
 }
 
 std::string RayScene::takeError() {
-    std::string error;
-    if (m_device)
-        error.swap(*m_error);
-    else
-        error = *m_error;
-    return error;
+    return std::exchange(*m_error, {});
 }
 
 bool RayScene::standsAlone(const Member& member) const {
@@ -127,6 +154,7 @@ std::size_t RayScene::geometryCount() const {
 }
 
 void RayScene::build(std::vector<Member> members) {
+    startLibrary();
     if (!m_device)
         return;
     SoleGroups groups = soleGroups();

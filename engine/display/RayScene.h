@@ -32,7 +32,9 @@ public:
 
     RayScene();
 
-    /// Replaces everything. Scenes of large meshes that were there before are taken over.
+    /// Replaces everything. Scenes of large meshes that were there before are taken over. The first
+    /// call starts the library, which lasts as long as the scene; where it cannot start, every
+    /// further call tries again.
     void build(std::vector<Member> members);
     /// Shows or hides one member, by its index in `build`. Takes effect with the next `commit`.
     void setVisible(std::size_t member, bool visible);
@@ -58,7 +60,8 @@ public:
     /// How many meshes have search structures, however often they are shown.
     std::size_t geometryCount() const;
 
-    /// What the library complained of since the last call; empty when it did not.
+    /// What the library could not do since the last call, in a sentence for the person; empty when
+    /// it could do all.
     std::string takeError();
 
 private:
@@ -92,6 +95,7 @@ private:
     };
     using SoleGroups = std::map<GroupKey, std::shared_ptr<Group>>;
 
+    void startLibrary();
     bool standsAlone(const Member& member) const;
     GroupKey keyOf(const Member& member) const;
     void addSole(std::size_t member, SoleGroups& groups);

@@ -13,20 +13,13 @@ double dot(const double (&a)[3], const double (&b)[3]) {
     return a[0] * b[0] + a[1] * b[1] + a[2] * b[2];
 }
 
-ScreenPoint between(const ScreenPoint& a, const ScreenPoint& b, float t) {
-    return {a.x + t * (b.x - a.x), a.y + t * (b.y - a.y),
-            a.nearness + t * (b.nearness - a.nearness), a.strength + t * (b.strength - a.strength),
-            a.growth + t * (b.growth - a.growth)};
-}
-
 } // namespace
 
 ScreenProjection::ScreenProjection(const CameraRays& rays, int width, int height, float margin_px)
     : m_left(rays.left), m_top(rays.top), m_pixels_per_x(1.0 / rays.pixel_width),
       m_pixels_per_y(1.0 / rays.pixel_size), m_near(rays.line_near), m_far(rays.far_depth),
-      m_parallel(rays.parallel), m_min(-margin_px), m_max_x(static_cast<float>(width) + margin_px),
-      m_max_y(static_cast<float>(height) + margin_px), m_width(static_cast<float>(width)),
-      m_height(static_cast<float>(height)) {
+      m_parallel(rays.parallel), m_min(-margin_px), m_max_x(width + double{margin_px}),
+      m_max_y(height + double{margin_px}), m_width(width), m_height(height) {
     std::copy_n(rays.eye, 3, m_eye);
     std::copy_n(rays.camera_x, 3, m_x);
     std::copy_n(rays.camera_y, 3, m_y);
@@ -38,11 +31,10 @@ ScreenProjection::CameraPoint ScreenProjection::cameraPoint(const double (&world
     return {dot(p, m_x), dot(p, m_y), -dot(p, m_z)};
 }
 
-ScreenPoint ScreenProjection::screenPoint(const CameraPoint& p) const {
+ScreenProjection::PicturePoint ScreenProjection::picturePoint(const CameraPoint& p) const {
     const double scale = m_parallel ? 1.0 : 1.0 / p.depth;
-    return {static_cast<float>((p.x * scale - m_left) * m_pixels_per_x),
-            static_cast<float>((m_top - p.y * scale) * m_pixels_per_y),
-            static_cast<float>(m_parallel ? m_far - p.depth : scale), 1.0F, 1.0F};
+    return {(p.x * scale - m_left) * m_pixels_per_x, (m_top - p.y * scale) * m_pixels_per_y,
+            m_parallel ? m_far - p.depth : scale};
 }
 
 bool ScreenProjection::project(const double (&from)[3], const double (&to)[3],
@@ -62,8 +54,7 @@ bool ScreenProjection::project(const double (&from)[3], const double (&to)[3],
         else if (b.depth < m_near)
             b = pulled(b, a);
     }
-    segment = {screenPoint(a), screenPoint(b)};
-    return clipToPicture(segment);
+    return clipToPicture(picturePoint(a), picturePoint(b), segment);
 }
 
 float ScreenProjection::nearness(const double (&world)[3]) const {
@@ -78,39 +69,49 @@ bool ScreenProjection::project(const double (&world)[3], ScreenPoint& point) con
     const CameraPoint camera_point = cameraPoint(world);
     if (!m_parallel && camera_point.depth < m_near)
         return false;
-    point = screenPoint(camera_point);
-    return point.x >= 0.0F && point.x < m_width && point.y >= 0.0F && point.y < m_height;
+    const PicturePoint place = picturePoint(camera_point);
+    if (!(place.x >= 0.0 && place.x < m_width && place.y >= 0.0 && place.y < m_height))
+        return false;
+    point = within(place);
+    return true;
 }
 
 /// By Y.-D. Liang and B. A. Barsky, "A New Concept and Method for Line Clipping", 1984.
-bool ScreenProjection::clipToPicture(ScreenSegment& segment) const {
-    const ScreenPoint a = segment.from;
-    const ScreenPoint b = segment.to;
-    const float sum = a.x + a.y + a.nearness + b.x + b.y + b.nearness;
-    if (!std::isfinite(sum))
+bool ScreenProjection::clipToPicture(const PicturePoint& a, const PicturePoint& b,
+                                     ScreenSegment& segment) const {
+    if (!std::isfinite(a.x + a.y + a.nearness + b.x + b.y + b.nearness))
         return false;
-    float enter = 0.0F;
-    float leave = 1.0F;
-    const auto clip = [&](float start, float change, float limit, float inward) {
-        const float distance = inward * (start - limit); // negative: outside
-        const float slope = inward * change;
-        if (slope == 0.0F)
-            return distance >= 0.0F;
-        const float t = -distance / slope;
-        if (slope > 0.0F)
+    double enter = 0.0;
+    double leave = 1.0;
+    const auto clip = [&](double start, double change, double limit, double inward) {
+        const double distance = inward * (start - limit); // negative: outside
+        const double slope = inward * change;
+        if (slope == 0.0)
+            return distance >= 0.0;
+        const double t = -distance / slope;
+        if (slope > 0.0)
             enter = std::max(enter, t);
         else
             leave = std::min(leave, t);
         return enter <= leave;
     };
-    if (!clip(a.x, b.x - a.x, m_min, 1.0F) || !clip(a.x, b.x - a.x, m_max_x, -1.0F) ||
-        !clip(a.y, b.y - a.y, m_min, 1.0F) || !clip(a.y, b.y - a.y, m_max_y, -1.0F))
+    if (!clip(a.x, b.x - a.x, m_min, 1.0) || !clip(a.x, b.x - a.x, m_max_x, -1.0) ||
+        !clip(a.y, b.y - a.y, m_min, 1.0) || !clip(a.y, b.y - a.y, m_max_y, -1.0))
         return false;
-    if (leave < 1.0F)
-        segment.to = between(a, b, leave);
-    if (enter > 0.0F)
-        segment.from = between(a, b, enter);
+    const auto at = [&](double t) {
+        return PicturePoint{a.x + t * (b.x - a.x), a.y + t * (b.y - a.y),
+                            a.nearness + t * (b.nearness - a.nearness)};
+    };
+    segment = {within(enter > 0.0 ? at(enter) : a), within(leave < 1.0 ? at(leave) : b)};
     return true;
+}
+
+/// The ends of what was clipped lie on the border of the picture but for rounding, which is great
+/// where the whole line is very long: the loops over its pixels rely on it.
+ScreenPoint ScreenProjection::within(const PicturePoint& p) const {
+    return {static_cast<float>(std::clamp(p.x, m_min, m_max_x)),
+            static_cast<float>(std::clamp(p.y, m_min, m_max_y)), static_cast<float>(p.nearness),
+            1.0F, 1.0F};
 }
 
 } // namespace quarn

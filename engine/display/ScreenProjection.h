@@ -43,9 +43,17 @@ private:
         double y;
         double depth;
     };
+    /// As a ScreenPoint, of any size: single precision does not reach to where lines near the
+    /// camera leave the picture.
+    struct PicturePoint {
+        double x;
+        double y;
+        double nearness;
+    };
     CameraPoint cameraPoint(const double (&world)[3]) const;
-    ScreenPoint screenPoint(const CameraPoint& p) const;
-    bool clipToPicture(ScreenSegment& segment) const;
+    PicturePoint picturePoint(const CameraPoint& p) const;
+    bool clipToPicture(const PicturePoint& a, const PicturePoint& b, ScreenSegment& segment) const;
+    ScreenPoint within(const PicturePoint& p) const;
 
     double m_eye[3];
     double m_x[3];
@@ -58,11 +66,11 @@ private:
     double m_near;
     double m_far;
     bool m_parallel;
-    float m_min;
-    float m_max_x;
-    float m_max_y;
-    float m_width;
-    float m_height;
+    double m_min;
+    double m_max_x;
+    double m_max_y;
+    double m_width;
+    double m_height;
 };
 
 } // namespace quarn

@@ -5,7 +5,8 @@ namespace quarn {
 /// How a mesh that several objects share stands in the coordinates of the frame. Rows come first.
 struct SurfacePlace {
     float linear[3][3];    ///< turns and stretches vectors of the mesh
-    float cofactors[3][3]; ///< turns normals and, as they are not of unit length, areas
+    float cofactors[3][3]; ///< turns normals; the largest is about 1, so that squares are floats
+    float area_scale;      ///< times this they stretch areas too
 };
 
 /// The matrix times the vector.

@@ -42,9 +42,9 @@ void findDepth(FrameSetup frame, DepthImage& depth) {
 
 } // namespace
 
-RenderLines::RenderLines(const DisplayScene& scene, const FrameSetup& frame)
+RenderLines::RenderLines(const DisplayScene& scene, const FrameSetup& frame, bool is_seen)
     : m_scene(scene), m_rays(frame.rays),
-      m_has_lines(LineDrawing::hasLines(scene, *findDisplayMode(rendered_mode_id))),
+      m_has_lines(is_seen && LineDrawing::hasLines(scene, *findDisplayMode(rendered_mode_id))),
       m_has_surfaces(frame.scene != nullptr) {
     if (m_has_lines && m_has_surfaces)
         findDepth(unlit(frame), m_depth);

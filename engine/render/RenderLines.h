@@ -15,9 +15,10 @@ class DisplayScene;
 class RenderLines {
 public:
     /// Looks how near the surfaces of a picture are, where there are lines.
-    /// @param scene  must stay as it is
-    /// @param frame  of the same scene
-    RenderLines(const DisplayScene& scene, const FrameSetup& frame);
+    /// @param scene    must stay as it is
+    /// @param frame    of the same scene
+    /// @param is_seen  false: the picture shows the background alone
+    RenderLines(const DisplayScene& scene, const FrameSetup& frame, bool is_seen);
 
     /// Draws the lines over a picture of the frame's size.
     void draw(Image& image);

@@ -73,7 +73,8 @@ Result<RenderEnd> Renderer::render(const DisplayScene& scene, const KM_Viewport&
     const SampleSequence sequence(request.samples);
     const RenderSetup setup =
         makeRenderSetup(scene, viewport, request.width_px, request.height_px, sequence, *m_kernel);
-    RenderLines lines(scene, setup.frame);
+    RenderLines lines(scene, setup.frame,
+                      scene.canBeSeenBy(viewport, request.width_px, request.height_px));
     RenderLayers layers(request.width_px, request.height_px);
     SampleTaking taking(setup, *m_kernel, layers, request.samples);
     PictureSoFar so_far(layers, taking, lines, shown);

@@ -34,7 +34,8 @@ public:
     using Shown = std::function<void(const Image& picture)>;
 
     /// Renders the scene as `viewport` sees it. The camera's opening is fitted to the picture's
-    /// aspect, the smaller half angle stays.
+    /// aspect, the smaller half angle stays. A camera that is out of range sees the background
+    /// alone, see DisplayScene::canBeSeenBy.
     /// @param image  takes the picture; unchanged unless done
     /// @param shown  may be empty; it changes nothing of the picture that comes out in the end
     /// @return an error for a size or number of samples out of range, an invalid camera, and a

@@ -25,13 +25,16 @@ bool keepsAxes(const KM_Xform& x) {
 } // namespace
 
 KM_BoundingBox PlacedMesh::box() const {
-    const KM_BoundingBox own = mesh->BoundingBox();
-    if (!own.IsValid() || world_from_mesh.IsIdentity())
-        return own;
+    return box(mesh->BoundingBox());
+}
+
+KM_BoundingBox PlacedMesh::box(const KM_BoundingBox& own_box) const {
+    if (!own_box.IsValid() || world_from_mesh.IsIdentity())
+        return own_box;
     KM_BoundingBox box;
     if (keepsAxes(world_from_mesh)) {
         for (int i = 0; i < 8; ++i)
-            box.Set(world_from_mesh * own.Corner(i));
+            box.Set(world_from_mesh * own_box.Corner(i));
         return box;
     }
     for (const KM_3fPoint& vertex : mesh->m_V)

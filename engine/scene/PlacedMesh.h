@@ -21,6 +21,8 @@ struct PlacedMesh {
     /// The box of the mesh in the world: exact, and empty for a mesh without a finite vertex. Looks
     /// at every vertex only where the transform turns the mesh. There must be a mesh.
     KM_BoundingBox box() const;
+    /// The same, where the box of the mesh's own coordinates is known already.
+    KM_BoundingBox box(const KM_BoundingBox& own_box) const;
 };
 
 /// A place near which single precision is enough for what lies in a box: the origin of the world

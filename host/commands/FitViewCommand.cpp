@@ -1,6 +1,7 @@
 #include "host/commands/CommandEnd.h"
 #include "host/commands/HostCommands.h"
 #include "host/document/Document.h"
+#include "host/document/DocumentDrawing.h"
 #include "host/document/ViewFit.h"
 #include "sdk/qncore/QnGet.h"
 
@@ -31,6 +32,7 @@ void addToggle(CQuarnGetOption& get, const wchar_t* name, int name_id, bool& var
 
 CQuarnCommand::result fitActiveView(Document& document, const ViewFit& fit) {
     ViewState& view = document.activeView();
+    document.drawing().tellObjectsOutOfRange();
     const auto fitted = fitViewport(view.viewport(), document.objects(), fit);
     if (!fitted)
         return fail(fitted.message());

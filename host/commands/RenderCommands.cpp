@@ -27,7 +27,8 @@ CQuarnCommand::result renderView(Document& document, int samples) {
         return fail(trouble + " No more pictures are rendered.");
     RenderWindow& window = document.renderWindow();
     const RenderRequest request{window.settings.width_px, window.settings.height_px, samples};
-    const KM_Viewport viewport = document.list().viewToRender(document).viewport();
+    ViewState& view = document.list().viewToRender(document);
+    const KM_Viewport viewport = view.viewport();
     FrontEnd& front_end = document.frontEnd();
     Renderer::Shown so_far;
     if (front_end.mainWindow()) // else there is no render window either
@@ -35,6 +36,8 @@ CQuarnCommand::result renderView(Document& document, int samples) {
     Image picture;
     const auto end = renderWatched(document, viewport, request, picture, SceneChanges(), so_far);
     const bool is_done = end && end.value() == RenderEnd::done;
+    if (end)
+        view.tellCameraOutOfRange();
     if (is_done)
         window.picture = std::move(picture);
     if (is_done || so_far)

@@ -219,6 +219,7 @@ CQuarnCommand::result saveFrame(const Animation& animation, const FrameWish& wis
                                       : drawFrame(animation, wish, scene.value(), picture.Image());
     if (made != CQuarnCommand::success)
         return made;
+    animation.view->tellCameraOutOfRange();
     return picture.WriteToFile(textFromPath(wish.file), 0) ? CQuarnCommand::success
                                                            : CQuarnCommand::failure;
 }

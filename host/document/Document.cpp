@@ -216,7 +216,8 @@ void Document::addModel(const ImportedModel& model) {
 void Document::fitTolerance() {
     KM_BoundingBox box;
     for (const auto& object : m_objects.objects())
-        box.Union(object->boundingBox());
+        if (object->isInDrawableRange())
+            box.Union(object->boundingBox());
     const double size = box.Diagonal().Length();
     if (size > 0.0)
         m_absolute_tolerance = std::min(m_absolute_tolerance, TOLERANCE_OF_SIZE * size);

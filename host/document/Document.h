@@ -126,9 +126,9 @@ public:
     FileRemainder& fileRemainder() { return *m_file_remainder; }
 
     /// Adds all that a model file holds. Meshes are shared, not copied. The tolerance becomes a
-    /// millionth of the box of all objects where that is less than it was, so that a model of a
-    /// millimetre in a document of metres is not smaller than what counts as one point. A document
-    /// without objects takes over the units of the model.
+    /// millionth of the box of all objects in range where that is less than it was, so that a model
+    /// of a millimetre in a document of metres is not smaller than what counts as one point. A
+    /// document without objects takes over the units of the model.
     void addModel(const ImportedModel& model);
 
     /// Takes over what a document file holds, in place of what the document has; for a document

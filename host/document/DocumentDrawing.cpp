@@ -36,7 +36,19 @@ std::vector<KM_Light> DocumentDrawing::shiningLights(const SceneChanges& changes
 Result<void> DocumentDrawing::update(const SceneChanges& changes) {
     if (!m_scene)
         m_scene = std::make_unique<DocumentScene>();
-    return m_scene->update(m_document.objects(), shiningLights(changes), changes.hidden);
+    const auto updated =
+        m_scene->update(m_document.objects(), shiningLights(changes), changes.hidden);
+    if (updated)
+        m_object_warning.tell(m_document, m_scene->display().outOfRange());
+    return updated;
+}
+
+void DocumentDrawing::tellObjectsOutOfRange() {
+    std::vector<KM_UUID> ids;
+    for (const auto& object : m_document.objects().objects())
+        if (!object->isInDrawableRange())
+            ids.push_back(object->id);
+    m_object_warning.tell(m_document, ids);
 }
 
 /// Nothing that was half built is drawn the next time.
@@ -54,6 +66,7 @@ Result<void> DocumentDrawing::draw(const KM_Viewport& viewport, const DisplayMod
         const auto updated = update(changes);
         if (!updated)
             return updated;
+        m_showed_scene = m_scene->display().canBeSeenBy(viewport, width_px, height_px);
         return m_scene->draw(viewport, withEdges(mode, m_document.edgesOf(mode.id)), width_px,
                              height_px, picture);
     } catch (const std::bad_alloc&) {
@@ -70,6 +83,8 @@ Result<RenderEnd> DocumentDrawing::render(const KM_Viewport& viewport, const Ren
         const auto updated = update(changes);
         if (!updated)
             return updated.error();
+        m_showed_scene =
+            m_scene->display().canBeSeenBy(viewport, request.width_px, request.height_px);
         return Renderer().render(m_scene->display(), viewport, request, watch, picture, shown);
     } catch (const std::bad_alloc&) {
         return memoryLacks("rendered", request.width_px, request.height_px);

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "ground/Result.h"
+#include "host/document/RangeWarnings.h"
 #include "host/document/SceneChanges.h"
 
 #include <functional>
@@ -19,7 +20,8 @@ struct RenderRequest;
 enum class RenderEnd;
 
 /// How a document is drawn. The scene is built once for each revision of the objects and shared by
-/// all views; nothing of the document changes.
+/// all views; nothing of the document changes. Objects that are out of range are told once, when
+/// the scene with them is to be drawn.
 class DocumentDrawing {
 public:
     /// @param document  must outlive the drawing
@@ -39,6 +41,10 @@ public:
                              const SceneChanges& changes,
                              const std::function<void(const Image& so_far)>& shown = {});
 
+    /// Whether the camera of the picture that was drawn or rendered last was in range, so that it
+    /// shows more than the background.
+    bool showedScene() const { return m_showed_scene; }
+
     /// The scene as it is drawn now, brought up to date. Valid until the next call.
     /// @return an error when it cannot be built
     Result<const DocumentScene*> scene();
@@ -46,6 +52,9 @@ public:
     Result<void> regenerate();
     /// Frees the scene.
     void release();
+
+    /// Tells which objects are out of range, of which no scene need be built.
+    void tellObjectsOutOfRange();
 
     /// The lights that shine now: the sun, when it is on, and the lights of the table.
     std::vector<KM_Light> shiningLights() const;
@@ -57,6 +66,8 @@ private:
 
     const Document& m_document;
     std::unique_ptr<DocumentScene> m_scene; ///< null until something is drawn
+    ObjectRangeWarning m_object_warning;
+    bool m_showed_scene = true;
 };
 
 } // namespace quarn

@@ -33,7 +33,12 @@ public:
 
     /// Called when the outermost command starts: until it has ended no document and no view closes,
     /// because the command may hold it.
-    void commandStarted() { m_is_command_running = true; }
+    void commandStarted() {
+        m_is_command_running = true;
+        ++m_command_count;
+    }
+    /// How many outermost commands have started.
+    std::uint64_t commandCount() const { return m_command_count; }
     /// Called when a plug-in placed the camera of a view or chose its display mode.
     void viewPlaced(ViewState& view);
     /// The view that pictures of a document are rendered of: the one that the running command has
@@ -74,6 +79,7 @@ private:
     std::vector<std::unique_ptr<Document>> m_closed_documents;
     Document* m_active = nullptr;
     bool m_is_command_running = false;
+    std::uint64_t m_command_count = 0;
     ViewState* m_placed_view = nullptr; ///< by the command that runs; null: none
     std::string m_unsaved_picture;
     std::unique_ptr<KM_3dmAnimationProperties> m_fresh_record;

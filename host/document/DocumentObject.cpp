@@ -1,5 +1,6 @@
 #include "host/document/DocumentObject.h"
 
+#include "engine/scene/DrawableRange.h"
 #include "host/border/Contract.h"
 #include "host/document/DocumentList.h"
 
@@ -12,14 +13,24 @@ const wchar_t* DocumentObject::kind() const {
 }
 
 KM_BoundingBox DocumentObject::boundingBox() const {
-    if (placed.mesh) {
-        if (!m_mesh_box)
-            m_mesh_box = placed.box();
-        return *m_mesh_box;
-    }
+    if (placed.mesh)
+        return meshMeasure().box;
     if (curve)
         return curve->BoundingBox();
     return point ? KM_BoundingBox(*point, *point) : KM_BoundingBox::EmptyBoundingBox;
+}
+
+bool DocumentObject::isInDrawableRange() const {
+    return placed.mesh ? meshMeasure().is_in_range : quarn::isInDrawableRange(boundingBox());
+}
+
+const DocumentObject::MeshMeasure& DocumentObject::meshMeasure() const {
+    if (!m_mesh_measure) {
+        const KM_BoundingBox own_box = placed.mesh->BoundingBox();
+        m_mesh_measure = {placed.box(own_box),
+                          quarn::isInDrawableRange(own_box, placed.world_from_mesh)};
+    }
+    return *m_mesh_measure;
 }
 
 namespace {

@@ -30,11 +30,19 @@ struct DocumentObject {
     const wchar_t* kind() const;
     /// The box of the object in world coordinates.
     KM_BoundingBox boundingBox() const;
+    /// False for an object that is out of range: it is kept and listed, and not drawn.
+    bool isInDrawableRange() const;
 
     CQuarnObject face; ///< what plug-ins see of it
 
 private:
-    mutable std::optional<KM_BoundingBox> m_mesh_box; ///< found when it is first asked for
+    struct MeshMeasure {
+        KM_BoundingBox box;
+        bool is_in_range = false;
+    };
+    const MeshMeasure& meshMeasure() const;
+
+    mutable std::optional<MeshMeasure> m_mesh_measure; ///< found when it is first asked for
 };
 
 } // namespace quarn

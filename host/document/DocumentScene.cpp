@@ -1,6 +1,7 @@
 #include "host/document/DocumentScene.h"
 
 #include "engine/images/PictureMemory.h"
+#include "host/document/DisplayPolyline.h"
 #include "host/document/ObjectTable.h"
 
 #include <algorithm>
@@ -12,13 +13,6 @@ namespace {
 /// How far a drawn curve may lie beside the true one, as a share of its size: less than a pixel
 /// even when it fills the largest picture.
 constexpr double CHORD_TOLERANCE_OF_SIZE = 5e-5;
-
-KM_3dPointArray displayPolyline(const KM_Curve& curve) {
-    KM_3dPointArray points;
-    const double size = curve.BoundingBox().Diagonal().Length();
-    curve.GetDisplayPolyline(CHORD_TOLERANCE_OF_SIZE * size, points);
-    return points;
-}
 
 } // namespace
 
@@ -48,7 +42,8 @@ void DocumentScene::takeObjects(const ObjectTable& objects) {
         if (object->placed.mesh)
             m_content.meshes.push_back({object->placed, object->id});
         else if (object->curve)
-            m_content.curves.push_back({object->id, displayPolyline(*object->curve)});
+            m_content.curves.push_back(
+                {object->id, displayPolyline(*object->curve, CHORD_TOLERANCE_OF_SIZE)});
         else if (object->point)
             m_content.points.push_back({object->id, *object->point});
     }

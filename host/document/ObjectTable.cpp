@@ -147,7 +147,7 @@ int ObjectTable::selectedCount() const {
 KM_BoundingBox ObjectTable::visibleBox() const {
     KM_BoundingBox box;
     for (const auto& object : m_objects)
-        if (object->visible)
+        if (object->visible && object->isInDrawableRange())
             box.Union(object->boundingBox());
     return box;
 }

@@ -63,7 +63,7 @@ public:
     const std::vector<std::unique_ptr<DocumentObject>>& objects() const { return m_objects; }
     bool empty() const { return m_objects.empty(); }
 
-    /// The box of all visible objects; not valid when there are none.
+    /// The box of all visible objects that are in range; not valid when there are none.
     KM_BoundingBox visibleBox() const;
 
     /// Rises whenever an object is added, removed or changed, but not when it is shown, hidden,

@@ -1,9 +1,11 @@
 #include "host/document/ViewFit.h"
 
 #include "host/document/CameraMove.h"
+#include "host/document/DisplayPolyline.h"
 #include "host/document/ObjectTable.h"
 #include "host/document/Reach.h"
 #include "host/document/TurnProfile.h"
+#include "sdk/qncore/QnLocalize.h"
 
 #include <algorithm>
 #include <cmath>
@@ -28,7 +30,7 @@ class VisiblePoints {
 public:
     explicit VisiblePoints(const ObjectTable& objects) : m_objects(objects) {
         for (const auto& object : objects.objects()) {
-            if (!object->visible)
+            if (!isFitted(*object))
                 continue;
             if (object->placed.mesh)
                 m_box.Union(object->boundingBox());
@@ -41,7 +43,7 @@ public:
 
     template <class Visit> void visit(Visit&& visit) const {
         for (const auto& object : m_objects.objects()) {
-            if (!object->visible)
+            if (!isFitted(*object))
                 continue;
             if (!object->placed.mesh)
                 visitCurveOrPoint(*object, visit);
@@ -53,6 +55,10 @@ public:
     }
 
 private:
+    static bool isFitted(const DocumentObject& object) {
+        return object.visible && object.isInDrawableRange();
+    }
+
     bool isSmallCopy(const DocumentObject& object) const {
         return !object.placed.world_from_mesh.IsIdentity() && object.placed.mesh.use_count() > 2 &&
                object.boundingBox().Diagonal().Length() < SMALL_SHARE * m_box.Diagonal().Length();
@@ -79,9 +85,7 @@ private:
     template <class Visit>
     static void visitCurveOrPoint(const DocumentObject& object, Visit&& visit) {
         if (object.curve) {
-            KM_3dPointArray points;
-            const double size = object.curve->BoundingBox().Diagonal().Length();
-            object.curve->GetDisplayPolyline(CHORD_TOLERANCE_OF_SIZE * size, points);
+            const KM_3dPointArray points = displayPolyline(*object.curve, CHORD_TOLERANCE_OF_SIZE);
             std::for_each(points.begin(), points.end(), visit);
         } else if (object.point) {
             visit(*object.point);
@@ -155,6 +159,12 @@ Result<KM_Viewport> fitViewport(const KM_Viewport& viewport, const ObjectTable& 
                                 const ViewFit& fit) {
     const VisiblePoints points(objects);
     const KM_BoundingBox& box = points.box();
+    if (!box.IsValid() && std::ranges::any_of(objects.objects(), &DocumentObject::visible))
+        return Error{
+            KM_wString(QnLocalizeString(L"All that is visible lies too far from the origin "
+                                        L"to be drawn. Move or scale it first.",
+                                        42523))
+                .ToUtf8()};
     if (!box.IsValid())
         return Error{"There is nothing visible to fit into the view. Import a model or show an "
                      "object first."};

@@ -106,11 +106,17 @@ bool ViewState::render(Image& picture, int width_px, int height_px,
                        const CDisplayPipelineAttributes& attributes) {
     const auto drawn = m_document.drawing().draw(m_viewport, drawingAttributes(attributes),
                                                  width_px, height_px, picture);
-    if (!drawn)
+    if (!drawn) {
         m_document.frontEnd().print(KM_wString::FromUtf8(drawn.message() + "\n").View());
-    else
-        ++m_draw_count;
-    return drawn.ok();
+        return false;
+    }
+    ++m_draw_count;
+    tellCameraOutOfRange();
+    return true;
+}
+
+void ViewState::tellCameraOutOfRange() {
+    m_camera_warning.tell(m_document, m_document.drawing().showedScene());
 }
 
 bool ViewState::copyToFrameBuffer(const Image& picture) {

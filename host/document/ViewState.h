@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/document/RangeWarnings.h"
 #include "kelmar/KM_Viewport.h"
 #include "kelmar/KM_wString.h"
 #include "sdk/qncore/QnView.h"
@@ -74,6 +75,9 @@ public:
     ///         person has asked the program to stop, and, with a message, when memory lacks
     bool draw(Image& picture, int width_px, int height_px,
               const CDisplayPipelineAttributes& attributes);
+    /// Tells a person when the picture of this view that was drawn or rendered just now shows the
+    /// background alone.
+    void tellCameraOutOfRange();
     /// @return false for a picture of another size than the frame buffer's
     bool copyToFrameBuffer(const Image& picture);
     /// As CQuarnView::Redraw.
@@ -98,6 +102,7 @@ private:
     int m_frame_width = default_width_px;
     int m_frame_height = default_height_px;
     std::unique_ptr<Image> m_frame_buffer;
+    CameraRangeWarning m_camera_warning;
     std::uint64_t m_draw_count = 0;
     std::uint64_t m_show_count = 0;
     bool m_is_open = true;

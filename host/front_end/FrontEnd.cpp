@@ -10,6 +10,10 @@ FrontEnd::~FrontEnd() = default;
 
 void FrontEnd::recordingEnded(const RecordingReport&) {}
 
+void FrontEnd::warn(std::wstring_view text) {
+    print(std::wstring(text) + L"\n");
+}
+
 void FrontEnd::pictureRendered(double) {}
 
 std::unique_ptr<DialogWindow> FrontEnd::makeDialog(const DialogTemplate&, HWND) {

@@ -52,6 +52,10 @@ public:
 
     /// Shows text on the command line; line breaks are part of the text.
     virtual void print(std::wstring_view text) = 0;
+    /// Tells a person what they should know although the work goes on; seen also where what is
+    /// printed is not. Prints it as a line unless it is overridden.
+    /// @param text  a sentence, without a line break
+    virtual void warn(std::wstring_view text);
     /// Asks a question and waits for one answer. The host checks the answer and asks again.
     virtual Answer ask(const Question& question) = 0;
     /// Shows a message and waits until it is confirmed. @return 1

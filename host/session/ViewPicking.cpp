@@ -57,6 +57,11 @@ std::optional<KM_3dPoint> onPlane(const PickRay& ray, const KM_3dPoint& through,
     return point;
 }
 
+/// A camera that is out of range shows nothing that could be picked.
+bool seesScene(const ViewState& view, const DocumentScene& scene) {
+    return scene.display().canBeSeenBy(view.frameCamera(), view.frameWidth(), view.frameHeight());
+}
+
 bool looksAlongAxis(const KM_Viewport& camera) {
     const KM_3dVector& z = camera.CameraZ();
     const double along = std::max({std::abs(z.x), std::abs(z.y), std::abs(z.z)});
@@ -165,7 +170,7 @@ std::optional<PickedObject> objectAt(CQuarnView& view, double x_px, double y_px)
     if (!ray)
         return std::nullopt;
     const auto scene = state.document().drawing().scene();
-    if (!scene)
+    if (!scene || !seesScene(state, *scene.value()))
         return std::nullopt;
     const auto found = Picking(state, *scene.value(), *ray, x_px, y_px).find();
     if (!found)
@@ -181,7 +186,8 @@ std::optional<KM_3dPoint> pointAt(CQuarnView& view, double x_px, double y_px) {
     const auto ray = rayAt(camera, x_px, y_px);
     if (!ray)
         return std::nullopt;
-    if (const auto scene = state.document().drawing().scene())
+    if (const auto scene = state.document().drawing().scene();
+        scene && seesScene(state, *scene.value()))
         if (const auto surface = firstSurface(scene.value()->display(), *ray))
             return surface->point;
     if (!ray->is_parallel || !looksAlongAxis(camera))

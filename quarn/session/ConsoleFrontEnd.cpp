@@ -85,6 +85,16 @@ void ConsoleFrontEnd::print(std::wstring_view text) {
     m_is_inside_line = !bytes.ends_with('\n');
 }
 
+/// Where it is not printed it goes to the standard error stream; why something fails it does not
+/// say.
+void ConsoleFrontEnd::warn(std::wstring_view text) {
+    if (m_prints == Prints::shown && !m_keeps_words)
+        return FrontEnd::warn(text);
+    m_progress.clear();
+    std::fflush(stdout);
+    std::fprintf(stderr, "quarn: %s\n", shownText(utf8Text(text)).c_str());
+}
+
 void ConsoleFrontEnd::endLine() {
     m_progress.clear();
     if (m_is_inside_line)

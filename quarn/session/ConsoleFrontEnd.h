@@ -49,6 +49,7 @@ public:
     std::string takeKeptWords();
 
     void print(std::wstring_view text) override;
+    void warn(std::wstring_view text) override;
     Answer ask(const Question& question) override;
     int showMessage(std::wstring_view text, std::wstring_view title, unsigned flags) override;
     std::optional<std::filesystem::path>

@@ -36,7 +36,6 @@ INSTANTIATE_TEST_SUITE_P(
         Refusal{"escaping_names.mtl", "files of this kind are not known"},
         Refusal{"index_out_of_range.obj", "index out of range"},
         Refusal{"negative_index_out_of_range.obj", "index out of range"},
-        Refusal{"huge_coordinates.obj", "1 triangles were left out"},
         Refusal{"header_only.ply", "its PLY header is damaged"},
         Refusal{"truncated.ply", "claims 2 elements of kind 'face' but ends before them"},
         Refusal{"huge_count.ply", "claims 2147483648 elements of kind 'face'"},
@@ -63,6 +62,20 @@ TEST(HostileModel, TrianglesWithACoordinateThatIsNoNumberAreLeftOutWithAWarning)
     EXPECT_EQ(model.meshes[0].placed.mesh->VertexCount(), 3);
     EXPECT_TRUE(model.meshes[0].placed.mesh->IsValid());
     EXPECT_THAT(model.warnings, Contains(HasSubstr("1 of 2 triangles were left out")));
+}
+
+TEST(HostileModel, CoordinatesThatCannotBeDrawnAreKept) {
+    const ImportedModel model = readOrFail(hostile / "huge_coordinates.obj");
+    ASSERT_EQ(model.meshes.size(), 1U);
+    EXPECT_EQ(model.meshes[0].placed.mesh->m_V[2], KM_3fPoint(1e30F, 1e30F, 0.0F));
+    EXPECT_TRUE(model.meshes[0].placed.mesh->IsValid());
+}
+
+TEST(HostileModel, ObjectsThatANodeMovesOutOfRangeAreKept) {
+    const ImportedModel model = readOrFail(hostile / "far_instance.gltf");
+    ASSERT_EQ(model.meshes.size(), 2U);
+    EXPECT_EQ(model.meshes[1].placed.mesh, model.meshes[0].placed.mesh);
+    EXPECT_GT(model.meshes[1].placed.box().m_min.x, 9e18);
 }
 
 TEST(HostileModel, NamesThatLeaveTheFolderAreNotFollowed) {

@@ -44,8 +44,11 @@ inline LaneVectors geometricNormals(const FrameSetup& frame, const RayPacket& pa
         straight_up);
 }
 
+/// Squares of less are no floats: a shorter vector stays short, and never becomes a long one.
+constexpr float least_length = 1e-19F;
+
 inline LaneVectors ofUnitLength(const LaneVectors& v) {
-    return v * (Lanes(1.0F) / greatest(squareRoot(dot(v, v)), 1e-30F));
+    return v * (Lanes(1.0F) / greatest(squareRoot(dot(v, v)), least_length));
 }
 
 /// The normals, turned toward the observer.
@@ -54,7 +57,7 @@ inline LaneVectors towardObserver(const FrameSetup& frame, const RayPacket& pack
     const Lanes turn = select(dot(normal, packet.direction()) > 0.0F, -1.0F, 1.0F);
     if (!frame.needs_unit_faces)
         return normal * turn;
-    return normal * (turn / greatest(squareRoot(dot(normal, normal)), 1e-30F));
+    return normal * (turn / greatest(squareRoot(dot(normal, normal)), least_length));
 }
 
 /// The direction that packNormal stored, some 32767 long.
@@ -106,7 +109,8 @@ inline void readSurface(const FrameSetup& frame, const RaySurface& surface, cons
                         const LaneMask& mask, SurfaceLanes& lanes) {
     if (surface.place) {
         const LaneVectors normal =
-            turned(surface.place->cofactors, geometricNormals(frame, packet));
+            turned(surface.place->cofactors, geometricNormals(frame, packet)) *
+            surface.place->area_scale;
         lanes.face = select(mask, towardObserver(frame, packet, normal), lanes.face);
     }
     if (surface.corner_normals)

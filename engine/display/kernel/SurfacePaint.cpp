@@ -32,8 +32,11 @@ float textureLevel(const FrameSetup& frame, const RaySurface& surface, const RTC
     const float size = std::max(frame.scene_size, 1e-15F);
     const float scale = 1.0F / (size * size);
     float normal[3] = {hit.Ng_x[lane] * scale, hit.Ng_y[lane] * scale, hit.Ng_z[lane] * scale};
-    if (surface.place)
+    if (surface.place) {
         turn(surface.place->cofactors, {normal[0], normal[1], normal[2]}, normal);
+        for (float& coordinate : normal)
+            coordinate *= surface.place->area_scale;
+    }
     const float world = length(normal[0], normal[1], normal[2]);
     const float side = frame.rays.pixel_size * (frame.rays.parallel ? 1.0F : distance);
     const float facing =
