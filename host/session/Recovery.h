@@ -1,10 +1,9 @@
 #pragma once
 
-#include "kelmar/KM_wString.h"
+#include "host/recovery/RecoverableDocuments.h"
 #include "sdk/qncore/QnExport.h"
 
 #include <chrono>
-#include <cstddef>
 #include <filesystem>
 #include <memory>
 #include <optional>
@@ -77,18 +76,6 @@ private:
     std::unique_ptr<State> m_state;
 };
 
-/// A document with unsaved work whose program ended without a person's wish.
-struct RecoverableDocument {
-    std::filesystem::path recovery; ///< the recovery file
-    std::filesystem::path mark;     ///< what in the state folder leads to it
-    std::filesystem::path document; ///< the document's own file; empty: it was never saved
-    KM_wString name;                ///< of its own file, without the ending; empty: never saved
-    std::chrono::system_clock::time_point kept_at; ///< its last state
-    /// What its active view showed, as a PNG file of at most 320 by 320 pixels; empty where nothing
-    /// was drawn.
-    std::vector<std::byte> picture;
-};
-
 /// The documents that can be recovered, the last kept first: those of programs of this machine that
 /// do not run any more. Looks at a few hundred bytes of each. Marks that lead to no recovery file
 /// any more are cleared away.
@@ -105,5 +92,9 @@ QNCORE_API std::optional<std::string> recover(Session& session,
 
 /// Removes the recovery file of a document that nobody wants.
 QNCORE_API void discard(const RecoverableDocument& document);
+
+/// Which document it is and when it was kept, by the clock on the wall, in a line for a person:
+/// "house", kept 2026-06-21 12:03, of /home/me/house.quarn
+QNCORE_API std::string recoverableText(const RecoverableDocument& document);
 
 } // namespace quarn

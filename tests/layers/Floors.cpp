@@ -27,7 +27,7 @@ const Places BELOW_DOCUMENT = BELOW_CURVES + "host/curves/";
 const Places BELOW_APP = BELOW_DOCUMENT + "host/document/";
 const Places BELOW_PROMPT = BELOW_APP + "host/app/";
 const Places BELOW_DIALOGS = BELOW_PROMPT + "host/prompt/";
-const Places BELOW_COMMANDS = BELOW_DIALOGS + "host/dialogs/";
+const Places BELOW_COMMANDS = BELOW_DIALOGS + "host/dialogs/" + "host/recovery/";
 const Places BELOW_SESSION = BELOW_COMMANDS + "host/commands/";
 
 // What a program sees of the host: its door, what it implements itself, and the cities of the
@@ -67,6 +67,7 @@ const Room FLOORS[] = {
     {4, "host/curves/", BELOW_CURVES},
     {5, "host/document/", BELOW_DOCUMENT},
     {6, "host/app/", BELOW_APP},
+    {7, "host/recovery/", BELOW_PROMPT},
     {7, "host/prompt/", BELOW_PROMPT},
     {8, "host/dialogs/", BELOW_DIALOGS},
     {9, "host/commands/", BELOW_COMMANDS},
