@@ -79,12 +79,15 @@ void RecoveryDialog::addDocument(const RecoverableDocument& document, std::size_
     auto* const row = new QListWidgetItem(m_list);
     const QString name = nameOf(document);
     const QString place = placeOf(document);
-    const QString time = timeOf(document);
+    QString time = timeOf(document);
+    if (fileIsNewer(document))
+        time += '\n' + localized(L"Older than its file, which was saved later", 45406);
     row->setText(name);
     row->setData(RecoveryRow::PLACE, place);
     row->setData(RecoveryRow::TIME, time);
     row->setData(RecoveryRow::PICTURE, pictureOf(document));
-    row->setData(Qt::AccessibleTextRole, QStringList{name, place, time}.join(", "));
+    row->setData(Qt::AccessibleTextRole,
+                 QStringList{name, place, time}.join(", ").replace('\n', ", "));
     row->setData(Qt::UserRole, static_cast<qulonglong>(index));
     row->setToolTip(qtText(document.document));
 }

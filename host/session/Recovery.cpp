@@ -195,6 +195,10 @@ void discard(const RecoverableDocument& document) {
     removeRecovery(document.mark);
 }
 
+bool fileIsNewer(const RecoverableDocument& document) {
+    return hasNewerFile(document);
+}
+
 std::string recoverableText(const RecoverableDocument& document) {
     return textOf(document);
 }

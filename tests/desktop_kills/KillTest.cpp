@@ -16,7 +16,7 @@ const std::vector<std::string> OPTIONS = {"--recovery-every", "0.5"};
 /// At most the last beats are lost: three of half a second.
 constexpr auto LONGEST_LOSS = 1500ms;
 /// Windows at a time; they mostly wait for what is typed next.
-constexpr int AT_A_TIME = 5;
+constexpr int AT_A_TIME = 10;
 
 /// As many as the environment says in QUARN_KILLS, for a night; else few.
 int kills() {
@@ -42,7 +42,7 @@ void expectNothingIsLost(TypedWork& work, TypedWork::Clock::time_point killed_at
     EXPECT_EQ(readFile(work.file()), bytes);
     const int offered = work.wasOffered() ? objectsIn(work.recovered()).value_or(-1) : in_file;
     EXPECT_GE(offered, kept);
-    EXPECT_GE(offered, in_file) << "what is offered is older than the file";
+    EXPECT_GE(offered, in_file) << "what is offered is older than the file and does not say so";
     EXPECT_LE(offered, work.begun());
 }
 
@@ -53,7 +53,7 @@ struct Life {
 };
 
 std::vector<Life> begin(int count, std::mt19937& random) {
-    std::uniform_int_distribution<int> life_ms(100, 3500);
+    std::uniform_int_distribution<int> life_ms(100, 3000);
     std::vector<Life> lives(static_cast<std::size_t>(count));
     for (Life& life : lives) {
         life.work->begin(OPTIONS);

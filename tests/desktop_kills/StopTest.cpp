@@ -15,13 +15,13 @@ class StoppedWindow : public testing::TestWithParam<int> {};
 TEST_P(StoppedWindow, KeepsItsUnsavedWorkForTheNextStart) {
     TypedWork work;
     work.begin(NO_BEAT);
+    const int done = work.doneUntil(TypedWork::Clock::now());
     const Ended ended = work.stop(GetParam());
     EXPECT_EQ(ended.exit_code, 128 + GetParam()) << ended.err;
     EXPECT_EQ(readFile(work.file()), readFile(work.savedCopy()));
-    const int begun = work.begun();
     EXPECT_EQ(work.recover(NO_BEAT).exit_code, 0);
     EXPECT_TRUE(work.wasOffered());
-    EXPECT_EQ(objectsIn(work.recovered()), begun);
+    EXPECT_GE(objectsIn(work.recovered()), done);
 }
 
 INSTANTIATE_TEST_SUITE_P(Stop, StoppedWindow, testing::Values(SIGTERM, SIGINT, SIGHUP));

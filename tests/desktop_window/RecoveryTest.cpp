@@ -14,7 +14,8 @@ protected:
         desk.startWithHouse({.arguments = {"--recovery-every", "0.1"}});
         desk.setUpTurntable();
         desk.lookUntil("work that is kept", [this](const Windows&) {
-            return !std::filesystem::is_empty(desk.home() / ".state" / "quarn");
+            const std::filesystem::path state = desk.home() / ".state" / "quarn";
+            return std::filesystem::exists(state) && !std::filesystem::is_empty(state);
         });
         desk.sendSignal(signal);
         desk.waitForEnd();
@@ -36,7 +37,6 @@ TEST_F(Recovery, UnsavedWorkOfAKilledProgramIsOfferedBeforeAFileIsOpened) {
     desk.waitForOutput("house.obj was not opened");
     desk.waitUntilIdle();
     desk.widget("play");
-    EXPECT_TRUE(desk.widget("mainWindow").title.startsWith("New document[*]"));
     desk.closeWindow("mainWindow");
     desk.click("discardChanges");
     desk.waitForEnd();
@@ -46,7 +46,7 @@ TEST_F(Recovery, UnsavedWorkOfAKilledProgramIsOfferedBeforeAFileIsOpened) {
 
 TEST_F(Recovery, AnUnattendedRunIsToldOfUnsavedWorkWhichTheMenuOffers) {
     leaveUnsavedWork(SIGTERM);
-    writeFile(desk.home() / "script.txt", "_-ViewportSize 20 20\n");
+    writeFile(desk.home() / "script.txt", "_-List\n");
     desk.start({.arguments = {"--run-script", "script.txt"}});
     desk.waitForOutput("File > Recover unsaved work");
     desk.waitForOutput("script.txt");

@@ -5,6 +5,7 @@
 #include <QGenericPlugin>
 #include <QKeyEvent>
 #include <QLineEdit>
+#include <QListWidget>
 #include <QTimer>
 
 namespace quarn::test {
@@ -59,13 +60,21 @@ private:
         QWidget* const dialog = QApplication::activeModalWidget();
         const bool is_offered = dialog && dialog->objectName() == "recovery";
         if (!m_is_typing && is_offered) {
-            note("offered", 0);
-            dialog->findChild<QAbstractButton*>("recover")->click();
+            take(*dialog);
             type("_-SaveAs \"" + m_folder + "/recovered.quarn\"");
             type("_-Exit");
         } else if (!m_is_typing && m_clock.elapsed() > LONGEST_WAIT_FOR_OFFER_MS) {
             type("_-Exit");
         }
+    }
+
+    /// A person takes nothing that says it is older than the file.
+    void take(QWidget& dialog) {
+        const QListWidgetItem& row = *dialog.findChild<QListWidget*>("recoverable")->item(0);
+        const bool is_older =
+            row.data(Qt::AccessibleTextRole).toString().contains("Older than its file");
+        note(is_older ? "older" : "offered", 0);
+        dialog.findChild<QAbstractButton*>(is_older ? "later" : "recover")->click();
     }
 
     /// @return whether there was a line to type into

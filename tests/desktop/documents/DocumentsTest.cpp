@@ -103,7 +103,7 @@ TEST_F(DocumentsTest, OtherCommandsAreStartedWithoutAQuestion) {
 
 TEST_F(DocumentsTest, WhoStaysLosesNothing) {
     change();
-    for (const char* line : {"_New", "open \"x.obj\"", "Exit"}) {
+    for (const char* line : {"_New", "open \"x.obj\"", "_-Recover 1", "Exit"}) {
         asked.clear();
         willClick("keepDocument");
         changes.start(line);
