@@ -1,15 +1,19 @@
 #include "desktop/command_line/CommandStarter.h"
+#include "desktop/documents/ProgramEnd.h"
 #include "desktop/documents/StartedLine.h"
+#include "desktop/recovery/RecoveryOffer.h"
 #include "desktop/texts/Texts.h"
 #include "desktop/window/Arguments.h"
 #include "desktop/window/InstalledFiles.h"
 #include "desktop/window/Language.h"
 #include "desktop/window/MainWindow.h"
+#include "host/session/DocumentState.h"
+#include "host/session/Recovery.h"
+#include "host/session/StopSignals.h"
 
 #include <QApplication>
 #include <QTimer>
 
-#include <csignal>
 #include <cstdio>
 
 namespace {
@@ -25,6 +29,31 @@ void openFile(MainWindow& window, const QString& file) {
         window.starter().start("_-Open " + word);
 }
 
+/// The program holds one document: a recovered one is not replaced by the file.
+void tellNotOpened(quarn::Session& session, MainWindow& window, const QString& file) {
+    std::error_code is_other;
+    const std::filesystem::path at_work = quarn::documentFile(session.document());
+    if (!file.isEmpty() && !std::filesystem::equivalent(at_work, nativePath(file), is_other))
+        window.tellAndPrint(
+            localized(L"%1 was not opened: the recovered document is at work.", 45401).arg(file));
+}
+
+/// Offers the unsaved work of earlier runs before anything is opened; where nobody may be there to
+/// answer it is only told.
+void begin(quarn::Session& session, MainWindow& window, const Arguments& arguments) {
+    RecoveryOffer* const offer = window.recoveryOffer();
+    const bool is_attended = arguments.script.isEmpty();
+    if (offer && is_attended && offer->offer(nativePath(arguments.file)))
+        tellNotOpened(session, window, arguments.file);
+    else
+        openFile(window, arguments.file);
+    if (offer && !is_attended && offer->count() > 0)
+        window.tellAndPrint(localized(
+            L"An earlier run ended with unsaved work: File > Recover unsaved work.", 45402));
+    if (!arguments.script.isEmpty())
+        window.runScript(arguments.script, arguments.wants_exit);
+}
+
 int runWindow(QApplication& application, const Arguments& arguments) {
     const Language language(arguments.language);
     DesktopFrontEnd front_end;
@@ -37,12 +66,13 @@ int runWindow(QApplication& application, const Arguments& arguments) {
     window.show();
     if (!load.ok())
         front_end.print(KM_wString::FromUtf8(load.message + "\n").View());
-    QTimer::singleShot(0, &window, [&] {
-        openFile(window, arguments.file);
-        if (!arguments.script.isEmpty())
-            window.runScript(arguments.script, arguments.wants_exit);
-    });
-    return application.exec();
+    window.programEnd().watchSignals();
+    if (arguments.wants_recovery)
+        window.keepUnsavedWork({.state_folder = {}, .every = arguments.recovery_every});
+    QTimer::singleShot(0, &window, [&] { begin(session, window, arguments); });
+    const int exit_code = application.exec();
+    window.finish();
+    return quarn::stopSignal() == 0 ? exit_code : 128 + quarn::stopSignal();
 }
 
 int answer(const QString& text, std::FILE* stream, int exit_code) {
@@ -63,7 +93,6 @@ int main(int argument_count, char** arguments) {
         return answer(typed.answer, stdout, 0);
     if (const QString why = whyNoWindow(); !why.isEmpty())
         return answer("quarn-desktop: " + why + "\n", stderr, 1);
-    std::signal(SIGXFSZ, SIG_IGN); // a file that may not grow is a write that fails, no crash
     QApplication application(argument_count, arguments);
     QApplication::setOrganizationName("Quarn");
     QApplication::setApplicationName("quarn-desktop");

@@ -17,12 +17,12 @@ void CommandStarter::start(const QString& line) {
     const QString trimmed = line.trimmed();
     if (trimmed.isEmpty())
         return;
-    runBetween(trimmed, [&] { return m_session.runCommand(wideText(trimmed).View(), true); });
+    startWork(trimmed, [&] { return m_session.runCommand(wideText(trimmed).View(), true); });
 }
 
 bool CommandStarter::startScript(const QString& file) {
     bool has_succeeded = false;
-    runBetween(file, [&] {
+    startWork(file, [&] {
         const std::optional<std::string> trouble = m_session.runScriptFile(nativePath(file));
         has_succeeded = !trouble;
         if (trouble)
@@ -32,17 +32,19 @@ bool CommandStarter::startScript(const QString& file) {
     return has_succeeded;
 }
 
-void CommandStarter::runBetween(const QString& line,
-                                const std::function<CQuarnCommand::result()>& run) {
+void CommandStarter::startWork(const QString& name,
+                               const std::function<CQuarnCommand::result()>& work) {
+    if (m_is_over)
+        return;
     if (isRunning()) {
         refuse();
         return;
     }
     m_front_end.commandStarts();
-    m_line = line;
+    m_line = name;
     m_is_started = true;
     emit started(m_line);
-    const CQuarnCommand::result result = run();
+    const CQuarnCommand::result result = work();
     m_is_started = false;
     m_line.clear();
     m_front_end.commandEnded();
@@ -52,6 +54,11 @@ void CommandStarter::runBetween(const QString& line,
 void CommandStarter::stop() {
     if (isRunning())
         m_front_end.requestStop();
+}
+
+void CommandStarter::stopForGood() {
+    m_is_over = true;
+    stop();
 }
 
 void CommandStarter::refuse() {

@@ -30,9 +30,14 @@ public slots:
     /// Runs the command lines of a script file one after the other, without dialogs; to whoever
     /// watches, as one command. @return whether every command succeeded
     bool startScript(const QString& file);
+    /// Does something that is no command in the way of one: while it runs nothing else is started.
+    /// @param name  what it is called, as a command line would be shown
+    void startWork(const QString& name, const std::function<CQuarnCommand::result()>& work);
     /// Asks the running command to end: until the outermost command has ended, the front end
     /// counts as interrupted and Escape as held down. Without one it does nothing.
     void stop();
+    /// Stops what runs, and starts nothing any more: the program ends.
+    void stopForGood();
 
 signals:
     void started(const QString& line);
@@ -43,12 +48,12 @@ signals:
 
 private:
     void refuse();
-    void runBetween(const QString& line, const std::function<CQuarnCommand::result()>& run);
 
     Session& m_session;
     DesktopFrontEnd& m_front_end;
     QString m_line;
     bool m_is_started = false;
+    bool m_is_over = false;
 };
 
 } // namespace quarn::desktop

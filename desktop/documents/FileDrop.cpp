@@ -5,6 +5,7 @@
 #include "desktop/documents/UnsavedChanges.h"
 #include "desktop/texts/Texts.h"
 
+#include <QApplication>
 #include <QDragEnterEvent>
 #include <QDropEvent>
 #include <QFileInfo>
@@ -23,7 +24,8 @@ FileDrop::FileDrop(CommandStarter& starter, UnsavedChanges& changes, QWidget& wi
 bool FileDrop::eventFilter(QObject* watched, QEvent* event) {
     if (event->type() == QEvent::DragEnter) {
         auto& drag = static_cast<QDragEnterEvent&>(*event);
-        if (drag.mimeData()->hasUrls() && !m_starter.isRunning())
+        const bool is_free = !m_starter.isRunning() && !QApplication::activeModalWidget();
+        if (drag.mimeData()->hasUrls() && is_free)
             drag.acceptProposedAction();
         return true;
     }

@@ -18,7 +18,7 @@ WindowClosing::WindowClosing(CommandStarter& starter, CommandPane& pane, Unsaved
 }
 
 bool WindowClosing::mayClose() {
-    if (m_starter.isRunning() && !m_pane.isAsking() && !askToStop())
+    if (!mayStop())
         return false;
     if (!m_starter.isRunning()) // it may have ended while the person thought about it
         return m_changes.mayLeave();
@@ -26,6 +26,10 @@ bool WindowClosing::mayClose() {
     m_starter.stop();
     m_pane.cancelQuestion();
     return false;
+}
+
+bool WindowClosing::mayStop() {
+    return !m_starter.isRunning() || m_pane.isAsking() || askToStop();
 }
 
 bool WindowClosing::askToStop() {

@@ -23,6 +23,9 @@ public:
     /// ended, if the person wants that; unsaved changes are asked about. Where false is returned
     /// because a command has to end, the window is closed once it has.
     bool mayClose();
+    /// Whether a command that runs may be stopped: none does, it only waits for an answer, or the
+    /// person agrees.
+    bool mayStop();
 
 private:
     bool askToStop();

@@ -2,12 +2,26 @@
 
 #include <QCommandLineParser>
 
+#include <cmath>
+
 namespace quarn::desktop {
 
 namespace {
 
+constexpr double LONGEST_BEAT_S = 86400.0;
+
 bool isSet(const char* variable) {
     return !qEnvironmentVariableIsEmpty(variable);
+}
+
+/// The steady beat that keeps unsaved work; a mistake where it is none.
+void readBeat(const QString& seconds, Arguments& read) {
+    bool is_number = false;
+    const double every_s = seconds.toDouble(&is_number);
+    if (!is_number || !(every_s >= 0.001) || every_s > LONGEST_BEAT_S)
+        read.mistake = "--recovery-every takes seconds from 0.001 to 86400, such as 10 or 0.5.";
+    else
+        read.recovery_every = std::chrono::milliseconds(std::llround(every_s * 1000.0));
 }
 
 } // namespace
@@ -30,7 +44,11 @@ Arguments readArguments(const QStringList& arguments) {
                 "a recording lacks pictures.");
     const QCommandLineOption overwrite(
         "overwrite", "Recordings replace files that no recording of their name wrote.");
-    parser.addOptions({help, version, language, overwrite, script, exit});
+    const QCommandLineOption every(
+        "recovery-every", "Keeps unsaved work for recovery so often. Default: 10.", "seconds");
+    const QCommandLineOption no_recovery(
+        "no-recovery", "Neither keeps unsaved work for recovery nor offers that of earlier runs.");
+    parser.addOptions({help, version, language, overwrite, script, exit, every, no_recovery});
 
     Arguments read;
     const bool is_good = parser.parse(arguments);
@@ -47,6 +65,9 @@ Arguments readArguments(const QStringList& arguments) {
     read.script = parser.value(script);
     read.overwrites = parser.isSet(overwrite);
     read.wants_exit = parser.isSet(exit);
+    read.wants_recovery = !parser.isSet(no_recovery);
+    if (read.mistake.isEmpty() && parser.isSet(every))
+        readBeat(parser.value(every), read);
     return read;
 }
 

@@ -10,14 +10,18 @@
 #include "desktop/dialogs/MessageBox.h"
 #include "desktop/documents/FileDrop.h"
 #include "desktop/documents/RecentFiles.h"
+#include "desktop/documents/SessionEnd.h"
 #include "desktop/documents/UnsavedChanges.h"
 #include "desktop/documents/WindowClosing.h"
 #include "desktop/menus/CommandMenus.h"
+#include "desktop/recovery/RecoveryBeat.h"
+#include "desktop/recovery/RecoveryOffer.h"
 #include "desktop/render/RenderPictureWindow.h"
 #include "desktop/texts/Texts.h"
 #include "desktop/views/ViewArea.h"
 #include "desktop/window/WindowActions.h"
 #include "host/session/DocumentState.h"
+#include "host/session/StopSignals.h"
 
 #include <QApplication>
 #include <QCloseEvent>
@@ -34,6 +38,7 @@ namespace quarn::desktop {
 
 namespace {
 
+constexpr unsigned LONGEST_KEEPING_S = 30; ///< a large document on a slow disk
 constexpr int MESSAGE_MS = 8000;
 constexpr QSize FIRST_SIZE{1280, 860};
 constexpr QSize FRAME_ROOM{8, 40}; ///< that a window manager's frame may take
@@ -56,7 +61,9 @@ MainWindow::MainWindow(Session& session, DesktopFrontEnd& front_end)
       m_recent_files(new RecentFiles(session, *m_starter, *this)),
       m_changes(new UnsavedChanges(session, *m_starter, *this)),
       m_closing(new WindowClosing(*m_starter, *m_pane, *m_changes, *this)),
-      m_file_drop(new FileDrop(*m_starter, *m_changes, *this)) {
+      m_file_drop(new FileDrop(*m_starter, *m_changes, *this)),
+      m_end(new ProgramEnd(*m_starter, *m_pane, this)),
+      m_session_end(new SessionEnd(session, *m_starter, *m_closing, *m_changes, *m_end, this)) {
     setObjectName("mainWindow");
     layOut();
     buildMenus();
@@ -200,11 +207,42 @@ void MainWindow::tell(const QString& message) {
     statusBar()->showMessage(message, MESSAGE_MS);
 }
 
+void MainWindow::tellAndPrint(const QString& message) {
+    tell(message);
+    m_pane->print(message.toStdWString() + L'\n');
+}
+
 void MainWindow::runScript(const QString& file, bool wants_exit) {
     m_lacks_pictures = false;
     const bool has_succeeded = m_starter->startScript(file) && !m_lacks_pictures;
     if (wants_exit) // without the question about changes that closing the window asks
         QTimer::singleShot(0, qApp, [=] { QCoreApplication::exit(has_succeeded ? 0 : 1); });
+}
+
+void MainWindow::keepUnsavedWork(const RecoveryOptions& options) {
+    m_recovery = new RecoveryBeat(m_session, *m_starter, options, this);
+    m_recovery_offer = new RecoveryOffer(m_session, *m_starter, *m_changes, options, *this);
+    connect(m_recovery, &RecoveryBeat::troubled, this, &MainWindow::tellAndPrint);
+    connect(m_recovery_offer, &RecoveryOffer::nothingThere, this, &MainWindow::tell);
+    connect(m_session_end, &SessionEnd::keepsWork, m_recovery, &RecoveryBeat::keepNow);
+    m_menus->addBelow("Open", {&m_recovery_offer->action()});
+}
+
+void MainWindow::finish() {
+    if (isVisible()) // nobody has closed it
+        saveLayout();
+    settleUnsavedWork();
+}
+
+void MainWindow::settleUnsavedWork() {
+    if (!m_recovery)
+        return;
+    if (m_end->unsavedWork() == UnsavedWork::not_wanted) {
+        m_recovery->forget();
+        return;
+    }
+    allowSecondsToStop(LONGEST_KEEPING_S);
+    m_recovery->keepNow();
 }
 
 void MainWindow::restoreLayout() {

@@ -7,6 +7,10 @@
 
 class QDockWidget;
 
+namespace quarn {
+struct RecoveryOptions;
+}
+
 namespace quarn::desktop {
 
 class AnimationBar;
@@ -14,8 +18,12 @@ class CommandMenus;
 class CommandPane;
 class CommandStarter;
 class FileDrop;
+class ProgramEnd;
 class RecentFiles;
+class RecoveryBeat;
+class RecoveryOffer;
 class RenderPictureWindow;
+class SessionEnd;
 class UnsavedChanges;
 class ViewArea;
 class WindowClosing;
@@ -35,12 +43,22 @@ public:
     ViewArea& views() { return *m_views; }
     AnimationBar& animationBar() { return *m_animation; }
     CommandMenus& menus() { return *m_menus; }
+    ProgramEnd& programEnd() { return *m_end; }
 
     /// Runs the command lines of a script file, as a program without a person does, while the
     /// window shows what happens.
     /// @param wants_exit  ends the program afterwards, without a question: with 0 where every
     ///                    command succeeded, else with 1
     void runScript(const QString& file, bool wants_exit);
+    /// From now on unsaved work is kept for recovery, and that of earlier runs can be had back.
+    void keepUnsavedWork(const RecoveryOptions& options);
+    /// What can be recovered; null before keepUnsavedWork.
+    RecoveryOffer* recoveryOffer() { return m_recovery_offer; }
+    /// Tells the person something that must not be missed: in the status bar and the output.
+    void tellAndPrint(const QString& message);
+    /// After the event loop: size and place are remembered, and unsaved work is kept for the next
+    /// start or not wanted any more.
+    void finish();
     /// Size, place and borders of the last run (QSettings); a good size where there was none.
     void restoreLayout();
 
@@ -59,6 +77,7 @@ private:
     void showTitle();
     void saveLayout();
     void noteRecording(const RecordingReport& report);
+    void settleUnsavedWork();
     void tell(const QString& message);
 
     Session& m_session;
@@ -72,6 +91,10 @@ private:
     UnsavedChanges* m_changes;
     WindowClosing* m_closing;
     FileDrop* m_file_drop;
+    ProgramEnd* m_end;
+    SessionEnd* m_session_end;
+    RecoveryBeat* m_recovery = nullptr;
+    RecoveryOffer* m_recovery_offer = nullptr;
     RenderPictureWindow* m_render_window = nullptr;
     QDockWidget* m_command_dock = nullptr;
     bool m_lacks_pictures = false; ///< a recording since the script began

@@ -85,6 +85,8 @@ CQuarnCommand::result CommandRunner::start(std::wstring_view line, const Command
     }
     RunningCommand running{found->command, found->english_name, origin.place, std::move(read.words),
                            origin.typed};
+    if (m_running.empty() && m_before_command)
+        m_before_command();
     if (m_running.empty())
         (void)takeMissingSun(); // of what was computed before
     const CQuarnCommand::result result =

@@ -5,6 +5,7 @@
 
 #include <deque>
 #include <filesystem>
+#include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -61,6 +62,10 @@ public:
     /// Runs a script file; as Session::runScriptFile.
     std::optional<std::string> runFile(const std::filesystem::path& file);
 
+    /// From now on called before each command that a person or a script file starts, while none
+    /// runs; an empty one ends that.
+    void setBeforeCommand(std::function<void()> look) { m_before_command = std::move(look); }
+
     /// The command that runs now, or null. Valid until it ends.
     RunningCommand* current() const { return m_running.empty() ? nullptr : m_running.back(); }
     /// The command that a person or a script file started, or null.
@@ -77,6 +82,7 @@ private:
 
     Application& m_application;
     std::vector<RunningCommand*> m_running;
+    std::function<void()> m_before_command;
 };
 
 } // namespace quarn

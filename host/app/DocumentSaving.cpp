@@ -26,8 +26,7 @@ void moveLightIndex(Document& document, const std::map<int, int>& indices) {
 
 } // namespace
 
-Result<void> saveDocument(Document& document, const std::filesystem::path& file,
-                          const DocumentSaveOptions& options) {
+Result<DocumentContent> contentToSave(Document& document, const DocumentSaveOptions& options) {
     DocumentContent content = document.content(options.only_selected);
     content.version = options.version;
     auto plug_ins =
@@ -35,12 +34,19 @@ Result<void> saveDocument(Document& document, const std::filesystem::path& file,
                        FileOptionsAccess::forWriting(options.only_selected, options.version,
                                                      document.serialNumber()));
     if (!plug_ins)
-        return Error{"Cannot save " + textFromPath(file).ToUtf8() + ": " + plug_ins.message() +
-                     "."};
+        return plug_ins.error();
     content.plug_ins = std::move(plug_ins.value());
     if (!options.only_selected && options.version == KM_CURRENT_ARCHIVE_VERSION)
         content.unknown = document.fileRemainder().unknown;
-    const auto written = writeDocumentFile(content, file, options.protection);
+    return content;
+}
+
+Result<void> saveDocument(Document& document, const std::filesystem::path& file,
+                          const DocumentSaveOptions& options) {
+    const auto content = contentToSave(document, options);
+    if (!content)
+        return Error{"Cannot save " + textFromPath(file).ToUtf8() + ": " + content.message() + "."};
+    const auto written = writeDocumentFile(content.value(), file, options.protection);
     if (!written)
         return written.error();
     if (!written.value().warning.empty())

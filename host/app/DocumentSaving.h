@@ -22,6 +22,10 @@ struct DocumentSaveOptions {
     Protection protection = Protection::respected;
 };
 
+/// All that a document file has to hold of the document, with what plug-ins keep in it.
+/// @return an error, part of a sentence, when a plug-in could not write
+Result<DocumentContent> contentToSave(Document& document, const DocumentSaveOptions& options = {});
+
 /// Writes a document file with what the document holds and what plug-ins keep in it. The file
 /// appears whole and on the disk, or not at all; a file that was there before stays whole until
 /// then. The document does not change, nor does it remember the file. Where it is not sure that the

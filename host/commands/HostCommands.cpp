@@ -50,6 +50,9 @@ constexpr HostCommandEntry HOST_COMMANDS[] = {
     {L"Point", "BCCFC956-461C-4AF5-A8F4-E74D33EA08CA", L"Draws a point", 41045, runPoint},
     {L"Polyline", "32A799F8-663C-4EA2-94A7-F139732F4D6B", L"Draws straight segments through points",
      41041, runPolyline},
+    {L"Recover", "B47C9E15-0D8A-4F63-9A2E-71D5F3C8064B",
+     L"Opens or discards a document that was not saved when a program ended", 42570, runRecover,
+     true},
     {L"RemoveView", "6B94D2F8-E3A1-4C07-8B5E-1D7FA0C36E92", L"Closes a view", 41031, runRemoveView},
     {L"Rename", "C3630EF1-F0A7-45D8-A581-3053A25A8A94", L"Gives an object another name", 41019,
      runRename},
@@ -87,7 +90,8 @@ constexpr HostCommandEntry HOST_COMMANDS[] = {
 
 class HostCommand final : public CQuarnCommand {
 public:
-    explicit HostCommand(const HostCommandEntry& entry) : m_entry(&entry) {}
+    explicit HostCommand(const HostCommandEntry& entry)
+        : CQuarnCommand(false, false, nullptr, entry.is_hidden), m_entry(&entry) {}
 
     KM_UUID CommandUUID() override { return KM_UuidFromString(m_entry->id); }
     const wchar_t* EnglishCommandName() override { return m_entry->name; }

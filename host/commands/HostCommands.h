@@ -14,6 +14,8 @@ struct HostCommandEntry {
     const wchar_t* description; ///< English, one line without a full stop, shown by `Help`
     int description_id;         ///< its number in the string tables, from 41001
     CQuarnCommand::result (*run)(const CQuarnCommandContext& context);
+    /// Whether `Help` leaves it out: programs offer it where it can do something.
+    bool is_hidden = false;
 };
 
 /// Makes the command objects of the table in HostCommands.cpp, in its order. They are announced
@@ -44,6 +46,7 @@ CQuarnCommand::result runNew(const CQuarnCommandContext& context);
 CQuarnCommand::result runOpen(const CQuarnCommandContext& context);
 CQuarnCommand::result runPoint(const CQuarnCommandContext& context);
 CQuarnCommand::result runPolyline(const CQuarnCommandContext& context);
+CQuarnCommand::result runRecover(const CQuarnCommandContext& context);
 CQuarnCommand::result runRemoveView(const CQuarnCommandContext& context);
 CQuarnCommand::result runRename(const CQuarnCommandContext& context);
 CQuarnCommand::result runRender(const CQuarnCommandContext& context);

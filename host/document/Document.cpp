@@ -177,11 +177,21 @@ void Document::resizeDueFrames() {
 }
 
 bool Document::isModified() const {
-    return m_saved_state && !m_saved_state->covers(savedStateOf(*this));
+    return isModified(savedStateOf(*this));
+}
+
+bool Document::isModified(const SavedState& now) const {
+    return m_saved_state && !m_saved_state->covers(now);
 }
 
 void Document::markSaved() {
     m_saved_state = std::make_unique<SavedState>(savedStateOf(*this));
+    ++m_save_count;
+}
+
+/// No table of objects has the revision of this state.
+void Document::markUnsaved() {
+    m_saved_state = std::make_unique<SavedState>();
 }
 
 void Document::markRecordSaved() {

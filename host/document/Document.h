@@ -111,14 +111,23 @@ public:
     /// none.
     const std::filesystem::path& file() const { return m_file; }
     void setFile(const std::filesystem::path& file) { m_file = file; }
+    /// The mark of the recovery file that the document was opened from; empty when it was not.
+    const std::filesystem::path& recoveredFrom() const { return m_recovered_from; }
+    void setRecoveredFrom(const std::filesystem::path& mark) { m_recovered_from = mark; }
 
     /// Whether what a file of it holds was changed since the last call of markSaved; cameras, the
     /// active view and the selection do not count, nor does what playing alone changes of the
     /// animation record. Looks at everything but coordinates: some milliseconds for large
     /// documents.
     bool isModified() const;
+    /// The same, where the state that the document has now is known already.
+    bool isModified(const SavedState& now) const;
     /// Called when the document was made, opened or saved: as it is now, it is not modified.
     void markSaved();
+    /// How often markSaved was called.
+    unsigned saveCount() const { return m_save_count; }
+    /// Called when what the document holds was never in its file: it is modified until it is saved.
+    void markUnsaved();
     /// Called when a plug-in began to keep the animation record of the document.
     void markRecordSaved();
 
@@ -167,8 +176,10 @@ private:
     double m_absolute_tolerance = default_absolute_tolerance;
     UnitSystem m_units = UnitSystem::none;
     std::filesystem::path m_file;
+    std::filesystem::path m_recovered_from;
     std::unique_ptr<FileRemainder> m_file_remainder;
     std::unique_ptr<SavedState> m_saved_state; ///< null until markSaved
+    unsigned m_save_count = 0;
     std::vector<NamedView> m_named_views;
     std::vector<std::unique_ptr<ViewState>> m_views;
     ViewState* m_active_view = nullptr;

@@ -1,9 +1,9 @@
 #include "quarn/console/HistoryFile.h"
 
 #include "ground/AtomicFile.h"
+#include "host/front_end/StateFolder.h"
 #include "quarn/words/Words.h"
 
-#include <cstdlib>
 #include <fcntl.h>
 #include <fstream>
 #include <unistd.h>
@@ -11,14 +11,6 @@
 namespace quarn::program {
 
 namespace {
-
-/// A folder that a variable of the environment names; empty when it names none, or only one that
-/// depends on where the program was started.
-std::filesystem::path folderOf(const char* variable) {
-    const char* const value = std::getenv(variable);
-    const std::filesystem::path folder = value ? value : "";
-    return folder.is_absolute() ? folder : std::filesystem::path();
-}
 
 std::vector<std::string> readLines(const std::filesystem::path& file) {
     std::vector<std::string> lines;
@@ -36,13 +28,6 @@ void replaceLines(const std::filesystem::path& file, const std::vector<std::stri
     for (const std::string& line : lines)
         bytes += line + '\n';
     (void)writeFileAtomically(file, std::as_bytes(std::span(bytes)));
-}
-
-/// The folder is the user's alone.
-void makeFolder(const std::filesystem::path& folder) {
-    std::error_code error;
-    if (std::filesystem::create_directories(folder, error))
-        std::filesystem::permissions(folder, std::filesystem::perms::owner_all, error);
 }
 
 } // namespace
@@ -65,7 +50,7 @@ std::vector<std::wstring> HistoryFile::load() const {
 void HistoryFile::append(std::wstring_view line) const {
     if (m_file.empty())
         return;
-    makeFolder(m_file.parent_path());
+    makeStateFolder(m_file.parent_path());
     const int descriptor = open(m_file.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0600);
     if (descriptor < 0)
         return;
@@ -75,11 +60,8 @@ void HistoryFile::append(std::wstring_view line) const {
 }
 
 std::filesystem::path historyPath() {
-    if (const std::filesystem::path state = folderOf("XDG_STATE_HOME"); !state.empty())
-        return state / "quarn" / "history";
-    if (const std::filesystem::path home = folderOf("HOME"); !home.empty())
-        return home / ".local" / "state" / "quarn" / "history";
-    return {};
+    const std::filesystem::path folder = userStateFolder();
+    return folder.empty() ? folder : folder / "history";
 }
 
 } // namespace quarn::program

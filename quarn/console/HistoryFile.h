@@ -28,8 +28,7 @@ private:
     std::filesystem::path m_file;
 };
 
-/// `quarn/history` in the folder for state of the user's programs: $XDG_STATE_HOME, else
-/// ~/.local/state. Empty where the environment names neither by a whole path.
+/// `history` in the user's folder for state (userStateFolder); empty where there is none.
 std::filesystem::path historyPath();
 
 } // namespace quarn::program

@@ -27,7 +27,7 @@ const Places BELOW_DOCUMENT = BELOW_CURVES + "host/curves/";
 const Places BELOW_APP = BELOW_DOCUMENT + "host/document/" + "host/recording/";
 const Places BELOW_PROMPT = BELOW_APP + "host/app/";
 const Places BELOW_DIALOGS = BELOW_PROMPT + "host/prompt/";
-const Places BELOW_COMMANDS = BELOW_DIALOGS + "host/dialogs/";
+const Places BELOW_COMMANDS = BELOW_DIALOGS + "host/dialogs/" + "host/recovery/";
 const Places BELOW_SESSION = BELOW_COMMANDS + "host/commands/";
 
 // What a program sees of the host: its door, what it implements itself, and the cities of the
@@ -41,8 +41,8 @@ const Places BELOW_PORT = PROGRAM + "desktop/texts/";
 const Places BELOW_STARTER = BELOW_PORT + "desktop/front_end/";
 const Places BELOW_BARS = BELOW_STARTER + "desktop/command_line/";
 const Places BELOW_WINDOW = BELOW_BARS + "desktop/dialogs/" + "desktop/render/" +
-                            "desktop/documents/" + "desktop/animation/" + "desktop/menus/" +
-                            "desktop/views/";
+                            "desktop/documents/" + "desktop/recovery/" + "desktop/animation/" +
+                            "desktop/menus/" + "desktop/views/";
 
 constexpr std::string_view UTILITIES = "zoetrix/plugin/ZoetrixUtilities.h";
 
@@ -68,6 +68,7 @@ const Room FLOORS[] = {
     {5, "host/document/", BELOW_DOCUMENT},
     {5, "host/recording/", BELOW_DOCUMENT},
     {6, "host/app/", BELOW_APP},
+    {7, "host/recovery/", BELOW_PROMPT},
     {7, "host/prompt/", BELOW_PROMPT},
     {8, "host/dialogs/", BELOW_DIALOGS},
     {9, "host/commands/", BELOW_COMMANDS},
@@ -117,6 +118,7 @@ const Room FLOORS[] = {
     {11, "desktop/dialogs/", BELOW_STARTER},
     {11, "desktop/render/", BELOW_STARTER},
     {11, "desktop/documents/", BELOW_BARS},
+    {11, "desktop/recovery/", BELOW_BARS + "desktop/dialogs/" + "desktop/documents/"},
     {11, "desktop/animation/", BELOW_BARS + "desktop/documents/"},
     {11, "desktop/menus/", BELOW_BARS + "desktop/animation/"},
     {11, "desktop/views/", BELOW_BARS + "desktop/documents/"},

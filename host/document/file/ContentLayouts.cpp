@@ -184,6 +184,12 @@ bool readMaterial(KM_BinaryArchive& archive, SharedContent& shared) {
     return true;
 }
 
+std::uint64_t meshSize(const KM_Mesh& mesh) {
+    return mesh.m_V.size() * sizeof(KM_3fPoint) + mesh.m_N.size() * sizeof(KM_3fVector) +
+           mesh.m_T.size() * sizeof(KM_2fPoint) + mesh.m_C.size() * sizeof(KM_Color) +
+           mesh.m_F.size() * sizeof(KM_MeshTriangle);
+}
+
 bool writeMesh(KM_BinaryArchive& archive, const KM_Mesh& mesh) {
     return meshFields(FieldWriter(archive), mesh);
 }

@@ -1,24 +1,13 @@
 #pragma once
 
 #include "host/document/file/DocumentContent.h"
-
-#include <vector>
+#include "host/document/file/SharedPlaces.h"
 
 namespace quarn {
 
 // The payloads of the chunks of a document file. Every operation returns false, with the archive
 // failed, when the thing cannot be written, or when what is read cannot be part of a document; what
 // was to be read is then unspecified.
-
-/// What objects share. In the file each is named by its place among those of its kind.
-struct SharedContent {
-    std::vector<std::shared_ptr<const Texture>> textures;
-    std::vector<std::shared_ptr<const Material>> materials;
-    std::vector<std::shared_ptr<const KM_Mesh>> meshes;
-};
-
-/// The place that stands for no texture and no material.
-inline constexpr std::int32_t NO_PLACE = -1;
 
 bool writeSettings(KM_BinaryArchive& archive, const SettingsContent& settings);
 bool readSettings(KM_BinaryArchive& archive, SettingsContent& settings);
@@ -31,6 +20,8 @@ bool readTexture(KM_BinaryArchive& archive, SharedContent& shared);
 bool writeMaterial(KM_BinaryArchive& archive, const Material& material, std::int32_t texture);
 bool readMaterial(KM_BinaryArchive& archive, SharedContent& shared);
 
+/// About the bytes that a mesh takes.
+std::uint64_t meshSize(const KM_Mesh& mesh);
 bool writeMesh(KM_BinaryArchive& archive, const KM_Mesh& mesh);
 bool readMesh(KM_BinaryArchive& archive, SharedContent& shared);
 

@@ -16,8 +16,8 @@ constexpr const char* DAMAGED = "it is damaged or was cut off; a copy made earli
 /// Reads one document. Each step is true, or leaves the archive failed.
 class DocumentReader {
 public:
-    explicit DocumentReader(std::span<const std::uint8_t> bytes)
-        : m_archive(KM_BinaryArchive::ForReading(bytes)) {}
+    DocumentReader(std::span<const std::uint8_t> bytes, SharedContent shared)
+        : m_archive(KM_BinaryArchive::ForReading(bytes)), m_shared(std::move(shared)) {}
 
     Result<DocumentContent> read() {
         if (const auto begun = readHeader(); !begun)
@@ -155,9 +155,9 @@ private:
 
 } // namespace
 
-Result<DocumentContent> decodeDocument(std::span<const std::uint8_t> bytes) {
+Result<DocumentContent> decodeDocument(std::span<const std::uint8_t> bytes, SharedContent shared) {
     try {
-        return DocumentReader(bytes).read();
+        return DocumentReader(bytes, std::move(shared)).read();
     } catch (const std::exception&) {
         return Error{"there is too little memory for it"};
     }

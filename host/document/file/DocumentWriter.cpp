@@ -4,53 +4,30 @@
 #include "host/document/file/DocumentHeader.h"
 
 #include <exception>
-#include <map>
 
 namespace quarn {
 
 namespace {
 
-/// The things of one kind, each once, in the order in which they were first met.
-template <class T> class Places {
-public:
-    /// @return the place of the thing; NO_PLACE for none
-    std::int32_t of(const std::shared_ptr<const T>& thing) {
-        if (!thing)
-            return NO_PLACE;
-        const auto [known, is_new] = m_places.try_emplace(thing.get(), count());
-        if (is_new)
-            m_things.push_back(thing.get());
-        return known->second;
-    }
-    const std::vector<const T*>& things() const { return m_things; }
-
-private:
-    std::int32_t count() const { return static_cast<std::int32_t>(m_things.size()); }
-
-    std::map<const T*, std::int32_t> m_places;
-    std::vector<const T*> m_things;
-};
+constexpr const char* NO_MEMORY = "there is too little memory";
 
 std::string nameOf(const ObjectContent& object) {
     return object.name.IsEmpty() ? "the object " + KM_UuidToString(object.id).ToUtf8()
                                  : "the object \"" + object.name.ToUtf8() + "\"";
 }
 
-std::uint64_t sizeOf(const KM_Mesh& mesh) {
-    return mesh.m_V.size() * sizeof(KM_3fPoint) + mesh.m_N.size() * sizeof(KM_3fVector) +
-           mesh.m_T.size() * sizeof(KM_2fPoint) + mesh.m_C.size() * sizeof(KM_Color) +
-           mesh.m_F.size() * sizeof(KM_MeshTriangle);
-}
-
 /// Writes one document. Each step is true, or leaves the archive failed and the name of what could
 /// not be written behind.
 class DocumentWriter {
 public:
-    explicit DocumentWriter(const DocumentContent& content)
-        : m_content(content), m_archive(KM_BinaryArchive::ForWriting(content.version)) {}
+    /// @param places  of all that objects share
+    /// @param shared  what of it is written
+    DocumentWriter(const DocumentContent& content, const SharedPlaces& places,
+                   const SharedContent& shared)
+        : m_content(content), m_places(places), m_shared(shared),
+          m_archive(KM_BinaryArchive::ForWriting(content.version)) {}
 
     Result<std::vector<std::uint8_t>> write() {
-        placeShared();
         reserve();
         if (writeHeader() && writeShared() && writeObjects() && writeSurroundings() &&
             writeChunk(chunk::END, "the end",
@@ -76,21 +53,12 @@ private:
         return true;
     }
 
-    void placeShared() {
-        for (const ObjectContent& object : m_content.objects) {
-            m_meshes.of(object.placed.mesh);
-            m_materials.of(object.placed.material);
-        }
-        for (const Material* material : m_materials.things())
-            m_textures.of(material->base_color_texture);
-    }
-
     void reserve() {
         constexpr std::uint64_t for_a_small_chunk = 256;
         std::uint64_t size = for_a_small_chunk * (16 + m_content.objects.size());
-        for (const KM_Mesh* mesh : m_meshes.things())
-            size += for_a_small_chunk + sizeOf(*mesh);
-        for (const Texture* texture : m_textures.things())
+        for (const auto& mesh : m_shared.meshes)
+            size += for_a_small_chunk + meshSize(*mesh);
+        for (const auto& texture : m_shared.textures)
             size += for_a_small_chunk + texture->rgba.size();
         for (const PlugInContent& plug_in : m_content.plug_ins)
             size += for_a_small_chunk + plug_in.bytes.size();
@@ -104,25 +72,25 @@ private:
     }
 
     bool writeShared() {
-        const auto texture = [](KM_BinaryArchive& archive, const Texture* thing) {
+        const auto texture = [](KM_BinaryArchive& archive, const auto& thing) {
             return writeTexture(archive, *thing);
         };
-        const auto material = [&](KM_BinaryArchive& archive, const Material* thing) {
-            return writeMaterial(archive, *thing, m_textures.of(thing->base_color_texture));
+        const auto material = [&](KM_BinaryArchive& archive, const auto& thing) {
+            return writeMaterial(archive, *thing, m_places.of(thing->base_color_texture));
         };
-        const auto mesh = [](KM_BinaryArchive& archive, const KM_Mesh* thing) {
+        const auto mesh = [](KM_BinaryArchive& archive, const auto& thing) {
             return writeMesh(archive, *thing);
         };
-        return writeEach(chunk::TEXTURE, "a texture", m_textures.things(), texture) &&
-               writeEach(chunk::MATERIAL, "a material", m_materials.things(), material) &&
-               writeEach(chunk::MESH, "a mesh", m_meshes.things(), mesh);
+        return writeEach(chunk::TEXTURE, "a texture", m_shared.textures, texture) &&
+               writeEach(chunk::MATERIAL, "a material", m_shared.materials, material) &&
+               writeEach(chunk::MESH, "a mesh", m_shared.meshes, mesh);
     }
 
     bool writeObjects() {
         for (const ObjectContent& object : m_content.objects) {
             const auto payload = [&] {
-                return writeObject(m_archive, object, m_meshes.of(object.placed.mesh),
-                                   m_materials.of(object.placed.material));
+                return writeObject(m_archive, object, m_places.of(object.placed.mesh),
+                                   m_places.of(object.placed.material));
             };
             if (!writeChunk(chunk::OBJECT, nameOf(object), payload))
                 return false;
@@ -156,10 +124,9 @@ private:
     }
 
     const DocumentContent& m_content;
+    const SharedPlaces& m_places;
+    const SharedContent& m_shared;
     KM_BinaryArchive m_archive;
-    Places<Texture> m_textures;
-    Places<Material> m_materials;
-    Places<KM_Mesh> m_meshes;
     std::string m_failed_at;
 };
 
@@ -167,9 +134,21 @@ private:
 
 Result<std::vector<std::uint8_t>> encodeDocument(const DocumentContent& content) {
     try {
-        return DocumentWriter(content).write();
+        SharedPlaces places;
+        const SharedContent shared = places.add(content);
+        return DocumentWriter(content, places, shared).write();
     } catch (const std::exception&) {
-        return Error{"there is too little memory"};
+        return Error{NO_MEMORY};
+    }
+}
+
+Result<std::vector<std::uint8_t>> encodeDocument(const DocumentContent& content,
+                                                 const SharedPlaces& places) {
+    try {
+        const SharedContent nothing;
+        return DocumentWriter(content, places, nothing).write();
+    } catch (const std::exception&) {
+        return Error{NO_MEMORY};
     }
 }
 

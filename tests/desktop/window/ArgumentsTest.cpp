@@ -20,6 +20,20 @@ TEST(Arguments, UnknownOptionAndSecondFileAreMistakes) {
     EXPECT_FALSE(readArguments({"quarn-desktop", "a.obj", "b.obj"}).mistake.isEmpty());
 }
 
+TEST(Arguments, TheBeatOfRecoveryIsReadInSecondsAndTheirFractions) {
+    EXPECT_EQ(readArguments({"quarn-desktop"}).recovery_every, std::chrono::seconds(10));
+    EXPECT_EQ(readArguments({"quarn-desktop", "--recovery-every", "0.25"}).recovery_every,
+              std::chrono::milliseconds(250));
+    for (const char* const none : {"0", "-1", "nan", "often", "1e9", ""})
+        EXPECT_FALSE(readArguments({"quarn-desktop", "--recovery-every", none}).mistake.isEmpty())
+            << none;
+}
+
+TEST(Arguments, RecoveryIsWantedWhereNobodyRefusesIt) {
+    EXPECT_TRUE(readArguments({"quarn-desktop"}).wants_recovery);
+    EXPECT_FALSE(readArguments({"quarn-desktop", "--no-recovery"}).wants_recovery);
+}
+
 TEST(Arguments, HelpAndVersionAreAnswered) {
     EXPECT_TRUE(readArguments({"quarn-desktop", "--help"}).answer.contains("--run-script"));
     EXPECT_TRUE(readArguments({"quarn-desktop", "--version"}).answer.startsWith("quarn-desktop "));

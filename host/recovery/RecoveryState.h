@@ -1,0 +1,20 @@
+#pragma once
+
+#include "engine/images/Image.h"
+#include "host/document/file/DocumentContent.h"
+
+#include <chrono>
+#include <filesystem>
+
+namespace quarn {
+
+/// A document at one moment, as it is kept. All of it is its own but for meshes, materials and
+/// textures, which never change: another thread may read it while the document goes on.
+struct RecoveryState {
+    std::filesystem::path document; ///< the document's own file; empty: it was never saved
+    std::chrono::system_clock::time_point kept_at;
+    DocumentContent content;
+    Image picture; ///< what the active view shows, made small; of no size: as it was kept before
+};
+
+} // namespace quarn

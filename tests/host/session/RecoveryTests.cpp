@@ -1,0 +1,468 @@
+#include "host/session/Recovery.h"
+
+#include "ground/ProcessIdentity.h"
+#include "host/document/file/DocumentFile.h"
+#include "host/session/DocumentState.h"
+#include "tests/host/app/TestCommand.h"
+#include "tests/host/document/DocumentFixtures.h"
+#include "tests/host/document/SampleContent.h"
+#include "tests/host/recovery/RecoveryFixtures.h"
+
+#include <gmock/gmock.h>
+
+#include <csignal>
+#include <cstdlib>
+
+namespace quarn::test {
+namespace {
+
+namespace fs = std::filesystem;
+using namespace std::chrono_literals;
+using testing::AllOf;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using testing::SizeIs;
+
+class RecoveryTest : public HostTest {
+protected:
+    RecoveryTest() {
+        fs::create_directory(documents);
+        setenv("XDG_STATE_HOME", (folder / "home").c_str(), 1); // what commands look into
+    }
+    ~RecoveryTest() override { unsetenv("XDG_STATE_HOME"); }
+
+    Document& document() { return Document::of(session.document()); }
+    bool modified() { return isModified(session.document()); }
+    void runAll(std::initializer_list<std::wstring> lines) {
+        for (const std::wstring& line : lines)
+            ASSERT_EQ(session.runCommand(line), CQuarnCommand::success) << printed();
+    }
+    std::wstring path(const char* name) const {
+        return L"\"" + (documents / name).wstring() + L"\"";
+    }
+
+    /// Opens the sample document from a file and changes it.
+    void workOnSample(const char* name) {
+        ASSERT_TRUE(writeDocumentFile(sampleContent(), documents / name));
+        runAll({L"Open " + path(name), L"Point 1,2,3"});
+    }
+    Bytes work() {
+        const auto content = contentToSave(document());
+        EXPECT_TRUE(content) << content.message();
+        return content ? documentBytes(content.value()) : Bytes();
+    }
+    /// Lets the program end without a person's wish, as far as its files can tell.
+    void crash() {
+        EXPECT_EQ(keeper->keepNow(), std::nullopt);
+        keeper.reset();
+        letWritersEnd(state_folder);
+        runAll({L"New"});
+    }
+    void restart(std::chrono::milliseconds every = 0ms) {
+        keeper.emplace(session, RecoveryOptions{state_folder, every});
+    }
+    std::vector<RecoverableDocument> found() const {
+        return recoverableDocuments({.state_folder = state_folder});
+    }
+    int keptFiles() const { return filesBelow(state_folder) + countOf(recoveryFilesIn(documents)); }
+    static int countOf(const std::vector<fs::path>& files) {
+        return static_cast<int>(files.size());
+    }
+
+    TempFolder folder;
+    const fs::path documents = folder / "documents";
+    const fs::path state_folder = folder / "home" / "quarn";
+    /// With every beat due.
+    std::optional<RecoveryKeeper> keeper{std::in_place, session,
+                                         RecoveryOptions{state_folder, 0ms}};
+};
+
+// ---- What is kept, and where
+
+TEST_F(RecoveryTest, UnsavedWorkComesBackWhole) {
+    workOnSample("house.quarn");
+    const Bytes saved = bytesOf(documents / "house.quarn");
+    const Bytes before = work();
+    crash();
+    restart();
+    ASSERT_THAT(found(), SizeIs(1));
+    EXPECT_EQ(recover(session, found()[0]), std::nullopt);
+    EXPECT_EQ(work(), before);
+    EXPECT_TRUE(modified());
+    EXPECT_EQ(documentFile(session.document()), documents / "house.quarn");
+    EXPECT_EQ(bytesOf(documents / "house.quarn"), saved);
+    EXPECT_THAT(printed(), HasSubstr("Recovered \"house\", kept 20"));
+}
+
+TEST_F(RecoveryTest, ADocumentWithAFileIsKeptBesideIt) {
+    workOnSample("house.quarn");
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    ASSERT_THAT(recoveryFilesIn(documents), SizeIs(1));
+    EXPECT_THAT(recoveryFilesIn(documents)[0].filename().native(),
+                AllOf(testing::StartsWith(".house.quarn-"), HasSubstr(hostName()),
+                      HasSubstr(std::to_string(getpid()))));
+}
+
+TEST_F(RecoveryTest, ADocumentThatWasNeverSavedIsKeptInTheStateFolder) {
+    runAll({L"Point 1,2,3"});
+    crash();
+    EXPECT_THAT(recoveryFilesIn(recoveryFolder(state_folder)), SizeIs(1));
+    ASSERT_THAT(found(), SizeIs(1));
+    EXPECT_EQ(found()[0].document, fs::path());
+    EXPECT_TRUE(found()[0].name.IsEmpty());
+    EXPECT_EQ(recover(session, found()[0]), std::nullopt);
+    EXPECT_EQ(objectCount(session.document()), 1);
+    EXPECT_EQ(documentFile(session.document()), fs::path());
+    EXPECT_TRUE(modified());
+}
+
+TEST_F(RecoveryTest, TheListTellsNameTimeAndPicture) {
+    workOnSample("house.quarn");
+    Image picture;
+    picture.resize(document().activeView().frameWidth(), document().activeView().frameHeight());
+    ASSERT_TRUE(document().activeView().copyToFrameBuffer(picture));
+    document().activeView().redraw(CQuarnView::show_frame_buffer);
+    const auto before = std::chrono::system_clock::now();
+    crash();
+    ASSERT_THAT(found(), SizeIs(1));
+    const RecoverableDocument first = found()[0];
+    EXPECT_EQ(first.name, L"house");
+    EXPECT_EQ(first.document, documents / "house.quarn");
+    EXPECT_GE(first.kept_at, before - 1s);
+    EXPECT_LE(first.kept_at, std::chrono::system_clock::now());
+    ASSERT_GT(first.picture.size(), 24U);
+    EXPECT_EQ(first.picture[1], std::byte{'P'});
+    EXPECT_EQ(std::to_integer<int>(first.picture[18]) * 256 +
+                  std::to_integer<int>(first.picture[19]),
+              320)
+        << "the width in a PNG file's head";
+}
+
+TEST_F(RecoveryTest, NothingIsKeptWhereNothingIsUnsaved) {
+    ASSERT_TRUE(writeDocumentFile(sampleContent(), documents / "house.quarn"));
+    runAll({L"Open " + path("house.quarn"), L"Camera _Location 1,2,3 _Enter"});
+    keeper->beat();
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    EXPECT_EQ(keptFiles(), 0);
+}
+
+TEST_F(RecoveryTest, ABeatWritesNothingWhenNothingChanged) {
+    workOnSample("house.quarn");
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    ASSERT_THAT(recoveryFilesIn(documents), SizeIs(1));
+    const fs::path file = recoveryFilesIn(documents)[0];
+    const auto size = fs::file_size(file);
+    for (int i = 0; i < 5; ++i) {
+        keeper->beat();
+        EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    }
+    EXPECT_EQ(fs::file_size(file), size);
+    runAll({L"Camera _Location 1,2,3 _Enter"});
+    keeper->beat();
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    EXPECT_GT(fs::file_size(file), size) << "the camera of unsaved work is kept";
+}
+
+TEST_F(RecoveryTest, MeshesAreNotWrittenAgain) {
+    auto mesh = boxMesh({0, 0, 0}, {1, 1, 1});
+    const auto one_box = mesh->m_F;
+    for (int i = 0; i < 5000; ++i)
+        mesh->m_F.insert(mesh->m_F.end(), one_box.begin(), one_box.end());
+    document().objects().addMesh(L"Large", {mesh});
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    const fs::path file = recoveryFilesIn(recoveryFolder(state_folder)).at(0);
+    const auto size = fs::file_size(file);
+    EXPECT_GT(size, 700'000U);
+    runAll({L"Line 0,0,0 1,1,1"});
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    EXPECT_GT(fs::file_size(file), size);
+    EXPECT_LT(fs::file_size(file) - size, 5'000U);
+}
+
+// ---- When
+
+TEST_F(RecoveryTest, ABeatKeepsWhatChangedWithoutWaitingForTheDisk) {
+    runAll({L"Point 1,2,3"});
+    keeper->beat();
+    EXPECT_TRUE(waitUntil([&] { return keptFiles() == 2; }));
+}
+
+TEST_F(RecoveryTest, WhatACommandBeganWithIsKeptWhileItRuns) {
+    restart(300ms);
+    bool was_kept = false;
+    TestCommand command(L"Long", [&](const auto&) {
+        was_kept = waitUntil([&] { return keptFiles() == 2; });
+        return CQuarnCommand::success;
+    });
+    add(command);
+    runAll({L"Point 1,2,3", L"Long"});
+    EXPECT_TRUE(was_kept);
+}
+
+TEST_F(RecoveryTest, WhatACommandHasDoneByHalfIsNotKept) {
+    std::optional<std::string> refusal;
+    TestCommand command(L"Half", [&](const auto&) {
+        document().objects().addPoint(L"Half", {0, 0, 0});
+        keeper->beat();
+        refusal = keeper->keepNow();
+        std::this_thread::sleep_for(20ms);
+        return CQuarnCommand::success;
+    });
+    add(command);
+    runAll({L"Half"});
+    EXPECT_TRUE(refusal);
+    EXPECT_EQ(keptFiles(), 0);
+}
+
+TEST_F(RecoveryTest, ALongerBeatWaits) {
+    restart(1h);
+    runAll({L"Point 1,2,3", L"Point 4,5,6"});
+    keeper->beat();
+    std::this_thread::sleep_for(20ms);
+    EXPECT_EQ(keptFiles(), 0);
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    EXPECT_EQ(keptFiles(), 2);
+}
+
+// ---- When it goes
+
+TEST_F(RecoveryTest, ASavedDocumentNeedsNoRecovery) {
+    runAll({L"Point 1,2,3"});
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    EXPECT_EQ(keptFiles(), 2);
+    runAll({L"SaveAs " + path("a.quarn")});
+    keeper->beat();
+    EXPECT_TRUE(waitUntil([&] { return keptFiles() == 0; }));
+    EXPECT_TRUE(fs::exists(documents / "a.quarn"));
+}
+
+TEST_F(RecoveryTest, SavingDoesNotWaitForTheNextBeat) {
+    restart(1h);
+    runAll({L"Point 1,2,3"});
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    runAll({L"SaveAs " + path("a.quarn")});
+    keeper->beat();
+    EXPECT_TRUE(waitUntil([&] { return keptFiles() == 0; }));
+}
+
+TEST_F(RecoveryTest, ADocumentThatAnotherOneTookThePlaceOfNeedsNoRecovery) {
+    runAll({L"Point 1,2,3"});
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    runAll({L"New"});
+    keeper->beat();
+    EXPECT_TRUE(waitUntil([&] { return keptFiles() == 0; }));
+}
+
+TEST_F(RecoveryTest, WhatWasPutBackNeedsNoRecovery) {
+    runAll({L"Point 1,2,3", L"SaveAs " + path("a.quarn")});
+    const KM_UUID id = document().objects().objects()[0]->id;
+    document().objects().setVisible(id, false);
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    EXPECT_EQ(keptFiles(), 2);
+    document().objects().setVisible(id, true);
+    keeper->beat();
+    EXPECT_TRUE(waitUntil([&] { return keptFiles() == 0; }));
+}
+
+TEST_F(RecoveryTest, ForgottenWorkIsKeptAgainWhenItChangesFurther) {
+    runAll({L"Point 1,2,3"});
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    keeper->forget();
+    EXPECT_EQ(keptFiles(), 0);
+    keeper->beat();
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    EXPECT_EQ(keptFiles(), 0);
+    runAll({L"Point 4,5,6"});
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    EXPECT_EQ(keptFiles(), 2);
+}
+
+TEST_F(RecoveryTest, AnEndByAPersonsWishLeavesNothing) {
+    runAll({L"Point 1,2,3"});
+    keeper->beat();
+    EXPECT_TRUE(waitUntil([&] { return keptFiles() == 2; }));
+    keeper.reset();
+    EXPECT_EQ(keptFiles(), 0);
+}
+
+TEST_F(RecoveryTest, AnEndAfterASaveLeavesNothingOfWhatWasKeptBefore) {
+    runAll({L"Point 1,2,3"});
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    runAll({L"SaveAs " + path("a.quarn")});
+    keeper.reset();
+    EXPECT_EQ(keptFiles(), 0);
+}
+
+// ---- Troubles
+
+TEST_F(RecoveryTest, ATroubleIsToldOnceAndWorkGoesOn) {
+    fs::remove_all(folder / "home");
+    writeFile(folder / "home", "no folder");
+    runAll({L"Point 1,2,3"});
+    const auto kept = keeper->keepNow();
+    ASSERT_TRUE(kept);
+    EXPECT_THAT(*kept, HasSubstr("Unsaved work cannot be kept for recovery"));
+    EXPECT_EQ(keeper->takeTrouble(), kept);
+    for (int i = 0; i < 3; ++i) {
+        runAll({L"Point 4,5,6"});
+        keeper->beat();
+        EXPECT_TRUE(keeper->keepNow());
+        EXPECT_EQ(keeper->takeTrouble(), std::nullopt);
+    }
+    fs::remove(folder / "home");
+    EXPECT_EQ(keeper->keepNow(), std::nullopt) << "it tries again though nothing changed";
+    EXPECT_EQ(keptFiles(), 2);
+}
+
+TEST_F(RecoveryTest, ADamagedFileIsToldAndTheDocumentAtWorkStays) {
+    workOnSample("house.quarn");
+    crash();
+    const RecoverableDocument damaged = found().at(0);
+    Bytes bytes = bytesOf(damaged.recovery);
+    bytes[bytes.size() / 2] ^= 1;
+    writeFile(damaged.recovery, std::string(bytes.begin(), bytes.end()));
+    runAll({L"Point 7,8,9"});
+    const auto refusal = recover(session, damaged);
+    ASSERT_TRUE(refusal);
+    EXPECT_THAT(*refusal, HasSubstr("damaged"));
+    EXPECT_THAT(*refusal, HasSubstr(damaged.recovery.native()));
+    EXPECT_EQ(objectCount(session.document()), 1);
+    fs::remove(damaged.recovery);
+    EXPECT_THAT(recover(session, damaged).value_or(""), HasSubstr("there is no such file"));
+}
+
+TEST_F(RecoveryTest, ATornEndIsToldWithTheTimeOfWhatIsThere) {
+    workOnSample("house.quarn");
+    const Bytes before = work();
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    runAll({L"Point 4,5,6"});
+    crash();
+    const RecoverableDocument torn = found().at(0);
+    fs::resize_file(torn.recovery, fs::file_size(torn.recovery) - 1);
+    EXPECT_EQ(recover(session, torn), std::nullopt);
+    EXPECT_EQ(work(), before);
+    EXPECT_THAT(printed(), HasSubstr("The last of what was kept is not whole"));
+}
+
+TEST_F(RecoveryTest, AFileThatWasChangedMeanwhileIsWarnedOf) {
+    workOnSample("house.quarn");
+    crash();
+    fs::last_write_time(documents / "house.quarn", fs::file_time_type::clock::now() + 1h);
+    EXPECT_EQ(recover(session, found().at(0)), std::nullopt);
+    EXPECT_THAT(printed(), HasSubstr("house.quarn was changed after this was kept"));
+}
+
+// ---- What is found
+
+TEST_F(RecoveryTest, WorkOfARunningProgramIsNotOffered) {
+    runAll({L"Point 1,2,3"});
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    EXPECT_THAT(found(), IsEmpty());
+}
+
+TEST_F(RecoveryTest, WorkOfAnotherMachineIsNotOffered) {
+    runAll({L"Point 1,2,3"});
+    crash();
+    auto mark = readMark(found().at(0).mark);
+    mark->writer.host += "-other";
+    fs::remove(found().at(0).mark);
+    ASSERT_TRUE(writeMark(recoveryFolder(state_folder), *mark));
+    EXPECT_THAT(found(), IsEmpty());
+    EXPECT_EQ(keptFiles(), 2);
+}
+
+TEST_F(RecoveryTest, TheLastKeptComesFirst) {
+    for (const wchar_t* name : {L"a", L"b", L"c"}) {
+        std::this_thread::sleep_for(2ms);
+        workOnSample((std::string(1, static_cast<char>(name[0])) + ".quarn").c_str());
+        crash();
+        restart();
+    }
+    ASSERT_THAT(found(), SizeIs(3));
+    EXPECT_EQ(found()[0].name, L"c");
+    EXPECT_EQ(found()[2].name, L"a");
+}
+
+TEST_F(RecoveryTest, MarksOfWhatIsGoneAreClearedButNotThoseOfADiskThatIsNotThere) {
+    workOnSample("a.quarn");
+    crash();
+    restart();
+    workOnSample("b.quarn");
+    crash();
+    const RecoverableDocument b = found().at(0);
+    const fs::path away = folder / "away";
+    fs::rename(documents, away);
+    EXPECT_THAT(found(), IsEmpty());
+    fs::rename(away, documents);
+    EXPECT_THAT(found(), SizeIs(2));
+    fs::remove(b.recovery);
+    EXPECT_THAT(found(), SizeIs(1));
+    EXPECT_FALSE(fs::exists(b.mark));
+}
+
+TEST_F(RecoveryTest, ARecoveredDocumentIsKeptByItsNewProgramAtOnceAndTheOldFileGoes) {
+    workOnSample("house.quarn");
+    crash();
+    restart(1h);
+    const RecoverableDocument old = found().at(0);
+    EXPECT_EQ(recover(session, old), std::nullopt);
+    EXPECT_TRUE(fs::exists(old.recovery));
+    keeper->beat();
+    EXPECT_TRUE(waitUntil([&] { return !fs::exists(old.mark); }));
+    EXPECT_FALSE(fs::exists(old.recovery));
+    EXPECT_THAT(recoveryFilesIn(documents), SizeIs(1));
+    runAll({L"Save"});
+    keeper->beat();
+    EXPECT_TRUE(waitUntil([&] { return keptFiles() == 0; }));
+}
+
+TEST_F(RecoveryTest, ARecoveredDocumentThatIsSavedAtOnceLeavesNothing) {
+    workOnSample("house.quarn");
+    const Bytes before = work();
+    crash();
+    restart(1h);
+    EXPECT_EQ(recover(session, found().at(0)), std::nullopt);
+    runAll({L"Save"});
+    keeper.reset();
+    EXPECT_EQ(keptFiles(), 0);
+    EXPECT_EQ(bytesOf(documents / "house.quarn"), before);
+}
+
+TEST_F(RecoveryTest, DiscardedWorkIsGone) {
+    workOnSample("house.quarn");
+    crash();
+    discard(found().at(0));
+    EXPECT_EQ(keptFiles(), 0);
+    EXPECT_THAT(found(), IsEmpty());
+}
+
+// ---- The command
+
+TEST_F(RecoveryTest, TheCommandListsAndOpensWhatThereIs) {
+    EXPECT_EQ(run(L"Recover"), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("no unsaved document to recover"));
+    workOnSample("house.quarn");
+    const Bytes before = work();
+    crash();
+    restart();
+    runAll({L"Recover _Enter"});
+    EXPECT_THAT(printed(), HasSubstr("1: \"house\", kept 20"));
+    EXPECT_EQ(work(), before);
+    EXPECT_TRUE(modified());
+}
+
+TEST_F(RecoveryTest, TheCommandDiscardsTheOneThatIsNamed) {
+    for (const char* name : {"a.quarn", "b.quarn"}) {
+        std::this_thread::sleep_for(2ms);
+        workOnSample(name);
+        crash();
+        restart();
+    }
+    EXPECT_EQ(run(L"Recover 3"), CQuarnCommand::cancel);
+    runAll({L"Recover _Discard 2"});
+    ASSERT_THAT(found(), SizeIs(1));
+    EXPECT_EQ(found()[0].name, L"b");
+}
+
+} // namespace
+} // namespace quarn::test
