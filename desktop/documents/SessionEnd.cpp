@@ -38,8 +38,9 @@ void SessionEnd::prepare(const EndingSession& ending) {
         return;
     }
     m_settled = askPerson();
-    ending.has_asked();
-    if (!m_settled)
+    if (m_settled)
+        ending.agree();
+    else
         ending.cancel();
 }
 

@@ -13,9 +13,9 @@ class WindowClosing;
 
 /// The end of a desktop session, as the desktop offers it to its programs one after the other.
 struct EndingSession {
-    std::function<bool()> may_ask;   ///< whether the person may be asked something now
-    std::function<void()> has_asked; ///< what was asked is answered
-    std::function<void()> cancel;    ///< the session goes on
+    std::function<bool()> may_ask; ///< whether the person may be asked something now
+    std::function<void()> agree;   ///< after a question: the session may end
+    std::function<void()> cancel;  ///< after a question: the session is to go on
 };
 
 /// Decides what becomes of unsaved work when the desktop session ends: the person is asked about it

@@ -41,7 +41,7 @@ protected:
     }
     /// The desktop tells the program that the session is about to end.
     void prepare(bool may_ask) {
-        session_end.prepare({[may_ask] { return may_ask; }, [this] { has_asked = true; },
+        session_end.prepare({[may_ask] { return may_ask; }, [this] { has_agreed = true; },
                              [this] { is_cancelled = true; }});
     }
     /// The desktop ends its programs.
@@ -69,14 +69,14 @@ protected:
     int times_closed = 0;
     int times_kept = 0;
     bool was_asked = false;
-    bool has_asked = false;
+    bool has_agreed = false;
     bool is_cancelled = false;
     bool has_ended = false;
 };
 
 TEST_F(SessionEndTest, NobodyIsAskedWhereNothingIsUnsaved) {
     prepare(true);
-    EXPECT_FALSE(has_asked);
+    EXPECT_FALSE(has_agreed);
     EXPECT_FALSE(is_cancelled);
     EXPECT_EQ(times_kept, 0);
 }
@@ -85,7 +85,7 @@ TEST_F(SessionEndTest, WhoStaysHasTheSessionGoOn) {
     change();
     willClick("unsavedChanges", "keepDocument");
     prepare(true);
-    EXPECT_TRUE(has_asked);
+    EXPECT_FALSE(has_agreed);
     EXPECT_TRUE(is_cancelled);
 }
 
@@ -93,6 +93,7 @@ TEST_F(SessionEndTest, WhoDoesNotSaveIsNotAskedAgain) {
     change();
     willClick("unsavedChanges", "discardChanges");
     prepare(true);
+    EXPECT_TRUE(has_agreed);
     EXPECT_FALSE(is_cancelled);
     quit();
     EXPECT_TRUE(has_ended);

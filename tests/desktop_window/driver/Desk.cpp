@@ -33,6 +33,7 @@ std::map<std::string, std::string> environmentIn(const std::filesystem::path& ho
         {"HOME", home},
         {"XDG_CONFIG_HOME", home / ".config"},
         {"XDG_DATA_HOME", home / ".local"},
+        {"XDG_STATE_HOME", home / ".state"},
         {"XDG_CACHE_HOME", home / ".cache"},
         {"XDG_RUNTIME_DIR", home / ".run"},
         {"XDG_CURRENT_DESKTOP", ""},
@@ -111,6 +112,11 @@ Desk::~Desk() {
 }
 
 void Desk::start(const DeskStart& start) {
+    begin(start);
+    waitUntilIdle();
+}
+
+void Desk::begin(const DeskStart& start) {
     m_program.reset();
     m_probe = std::make_unique<Probe>();
     if (!m_display)
@@ -121,6 +127,7 @@ void Desk::start(const DeskStart& start) {
     program.environment = environmentIn(home());
     program.environment["DISPLAY"] = m_display->name();
     program.environment["QUARN_PROBE_SOCKET"] = std::to_string(m_probe->other());
+    program.environment["SESSION_MANAGER"] = start.session_manager;
     program.largest_file = start.largest_file;
     for (const QString& argument : start.arguments)
         program.arguments.push_back(argument.toStdString());
@@ -128,7 +135,6 @@ void Desk::start(const DeskStart& start) {
     m_probe->closeOther();
     const SeenWidget window = widget("mainWindow");
     m_display->giveKeyboard(window.window_id);
-    waitUntilIdle();
 }
 
 Ended Desk::waitForEnd() {

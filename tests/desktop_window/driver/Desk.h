@@ -13,7 +13,8 @@ namespace quarn::test {
 struct DeskStart {
     QSize screen_px = {1600, 1000};
     QStringList arguments = {};
-    unsigned long largest_file = 0; ///< bytes that a file may have; 0: no limit
+    unsigned long largest_file = 0;   ///< bytes that a file may have; 0: no limit
+    std::string session_manager = {}; ///< as DesktopSession::address
 };
 
 /// A person at a desk: the program `quarn-desktop` in a real window, a home folder that nothing
@@ -31,8 +32,12 @@ public:
     std::filesystem::path documents() const { return home() / "Documents"; }
     Display& display() { return *m_display; }
 
-    /// Starts the program and waits for its window.
+    /// Starts the program and waits until its window is there and idle.
     void start(const DeskStart& start = {});
+    /// Starts the program, which may ask something at once.
+    void begin(const DeskStart& start);
+    /// Sends the program a signal.
+    void sendSignal(int signal) { m_program->sendSignal(signal); }
     /// Waits until the program has ended by itself.
     Ended waitForEnd();
 
