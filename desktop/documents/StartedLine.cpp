@@ -20,7 +20,7 @@ StartedLine readLine(const Session& session, const QString& line) {
     while (end < line.size() && !line[end].isSpace())
         ++end;
     const QString name = line.mid(begin, end - begin);
-    for (const CommandName& command : session.commandNames()) {
+    for (const CommandName& command : session.commandNames(true)) {
         const QString english = qtText(command.english);
         if (name.compare(english, Qt::CaseInsensitive) == 0 ||
             name.compare(qtText(command.local), Qt::CaseInsensitive) == 0)

@@ -13,7 +13,8 @@ namespace quarn::desktop {
 namespace {
 
 bool leavesDocument(const QString& english_name) {
-    return english_name == "New" || english_name == "Open" || english_name == "Exit";
+    return english_name == "New" || english_name == "Open" || english_name == "Recover" ||
+           english_name == "Exit";
 }
 
 QString nameOf(CQuarnDoc& document) {

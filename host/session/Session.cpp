@@ -34,10 +34,10 @@ CQuarnCommand::result Session::runTypedCommand(std::wstring_view line) {
     return m_state->application.runner().run(line, {&document(), false, {}, true});
 }
 
-std::vector<CommandName> Session::commandNames() const {
+std::vector<CommandName> Session::commandNames(bool hidden_too) const {
     std::vector<CommandName> names;
     for (const RegisteredCommand& entry : m_state->application.commands().sortedByName()) {
-        if (!entry.command->IsHidden())
+        if (hidden_too || !entry.command->IsHidden())
             names.push_back(
                 {entry.english_name, entry.local_name, entry.command->CommandDescription()});
     }

@@ -51,7 +51,8 @@ public:
     CQuarnCommand::result runTypedCommand(std::wstring_view line);
 
     /// The names of the commands that Help lists, in the order of their English names.
-    std::vector<CommandName> commandNames() const;
+    /// @param hidden_too  those as well that Help leaves out
+    std::vector<CommandName> commandNames(bool hidden_too = false) const;
 
     /// Runs a script file: one command line per line; blank lines and lines that start with "#" are
     /// skipped. Stops at the first command that does not succeed.

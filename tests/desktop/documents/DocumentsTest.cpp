@@ -103,7 +103,7 @@ TEST_F(DocumentsTest, OtherCommandsAreStartedWithoutAQuestion) {
 
 TEST_F(DocumentsTest, WhoStaysLosesNothing) {
     change();
-    for (const char* line : {"_New", "open \"x.obj\"", "Exit"}) {
+    for (const char* line : {"_New", "open \"x.obj\"", "_-Recover 1", "Exit"}) {
         asked.clear();
         willClick("keepDocument");
         changes.start(line);
@@ -149,6 +149,27 @@ TEST_F(DocumentsTest, ClosingTheWindowAsksAndStaysOrGoes) {
     EXPECT_FALSE(window.close());
     willClick("discardChanges");
     EXPECT_TRUE(window.close());
+}
+
+TEST_F(DocumentsTest, AWindowWhoseDocumentCannotBeSavedStaysOpen) {
+    change();
+    willChoose({FileChoice::Kind::chosen, "/dev/null/kept.quarn"});
+    willClick("saveChanges");
+    EXPECT_FALSE(window.close());
+    EXPECT_TRUE(isModified(session.document()));
+    EXPECT_TRUE(printed.contains("kept.quarn")) << printed.toStdString();
+}
+
+TEST_F(DocumentsTest, ExitIsRefusedWhileACommandRuns) {
+    setUpTurntable(1000);
+    QTimer::singleShot(50, [this] {
+        changes.start("_Exit");
+        EXPECT_TRUE(printed.contains("still running")) << printed.toStdString();
+        starter.stop();
+    });
+    starter.start("_PlayAnimation");
+    EXPECT_FALSE(session.isExitRequested());
+    EXPECT_EQ(objectCount(session.document()), 1);
 }
 
 TEST_F(DocumentsTest, TheCommandThatEndsTheProgramAsksOnce) {
@@ -225,6 +246,20 @@ TEST_F(DocumentsTest, DroppingAsksAboutUnsavedChangesFirst) {
     willClick("keepDocument");
     drop.open({QUrl::fromLocalFile(qtText(triangle("c.obj")))});
     EXPECT_TRUE(started.isEmpty());
+    EXPECT_EQ(objectCount(session.document()), 1);
+}
+
+TEST_F(DocumentsTest, AQuestionAboutADocumentIsNotOvertakenByADrop) {
+    change();
+    QMimeData files;
+    files.setUrls({QUrl::fromLocalFile(qtText(triangle("c.obj")))});
+    QTimer::singleShot(0, [&] {
+        QDragEnterEvent enter({5, 5}, Qt::CopyAction, &files, Qt::LeftButton, {});
+        QApplication::sendEvent(&window, &enter);
+        EXPECT_FALSE(enter.isAccepted());
+        willClick("keepDocument");
+    });
+    changes.start("_New");
     EXPECT_EQ(objectCount(session.document()), 1);
 }
 
