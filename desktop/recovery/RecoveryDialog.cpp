@@ -6,6 +6,7 @@
 
 #include <QDateTime>
 #include <QDialogButtonBox>
+#include <QDir>
 #include <QLabel>
 #include <QListWidget>
 #include <QLocale>
@@ -23,9 +24,14 @@ QImage pictureOf(const RecoverableDocument& document) {
     return QImage::fromData(bytes, static_cast<int>(document.picture.size()), "PNG");
 }
 
+/// Its folder, from the person's own on.
 QString placeOf(const RecoverableDocument& document) {
-    return document.document.empty() ? localized(L"Never saved to a file", 45399)
-                                     : qtText(document.document.parent_path());
+    if (document.document.empty())
+        return localized(L"Never saved to a file", 45399);
+    const QString folder = qtText(document.document.parent_path());
+    const QString home = QDir::homePath();
+    const bool is_at_home = folder == home || folder.startsWith(home + '/');
+    return is_at_home ? '~' + folder.mid(home.size()) : folder;
 }
 
 QString timeOf(const RecoverableDocument& document) {
@@ -79,12 +85,15 @@ void RecoveryDialog::addDocument(const RecoverableDocument& document, std::size_
     auto* const row = new QListWidgetItem(m_list);
     const QString name = nameOf(document);
     const QString place = placeOf(document);
-    const QString time = timeOf(document);
+    QString time = timeOf(document);
+    if (fileIsNewer(document))
+        time += '\n' + localized(L"Older than its file, which was saved later", 45406);
     row->setText(name);
     row->setData(RecoveryRow::PLACE, place);
     row->setData(RecoveryRow::TIME, time);
     row->setData(RecoveryRow::PICTURE, pictureOf(document));
-    row->setData(Qt::AccessibleTextRole, QStringList{name, place, time}.join(", "));
+    row->setData(Qt::AccessibleTextRole,
+                 QStringList{name, place, time}.join(", ").replace('\n', ", "));
     row->setData(Qt::UserRole, static_cast<qulonglong>(index));
     row->setToolTip(qtText(document.document));
 }

@@ -60,7 +60,8 @@ void RecoveryRow::paint(QPainter* painter, const QStyleOptionViewItem& option,
     lines = paintLine(*painter, lines, index.data(Qt::DisplayRole).toString());
     painter->setFont(row.font);
     lines = paintLine(*painter, lines, index.data(PLACE).toString());
-    paintLine(*painter, lines, index.data(TIME).toString());
+    for (const QString& line : index.data(TIME).toString().split('\n'))
+        lines = paintLine(*painter, lines, line);
     painter->restore();
 }
 

@@ -10,7 +10,7 @@ class RecoveryRow final : public QStyledItemDelegate {
     Q_OBJECT
 public:
     static constexpr int PLACE = Qt::UserRole + 1;
-    static constexpr int TIME = Qt::UserRole + 2;
+    static constexpr int TIME = Qt::UserRole + 2;    ///< of one line or more
     static constexpr int PICTURE = Qt::UserRole + 3; ///< a QImage; a null one where there is none
 
     using QStyledItemDelegate::QStyledItemDelegate;

@@ -55,9 +55,12 @@ std::string localTime(std::chrono::system_clock::time_point time) {
 }
 
 bool wasChangedSince(const fs::path& file, std::chrono::system_clock::time_point time) {
+    using namespace std::chrono;
     struct stat status {};
-    return !file.empty() && stat(file.c_str(), &status) == 0 &&
-           std::chrono::system_clock::from_time_t(status.st_mtime) > time;
+    if (file.empty() || stat(file.c_str(), &status) != 0)
+        return false;
+    const auto since_epoch = seconds(status.st_mtim.tv_sec) + nanoseconds(status.st_mtim.tv_nsec);
+    return system_clock::time_point(duration_cast<system_clock::duration>(since_epoch)) > time;
 }
 
 Error cannotRecover(const RecoverableDocument& document, const std::string& why) {
@@ -89,6 +92,10 @@ std::vector<RecoverableDocument> recoverableIn(const fs::path& state_folder) {
             documents.push_back(std::move(*document));
     std::ranges::sort(documents, std::ranges::greater(), &RecoverableDocument::kept_at);
     return documents;
+}
+
+bool hasNewerFile(const RecoverableDocument& document) {
+    return wasChangedSince(document.document, document.kept_at);
 }
 
 std::string textOf(const RecoverableDocument& document) {

@@ -29,6 +29,10 @@ struct RecoverableDocument {
 /// do not run any more. Clears away marks that lead to no recovery file.
 std::vector<RecoverableDocument> recoverableIn(const std::filesystem::path& state_folder);
 
+/// Whether the document's own file was written after the last state was kept: by the program that
+/// ended as it saved, or by somebody who left the recovery for later.
+bool hasNewerFile(const RecoverableDocument& document);
+
 /// Which document it is and when it was kept, by the clock on the wall, in a line for a person:
 /// "house", kept 2026-06-21 12:03, of /home/me/house.quarn
 std::string textOf(const RecoverableDocument& document);

@@ -37,6 +37,10 @@ struct RecoveryKeeper::State {
     void look(Clock::time_point time_to_write);
     void lookWhereDue();
     void lookBeforeCommand();
+    /// Whether there is something to show now that there was not when the document was kept.
+    bool hasFirstPicture() const {
+        return shown == ShownView{} && document().activeView().frameBuffer().width > 0;
+    }
     void handOver(RecoveryMatter now, Clock::time_point time_to_write);
     void dropAll();
     void noteTrouble(const std::optional<std::string>& why);
@@ -88,7 +92,7 @@ void RecoveryKeeper::State::look(Clock::time_point time_to_write) {
         RecoveryMatter now = recoveryMatterOf(document());
         if (!document().isModified(now.saved))
             dropAll();
-        else if (now != known || worker.isInTrouble())
+        else if (now != known || worker.isInTrouble() || hasFirstPicture())
             handOver(std::move(now), time_to_write);
     } catch (const std::exception&) {
         noteTrouble("There is too little memory to keep unsaved work for recovery.");
@@ -193,6 +197,10 @@ std::optional<std::string> recover(Session& session, const RecoverableDocument& 
 
 void discard(const RecoverableDocument& document) {
     removeRecovery(document.mark);
+}
+
+bool fileIsNewer(const RecoverableDocument& document) {
+    return hasNewerFile(document);
 }
 
 std::string recoverableText(const RecoverableDocument& document) {

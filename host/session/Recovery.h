@@ -93,6 +93,10 @@ QNCORE_API std::optional<std::string> recover(Session& session,
 /// Removes the recovery file of a document that nobody wants.
 QNCORE_API void discard(const RecoverableDocument& document);
 
+/// Whether the document's own file was written after the last state was kept: by the program that
+/// ended as it saved, or by somebody who left the recovery for later.
+QNCORE_API bool fileIsNewer(const RecoverableDocument& document);
+
 /// Which document it is and when it was kept, by the clock on the wall, in a line for a person:
 /// "house", kept 2026-06-21 12:03, of /home/me/house.quarn
 QNCORE_API std::string recoverableText(const RecoverableDocument& document);
