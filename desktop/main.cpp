@@ -69,7 +69,7 @@ int runWindow(QApplication& application, const Arguments& arguments) {
         window.keepUnsavedWork({.state_folder = {}, .every = arguments.recovery_every});
     QTimer::singleShot(0, &window, [&] { begin(session, window, arguments); });
     const int exit_code = application.exec();
-    window.settleUnsavedWork();
+    window.finish();
     return quarn::stopSignal() == 0 ? exit_code : 128 + quarn::stopSignal();
 }
 

@@ -217,6 +217,12 @@ void MainWindow::keepUnsavedWork(const RecoveryOptions& options) {
     m_menus->addBelow("Open", {&m_recovery_offer->action()});
 }
 
+void MainWindow::finish() {
+    if (isVisible()) // nobody has closed it
+        saveLayout();
+    settleUnsavedWork();
+}
+
 void MainWindow::settleUnsavedWork() {
     if (!m_recovery)
         return;

@@ -56,8 +56,9 @@ public:
     RecoveryOffer* recoveryOffer() { return m_recovery_offer; }
     /// Tells the person something that must not be missed: in the status bar and the output.
     void tellAndPrint(const QString& message);
-    /// After the event loop: unsaved work is kept for the next start, or is not wanted any more.
-    void settleUnsavedWork();
+    /// After the event loop: size and place are remembered, and unsaved work is kept for the next
+    /// start or not wanted any more.
+    void finish();
     /// Size, place and borders of the last run (QSettings); a good size where there was none.
     void restoreLayout();
 
@@ -75,6 +76,7 @@ private:
     RenderPictureWindow& renderWindow();
     void showTitle();
     void saveLayout();
+    void settleUnsavedWork();
     void tell(const QString& message);
 
     Session& m_session;

@@ -1,0 +1,132 @@
+#include <QAbstractButton>
+#include <QApplication>
+#include <QElapsedTimer>
+#include <QFile>
+#include <QGenericPlugin>
+#include <QKeyEvent>
+#include <QLineEdit>
+#include <QListWidget>
+#include <QTimer>
+
+namespace quarn::test {
+
+namespace {
+
+constexpr int BETWEEN_LINES_MS = 15;
+constexpr int POINTS_BETWEEN_SAVES = 40;
+/// After which no offer comes any more.
+constexpr int LONGEST_WAIT_FOR_OFFER_MS = 500;
+
+/// Types command lines as a person does, one after the other, and writes down in a journal what it
+/// begins and what is done: whoever kills the program reads there what was there to be lost.
+///
+/// It makes points and saves now and then, to `work.quarn` in its folder, with a copy of each saved
+/// file beside it; or it takes the recovery that is offered, saves it as `recovered.quarn` and ends
+/// the program.
+class WindowTypist final : public QObject {
+public:
+    WindowTypist(const QString& folder, bool recovers)
+        : m_folder(folder), m_journal(folder + "/journal"), m_recovers(recovers) {
+        m_journal.open(QIODevice::WriteOnly | QIODevice::Append | QIODevice::Unbuffered);
+        connect(&m_timer, &QTimer::timeout, this, [this] { m_recovers ? recover() : work(); });
+        m_timer.start(BETWEEN_LINES_MS);
+        m_clock.start();
+    }
+
+private:
+    /// Nothing is typed while a command runs or a dialog is open.
+    void work() {
+        if (QApplication::activeModalWidget() || m_is_typing)
+            return;
+        if (m_points == 0)
+            save("_-SaveAs \"" + m_folder + "/work.quarn\"");
+        else if (m_points % POINTS_BETWEEN_SAVES == 0)
+            save("_-Save");
+        note("begun", ++m_points);
+        if (type(QString("_-Point %1,0,0").arg(m_points)))
+            note("done", m_points);
+    }
+
+    void save(const QString& line) {
+        note("saving", m_points);
+        if (!type(line))
+            return;
+        QFile::remove(m_folder + "/saved.quarn");
+        QFile::copy(m_folder + "/work.quarn", m_folder + "/saved.quarn");
+        note("saved", m_points);
+    }
+
+    void recover() {
+        QWidget* const dialog = QApplication::activeModalWidget();
+        const bool is_offered = dialog && dialog->objectName() == "recovery";
+        if (!m_is_typing && is_offered) {
+            take(*dialog);
+            type("_-SaveAs \"" + m_folder + "/recovered.quarn\"");
+            type("_-Exit");
+        } else if (!m_is_typing && m_clock.elapsed() > LONGEST_WAIT_FOR_OFFER_MS) {
+            type("_-Exit");
+        }
+    }
+
+    /// A person takes nothing that says it is older than the file.
+    void take(QWidget& dialog) {
+        const QListWidgetItem& row = *dialog.findChild<QListWidget*>("recoverable")->item(0);
+        const bool is_older =
+            row.data(Qt::AccessibleTextRole).toString().contains("Older than its file");
+        note(is_older ? "older" : "offered", 0);
+        dialog.findChild<QAbstractButton*>(is_older ? "later" : "recover")->click();
+    }
+
+    /// @return whether there was a line to type into
+    bool type(const QString& line) {
+        QLineEdit* edit = nullptr;
+        for (QWidget* const window : QApplication::topLevelWidgets())
+            if (window->objectName() == "mainWindow")
+                edit = window->findChild<QLineEdit*>("commandLine");
+        if (!edit)
+            return false;
+        m_is_typing = true;
+        edit->setText(line);
+        QKeyEvent press(QEvent::KeyPress, Qt::Key_Return, Qt::NoModifier, "\r");
+        QApplication::sendEvent(edit, &press);
+        m_is_typing = false;
+        return true;
+    }
+
+    /// "done 12 81234": what, which point, and when, on the clock that all processes share.
+    void note(const char* what, int point) {
+        using namespace std::chrono;
+        const qint64 now_ms =
+            duration_cast<milliseconds>(steady_clock::now().time_since_epoch()).count();
+        m_journal.write(QString("%1 %2 %3\n").arg(what).arg(point).arg(now_ms).toLatin1());
+    }
+
+    QString m_folder;
+    QFile m_journal;
+    bool m_recovers;
+    QTimer m_timer;
+    QElapsedTimer m_clock;
+    int m_points = 0;
+    bool m_is_typing = false;
+};
+
+/// Loaded by way of QT_QPA_GENERIC_PLUGINS, with `QUARN_TYPIST_FOLDER` and, where it takes a
+/// recovery, `QUARN_TYPIST_RECOVERS`.
+class WindowTypistPlugin final : public QGenericPlugin {
+    Q_OBJECT
+    Q_PLUGIN_METADATA(IID QGenericPluginFactoryInterface_iid FILE "typist.json")
+
+public:
+    QObject* create(const QString&, const QString&) override {
+        const QString folder = qEnvironmentVariable("QUARN_TYPIST_FOLDER");
+        if (folder.isEmpty())
+            return nullptr;
+        return new WindowTypist(folder, qEnvironmentVariableIsSet("QUARN_TYPIST_RECOVERS"));
+    }
+};
+
+} // namespace
+
+} // namespace quarn::test
+
+#include "WindowTypist.moc"
