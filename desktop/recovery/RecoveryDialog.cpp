@@ -6,6 +6,7 @@
 
 #include <QDateTime>
 #include <QDialogButtonBox>
+#include <QDir>
 #include <QLabel>
 #include <QListWidget>
 #include <QLocale>
@@ -23,9 +24,14 @@ QImage pictureOf(const RecoverableDocument& document) {
     return QImage::fromData(bytes, static_cast<int>(document.picture.size()), "PNG");
 }
 
+/// Its folder, from the person's own on.
 QString placeOf(const RecoverableDocument& document) {
-    return document.document.empty() ? localized(L"Never saved to a file", 45399)
-                                     : qtText(document.document.parent_path());
+    if (document.document.empty())
+        return localized(L"Never saved to a file", 45399);
+    const QString folder = qtText(document.document.parent_path());
+    const QString home = QDir::homePath();
+    const bool is_at_home = folder == home || folder.startsWith(home + '/');
+    return is_at_home ? '~' + folder.mid(home.size()) : folder;
 }
 
 QString timeOf(const RecoverableDocument& document) {

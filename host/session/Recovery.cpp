@@ -39,6 +39,10 @@ struct RecoveryKeeper::State {
     void look(Clock::time_point time_to_write, Clock::duration longest);
     void lookWhereDue();
     void lookBeforeCommand();
+    /// Whether there is something to show now that there was not when the document was kept.
+    bool hasFirstPicture() const {
+        return shown == ShownView{} && document().activeView().frameBuffer().width > 0;
+    }
     void handOver(RecoveryMatter now, const std::shared_ptr<const ObjectCopies>& objects,
                   Clock::time_point time_to_write);
     void dropAll();
@@ -94,7 +98,7 @@ void RecoveryKeeper::State::look(Clock::time_point time_to_write, Clock::duratio
         RecoveryMatter now = recoveryMatterOf(document());
         if (!document().isModified(now.saved))
             dropAll();
-        else if (objects && (now != known || worker.isInTrouble()))
+        else if (objects && (now != known || worker.isInTrouble() || hasFirstPicture()))
             handOver(std::move(now), objects, time_to_write);
         if (!objects)
             next_look = {};

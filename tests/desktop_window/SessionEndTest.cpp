@@ -47,6 +47,8 @@ TEST_F(SessionEnds, WhereNothingMayBeAskedUnsavedWorkIsOfferedAtTheNextStart) {
     EXPECT_TRUE(desk.look().modalWindows().isEmpty());
     session.end();
     EXPECT_EQ(desk.waitForEnd().exit_code, 0);
+    desk.begin({});
+    desk.widget("recover");
 }
 
 } // namespace

@@ -2,8 +2,10 @@
 
 #include <QColor>
 
+#include <csignal>
 #include <cstdio>
 #include <exception>
+#include <thread>
 
 namespace {
 
@@ -76,6 +78,20 @@ public:
         take(desk, "window-sun-frame");
     }
 
+    /// Two documents of programs that were killed.
+    void recovery() {
+        Desk desk;
+        std::filesystem::copy(m_model.parent_path(), desk.documents());
+        workAndKill(
+            desk, "_-SaveAs \"Documents/riverside.quarn\"\n"
+                  "_-DisplayMode _Rendered\n"
+                  "_-SetTurntableAnimation 120 _Clockwise _jpg _RenderedViewport Perspective R\n");
+        workAndKill(desk, "_-DisplayMode _Shaded\n_-Point 0,0,0\n");
+        desk.begin({.arguments = {"--language", "en"}});
+        desk.widget("recover");
+        take(desk, "window-recovery");
+    }
+
     void inJapanese() {
         Desk desk;
         open(desk, "ja");
@@ -91,6 +107,16 @@ public:
     }
 
 private:
+    void workAndKill(Desk& desk, const char* lines) {
+        writeFile(desk.home() / "work.txt",
+                  std::string("_-Open \"Documents/pavilion.obj\"\n") + lines);
+        desk.start({.screen_px = {1300, 900},
+                    .arguments = {"--recovery-every", "0.2", "--run-script", "work.txt"}});
+        std::this_thread::sleep_for(std::chrono::seconds(2)); // some beats
+        desk.sendSignal(SIGKILL);
+        desk.waitForEnd();
+    }
+
     void open(Desk& desk, const char* language) {
         std::filesystem::copy(m_model.parent_path(), desk.documents());
         desk.start({.screen_px = {1300, 900}, .arguments = {"--language", language}});
@@ -148,6 +174,7 @@ int main(int argument_count, char** arguments) {
     try {
         Tour tour(std::filesystem::absolute(arguments[1]), QString::fromLocal8Bit(arguments[2]));
         tour.inEnglish();
+        tour.recovery();
         tour.inJapanese();
         tour.inGerman();
     } catch (const std::exception& error) {

@@ -5,6 +5,7 @@
 #include "tests/desktop/dialogs/DialogDriver.h"
 
 #include <QBuffer>
+#include <QDir>
 #include <QListWidget>
 #include <QPushButton>
 
@@ -25,7 +26,7 @@ RecoverableDocument document(const std::string& file) {
     RecoverableDocument made;
     made.recovery = "/state/" + file;
     if (!file.empty())
-        made.document = "/home/anna/models/" + file;
+        made.document = "/data/models/" + file;
     made.kept_at = std::chrono::system_clock::time_point(1700000000s); // 2023-11-14 22:13:20 UTC
     QImage green(32, 20, QImage::Format_RGB32);
     green.fill(Qt::green);
@@ -54,7 +55,7 @@ protected:
 TEST_F(RecoveryDialogTest, EachDocumentIsShownWithNamePlaceTimeAndPicture) {
     const QListWidgetItem& house = *list().item(0);
     EXPECT_EQ(house.text(), "house.quarn");
-    EXPECT_EQ(house.data(RecoveryRow::PLACE).toString(), "/home/anna/models");
+    EXPECT_EQ(house.data(RecoveryRow::PLACE).toString(), "/data/models");
     EXPECT_TRUE(house.data(RecoveryRow::TIME).toString().contains("2023"));
     EXPECT_EQ(house.data(RecoveryRow::PICTURE).value<QImage>().pixelColor(3, 3), Qt::green);
     EXPECT_EQ(list().item(1)->text(), "New document");
@@ -63,7 +64,25 @@ TEST_F(RecoveryDialogTest, EachDocumentIsShownWithNamePlaceTimeAndPicture) {
 
 TEST_F(RecoveryDialogTest, ARowReadsAloudAsAllThatItShows) {
     const QString aloud = list().item(0)->data(Qt::AccessibleTextRole).toString();
-    EXPECT_TRUE(aloud.startsWith("house.quarn, /home/anna/models, Kept on")) << aloud.toStdString();
+    EXPECT_TRUE(aloud.startsWith("house.quarn, /data/models, Kept on")) << aloud.toStdString();
+}
+
+TEST_F(RecoveryDialogTest, AFolderOfThePersonIsShownFromTheirOwnOn) {
+    RecoverableDocument mine = document("house.quarn");
+    mine.document = nativePath(QDir::homePath()) / "models" / "house.quarn";
+    const RecoveryDialog offer({mine}, {}, nullptr);
+    const QListWidgetItem& row = *part<QListWidget>(offer, "recoverable").item(0);
+    EXPECT_EQ(row.data(RecoveryRow::PLACE).toString(), "~/models");
+}
+
+TEST_F(RecoveryDialogTest, WhatIsOlderThanItsFileSaysSo) {
+    RecoverableDocument older = document("");
+    older.document = folder / "saved.quarn";
+    quarn::test::writeFile(older.document, "saved in this year");
+    const RecoveryDialog offer({older}, {}, nullptr);
+    const QListWidgetItem& row = *part<QListWidget>(offer, "recoverable").item(0);
+    EXPECT_TRUE(row.data(RecoveryRow::TIME).toString().contains("saved later"));
+    EXPECT_FALSE(list().item(0)->data(RecoveryRow::TIME).toString().contains("saved later"));
 }
 
 TEST_F(RecoveryDialogTest, WhatIsOlderThanItsFileSaysSo) {
@@ -120,7 +139,7 @@ TEST_F(RecoveryDialogTest, TheDialogClosesWhenAllIsDiscarded) {
         onceShown("message", [](QWidget& box) { part<QPushButton>(box, "yes").click(); });
         press("discard");
     }
-    EXPECT_EQ(discarded, (std::vector<std::filesystem::path>{"/home/anna/models/house.quarn", {}}));
+    EXPECT_EQ(discarded, (std::vector<std::filesystem::path>{"/data/models/house.quarn", {}}));
     EXPECT_FALSE(dialog.isVisible());
     EXPECT_EQ(dialog.result(), QDialog::Rejected);
 }
