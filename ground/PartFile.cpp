@@ -4,7 +4,9 @@
 
 #include <cerrno>
 #include <charconv>
+#include <dirent.h>
 #include <fcntl.h>
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -51,10 +53,11 @@ std::optional<ProcessIdentity> writerOf(std::string_view name) {
     return ProcessIdentity{std::string(name), *pid, 0};
 }
 
-bool isLeft(const fs::directory_entry& entry) {
-    const std::optional<ProcessIdentity> writer = writerOf(entry.path().filename().native());
+bool isLeft(const fs::path& folder, const char* name) {
+    const std::optional<ProcessIdentity> writer = writerOf(name);
     std::error_code error;
-    return writer && hasEnded(*writer) && fs::is_regular_file(entry.symlink_status(error));
+    return writer && hasEnded(*writer) &&
+           fs::is_regular_file(fs::symlink_status(folder / name, error));
 }
 
 } // namespace
@@ -103,13 +106,15 @@ bool PartFile::renameTo(const fs::path& path) {
     return !m_exists;
 }
 
+/// A folder of recordings may have many thousand files, so no path is made for those that stay.
 void removeLeftParts(const fs::path& folder) {
-    std::error_code error;
-    for (fs::directory_iterator entry(folder, error), end; !error && entry != end;
-         entry.increment(error)) {
+    const std::unique_ptr<DIR, int (*)(DIR*)> listing(opendir(folder.c_str()), closedir);
+    if (!listing)
+        return;
+    while (const dirent* const entry = readdir(listing.get())) {
         std::error_code ignored;
-        if (isLeft(*entry))
-            fs::remove(entry->path(), ignored);
+        if (isLeft(folder, entry->d_name))
+            fs::remove(folder / entry->d_name, ignored);
     }
 }
 
