@@ -43,7 +43,8 @@ Arguments readArguments(const QStringList& arguments) {
         "exit", "Ends when the script has ended: with 0, or with 1 where a command failed or "
                 "a recording lacks pictures.");
     const QCommandLineOption overwrite(
-        "overwrite", "Recordings replace files that no recording of their name wrote.");
+        "overwrite",
+        "Replaces write-protected files, and by a recording those that none of its name wrote.");
     const QCommandLineOption every(
         "recovery-every", "Keeps unsaved work for recovery so often. Default: 10.", "seconds");
     const QCommandLineOption no_recovery(

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "ground/AtomicFile.h"
 #include "host/app/CommandRegistry.h"
 #include "host/app/CommandRunner.h"
 #include "host/app/PlugInLoader.h"
@@ -59,6 +60,10 @@ public:
     /// Whether a picture or a page may be written to a file now: a recording that runs leaves files
     /// of others alone, and has told so then.
     bool mayWrite(const std::filesystem::path& file) const;
+    /// What becomes of a write-protected file that is to be replaced.
+    Protection protection() const {
+        return m_options.overwrites ? Protection::overridden : Protection::respected;
+    }
     /// To be called after a picture was written to a file: counts it for the command that runs, and
     /// tells the front end. Without a running command nothing happens.
     void pictureWritten(const std::filesystem::path& file);

@@ -31,7 +31,7 @@ bool CQuarnDib::WriteToFile(const wchar_t* path, int) const {
     const std::filesystem::path file = quarn::pathFromText(path);
     if (!application->mayWrite(file))
         return false;
-    const auto written = quarn::writeImageFile(file, *m_image);
+    const auto written = quarn::writeImageFile(file, *m_image, application->protection());
     if (written)
         application->pictureWritten(file);
     else

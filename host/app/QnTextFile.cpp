@@ -43,6 +43,11 @@ bool mayWrite(const std::filesystem::path& file) {
     return !application || application->mayWrite(file);
 }
 
+quarn::Protection protection() {
+    const quarn::Application* const application = applicationHere();
+    return application ? application->protection() : quarn::Protection::respected;
+}
+
 void noteEnd(const std::filesystem::path& file, const quarn::Result<void>& written) {
     quarn::Application* const application = applicationHere();
     if (!application)
@@ -87,7 +92,7 @@ bool CQnTextFile::Close() {
     // A page comes once behind its pictures; those are written without a look around.
     quarn::removeLeftParts(folderOf(*closing.path));
     const quarn::Result<void> written =
-        quarn::writeFileAtomically(*closing.path, std::as_bytes(std::span(bytes)));
+        quarn::writeFileAtomically(*closing.path, std::as_bytes(std::span(bytes)), protection());
     noteEnd(*closing.path, written);
     return written.ok();
 }

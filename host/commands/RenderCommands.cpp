@@ -69,15 +69,16 @@ CQuarnCommand::result runSaveRenderWindowAs(const CQuarnCommandContext& context)
         askFile(context, FileUse::save_rendering, QnLocalizeString(L"Image file", 42201), file);
     if (asked != CQuarnCommand::success)
         return asked;
-    if (!Application::current()->mayWrite(file)) {
+    Application& application = *Application::current();
+    if (!application.mayWrite(file)) {
         document.list().noteUnsavedPicture("The picture was not written.");
         return CQuarnCommand::failure;
     }
-    const auto written = writeImageFile(file, window.picture);
+    const auto written = writeImageFile(file, window.picture, application.protection());
     document.list().noteUnsavedPicture(written ? std::string() : written.message());
     if (!written)
         return fail(written.message());
-    Application::current()->pictureWritten(file);
+    application.pictureWritten(file);
     return CQuarnCommand::success;
 }
 

@@ -122,9 +122,10 @@ CQuarnCommand::result failAtProtection(const std::filesystem::path& file, const 
 }
 
 CQuarnCommand::result save(Document& document, const SaveTarget& target, bool only_selected) {
-    if (!target.overwrite && isWriteProtected(target.file))
+    const Protection protection =
+        target.overwrite ? Protection::overridden : Application::current()->protection();
+    if (protection == Protection::respected && isWriteProtected(target.file))
         return failAtProtection(target.file, only_selected ? L"SaveSelected" : L"SaveAs");
-    const Protection protection = target.overwrite ? Protection::overridden : Protection::respected;
     const auto saved =
         saveDocument(document, target.file, {target.version, only_selected, protection});
     if (!saved)

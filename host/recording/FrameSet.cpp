@@ -22,10 +22,10 @@ FrameSet FrameSet::firstOf(int count) {
 }
 
 void FrameSet::add(const Range& range) {
-    const auto begin = std::ranges::find_if(
-        m_ranges, [&](const Range& other) { return !isApart(other.last, range.first); });
-    const auto end = std::find_if(begin, m_ranges.end(), [&](const Range& other) {
-        return isApart(range.last, other.first);
+    const auto begin = std::ranges::partition_point(
+        m_ranges, [&](const Range& other) { return isApart(other.last, range.first); });
+    const auto end = std::partition_point(begin, m_ranges.end(), [&](const Range& other) {
+        return !isApart(range.last, other.first);
     });
     Range joined = range;
     if (begin != end) {

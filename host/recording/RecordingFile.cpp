@@ -1,6 +1,5 @@
 #include "host/recording/RecordingFile.h"
 
-#include "ground/AtomicFile.h"
 #include "ground/FileBytes.h"
 #include "ground/PathText.h"
 #include "sdk/qncore/QnLocalize.h"
@@ -68,12 +67,14 @@ int intOf(const json& value) {
 
 FrameSet framesOf(const json& ranges) {
     FrameSet frames;
+    int before = -1;
     for (const json& range : ranges) {
         const int first = intOf(range.at(0));
         const int last = intOf(range.at(1));
-        if (first > last)
+        if (first <= before || first > last)
             throw std::out_of_range("range");
         frames.add(FrameSet::Range{first, last});
+        before = last;
     }
     return frames;
 }
@@ -130,15 +131,19 @@ Error ofALaterVersion(const std::filesystem::path& file) {
                 .ToUtf8()};
 }
 
-Result<std::optional<RecordingFile>> parseRecording(std::string_view text,
-                                                    const std::filesystem::path& file) {
+/// Even a recording of many pieces takes a small part of this.
+constexpr std::uintmax_t largest_file_bytes = 64'000'000;
+
+} // namespace
+
+Result<RecordingFile> parseRecordingFile(std::string_view text, const std::filesystem::path& file) {
     try {
         const json object = json::parse(text);
         if (object.at("format") != format_name)
             return notARecording(file);
         if (object.at("version").get<int>() > format_version)
             return ofALaterVersion(file);
-        return std::optional(recordingOf(object));
+        return recordingOf(object);
     } catch (const json::exception&) {
         return notARecording(file);
     } catch (const std::out_of_range&) {
@@ -146,23 +151,31 @@ Result<std::optional<RecordingFile>> parseRecording(std::string_view text,
     }
 }
 
-} // namespace
+std::string recordingFileText(const RecordingFile& recording) {
+    return jsonOf(recording).dump(2, ' ', false, json::error_handler_t::replace) + "\n";
+}
 
 Result<std::optional<RecordingFile>> readRecordingFile(const std::filesystem::path& file) {
     std::error_code error;
     if (!std::filesystem::exists(std::filesystem::symlink_status(file, error)))
         return std::optional<RecordingFile>();
+    if (std::filesystem::file_size(file, error) > largest_file_bytes)
+        return notARecording(file);
     const Result<FileBytes> read = readFileBytes(file);
     if (!read)
         return notARecording(file);
     const auto bytes = read.value().bytes();
-    return parseRecording({reinterpret_cast<const char*>(bytes.data()), bytes.size()}, file);
+    auto recording =
+        parseRecordingFile({reinterpret_cast<const char*>(bytes.data()), bytes.size()}, file);
+    if (!recording)
+        return recording.error();
+    return std::optional(std::move(recording.value()));
 }
 
-Result<void> writeRecordingFile(const std::filesystem::path& file, const RecordingFile& recording) {
-    const std::string text =
-        jsonOf(recording).dump(2, ' ', false, json::error_handler_t::replace) + "\n";
-    return writeFileAtomically(file, std::as_bytes(std::span(text)));
+Result<void> writeRecordingFile(const std::filesystem::path& file, const RecordingFile& recording,
+                                Protection protection) {
+    const std::string text = recordingFileText(recording);
+    return writeFileAtomically(file, std::as_bytes(std::span(text)), protection);
 }
 
 bool isRecordedElsewhere(const RecordingFile& recording, std::int64_t now_s) {

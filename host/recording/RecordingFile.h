@@ -1,5 +1,6 @@
 #pragma once
 
+#include "ground/AtomicFile.h"
 #include "ground/ProcessIdentity.h"
 #include "ground/Result.h"
 #include "host/recording/FrameSet.h"
@@ -9,6 +10,7 @@
 #include <map>
 #include <optional>
 #include <string>
+#include <string_view>
 
 namespace quarn {
 
@@ -49,7 +51,15 @@ struct RecordingFile {
 Result<std::optional<RecordingFile>> readRecordingFile(const std::filesystem::path& file);
 
 /// Writes such a file; it appears whole or not at all.
-Result<void> writeRecordingFile(const std::filesystem::path& file, const RecordingFile& recording);
+Result<void> writeRecordingFile(const std::filesystem::path& file, const RecordingFile& recording,
+                                Protection protection = Protection::respected);
+
+/// What such a file holds as bytes.
+std::string recordingFileText(const RecordingFile& recording);
+/// Reads that back.
+/// @param file  for the message
+/// @return errors as of readRecordingFile
+Result<RecordingFile> parseRecordingFile(std::string_view text, const std::filesystem::path& file);
 
 /// Whether another process records now, as far as can be told: its lease lives, and it has not
 /// ended on this machine.

@@ -121,11 +121,16 @@ bool RunningRecording::isStillOurs() {
     return false;
 }
 
-/// Where the file cannot be written, as on a full disk, the pictures themselves tell it.
 void RunningRecording::renew() {
     m_next_beat = std::chrono::steady_clock::now() + m_pace.beat;
     m_file.lease_until_s = unixSeconds() + m_pace.lease.count();
-    (void)writeRecordingFile(m_place.recordingFile(), m_file).ok();
+    store();
+}
+
+/// Where the file cannot be written, as on a full disk, the pictures themselves tell it.
+void RunningRecording::store() const {
+    const Protection protection = m_overwrites ? Protection::overridden : Protection::respected;
+    (void)writeRecordingFile(m_place.recordingFile(), m_file, protection).ok();
 }
 
 std::optional<RecordingReport> RunningRecording::end() {
@@ -179,12 +184,11 @@ bool RunningRecording::keepIfOf(const PicturesByExtension& earlier, const std::s
 void RunningRecording::noteEnd() {
     m_file.is_running = false;
     m_file.owns_page = m_page_is_written || m_owned_page;
-    const fs::path file = m_place.recordingFile();
     std::error_code error;
     if (m_written > 0 || m_file.owns_page || !m_file.earlier.empty())
-        (void)writeRecordingFile(file, m_file).ok();
+        store();
     else
-        fs::remove(file, error); // it would tell of nothing
+        fs::remove(m_place.recordingFile(), error); // it would tell of nothing
 }
 
 } // namespace quarn

@@ -56,6 +56,7 @@ private:
     void refuse(const std::string& why);
     bool isStillOurs();
     void renew();
+    void store() const;
     void lookThroughFolder(RecordingReport& report);
     bool keepIfOf(const PicturesByExtension& earlier, const std::string& name);
     void noteEnd();

@@ -71,8 +71,9 @@ void addShowScript(CLI::App& command, bool& is_only_shown) {
 }
 
 void addOverwrite(CLI::App& command, CommonOptions& common) {
-    command.add_flag("--overwrite", common.overwrites,
-                     "Replace files that a recording of this name did not write");
+    command.add_flag(
+        "--overwrite", common.overwrites,
+        "Replace files that a recording of this name did not write, and protected ones");
 }
 
 void addModelAndFolder(const OptionAdder& add, RecordingRequest& request) {

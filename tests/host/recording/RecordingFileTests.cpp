@@ -87,6 +87,17 @@ TEST_F(RecordingFileOnDisk, MayHoldFieldsThatALaterStepAdds) {
     EXPECT_EQ(readRecordingFile(file).value(), sample());
 }
 
+TEST_F(RecordingFileOnDisk, WithRangesOutOfOrderIsNone) {
+    for (const char* ranges : {"[[5, 3]]", "[[3, 5], [0, 1]]", "[[0, 5], [5, 6]]", "[[0]]"}) {
+        RecordingFile recording = sample();
+        recording.written = {};
+        std::string text = recordingFileText(recording);
+        const std::string empty = "\"written\": []";
+        text.replace(text.find(empty), empty.size(), std::string("\"written\": ") + ranges);
+        EXPECT_FALSE(parseRecordingFile(text, file).ok()) << ranges;
+    }
+}
+
 TEST(RecordedElsewhere, OnlyWhileTheLeaseOfAnotherLivingProcessLasts) {
     constexpr std::int64_t now_s = 1000;
     RecordingFile recording = sample();

@@ -273,7 +273,7 @@ TEST_F(Recording, GoesOnWhereItsFolderWasRemoved) {
 }
 
 TEST_F(Recording, TakesTheFolderHoweverItsPathIsWritten) {
-    for (const std::string& end : {"", "/", "/."}) {
+    for (const std::string end : {"", "/", "/."}) {
         RunningRecording recording = make(1);
         ASSERT_TRUE(recording.begin(folder.path().string() + end));
         const std::filesystem::path file = folder.path().string() + end + "/Walk000.jpg";

@@ -164,6 +164,22 @@ TEST_F(RecordingSafety, OverwriteReplacesWhatIsInTheWay) {
     EXPECT_TRUE(readPictureHeader(studio / "one/house000.jpg"));
 }
 
+TEST_F(RecordingSafety, WriteProtectedPicturePageAndDocumentAreReplacedOnlyWhereThatIsAskedFor) {
+    const std::vector<std::string> saving = {"--save", "house.quarn"};
+    ASSERT_EQ(run(studio.turntable(2, saving)).exit_code, 0);
+    for (const char* name : {"out/house001.jpg", "out/house.html", "house.quarn"}) {
+        std::filesystem::permissions(studio / name, std::filesystem::perms(0444));
+        const std::string before = readFile(studio / name);
+        const Ended ended = run(
+            studio.turntable(2, {"--elevation", "50", "--mode", "Clay", "--save", "house.quarn"}));
+        EXPECT_EQ(ended.exit_code, 1) << name;
+        EXPECT_THAT(ended.err, HasSubstr("protected"));
+        EXPECT_EQ(readFile(studio / name), before);
+        EXPECT_EQ(run(studio.turntable(2, {"--save", "house.quarn", "--overwrite"})).exit_code, 0);
+        std::filesystem::permissions(studio / name, std::filesystem::perms(0644));
+    }
+}
+
 TEST_F(RecordingSafety, FolderOfAProgramWithoutRecordingFilesIsRecordedIntoAgain) {
     ASSERT_EQ(run(studio.turntable(3)).exit_code, 0);
     std::filesystem::remove(studio / "out/house.recording");

@@ -18,7 +18,7 @@ protected:
         front_end.while_waiting = [&] { held.push_back(quarn::test::heldMemory()); };
         EXPECT_EQ(CQuarnCommand::success, run(L"RecordAnimation _Enter"));
         front_end.while_waiting = nullptr;
-        ASSERT_EQ(frame_count + 1U, files().size()); // with the page
+        ASSERT_EQ(frame_count + 2U, files().size()); // with the page and what tells of it all
         ASSERT_GE(held.size(), std::size_t{frame_count});
         const auto quarter = static_cast<std::ptrdiff_t>(held.size() / 4);
         const std::size_t at_first = *std::max_element(held.begin(), held.begin() + quarter);
