@@ -29,6 +29,13 @@ void moveLightIndex(Document& document, const std::map<int, int>& indices) {
 Result<DocumentContent> contentToSave(Document& document, const DocumentSaveOptions& options) {
     DocumentContent content = document.content(options.only_selected);
     content.version = options.version;
+    if (const auto added = addPlugInContent(document, content, options); !added)
+        return added.error();
+    return content;
+}
+
+Result<void> addPlugInContent(Document& document, DocumentContent& content,
+                              const DocumentSaveOptions& options) {
     auto plug_ins =
         plugInContents(*Application::current(), document,
                        FileOptionsAccess::forWriting(options.only_selected, options.version,
@@ -38,7 +45,7 @@ Result<DocumentContent> contentToSave(Document& document, const DocumentSaveOpti
     content.plug_ins = std::move(plug_ins.value());
     if (!options.only_selected && options.version == KM_CURRENT_ARCHIVE_VERSION)
         content.unknown = document.fileRemainder().unknown;
-    return content;
+    return {};
 }
 
 Result<void> saveDocument(Document& document, const std::filesystem::path& file,

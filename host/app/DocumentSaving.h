@@ -23,6 +23,11 @@ struct DocumentSaveOptions {
 /// @return an error, part of a sentence, when a plug-in could not write
 Result<DocumentContent> contentToSave(Document& document, const DocumentSaveOptions& options = {});
 
+/// Adds to the content of a document what plug-ins keep in it, and what nobody here understands.
+/// @return as contentToSave, with nothing added
+Result<void> addPlugInContent(Document& document, DocumentContent& content,
+                              const DocumentSaveOptions& options = {});
+
 /// Writes a document file with what the document holds and what plug-ins keep in it. The file
 /// appears whole and on the disk, or not at all; a file that was there before stays whole until
 /// then. The document does not change, nor does it remember the file.

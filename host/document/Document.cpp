@@ -70,6 +70,7 @@ void Document::close() {
     m_edges.clear();
     *m_file_remainder = FileRemainder();
     m_saved_state.reset();
+    m_object_copies.reset();
 }
 
 void Document::closeAllViews() {

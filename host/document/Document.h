@@ -9,6 +9,7 @@
 #include "host/document/ViewState.h"
 #include "sdk/qncore/QnDoc.h"
 
+#include <chrono>
 #include <filesystem>
 #include <map>
 #include <memory>
@@ -25,7 +26,10 @@ enum class MeshEdgeChoice : int;
 struct DocumentContent;
 struct FileRemainder;
 struct ImportedModel;
+struct ObjectContent;
 struct SavedState;
+
+using ObjectCopies = std::vector<std::shared_ptr<const ObjectContent>>;
 
 /// A camera that a model file brought along.
 struct NamedView {
@@ -150,6 +154,14 @@ public:
     /// What a document file has to hold of the document; what plug-ins keep is left out.
     /// @param only_selected  take the selected objects alone, without views, cameras and lights
     DocumentContent content(bool only_selected) const;
+    /// The same of the whole document, without its objects.
+    DocumentContent contentWithoutObjects() const;
+    /// Copies of all objects as content has them, for other threads: what changes later makes new
+    /// ones. A copy of an object that did not change is the one that was made before.
+    /// @param end  when the call has to end
+    /// @return null when not all of them were made until then; the next call goes on
+    std::shared_ptr<const ObjectCopies>
+    objectCopies(std::chrono::steady_clock::time_point end) const;
 
     /// Draws the document.
     DocumentDrawing& drawing() { return *m_drawing; }
@@ -159,6 +171,7 @@ public:
 private:
     void addStandardViews();
     void closeAllViews();
+    DocumentContent settingsContent() const;
     void addObjects(const DocumentContent& content);
     void addCameras(const DocumentContent& content);
     std::vector<std::string> replaceViews(const DocumentContent& content);
@@ -180,6 +193,8 @@ private:
     std::unique_ptr<FileRemainder> m_file_remainder;
     std::unique_ptr<SavedState> m_saved_state; ///< null until markSaved
     unsigned m_save_count = 0;
+    mutable std::shared_ptr<const ObjectCopies> m_object_copies; ///< null: none were made yet
+    mutable std::uint64_t m_copied_changes = 0; ///< of the objects, when they were made
     std::vector<NamedView> m_named_views;
     std::vector<std::unique_ptr<ViewState>> m_views;
     ViewState* m_active_view = nullptr;

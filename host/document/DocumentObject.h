@@ -10,6 +10,8 @@
 
 namespace quarn {
 
+struct ObjectContent;
+
 /// An object of a document: exactly one of mesh, curve and point is there. Owned by its
 /// ObjectTable; others keep its id.
 struct DocumentObject {
@@ -32,6 +34,9 @@ struct DocumentObject {
     KM_BoundingBox boundingBox() const;
 
     CQuarnObject face; ///< what plug-ins see of it
+
+    /// A copy that was made since the object changed last, for other threads; null: there is none.
+    mutable std::shared_ptr<const ObjectContent> copy;
 
 private:
     mutable std::optional<KM_BoundingBox> m_mesh_box; ///< found when it is first asked for

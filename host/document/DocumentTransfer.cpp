@@ -42,16 +42,45 @@ DocumentObject& add(ObjectTable& objects, const ObjectContent& content) {
 } // namespace
 
 DocumentContent Document::content(bool only_selected) const {
+    DocumentContent content = only_selected ? settingsContent() : contentWithoutObjects();
+    for (const auto& object : m_objects.objects())
+        if (object->selected || !only_selected)
+            content.objects.push_back(contentOf(*object));
+    return content;
+}
+
+std::shared_ptr<const ObjectCopies>
+Document::objectCopies(std::chrono::steady_clock::time_point end) const {
+    constexpr int copies_between_looks = 64;
+    if (m_object_copies && m_copied_changes == m_objects.changeCount())
+        return m_object_copies;
+    auto copies = std::make_shared<ObjectCopies>();
+    copies->reserve(m_objects.objects().size());
+    int made = 0;
+    for (const auto& object : m_objects.objects()) {
+        if (!object->copy) {
+            if (++made % copies_between_looks == 0 && std::chrono::steady_clock::now() >= end)
+                return nullptr;
+            object->copy = std::make_shared<const ObjectContent>(contentOf(*object));
+        }
+        copies->push_back(object->copy);
+    }
+    m_copied_changes = m_objects.changeCount();
+    m_object_copies = std::move(copies);
+    return m_object_copies;
+}
+
+DocumentContent Document::settingsContent() const {
     DocumentContent content;
     content.settings.units = m_units;
     content.settings.absolute_tolerance = m_absolute_tolerance;
     content.settings.sun_enabled = m_sun.isEnabled();
     content.settings.direction_to_sun = m_sun.directionToSun();
-    for (const auto& object : m_objects.objects())
-        if (object->selected || !only_selected)
-            content.objects.push_back(contentOf(*object));
-    if (only_selected)
-        return content;
+    return content;
+}
+
+DocumentContent Document::contentWithoutObjects() const {
+    DocumentContent content = settingsContent();
     for (const auto& view : m_views)
         content.views.push_back(contentOf(*view, view.get() == m_active_view));
     for (const NamedView& camera : m_named_views)

@@ -83,6 +83,7 @@ bool ObjectTable::rename(const KM_UUID& id, const KM_wString& name) {
     object->name = name;
     if (!name.IsEmpty())
         m_by_name[lowerCase(name.View())] = object;
+    noteChange(*object, m_small_changes);
     return true;
 }
 
@@ -91,7 +92,7 @@ bool ObjectTable::replaceCurve(const KM_UUID& id, std::unique_ptr<KM_Curve> curv
     if (!object || !object->curve || !curve)
         return false;
     object->curve = std::move(curve);
-    ++m_revision;
+    noteChange(*object, m_revision);
     return true;
 }
 
@@ -100,8 +101,13 @@ bool ObjectTable::movePoint(const KM_UUID& id, const KM_3dPoint& point) {
     if (!object || !object->point)
         return false;
     object->point = point;
-    ++m_revision;
+    noteChange(*object, m_revision);
     return true;
+}
+
+void ObjectTable::noteChange(DocumentObject& object, std::uint64_t& count) {
+    object.copy.reset();
+    ++count;
 }
 
 DocumentObject* ObjectTable::find(const KM_UUID& id) const {
@@ -119,6 +125,7 @@ bool ObjectTable::setVisible(const KM_UUID& id, bool visible) {
     if (!object || object->visible == visible)
         return false;
     object->visible = visible;
+    noteChange(*object, m_small_changes);
     return true;
 }
 

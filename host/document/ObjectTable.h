@@ -69,16 +69,20 @@ public:
     /// Rises whenever an object is added, removed or changed, but not when it is shown, hidden,
     /// selected or renamed.
     std::uint64_t revision() const { return m_revision; }
+    /// Rises whenever anything but the selection changes.
+    std::uint64_t changeCount() const { return m_revision + m_small_changes; }
 
 private:
     DocumentObject& add(const KM_wString& name, const KM_UUID& id);
     KM_wString freeName(const KM_wString& wish);
+    void noteChange(DocumentObject& object, std::uint64_t& count);
 
     std::vector<std::unique_ptr<DocumentObject>> m_objects;
     std::map<KM_UUID, DocumentObject*> m_by_id;
     std::map<KM_wString, DocumentObject*> m_by_name; ///< by the name in lower case
     std::map<KM_wString, int> m_last_number;         ///< by the name in lower case
     std::uint64_t m_revision = 1;
+    std::uint64_t m_small_changes = 0; ///< of names and visibility
 };
 
 } // namespace quarn

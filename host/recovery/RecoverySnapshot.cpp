@@ -21,14 +21,14 @@ Image newPicture(const ViewState& view, ShownView& shown) {
 
 /// What a plug-in cannot write leaves the rest worth keeping.
 DocumentContent contentOf(Document& document, std::optional<std::string>& trouble) {
-    auto content = contentToSave(document);
-    if (content)
-        return std::move(content.value());
-    trouble = "Recovery keeps the document without its plug-ins' part: " + content.message() + ".";
-    DocumentContent rest = document.content(false);
-    rest.plug_ins = document.fileRemainder().plug_ins;
-    rest.unknown = document.fileRemainder().unknown;
-    return rest;
+    DocumentContent content = document.contentWithoutObjects();
+    const auto added = addPlugInContent(document, content);
+    if (added)
+        return content;
+    trouble = "Recovery keeps the document without its plug-ins' part: " + added.message() + ".";
+    content.plug_ins = document.fileRemainder().plug_ins;
+    content.unknown = document.fileRemainder().unknown;
+    return content;
 }
 
 } // namespace
@@ -44,12 +44,14 @@ RecoveryMatter recoveryMatterOf(const Document& document) {
     return matter;
 }
 
-RecoverySnapshot snapshotOf(Document& document, ShownView& shown) {
+RecoverySnapshot snapshotOf(Document& document, std::shared_ptr<const ObjectCopies> objects,
+                            ShownView& shown) {
     RecoverySnapshot snapshot;
     snapshot.state = std::make_unique<RecoveryState>();
     snapshot.state->document = document.file();
     snapshot.state->kept_at = std::chrono::system_clock::now();
     snapshot.state->content = contentOf(document, snapshot.trouble);
+    snapshot.state->objects = std::move(objects);
     snapshot.state->picture = newPicture(document.activeView(), shown);
     return snapshot;
 }

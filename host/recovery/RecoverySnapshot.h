@@ -40,8 +40,10 @@ struct RecoverySnapshot {
 };
 
 /// Copies what changes of a document and shares what does not.
+/// @param objects  the copies of its objects
 /// @param shown  whose picture was copied last; receives whose is copied now, or stays where there
 ///               is no other one
-RecoverySnapshot snapshotOf(Document& document, ShownView& shown);
+RecoverySnapshot snapshotOf(Document& document, std::shared_ptr<const ObjectCopies> objects,
+                            ShownView& shown);
 
 } // namespace quarn

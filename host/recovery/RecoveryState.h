@@ -1,10 +1,12 @@
 #pragma once
 
 #include "engine/images/Image.h"
+#include "host/document/Document.h"
 #include "host/document/file/DocumentContent.h"
 
 #include <chrono>
 #include <filesystem>
+#include <memory>
 
 namespace quarn {
 
@@ -13,7 +15,8 @@ namespace quarn {
 struct RecoveryState {
     std::filesystem::path document; ///< the document's own file; empty: it was never saved
     std::chrono::system_clock::time_point kept_at;
-    DocumentContent content;
+    DocumentContent content;                       ///< without its objects, where these are copies
+    std::shared_ptr<const ObjectCopies> objects{}; ///< null: they stand in the content
     Image picture; ///< what the active view shows, made small; of no size: as it was kept before
 };
 

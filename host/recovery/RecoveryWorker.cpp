@@ -3,6 +3,7 @@
 #include "host/recovery/RecoveryMarks.h"
 
 #include <csignal>
+#include <exception>
 #include <utility>
 
 namespace quarn {
@@ -18,6 +19,15 @@ template <class Work> std::thread deafThread(Work work) {
     std::thread thread(work);
     pthread_sigmask(SIG_SETMASK, &before, nullptr);
     return thread;
+}
+
+/// Gives the content of a state its objects.
+void addObjects(RecoveryState& state) {
+    if (!state.objects)
+        return;
+    state.content.objects.reserve(state.objects->size());
+    for (const auto& object : *state.objects)
+        state.content.objects.push_back(*object);
 }
 
 } // namespace
@@ -119,11 +129,11 @@ void RecoveryWorker::removeAll(Lock& lock) {
 }
 
 void RecoveryWorker::write(Lock& lock) {
-    std::unique_ptr<const RecoveryState> state = std::exchange(m_waiting, nullptr);
+    std::unique_ptr<RecoveryState> state = std::exchange(m_waiting, nullptr);
     const std::filesystem::path replaced_mark = std::exchange(m_replaced_mark, {});
     m_is_writing = true;
     lock.unlock();
-    const auto written = m_journal.write(*state);
+    const auto written = writeNow(*state);
     if (written && !replaced_mark.empty())
         removeRecovery(replaced_mark);
     state.reset();
@@ -131,6 +141,15 @@ void RecoveryWorker::write(Lock& lock) {
     m_is_writing = false;
     if (m_removals_done == m_removals_wanted)
         note(written);
+}
+
+Result<void> RecoveryWorker::writeNow(RecoveryState& state) {
+    try {
+        addObjects(state);
+    } catch (const std::exception&) {
+        return Error{"There is too little memory to keep unsaved work for recovery."};
+    }
+    return m_journal.write(state);
 }
 
 void RecoveryWorker::note(const Result<void>& written) {

@@ -49,6 +49,7 @@ private:
     void work();
     bool doNext(Lock& lock);
     void write(Lock& lock);
+    Result<void> writeNow(RecoveryState& state);
     void removeAll(Lock& lock);
     void note(const Result<void>& written);
 

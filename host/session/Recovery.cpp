@@ -17,6 +17,8 @@ namespace {
 
 using Clock = RecoveryWorker::Clock;
 
+/// Of objects in one look: those of a document of many thousand take several.
+constexpr Clock::duration LONGEST_COPYING = std::chrono::milliseconds(2);
 /// Before some dozens of quick commands it is looked each time.
 constexpr Clock::duration MOST_CREDIT = std::chrono::milliseconds(100);
 
@@ -34,14 +36,15 @@ struct RecoveryKeeper::State {
     static Document& document() { return *application().documents().active(); }
 
     void followDocument();
-    void look(Clock::time_point time_to_write);
+    void look(Clock::time_point time_to_write, Clock::duration longest);
     void lookWhereDue();
     void lookBeforeCommand();
     /// Whether there is something to show now that there was not when the document was kept.
     bool hasFirstPicture() const {
         return shown == ShownView{} && document().activeView().frameBuffer().width > 0;
     }
-    void handOver(RecoveryMatter now, Clock::time_point time_to_write);
+    void handOver(RecoveryMatter now, const std::shared_ptr<const ObjectCopies>& objects,
+                  Clock::time_point time_to_write);
     void dropAll();
     void noteTrouble(const std::optional<std::string>& why);
 
@@ -87,20 +90,27 @@ void RecoveryKeeper::State::dropAll() {
         worker.remove(other_mark);
 }
 
-void RecoveryKeeper::State::look(Clock::time_point time_to_write) {
+/// Objects that were not copied since they changed are copied also where the document is not
+/// modified yet: those of a large document that was opened just now take several looks.
+void RecoveryKeeper::State::look(Clock::time_point time_to_write, Clock::duration longest) {
     try {
+        const auto objects = document().objectCopies(Clock::now() + longest);
         RecoveryMatter now = recoveryMatterOf(document());
         if (!document().isModified(now.saved))
             dropAll();
-        else if (now != known || worker.isInTrouble() || hasFirstPicture())
-            handOver(std::move(now), time_to_write);
+        else if (objects && (now != known || worker.isInTrouble() || hasFirstPicture()))
+            handOver(std::move(now), objects, time_to_write);
+        if (!objects)
+            next_look = {};
     } catch (const std::exception&) {
         noteTrouble("There is too little memory to keep unsaved work for recovery.");
     }
 }
 
-void RecoveryKeeper::State::handOver(RecoveryMatter now, Clock::time_point time_to_write) {
-    RecoverySnapshot snapshot = snapshotOf(document(), shown);
+void RecoveryKeeper::State::handOver(RecoveryMatter now,
+                                     const std::shared_ptr<const ObjectCopies>& objects,
+                                     Clock::time_point time_to_write) {
+    RecoverySnapshot snapshot = snapshotOf(document(), objects, shown);
     noteTrouble(snapshot.trouble);
     worker.keep(std::move(snapshot.state), time_to_write, recovered_from);
     is_kept = true;
@@ -113,7 +123,7 @@ void RecoveryKeeper::State::lookWhereDue() {
     if (now < next_look)
         return;
     next_look = now + every;
-    look(now);
+    look(now, LONGEST_COPYING);
 }
 
 /// A command may run for hours. What it begins with is handed over, to be written when the next
@@ -127,7 +137,7 @@ void RecoveryKeeper::State::lookBeforeCommand() {
     credit_time = begin;
     if (credit <= Clock::duration::zero())
         return;
-    look(next_look);
+    look(next_look, LONGEST_COPYING);
     credit -= Clock::now() - begin;
 }
 
@@ -161,7 +171,7 @@ std::optional<std::string> RecoveryKeeper::keepNow() {
         return "Unsaved work is kept when the command that runs has ended.";
     m_state->followDocument();
     m_state->outlives = true;
-    m_state->look(Clock::now());
+    m_state->look(Clock::now(), std::chrono::hours(1));
     const auto kept = m_state->worker.finish();
     return kept ? takeTrouble() : std::optional(kept.message());
 }

@@ -163,6 +163,10 @@ line; the command asks for those that are missing, and again for one that does n
              one, while a command is at work, ends the program at once)
   Ctrl-D     ends the program where a command is asked for, as Exit does; nothing is saved then
 
+What is not saved is kept for recovery as work goes on (--recovery-every). When the program ends
+otherwise than by Exit or Ctrl-D, its next start says so, and the command Recover opens or discards
+what was kept.
+
 An empty line where a command is asked for does nothing; Up and Enter repeat the last command. What
 is piped in is read as if it were typed; there lines that start with # are skipped.
 

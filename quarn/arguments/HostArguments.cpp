@@ -18,6 +18,19 @@ struct FileWish {
     CommonOptions common;
 };
 
+/// How a person wants unsaved work to be kept.
+struct KeepingWish {
+    double every_s = 0.0;
+    bool is_unwanted = false;
+
+    std::optional<RecoveryOptions> options() const {
+        if (is_unwanted)
+            return std::nullopt;
+        const auto every_ms = static_cast<std::chrono::milliseconds::rep>(1000.0 * every_s);
+        return RecoveryOptions{.every = std::chrono::milliseconds(every_ms)};
+    }
+};
+
 CLI::Option* addModel(CLI::App& command, FileWish& wish, const std::string& description) {
     return OptionAdder(command)("MODEL", wish.model, "", scriptWord("the model's path"),
                                 description);
@@ -81,8 +94,14 @@ Action addRun(CLI::App& command) {
 Action addConsole(CLI::App& command) {
     const auto wish = std::make_shared<FileWish>();
     addModel(command, *wish, "A model file or document to read first");
+    const auto keeping = std::make_shared<KeepingWish>();
+    const OptionAdder add(command);
+    add("--recovery-every", keeping->every_s, "SECONDS", numberFrom(0.1, 3600, "seconds"),
+        "How often unsaved work is kept for recovery", "10");
+    command.add_flag("--no-recovery", keeping->is_unwanted,
+                     "Keep no unsaved work for recovery, and offer none");
     addCommonOptions(command, wish->common);
-    return [=] { return runConsole(wish->model, wish->common); };
+    return [=] { return runConsole(wish->model, wish->common, keeping->options()); };
 }
 
 } // namespace quarn::program

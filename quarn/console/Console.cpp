@@ -4,8 +4,10 @@
 #include "quarn/console/LineEditor.h"
 #include "quarn/console/PlainLines.h"
 #include "quarn/console/TerminalFrontEnd.h"
+#include "quarn/console/UnsavedWork.h"
 #include "quarn/session/Interruption.h"
 
+#include <csignal>
 #include <unistd.h>
 
 namespace quarn::program {
@@ -19,8 +21,12 @@ constexpr const wchar_t* WELCOME =
 /// Reads commands and runs them.
 class Console {
 public:
-    Console(HostSession& host, TerminalFrontEnd& front_end, LineSource& lines)
-        : m_session(host.session()), m_front_end(front_end), m_history(historyOf(lines)) {
+    Console(HostSession& host, TerminalFrontEnd& front_end, LineSource& lines,
+            const std::optional<RecoveryOptions>& recovery)
+        : m_session(host.session()), m_front_end(front_end), m_history(historyOf(lines)),
+          m_work(m_session, front_end, lines, recovery) {
+        if (lines.isTerminal())
+            m_work.offer();
         for (const std::wstring& line : m_history.load())
             lines.remember(line, LineUse::command);
     }
@@ -30,10 +36,13 @@ public:
             const LineRead read = readCommand();
             if (read.kind == LineRead::Kind::end)
                 break;
+            if (read.kind == LineRead::Kind::lost)
+                return {128 + SIGHUP, m_work.keepForNextStart()};
             if (read.kind == LineRead::Kind::line)
                 runLine(read.text);
             if (isInterruptionRequested() && !forgetCtrlC())
-                return stopped("");
+                return stopped(m_work.keepForNextStart());
+            m_work.look();
         }
         m_front_end.endLine();
         return Outcome::success("");
@@ -69,6 +78,7 @@ private:
     Session& m_session;
     TerminalFrontEnd& m_front_end;
     HistoryFile m_history;
+    UnsavedWork m_work;
 };
 
 /// A person's terminal is edited on only where both ends of it are there.
@@ -80,7 +90,8 @@ std::unique_ptr<LineSource> openLines() {
 
 } // namespace
 
-Outcome runConsole(const std::filesystem::path& model, const CommonOptions& common) {
+Outcome runConsole(const std::filesystem::path& model, const CommonOptions& common,
+                   const std::optional<RecoveryOptions>& recovery) {
     watchForInterruption();
     const std::unique_ptr<LineSource> lines = openLines();
     // What opening tells is told once, by the outcome, when it fails.
@@ -94,7 +105,7 @@ Outcome runConsole(const std::filesystem::path& model, const CommonOptions& comm
     front_end.showWords();
     if (lines->isTerminal())
         front_end.print(WELCOME);
-    return Console(host, front_end, *lines).run();
+    return Console(host, front_end, *lines, recovery).run();
 }
 
 } // namespace quarn::program

@@ -1,7 +1,6 @@
 #include "quarn/console/LineEditor.h"
 
 #include "quarn/console/PromptText.h"
-#include "quarn/session/Interruption.h"
 #include "quarn/terminal/Columns.h"
 #include "quarn/terminal/ShownText.h"
 #include "quarn/terminal/Utf8Scope.h"
@@ -111,6 +110,8 @@ LineRead LineEditor::read(const std::wstring& prompt, LineUse use, const Complet
         return {LineRead::Kind::line, std::wstring(withoutLineBreak(line))};
     std::fputs(m_is_interrupted ? "^C\n" : "\n", stdout);
     std::fflush(stdout);
+    if (m_is_terminal_lost)
+        return {LineRead::Kind::lost, {}};
     return {m_is_interrupted ? LineRead::Kind::interrupted : LineRead::Kind::end, {}};
 }
 
@@ -137,10 +138,11 @@ wchar_t* LineEditor::promptOf(EditLine* editor) {
 
 bool LineEditor::readByte(unsigned char& byte) {
     for (;;) {
-        const InputByte input = readInputByte(STDIN_FILENO);
+        const InputByte input = waitForByte(STDIN_FILENO);
         if (g_is_screen_stale != 0)
             refreshScreen(m_editor.get());
         m_is_interrupted = input.kind == InputByte::Kind::interrupted;
+        m_is_terminal_lost = input.kind == InputByte::Kind::end; // Ctrl-D is a byte
         byte = input.byte;
         if (input.kind != InputByte::Kind::woken)
             return input.kind == InputByte::Kind::byte;

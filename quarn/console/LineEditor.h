@@ -45,6 +45,7 @@ private:
     std::wstring m_prompt;
     const Completer* m_completer = nullptr;
     bool m_is_interrupted = false;
+    bool m_is_terminal_lost = false;
     std::unique_ptr<EditLine, EditorEnd> m_editor; // goes first: it looks into the rest
 };
 

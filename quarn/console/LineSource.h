@@ -1,7 +1,9 @@
 #pragma once
 
 #include "host/session/Completion.h"
+#include "quarn/session/Interruption.h"
 
+#include <chrono>
 #include <functional>
 #include <string>
 #include <string_view>
@@ -13,6 +15,7 @@ struct LineRead {
     enum class Kind {
         line,
         end,         ///< no further line comes
+        lost,        ///< the terminal is gone
         interrupted, ///< Ctrl-C, or a request to terminate
     };
     Kind kind = Kind::end;
@@ -39,6 +42,18 @@ public:
 
     /// Whether a person is at the other end, who sees what they type.
     virtual bool isTerminal() const = 0;
+
+    /// From now on this is done whenever nothing was typed for so long while a line is waited for;
+    /// it must print nothing. Empty work ends that.
+    void setIdleWork(std::function<void()> work, std::chrono::milliseconds between);
+
+protected:
+    /// As readInputByte, with the idle work meanwhile.
+    InputByte waitForByte(int descriptor) const;
+
+private:
+    std::function<void()> m_idle_work;
+    std::chrono::milliseconds m_between{};
 };
 
 } // namespace quarn::program

@@ -1,6 +1,5 @@
 #include "quarn/console/PlainLines.h"
 
-#include "quarn/session/Interruption.h"
 #include "quarn/terminal/ShownText.h"
 #include "quarn/words/Words.h"
 
@@ -34,7 +33,7 @@ LineRead PlainLines::read(const std::wstring& prompt, LineUse, const Completer&)
     show(utf8Text(prompt));
     std::string bytes;
     for (;;) {
-        const InputByte input = readInputByte(m_descriptor);
+        const InputByte input = waitForByte(m_descriptor);
         if (input.kind == InputByte::Kind::interrupted)
             return noLine(LineRead::Kind::interrupted);
         if (input.kind == InputByte::Kind::end && bytes.empty())

@@ -28,13 +28,15 @@ int interruptionExitCode() {
     return 128 + stopSignal();
 }
 
-InputByte readInputByte(int descriptor) {
+InputByte readInputByte(int descriptor, std::chrono::milliseconds longest) {
     pollfd waiting[] = {{descriptor, POLLIN, 0}, {stopSignalDescriptor(), POLLIN, 0}};
-    const int ready = poll(waiting, 2, -1);
+    const int ready = poll(waiting, 2, static_cast<int>(longest.count()));
     if (isInterruptionRequested())
         return {InputByte::Kind::interrupted};
     if (ready < 0)
         return {errno == EINTR ? InputByte::Kind::woken : InputByte::Kind::end};
+    if (ready == 0)
+        return {InputByte::Kind::late};
     InputByte input{InputByte::Kind::byte};
     return read(descriptor, &input.byte, 1) == 1 ? input : InputByte{};
 }

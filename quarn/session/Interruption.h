@@ -1,5 +1,7 @@
 #pragma once
 
+#include <chrono>
+
 namespace quarn::program {
 
 /// From now on Ctrl-C, a request to terminate and the end of the terminal are noted instead of
@@ -26,13 +28,18 @@ struct InputByte {
         end,         ///< nothing more will come
         interrupted, ///< the program was asked to stop
         woken,       ///< another signal came while nothing was typed
+        late,        ///< nothing was typed in time
     };
     Kind kind = Kind::end;
     unsigned char byte = 0;
 };
 
+/// Waiting without an end.
+inline constexpr std::chrono::milliseconds NO_END{-1};
+
 /// Waits for a byte of a file descriptor, or for a request to stop, whichever comes first. Needs
 /// watchForInterruption.
-InputByte readInputByte(int descriptor);
+/// @param longest  of the wait, or NO_END
+InputByte readInputByte(int descriptor, std::chrono::milliseconds longest = NO_END);
 
 } // namespace quarn::program

@@ -42,7 +42,8 @@ Terminal::~Terminal() {
         kill(m_child, SIGKILL);
         waitpid(m_child, nullptr, 0);
     }
-    close(m_terminal);
+    if (m_terminal >= 0)
+        close(m_terminal);
 }
 
 void Terminal::type(std::string_view keys) const {
@@ -56,6 +57,11 @@ void Terminal::type(std::string_view keys) const {
 
 void Terminal::sendSignal(int signal) const {
     kill(m_child, signal);
+}
+
+void Terminal::hangUp() {
+    close(m_terminal);
+    m_terminal = -1;
 }
 
 bool Terminal::shows(std::string_view text) {
@@ -99,7 +105,7 @@ void Terminal::addToScreen(std::string_view bytes) {
 }
 
 Ended Terminal::end() {
-    while (readMore())
+    while (m_terminal >= 0 && readMore())
         ;
     Ended ended;
     int status = 0;

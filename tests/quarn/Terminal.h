@@ -24,6 +24,8 @@ public:
     /// Presses keys.
     void type(std::string_view keys) const;
     void sendSignal(int signal) const;
+    /// Closes the terminal under the program; nothing is typed and seen any more.
+    void hangUp();
     /// Waits, at most half a minute, until the terminal shows the text behind the one waited for
     /// last.
     /// @return false when the program ended, or the time passed, before it did

@@ -22,8 +22,7 @@ TEST_F(HelpTest, ListsEveryCommandWithOneLine) {
     EXPECT_THAT(printed(), HasSubstr("LoadPlugIn"));
     EXPECT_THAT(printed(), HasSubstr("Loads a plug-in file\n"));
     const auto lines = std::ranges::count(front_end.printed(), L'\n');
-    EXPECT_EQ(static_cast<std::size_t>(lines),
-              Application::current()->commands().sortedByName().size());
+    EXPECT_EQ(static_cast<std::size_t>(lines), session.commandNames().size());
     EXPECT_TRUE(front_end.questions().empty());
 }
 

@@ -138,6 +138,17 @@ TEST_F(RecoveryTest, TheListTellsNameTimeAndPicture) {
         << "the width in a PNG file's head";
 }
 
+TEST_F(RecoveryTest, APictureThatIsDrawnAfterTheDocumentWasKeptIsKeptToo) {
+    runAll({L"Point 1,2,3"});
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    Image picture;
+    picture.resize(document().activeView().frameWidth(), document().activeView().frameHeight());
+    ASSERT_TRUE(document().activeView().copyToFrameBuffer(picture));
+    crash();
+    ASSERT_THAT(found(), SizeIs(1));
+    EXPECT_GT(found()[0].picture.size(), 24U);
+}
+
 TEST_F(RecoveryTest, NothingIsKeptWhereNothingIsUnsaved) {
     ASSERT_TRUE(writeDocumentFile(sampleContent(), documents / "house.quarn"));
     runAll({L"Open " + path("house.quarn"), L"Camera _Location 1,2,3 _Enter"});
@@ -222,6 +233,52 @@ TEST_F(RecoveryTest, ALongerBeatWaits) {
     EXPECT_EQ(keptFiles(), 0);
     EXPECT_EQ(keeper->keepNow(), std::nullopt);
     EXPECT_EQ(keptFiles(), 2);
+}
+
+TEST_F(RecoveryTest, ManyObjectsAreCopiedOverSeveralLooksAndComeBackAll) {
+    for (std::uint32_t i = 0; i < 30'000; ++i)
+        document().objects().addPoint(KM_wString::FormatToString(L"P%u", i), KM_3dPoint(i, 0, 0),
+                                      sampleId(i + 1));
+    restart(1ms);
+    int beats = 0;
+    while (keptFiles() < 2 && beats < 1000) {
+        std::this_thread::sleep_for(2ms);
+        keeper->beat();
+        ++beats;
+    }
+    EXPECT_GT(beats, 1);
+    const Bytes before = work();
+    crash();
+    EXPECT_EQ(recover(session, found().at(0)), std::nullopt);
+    EXPECT_EQ(work(), before);
+}
+
+TEST_F(RecoveryTest, EveryChangeOfAnObjectIsKept) {
+    ObjectTable& objects = document().objects();
+    const KM_UUID point = objects.addPoint(L"P", {1, 2, 3}).id;
+    const KM_UUID curve = objects
+                              .addCurve(L"C", std::make_unique<KM_PolylineCurve>(
+                                                  std::vector<KM_3dPoint>{{0, 0, 0}, {1, 0, 0}}))
+                              .id;
+    const auto kept = [&] {
+        EXPECT_EQ(keeper->keepNow(), std::nullopt);
+        const auto files = recoveryFilesIn(recoveryFolder(state_folder));
+        auto read = decodeRecovery(bytesOf(files.at(0)));
+        EXPECT_TRUE(read) << read.message();
+        return documentBytes(read.value().content);
+    };
+    EXPECT_EQ(kept(), work());
+    objects.movePoint(point, {4, 5, 6});
+    EXPECT_EQ(kept(), work());
+    objects.rename(point, L"Q");
+    EXPECT_EQ(kept(), work());
+    objects.setVisible(curve, false);
+    EXPECT_EQ(kept(), work());
+    objects.replaceCurve(
+        curve, std::make_unique<KM_PolylineCurve>(std::vector<KM_3dPoint>{{0, 0, 0}, {0, 7, 0}}));
+    EXPECT_EQ(kept(), work());
+    objects.remove(point);
+    EXPECT_EQ(kept(), work());
 }
 
 // ---- When it goes
