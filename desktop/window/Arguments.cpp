@@ -8,7 +8,8 @@ namespace quarn::desktop {
 
 namespace {
 
-constexpr double LONGEST_BEAT_S = 86400.0;
+constexpr double SHORTEST_BEAT_S = 0.1;
+constexpr double LONGEST_BEAT_S = 3600.0;
 
 bool isSet(const char* variable) {
     return !qEnvironmentVariableIsEmpty(variable);
@@ -18,8 +19,8 @@ bool isSet(const char* variable) {
 void readBeat(const QString& seconds, Arguments& read) {
     bool is_number = false;
     const double every_s = seconds.toDouble(&is_number);
-    if (!is_number || !(every_s >= 0.001) || every_s > LONGEST_BEAT_S)
-        read.mistake = "--recovery-every takes seconds from 0.001 to 86400, such as 10 or 0.5.";
+    if (!is_number || !(every_s >= SHORTEST_BEAT_S) || every_s > LONGEST_BEAT_S)
+        read.mistake = "--recovery-every takes seconds from 0.1 to 3600, such as 10 or 0.5.";
     else
         read.recovery_every = std::chrono::milliseconds(std::llround(every_s * 1000.0));
 }

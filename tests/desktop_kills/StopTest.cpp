@@ -8,7 +8,7 @@ namespace quarn::test {
 namespace {
 
 /// A beat that never comes while a test runs: what is kept then is kept at the end.
-const std::vector<std::string> NO_BEAT = {"--recovery-every", "86400"};
+const std::vector<std::string> NO_BEAT = {"--recovery-every", "3600"};
 
 class StoppedWindow : public testing::TestWithParam<int> {};
 

@@ -138,6 +138,17 @@ TEST_F(RecoveryTest, TheListTellsNameTimeAndPicture) {
         << "the width in a PNG file's head";
 }
 
+TEST_F(RecoveryTest, APictureThatIsDrawnAfterTheDocumentWasKeptIsKeptToo) {
+    runAll({L"Point 1,2,3"});
+    EXPECT_EQ(keeper->keepNow(), std::nullopt);
+    Image picture;
+    picture.resize(document().activeView().frameWidth(), document().activeView().frameHeight());
+    ASSERT_TRUE(document().activeView().copyToFrameBuffer(picture));
+    crash();
+    ASSERT_THAT(found(), SizeIs(1));
+    EXPECT_GT(found()[0].picture.size(), 24U);
+}
+
 TEST_F(RecoveryTest, NothingIsKeptWhereNothingIsUnsaved) {
     ASSERT_TRUE(writeDocumentFile(sampleContent(), documents / "house.quarn"));
     runAll({L"Open " + path("house.quarn"), L"Camera _Location 1,2,3 _Enter"});
