@@ -1,3 +1,4 @@
+#include "tests/host/app/TestCommand.h"
 #include "tests/host/dialogs/DialogFixture.h"
 
 #include <limits>
@@ -73,6 +74,21 @@ TEST_F(DialogExchange, TextThatNoIntHoldsIsRefusedWhereAWholeNumberIsWanted) {
                                 L"-2147483649", L"99999999999999999999", L"1 2"})
         EXPECT_EQ(L"Enter a whole number", refusal(integer_id, text)) << KM_wString(text).ToUtf8();
     EXPECT_EQ(24, sample.count);
+}
+
+TEST_F(DialogExchange, FramesBeyondMemoryAreRefusedWhereATurntableAsksForThem) {
+    std::wstring told;
+    TestCommand turn(L"Turn", [&](const CQuarnCommandContext&) {
+        told = refusal(integer_id, L"2147483647");
+        return CQuarnCommand::success;
+    });
+    ASSERT_TRUE(Application::current()->commands().add(turn));
+    session.runCommand(L"Turn");
+    EXPECT_EQ(L"", told) << "this command asks for another number";
+    // SetTurntableAnimation: 24E39B43-B4C1-44AC-8479-4CB1AB388ED5
+    turn.m_id = {0x24E39B43, 0xB4C1, 0x44AC, {0x84, 0x79, 0x4C, 0xB1, 0xAB, 0x38, 0x8E, 0xD5}};
+    session.runCommand(L"Turn");
+    EXPECT_THAT(told, testing::HasSubstr(L"2147483647 frames would take about 1600.0 GB"));
 }
 
 TEST_F(DialogExchange, NumbersAreShownAsTheyReadBack) {

@@ -352,6 +352,9 @@ TEST_F(RecordCommand, PictureOfAnotherOriginIsLeftAloneAndNothingIsRecordedBesid
         EXPECT_EQ("a texture", readFile(frames / "Walk001.jpg"));
         EXPECT_THAT(printed(), HasSubstr(L"/Walk001.jpg is not replaced: no recording named Walk "
                                          L"wrote it."));
+        EXPECT_THAT(printed(), Not(HasSubstr(L"_RenderPreview")))
+            << "refused before it is rendered";
+        ASSERT_FALSE(front_end.recordings().empty());
         EXPECT_EQ(0, front_end.recordings().back().written);
     }
 }
