@@ -12,6 +12,7 @@ int main(int argument_count, char** arguments) {
     const QTemporaryDir settings;
     QSettings::setDefaultFormat(QSettings::IniFormat);
     QSettings::setPath(QSettings::IniFormat, QSettings::UserScope, settings.path());
+    qputenv("XDG_STATE_HOME", settings.path().toUtf8()); // of the programs that tests start, too
     QApplication application(argument_count, arguments);
     QApplication::setOrganizationName("Quarn");
     QApplication::setApplicationName("quarn-desktop");

@@ -53,7 +53,7 @@ struct Life {
 };
 
 std::vector<Life> begin(int count, std::mt19937& random) {
-    std::uniform_int_distribution<int> life_ms(100, 3000);
+    std::uniform_int_distribution<int> life_ms(100, 2500);
     std::vector<Life> lives(static_cast<std::size_t>(count));
     for (Life& life : lives) {
         life.work->begin(OPTIONS);

@@ -15,7 +15,7 @@ protected:
     /// @return whether the loop returned by itself
     bool endDuring(std::function<void()> work) {
         later(std::move(work));
-        QTimer::singleShot(200, &window, [this] { window.programEnd().end(UnsavedWork::kept); });
+        QTimer::singleShot(120, &window, [this] { window.programEnd().end(UnsavedWork::kept); });
         QTimer late;
         late.callOnTimeout([] { QCoreApplication::exit(1); });
         late.start(20000);
@@ -37,7 +37,7 @@ TEST_P(EndDuring, WhateverIsGoingOnIsGivenUpAndChangesNothing) {
     run("_-SaveAs \"" + qtText(folder / "slab.quarn") + '"');
     QSignalSpy ended(&window.starter(), &CommandStarter::ended);
     bool was_running = false;
-    QTimer::singleShot(150, &window, [&] { was_running = window.starter().isRunning(); });
+    QTimer::singleShot(80, &window, [&] { was_running = window.starter().isRunning(); });
     EXPECT_TRUE(endDuring([this] { run(GetParam().line); }));
     EXPECT_TRUE(was_running);
     EXPECT_EQ(ended.size(), 1);
