@@ -101,11 +101,9 @@ bool KM_Viewport::SetProjection(KM_ViewProjection projection) {
     return true;
 }
 
+// An opening that would have no size, or one without end, stays as it is.
 void KM_Viewport::ScaleOpening(double factor) {
-    m_left *= factor;
-    m_right *= factor;
-    m_bottom *= factor;
-    m_top *= factor;
+    SetFrustum(factor * m_left, factor * m_right, factor * m_bottom, factor * m_top, m_near, m_far);
 }
 
 bool KM_Viewport::GetFrustum(double* left, double* right, double* bottom, double* top,

@@ -35,7 +35,8 @@ public:
     KM_ViewProjection Projection() const { return m_projection; }
     /// Changes the projection and keeps the size in which things at the target's distance are seen
     /// (at the near plane when there is no target in front of the camera). A near plane that is not
-    /// in front of the camera is moved there when the projection becomes perspective.
+    /// in front of the camera is moved there when the projection becomes perspective. The opening
+    /// stays as it is where that size is no number, as for a target 1e308 away.
     /// @return false, with nothing changed, for a value that is no projection
     bool SetProjection(KM_ViewProjection projection);
 

@@ -76,7 +76,6 @@ void DisplayScene::clear() {
     m_curves.clear();
     m_points.clear();
     m_out_of_range.clear();
-    m_rays.build({});
     updateBoxes();
 }
 

@@ -120,7 +120,25 @@ void RayScene::startLibrary() {
 }
 
 std::string RayScene::takeError() {
-    return std::exchange(*m_error, {});
+    std::string error = std::exchange(*m_error, {});
+    if (!error.empty())
+        abandonLibrary();
+    return error;
+}
+
+/// Where the library's memory ran out one of its locks may stay closed, and its device would wait
+/// for it without end when it is released.
+void RayScene::abandonLibrary() {
+    m_root = nullptr;
+    m_instances.clear();
+    m_top = RaySceneHandle();
+    m_device.abandon();
+    m_members.clear();
+    m_surfaces.clear();
+    m_surface_members.clear();
+    m_surface_places.clear();
+    m_first_surfaces.clear();
+    m_places.clear();
 }
 
 bool RayScene::standsAlone(const Member& member) const {

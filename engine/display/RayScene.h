@@ -33,8 +33,7 @@ public:
     RayScene();
 
     /// Replaces everything. Scenes of large meshes that were there before are taken over. The first
-    /// call starts the library, which lasts as long as the scene; where it cannot start, every
-    /// further call tries again.
+    /// call starts the library; where it cannot start, the next one tries again.
     void build(std::vector<Member> members);
     /// Shows or hides one member, by its index in `build`. Takes effect with the next `commit`.
     void setVisible(std::size_t member, bool visible);
@@ -61,7 +60,8 @@ public:
     std::size_t geometryCount() const;
 
     /// What the library could not do since the last call, in a sentence for the person; empty when
-    /// it could do all.
+    /// it could do all. After an error the scene is empty, and the next `build` starts the library
+    /// anew.
     std::string takeError();
 
 private:
@@ -96,6 +96,7 @@ private:
     using SoleGroups = std::map<GroupKey, std::shared_ptr<Group>>;
 
     void startLibrary();
+    void abandonLibrary();
     bool standsAlone(const Member& member) const;
     GroupKey keyOf(const Member& member) const;
     void addSole(std::size_t member, SoleGroups& groups);

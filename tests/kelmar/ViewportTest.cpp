@@ -175,6 +175,19 @@ TEST(Viewport, UnsoundFrustumsAreRefused) {
     EXPECT_TRUE(viewport.SetFrustum(-1, 1, -1, 1, -5, 10)) << "a parallel view may begin behind";
 }
 
+TEST(Viewport, ChangingTheProjectionKeepsTheOpeningWhereTheTargetIsTooFarToMeasure) {
+    KM_Viewport viewport;
+    viewport.SetCameraLocation({-1e308, 0.0, 0.0});
+    viewport.SetCameraDirection({1.0, 0.0, 0.0});
+    viewport.SetTargetPoint({1e307, 0.0, 0.0});
+    ASSERT_TRUE(viewport.SetFrustumNearFar(1e-3, 10.0));
+    const double aspect = viewport.FrustumAspect();
+    EXPECT_TRUE(viewport.SetProjection(KM_parallel_view));
+    EXPECT_TRUE(viewport.IsParallelProjection());
+    EXPECT_DOUBLE_EQ(viewport.FrustumAspect(), aspect);
+    EXPECT_TRUE(viewport.SetScreenPort(640, 480));
+}
+
 TEST(Viewport, MovingThePlanesKeepsThePerspectiveOpening) {
     KM_Viewport viewport;
     ASSERT_TRUE(viewport.SetFrustum(-1, 2, -1, 1, 1, 100));

@@ -50,6 +50,16 @@ TEST(LittleMemory, ASizeThatDoesNotFitIsRefusedBeforeAnythingIsDrawn) {
     EXPECT_FALSE(std::filesystem::exists(studio / "out"));
 }
 
+TEST(LittleMemory, RayTracingThatDoesNotFitIsToldAsThatAndEnds) {
+    const Studio studio;
+    const Ended ended =
+        runWithin(180, studio.path(),
+                  "_-Import house.obj\n_-RenderSettings _Size 48 32 _PreviewSamples 1 _Enter\n"
+                  "_-RenderPreview\n");
+    EXPECT_EQ(ended.exit_code, 1);
+    EXPECT_THAT(ended.out, HasSubstr("The scene cannot be drawn: there is too little memory."));
+}
+
 } // namespace
 } // namespace quarn::test
 

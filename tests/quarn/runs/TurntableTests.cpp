@@ -14,6 +14,7 @@ using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::MatchesRegex;
 using testing::Not;
+using testing::StartsWith;
 
 class FormatOfPictures : public testing::TestWithParam<const char*> {};
 
@@ -49,6 +50,50 @@ TEST(Turntable, IsRecordedAtTheSizeOfAScreenByDefault) {
     ASSERT_TRUE(header.has_value());
     EXPECT_EQ(header->width_px, 1280);
     EXPECT_EQ(header->height_px, 720);
+}
+
+TEST(Turntable, OfATargetOutOfRangeShowsTheBackgroundAndIsToldOnce) {
+    const Studio studio;
+    for (const char* mode : {"Rendered", "Wireframe", "RenderPreview"}) {
+        const Ended ended = run(studio.turntable(
+            3, {"--target", "1e18,0,0", "--mode", mode, "--size", "48x32", "--samples", "1"}));
+        EXPECT_EQ(ended.exit_code, 0) << mode << ended.err;
+        EXPECT_THAT(ended.out, HasSubstr("3 frames and out/house.html"));
+        EXPECT_THAT(ended.err, StartsWith("quarn: The camera is out of range: the picture shows"));
+        EXPECT_EQ(std::ranges::count(ended.err, '\n'), 1) << ended.err;
+        EXPECT_EQ(filesIn(studio / "out").size(), 4U);
+    }
+}
+
+TEST(Turntable, OfAModelWithAnObjectOutOfRangeShowsTheOthersAndTellsIt) {
+    const TempFolder folder;
+    Start start;
+    start.folder = folder.path();
+    for (const char* file : {"far_instance.gltf", "extreme_scales.gltf"}) {
+        start.arguments = {"turntable", QUARN_SOURCE_DIR "/tests/data/hostile/" + std::string(file),
+                           "--frames",  "2",
+                           "--size",    "48x32",
+                           "--out",     "out"};
+        const Ended ended = run(start);
+        EXPECT_EQ(ended.exit_code, 0) << ended.err;
+        EXPECT_THAT(ended.err, StartsWith("quarn: Not drawn, because it lies beyond 1e12 units or "
+                                          "has an extreme scale: "));
+    }
+}
+
+TEST(Turntable, OfNothingButWhatIsOutOfRangeIsRefused) {
+    const TempFolder folder;
+    Start start;
+    start.folder = folder.path();
+    for (const char* file : {"far_camera.quarn", "huge_coordinates.obj"}) {
+        start.arguments = {"turntable", QUARN_SOURCE_DIR "/tests/data/hostile/" + std::string(file),
+                           "--frames",  "2",
+                           "--size",    "48x32",
+                           "--out",     "out"};
+        const Ended ended = run(start);
+        EXPECT_EQ(ended.exit_code, 1);
+        EXPECT_THAT(ended.err, HasSubstr("All that is visible lies too far from the origin"));
+    }
 }
 
 TEST(Turntable, OfOneFrameIsOnePicture) {
