@@ -43,6 +43,7 @@ DocumentObject& add(ObjectTable& objects, const ObjectContent& content) {
 
 DocumentContent Document::content(bool only_selected) const {
     DocumentContent content = only_selected ? settingsContent() : contentWithoutObjects();
+    content.objects.reserve(only_selected ? 0 : m_objects.objects().size());
     for (const auto& object : m_objects.objects())
         if (object->selected || !only_selected)
             content.objects.push_back(contentOf(*object));

@@ -49,6 +49,19 @@ fs::path freeName(const fs::path& folder, const fs::path& document, const Proces
     return file;
 }
 
+/// Calls `visit` with each mesh, material and texture of each object.
+template <class Visit> void forEachShared(const DocumentContent& content, Visit visit) {
+    for (const ObjectContent& object : content.objects) {
+        const auto& material = object.placed.material;
+        if (object.placed.mesh)
+            visit(object.placed.mesh);
+        if (material)
+            visit(material);
+        if (material && material->base_color_texture)
+            visit(material->base_color_texture);
+    }
+}
+
 } // namespace
 
 RecoveryJournal::RecoveryJournal(fs::path state_folder, ProcessIdentity writer)
@@ -150,7 +163,7 @@ Result<void> RecoveryJournal::rewrite(const RecoveryState& state) {
 
 Result<void> RecoveryJournal::writeWhole(AppendedFile& file, const RecoveryState& state) {
     m_places = {};
-    m_sizes.clear();
+    m_shared.clear();
     takePicture(state.picture);
     if (const auto done = file.append(recoveryBeginning()); !done)
         return done;
@@ -173,7 +186,7 @@ Result<void> RecoveryJournal::append(const RecoveryState& state) {
 
 Result<void> RecoveryJournal::appendParts(AppendedFile& file, const RecoveryState& state,
                                           bool has_picture) {
-    if (const auto done = appendShared(file, m_places.add(state.content)); !done)
+    if (const auto done = appendShared(file, state.content); !done)
         return done;
     if (const auto done = has_picture ? appendTo(file, pictureChunk(m_picture)) : Result<void>();
         !done)
@@ -185,20 +198,37 @@ Result<void> RecoveryJournal::appendParts(AppendedFile& file, const RecoveryStat
     return file.flush();
 }
 
-Result<void> RecoveryJournal::appendShared(AppendedFile& file, const SharedContent& shared) {
-    const auto add = [&](const auto& thing, const Result<std::vector<std::uint8_t>>& chunk) {
-        if (chunk)
-            m_sizes[thing.get()] = chunk.value().size();
-        return appendTo(file, chunk);
-    };
+Result<void> RecoveryJournal::appendShared(AppendedFile& file, const DocumentContent& content) {
+    forgetGone();
+    const SharedThings added = m_places.add(content);
     Result<void> done;
-    for (auto at = shared.textures.begin(); done && at != shared.textures.end(); ++at)
-        done = add(*at, textureChunk(**at));
-    for (auto at = shared.materials.begin(); done && at != shared.materials.end(); ++at)
-        done = add(*at, materialChunk(**at, m_places.of((*at)->base_color_texture)));
-    for (auto at = shared.meshes.begin(); done && at != shared.meshes.end(); ++at)
-        done = add(*at, meshChunk(**at));
+    for (auto at = added.textures.begin(); done && at != added.textures.end(); ++at)
+        done = appendThing(file, *at, textureChunk(**at));
+    for (auto at = added.materials.begin(); done && at != added.materials.end(); ++at) {
+        const std::int32_t texture = m_places.of((*at)->base_color_texture.get());
+        done = appendThing(file, *at, materialChunk(**at, texture));
+    }
+    for (auto at = added.meshes.begin(); done && at != added.meshes.end(); ++at)
+        done = appendThing(file, *at, meshChunk(**at));
+    forEachShared(content, [this](const auto& thing) { m_shared[thing.get()].thing = thing; });
     return done;
+}
+
+Result<void> RecoveryJournal::appendThing(AppendedFile& file, const void* thing,
+                                          const Result<std::vector<std::uint8_t>>& chunk) {
+    if (chunk)
+        m_shared[thing].size = chunk.value().size();
+    return appendTo(file, chunk);
+}
+
+/// Another thing may be made in the memory of one that is gone.
+void RecoveryJournal::forgetGone() {
+    std::erase_if(m_shared, [this](const auto& shared) {
+        const bool is_gone = shared.second.thing.expired();
+        if (is_gone)
+            m_places.forget(shared.first);
+        return is_gone;
+    });
 }
 
 Result<void> RecoveryJournal::appendTo(AppendedFile& file,
@@ -222,17 +252,11 @@ bool RecoveryJournal::takePicture(const Image& picture) {
 std::uint64_t RecoveryJournal::sizeNeeded(const RecoveryState& state) const {
     std::uint64_t size = m_state_size + m_picture.size();
     std::unordered_set<const void*> counted;
-    const auto add = [&](const void* thing) {
-        const auto known = m_sizes.find(thing);
-        if (known != m_sizes.end() && counted.insert(thing).second)
-            size += known->second;
-    };
-    for (const ObjectContent& object : state.content.objects) {
-        add(object.placed.mesh.get());
-        add(object.placed.material.get());
-        if (object.placed.material)
-            add(object.placed.material->base_color_texture.get());
-    }
+    forEachShared(state.content, [&](const auto& thing) {
+        const auto known = m_shared.find(thing.get());
+        if (known != m_shared.end() && counted.insert(thing.get()).second)
+            size += known->second.size;
+    });
     return size;
 }
 

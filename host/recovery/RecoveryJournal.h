@@ -10,6 +10,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <filesystem>
+#include <memory>
 #include <unordered_map>
 #include <vector>
 
@@ -44,8 +45,11 @@ private:
     Result<void> writeWhole(AppendedFile& file, const RecoveryState& state);
     Result<void> append(const RecoveryState& state);
     Result<void> appendParts(AppendedFile& file, const RecoveryState& state, bool has_picture);
-    Result<void> appendShared(AppendedFile& file, const SharedContent& shared);
+    Result<void> appendShared(AppendedFile& file, const DocumentContent& content);
     Result<void> appendTo(AppendedFile& file, const Result<std::vector<std::uint8_t>>& chunk) const;
+    Result<void> appendThing(AppendedFile& file, const void* thing,
+                             const Result<std::vector<std::uint8_t>>& chunk);
+    void forgetGone();
     bool takePicture(const Image& picture);
     std::uint64_t sizeNeeded(const RecoveryState& state) const;
 
@@ -58,9 +62,13 @@ private:
     std::filesystem::path m_document; ///< whose states they are
     AppendedFile m_file;              ///< closed where it cannot be appended to any more
     SharedPlaces m_places;
-    std::unordered_map<const void*, std::uint64_t> m_sizes; ///< bytes of what objects share
-    std::vector<std::byte> m_picture;                       ///< the last one, a PNG file
-    std::uint64_t m_state_size = 0;                         ///< of the last one
+    struct Shared {
+        std::weak_ptr<const void> thing;
+        std::uint64_t size = 0; ///< bytes in the file
+    };
+    std::unordered_map<const void*, Shared> m_shared; ///< what stands in the file
+    std::vector<std::byte> m_picture;                 ///< the last one, a PNG file
+    std::uint64_t m_state_size = 0;                   ///< of the last one
 };
 
 } // namespace quarn

@@ -23,7 +23,7 @@ public:
     /// @param places  of all that objects share
     /// @param shared  what of it is written
     DocumentWriter(const DocumentContent& content, const SharedPlaces& places,
-                   const SharedContent& shared)
+                   const SharedThings& shared)
         : m_content(content), m_places(places), m_shared(shared),
           m_archive(KM_BinaryArchive::ForWriting(content.version)) {}
 
@@ -56,9 +56,9 @@ private:
     void reserve() {
         constexpr std::uint64_t for_a_small_chunk = 256;
         std::uint64_t size = for_a_small_chunk * (16 + m_content.objects.size());
-        for (const auto& mesh : m_shared.meshes)
+        for (const KM_Mesh* mesh : m_shared.meshes)
             size += for_a_small_chunk + meshSize(*mesh);
-        for (const auto& texture : m_shared.textures)
+        for (const Texture* texture : m_shared.textures)
             size += for_a_small_chunk + texture->rgba.size();
         for (const PlugInContent& plug_in : m_content.plug_ins)
             size += for_a_small_chunk + plug_in.bytes.size();
@@ -72,13 +72,13 @@ private:
     }
 
     bool writeShared() {
-        const auto texture = [](KM_BinaryArchive& archive, const auto& thing) {
+        const auto texture = [](KM_BinaryArchive& archive, const Texture* thing) {
             return writeTexture(archive, *thing);
         };
-        const auto material = [&](KM_BinaryArchive& archive, const auto& thing) {
-            return writeMaterial(archive, *thing, m_places.of(thing->base_color_texture));
+        const auto material = [&](KM_BinaryArchive& archive, const Material* thing) {
+            return writeMaterial(archive, *thing, m_places.of(thing->base_color_texture.get()));
         };
-        const auto mesh = [](KM_BinaryArchive& archive, const auto& thing) {
+        const auto mesh = [](KM_BinaryArchive& archive, const KM_Mesh* thing) {
             return writeMesh(archive, *thing);
         };
         return writeEach(chunk::TEXTURE, "a texture", m_shared.textures, texture) &&
@@ -89,8 +89,8 @@ private:
     bool writeObjects() {
         for (const ObjectContent& object : m_content.objects) {
             const auto payload = [&] {
-                return writeObject(m_archive, object, m_places.of(object.placed.mesh),
-                                   m_places.of(object.placed.material));
+                return writeObject(m_archive, object, m_places.of(object.placed.mesh.get()),
+                                   m_places.of(object.placed.material.get()));
             };
             if (!writeChunk(chunk::OBJECT, nameOf(object), payload))
                 return false;
@@ -125,7 +125,7 @@ private:
 
     const DocumentContent& m_content;
     const SharedPlaces& m_places;
-    const SharedContent& m_shared;
+    const SharedThings& m_shared;
     KM_BinaryArchive m_archive;
     std::string m_failed_at;
 };
@@ -135,7 +135,7 @@ private:
 Result<std::vector<std::uint8_t>> encodeDocument(const DocumentContent& content) {
     try {
         SharedPlaces places;
-        const SharedContent shared = places.add(content);
+        const SharedThings shared = places.add(content);
         return DocumentWriter(content, places, shared).write();
     } catch (const std::exception&) {
         return Error{NO_MEMORY};
@@ -145,7 +145,7 @@ Result<std::vector<std::uint8_t>> encodeDocument(const DocumentContent& content)
 Result<std::vector<std::uint8_t>> encodeDocument(const DocumentContent& content,
                                                  const SharedPlaces& places) {
     try {
-        const SharedContent nothing;
+        const SharedThings nothing;
         return DocumentWriter(content, places, nothing).write();
     } catch (const std::exception&) {
         return Error{NO_MEMORY};

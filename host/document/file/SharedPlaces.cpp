@@ -2,15 +2,21 @@
 
 namespace quarn {
 
-SharedContent SharedPlaces::add(const DocumentContent& content) {
-    SharedContent added;
+SharedThings SharedPlaces::add(const DocumentContent& content) {
+    SharedThings added;
     for (const ObjectContent& object : content.objects) {
-        m_meshes.add(object.placed.mesh, added.meshes);
-        m_materials.add(object.placed.material, added.materials);
+        m_meshes.add(object.placed.mesh.get(), added.meshes);
+        m_materials.add(object.placed.material.get(), added.materials);
     }
-    for (const auto& material : added.materials)
-        m_textures.add(material->base_color_texture, added.textures);
+    for (const Material* material : added.materials)
+        m_textures.add(material->base_color_texture.get(), added.textures);
     return added;
+}
+
+void SharedPlaces::forget(const void* gone) {
+    m_textures.forget(gone);
+    m_materials.forget(gone);
+    m_meshes.forget(gone);
 }
 
 } // namespace quarn

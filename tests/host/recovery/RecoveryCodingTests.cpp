@@ -22,12 +22,12 @@ public:
         bytes.insert(bytes.end(), chunk.value().begin(), chunk.value().end());
     }
     void addState(const DocumentContent& content, Time kept_at = Time(5s)) {
-        const SharedContent shared = m_places.add(content);
-        for (const auto& texture : shared.textures)
+        const SharedThings shared = m_places.add(content);
+        for (const Texture* texture : shared.textures)
             add(textureChunk(*texture));
-        for (const auto& material : shared.materials)
-            add(materialChunk(*material, m_places.of(material->base_color_texture)));
-        for (const auto& mesh : shared.meshes)
+        for (const Material* material : shared.materials)
+            add(materialChunk(*material, m_places.of(material->base_color_texture.get())));
+        for (const KM_Mesh* mesh : shared.meshes)
             add(meshChunk(*mesh));
         RecoveryState state;
         state.kept_at = kept_at;
