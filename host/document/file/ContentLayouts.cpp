@@ -99,13 +99,19 @@ template <class Step, class AnyObject> bool attributeFields(Step step, AnyObject
            step.check(!KM_UuidIsNil(object.id));
 }
 
+/// The determinant of a very small scale is too small for a number.
+bool isFlattening(const KM_Xform& place) {
+    KM_Xform inverse = place;
+    return place.Determinant() == 0.0 && !inverse.Invert();
+}
+
 /// An affine transform: three rows of four numbers.
 template <class Step, class AnyXform> bool placeFields(Step step, AnyXform& place) {
     for (int i = 0; i < 3; ++i)
         for (int j = 0; j < 4; ++j)
             if (!step(place.m_xform[i][j]))
                 return false;
-    return step.check(place.IsValid() && place.Determinant() != 0.0);
+    return step.check(place.IsValid() && !isFlattening(place));
 }
 
 template <class Step, class AnyView> bool viewFields(Step step, AnyView& view) {

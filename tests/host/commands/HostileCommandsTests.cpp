@@ -11,7 +11,7 @@
 namespace quarn::test {
 namespace {
 
-constexpr unsigned RUNS = 80;
+constexpr unsigned RUNS = 60;
 constexpr int COMMANDS = 12;
 
 /// Runs commands with whatever numbers there are, as a script would.

@@ -55,8 +55,8 @@ TEST(Turntable, IsRecordedAtTheSizeOfAScreenByDefault) {
 TEST(Turntable, OfATargetOutOfRangeShowsTheBackgroundAndIsToldOnce) {
     const Studio studio;
     for (const char* mode : {"Rendered", "Wireframe", "RenderPreview"}) {
-        const Ended ended = run(studio.turntable(
-            3, {"--target", "1e18,0,0", "--mode", mode, "--size", "48x32", "--samples", "1"}));
+        const Ended ended =
+            run(studio.turntable(3, {"--target", "1e18,0,0", "--mode", mode, "--size", "48x32"}));
         EXPECT_EQ(ended.exit_code, 0) << mode << ended.err;
         EXPECT_THAT(ended.out, HasSubstr("3 frames and out/house.html"));
         EXPECT_THAT(ended.err, StartsWith("quarn: The camera is out of range: the picture shows"));
