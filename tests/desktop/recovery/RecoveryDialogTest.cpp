@@ -85,16 +85,6 @@ TEST_F(RecoveryDialogTest, WhatIsOlderThanItsFileSaysSo) {
     EXPECT_FALSE(list().item(0)->data(RecoveryRow::TIME).toString().contains("saved later"));
 }
 
-TEST_F(RecoveryDialogTest, WhatIsOlderThanItsFileSaysSo) {
-    RecoverableDocument older = document("");
-    older.document = folder / "saved.quarn";
-    quarn::test::writeFile(older.document, "saved in this year");
-    const RecoveryDialog offer({older}, {}, nullptr);
-    const QListWidgetItem& row = *part<QListWidget>(offer, "recoverable").item(0);
-    EXPECT_TRUE(row.data(RecoveryRow::TIME).toString().contains("saved later"));
-    EXPECT_FALSE(list().item(0)->data(RecoveryRow::TIME).toString().contains("saved later"));
-}
-
 TEST_F(RecoveryDialogTest, ThePictureIsDrawnInItsRow) {
     dialog.show();
     QTest::qWait(20);
