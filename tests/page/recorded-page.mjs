@@ -87,7 +87,8 @@ export function recordNothing({ name }) {
     const run = spawnSync(process.env.QUARN_PROGRAM,
         ['run', join(folder, 'script.txt'), join(folder, 'house.obj'), '--language', 'en'],
         { encoding: 'utf8' });
-    if (run.status !== 0) throw new Error(`quarn ended with ${run.status}: ${run.stderr}`);
+    if (run.status !== 1 || !run.stderr.includes(`${name}.html shows nothing`))
+        throw new Error(`quarn ended with ${run.status}: ${run.stderr}`);
     return {
         address: pathToFileURL(join(out, `${name}.html`)).href,
         remove: () => rmSync(folder, { recursive: true, force: true }),

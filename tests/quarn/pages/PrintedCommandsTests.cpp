@@ -197,6 +197,7 @@ std::set<std::string> optionsIn(const std::string& text) {
 
 TEST(PrintedOptions, AreThoseOfSomeProgram) {
     std::set<std::string> known = {"--preset", "--build", // of cmake
+                                   "--run-script",        // of the window
                                    "--gtest"};            // of the test programs
     for (const std::string& command : subcommands()) {
         const std::string help = helpOf(command);

@@ -61,7 +61,7 @@ TEST(Turntable, OfATargetOutOfRangeShowsTheBackgroundAndIsToldOnce) {
         EXPECT_THAT(ended.out, HasSubstr("3 frames and out/house.html"));
         EXPECT_THAT(ended.err, StartsWith("quarn: The camera is out of range: the picture shows"));
         EXPECT_EQ(std::ranges::count(ended.err, '\n'), 1) << ended.err;
-        EXPECT_EQ(filesIn(studio / "out").size(), 4U);
+        EXPECT_EQ(filesIn(studio / "out").size(), 5U);
     }
 }
 
