@@ -1,7 +1,10 @@
 #include "tests/desktop_window/HouseDesk.h"
 
+#include <chrono>
 #include <csignal>
+#include <filesystem>
 #include <gtest/gtest.h>
+#include <thread>
 
 namespace quarn::test {
 
@@ -13,12 +16,20 @@ protected:
     void leaveUnsavedWork(int signal) {
         desk.startWithHouse({.arguments = {"--recovery-every", "0.1"}});
         desk.setUpTurntable();
-        desk.lookUntil("work that is kept", [this](const Windows&) {
-            const std::filesystem::path state = desk.home() / ".state" / "quarn";
-            return std::filesystem::exists(state) && !std::filesystem::is_empty(state);
-        });
+        desk.lookUntil("work that is kept", [this](const Windows&) { return isKept(); });
+        std::this_thread::sleep_for(std::chrono::milliseconds(500)); // its last bytes, on a beat
         desk.sendSignal(signal);
         desk.waitForEnd();
+    }
+    /// Whether a mark leads to a copy; it is written before the copy is whole.
+    bool isKept() const {
+        const std::filesystem::path kept = desk.home() / ".state" / "quarn" / "recovery";
+        if (!std::filesystem::is_directory(kept))
+            return false;
+        for (const auto& entry : std::filesystem::directory_iterator(kept))
+            if (entry.path().extension() == ".mark")
+                return true;
+        return false;
     }
     QStringList house() { return {QString::fromStdString(desk.documents() / "house.obj")}; }
 
