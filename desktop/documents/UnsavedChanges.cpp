@@ -31,15 +31,11 @@ bool UnsavedChanges::mayLeave() {
     const bool was_settled = m_may_exit && m_session.isExitRequested();
     if (was_settled || !isModified(m_session.document()))
         return true;
-    switch (askPerson()) {
-    case Choice::save:
-        return save();
-    case Choice::discard:
-        return true;
-    case Choice::stay:
-        break;
-    }
-    return false;
+    const Choice choice = askPerson();
+    const bool leaves = choice == Choice::discard || (choice == Choice::save && save());
+    if (!leaves)
+        m_session.takeBackExit(); // or the end of the next command would ask again
+    return leaves;
 }
 
 void UnsavedChanges::start(const QString& line) {

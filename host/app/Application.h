@@ -83,6 +83,7 @@ public:
     void setOpenDialog(const CDialog* dialog) { m_open_dialog = dialog; }
 
     void requestExit() { m_exit_requested = true; }
+    void takeBackExit() { m_exit_requested = false; }
     bool isExitRequested() const { return m_exit_requested; }
 
 private:

@@ -68,4 +68,8 @@ bool Session::isExitRequested() const {
     return m_state->application.isExitRequested();
 }
 
+void Session::takeBackExit() {
+    m_state->application.takeBackExit();
+}
+
 } // namespace quarn

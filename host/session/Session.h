@@ -74,6 +74,8 @@ public:
 
     /// True once a command asked the program to end.
     bool isExitRequested() const;
+    /// For a person who was asked about unsaved changes then, and stays.
+    void takeBackExit();
 
 private:
     struct State;

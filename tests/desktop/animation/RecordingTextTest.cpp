@@ -1,20 +1,13 @@
 #include "desktop/animation/RecordingText.h"
 
+#include "tests/host/front_end/RecordingReports.h"
+
 #include <gtest/gtest.h>
 
 namespace quarn::desktop::test {
 namespace {
 
-RecordingReport reportOf(int expected, int written, int there) {
-    RecordingReport report;
-    report.folder = "out";
-    report.page = "out/house.html";
-    report.expected = expected;
-    report.written = written;
-    report.there = there;
-    report.has_page = true;
-    return report;
-}
+using quarn::test::reportOf;
 
 TEST(RecordingTextTest, TellsHowManyPicturesThereAre) {
     EXPECT_EQ(recordingText(reportOf(3, 3, 3)), "3 pictures were written to out.");

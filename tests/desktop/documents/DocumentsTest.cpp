@@ -181,6 +181,15 @@ TEST_F(DocumentsTest, TheCommandThatEndsTheProgramAsksOnce) {
     EXPECT_TRUE(window.close());
 }
 
+TEST_F(DocumentsTest, WhoStaysWhenAScriptEndsTheProgramIsNotAskedAgain) {
+    change();
+    starter.start("_Exit");
+    EXPECT_TRUE(session.isExitRequested());
+    willClick("keepDocument");
+    EXPECT_FALSE(window.close());
+    EXPECT_FALSE(session.isExitRequested());
+}
+
 TEST_F(DocumentsTest, ClosingWhileAQuestionIsAskedCancelsItAndCloses) {
     usePart([this](FrontEndParts& used) {
         used.ask = [this](const Question& question) { return pane.ask(question); };

@@ -11,11 +11,20 @@ namespace {
 
 class ProgramEndTest : public WindowTest {
 protected:
-    /// Does something in the application's event loop, and ends the program shortly afterwards.
+    /// Does something in the application's event loop, and ends the program shortly afterwards, as
+    /// soon as the work is far enough.
     /// @return whether the loop returned by itself
-    bool endDuring(std::function<void()> work) {
+    bool endDuring(
+        std::function<void()> work, std::function<bool()> is_far_enough = [] { return true; }) {
         later(std::move(work));
-        QTimer::singleShot(120, &window, [this] { window.programEnd().end(UnsavedWork::kept); });
+        QTimer look;
+        look.callOnTimeout([&] {
+            if (!is_far_enough())
+                return;
+            look.stop();
+            window.programEnd().end(UnsavedWork::kept);
+        });
+        look.start(120);
         QTimer late;
         late.callOnTimeout([] { QCoreApplication::exit(1); });
         late.start(20000);
@@ -57,12 +66,16 @@ TEST_F(ProgramEndTest, FramesThatWereRecordedStayAndThePageShowsThem) {
     readSlab();
     setUpTurntable(5000);
     std::filesystem::create_directory(folder / "frames");
-    EXPECT_TRUE(endDuring([this] {
-        run("_-RecordAnimation _TargetFolder \"" + qtText(folder / "frames") + "\" _Enter");
-    }));
-    const QStringList frames = QDir(qtText(folder / "frames")).entryList({"*.jpg"});
-    EXPECT_GT(frames.size(), 2) << printed().toStdString();
-    EXPECT_LT(frames.size(), 5000);
+    const auto frames = [this] {
+        return QDir(qtText(folder / "frames")).entryList({"*.jpg"}).size();
+    };
+    EXPECT_TRUE(endDuring(
+        [this] {
+            run("_-RecordAnimation _TargetFolder \"" + qtText(folder / "frames") + "\" _Enter");
+        },
+        [&] { return frames() > 2; }));
+    EXPECT_GT(frames(), 2) << printed().toStdString();
+    EXPECT_LT(frames(), 5000);
     EXPECT_EQ(QDir(qtText(folder / "frames")).entryList({"*.html"}).size(), 1);
 }
 

@@ -1,20 +1,13 @@
 #include "quarn/session/RecordingText.h"
 
+#include "tests/host/front_end/RecordingReports.h"
+
 #include <gtest/gtest.h>
 
 namespace quarn::program {
 namespace {
 
-RecordingReport reportOf(int expected, int written, int there) {
-    RecordingReport report;
-    report.folder = "out";
-    report.page = "out/house.html";
-    report.expected = expected;
-    report.written = written;
-    report.there = there;
-    report.has_page = true;
-    return report;
-}
+using quarn::test::reportOf;
 
 TEST(RecordingText, TellsWhatAWholeRecordingWrote) {
     EXPECT_EQ(endText({reportOf(3, 3, 3), ""}),
