@@ -58,8 +58,15 @@ json jsonOf(const RecordingFile& recording) {
 
 // ---- From JSON. What has another type than it should throws, which ends in parseRecording.
 
+/// The library would convert a number of another type, and one too large for this is a double to it.
+template <class Integer> Integer integerOf(const json& value) {
+    if (!value.is_number_integer())
+        throw std::out_of_range("number");
+    return value.get<Integer>();
+}
+
 int intOf(const json& value) {
-    const auto number = value.get<std::int64_t>();
+    const auto number = integerOf<std::int64_t>(value);
     if (number < 0 || number > std::numeric_limits<int>::max())
         throw std::out_of_range("number");
     return static_cast<int>(number);
@@ -101,9 +108,9 @@ RecordingFile recordingOf(const json& object) {
     recording.is_running = object.at("state") == "recording";
     const json& writer = object.at("writer");
     recording.writer = {writer.at("host"), intOf(writer.at("pid")),
-                        writer.at("started").get<std::uint64_t>()};
+                        integerOf<std::uint64_t>(writer.at("started"))};
     if (recording.is_running)
-        recording.lease_until_s = object.at("lease_until_unix_s").get<std::int64_t>();
+        recording.lease_until_s = integerOf<std::int64_t>(object.at("lease_until_unix_s"));
     recording.settings = settingsOf(object.at("settings"));
     recording.written = framesOf(object.at("written"));
     recording.owns_page = object.at("owns_page");
@@ -141,7 +148,7 @@ Result<RecordingFile> parseRecordingFile(std::string_view text, const std::files
         const json object = json::parse(text);
         if (object.at("format") != format_name)
             return notARecording(file);
-        if (object.at("version").get<int>() > format_version)
+        if (integerOf<std::int64_t>(object.at("version")) > format_version)
             return ofALaterVersion(file);
         return recordingOf(object);
     } catch (const json::exception&) {

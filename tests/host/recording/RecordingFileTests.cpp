@@ -60,7 +60,9 @@ TEST_F(RecordingFileOnDisk, ThatIsSomethingElseIsToldWithItsName) {
           std::string(100000, '['), good.substr(0, good.size() / 2),
           replaced("quarn-recording", "another"), replaced("4711", "-4711"),
           replaced("4711", "\"4711\""), replaced("150", "15000000000"), replaced("\"jpg\"", "7"),
-          replaced("4711", "1e300")}) {
+          replaced("4711", "1e300"), replaced("123456789012345", "1.5"),
+          replaced("123456789012345", "18446744073709551616"), replaced("1795320936", "1e300"),
+          replaced("\"version\": 1", "\"version\": 0.5")}) {
         writeFile(file, text);
         const auto read = readRecordingFile(file);
         ASSERT_FALSE(read.ok()) << text;
