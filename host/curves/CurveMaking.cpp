@@ -50,6 +50,17 @@ Error badDegree() {
     return Error{"The degree of a curve is from 1 to " + std::to_string(HIGHEST_DEGREE) + "."};
 }
 
+/// Beyond it most of the curve lies in so small a part of its domain that its length comes out
+/// wrong.
+constexpr double LARGEST_WEIGHT_RATIO = 1e6;
+
+bool areFarApart(std::span<const double> weights) {
+    if (weights.empty())
+        return false;
+    const auto [least, most] = std::ranges::minmax(weights);
+    return most > LARGEST_WEIGHT_RATIO * least;
+}
+
 bool setWeights(KM_NurbsCurve& curve, std::span<const double> weights) {
     // Behind the last point of a periodic curve its first ones come again.
     for (int i = 0; i < curve.CVCount() && !weights.empty(); ++i)
@@ -96,6 +107,9 @@ CurveResult makeSpline(std::span<const KM_3dPoint> control_points, int degree, b
                              : curve->CreateClampedUniformNurbs(points, degree + 1);
     if (!made)
         return Error{what + " cannot be made of these points."};
+    if (areFarApart(weights))
+        return Error{"The weights of points differ by a factor of more than 1,000,000. Bring them "
+                     "nearer to each other."};
     if (!setWeights(*curve, weights.first(std::min(weights.size(), points.size()))))
         return Error{"The weight of a point is a number above 0."};
     return checked(std::move(curve));

@@ -26,7 +26,8 @@ CurveResult makePolyline(std::span<const KM_3dPoint> corners, bool closed);
 /// A curve drawn toward control points: clamped with uniform knots, or closed and smooth all over.
 /// @param weights  of the control points, all above 0; none for a curve that is not rational
 /// @return an error for a degree outside 1 to HIGHEST_DEGREE, for less than degree + 1 points
-///         (closed: less than the degree or 3), when all points coincide, and for bad weights
+///         (closed: less than the degree or 3), when all points coincide, and for weights that are
+///         not above 0 or differ by a factor of more than a million
 CurveResult makeSpline(std::span<const KM_3dPoint> control_points, int degree, bool closed,
                        std::span<const double> weights = {});
 

@@ -129,6 +129,17 @@ TEST(CurveFile, JsonGivesDegreePointsAndWeights) {
     EXPECT_EQ(as<KM_NurbsCurve>(R"({"points":[[0,0,0],[1,1,1,2]]})").Degree(), 1);
 }
 
+/// The true length comes near 2, by way of the corner, as the weight of the corner grows.
+TEST(CurveFile, WeightsMayDifferByAMillionAndNoMore) {
+    const auto corner =
+        as<KM_NurbsCurve>(R"({"degree": 2, "points": [[1, 0, 0], [1, 1, 0, 1e6], [0, 1, 0]]})");
+    double length = 0.0;
+    ASSERT_TRUE(corner.GetLength(&length));
+    EXPECT_NEAR(length, 2.0, 1e-5);
+    expectRefused(R"({"degree": 2, "points": [[1, 0, 0], [1, 1, 0, 1.1e6], [0, 1, 0]]})",
+                  "by a factor of more than 1,000,000");
+}
+
 TEST(CurveFile, ClosedJsonCurvesRepeatTheirFirstWeightsToo) {
     const auto loop = as<KM_NurbsCurve>(
         R"({"closed":true,"degree":2,"points":[[0,0,0,5],[4,0,0,1],[4,4,0,2],[0,4,0,1]]})");
