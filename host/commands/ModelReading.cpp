@@ -128,7 +128,7 @@ Result<void> readDocument(AskedFile& asked, UpAxis up) {
 }
 
 Result<void> readModel(AskedFile& asked, UpAxis up) {
-    auto model = readModelFile(asked.file, up);
+    auto model = readModelFile(asked.file, {.up = up});
     if (!model)
         return model.error();
     asked.content = std::move(model.value());

@@ -1,4 +1,4 @@
-#include "import/ModelExtensions.h"
+#include "import/library/ModelExtensions.h"
 
 #include <gmock/gmock.h>
 

@@ -38,7 +38,7 @@ TEST(PlacedModel, TrianglesThatAreNearTheOriginStandWhereTheirVerticesSay) {
 
 TEST(PlacedModel, SurveyedModelThatIsYUpIsTurnedAsAWhole) {
     const TemporaryFolder folder;
-    const auto model = readModelFile(folder.write("site.obj", surveyed), UpAxis::y);
+    const auto model = readModelFile(folder.write("site.obj", surveyed), {.up = UpAxis::y});
     ASSERT_TRUE(model.ok());
     // x stays, z comes from y, y from -z.
     expectNear(boundsOf(model.value()).m_min, {4500012.125, -101.0, 5200034.25}, 1e-6);
