@@ -9,6 +9,7 @@
 #include "host/document/ViewFit.h"
 #include "host/document/file/DocumentExtension.h"
 #include "host/document/file/DocumentFile.h"
+#include "host/reader/ModelReader.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLocalize.h"
 
@@ -127,8 +128,8 @@ Result<void> readDocument(AskedFile& asked, UpAxis up) {
     return {};
 }
 
-Result<void> readModel(AskedFile& asked, UpAxis up) {
-    auto model = readModelFile(asked.file, {.up = up});
+Result<void> readModelOf(AskedFile& asked, UpAxis up) {
+    auto model = readModel(asked.file, {.up = up});
     if (!model)
         return model.error();
     asked.content = std::move(model.value());
@@ -148,7 +149,7 @@ AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use) {
     asked.file = choice.kind == FileChoice::Kind::chosen ? choice.file : asked.file;
     if (asked.result != CQuarnCommand::success)
         return asked;
-    const auto read = isDocumentFile(asked.file) ? readDocument(asked, up) : readModel(asked, up);
+    const auto read = isDocumentFile(asked.file) ? readDocument(asked, up) : readModelOf(asked, up);
     if (!read)
         asked.result = fail(read.message());
     return asked;

@@ -2,7 +2,7 @@
 
 #include "host/commands/FileAsking.h"
 #include "host/document/file/DocumentContent.h"
-#include "import/ModelFile.h"
+#include "import/ImportedModel.h"
 #include "sdk/qncore/QnCommand.h"
 
 #include <filesystem>

@@ -4,9 +4,9 @@
 #include "host/document/LightStore.h"
 #include "host/document/ViewState.h"
 #include "host/document/file/CurveLayout.h"
-#include "host/document/file/Fields.h"
-#include "host/document/file/LightFields.h"
-#include "host/document/file/ViewportLayout.h"
+#include "ground/Fields.h"
+#include "ground/LightFields.h"
+#include "ground/ViewportLayout.h"
 
 #include <cmath>
 

@@ -1,6 +1,6 @@
-#include "host/document/file/ViewportLayout.h"
+#include "ground/ViewportLayout.h"
 
-#include "host/document/file/Fields.h"
+#include "ground/Fields.h"
 
 namespace quarn {
 
