@@ -1,40 +1,18 @@
 #include "import/ModelFile.h"
 
 #include "ground/FileBytes.h"
+#include "import/ModelFormats.h"
 #include "import/assembly/ModelAssembly.h"
-#include "import/cad/CadReader.h"
 #include "import/files/ModelFileCheck.h"
-#include "import/library/LibraryReader.h"
 
 #include <exception>
 #include <new>
-#include <string_view>
 
 namespace quarn {
 
 namespace {
 
 namespace fs = std::filesystem;
-
-using Reader = Result<SourceScene> (*)(const ModelReading& reading);
-
-struct Format {
-    std::string_view extension;
-    Reader read;
-};
-
-/// The formats that have a reader of their own.
-constexpr Format FORMATS[] = {
-    {"brep", readBrep}, {"iges", readIges}, {"igs", readIges},
-    {"step", readStep}, {"stp", readStep},
-};
-
-Reader readerOf(const std::string& extension) {
-    for (const Format& format : FORMATS)
-        if (format.extension == extension)
-            return format.read;
-    return readWithLibrary;
-}
 
 class NobodyWatches final : public ReadingWatch {
     bool goesOn(ReadingStep, double) override { return true; }

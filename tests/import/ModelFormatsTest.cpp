@@ -1,4 +1,4 @@
-#include "import/library/ModelExtensions.h"
+#include "import/ModelFormats.h"
 
 #include <gmock/gmock.h>
 
@@ -9,7 +9,7 @@ namespace {
 
 using testing::IsSupersetOf;
 
-TEST(ModelExtensions, TheUsualModelFilesComeFirstAndNoneTwice) {
+TEST(ModelFormats, TheUsualModelFilesComeFirstAndNoneTwice) {
     const std::vector<std::string> endings = modelFileExtensions();
     ASSERT_GT(endings.size(), 10U);
     EXPECT_EQ(endings[0], "glb");
