@@ -5,6 +5,7 @@
 #include "host/app/DocumentSaving.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileNameQuestion.h"
+#include "host/commands/WatchedReading.h"
 #include "host/document/DocumentList.h"
 #include "host/document/ViewFit.h"
 #include "host/document/file/DocumentExtension.h"
@@ -129,7 +130,11 @@ Result<void> readDocument(AskedFile& asked, UpAxis up) {
 }
 
 Result<void> readModelOf(AskedFile& asked, UpAxis up) {
-    auto model = readModel(asked.file, {.up = up});
+    const Application& application = *Application::current();
+    WatchedReading watch(application.frontEnd(), asked.file);
+    auto model = readModel(
+        asked.file, {.up = up, .most_memory = application.options().most_memory, .watch = &watch});
+    asked.is_given_up = watch.isGivenUp();
     if (!model)
         return model.error();
     asked.content = std::move(model.value());
@@ -152,6 +157,8 @@ AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use) {
     const auto read = isDocumentFile(asked.file) ? readDocument(asked, up) : readModelOf(asked, up);
     if (!read)
         asked.result = fail(read.message());
+    if (!read && asked.is_given_up)
+        asked.result = CQuarnCommand::cancel;
     return asked;
 }
 

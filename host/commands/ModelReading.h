@@ -17,6 +17,7 @@ class DocumentList;
 struct AskedFile {
     CQuarnCommand::result result = CQuarnCommand::success;
     std::filesystem::path file;
+    bool is_given_up = false;                             ///< by the person, while it was read
     std::variant<ImportedModel, DocumentContent> content; ///< only after success
 };
 

@@ -25,9 +25,13 @@ constexpr milliseconds SHORTEST_LIMIT{60'000};
 constexpr std::uint64_t BYTES_A_MILLISECOND = 10'000'000 / 30'000;
 /// Where the system does not tell how much memory is free.
 constexpr std::uint64_t MOST_MEMORY = std::uint64_t{1} << 62;
+/// What a small model needs is tried also where hardly any memory is free.
+constexpr std::uint64_t LEAST_MEMORY = std::uint64_t{64} << 20;
 
 std::uint64_t memoryOf(const ModelReaderOptions& options) {
-    return std::min(options.most_memory > 0 ? options.most_memory : freeMemory() / 2, MOST_MEMORY);
+    if (options.most_memory > 0)
+        return std::min(options.most_memory, MOST_MEMORY);
+    return std::clamp(freeMemory() / 2, LEAST_MEMORY, MOST_MEMORY);
 }
 
 milliseconds timeOf(const ModelReaderOptions& options, const fs::path& path) {
@@ -69,7 +73,7 @@ private:
     Result<ImportedModel> result(const ReaderAnswer& answer) {
         m_reader.kill(); // it has nothing more to do, and shall do nothing more
         if (answer.kind == ReaderAnswer::Kind::refused)
-            return Error{answer.message};
+            return answer.message.empty() ? readerStopped(m_path, 0) : Error{answer.message};
         if (m_reader.block().memory() > m_most_memory)
             return readingNeedsMore(m_path, m_most_memory);
         Result<ImportedModel> model = takeModel(m_reader.block());

@@ -14,7 +14,8 @@ namespace quarn {
 struct ModelReaderOptions {
     UpAxis up = UpAxis::by_format;
     double tolerance = 0.0; ///< as ReadingOptions has it
-    /// Bytes of memory that the reader and the model together may take; 0: half of what is free.
+    /// Bytes of memory that the reader and the model together may take; 0: half of what is
+    /// free, and at least 64 MB.
     std::uint64_t most_memory = 0;
     /// How long the reading may take; 0: longestReading of the file.
     std::chrono::milliseconds longest{0};

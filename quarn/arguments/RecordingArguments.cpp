@@ -63,6 +63,9 @@ void addCommonOptions(CLI::App& command, CommonOptions& common) {
     command.add_flag("--verbose", common.is_verbose, "Show what the host's commands print");
     command.add_option("--language", common.language,
                        "Language of texts, such as de or ja (default: the environment's)");
+    const OptionAdder add(command);
+    add("--limit-memory", common.most_memory, "SIZE", sizeOfMemory(),
+        "Memory that reading a model may take, such as 500M or 2G (default: half of what is free)");
 }
 
 void addShowScript(CLI::App& command, bool& is_only_shown) {
