@@ -64,6 +64,12 @@ struct ImportedPlace {
     double north_angle_deg = 0.0; ///< from the Y axis to north, clockwise seen from above, 0 to 360
 };
 
+/// What a person may want to know of a reading afterwards.
+struct ReadingNotes {
+    TakenUpAxis up;
+    std::vector<std::string> warnings; ///< sentences: what was left out and why
+};
+
 /// What a model file holds.
 struct ImportedModel {
     std::vector<ImportedMesh> meshes;
