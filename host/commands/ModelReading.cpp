@@ -102,14 +102,37 @@ CQuarnCommand::result askUpAxis(UpAxis& up) {
     return CQuarnCommand::success;
 }
 
-/// Asks for the file and, where the option is picked, for the axis that points up in it.
-CQuarnCommand::result askFile(std::filesystem::path& file, UpAxis& up) {
+/// @param tolerance  receives the answer
+CQuarnCommand::result askTolerance(double& tolerance) {
+    CQuarnGetNumber get;
+    get.SetCommandPrompt(
+        QnLocalizeString(L"How far meshes may lie beside curved surfaces, 0 for by size", 42660));
+    get.SetLowerLimit(0.0);
+    if (get.GetNumber() != CQuarnGet::number)
+        return get.CommandResult() == CQuarnCommand::success ? CQuarnCommand::failure
+                                                             : get.CommandResult();
+    tolerance = get.Number();
+    return CQuarnCommand::success;
+}
+
+/// How a person wants a model file to be read.
+struct ReadingWish {
+    UpAxis up = UpAxis::by_format;
+    double tolerance = 0.0; ///< as ReadingOptions has it
+
+    bool isUsual() const { return up == UpAxis::by_format && tolerance == 0.0; }
+};
+
+/// Asks for the file and, where their options are picked, how it is to be read.
+CQuarnCommand::result askFile(std::filesystem::path& file, ReadingWish& wish) {
     FileNameQuestion get;
     get.SetCommandPrompt(QnLocalizeString(L"Model or document file", 42050));
-    get.AddCommandOption(QnLocalizeCommandOptionName(L"Up", 42051));
+    const int up = get.AddCommandOption(QnLocalizeCommandOptionName(L"Up", 42051));
+    get.AddCommandOption(QnLocalizeCommandOptionName(L"Tolerance", 42660));
     CQuarnGet::result answer = get.GetString();
     while (answer == CQuarnGet::option) {
-        const CQuarnCommand::result asked = askUpAxis(up);
+        const CQuarnCommand::result asked =
+            get.Option()->m_option_index == up ? askUpAxis(wish.up) : askTolerance(wish.tolerance);
         if (asked != CQuarnCommand::success)
             return asked;
         answer = get.GetString();
@@ -119,9 +142,9 @@ CQuarnCommand::result askFile(std::filesystem::path& file, UpAxis& up) {
     return get.CommandResult();
 }
 
-Result<void> readDocument(AskedFile& asked, UpAxis up) {
-    if (up != UpAxis::by_format)
-        return Error{"A document tells itself which axis points up; leave Up out."};
+Result<void> readDocument(AskedFile& asked, const ReadingWish& wish) {
+    if (!wish.isUsual())
+        return Error{"A document has its axes and its meshes; leave Up and Tolerance out."};
     auto content = readDocumentFile(asked.file);
     if (!content)
         return content.error();
@@ -129,11 +152,13 @@ Result<void> readDocument(AskedFile& asked, UpAxis up) {
     return {};
 }
 
-Result<void> readModelOf(AskedFile& asked, UpAxis up) {
+Result<void> readModelOf(AskedFile& asked, const ReadingWish& wish) {
     const Application& application = *Application::current();
     WatchedReading watch(application.frontEnd(), asked.file);
-    auto model = readModel(
-        asked.file, {.up = up, .most_memory = application.options().most_memory, .watch = &watch});
+    auto model = readModel(asked.file, {.up = wish.up,
+                                        .tolerance = wish.tolerance,
+                                        .most_memory = application.options().most_memory,
+                                        .watch = &watch});
     asked.is_given_up = watch.isGivenUp();
     if (!model)
         return model.error();
@@ -145,16 +170,17 @@ Result<void> readModelOf(AskedFile& asked, UpAxis up) {
 
 AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use) {
     AskedFile asked;
-    UpAxis up = UpAxis::by_format;
+    ReadingWish wish;
     const FileChoice choice = chooseFile(context, use);
     if (choice.kind == FileChoice::Kind::nobody)
-        asked.result = askFile(asked.file, up);
+        asked.result = askFile(asked.file, wish);
     else if (choice.kind == FileChoice::Kind::given_up)
         asked.result = CQuarnCommand::cancel;
     asked.file = choice.kind == FileChoice::Kind::chosen ? choice.file : asked.file;
     if (asked.result != CQuarnCommand::success)
         return asked;
-    const auto read = isDocumentFile(asked.file) ? readDocument(asked, up) : readModelOf(asked, up);
+    const auto read =
+        isDocumentFile(asked.file) ? readDocument(asked, wish) : readModelOf(asked, wish);
     if (!read)
         asked.result = fail(read.message());
     if (!read && asked.is_given_up)
