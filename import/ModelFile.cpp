@@ -3,6 +3,7 @@
 #include "ground/FileBytes.h"
 #include "import/assembly/ModelAssembly.h"
 #include "import/files/ModelFileCheck.h"
+#include "import/gltf/GltfReader.h"
 #include "import/library/LibraryReader.h"
 
 #include <array>
@@ -24,7 +25,10 @@ struct Format {
 };
 
 /// The formats that have a reader of their own.
-constexpr std::array<Format, 0> FORMATS = {};
+constexpr std::array FORMATS = {
+    Format{"gltf", readGltf},
+    Format{"glb", readGltf},
+};
 
 Reader readerOf(const std::string& extension) {
     for (const Format& format : FORMATS)

@@ -43,25 +43,6 @@ std::string whyBadStl(std::istream& file, std::uint64_t size) {
                                 std::to_string((size - head.size()) / 50);
 }
 
-std::string whyBadGlb(std::istream& file, std::uint64_t size) {
-    std::array<char, 20> head{};
-    file.read(head.data(), head.size());
-    if (std::memcmp(head.data(), "glTF", 4) != 0) {
-        return "it is not a GLB file, whatever its name says";
-    }
-    if (file.gcount() < static_cast<std::streamsize>(head.size())) {
-        return "the file is cut short";
-    }
-    if (numberAt(&head[4]) != 2) {
-        return {}; // an older layout
-    }
-    const std::uint64_t whole_length = numberAt(&head[8]);
-    const std::uint64_t text_length = numberAt(&head[12]);
-    return whole_length <= size && head.size() + text_length <= whole_length
-               ? std::string()
-               : "the lengths in its header do not fit the file's length";
-}
-
 /// The counts stand at the first line that is neither the keyword nor a comment.
 std::string whyBadOff(std::istream& file, std::uint64_t size) {
     constexpr int most_lines = 1000;
@@ -87,9 +68,6 @@ std::string whyBadBytes(const fs::path& path, std::istream& file, std::uint64_t 
     const std::string format = modelFormat(path);
     if (format == "stl") {
         return whyBadStl(file, size);
-    }
-    if (format == "glb") {
-        return whyBadGlb(file, size);
     }
     if (format == "off") {
         return whyBadOff(file, size);
