@@ -2,11 +2,11 @@
 
 #include "ground/FileBytes.h"
 #include "import/assembly/ModelAssembly.h"
+#include "import/cad/CadReader.h"
 #include "import/files/ModelFileCheck.h"
 #include "import/gltf/GltfReader.h"
 #include "import/library/LibraryReader.h"
 
-#include <array>
 #include <exception>
 #include <new>
 #include <string_view>
@@ -25,9 +25,9 @@ struct Format {
 };
 
 /// The formats that have a reader of their own.
-constexpr std::array FORMATS = {
-    Format{"gltf", readGltf},
-    Format{"glb", readGltf},
+constexpr Format FORMATS[] = {
+    {"brep", readBrep}, {"glb", readGltf},  {"gltf", readGltf}, {"iges", readIges},
+    {"igs", readIges},  {"step", readStep}, {"stp", readStep},
 };
 
 Reader readerOf(const std::string& extension) {
