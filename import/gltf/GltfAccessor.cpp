@@ -209,11 +209,8 @@ Result<void> Accessors::overlay(const Json& sparse, Accessor& accessor) {
                      size, size, indices.value().name);
     if (!values)
         return values.error();
-    const std::uint64_t most = UINT64_MAX / 64; // an element has 64 bytes at most
-    const Result<void> taken =
-        m_reading.budget.take(std::min(accessor.count, most) * size, "vertices");
-    if (!taken)
-        return tooLarge(m_reading, taken.message());
+    if (const Result<void> taken = takeMemory(m_reading, accessor.count, size, "vertices"); !taken)
+        return taken;
     auto dense = std::make_shared<std::vector<std::uint8_t>>(accessor.count * size);
     for (std::uint64_t i = 0; i < accessor.count && !accessor.bytes.empty(); ++i)
         std::memcpy(dense->data() + i * size, accessor.bytes.data() + i * accessor.stride, size);

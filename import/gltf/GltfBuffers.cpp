@@ -82,9 +82,9 @@ Result<Bytes> Buffers::decompressed(const Json& compressed, const std::string& w
     const std::string wrong = whyBad(layout);
     if (!wrong.empty())
         return damaged(m_reading, what + " cannot be decompressed: " + wrong);
-    const Result<void> taken = m_reading.budget.take(layout.count * layout.stride, "vertices");
-    if (!taken)
-        return tooLarge(m_reading, taken.message());
+    if (const Result<void> taken = takeMemory(m_reading, layout.count, layout.stride, "vertices");
+        !taken)
+        return taken.error();
     Result<std::vector<std::uint8_t>> decoded = decodeMeshopt(bytes.value(), layout);
     if (!decoded)
         return damaged(m_reading, what + " cannot be decompressed: " + decoded.message());
@@ -121,9 +121,8 @@ Result<Bytes> Buffers::fromDataUri(const std::string& what, std::string_view uri
     const std::size_t at = uri.find(MARK);
     if (at == std::string_view::npos)
         return damaged(m_reading, what + " is not given in Base64");
-    const Result<void> taken = m_reading.budget.take(uri.size() / 4 * 3 + 3, "buffers");
-    if (!taken)
-        return tooLarge(m_reading, taken.message());
+    if (const Result<void> taken = takeMemory(m_reading, uri.size(), 1, "buffers"); !taken)
+        return taken.error();
     Result<std::vector<std::uint8_t>> bytes = fromBase64(uri.substr(at + MARK.size()));
     if (!bytes)
         return damaged(m_reading, what + " is damaged: " + bytes.message());

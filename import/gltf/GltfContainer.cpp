@@ -4,6 +4,7 @@
 #include "kelmar/KM_LittleEndian.h"
 
 #include <cstring>
+#include <limits>
 
 namespace quarn::gltf {
 
@@ -90,6 +91,14 @@ Error damaged(const ModelReading& reading, std::string_view why) {
 
 Error tooLarge(const ModelReading& reading, std::string_view why) {
     return cannotReadModel(reading.path, why, "Use a smaller model.");
+}
+
+Result<void> takeMemory(const ModelReading& reading, std::uint64_t count, std::uint64_t bytes_each,
+                        std::string_view what) {
+    constexpr std::uint64_t MOST = std::numeric_limits<std::uint64_t>::max();
+    const bool is_beyond = bytes_each > 0 && count > MOST / bytes_each;
+    const Result<void> taken = reading.budget.take(is_beyond ? MOST : count * bytes_each, what);
+    return taken ? taken : tooLarge(reading, taken.message());
 }
 
 } // namespace quarn::gltf

@@ -24,4 +24,10 @@ Error damaged(const ModelReading& reading, std::string_view why);
 /// The error for a file whose content the budget does not hold.
 Error tooLarge(const ModelReading& reading, std::string_view why);
 
+/// Takes a share of the budget; a product beyond 64 bits is more than any budget holds.
+/// @param what  what the memory is for, in the plural
+/// @return an error that names the file
+Result<void> takeMemory(const ModelReading& reading, std::uint64_t count, std::uint64_t bytes_each,
+                        std::string_view what);
+
 } // namespace quarn::gltf

@@ -53,13 +53,6 @@ std::uint64_t memoryOfVertex(const Primitive& primitive) {
 
 } // namespace
 
-Result<void> Meshes::take(std::uint64_t count, std::uint64_t bytes_each, const char* what) {
-    const std::uint64_t most = UINT64_MAX / bytes_each;
-    const Result<void> taken =
-        m_source.reading.budget.take(std::min(count, most) * bytes_each, what);
-    return taken ? taken : tooLarge(m_source.reading, taken.message());
-}
-
 Result<SourceMesh> Meshes::read(const Json& json, const std::string& name, const Pose& pose) {
     SourceMesh piece;
     if (!hasPositions(json)) {
@@ -99,8 +92,9 @@ Result<void> Meshes::readTriangles(const Primitive& primitive, const ReadMateria
         return tooLarge(m_source.reading,
                         "one of its meshes has " + std::to_string(all) + " triangles");
     const std::uint64_t used = std::min(primitive.positions.count, 3 * all);
-    for (const Result<void>& taken : {take(all, MEMORY_OF_TRIANGLE, "triangles"),
-                                      take(used, memoryOfVertex(primitive), "vertices")})
+    for (const Result<void>& taken :
+         {takeMemory(m_source.reading, all, MEMORY_OF_TRIANGLE, "triangles"),
+          takeMemory(m_source.reading, used, memoryOfVertex(primitive), "vertices")})
         if (!taken)
             return taken;
     ReadTriangles read = readTrianglesOf(primitive, deformation, material.texture_place);
@@ -120,7 +114,8 @@ Result<void> Meshes::readLines(const Primitive& primitive, const Deformation& de
                                Losses& losses, SourceMesh& piece) {
     const std::uint64_t corners = cornersOf(primitive);
     const std::uint64_t all = segmentsOf(primitive.mode, corners);
-    if (const Result<void> taken = take(all, MEMORY_OF_SEGMENT, "lines"); !taken)
+    if (const Result<void> taken = takeMemory(m_source.reading, all, MEMORY_OF_SEGMENT, "lines");
+        !taken)
         return taken;
     losses = {0, all, "lines"};
     std::vector<LineSegment> segments;
@@ -147,7 +142,8 @@ Result<void> Meshes::readLines(const Primitive& primitive, const Deformation& de
 Result<void> Meshes::readPoints(const Primitive& primitive, const Deformation& deformation,
                                 Losses& losses, SourceMesh& piece) {
     const std::uint64_t all = cornersOf(primitive);
-    if (const Result<void> taken = take(all, MEMORY_OF_POINT, "points"); !taken)
+    if (const Result<void> taken = takeMemory(m_source.reading, all, MEMORY_OF_POINT, "points");
+        !taken)
         return taken;
     losses = {0, all, "points"};
     for (std::uint64_t i = 0; i < all; ++i) {

@@ -39,7 +39,6 @@ private:
                            Losses& losses, SourceMesh& piece);
     Result<void> readPoints(const Primitive& primitive, const Deformation& deformation,
                             Losses& losses, SourceMesh& piece);
-    Result<void> take(std::uint64_t count, std::uint64_t bytes_each, const char* what);
 
     const PrimitiveSource& m_source;
     Materials& m_materials;

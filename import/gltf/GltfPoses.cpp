@@ -113,11 +113,10 @@ Result<std::vector<KM_Xform>> instancesAt(const PoseSource& source, const Json& 
             return found.error();
     const std::uint64_t stated = std::min({moves.count(), turns.count(), scales.count()});
     const std::uint64_t count = stated == UINT64_MAX && attributes.is_null() ? 1 : stated;
-    const std::uint64_t most = UINT64_MAX / std::max<std::uint64_t>(most_memory_each, 1);
-    const Result<void> taken =
-        source.reading.budget.take(std::min(count, most) * most_memory_each, "repeated objects");
-    if (!taken)
-        return tooLarge(source.reading, taken.message());
+    if (const Result<void> taken =
+            takeMemory(source.reading, count, most_memory_each, "repeated objects");
+        !taken)
+        return taken.error();
     std::vector<KM_Xform> places(count);
     for (std::uint64_t i = 0; i < count; ++i) {
         double move[3] = {0, 0, 0};

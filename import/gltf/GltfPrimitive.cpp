@@ -102,13 +102,11 @@ private:
         if (!positions || !indices)
             return positions ? indices.error() : positions.error();
         const DracoLimits limits{positions.value().count, indices.value().count};
-        const std::uint64_t most = UINT64_MAX / 512;
-        const Result<void> taken =
-            m_source.reading.budget.take(std::min(limits.vertices, most) * MEMORY_OF_VERTEX +
-                                             std::min(limits.indices, most) * MEMORY_OF_INDEX,
-                                         "compressed meshes");
-        if (!taken)
-            return tooLarge(m_source.reading, taken.message());
+        for (const Result<void>& taken :
+             {takeMemory(m_source.reading, limits.vertices, MEMORY_OF_VERTEX, "compressed meshes"),
+              takeMemory(m_source.reading, limits.indices, MEMORY_OF_INDEX, "compressed meshes")})
+            if (!taken)
+                return taken.error();
         return limits;
     }
 

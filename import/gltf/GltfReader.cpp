@@ -161,8 +161,8 @@ bool isOld(const Json& json) {
 
 Result<SourceScene> readParts(const ModelReading& reading, const Container& parts) {
     const std::uint64_t memory = memoryOfJson(parts.text);
-    if (const Result<void> taken = reading.budget.take(memory, "descriptions"); !taken)
-        return tooLarge(reading, taken.message());
+    if (const Result<void> taken = takeMemory(reading, memory, 1, "descriptions"); !taken)
+        return taken.error();
     const Result<Json> json = parseJson(parts.text);
     if (!json)
         return damaged(reading, json.message());
