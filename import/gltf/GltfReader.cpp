@@ -58,8 +58,12 @@ private:
     Result<void> readNode(std::uint64_t index) {
         const Json& node = element(member(m_json, "nodes"), index);
         const KM_Xform& world_from_node = m_nodes.world_from_node[index];
-        if (auto camera = cameraOf(m_json, node, world_from_node))
+        if (auto camera = cameraOf(m_json, node, world_from_node)) {
+            const std::wstring number = std::to_wstring(m_result.cameras.size() + 1);
+            if (camera->name.IsEmpty())
+                camera->name = KM_wString(L"Camera " + number);
             m_result.cameras.push_back(std::move(*camera));
+        }
         if (auto light = lightOf(m_json, node, world_from_node))
             m_result.lights.push_back(std::move(*light));
         const auto mesh = wholeNumber(member(node, "mesh"));

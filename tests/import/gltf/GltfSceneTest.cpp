@@ -171,6 +171,7 @@ TEST(GltfCamera, TakesItsPlaceFromItsNodeAndItsAngleFromTheHeight) {
     ASSERT_TRUE(door.GetFrustum(&left, &right, &bottom, &top, &near, &far));
     EXPECT_NEAR(top / near, 0.5, 1e-9);
     EXPECT_NEAR(right / near, 1.0, 1e-9);
+    EXPECT_EQ(model.cameras[1].name, L"Camera 2");
     const KM_Viewport& parallel = model.cameras[1].viewport;
     ASSERT_TRUE(parallel.GetFrustum(&left, &right, &bottom, &top, &near, &far));
     EXPECT_TRUE(parallel.IsParallelProjection());
