@@ -72,7 +72,8 @@ private:
         const Result<Pieces> pieces = piecesOf(index, node, *mesh);
         if (!pieces)
             return pieces.error();
-        return place(node, world_from_node, pieces.value());
+        return pieces.value().empty() ? Result<void>()
+                                      : place(node, world_from_node, pieces.value());
     }
 
     PoseSource poses() { return {m_reading, m_json, m_nodes, m_accessors}; }

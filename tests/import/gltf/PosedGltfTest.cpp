@@ -158,6 +158,8 @@ TEST(GltfInstances, OfACountThatNothingHoldsAreRefused) {
     EXPECT_THAT(gltf.refusal(), HasSubstr("accessor 1 is out of range"));
     gltf.json["accessors"][list].erase("bufferView");
     EXPECT_THAT(gltf.refusal(), HasSubstr("its repeated objects need"));
+    gltf.json["meshes"][0]["primitives"] = Json::array();
+    EXPECT_THAT(gltf.refusal(), HasSubstr("it holds no triangles"));
 }
 
 } // namespace
