@@ -99,8 +99,7 @@ Result<MappedFile> mapFile(const std::filesystem::path& path) {
         return size.error();
     if (size.value() == 0) // which cannot be mapped
         return MappedFile(nullptr, 0);
-    void* const bytes =
-        mmap(nullptr, size.value(), PROT_READ, MAP_PRIVATE, file.descriptor(), 0);
+    void* const bytes = mmap(nullptr, size.value(), PROT_READ, MAP_PRIVATE, file.descriptor(), 0);
     if (bytes == MAP_FAILED)
         return reason(errno);
     return MappedFile(static_cast<const std::uint8_t*>(bytes), size.value());

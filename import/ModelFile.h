@@ -24,7 +24,8 @@ struct ReadingOptions {
 
 /// Reads a model file; docs/model-files.md says what is kept of each format.
 ///
-/// - Coordinates are in the file's own units, with Z up: files that are Y-up are turned, with Y to Z
+/// - Coordinates are in the file's own units, with Z up: files that are Y-up are turned, with Y to
+/// Z
 ///   and Z to -Y.
 /// - The transforms of the file's nodes are applied. A mesh that stands in a scene ten times
 ///   becomes ten objects that share it, each with its transform; where a mesh stands once, its

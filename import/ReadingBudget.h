@@ -16,7 +16,8 @@ public:
     explicit ReadingBudget(std::uint64_t bytes) : m_bytes(bytes) {}
 
     /// @param what  what the memory is for, in the plural: "textures", "triangles"
-    /// @return an error whose message is why not, a part of a sentence, where that much is not left;
+    /// @return an error whose message is why not, a part of a sentence, where that much is not
+    /// left;
     ///   then nothing was taken
     Result<void> take(std::uint64_t bytes, std::string_view what);
     void giveBack(std::uint64_t bytes) { m_taken -= bytes; }

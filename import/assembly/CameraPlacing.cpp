@@ -27,7 +27,8 @@ void setOpening(const SourceCamera& camera, KM_Viewport& viewport) {
 
 } // namespace
 
-std::optional<ImportedCamera> placeCamera(const SourceCamera& camera, const KM_BoundingBox& bounds) {
+std::optional<ImportedCamera> placeCamera(const SourceCamera& camera,
+                                          const KM_BoundingBox& bounds) {
     const KM_3dPoint& location = camera.location;
     KM_3dVector direction = camera.direction;
     ImportedCamera placed;

@@ -15,8 +15,9 @@ bool isUsableCoordinate(double coordinate);
 bool isFlattening(const KM_Xform& xform);
 
 /// Moves a mesh by a matrix that may also flatten it, which KM_Mesh::Transform refuses. One that
-/// mirrors turns the triangles round, so that their outside stays outside. Normals stay unit vectors
-/// or become zero; triangles with a vertex that would leave single precision are taken away.
+/// mirrors turns the triangles round, so that their outside stays outside. Normals stay unit
+/// vectors or become zero; triangles with a vertex that would leave single precision are taken
+/// away.
 /// @return how many triangles were
 std::size_t placeMesh(KM_Mesh& mesh, const KM_Xform& xform);
 

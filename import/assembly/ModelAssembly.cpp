@@ -54,7 +54,8 @@ public:
             return Error{"its meshes have more than 100 million triangles in all"};
         m_origin = nearbyOrigin(box());
         for (std::size_t done = 0; done < m_scene.places.size(); ++done) {
-            const double share = static_cast<double>(done) / static_cast<double>(m_scene.places.size());
+            const double share =
+                static_cast<double>(done) / static_cast<double>(m_scene.places.size());
             if (!m_reading.watch.goesOn(ReadingStep::made, share))
                 return Error{"it was given up"};
             placePiece(m_scene.places[done]);

@@ -1,7 +1,7 @@
 #include "import/library/FaceIndexCheck.h"
 
-#include "import/library/LineReader.h"
 #include "import/files/ModelFileCheck.h"
+#include "import/library/LineReader.h"
 #include "import/library/PlyHeader.h"
 
 #include <charconv>

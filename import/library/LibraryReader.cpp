@@ -1,12 +1,12 @@
 #include "import/library/LibraryReader.h"
 
+#include "import/files/LargeStack.h"
+#include "import/files/ModelFileCheck.h"
 #include "import/library/CoordinateShift.h"
 #include "import/library/FaceIndexCheck.h"
 #include "import/library/GltfExtensions.h"
 #include "import/library/GltfLosses.h"
-#include "import/files/LargeStack.h"
 #include "import/library/ModelFileAccess.h"
-#include "import/files/ModelFileCheck.h"
 #include "import/library/PlainWords.h"
 #include "import/library/SceneReading.h"
 #include "import/library/SceneRepair.h"
@@ -150,9 +150,9 @@ Replacement replacementFor(const fs::path& path) {
     return {utf8OfWideFile(path), KM_3dPoint::Origin};
 }
 
-Result<SourceScene> takeChecked(Assimp::Importer& importer, const fs::path& path,
-                                const ModelFolder& folder, const ModelConventions& conventions,
-                                const BesideReading& beside) {
+Result<SourceScene> takeChecked(Assimp::Importer& importer, const ModelReading& reading,
+                                const ModelConventions& conventions, const BesideReading& beside) {
+    const fs::path& path = reading.path;
     std::vector<std::string> warnings;
     if (beside.gltf) {
         warnings = tellLostFaces(sceneOf(importer), *beside.gltf);
@@ -168,7 +168,7 @@ Result<SourceScene> takeChecked(Assimp::Importer& importer, const fs::path& path
     }
     const std::unique_ptr<aiScene> scene(importer.GetOrphanedScene());
     importer.FreeScene();
-    SourceScene taken = takeScene(*scene, folder, conventions);
+    SourceScene taken = takeScene(*scene, reading, conventions);
     taken.warnings.insert(taken.warnings.begin(), warnings.begin(), warnings.end());
     return taken;
 }
@@ -199,8 +199,7 @@ Result<SourceScene> readChecked(const ModelReading& reading) {
     const std::string format = modelFormat(path);
     ModelConventions conventions = conventionsOf(sceneOf(importer), format);
     conventions.origin = replacement.origin;
-    Result<SourceScene> scene =
-        takeChecked(importer, path, reading.folder, conventions, beside.get());
+    Result<SourceScene> scene = takeChecked(importer, reading, conventions, beside.get());
     if (!scene) {
         return scene;
     }
@@ -218,8 +217,8 @@ Result<SourceScene> readWithLibrary(const ModelReading& reading) {
         try {
             scene = readChecked(reading);
         } catch (const std::bad_alloc&) {
-            scene = cannotReadModel(reading.path, "there is not enough memory",
-                                    "Use a smaller model.");
+            scene =
+                cannotReadModel(reading.path, "there is not enough memory", "Use a smaller model.");
         } catch (const std::exception& failure) {
             scene = cannotReadModel(reading.path, inPlainWords(failure.what()), repair);
         }

@@ -1,8 +1,7 @@
 #include "import/library/MaterialReading.h"
 
-#include "import/textures/OpacityMap.h"
 #include "import/assembly/StoredColor.h"
-#include "import/textures/TextureDecoding.h"
+#include "import/textures/TextureTransparency.h"
 
 #include <assimp/GltfMaterial.h>
 #include <assimp/material.h>
@@ -80,26 +79,6 @@ aiColor4D baseColorOf(const aiMaterial& source) {
     return color;
 }
 
-/// What a texture or vertices let through.
-enum class Transparency { none, holes, partial };
-
-/// Soft borders of holes do not make a texture of leaves one of glass.
-Transparency transparencyOf(const Texture& texture) {
-    constexpr std::size_t border_share = 10;
-    std::size_t clear = 0;
-    std::size_t partial = 0;
-    for (std::size_t i = 3; i < texture.rgba.size(); i += 4) {
-        const std::uint8_t alpha = texture.rgba[i];
-        clear += alpha < 16 ? 1 : 0;
-        partial += alpha >= 16 && alpha < 240 ? 1 : 0;
-    }
-    if (clear == 0 && partial == 0) {
-        return Transparency::none;
-    }
-    return partial * border_share > texture.rgba.size() / 4 ? Transparency::partial
-                                                            : Transparency::holes;
-}
-
 bool isSeeThrough(const aiMesh& mesh) {
     return mesh.mColors[0] != nullptr &&
            std::any_of(mesh.mColors[0], mesh.mColors[0] + mesh.mNumVertices,
@@ -157,16 +136,11 @@ std::shared_ptr<Texture> textureFromPixels(const aiTexture& source) {
     return texture;
 }
 
-Result<Texture> decodeEmbedded(const aiTexture& source) {
-    const auto* bytes = reinterpret_cast<const std::uint8_t*>(source.pcData);
-    return decodeTexture({bytes, source.mWidth});
-}
-
 } // namespace
 
-MaterialReading::MaterialReading(const aiScene& scene, const ModelFolder& folder,
+MaterialReading::MaterialReading(const aiScene& scene, const ModelReading& reading,
                                  bool linear_colors, std::vector<std::string>& warnings)
-    : m_scene(scene), m_folder(folder), m_linear_colors(linear_colors), m_warnings(warnings) {}
+    : m_scene(scene), m_linear_colors(linear_colors), m_textures(reading, warnings) {}
 
 const ReadMaterial& MaterialReading::at(unsigned index) {
     const auto found = m_materials.find(index);
@@ -209,7 +183,7 @@ void MaterialReading::readTexture(const aiMaterial& source, ReadMaterial& result
     result.texture_coordinates = reference.coordinates;
     result.texture_place = m_linear_colors ? texturePlaceOf(source) : TexturePlace();
     material.base_color_texture =
-        texture({reference.name, wrapOf(reference.modes[0]), wrapOf(reference.modes[1])});
+        texture(reference.name, {wrapOf(reference.modes[0]), wrapOf(reference.modes[1])});
     KM_Color& color = material.base_color;
     if (material.base_color_texture != nullptr && color.r == 0 && color.g == 0 && color.b == 0) {
         // Many programs write black where the texture alone gives the colour.
@@ -224,7 +198,7 @@ void MaterialReading::readOpacityMap(const aiMaterial& source, ReadMaterial& res
         return;
     }
     const auto opacity =
-        texture({reference.name, wrapOf(reference.modes[0]), wrapOf(reference.modes[1])});
+        texture(reference.name, {wrapOf(reference.modes[0]), wrapOf(reference.modes[1])});
     std::shared_ptr<const Texture>& colors = result.material->base_color_texture;
     if (opacity == nullptr) {
         return;
@@ -232,65 +206,20 @@ void MaterialReading::readOpacityMap(const aiMaterial& source, ReadMaterial& res
     if (colors == nullptr) {
         result.texture_coordinates = reference.coordinates;
     }
-    std::shared_ptr<const Texture>& both = m_with_opacity[{colors, opacity}];
-    if (both == nullptr) {
-        both = withOpacity(colors.get(), *opacity);
-    }
-    colors = both;
+    colors = m_textures.combined(colors, opacity);
 }
 
-std::shared_ptr<const Texture> MaterialReading::texture(const TextureKey& key) {
-    const auto found = m_textures.find(key);
-    if (found != m_textures.end()) {
-        return found->second;
-    }
-    const auto& [reference, wrap_u, wrap_v] = key;
-    std::shared_ptr<Texture> loaded = load(reference);
-    if (loaded != nullptr) {
-        loaded->wrap_u = wrap_u;
-        loaded->wrap_v = wrap_v;
-    }
-    m_textures.emplace(key, loaded);
-    return loaded;
-}
-
-std::shared_ptr<Texture> MaterialReading::load(const std::string& reference) {
+std::shared_ptr<const Texture> MaterialReading::texture(const std::string& reference,
+                                                        TextureWraps wraps) {
     const aiTexture* embedded = m_scene.GetEmbeddedTexture(reference.c_str());
     if (embedded == nullptr || embedded->pcData == nullptr) {
-        return loadFile(reference);
+        return m_textures.fromFile(reference, wraps);
     }
     if (embedded->mHeight > 0) {
-        return textureFromPixels(*embedded);
+        return m_textures.keep(reference, textureFromPixels(*embedded), wraps);
     }
-    Result<Texture> decoded = decodeEmbedded(*embedded);
-    if (!decoded) {
-        warnLeftOut(reference, decoded.message());
-        return nullptr;
-    }
-    return std::make_shared<Texture>(std::move(decoded.value()));
-}
-
-std::shared_ptr<Texture> MaterialReading::loadFile(const std::string& reference) {
-    const auto path = m_folder.find(reference);
-    if (!path) {
-        warnLeftOut(reference, m_folder.leadsOutside(reference)
-                                   ? "it lies outside the model's folder; copy it beside the model"
-                                   : "there is no such file beside the model");
-        return nullptr;
-    }
-    Result<Texture> decoded = readTextureFile(*path);
-    if (!decoded) {
-        warnLeftOut(reference, decoded.message());
-        return nullptr;
-    }
-    return std::make_shared<Texture>(std::move(decoded.value()));
-}
-
-void MaterialReading::warnLeftOut(const std::string& reference, const std::string& why) {
-    if (!m_told.insert(reference).second) {
-        return; // other materials use it otherwise
-    }
-    m_warnings.push_back("The texture '" + reference + "' was left out: " + why + ".");
+    const auto* bytes = reinterpret_cast<const std::uint8_t*>(embedded->pcData);
+    return m_textures.fromBytes(reference, {bytes, embedded->mWidth}, wraps);
 }
 
 } // namespace quarn

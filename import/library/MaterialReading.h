@@ -1,15 +1,12 @@
 #pragma once
 
 #include "engine/scene/Material.h"
-#include "import/files/ModelFolder.h"
 #include "import/textures/TexturePlace.h"
+#include "import/textures/TextureStore.h"
 
 #include <map>
 #include <memory>
-#include <set>
 #include <string>
-#include <tuple>
-#include <utility>
 #include <vector>
 
 struct aiMaterial;
@@ -29,35 +26,24 @@ struct ReadMaterial {
 class MaterialReading {
 public:
     /// @param scene          outlives this object, with its materials and textures
-    /// @param folder         outlives this object
+    /// @param reading        outlives this object
     /// @param linear_colors  the file's base colours are linear light
     /// @param warnings       receives a sentence for each texture that is left out; outlives this
-    MaterialReading(const aiScene& scene, const ModelFolder& folder, bool linear_colors,
+    MaterialReading(const aiScene& scene, const ModelReading& reading, bool linear_colors,
                     std::vector<std::string>& warnings);
 
     const ReadMaterial& at(unsigned index);
 
 private:
-    using TextureKey = std::tuple<std::string, TextureWrap, TextureWrap>;
-
     ReadMaterial read(const aiMaterial& source);
     void readTexture(const aiMaterial& source, ReadMaterial& result);
     void readOpacityMap(const aiMaterial& source, ReadMaterial& result);
-    std::shared_ptr<const Texture> texture(const TextureKey& key);
-    std::shared_ptr<Texture> load(const std::string& reference);
-    std::shared_ptr<Texture> loadFile(const std::string& reference);
-    void warnLeftOut(const std::string& reference, const std::string& why);
+    std::shared_ptr<const Texture> texture(const std::string& reference, TextureWraps wraps);
 
     const aiScene& m_scene;
-    const ModelFolder& m_folder;
     bool m_linear_colors;
-    std::vector<std::string>& m_warnings;
+    TextureStore m_textures;
     std::map<unsigned, ReadMaterial> m_materials;
-    std::map<TextureKey, std::shared_ptr<const Texture>> m_textures;
-    using TexturePair = std::pair<std::shared_ptr<const Texture>, std::shared_ptr<const Texture>>;
-    std::map<TexturePair, std::shared_ptr<const Texture>>
-        m_with_opacity;           ///< by colours and opacity
-    std::set<std::string> m_told; ///< textures that were left out
 };
 
 } // namespace quarn

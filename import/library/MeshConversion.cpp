@@ -55,8 +55,7 @@ public:
           m_has_normals(reading.keep_normals && source.mNormals != nullptr),
           m_has_texture(reading.texture_coordinates < AI_MAX_NUMBER_OF_TEXTURECOORDS &&
                         source.mTextureCoords[reading.texture_coordinates] != nullptr),
-          m_has_colors(source.mColors[0] != nullptr),
-          m_weld(mayShareNothing(source)),
+          m_has_colors(source.mColors[0] != nullptr), m_weld(mayShareNothing(source)),
           m_table(m_weld ? source.mNumVertices / usual_sharing : 0) {}
 
     ConvertedMesh read() {

@@ -1,9 +1,9 @@
 #include "import/library/SceneReading.h"
 
 #include "import/assembly/MeshPlacing.h"
+#include "import/assembly/PolylineChains.h"
 #include "import/library/MaterialReading.h"
 #include "import/library/MeshConversion.h"
-#include "import/assembly/PolylineChains.h"
 
 #include <assimp/camera.h>
 #include <assimp/mesh.h>
@@ -84,9 +84,9 @@ private:
 
 class SceneReader {
 public:
-    SceneReader(aiScene& scene, const ModelFolder& folder, const ModelConventions& conventions)
+    SceneReader(aiScene& scene, const ModelReading& reading, const ModelConventions& conventions)
         : m_scene(scene), m_conventions(conventions),
-          m_materials(scene, folder, conventions.linear_colors, m_result.warnings) {}
+          m_materials(scene, reading, conventions.linear_colors, m_result.warnings) {}
 
     SourceScene read() {
         m_nodes = placedNodes(m_scene.mRootNode);
@@ -318,9 +318,9 @@ private:
 
 } // namespace
 
-SourceScene takeScene(aiScene& scene, const ModelFolder& folder,
-                                const ModelConventions& conventions) {
-    return SceneReader(scene, folder, conventions).read();
+SourceScene takeScene(aiScene& scene, const ModelReading& reading,
+                      const ModelConventions& conventions) {
+    return SceneReader(scene, reading, conventions).read();
 }
 
 } // namespace quarn

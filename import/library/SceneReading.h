@@ -1,7 +1,6 @@
 #pragma once
 
-#include "import/assembly/SourceScene.h"
-#include "import/files/ModelFolder.h"
+#include "import/ModelReading.h"
 
 struct aiScene;
 
@@ -20,7 +19,7 @@ struct ModelConventions {
 /// Takes a scene of the reading library apart. Each mesh's memory is freed as soon as it has been
 /// converted, so that the scene and its copy never stand in memory together; the scene is useless
 /// afterwards.
-SourceScene takeScene(aiScene& scene, const ModelFolder& folder,
+SourceScene takeScene(aiScene& scene, const ModelReading& reading,
                       const ModelConventions& conventions);
 
 } // namespace quarn

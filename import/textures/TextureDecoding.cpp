@@ -1,9 +1,9 @@
 #include "import/textures/TextureDecoding.h"
 
-#include <fstream>
+#include "ground/FileBytes.h"
+
 #include <memory>
 #include <string_view>
-#include <vector>
 
 #define STB_IMAGE_STATIC
 #define STB_IMAGE_IMPLEMENTATION
@@ -46,7 +46,7 @@ const char* whyUnknown(std::span<const std::uint8_t> bytes) {
 
 } // namespace
 
-Result<Texture> decodeTexture(std::span<const std::uint8_t> bytes) {
+Result<Texture> decodeTexture(std::span<const std::uint8_t> bytes, ReadingBudget& budget) {
     if (bytes.size() > most_bytes) {
         return Error{"it is larger than 256 MB"};
     }
@@ -60,11 +60,15 @@ Result<Texture> decodeTexture(std::span<const std::uint8_t> bytes) {
     if (static_cast<std::int64_t>(width) * height > most_pixels) {
         return Error{too_large};
     }
+    const std::size_t byte_count = 4 * static_cast<std::size_t>(width) * height;
+    if (const Result<void> taken = budget.take(byte_count, "textures"); !taken) {
+        return taken.error();
+    }
     const Pixels pixels(stbi_load_from_memory(bytes.data(), size, &width, &height, &channels, 4));
     if (pixels == nullptr) {
+        budget.giveBack(byte_count);
         return Error{"the picture is damaged"};
     }
-    const std::size_t byte_count = 4 * static_cast<std::size_t>(width) * height;
     Texture texture;
     texture.width = width;
     texture.height = height;
@@ -72,20 +76,12 @@ Result<Texture> decodeTexture(std::span<const std::uint8_t> bytes) {
     return texture;
 }
 
-Result<Texture> readTextureFile(const std::filesystem::path& path) {
-    std::error_code failure;
-    const std::uintmax_t size = std::filesystem::file_size(path, failure);
-    std::ifstream file(path, std::ios::binary);
-    if (failure || !file) {
-        return Error{"it cannot be opened"};
+Result<Texture> readTextureFile(const std::filesystem::path& path, ReadingBudget& budget) {
+    const Result<FileBytes> file = readFileBytes(path, most_bytes);
+    if (!file) {
+        return file.error();
     }
-    if (size > most_bytes) {
-        return Error{"it is larger than 256 MB"};
-    }
-    std::vector<std::uint8_t> bytes(size);
-    file.read(reinterpret_cast<char*>(bytes.data()), static_cast<std::streamsize>(size));
-    bytes.resize(static_cast<std::size_t>(file.gcount()));
-    return decodeTexture(bytes);
+    return decodeTexture(file.value().bytes(), budget);
 }
 
 } // namespace quarn
