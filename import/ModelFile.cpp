@@ -6,6 +6,8 @@
 #include "import/files/ModelFileCheck.h"
 #include "import/gltf/GltfReader.h"
 #include "import/library/LibraryReader.h"
+#include "import/ply/PlyReader.h"
+#include "import/stl/StlReader.h"
 
 #include <exception>
 #include <new>
@@ -26,8 +28,9 @@ struct Format {
 
 /// The formats that have a reader of their own.
 constexpr Format FORMATS[] = {
-    {"brep", readBrep}, {"glb", readGltf},  {"gltf", readGltf}, {"iges", readIges},
-    {"igs", readIges},  {"step", readStep}, {"stp", readStep},
+    {"brep", readBrep}, {"glb", readGltf}, {"gltf", readGltf},
+    {"iges", readIges}, {"igs", readIges}, {"ply", readPly},
+    {"step", readStep}, {"stl", readStl},  {"stp", readStep},
 };
 
 Reader readerOf(const std::string& extension) {

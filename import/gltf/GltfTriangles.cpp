@@ -1,7 +1,7 @@
 #include "import/gltf/GltfTriangles.h"
 
+#include "import/assembly/MeshCleaning.h"
 #include "import/assembly/StoredColor.h"
-#include "import/assembly/VertexWelding.h"
 
 #include <tbb/parallel_for.h>
 
@@ -28,10 +28,6 @@ std::array<std::uint64_t, 3> cornersOf(PrimitiveMode mode, std::uint64_t triangl
     }
 }
 
-bool isFinite(const KM_3fPoint& p) {
-    return std::isfinite(p.x) && std::isfinite(p.y) && std::isfinite(p.z);
-}
-
 float finiteOrZero(double number) {
     const auto single = static_cast<float>(number);
     return std::isfinite(single) ? single + 0.0F : 0.0F;
@@ -48,12 +44,9 @@ public:
         const std::uint64_t in_range = m_mesh->m_F.size();
         selectVertices();
         readVertices();
-        const bool has_unusable = dropUnusable();
-        const bool shares_little = m_mesh->m_V.size() > m_mesh->m_F.size();
-        if (shares_little)
-            weldVertices(*m_mesh);
-        else if (has_unusable || m_has_unused)
+        if (dropUnusableTriangles(*m_mesh) > 0 || m_has_unused)
             dropUnusedVertices(*m_mesh);
+        weldSparseMesh(*m_mesh);
         return {std::move(m_mesh), in_range};
     }
 
@@ -146,18 +139,6 @@ private:
         const std::size_t given = m_primitive.colors->components >= 4 ? 4 : 3;
         m_primitive.colors->read(vertex, std::span(c).first(given));
         return colorFromLinear(c[0], c[1], c[2], c[3]);
-    }
-
-    /// @return whether there was any
-    bool dropUnusable() {
-        std::vector<KM_3fPoint>& places = m_mesh->m_V;
-        if (std::ranges::all_of(places, isFinite))
-            return false;
-        std::erase_if(m_mesh->m_F, [&](const KM_MeshTriangle& face) {
-            return std::ranges::any_of(face.vi,
-                                       [&](std::uint32_t v) { return !isFinite(places[v]); });
-        });
-        return true;
     }
 
     const Primitive& m_primitive;

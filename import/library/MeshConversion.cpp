@@ -1,7 +1,7 @@
 #include "import/library/MeshConversion.h"
 
+#include "import/assembly/MeshCleaning.h"
 #include "import/assembly/StoredColor.h"
-#include "import/assembly/VertexWelding.h"
 
 #include <assimp/mesh.h>
 
@@ -28,12 +28,6 @@ bool isUsable(const aiVector3D& p) {
 
 float finiteOrZero(float number) {
     return std::isfinite(number) ? number + 0.0F : 0.0F;
-}
-
-/// Polygons of n corners are n - 2 triangles by now, so where no two share a vertex there are more
-/// vertices than triangles. In a mesh whose polygons share them there are half as many.
-bool mayShareNothing(const aiMesh& mesh) {
-    return mesh.mNumVertices > mesh.mNumFaces;
 }
 
 template <class Element, class Source, class Convert>
@@ -76,10 +70,8 @@ ConvertedMesh convertTriangles(const aiMesh& source, const MeshReading& reading)
     for (const aiFace& face : std::span(source.mFaces, source.mNumFaces))
         if (isUsable(source, face))
             mesh->m_F.push_back({{face.mIndices[0], face.mIndices[1], face.mIndices[2]}});
-    if (mayShareNothing(source))
-        weldVertices(*mesh);
-    else
-        dropUnusedVertices(*mesh);
+    dropUnusedVertices(*mesh);
+    weldSparseMesh(*mesh);
     return {mesh, source.mNumFaces - mesh->m_F.size()};
 }
 
