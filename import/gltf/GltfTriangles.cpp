@@ -44,8 +44,8 @@ public:
         const std::uint64_t in_range = m_mesh->m_F.size();
         selectVertices();
         readVertices();
-        if (dropUnusableTriangles(*m_mesh) > 0 || m_has_unused)
-            dropUnusedVertices(*m_mesh);
+        dropUnusableTriangles(*m_mesh);
+        dropUnusedVertices(*m_mesh);
         weldSparseMesh(*m_mesh);
         return {std::move(m_mesh), in_range};
     }
@@ -84,10 +84,8 @@ private:
         const std::uint64_t vertices = m_primitive.positions.count;
         std::vector<KM_MeshTriangle>& faces = m_mesh->m_F;
         m_count = vertices;
-        if (3 * faces.size() >= vertices) {
-            m_has_unused = hasUnused(vertices);
+        if (3 * faces.size() >= vertices)
             return;
-        }
         for (const KM_MeshTriangle& face : faces)
             m_selected.insert(m_selected.end(), std::begin(face.vi), std::end(face.vi));
         std::ranges::sort(m_selected);
@@ -97,14 +95,6 @@ private:
             for (std::uint32_t& v : face.vi)
                 v = static_cast<std::uint32_t>(std::ranges::lower_bound(m_selected, v) -
                                                m_selected.begin());
-    }
-
-    bool hasUnused(std::uint64_t vertices) const {
-        std::vector<bool> is_used(vertices, false);
-        for (const KM_MeshTriangle& face : m_mesh->m_F)
-            for (const std::uint32_t v : face.vi)
-                is_used[v] = true;
-        return std::ranges::find(is_used, false) != is_used.end();
     }
 
     template <class Element, class Read>
@@ -147,7 +137,6 @@ private:
     std::shared_ptr<KM_Mesh> m_mesh = std::make_shared<KM_Mesh>();
     std::vector<std::uint32_t> m_selected; ///< the vertices that are read; none: all
     std::uint64_t m_count = 0;             ///< of vertices that are read
-    bool m_has_unused = false;
 };
 
 } // namespace
