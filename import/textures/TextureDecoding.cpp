@@ -1,6 +1,7 @@
 #include "import/textures/TextureDecoding.h"
 
 #include "ground/FileBytes.h"
+#include "import/textures/AvifPicture.h"
 #include "import/textures/PlainPicture.h"
 #include "import/textures/PngPicture.h"
 #include "import/textures/WebpPicture.h"
@@ -19,7 +20,8 @@ constexpr std::uintmax_t MOST_BYTES = 256ULL << 20;
 using Bytes = std::span<const std::uint8_t>;
 
 const PictureFormat* formatOf(Bytes file) {
-    for (const PictureFormat* const format : {&PNG_PICTURES, &WEBP_PICTURES, &PLAIN_PICTURES})
+    for (const PictureFormat* const format :
+         {&PNG_PICTURES, &WEBP_PICTURES, &AVIF_PICTURES, &PLAIN_PICTURES})
         if (format->begins(file))
             return format;
     return nullptr;
@@ -29,12 +31,13 @@ const PictureFormat* formatOf(Bytes file) {
 std::string whyUnknown(Bytes file) {
     const std::string_view head(reinterpret_cast<const char*>(file.data()),
                                 std::min<std::size_t>(file.size(), 12));
-    constexpr std::string_view KNOWN = "those that are read are PNG, JPEG, WebP, BMP, TGA and GIF";
+    constexpr std::string_view KNOWN =
+        "those that are read are PNG, JPEG, WebP, AVIF, BMP, TGA and GIF";
     std::string kind = "it is not a picture of a known kind";
     if (head.substr(0, 7) == "\xABKTX 20" || head.substr(0, 7) == "\xABKTX 11")
         kind = "it is a KTX picture";
     else if (head.ends_with("ftypavif") || head.ends_with("ftypavis"))
-        kind = "it is an AVIF picture";
+        kind = "it is an AVIF picture, for which libavif is not installed";
     return kind + "; " + std::string(KNOWN);
 }
 
