@@ -23,9 +23,11 @@ bool isEmpty(const ImportedModel& model) {
 }
 
 Error nothingLeft(const fs::path& path, const ImportedModel& model) {
-    const std::string why = model.warnings.empty()
-                                ? "it holds no triangles, lines or points"
-                                : "nothing in it can be shown. " + model.warnings.back();
+    std::string why = "it holds no triangles, lines or points";
+    if (!model.warnings.empty())
+        why = "nothing in it can be shown. " + model.warnings.back();
+    if (why.ends_with('.'))
+        why.pop_back(); // the sentence goes on
     return cannotReadModel(path, why, "Export the model again, with its meshes.");
 }
 

@@ -1,8 +1,13 @@
 #include "import/ModelFormats.h"
 
 #include "import/cad/CadReader.h"
+#include "import/gltf/GltfReader.h"
 #include "import/library/LibraryExtensions.h"
 #include "import/library/LibraryReader.h"
+#include "import/obj/ObjReader.h"
+#include "import/off/OffReader.h"
+#include "import/ply/PlyReader.h"
+#include "import/stl/StlReader.h"
 
 #include <algorithm>
 
@@ -18,8 +23,10 @@ struct Format {
 
 /// The formats that have a reader of their own.
 constexpr Format FORMATS[] = {
-    {"brep", readBrep, false}, {"iges", readIges, false}, {"igs", readIges, false},
-    {"step", readStep, false}, {"stp", readStep, false},
+    {"brep", readBrep, false}, {"glb", readGltf, true},  {"gltf", readGltf, true},
+    {"iges", readIges, false}, {"igs", readIges, false}, {"obj", readObj, true},
+    {"off", readOff, true},    {"ply", readPly, true},   {"step", readStep, false},
+    {"stl", readStl, true},    {"stp", readStep, false},
 };
 
 constexpr const char* USUAL[] = {"glb", "gltf", "obj", "fbx", "dae",  "stl",

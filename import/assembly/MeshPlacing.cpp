@@ -1,5 +1,6 @@
 #include "import/assembly/MeshPlacing.h"
 
+#include "import/assembly/MeshCleaning.h"
 #include "import/assembly/VertexNormals.h"
 
 #include <tbb/parallel_for.h>
@@ -65,10 +66,6 @@ bool onlyMoves(const KM_Xform& x) {
     return rest.IsIdentity();
 }
 
-bool isUsable(const KM_3fPoint& p) {
-    return std::isfinite(p.x) && std::isfinite(p.y) && std::isfinite(p.z);
-}
-
 KM_3fPoint placed(const KM_Xform& xform, const KM_3fPoint& vertex) {
     const KM_3dPoint p = xform * vertex.ToDouble();
     const auto single = [](double coordinate) {
@@ -78,17 +75,10 @@ KM_3fPoint placed(const KM_Xform& xform, const KM_3fPoint& vertex) {
     return {single(p.x), single(p.y), single(p.z)};
 }
 
-std::size_t dropUnusable(KM_Mesh& mesh) {
-    if (std::ranges::all_of(mesh.m_V, isUsable))
-        return 0;
-    const std::size_t dropped = std::erase_if(mesh.m_F, [&](const KM_MeshTriangle& triangle) {
-        return !std::ranges::all_of(triangle.vi,
-                                    [&](std::uint32_t v) { return isUsable(mesh.m_V[v]); });
-    });
-    for (KM_3fPoint& vertex : mesh.m_V)
-        if (!isUsable(vertex))
-            vertex = {}; // of no triangle any more
-    return dropped;
+/// A reserve that is small beside what is kept is not worth the copy that would release it.
+template <class Item> void releaseReserve(std::vector<Item>& items) {
+    if (items.capacity() - items.size() > items.size() / 16 + 1)
+        items.shrink_to_fit();
 }
 
 } // namespace
@@ -114,7 +104,7 @@ std::size_t placeMesh(KM_Mesh& mesh, const KM_Xform& xform) {
     if (normals.mirrors())
         for (KM_MeshTriangle& triangle : mesh.m_F)
             std::swap(triangle.vi[1], triangle.vi[2]);
-    return dropUnusable(mesh);
+    return dropUnusableTriangles(mesh);
 }
 
 void completeMesh(KM_Mesh& mesh) {
@@ -122,11 +112,11 @@ void completeMesh(KM_Mesh& mesh) {
         smoothVertexNormals(mesh, crease_angle_deg);
     else
         fillMissingNormals(mesh);
-    mesh.m_V.shrink_to_fit();
-    mesh.m_N.shrink_to_fit();
-    mesh.m_T.shrink_to_fit();
-    mesh.m_C.shrink_to_fit();
-    mesh.m_F.shrink_to_fit();
+    releaseReserve(mesh.m_V);
+    releaseReserve(mesh.m_N);
+    releaseReserve(mesh.m_T);
+    releaseReserve(mesh.m_C);
+    releaseReserve(mesh.m_F);
     mesh.PadForRayTracing();
 }
 

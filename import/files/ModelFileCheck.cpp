@@ -1,9 +1,5 @@
 #include "import/files/ModelFileCheck.h"
 
-#include "import/library/PlyLength.h"
-#include "kelmar/KM_LittleEndian.h"
-
-#include <array>
 #include <cerrno>
 #include <cstdint>
 #include <cstring>
@@ -19,49 +15,7 @@ constexpr std::uintmax_t largest_model_bytes = 4ULL << 30;
 constexpr std::string_view choose_model = "Choose a model file (OBJ, glTF, GLB, PLY, STL, ...).";
 constexpr std::string_view export_again = "Export the model again or restore the file.";
 
-/// The number of four bytes, lowest first.
-std::uint32_t numberAt(const char* bytes) {
-    return kelmar::fromLittleEndian<std::uint32_t>(reinterpret_cast<const std::uint8_t*>(bytes));
-}
-
 /// Why the bytes of a file cannot be what its extension says; empty when nothing speaks against it.
-std::string whyBadStl(std::istream& file, std::uint64_t size) {
-    std::array<char, 84> head{};
-    file.read(head.data(), head.size());
-    const std::string_view begin(head.data(), static_cast<std::size_t>(file.gcount()));
-    if (begin.find("solid") != std::string_view::npos &&
-        begin.find('\0') == std::string_view::npos) {
-        return {}; // text; binary headers are padded with zeros, or their counts contain one
-    }
-    if (size < head.size()) {
-        return "the file is cut short";
-    }
-    const std::uint64_t count = numberAt(&head[80]);
-    const std::uint64_t needed = head.size() + 50 * count;
-    return needed <= size ? std::string()
-                          : "it claims " + std::to_string(count) + " triangles but holds only " +
-                                std::to_string((size - head.size()) / 50);
-}
-
-std::string whyBadGlb(std::istream& file, std::uint64_t size) {
-    std::array<char, 20> head{};
-    file.read(head.data(), head.size());
-    if (std::memcmp(head.data(), "glTF", 4) != 0) {
-        return "it is not a GLB file, whatever its name says";
-    }
-    if (file.gcount() < static_cast<std::streamsize>(head.size())) {
-        return "the file is cut short";
-    }
-    if (numberAt(&head[4]) != 2) {
-        return {}; // an older layout
-    }
-    const std::uint64_t whole_length = numberAt(&head[8]);
-    const std::uint64_t text_length = numberAt(&head[12]);
-    return whole_length <= size && head.size() + text_length <= whole_length
-               ? std::string()
-               : "the lengths in its header do not fit the file's length";
-}
-
 /// The counts stand at the first line that is neither the keyword nor a comment.
 std::string whyBadOff(std::istream& file, std::uint64_t size) {
     constexpr int most_lines = 1000;
@@ -85,16 +39,7 @@ std::string whyBadOff(std::istream& file, std::uint64_t size) {
 
 std::string whyBadBytes(const fs::path& path, std::istream& file, std::uint64_t size) {
     const std::string format = modelFormat(path);
-    if (format == "stl") {
-        return whyBadStl(file, size);
-    }
-    if (format == "glb") {
-        return whyBadGlb(file, size);
-    }
-    if (format == "off") {
-        return whyBadOff(file, size);
-    }
-    return format == "ply" ? whyBadPly(file, size) : std::string();
+    return format == "off" ? whyBadOff(file, size) : std::string();
 }
 
 } // namespace

@@ -7,17 +7,22 @@ namespace quarn {
 
 std::shared_ptr<const Texture> TextureStore::fromFile(const std::string& reference,
                                                       TextureWraps wraps) {
-    const auto found = m_textures.find({reference, wraps});
-    return found != m_textures.end() ? found->second : keep(reference, load(reference), wraps);
+    const auto have = known(reference, wraps);
+    return have ? *have : keep(reference, load(reference), wraps);
 }
 
 std::shared_ptr<const Texture> TextureStore::fromBytes(const std::string& name,
                                                        std::span<const std::uint8_t> bytes,
                                                        TextureWraps wraps) {
-    const auto found = m_textures.find({name, wraps});
-    if (found != m_textures.end())
-        return found->second;
+    if (const auto have = known(name, wraps))
+        return *have;
     return keep(name, decoded(name, decodeTexture(bytes, m_reading.budget)), wraps);
+}
+
+std::optional<std::shared_ptr<const Texture>> TextureStore::known(const std::string& name,
+                                                                  TextureWraps wraps) const {
+    const auto found = m_textures.find({name, wraps});
+    return found != m_textures.end() ? std::optional(found->second) : std::nullopt;
 }
 
 std::shared_ptr<const Texture>
@@ -39,9 +44,11 @@ TextureStore::combined(const std::shared_ptr<const Texture>& colors,
 }
 
 std::shared_ptr<Texture> TextureStore::load(const std::string& reference) {
-    const auto path = m_reading.folder.find(reference);
-    if (path)
-        return decoded(reference, readTextureFile(*path, m_reading.budget));
+    const std::optional<NamedFile> file = m_reading.folder.find(reference);
+    if (file && file->differs_in_case && m_told.insert(reference).second)
+        m_warnings.push_back(otherCaseText(reference, *file));
+    if (file)
+        return decoded(reference, readTextureFile(file->path, m_reading.budget));
     warnLeftOut(reference, m_reading.folder.leadsOutside(reference)
                                ? "it lies outside the model's folder; copy it beside the model"
                                : "there is no such file beside the model");
