@@ -50,7 +50,7 @@ template <class Number> std::optional<Number> takeLeadingNumber(std::string_view
             const std::string_view digits(begin, after);
             const std::size_t exponent = digits.find_first_of("eE");
             const bool is_small =
-                exponent != std::string_view::npos && digits.substr(exponent).starts_with("e-");
+                exponent != std::string_view::npos && digits.substr(exponent + 1).starts_with('-');
             number = is_small ? Number{} : std::numeric_limits<Number>::infinity();
         }
         if (failure == std::errc::invalid_argument)
