@@ -43,7 +43,32 @@ bool isAbsolute(const std::string& text) {
     return drive || text.starts_with('/');
 }
 
+std::string inSmallLetters(std::string text) {
+    for (char& c : text)
+        c = c >= 'A' && c <= 'Z' ? static_cast<char>(c + 32) : c;
+    return text;
+}
+
+/// The first of a folder's names that differs from `name` in case alone.
+std::optional<fs::path> entryOfOtherCase(const fs::path& folder, const fs::path& name) {
+    const std::string wanted = inSmallLetters(name.string());
+    std::optional<fs::path> first;
+    std::error_code failure;
+    for (fs::directory_iterator at(folder, failure), end; !failure && at != end;
+         at.increment(failure)) {
+        const fs::path found = at->path().filename();
+        if (inSmallLetters(found.string()) == wanted && (!first || found < *first))
+            first = found;
+    }
+    return first;
+}
+
 } // namespace
+
+std::string otherCaseText(std::string_view reference, const NamedFile& file) {
+    return "The file '" + file.path.filename().string() + "' was read for '" +
+           std::string(reference) + "': the names differ in capital and small letters.";
+}
 
 ModelFolder::ModelFolder(const fs::path& model_file) {
     std::error_code ignored;
@@ -81,15 +106,36 @@ std::optional<fs::path> ModelFolder::fileInside(const std::string& relative) con
     return path;
 }
 
-std::optional<fs::path> ModelFolder::find(std::string_view reference) const {
+std::optional<fs::path> ModelFolder::fileOfOtherCase(const std::string& relative) const {
+    const fs::path wanted = fs::path(relative).lexically_normal();
+    if (relative.find('\0') != std::string::npos || wanted.is_absolute() ||
+        (!wanted.empty() && *wanted.begin() == ".."))
+        return std::nullopt;
+    fs::path found;
+    for (const fs::path& part : wanted) {
+        std::error_code failure;
+        const bool is_exact = fs::exists(m_folder / found / part, failure);
+        const std::optional<fs::path> entry =
+            is_exact ? part : entryOfOtherCase(m_folder / found, part);
+        if (!entry)
+            return std::nullopt;
+        found /= *entry;
+    }
+    return fileInside(found.string());
+}
+
+std::optional<NamedFile> ModelFolder::find(std::string_view reference) const {
     const std::string text = withSlashes(reference);
     const std::string plain = withoutEscapes(text);
-    for (const std::string& candidate : {text, plain}) {
-        if (auto file = fileInside(candidate)) {
-            return file;
-        }
+    if (auto file = fileInside(text))
+        return NamedFile{*file};
+    for (const std::string& name : {plain, plain.substr(plain.rfind('/') + 1)}) {
+        if (auto file = fileInside(name))
+            return NamedFile{*file};
+        if (auto file = fileOfOtherCase(name))
+            return NamedFile{*file, true};
     }
-    return fileInside(plain.substr(plain.rfind('/') + 1));
+    return std::nullopt;
 }
 
 bool ModelFolder::leadsOutside(std::string_view reference) const {

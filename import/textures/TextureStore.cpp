@@ -39,9 +39,11 @@ TextureStore::combined(const std::shared_ptr<const Texture>& colors,
 }
 
 std::shared_ptr<Texture> TextureStore::load(const std::string& reference) {
-    const auto path = m_reading.folder.find(reference);
-    if (path)
-        return decoded(reference, readTextureFile(*path, m_reading.budget));
+    const std::optional<NamedFile> file = m_reading.folder.find(reference);
+    if (file && file->differs_in_case && m_told.insert(reference).second)
+        m_warnings.push_back(otherCaseText(reference, *file));
+    if (file)
+        return decoded(reference, readTextureFile(file->path, m_reading.budget));
     warnLeftOut(reference, m_reading.folder.leadsOutside(reference)
                                ? "it lies outside the model's folder; copy it beside the model"
                                : "there is no such file beside the model");
