@@ -4,8 +4,9 @@
 #include "import/assembly/ModelAssembly.h"
 #include "import/files/ModelFileCheck.h"
 #include "import/library/LibraryReader.h"
+#include "import/obj/ObjReader.h"
+#include "import/off/OffReader.h"
 
-#include <array>
 #include <exception>
 #include <new>
 #include <string_view>
@@ -24,7 +25,10 @@ struct Format {
 };
 
 /// The formats that have a reader of their own.
-constexpr std::array<Format, 0> FORMATS = {};
+constexpr Format FORMATS[] = {
+    {"obj", readObj},
+    {"off", readOff},
+};
 
 Reader readerOf(const std::string& extension) {
     for (const Format& format : FORMATS)
