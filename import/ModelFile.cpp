@@ -2,6 +2,7 @@
 
 #include "ground/FileBytes.h"
 #include "import/assembly/ModelAssembly.h"
+#include "import/cad/CadReader.h"
 #include "import/files/ModelFileCheck.h"
 #include "import/library/LibraryReader.h"
 #include "import/obj/ObjReader.h"
@@ -26,8 +27,8 @@ struct Format {
 
 /// The formats that have a reader of their own.
 constexpr Format FORMATS[] = {
-    {"obj", readObj},
-    {"off", readOff},
+{"brep", readBrep}, {"iges", readIges}, {"igs", readIges}, {"obj", readObj},
+    {"off", readOff},   {"step", readStep}, {"stp", readStep},
 };
 
 Reader readerOf(const std::string& extension) {
