@@ -27,7 +27,7 @@ struct Format {
 
 /// The formats that have a reader of their own.
 constexpr Format FORMATS[] = {
-{"brep", readBrep}, {"iges", readIges}, {"igs", readIges}, {"obj", readObj},
+    {"brep", readBrep}, {"iges", readIges}, {"igs", readIges}, {"obj", readObj},
     {"off", readOff},   {"step", readStep}, {"stp", readStep},
 };
 
@@ -47,9 +47,11 @@ bool isEmpty(const ImportedModel& model) {
 }
 
 Error nothingLeft(const fs::path& path, const ImportedModel& model) {
-    const std::string why = model.warnings.empty()
-                                ? "it holds no triangles, lines or points"
-                                : "nothing in it can be shown. " + model.warnings.back();
+    std::string why = model.warnings.empty()
+                          ? "it holds no triangles, lines or points"
+                          : "nothing in it can be shown. " + model.warnings.back();
+    if (why.ends_with('.'))
+        why.pop_back(); // another sentence follows
     return cannotReadModel(path, why, "Export the model again, with its meshes.");
 }
 

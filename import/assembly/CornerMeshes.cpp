@@ -78,8 +78,7 @@ CornerMesh CornerMeshes::make(std::span<const FaceCorners> faces,
     m_textures = namingOf(faces, &FaceCorners::textures);
     m_normals = namingOf(faces, &FaceCorners::normals);
     m_colors = namingOf(faces, &FaceCorners::colors);
-    m_has_own =
-        m_textures == Naming::own || m_normals == Naming::own || m_colors == Naming::own;
+    m_has_own = m_textures == Naming::own || m_normals == Naming::own || m_colors == Naming::own;
     m_triangles.reserve(trianglesOf(faces));
     for (const FaceCorners& part : faces)
         addFaces(part);
@@ -101,16 +100,16 @@ CornerMesh CornerMeshes::make(std::span<const FaceCorners> faces,
 
 /// Most files number the parts of a corner alike, or have one part alone.
 CornerMeshes::Naming CornerMeshes::namingOf(std::span<const FaceCorners> faces,
-                                            const std::uint32_t* FaceCorners::* part) const {
+                                            const std::uint32_t* FaceCorners::*part) const {
     bool is_by_place = true;
     bool is_none = true;
     for (const FaceCorners& some : faces) {
         const std::uint32_t* const numbers = some.*part;
         const std::size_t count = cornersOf(some);
         is_none = is_none && (numbers == nullptr || count == 0);
-        is_by_place = is_by_place && (numbers == some.places ||
-                                      (numbers != nullptr &&
-                                       std::equal(numbers, numbers + count, some.places)));
+        is_by_place = is_by_place &&
+                      (numbers == some.places ||
+                       (numbers != nullptr && std::equal(numbers, numbers + count, some.places)));
     }
     return is_none ? Naming::none : is_by_place ? Naming::by_place : Naming::own;
 }

@@ -72,7 +72,7 @@ private:
     enum class Naming { none, by_place, own };
 
     Naming namingOf(std::span<const FaceCorners> faces,
-                    const std::uint32_t* FaceCorners::* part) const;
+                    const std::uint32_t* FaceCorners::*part) const;
     void addFaces(const FaceCorners& faces);
     void addFace(const FaceCorners& faces, std::size_t begin, std::uint32_t corners);
     bool isUsable(std::uint32_t place);
@@ -95,7 +95,7 @@ private:
     Naming m_textures = Naming::none;
     Naming m_normals = Naming::none;
     Naming m_colors = Naming::none;
-    bool m_has_own = false; ///< one of the three is named by numbers of its own
+    bool m_has_own = false;                ///< one of the three is named by numbers of its own
     std::vector<std::uint32_t> m_places;   ///< by vertex
     std::vector<Vertex> m_vertices;        ///< by vertex, where m_has_own
     std::vector<std::uint32_t> m_next;     ///< by vertex, where m_has_own: another of its place

@@ -32,8 +32,7 @@ std::uint32_t hashOf(const KM_Mesh& mesh, std::uint32_t vertex) {
     return hashOfBits(numbers);
 }
 
-template <class Part>
-void keep(std::vector<Part>& parts, const std::vector<std::uint32_t>& kept) {
+template <class Part> void keep(std::vector<Part>& parts, const std::vector<std::uint32_t>& kept) {
     if (parts.empty())
         return;
     for (std::size_t i = 0; i < kept.size(); ++i)
@@ -49,9 +48,8 @@ void weldVertices(KM_Mesh& mesh) {
     std::vector<std::uint32_t> number(mesh.m_V.size());
     for (std::uint32_t v = 0; v < number.size(); ++v) {
         const auto next = static_cast<std::uint32_t>(kept.size());
-        number[v] = table.findOrAdd(hashOf(mesh, v), next, [&](std::uint32_t i) {
-            return areEqual(mesh, kept[i], v);
-        });
+        number[v] = table.findOrAdd(hashOf(mesh, v), next,
+                                    [&](std::uint32_t i) { return areEqual(mesh, kept[i], v); });
         if (number[v] == next)
             kept.push_back(v);
     }

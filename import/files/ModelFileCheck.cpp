@@ -8,7 +8,6 @@
 #include <cstdint>
 #include <cstring>
 #include <fstream>
-#include <sstream>
 
 namespace quarn {
 namespace {
@@ -62,27 +61,6 @@ std::string whyBadGlb(std::istream& file, std::uint64_t size) {
                : "the lengths in its header do not fit the file's length";
 }
 
-/// The counts stand at the first line that is neither the keyword nor a comment.
-std::string whyBadOff(std::istream& file, std::uint64_t size) {
-    constexpr int most_lines = 1000;
-    constexpr std::uint64_t least_bytes_a_line = 6; // three numbers
-    std::string line;
-    for (int i = 0; i < most_lines && std::getline(file, line); ++i) {
-        const std::size_t digits = line.find_first_of("0123456789");
-        const std::size_t letters = line.find_first_not_of("OFFCNST4n \t\r0123456789");
-        if (digits == std::string::npos || letters != std::string::npos) {
-            continue;
-        }
-        std::uint64_t vertices = 0;
-        std::uint64_t faces = 0;
-        std::istringstream(line.substr(digits)) >> vertices >> faces;
-        const std::uint64_t most = size / least_bytes_a_line + 1;
-        return vertices <= most && faces <= most ? std::string()
-                                                 : "it claims more vertices or faces than it holds";
-    }
-    return {};
-}
-
 std::string whyBadBytes(const fs::path& path, std::istream& file, std::uint64_t size) {
     const std::string format = modelFormat(path);
     if (format == "stl") {
@@ -90,9 +68,6 @@ std::string whyBadBytes(const fs::path& path, std::istream& file, std::uint64_t 
     }
     if (format == "glb") {
         return whyBadGlb(file, size);
-    }
-    if (format == "off") {
-        return whyBadOff(file, size);
     }
     return format == "ply" ? whyBadPly(file, size) : std::string();
 }

@@ -226,94 +226,11 @@ std::string whyBadPlyIndices(const std::filesystem::path& path) {
     return PlyCheck(lines, *header).why();
 }
 
-class OffCheck {
-public:
-    explicit OffCheck(const std::filesystem::path& path) : m_lines(path) {}
-
-    std::string why() {
-        std::uint64_t counts[3] = {}; // of vertices, faces and edges
-        std::string_view word = nextWord();
-        if (word.ends_with("OFF")) {
-            if (word.starts_with("n") || word.starts_with("4")) {
-                return {}; // more coordinates than three
-            }
-            word = nextWord();
-        }
-        if (word == "BINARY") {
-            return {};
-        }
-        for (std::uint64_t& count : counts) {
-            if (!readNumber(word, count)) {
-                return inLine(m_lines.number()) + "holds " + quoted(word) +
-                       " where the numbers of vertices, faces and edges belong";
-            }
-            word = &count == &counts[2] ? word : nextWord();
-        }
-        return whyBadLines(counts[0], counts[1]);
-    }
-
-private:
-    /// Across lines, without comments.
-    std::string_view nextWord() {
-        std::string_view word = m_words.next();
-        while (word.empty() || word.front() == '#') {
-            std::string_view line;
-            if (!m_lines.next(line)) {
-                return {};
-            }
-            m_words = LineWords(line);
-            word = m_words.next();
-        }
-        return word;
-    }
-
-    bool nextFilledLine() {
-        std::string_view line;
-        while (m_lines.next(line)) {
-            m_words = LineWords(line);
-            if (!LineWords(line).next().empty()) {
-                return true;
-            }
-        }
-        return false;
-    }
-
-    std::string whyBadLines(std::uint64_t vertices, std::uint64_t faces) {
-        for (std::uint64_t i = 0; i < vertices + faces; ++i) {
-            if (!nextFilledLine()) {
-                return "it claims " + std::to_string(vertices) + " vertices and " +
-                       std::to_string(faces) + " faces but ends before them";
-            }
-            const std::string why =
-                i < vertices ? whyBadVertex() : FaceCheck(vertices).check(m_words, true);
-            if (!why.empty()) {
-                return inLine(m_lines.number()) + why;
-            }
-        }
-        return {};
-    }
-
-    std::string whyBadVertex() {
-        for (int i = 0; i < 3; ++i) {
-            if (m_words.next().empty()) {
-                return "holds " + std::to_string(i) + " of the 3 coordinates of a vertex";
-            }
-        }
-        return {};
-    }
-
-    LineReader m_lines;
-    LineWords m_words{std::string_view()};
-};
-
 } // namespace
 
 std::string whyBadIndices(const std::filesystem::path& path) {
     const std::string format = modelFormat(path);
-    if (format == "ply") {
-        return whyBadPlyIndices(path);
-    }
-    return format == "off" ? OffCheck(path).why() : std::string();
+    return format == "ply" ? whyBadPlyIndices(path) : std::string();
 }
 
 } // namespace quarn

@@ -2,7 +2,6 @@
 
 #include "import/files/LargeStack.h"
 #include "import/files/ModelFileCheck.h"
-#include "import/library/CoordinateShift.h"
 #include "import/library/FaceIndexCheck.h"
 #include "import/library/GltfExtensions.h"
 #include "import/library/GltfLosses.h"
@@ -51,7 +50,7 @@ TakenUpAxis upAxisOf(const std::string& format, UpAxis asked) {
     if (asked != UpAxis::by_format) {
         return {asked, TakenUpAxis::Reason::asked, {}};
     }
-    const bool is_open = isOneOf(format, {"obj", "ply", "stl", "off"});
+    const bool is_open = isOneOf(format, {"ply", "stl"});
     const bool is_z = is_open || isOneOf(format, {"3mf", "amf", "blend", "cob", "hmp", "q3o", "q3s",
                                                   "scn", "smd", "vta"});
     return {is_z ? UpAxis::z : UpAxis::y,
@@ -137,19 +136,6 @@ bool completeScene(Assimp::Importer& importer, const std::string& format,
     return scene.mNumMeshes == 0 || importer.ApplyPostProcessing(stepsFor(format)) != nullptr;
 }
 
-/// Other bytes than those on the disk, for what the library would not understand or not exactly.
-struct Replacement {
-    std::optional<std::string> bytes;
-    KM_3dPoint origin; ///< where their coordinates begin
-};
-
-Replacement replacementFor(const fs::path& path) {
-    if (std::optional<ShiftedFile> shifted = shiftFarCoordinates(path)) {
-        return {std::move(shifted->bytes), shifted->origin};
-    }
-    return {utf8OfWideFile(path), KM_3dPoint::Origin};
-}
-
 Result<SourceScene> takeChecked(Assimp::Importer& importer, const ModelReading& reading,
                                 const ModelConventions& conventions, const BesideReading& beside) {
     const fs::path& path = reading.path;
@@ -176,12 +162,12 @@ Result<SourceScene> takeChecked(Assimp::Importer& importer, const ModelReading& 
 Result<SourceScene> readChecked(const ModelReading& reading) {
     const fs::path& path = reading.path;
     std::set<std::string> refused;
-    const Replacement replacement = replacementFor(path);
+    const std::optional<std::string> narrow = utf8OfWideFile(modelFormat(path), reading.bytes);
     Assimp::Importer importer;
     auto* const access = new ModelFileAccess(reading.folder, refused);
     importer.SetIOHandler(access); // which owns it
-    if (replacement.bytes) {
-        access->replace(path, *replacement.bytes);
+    if (narrow) {
+        access->replace(path, *narrow);
     }
     configure(importer);
     const std::string extension = path.extension().string();
@@ -197,8 +183,7 @@ Result<SourceScene> readChecked(const ModelReading& reading) {
                                found.advice);
     }
     const std::string format = modelFormat(path);
-    ModelConventions conventions = conventionsOf(sceneOf(importer), format);
-    conventions.origin = replacement.origin;
+    const ModelConventions conventions = conventionsOf(sceneOf(importer), format);
     Result<SourceScene> scene = takeChecked(importer, reading, conventions, beside.get());
     if (!scene) {
         return scene;

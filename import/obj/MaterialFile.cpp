@@ -23,8 +23,8 @@ std::string_view unquoted(std::string_view name) {
 }
 
 /// Options of a picture that have one word behind them which does not matter here.
-constexpr std::string_view OPTIONS_OF_A_WORD[] = {"-bm",     "-blendu", "-blendv", "-cc",
-                                                  "-texres", "-imfchan", "-boost", "-type"};
+constexpr std::string_view OPTIONS_OF_A_WORD[] = {"-bm",     "-blendu",  "-blendv", "-cc",
+                                                  "-texres", "-imfchan", "-boost",  "-type"};
 
 class Lines {
 public:

@@ -21,11 +21,11 @@ struct MaterialMap {
 /// A material of a material file, as far as it is of use here.
 struct FileMaterial {
     std::string_view name; ///< may be empty
-    std::optional<std::array<float, 3>> color;
-    std::optional<float> opacity;      ///< 0 to 1
-    std::optional<float> transparency; ///< what other programs write in its place
-    MaterialMap color_map;
-    MaterialMap opacity_map;
+    std::optional<std::array<float, 3>> color{};
+    std::optional<float> opacity{};      ///< 0 to 1
+    std::optional<float> transparency{}; ///< what other programs write in its place
+    MaterialMap color_map{};
+    MaterialMap opacity_map{};
 };
 
 /// What a material file (MTL) holds.

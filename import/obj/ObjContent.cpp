@@ -1,9 +1,9 @@
 #include "import/obj/ObjContent.h"
 
 #include "import/ReadingProgress.h"
+#include "import/assembly/StoredColor.h"
 #include "import/obj/ObjIndices.h"
 #include "import/obj/ObjPieces.h"
-#include "import/assembly/StoredColor.h"
 #include "import/text/LineCursor.h"
 
 #include <tbb/parallel_for.h>
@@ -18,9 +18,6 @@ namespace quarn {
 namespace {
 
 constexpr std::size_t BYTES_OF_A_PART = std::size_t{1} << 19;
-
-/// What a piece takes until it is an object of the model.
-constexpr std::size_t BYTES_OF_A_PIECE = 1024;
 
 bool endsWithBackslash(std::string_view part, char line_break) {
     while (!part.empty() && (part.back() == line_break || part.back() == '\r'))
@@ -85,7 +82,7 @@ private:
 
 /// Moves the tables of the parts into one.
 template <class T>
-std::vector<T> joined(std::vector<ObjPart>& parts, std::vector<T> ObjPart::* table) {
+std::vector<T> joined(std::vector<ObjPart>& parts, std::vector<T> ObjPart::*table) {
     std::vector<std::size_t> begins;
     std::size_t all = 0;
     for (const ObjPart& part : parts) {
@@ -122,23 +119,34 @@ std::vector<KM_Color> takeColors(std::vector<ObjPart>& parts) {
     return colors;
 }
 
+/// "; so do 3 other lines", or nothing.
+std::string othersToo(std::uint64_t others, std::string_view thing, std::string_view one_does,
+                      std::string_view many_do) {
+    if (others == 0)
+        return {};
+    return "; " + std::to_string(others) + " other " + std::string(thing) +
+           std::string(others == 1 ? one_does : many_do);
+}
+
 std::string sentenceOf(ObjFault kind, const ObjFaults& faults, std::uint64_t line) {
-    const std::string in_line = "Line " + std::to_string(line);
-    const std::string others = std::to_string(faults.count - 1);
+    const std::string in_line = "ine " + std::to_string(line);
+    const std::uint64_t others = faults.count - 1;
     switch (kind) {
     case ObjFault::free_form:
-        return "Free-form curves and surfaces were left out: they begin in line " +
-               std::to_string(line) + ". Export them as meshes.";
+        return "Free-form curves and surfaces were left out: they begin in l" + in_line +
+               ". Export them as meshes.";
     case ObjFault::keyword:
-        return in_line + " " + faults.why + ", which is not known" +
-               (faults.count > 1 ? "; neither are " + others + " other lines." : ".");
+        return "L" + in_line + " " + faults.why + ", which is not known" +
+               othersToo(others, "line", " is not known either", "s are not known either") + ".";
     case ObjFault::index:
-        return in_line + " " + faults.why +
-               (faults.count > 1 ? "; " + others + " other indices name nothing either." : ".");
-    default:
-        return in_line + " " + faults.why +
-               (faults.count > 1 ? "; " + others + " other lines are damaged too." : ".");
+        return "L" + in_line + " " + faults.why +
+               othersToo(others, "ind", "ex names nothing either", "ices name nothing either") +
+               ".";
+    case ObjFault::statement:
+        break;
     }
+    return "L" + in_line + " " + faults.why +
+           othersToo(others, "line", " is damaged too", "s are damaged too") + ".";
 }
 
 std::vector<std::string> tellFaults(const std::vector<ObjPart>& parts, std::string_view text,
@@ -155,8 +163,7 @@ std::vector<std::string> tellFaults(const std::vector<ObjPart>& parts, std::stri
                 all.count += some.count;
         }
         if (all.count > 0)
-            sentences.push_back(
-                sentenceOf(kind, all, lineNumberAt(text, all.place, line_break)));
+            sentences.push_back(sentenceOf(kind, all, lineNumberAt(text, all.place, line_break)));
     }
     return sentences;
 }
@@ -176,9 +183,6 @@ Result<ObjContent> readObjContent(std::string_view text, const ModelReading& rea
     content.textures = joined(content.parts, &ObjPart::textures);
     content.normals = joined(content.parts, &ObjPart::normals);
     takePieces(content);
-    const std::size_t bytes = content.pieces.size() * BYTES_OF_A_PIECE;
-    if (const Result<void> taken = reading.budget.take(bytes, "objects"); !taken)
-        return taken.error();
     content.faults = tellFaults(content.parts, text, line_break);
     return content;
 }

@@ -2,9 +2,9 @@
 
 #include "ground/Result.h"
 #include "import/ModelReading.h"
+#include "import/assembly/CornerPieces.h"
 #include "import/obj/ObjPart.h"
 
-#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -15,9 +15,7 @@ namespace quarn {
 struct ObjPiece {
     std::string_view name;     ///< empty: the file gives none
     std::string_view material; ///< likewise
-    std::vector<FaceCorners> faces;
-    std::vector<FaceCorners> lines; ///< polylines
-    std::vector<std::span<const std::uint32_t>> points;
+    CornerElements elements;
 };
 
 /// An OBJ file whose statements are read. Neither copied nor moved while its pieces are in use.

@@ -28,7 +28,7 @@ constexpr Table NORMALS{"normal", "normals",
 
 /// Indices of a part, and what they count in.
 struct List {
-    Indices ObjPart::* indices;
+    Indices ObjPart::*indices;
     const Table& table;
 };
 

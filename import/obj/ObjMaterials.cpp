@@ -15,8 +15,8 @@ constexpr std::size_t MOST_BYTES = std::size_t{64} << 20;
 constexpr std::size_t MOST_LIBRARIES = 1000;
 
 bool endsWithMtl(std::string_view word) {
-    const std::string_view extension = word.substr(word.size() - std::min<std::size_t>(
-                                                                     word.size(), 4));
+    const std::string_view extension =
+        word.substr(word.size() - std::min<std::size_t>(word.size(), 4));
     return extension == ".mtl" || extension == ".MTL";
 }
 
@@ -48,8 +48,7 @@ void setTransparency(const FileMaterial& source, Material& material) {
 }
 
 KM_Color colorOf(const FileMaterial& source, const Material& material) {
-    const float opacity =
-        source.opacity.value_or(1.0F - source.transparency.value_or(0.0F));
+    const float opacity = source.opacity.value_or(1.0F - source.transparency.value_or(0.0F));
     const bool is_textured = material.base_color_texture != nullptr;
     KM_Color color = material.base_color;
     if (source.color)

@@ -10,6 +10,9 @@ namespace quarn {
 
 namespace {
 
+/// With its changes and the piece that it may become.
+constexpr std::size_t BYTES_OF_A_SECTION = 512;
+
 template <class T> std::size_t bytesOf(const std::vector<T>& list) {
     return list.capacity() * sizeof(T);
 }
@@ -39,9 +42,8 @@ std::string_view joinedLines(std::string_view line, LineCursor& lines, ObjPart& 
 
 } // namespace
 
-ObjPart readObjPart(
-    std::string_view text, char line_break, bool is_last,
-    const std::function<bool(const ObjPart& part, const char* place)>& goes_on) {
+ObjPart readObjPart(std::string_view text, char line_break, bool is_last,
+                    const std::function<bool(const ObjPart& part, const char* place)>& goes_on) {
     ObjPart part;
     part.text = text;
     ObjStatements statements(part);
@@ -61,7 +63,7 @@ std::size_t ObjPart::bytes() const {
     return bytesOf(places) + bytesOf(colors) + bytesOf(textures) + bytesOf(normals) +
            bytesOf(runs) + bytesOf(corners) + bytesOf(corner_textures) + bytesOf(corner_normals) +
            bytesOf(line_runs) + bytesOf(line_corners) + bytesOf(points) +
-           sections.capacity() * (sizeof(ObjSection) + sizeof(ObjChange));
+           sections.capacity() * BYTES_OF_A_SECTION;
 }
 
 void ObjPart::note(ObjFault kind, const char* place, std::string why) {

@@ -88,8 +88,8 @@ struct ObjPart {
 /// @param text     whole lines, none of which a backslash joins to others; outlives the part
 /// @param is_last  nothing follows in the file
 /// @param goes_on  asked after each statement; false ends the reading
-ObjPart readObjPart(
-    std::string_view text, char line_break, bool is_last,
-    const std::function<bool(const ObjPart& part, const char* place)>& goes_on = nullptr);
+ObjPart
+readObjPart(std::string_view text, char line_break, bool is_last,
+            const std::function<bool(const ObjPart& part, const char* place)>& goes_on = nullptr);
 
 } // namespace quarn

@@ -45,19 +45,19 @@ private:
         for (const ObjChange& change : begin.changes)
             take(change);
         if (begin.runs < end.runs)
-            piece().faces.push_back(
+            piece().elements.faces.push_back(
                 {{part.runs.data() + begin.runs, end.runs - begin.runs},
                  part.corners.data() + begin.corners,
                  someOf(part.corner_textures, begin.corners, end.corners),
                  someOf(part.corner_normals, begin.corners, end.corners),
                  m_content.colors.empty() ? nullptr : part.corners.data() + begin.corners});
         if (begin.line_runs < end.line_runs)
-            piece().lines.push_back(
+            piece().elements.lines.push_back(
                 {.runs = {part.line_runs.data() + begin.line_runs, end.line_runs - begin.line_runs},
                  .places = part.line_corners.data() + begin.line_corners});
         if (begin.points < end.points)
-            piece().points.emplace_back(part.points.data() + begin.points,
-                                        end.points - begin.points);
+            piece().elements.points.emplace_back(part.points.data() + begin.points,
+                                                 end.points - begin.points);
     }
 
     void take(const ObjChange& change) {
@@ -72,17 +72,15 @@ private:
     }
 
     ObjPiece& piece() {
-        const auto [known, is_new] =
-            m_of_material.try_emplace(m_material, m_content.pieces.size());
+        const auto [known, is_new] = m_of_material.try_emplace(m_material, m_content.pieces.size());
         if (is_new)
-            m_content.pieces.push_back({m_object, m_material, {}, {}, {}});
+            m_content.pieces.push_back({m_object, m_material, {}});
         return m_content.pieces[known->second];
     }
 
     /// Ends the object in hand.
     void nameAfterMaterials() {
-        const bool is_unnamed =
-            m_of_material.size() > 1 && m_content.pieces.back().name.empty();
+        const bool is_unnamed = m_of_material.size() > 1 && m_content.pieces.back().name.empty();
         for (const auto& [material, piece] : m_of_material)
             if (is_unnamed)
                 m_content.pieces[piece].name = material;

@@ -16,10 +16,9 @@ constexpr std::string_view WITHOUT_MEANING_HERE[] = {
     "s",        "mg",       "lod",        "usemap",    "maplib", "bevel",
     "c_interp", "d_interp", "shadow_obj", "trace_obj", "vp"};
 
-constexpr std::string_view FREE_FORM[] = {"cstype", "deg",  "bmat", "step", "curv", "curv2",
-                                          "surf",   "parm", "trim", "hole", "scrv", "sp",
-                                          "end",    "con",  "ctech", "stech", "bzp", "bsp",
-                                          "cdc",    "cdp",  "res"};
+constexpr std::string_view FREE_FORM[] = {
+    "cstype", "deg", "bmat", "step",  "curv",  "curv2", "surf", "parm", "trim", "hole", "scrv",
+    "sp",     "end", "con",  "ctech", "stech", "bzp",   "bsp",  "cdc",  "cdp",  "res"};
 
 bool isOneOf(std::string_view word, std::span<const std::string_view> words) {
     return std::find(words.begin(), words.end(), word) != words.end();
@@ -52,8 +51,7 @@ int takeNumbers(std::string_view& rest, std::array<double, MOST>& numbers) {
 
 /// What a number whose rest the file's end cuts off may end with.
 bool endsWithinNumber(std::string_view line) {
-    return !line.empty() &&
-           std::string_view(".+-eE/").find(line.back()) != std::string_view::npos;
+    return !line.empty() && std::string_view(".+-eE/").find(line.back()) != std::string_view::npos;
 }
 
 std::string tooFew(int count, std::string_view wanted) {
@@ -265,8 +263,7 @@ bool ObjStatements::readCorner(std::string_view& rest, Corner& corner) {
     const auto isIndexNext = [&] {
         return !rest.empty() && rest.front() != '/' && !isBlank(rest.front());
     };
-    if (takeSlash() && isIndexNext() &&
-        !takeIndex(rest, m_part.textures.size(), corner.texture))
+    if (takeSlash() && isIndexNext() && !takeIndex(rest, m_part.textures.size(), corner.texture))
         return false;
     if (corner.slashes == 1 && takeSlash() && isIndexNext() &&
         !takeIndex(rest, m_part.normals.size(), corner.normal))
