@@ -34,7 +34,7 @@ Result<void> CornerPieces::add(const CornerElements& elements, SourceMesh piece,
         piece.mesh = std::move(made.mesh);
         piece.origin = made.origin;
     }
-    piece.lines = linesOf(elements);
+    piece.lines = linesOf(elements, piece.origin);
     for (const std::span<const std::uint32_t> points : elements.points)
         for (const std::uint32_t point : points)
             takePoint(point, piece);
@@ -77,11 +77,13 @@ Result<void> CornerPieces::takeMemory(const CornerElements& elements) {
     return m_reading.budget.take(bytes, "triangles, lines and points");
 }
 
-std::vector<KM_3dPointArray> CornerPieces::linesOf(const CornerElements& elements) {
+std::vector<KM_3dPointArray> CornerPieces::linesOf(const CornerElements& elements,
+                                                   const KM_3dPoint& origin) {
+    const KM_3dVector to_piece = KM_3dPoint::Origin - origin;
     std::vector<LineSegment> segments;
     const auto take = [&](std::uint32_t from, std::uint32_t to) {
         if (isUsable(from) && isUsable(to))
-            segments.emplace_back(m_tables.places[from], m_tables.places[to]);
+            segments.emplace_back(m_tables.places[from] + to_piece, m_tables.places[to] + to_piece);
         else
             ++m_segments.dropped;
     };
@@ -98,7 +100,7 @@ std::vector<KM_3dPointArray> CornerPieces::linesOf(const CornerElements& element
 void CornerPieces::takePoint(std::uint32_t place, SourceMesh& piece) {
     ++m_points.all;
     if (isUsable(place))
-        piece.points.Append(m_tables.places[place]);
+        piece.points.Append(m_tables.places[place] + (KM_3dPoint::Origin - piece.origin));
     else
         ++m_points.dropped;
 }

@@ -44,7 +44,7 @@ private:
     };
 
     Result<void> takeMemory(const CornerElements& elements);
-    std::vector<KM_3dPointArray> linesOf(const CornerElements& elements);
+    std::vector<KM_3dPointArray> linesOf(const CornerElements& elements, const KM_3dPoint& origin);
     void takePoint(std::uint32_t place, SourceMesh& piece);
     void place(SourceMesh&& piece);
     bool isUsable(std::uint32_t place) const;
