@@ -7,6 +7,8 @@
 #include "import/library/LibraryReader.h"
 #include "import/obj/ObjReader.h"
 #include "import/off/OffReader.h"
+#include "import/ply/PlyReader.h"
+#include "import/stl/StlReader.h"
 
 #include <exception>
 #include <new>
@@ -27,8 +29,8 @@ struct Format {
 
 /// The formats that have a reader of their own.
 constexpr Format FORMATS[] = {
-    {"brep", readBrep}, {"iges", readIges}, {"igs", readIges}, {"obj", readObj},
-    {"off", readOff},   {"step", readStep}, {"stp", readStep},
+    {"brep", readBrep}, {"iges", readIges}, {"igs", readIges}, {"obj", readObj},  {"off", readOff},
+    {"ply", readPly},   {"step", readStep}, {"stl", readStl},  {"stp", readStep},
 };
 
 Reader readerOf(const std::string& extension) {

@@ -1,8 +1,8 @@
 #include "import/assembly/CornerMeshes.h"
 
 #include "engine/scene/PlacedMesh.h"
+#include "import/assembly/MeshCleaning.h"
 #include "import/assembly/MeshPlacing.h"
-#include "import/assembly/VertexWelding.h"
 
 #include <tbb/blocked_range.h>
 #include <tbb/parallel_for.h>
@@ -91,10 +91,7 @@ CornerMesh CornerMeshes::make(std::span<const FaceCorners> faces,
     made.dropped = m_dropped;
     made.mesh->m_F = std::move(m_triangles);
     forget();
-    // Polygons of n corners are n - 2 triangles by now: where no two share a vertex there are more
-    // vertices than triangles, where all share them half as many.
-    if (made.mesh->m_V.size() > made.mesh->m_F.size())
-        weldVertices(*made.mesh);
+    weldSparseMesh(*made.mesh);
     return made;
 }
 

@@ -1,5 +1,6 @@
 #include "import/assembly/MeshPlacing.h"
 
+#include "import/assembly/MeshCleaning.h"
 #include "import/assembly/VertexNormals.h"
 
 #include <tbb/parallel_for.h>
@@ -65,10 +66,6 @@ bool onlyMoves(const KM_Xform& x) {
     return rest.IsIdentity();
 }
 
-bool isUsable(const KM_3fPoint& p) {
-    return std::isfinite(p.x) && std::isfinite(p.y) && std::isfinite(p.z);
-}
-
 KM_3fPoint placed(const KM_Xform& xform, const KM_3fPoint& vertex) {
     const KM_3dPoint p = xform * vertex.ToDouble();
     const auto single = [](double coordinate) {
@@ -76,19 +73,6 @@ KM_3fPoint placed(const KM_Xform& xform, const KM_3fPoint& vertex) {
                                               : std::numeric_limits<float>::quiet_NaN();
     };
     return {single(p.x), single(p.y), single(p.z)};
-}
-
-std::size_t dropUnusable(KM_Mesh& mesh) {
-    if (std::ranges::all_of(mesh.m_V, isUsable))
-        return 0;
-    const std::size_t dropped = std::erase_if(mesh.m_F, [&](const KM_MeshTriangle& triangle) {
-        return !std::ranges::all_of(triangle.vi,
-                                    [&](std::uint32_t v) { return isUsable(mesh.m_V[v]); });
-    });
-    for (KM_3fPoint& vertex : mesh.m_V)
-        if (!isUsable(vertex))
-            vertex = {}; // of no triangle any more
-    return dropped;
 }
 
 } // namespace
@@ -114,7 +98,7 @@ std::size_t placeMesh(KM_Mesh& mesh, const KM_Xform& xform) {
     if (normals.mirrors())
         for (KM_MeshTriangle& triangle : mesh.m_F)
             std::swap(triangle.vi[1], triangle.vi[2]);
-    return dropUnusable(mesh);
+    return dropUnusableTriangles(mesh);
 }
 
 void completeMesh(KM_Mesh& mesh) {

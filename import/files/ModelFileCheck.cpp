@@ -1,6 +1,5 @@
 #include "import/files/ModelFileCheck.h"
 
-#include "import/library/PlyLength.h"
 #include "kelmar/KM_LittleEndian.h"
 
 #include <array>
@@ -24,24 +23,6 @@ std::uint32_t numberAt(const char* bytes) {
 }
 
 /// Why the bytes of a file cannot be what its extension says; empty when nothing speaks against it.
-std::string whyBadStl(std::istream& file, std::uint64_t size) {
-    std::array<char, 84> head{};
-    file.read(head.data(), head.size());
-    const std::string_view begin(head.data(), static_cast<std::size_t>(file.gcount()));
-    if (begin.find("solid") != std::string_view::npos &&
-        begin.find('\0') == std::string_view::npos) {
-        return {}; // text; binary headers are padded with zeros, or their counts contain one
-    }
-    if (size < head.size()) {
-        return "the file is cut short";
-    }
-    const std::uint64_t count = numberAt(&head[80]);
-    const std::uint64_t needed = head.size() + 50 * count;
-    return needed <= size ? std::string()
-                          : "it claims " + std::to_string(count) + " triangles but holds only " +
-                                std::to_string((size - head.size()) / 50);
-}
-
 std::string whyBadGlb(std::istream& file, std::uint64_t size) {
     std::array<char, 20> head{};
     file.read(head.data(), head.size());
@@ -62,14 +43,7 @@ std::string whyBadGlb(std::istream& file, std::uint64_t size) {
 }
 
 std::string whyBadBytes(const fs::path& path, std::istream& file, std::uint64_t size) {
-    const std::string format = modelFormat(path);
-    if (format == "stl") {
-        return whyBadStl(file, size);
-    }
-    if (format == "glb") {
-        return whyBadGlb(file, size);
-    }
-    return format == "ply" ? whyBadPly(file, size) : std::string();
+    return modelFormat(path) == "glb" ? whyBadGlb(file, size) : std::string();
 }
 
 } // namespace

@@ -16,7 +16,7 @@ Error cannotReadModel(const std::filesystem::path& path, std::string_view why,
 std::string modelFormat(const std::filesystem::path& path);
 
 /// Looks at a model file before it is read: it is there, is a file, has bytes, can be opened, and
-/// the counts in its header (PLY, binary STL, GLB) agree with its length, so that a damaged or
+/// the counts in its header (GLB, OFF) agree with its length, so that a damaged or
 /// hostile file cannot ask for memory that it has no right to.
 Result<void> checkModelFile(const std::filesystem::path& path);
 

@@ -2,7 +2,6 @@
 
 #include "import/files/LargeStack.h"
 #include "import/files/ModelFileCheck.h"
-#include "import/library/FaceIndexCheck.h"
 #include "import/library/GltfExtensions.h"
 #include "import/library/GltfLosses.h"
 #include "import/library/ModelFileAccess.h"
@@ -50,17 +49,14 @@ TakenUpAxis upAxisOf(const std::string& format, UpAxis asked) {
     if (asked != UpAxis::by_format) {
         return {asked, TakenUpAxis::Reason::asked, {}};
     }
-    const bool is_open = isOneOf(format, {"ply", "stl"});
-    const bool is_z = is_open || isOneOf(format, {"3mf", "amf", "blend", "cob", "hmp", "q3o", "q3s",
-                                                  "scn", "smd", "vta"});
-    return {is_z ? UpAxis::z : UpAxis::y,
-            is_open ? TakenUpAxis::Reason::habit : TakenUpAxis::Reason::format,
-            {}};
+    const bool is_z = isOneOf(
+        format, {"3mf", "amf", "blend", "cob", "hmp", "q3o", "q3s", "scn", "smd", "vta"});
+    return {is_z ? UpAxis::z : UpAxis::y, TakenUpAxis::Reason::format, {}};
 }
 
 ModelConventions conventionsOf(const aiScene& scene, const std::string& format) {
     ModelConventions conventions;
-    conventions.keep_normals = !isOneOf(format, {"stl", "blend"});
+    conventions.keep_normals = format != "blend";
     conventions.gltf_cameras = isOneOf(format, {"gltf", "glb"});
     conventions.linear_colors = hasLinearColors(scene, format);
     return conventions;
@@ -98,7 +94,6 @@ struct BesideReading {
 
 BesideReading readBeside(const fs::path& path) {
     BesideReading beside;
-    beside.why_bad = whyBadIndices(path);
     if (isOneOf(modelFormat(path), {"gltf", "glb"})) {
         beside.gltf = readGltfDescription(path);
     }

@@ -1,7 +1,7 @@
 #include "import/obj/ObjReader.h"
 
+#include "import/WritingProgram.h"
 #include "import/assembly/CornerPieces.h"
-#include "import/assembly/WritingProgram.h"
 #include "import/files/ModelFileCheck.h"
 #include "import/obj/ObjContent.h"
 #include "import/obj/ObjMaterials.h"
@@ -12,6 +12,16 @@
 namespace quarn {
 
 namespace {
+
+/// The programs' exporters write so unless they are told otherwise.
+TakenUpAxis upOf(const ModelReading& reading, std::string_view text) {
+    constexpr std::size_t BYTES_OF_HEAD = 1024;
+    return upAxisOf(reading.up, text.substr(0, BYTES_OF_HEAD),
+                    {{"# Blender", "Blender", UpAxis::y},
+                     {"# Exported from Wings 3D", "Wings 3D", UpAxis::y},
+                     {"# This file uses centimeters as units for non-parametric coordinates",
+                      "Maya", UpAxis::y}});
+}
 
 Result<SourceScene> sceneOf(const ObjContent& content, const ModelReading& reading) {
     SourceScene scene;
@@ -53,7 +63,7 @@ Result<SourceScene> readObj(const ModelReading& reading) {
     Result<SourceScene> scene = sceneOf(content.value(), reading);
     if (!scene)
         return failed(scene.message());
-    scene.value().up = upAxisOfOpenFormat("obj", text, reading.up);
+    scene.value().up = upOf(reading, text);
     return scene;
 }
 

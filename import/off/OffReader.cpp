@@ -1,7 +1,7 @@
 #include "import/off/OffReader.h"
 
+#include "import/WritingProgram.h"
 #include "import/assembly/CornerPieces.h"
-#include "import/assembly/WritingProgram.h"
 #include "import/files/ModelFileCheck.h"
 #include "import/off/OffBody.h"
 #include "import/text/FileText.h"
@@ -69,7 +69,7 @@ Result<SourceScene> readOff(const ModelReading& reading) {
     Result<SourceScene> scene = sceneOf(header.value(), body.value(), reading);
     if (!scene)
         return cannotReadModel(reading.path, scene.message(), SMALLER);
-    scene.value().up = upAxisOfOpenFormat("off", text, reading.up);
+    scene.value().up = upAxisOf(reading.up, {}, {});
     return scene;
 }
 

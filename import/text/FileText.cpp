@@ -9,8 +9,6 @@ namespace quarn {
 
 namespace {
 
-constexpr std::string_view MARK = "\xEF\xBB\xBF";
-
 /// Wide characters take four bytes for two of the file, and up to three and as many again for
 /// their UTF-8.
 constexpr std::uint64_t BYTES_FOR_A_BYTE = 5;
@@ -23,9 +21,7 @@ bool mayBeWide(std::span<const std::uint8_t> bytes) {
 
 Result<FileText> FileText::of(std::span<const std::uint8_t> bytes, ReadingBudget& budget) {
     FileText file;
-    file.m_own = textOf(bytes);
-    if (file.m_own.starts_with(MARK))
-        file.m_own.remove_prefix(MARK.size());
+    file.m_own = withoutByteOrderMark(textOf(bytes));
     if (!mayBeWide(bytes))
         return file;
     if (const Result<void> taken = budget.take(BYTES_FOR_A_BYTE * bytes.size(), "characters");

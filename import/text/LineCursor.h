@@ -15,6 +15,11 @@ inline std::string_view textOf(std::span<const std::uint8_t> bytes) {
     return {reinterpret_cast<const char*>(bytes.data()), bytes.size()};
 }
 
+/// A text without the three bytes by which some programs say that it is UTF-8.
+inline std::string_view withoutByteOrderMark(std::string_view text) {
+    return text.starts_with("\xEF\xBB\xBF") ? text.substr(3) : text;
+}
+
 /// What ends the lines of a text: a line feed, or a carriage return in files from old machines
 /// where nothing follows it. A carriage return before a line feed counts as a blank of its line.
 char lineBreakOf(std::string_view text);
