@@ -61,7 +61,7 @@ std::uint32_t hashOf(const KM_Mesh& mesh, std::uint32_t v) {
     const std::array<float, 3> place{p.x + 0.0F, p.y + 0.0F, p.z + 0.0F};
     std::uint32_t hash = hashOfBits(place);
     const auto add = [&hash](auto... numbers) {
-        const std::array parts{static_cast<float>(numbers) + 0.0F...};
+        const std::array parts{(static_cast<float>(numbers) + 0.0F)...};
         hash = 31U * hash + hashOfBits(parts);
     };
     if (!mesh.m_N.empty())
