@@ -4,6 +4,7 @@
 #include "import/assembly/ModelAssembly.h"
 #include "import/cad/CadReader.h"
 #include "import/files/ModelFileCheck.h"
+#include "import/gltf/GltfReader.h"
 #include "import/library/LibraryReader.h"
 #include "import/obj/ObjReader.h"
 #include "import/off/OffReader.h"
@@ -29,8 +30,9 @@ struct Format {
 
 /// The formats that have a reader of their own.
 constexpr Format FORMATS[] = {
-    {"brep", readBrep}, {"iges", readIges}, {"igs", readIges}, {"obj", readObj},  {"off", readOff},
-    {"ply", readPly},   {"step", readStep}, {"stl", readStl},  {"stp", readStep},
+    {"brep", readBrep}, {"glb", readGltf}, {"gltf", readGltf}, {"iges", readIges},
+    {"igs", readIges},  {"obj", readObj},  {"off", readOff},   {"ply", readPly},
+    {"step", readStep}, {"stl", readStl},  {"stp", readStep},
 };
 
 Reader readerOf(const std::string& extension) {
@@ -49,11 +51,11 @@ bool isEmpty(const ImportedModel& model) {
 }
 
 Error nothingLeft(const fs::path& path, const ImportedModel& model) {
-    std::string why = model.warnings.empty()
-                          ? "it holds no triangles, lines or points"
-                          : "nothing in it can be shown. " + model.warnings.back();
+    std::string why = "it holds no triangles, lines or points";
+    if (!model.warnings.empty())
+        why = "nothing in it can be shown. " + model.warnings.back();
     if (why.ends_with('.'))
-        why.pop_back(); // another sentence follows
+        why.pop_back(); // the sentence goes on
     return cannotReadModel(path, why, "Export the model again, with its meshes.");
 }
 

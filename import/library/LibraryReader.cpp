@@ -2,8 +2,6 @@
 
 #include "import/files/LargeStack.h"
 #include "import/files/ModelFileCheck.h"
-#include "import/library/GltfExtensions.h"
-#include "import/library/GltfLosses.h"
 #include "import/library/ModelFileAccess.h"
 #include "import/library/PlainWords.h"
 #include "import/library/SceneReading.h"
@@ -11,7 +9,6 @@
 #include "import/library/Utf16Text.h"
 
 #include <assimp/Importer.hpp>
-#include <assimp/commonMetaData.h>
 #include <assimp/config.h>
 #include <assimp/postprocess.h>
 #include <assimp/scene.h>
@@ -19,7 +16,6 @@
 #include <algorithm>
 #include <array>
 #include <exception>
-#include <future>
 #include <optional>
 #include <set>
 #include <string_view>
@@ -35,30 +31,20 @@ bool isOneOf(std::string_view format, std::initializer_list<std::string_view> fo
     return std::find(formats.begin(), formats.end(), format) != formats.end();
 }
 
-/// Version 1 of glTF left the meaning of its colours to shaders, which took them as they are.
-bool hasLinearColors(const aiScene& scene, const std::string& format) {
-    aiString version;
-    const bool old = scene.mMetaData != nullptr &&
-                     scene.mMetaData->Get(AI_METADATA_SOURCE_FORMAT_VERSION, version) &&
-                     std::string_view(version.C_Str()).starts_with("1");
-    return isOneOf(format, {"gltf", "glb"}) && !old;
-}
-
 /// The library hands out most formats Y-up, whatever their files say.
 TakenUpAxis upAxisOf(const std::string& format, UpAxis asked) {
     if (asked != UpAxis::by_format) {
         return {asked, TakenUpAxis::Reason::asked, {}};
     }
-    const bool is_z = isOneOf(
-        format, {"3mf", "amf", "blend", "cob", "hmp", "q3o", "q3s", "scn", "smd", "vta"});
+    const bool is_z =
+        isOneOf(format, {"3mf", "amf", "blend", "cob", "hmp", "q3o", "q3s", "scn", "smd", "vta"});
     return {is_z ? UpAxis::z : UpAxis::y, TakenUpAxis::Reason::format, {}};
 }
 
-ModelConventions conventionsOf(const aiScene& scene, const std::string& format) {
+ModelConventions conventionsOf(const std::string& format) {
     ModelConventions conventions;
     conventions.keep_normals = format != "blend";
     conventions.gltf_cameras = isOneOf(format, {"gltf", "glb"});
-    conventions.linear_colors = hasLinearColors(scene, format);
     return conventions;
 }
 
@@ -85,68 +71,33 @@ void warnOfRefused(const std::set<std::string>& refused, SourceScene& scene) {
     }
 }
 
-/// What is found out about a file beside the library's reading, which keeps it to itself.
-struct BesideReading {
-    std::string why_bad; ///< empty: nothing speaks against the file
-    std::string_view advice = repair;
-    std::optional<GltfDescription> gltf;
-};
-
-BesideReading readBeside(const fs::path& path) {
-    BesideReading beside;
-    if (isOneOf(modelFormat(path), {"gltf", "glb"})) {
-        beside.gltf = readGltfDescription(path);
-    }
-    const std::string extension = beside.gltf ? unreadableExtension(*beside.gltf) : std::string();
-    if (!extension.empty()) {
-        beside.why_bad = "it needs the glTF extension '" + extension + "', which is not known here";
-        beside.advice = "Export the model without it, or without compression.";
-    }
-    return beside;
-}
-
 /// The scene is the importer's own, which hands it out as constant only for its users' sake.
 aiScene& sceneOf(const Assimp::Importer& importer) {
     return *const_cast<aiScene*>(importer.GetScene());
 }
 
-unsigned stepsFor(const std::string& format) {
-    constexpr unsigned steps = aiProcess_ValidateDataStructure | aiProcess_Triangulate |
-                               aiProcess_SortByPType | aiProcess_GenUVCoords;
-    const bool is_gltf = isOneOf(format, {"gltf", "glb"});
-    return is_gltf ? steps
-                   : steps | aiProcess_TransformUVCoords; // turned ones of glTF come out wrong
-}
+constexpr unsigned STEPS = aiProcess_ValidateDataStructure | aiProcess_Triangulate |
+                           aiProcess_SortByPType | aiProcess_GenUVCoords |
+                           aiProcess_TransformUVCoords;
 
 /// Turns what was read into triangles, lines and points; false with the importer's error text where
 /// it is damaged.
-bool completeScene(Assimp::Importer& importer, const std::string& format,
-                   std::vector<std::string>& warnings) {
+bool completeScene(Assimp::Importer& importer, std::vector<std::string>& warnings) {
     aiScene& scene = sceneOf(importer);
     const std::uint64_t without_corners = repairScene(scene);
     if (without_corners > 0) {
         warnings.push_back(std::to_string(without_corners) +
                            " faces were left out: they have no corners.");
     }
-    return scene.mNumMeshes == 0 || importer.ApplyPostProcessing(stepsFor(format)) != nullptr;
+    return scene.mNumMeshes == 0 || importer.ApplyPostProcessing(STEPS) != nullptr;
 }
 
 Result<SourceScene> takeChecked(Assimp::Importer& importer, const ModelReading& reading,
-                                const ModelConventions& conventions, const BesideReading& beside) {
+                                const ModelConventions& conventions) {
     const fs::path& path = reading.path;
     std::vector<std::string> warnings;
-    if (beside.gltf) {
-        warnings = tellLostFaces(sceneOf(importer), *beside.gltf);
-        for (std::string& sentence : tellUnknownExtensions(*beside.gltf)) {
-            warnings.push_back(std::move(sentence));
-        }
-    }
-    const bool is_complete = completeScene(importer, modelFormat(path), warnings);
-    if (!is_complete || !beside.why_bad.empty()) {
-        const std::string& why = beside.why_bad;
-        return cannotReadModel(path, why.empty() ? inPlainWords(importer.GetErrorString()) : why,
-                               beside.advice);
-    }
+    if (!completeScene(importer, warnings))
+        return cannotReadModel(path, inPlainWords(importer.GetErrorString()), repair);
     const std::unique_ptr<aiScene> scene(importer.GetOrphanedScene());
     importer.FreeScene();
     SourceScene taken = takeScene(*scene, reading, conventions);
@@ -170,16 +121,10 @@ Result<SourceScene> readChecked(const ModelReading& reading) {
         return cannotReadModel(path, "files of this kind are not known",
                                "Choose a model file (OBJ, glTF, GLB, PLY, STL, ...).");
     }
-    auto beside = std::async(std::launch::async | std::launch::deferred, readBeside, path);
-    if (importer.ReadFile(path.string(), 0) == nullptr) {
-        const BesideReading found = beside.get();
-        const std::string& why = found.why_bad;
-        return cannotReadModel(path, why.empty() ? inPlainWords(importer.GetErrorString()) : why,
-                               found.advice);
-    }
+    if (importer.ReadFile(path.string(), 0) == nullptr)
+        return cannotReadModel(path, inPlainWords(importer.GetErrorString()), repair);
     const std::string format = modelFormat(path);
-    const ModelConventions conventions = conventionsOf(sceneOf(importer), format);
-    Result<SourceScene> scene = takeChecked(importer, reading, conventions, beside.get());
+    Result<SourceScene> scene = takeChecked(importer, reading, conventionsOf(format));
     if (!scene) {
         return scene;
     }

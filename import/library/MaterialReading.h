@@ -1,7 +1,6 @@
 #pragma once
 
 #include "engine/scene/Material.h"
-#include "import/textures/TexturePlace.h"
 #include "import/textures/TextureStore.h"
 
 #include <map>
@@ -19,17 +18,15 @@ namespace quarn {
 struct ReadMaterial {
     std::shared_ptr<Material> material; ///< null: the file gives none
     unsigned texture_coordinates = 0;   ///< the set that its texture uses
-    TexturePlace texture_place;
 };
 
 /// Makes materials of a model file on demand, each once, with the textures that they name.
 class MaterialReading {
 public:
-    /// @param scene          outlives this object, with its materials and textures
-    /// @param reading        outlives this object
-    /// @param linear_colors  the file's base colours are linear light
-    /// @param warnings       receives a sentence for each texture that is left out; outlives this
-    MaterialReading(const aiScene& scene, const ModelReading& reading, bool linear_colors,
+    /// @param scene     outlives this object, with its materials and textures
+    /// @param reading   outlives this object
+    /// @param warnings  receives a sentence for each texture that is left out; outlives this
+    MaterialReading(const aiScene& scene, const ModelReading& reading,
                     std::vector<std::string>& warnings);
 
     const ReadMaterial& at(unsigned index);
@@ -41,7 +38,6 @@ private:
     std::shared_ptr<const Texture> texture(const std::string& reference, TextureWraps wraps);
 
     const aiScene& m_scene;
-    bool m_linear_colors;
     TextureStore m_textures;
     std::map<unsigned, ReadMaterial> m_materials;
 };

@@ -1,6 +1,5 @@
 #pragma once
 
-#include "import/textures/TexturePlace.h"
 #include "kelmar/KM_Mesh.h"
 
 #include <cstddef>
@@ -13,9 +12,7 @@ namespace quarn {
 /// How one mesh of a model file becomes a mesh of ours.
 struct MeshReading {
     bool keep_normals = true;         ///< false: the file's normals say no more than its triangles
-    bool linear_colors = false;       ///< vertex colours are linear light, not sRGB
     unsigned texture_coordinates = 0; ///< which set of the mesh to take
-    TexturePlace texture_place;       ///< where its coordinates lie on the texture
 };
 
 struct ConvertedMesh {

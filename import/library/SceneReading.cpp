@@ -2,6 +2,7 @@
 
 #include "import/assembly/MeshPlacing.h"
 #include "import/assembly/PolylineChains.h"
+#include "import/assembly/RoundingTold.h"
 #include "import/library/MaterialReading.h"
 #include "import/library/MeshConversion.h"
 
@@ -13,9 +14,7 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdint>
-#include <locale>
 #include <map>
-#include <sstream>
 #include <string_view>
 #include <utility>
 
@@ -86,7 +85,7 @@ class SceneReader {
 public:
     SceneReader(aiScene& scene, const ModelReading& reading, const ModelConventions& conventions)
         : m_scene(scene), m_conventions(conventions),
-          m_materials(scene, reading, conventions.linear_colors, m_result.warnings) {}
+          m_materials(scene, reading, m_result.warnings) {}
 
     SourceScene read() {
         m_nodes = placedNodes(m_scene.mRootNode);
@@ -96,7 +95,8 @@ public:
                 place(placed, placed.node->mMeshes[i]);
             }
         }
-        warnOfRounding();
+        if (const std::string rounded = roundingText(m_result); !rounded.empty())
+            m_result.warnings.push_back(rounded);
         readCameras();
         warnOfDropped();
         return std::move(m_result);
@@ -141,56 +141,11 @@ private:
         }
     }
 
-    /// The reading library keeps coordinates in single precision, with 24 binary digits.
-    static double roundingStep(const KM_BoundingBox& box) {
-        double largest = 1e-30;
-        for (int corner = 0; corner < 8 && box.IsValid(); ++corner) {
-            const KM_3dPoint p = box.Corner(corner);
-            largest = std::max({largest, std::abs(p.x), std::abs(p.y), std::abs(p.z)});
-        }
-        return std::ldexp(1.0, std::ilogb(largest) - 23);
-    }
-
-    /// How much longer a transform makes what points along an axis, at most.
-    static double largestScale(const KM_Xform& x) {
-        double largest = 0.0;
-        for (int axis = 0; axis < 3; ++axis) {
-            largest = std::max(
-                largest, std::hypot(x.m_xform[0][axis], x.m_xform[1][axis], x.m_xform[2][axis]));
-        }
-        return largest;
-    }
-
-    void warnOfRounding() {
-        constexpr double visible_share = 1e-5;
-        double step = 0.0;
-        KM_BoundingBox all;
-        for (const SourcePlace& place : m_result.places) {
-            const std::shared_ptr<KM_Mesh>& mesh = m_result.meshes[place.mesh].mesh;
-            const KM_BoundingBox box = mesh ? mesh->BoundingBox() : KM_BoundingBox();
-            step = std::max(step, largestScale(place.world_from_mesh) * roundingStep(box));
-            for (int corner = 0; corner < 8 && box.IsValid(); ++corner) {
-                all.Set(place.world_from_mesh * box.Corner(corner));
-            }
-        }
-        const double size = all.IsValid() ? all.Diagonal().Length() : 0.0;
-        if (size > 0.0 && step > visible_share * size) {
-            std::ostringstream text;
-            text.imbue(std::locale::classic());
-            text << "The model lies so far from the origin that its coordinates are rounded to "
-                    "multiples of "
-                 << step << ". Move it nearer, or export it as OBJ.";
-            m_result.warnings.push_back(text.str());
-        }
-    }
-
     void readTriangles(const aiMesh& mesh, SourceMesh& piece) {
         const ReadMaterial& material = m_materials.at(mesh.mMaterialIndex);
         MeshReading reading;
         reading.keep_normals = m_conventions.keep_normals;
-        reading.linear_colors = m_conventions.linear_colors;
         reading.texture_coordinates = material.texture_coordinates;
-        reading.texture_place = material.texture_place;
         ConvertedMesh converted = convertTriangles(mesh, reading);
         m_triangles += mesh.mNumFaces;
         m_dropped += converted.triangles_dropped;

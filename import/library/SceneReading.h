@@ -8,8 +8,7 @@ namespace quarn {
 
 /// What the format of a model file implies.
 struct ModelConventions {
-    bool keep_normals = true;   ///< false: those of the file are worth nothing
-    bool linear_colors = false; ///< colours are linear light
+    bool keep_normals = true; ///< false: those of the file are worth nothing
     /// The loader of glTF repeats a camera's place, which its node states already, and gives the
     /// vertical angle times the aspect for the horizontal one.
     bool gltf_cameras = false;

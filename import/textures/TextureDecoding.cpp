@@ -1,86 +1,77 @@
 #include "import/textures/TextureDecoding.h"
 
 #include "ground/FileBytes.h"
+#include "import/textures/PlainPicture.h"
+#include "import/textures/PngPicture.h"
+#include "import/textures/WebpPicture.h"
 
-#include <memory>
+#include <algorithm>
 #include <string_view>
 
-#define STB_IMAGE_STATIC
-#define STB_IMAGE_IMPLEMENTATION
-#define STBI_NO_STDIO
-#define STBI_ONLY_PNG
-#define STBI_ONLY_JPEG
-#define STBI_ONLY_BMP
-#define STBI_ONLY_TGA
-#define STBI_ONLY_GIF
-#define STBI_MAX_DIMENSIONS 16384
-#include <stb_image.h>
-
 namespace quarn {
+
 namespace {
 
-constexpr std::int64_t most_pixels = 64LL << 20;
-constexpr std::uintmax_t most_bytes = 256ULL << 20;
+constexpr std::int64_t MOST_PIXELS = 64LL << 20;
+constexpr std::int64_t MOST_IN_A_ROW = 16384;
+constexpr std::uintmax_t MOST_BYTES = 256ULL << 20;
 
-constexpr const char* too_large =
-    "it is too large: more than 64 million pixels, or more than 16384 in a row";
+using Bytes = std::span<const std::uint8_t>;
 
-struct FreePixels {
-    void operator()(stbi_uc* pixels) const { stbi_image_free(pixels); }
-};
+const PictureFormat* formatOf(Bytes file) {
+    for (const PictureFormat* const format : {&PNG_PICTURES, &WEBP_PICTURES, &PLAIN_PICTURES})
+        if (format->begins(file))
+            return format;
+    return nullptr;
+}
 
-using Pixels = std::unique_ptr<stbi_uc, FreePixels>;
+/// Pictures that people have for a reason, so that they are told what it is.
+std::string whyUnknown(Bytes file) {
+    const std::string_view head(reinterpret_cast<const char*>(file.data()),
+                                std::min<std::size_t>(file.size(), 12));
+    constexpr std::string_view KNOWN = "those that are read are PNG, JPEG, WebP, BMP, TGA and GIF";
+    std::string kind = "it is not a picture of a known kind";
+    if (head.substr(0, 7) == "\xABKTX 20" || head.substr(0, 7) == "\xABKTX 11")
+        kind = "it is a KTX picture";
+    else if (head.ends_with("ftypavif") || head.ends_with("ftypavis"))
+        kind = "it is an AVIF picture";
+    return kind + "; " + std::string(KNOWN);
+}
 
-/// Why a picture whose size cannot be told cannot be read. Only the attempt to read all of it says
-/// whether that is so for its size.
-const char* whyUnknown(std::span<const std::uint8_t> bytes) {
-    int unused = 0;
-    const Pixels pixels(stbi_load_from_memory(bytes.data(), static_cast<int>(bytes.size()), &unused,
-                                              &unused, &unused, 4));
-    const char* const reason = stbi_failure_reason();
-    const bool is_too_large = reason != nullptr && std::string_view(reason) == "too large";
-    return pixels == nullptr && is_too_large
-               ? too_large
-               : "it is not a picture of a known kind (PNG, JPEG, BMP, TGA, GIF)";
+bool isTooLarge(const PictureSize& size) {
+    return std::max(size.width, size.height) > MOST_IN_A_ROW ||
+           size.width * size.height > MOST_PIXELS;
 }
 
 } // namespace
 
-Result<Texture> decodeTexture(std::span<const std::uint8_t> bytes, ReadingBudget& budget) {
-    if (bytes.size() > most_bytes) {
+Result<Texture> decodeTexture(Bytes bytes, ReadingBudget& budget) {
+    if (bytes.size() > MOST_BYTES)
         return Error{"it is larger than 256 MB"};
-    }
-    const int size = static_cast<int>(bytes.size());
-    int width = 0;
-    int height = 0;
-    int channels = 0;
-    if (stbi_info_from_memory(bytes.data(), size, &width, &height, &channels) == 0) {
+    const PictureFormat* const format = formatOf(bytes);
+    if (format == nullptr)
         return Error{whyUnknown(bytes)};
-    }
-    if (static_cast<std::int64_t>(width) * height > most_pixels) {
-        return Error{too_large};
-    }
-    const std::size_t byte_count = 4 * static_cast<std::size_t>(width) * height;
-    if (const Result<void> taken = budget.take(byte_count, "textures"); !taken) {
-        return taken.error();
-    }
-    const Pixels pixels(stbi_load_from_memory(bytes.data(), size, &width, &height, &channels, 4));
-    if (pixels == nullptr) {
-        budget.giveBack(byte_count);
+    const std::optional<PictureSize> size = format->size(bytes);
+    if (!size || size->width < 1 || size->height < 1)
         return Error{"the picture is damaged"};
-    }
+    if (isTooLarge(*size))
+        return Error{"it is too large: more than 64 million pixels, or more than 16384 in a row"};
+    if (const Result<void> taken = budget.take(size->bytes(), "textures"); !taken)
+        return taken.error();
     Texture texture;
-    texture.width = width;
-    texture.height = height;
-    texture.rgba.assign(pixels.get(), pixels.get() + byte_count);
-    return texture;
+    texture.width = static_cast<int>(size->width);
+    texture.height = static_cast<int>(size->height);
+    texture.rgba.resize(size->bytes());
+    if (format->decode(bytes, texture.rgba))
+        return texture;
+    budget.giveBack(size->bytes());
+    return Error{"the picture is damaged"};
 }
 
 Result<Texture> readTextureFile(const std::filesystem::path& path, ReadingBudget& budget) {
-    const Result<FileBytes> file = readFileBytes(path, most_bytes);
-    if (!file) {
+    const Result<FileBytes> file = readFileBytes(path, MOST_BYTES);
+    if (!file)
         return file.error();
-    }
     return decodeTexture(file.value().bytes(), budget);
 }
 

@@ -11,9 +11,9 @@
 
 namespace quarn {
 
-/// The picture in the bytes of a PNG, JPEG, BMP, TGA or GIF file (its first frame), with repeating
-/// wrap modes. Pictures with a side over 16384 pixels or with more than 64 million pixels are
-/// refused before memory is asked for, and so are those whose pixels the budget does not hold.
+/// The picture in the bytes of a PNG, JPEG, WebP, BMP, TGA or GIF file (its first frame), with
+/// repeating wrap modes. Pictures with a side over 16384 pixels or with more than 64 million pixels
+/// are refused before memory is asked for, and so are those whose pixels the budget does not hold.
 /// @return the texture; or an error whose message is why, a part of a sentence
 Result<Texture> decodeTexture(std::span<const std::uint8_t> bytes, ReadingBudget& budget);
 

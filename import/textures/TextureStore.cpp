@@ -7,17 +7,22 @@ namespace quarn {
 
 std::shared_ptr<const Texture> TextureStore::fromFile(const std::string& reference,
                                                       TextureWraps wraps) {
-    const auto found = m_textures.find({reference, wraps});
-    return found != m_textures.end() ? found->second : keep(reference, load(reference), wraps);
+    const auto have = known(reference, wraps);
+    return have ? *have : keep(reference, load(reference), wraps);
 }
 
 std::shared_ptr<const Texture> TextureStore::fromBytes(const std::string& name,
                                                        std::span<const std::uint8_t> bytes,
                                                        TextureWraps wraps) {
-    const auto found = m_textures.find({name, wraps});
-    if (found != m_textures.end())
-        return found->second;
+    if (const auto have = known(name, wraps))
+        return *have;
     return keep(name, decoded(name, decodeTexture(bytes, m_reading.budget)), wraps);
+}
+
+std::optional<std::shared_ptr<const Texture>> TextureStore::known(const std::string& name,
+                                                                  TextureWraps wraps) const {
+    const auto found = m_textures.find({name, wraps});
+    return found != m_textures.end() ? std::optional(found->second) : std::nullopt;
 }
 
 std::shared_ptr<const Texture>

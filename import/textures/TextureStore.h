@@ -6,6 +6,7 @@
 #include <cstdint>
 #include <map>
 #include <memory>
+#include <optional>
 #include <set>
 #include <span>
 #include <string>
@@ -39,6 +40,9 @@ public:
     /// @param name  names it to the person and tells it from the others of the file
     std::shared_ptr<const Texture>
     fromBytes(const std::string& name, std::span<const std::uint8_t> bytes, TextureWraps wraps);
+    /// What is known of a picture: it was had already, or null where it was left out.
+    std::optional<std::shared_ptr<const Texture>> known(const std::string& name,
+                                                        TextureWraps wraps) const;
     /// Keeps a picture that needs no decoding; null stays null.
     std::shared_ptr<const Texture> keep(const std::string& name, std::shared_ptr<Texture> picture,
                                         TextureWraps wraps);

@@ -53,7 +53,9 @@ INSTANTIATE_TEST_SUITE_P(
         Refusal{"bad_length.glb", "lengths in its header do not fit"},
         Refusal{"cut_short.glb", "lengths in its header do not fit"},
         Refusal{"huge_accessor.gltf", "out of range"},
-        Refusal{"escaping_buffer.gltf", "could not open referenced file"},
+        Refusal{"escaping_buffer.gltf",
+                "its buffer 0 is the file '../../../../../../etc/passwd', which lies outside the "
+                "model's folder"},
         Refusal{"huge_count.off", "more vertices or faces than it holds"}));
 
 TEST(HostileModel, TrianglesWithACoordinateThatIsNoNumberAreLeftOutWithAWarning) {
