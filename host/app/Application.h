@@ -10,10 +10,12 @@
 #include "host/front_end/FrontEnd.h"
 #include "host/front_end/SessionOptions.h"
 #include "host/recording/RunningRecording.h"
+#include "import/ImportedModel.h"
 
 #include <filesystem>
 #include <map>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -68,6 +70,10 @@ public:
     /// tells the front end. Without a running command nothing happens.
     void pictureWritten(const std::filesystem::path& file);
 
+    /// Keeps which axis was taken as up in the model file that was read last.
+    void modelRead(const TakenUpAxis& up) { m_last_up = up; }
+    const std::optional<TakenUpAxis>& lastUpAxis() const { return m_last_up; }
+
     /// The recording of a whole animation that runs now, or null. RecordingScope begins and ends
     /// it.
     RunningRecording* recording() const { return m_recording.get(); }
@@ -102,6 +108,7 @@ private:
     std::map<HWND, std::unique_ptr<CWnd>> m_windows;
     const CDialog* m_open_dialog = nullptr;
     bool m_exit_requested = false;
+    std::optional<TakenUpAxis> m_last_up;
     WithheldText* m_withheld_text = nullptr; ///< null while text is shown at once
 };
 

@@ -48,6 +48,10 @@ std::optional<std::string> Session::runScriptFile(const std::filesystem::path& f
     return m_state->application.runner().runFile(file);
 }
 
+const std::optional<TakenUpAxis>& Session::lastUpAxis() const {
+    return m_state->application.lastUpAxis();
+}
+
 CQuarnDoc& Session::document() {
     return m_state->application.documents().active()->face();
 }

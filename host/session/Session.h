@@ -3,12 +3,14 @@
 #include "host/front_end/FrontEnd.h"
 #include "host/front_end/PlugInLoad.h"
 #include "host/front_end/SessionOptions.h"
+#include "import/ImportedModel.h"
 #include "sdk/qncore/QnCommand.h"
 #include "sdk/qncore/QnDoc.h"
 #include "sdk/qncore/QnExport.h"
 
 #include <filesystem>
 #include <memory>
+#include <optional>
 #include <string_view>
 #include <vector>
 
@@ -59,6 +61,9 @@ public:
     /// @return nothing when every command succeeded; else one sentence, not told yet: which line
     ///         ended the script, or why the file is none
     std::optional<std::string> runScriptFile(const std::filesystem::path& file);
+
+    /// Which axis was taken as up in the model file that was read last, and why; none before.
+    const std::optional<TakenUpAxis>& lastUpAxis() const;
 
     /// The active document; there is always one. Valid until another one is opened.
     CQuarnDoc& document();

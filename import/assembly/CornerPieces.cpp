@@ -14,7 +14,8 @@ namespace {
 /// A triangle's indices, its share of the vertices with all that they have, and what finding them
 /// takes.
 constexpr std::uint64_t BYTES_OF_A_TRIANGLE = 64;
-constexpr std::uint64_t BYTES_OF_A_SEGMENT = 128;
+constexpr std::uint64_t BYTES_OF_A_SEGMENT = 96;
+constexpr std::uint64_t BYTES_OF_A_LINE = 1024; // which is joined to others piece by piece
 constexpr std::uint64_t BYTES_OF_A_POINT = 48;
 constexpr std::uint64_t BYTES_OF_A_PIECE = 1024;
 
@@ -60,20 +61,24 @@ void CornerPieces::tellDropped() {
 
 Result<void> CornerPieces::takeMemory(const CornerElements& elements) {
     std::uint64_t triangles = 0;
+    std::uint64_t lines = 0;
     std::uint64_t segments = 0;
     std::uint64_t points = 0;
     for (const FaceCorners& faces : elements.faces)
         for (const FaceRun& run : faces.runs)
             triangles += std::uint64_t{run.faces} * (run.corners - 2);
-    for (const FaceCorners& lines : elements.lines)
-        for (const FaceRun& run : lines.runs)
+    for (const FaceCorners& some : elements.lines)
+        for (const FaceRun& run : some.runs) {
+            lines += run.faces;
             segments += std::uint64_t{run.faces} * (run.corners - 1);
+        }
     for (const std::span<const std::uint32_t> some : elements.points)
         points += some.size();
     m_triangles.all += triangles;
     m_segments.all += segments;
     const std::uint64_t bytes = BYTES_OF_A_PIECE + triangles * BYTES_OF_A_TRIANGLE +
-                                segments * BYTES_OF_A_SEGMENT + points * BYTES_OF_A_POINT;
+                                lines * BYTES_OF_A_LINE + segments * BYTES_OF_A_SEGMENT +
+                                points * BYTES_OF_A_POINT;
     return m_reading.budget.take(bytes, "triangles, lines and points");
 }
 

@@ -9,13 +9,6 @@ namespace quarn {
 
 namespace {
 
-std::string_view trimmed(std::string_view text) {
-    skipBlanks(text);
-    while (!text.empty() && isBlank(text.back()))
-        text.remove_suffix(1);
-    return text;
-}
-
 /// Some programs put a file's name between quotation marks.
 std::string_view unquoted(std::string_view name) {
     const bool is_quoted = name.size() > 1 && name.front() == '"' && name.back() == '"';
@@ -26,12 +19,15 @@ std::string_view unquoted(std::string_view name) {
 constexpr std::string_view OPTIONS_OF_A_WORD[] = {"-bm",     "-blendu",  "-blendv", "-cc",
                                                   "-texres", "-imfchan", "-boost",  "-type"};
 
+/// What follows is passed over, so that a file of their names alone cannot fill the memory.
+constexpr std::size_t MOST_MATERIALS = 100'000;
+
 class Lines {
 public:
     explicit Lines(std::string_view text) : m_lines(text, lineBreakOf(text)) {}
 
     MaterialFile read() {
-        for (std::string_view line; m_lines.next(line);)
+        for (std::string_view line; m_file.materials.size() < MOST_MATERIALS && m_lines.next(line);)
             readLine(line);
         return std::move(m_file);
     }

@@ -12,7 +12,8 @@ namespace quarn {
 namespace {
 
 constexpr std::size_t MOST_BYTES = std::size_t{64} << 20;
-constexpr std::size_t MOST_LIBRARIES = 1000;
+/// For each one that is missing the folder is searched.
+constexpr std::size_t MOST_LIBRARIES = 100;
 
 bool endsWithMtl(std::string_view word) {
     const std::string_view extension =
@@ -76,7 +77,7 @@ void ObjMaterials::readLibraries(std::span<const std::string_view> statements) {
 }
 
 void ObjMaterials::readStatement(std::string_view statement) {
-    if (statement.empty() || m_asked.size() >= MOST_LIBRARIES || m_asked.contains(statement))
+    if (statement.empty() || m_asked.contains(statement))
         return;
     const std::vector<std::string_view> names = namesOf(statement);
     if (names.size() == 1 || m_reading.folder.find(statement)) {
@@ -88,8 +89,14 @@ void ObjMaterials::readStatement(std::string_view statement) {
 }
 
 void ObjMaterials::readLibrary(std::string_view name) {
-    if (!m_asked.emplace(name).second)
+    if (m_asked.size() > MOST_LIBRARIES || !m_asked.emplace(name).second)
         return;
+    if (m_asked.size() > MOST_LIBRARIES) {
+        m_warnings.push_back("Material files from '" + std::string(name) +
+                             "' on were not read: there are more than " +
+                             std::to_string(MOST_LIBRARIES) + ".");
+        return;
+    }
     const std::optional<NamedFile> file = m_reading.folder.find(name);
     if (file && readFile(*file)) {
         if (file->differs_in_case)

@@ -28,13 +28,6 @@ bool isAtEnd(std::string_view rest) {
     return rest.empty() || rest.front() == '#';
 }
 
-std::string_view trimmed(std::string_view text) {
-    skipBlanks(text);
-    while (!text.empty() && isBlank(text.back()))
-        text.remove_suffix(1);
-    return text;
-}
-
 /// @return how many numbers the line begins with, at most as many as `numbers` holds
 template <std::size_t MOST>
 int takeNumbers(std::string_view& rest, std::array<double, MOST>& numbers) {

@@ -5,6 +5,7 @@
 
 #include <chrono>
 #include <cmath>
+#include <type_traits>
 
 namespace quarn::program {
 
@@ -47,6 +48,22 @@ std::string fileReport(const std::filesystem::path& model,
            "\nread in: " + millisecondsText(read_time) + "\n";
 }
 
+/// Which axis was taken as up, and why; empty for a document, which knows its axes.
+std::string upReport(HostSession& host, const std::string& format) {
+    const auto& up = host.session().lastUpAxis();
+    if (!up)
+        return {};
+    using Reason = std::decay_t<decltype(up->reason)>;
+    const bool is_y = up->axis == std::decay_t<decltype(up->axis)>::y;
+    const std::string axis = is_y ? "y" : "z";
+    const std::string other = std::string("; ") + (is_y ? "--up z" : "--up y") + " turns it";
+    if (up->reason == Reason::habit)
+        return "up: " + axis + ", as in most " + format + " files" + other + "\n";
+    if (up->reason == Reason::writer)
+        return "up: " + axis + ", as " + up->writer + " writes " + format + " files" + other + "\n";
+    return "up: " + axis + "\n";
+}
+
 } // namespace
 
 Outcome reportModel(const std::filesystem::path& model, const CommonOptions& common) {
@@ -60,7 +77,8 @@ Outcome reportModel(const std::filesystem::path& model, const CommonOptions& com
     front_end.keepWords();
     if (const auto trouble = host.run("_-List _Objects"))
         return *trouble;
-    return Outcome::success(fileReport(model, read_time) + front_end.takeKeptWords());
+    return Outcome::success(fileReport(model, read_time) + upReport(host, formatName(model)) +
+                            front_end.takeKeptWords());
 }
 
 } // namespace quarn::program

@@ -119,6 +119,17 @@ TEST(ObjMaterialFiles, OfTheModelsOwnNameStandInForMissingOnes) {
                                             "The material file 'b.mtl' was read in its place."));
 }
 
+TEST(ObjMaterialFiles, AreNotSoughtWithoutEnd) {
+    const TemporaryFolder folder;
+    std::string text = "mtllib";
+    for (int i = 0; i < 500; ++i)
+        text += " " + std::to_string(i) + ".mtl";
+    const ImportedModel model = readOrFail(folder.write("b.obj", text + "\n" + body + "f 1 2 3\n"));
+    ASSERT_EQ(model.warnings.size(), 101U);
+    EXPECT_EQ(model.warnings.back(),
+              "Material files from '100.mtl' on were not read: there are more than 100.");
+}
+
 TEST(ObjMaterialFiles, ThatDifferInCaseAreReadAndTold) {
     const TemporaryFolder folder;
     folder.write("Paint.mtl", "newmtl m\nKd 1 0 0\n");
