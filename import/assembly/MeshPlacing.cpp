@@ -75,6 +75,12 @@ KM_3fPoint placed(const KM_Xform& xform, const KM_3fPoint& vertex) {
     return {single(p.x), single(p.y), single(p.z)};
 }
 
+/// A reserve that is small beside what is kept is not worth the copy that would release it.
+template <class Item> void releaseReserve(std::vector<Item>& items) {
+    if (items.capacity() - items.size() > items.size() / 16 + 1)
+        items.shrink_to_fit();
+}
+
 } // namespace
 
 bool isUsableCoordinate(double coordinate) {
@@ -106,11 +112,11 @@ void completeMesh(KM_Mesh& mesh) {
         smoothVertexNormals(mesh, crease_angle_deg);
     else
         fillMissingNormals(mesh);
-    mesh.m_V.shrink_to_fit();
-    mesh.m_N.shrink_to_fit();
-    mesh.m_T.shrink_to_fit();
-    mesh.m_C.shrink_to_fit();
-    mesh.m_F.shrink_to_fit();
+    releaseReserve(mesh.m_V);
+    releaseReserve(mesh.m_N);
+    releaseReserve(mesh.m_T);
+    releaseReserve(mesh.m_C);
+    releaseReserve(mesh.m_F);
     mesh.PadForRayTracing();
 }
 

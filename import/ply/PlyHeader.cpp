@@ -4,7 +4,6 @@
 #include "import/text/Words.h"
 
 #include <algorithm>
-#include <array>
 #include <utility>
 
 namespace quarn {
@@ -98,11 +97,6 @@ Result<void> checkCounts(const PlyHeader& header, std::uint64_t left) {
 }
 
 } // namespace
-
-std::size_t bytesOf(PlyType type) {
-    constexpr std::array<std::size_t, 8> BYTES{1, 1, 2, 2, 4, 4, 4, 8};
-    return BYTES[static_cast<std::size_t>(type)];
-}
 
 bool PlyElement::hasList() const {
     return std::ranges::any_of(properties, &PlyProperty::isList);

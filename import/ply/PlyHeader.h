@@ -26,7 +26,10 @@ enum class PlyType : std::uint8_t {
 };
 
 /// In a binary file.
-std::size_t bytesOf(PlyType type);
+constexpr std::size_t bytesOf(PlyType type) {
+    constexpr std::size_t BYTES[] = {1, 1, 2, 2, 4, 4, 4, 8};
+    return BYTES[static_cast<std::size_t>(type)];
+}
 
 struct PlyProperty {
     std::string name;

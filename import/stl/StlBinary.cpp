@@ -1,7 +1,6 @@
 #include "import/stl/StlBinary.h"
 
 #include "import/ReadingProgress.h"
-#include "import/WritingProgram.h"
 #include "import/assembly/MeshCleaning.h"
 #include "import/files/ModelFileCheck.h"
 #include "import/stl/StlMesh.h"
@@ -134,12 +133,6 @@ std::shared_ptr<const Material> materialOf(KM_Color color) {
     return std::make_shared<const Material>(std::move(material));
 }
 
-TakenUpAxis upOf(const ModelReading& reading, std::string_view header) {
-    return upAxisOf(
-        reading.up, header,
-        {{"Exported from Blender", "Blender", UpAxis::z}, {"OpenSCAD", "OpenSCAD", UpAxis::z}});
-}
-
 } // namespace
 
 bool hasBinaryStlLength(std::string_view file) {
@@ -174,7 +167,6 @@ Result<SourceScene> readBinaryStl(const ModelReading& reading) {
     }
     if (facets.colorOfAll() && !facets.hasColors())
         piece.material = materialOf(*facets.colorOfAll());
-    scene.up = upOf(reading, file.substr(0, HEADER_BYTES));
     scene.meshes.push_back(std::move(piece));
     scene.places.push_back({});
     return scene;

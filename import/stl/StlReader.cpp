@@ -1,5 +1,6 @@
 #include "import/stl/StlReader.h"
 
+#include "import/WritingProgram.h"
 #include "import/stl/StlBinary.h"
 #include "import/stl/StlText.h"
 #include "import/text/LineCursor.h"
@@ -28,9 +29,15 @@ bool isText(std::string_view file) {
 } // namespace
 
 Result<SourceScene> readStl(const ModelReading& reading) {
+    constexpr std::size_t HEADER_BYTES = 80;
     const std::string_view file = textOf(reading.bytes);
-    return !hasBinaryStlLength(file) && isText(file) ? readTextStl(reading)
-                                                     : readBinaryStl(reading);
+    const bool is_text = !hasBinaryStlLength(file) && isText(file);
+    Result<SourceScene> scene = is_text ? readTextStl(reading) : readBinaryStl(reading);
+    if (scene)
+        scene.value().up = upAxisOf(
+            reading.up, file.substr(0, HEADER_BYTES),
+            {{"Exported from Blender", "Blender", UpAxis::z}, {"OpenSCAD", "OpenSCAD", UpAxis::z}});
+    return scene;
 }
 
 } // namespace quarn

@@ -2,7 +2,6 @@
 
 #include "engine/scene/PlacedMesh.h"
 #include "import/ReadingProgress.h"
-#include "import/WritingProgram.h"
 #include "import/assembly/MeshCleaning.h"
 #include "import/files/ModelFileCheck.h"
 #include "import/stl/StlMesh.h"
@@ -45,9 +44,6 @@ public:
         }
         joinParts();
         makeSolids();
-        m_scene.up = upAxisOf(
-            m_reading.up, m_file.substr(0, 80),
-            {{"Exported from Blender", "Blender", UpAxis::z}, {"OpenSCAD", "OpenSCAD", UpAxis::z}});
         return std::move(m_scene);
     }
 

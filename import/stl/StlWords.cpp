@@ -12,6 +12,7 @@ namespace {
 
 constexpr std::size_t PART_BYTES = std::size_t{512} << 10;
 constexpr std::string_view FACET_END = "endfacet";
+constexpr const char* CUT_SHORT = "ends within a triangle: the file is cut short";
 
 char lower(char c) {
     return c >= 'A' && c <= 'Z' ? static_cast<char>(c + 32) : c;
@@ -35,7 +36,7 @@ public:
             if (!readWord(word))
                 return std::move(m_part);
         if (m_in_facet)
-            fail("ends within a triangle: the file is cut short");
+            fail(CUT_SHORT);
         return std::move(m_part);
     }
 
@@ -84,6 +85,8 @@ private:
     }
 
     bool misplaced(std::string_view word) {
+        if (m_in_facet && m_rest.empty()) // a word that the file's end cuts off
+            return fail(CUT_SHORT);
         return fail("holds " + quotedWord(word) + ", which does not belong there");
     }
 
@@ -117,7 +120,7 @@ private:
             std::string_view word = next();
             const std::string_view whole = word;
             if (word.empty())
-                return fail("ends within a triangle: the file is cut short");
+                return fail(CUT_SHORT);
             const auto taken = takeNumber<double>(word);
             const bool is_none = whole.find(".#") != std::string_view::npos; // as some wrote it
             if (!taken && !is_none)
