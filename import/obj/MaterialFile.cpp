@@ -4,6 +4,7 @@
 #include "import/text/Words.h"
 
 #include <algorithm>
+#include <cmath>
 
 namespace quarn {
 
@@ -78,7 +79,7 @@ private:
         if (takeWord(after) == "-halo") // see-through in the middle, opaque at the border
             rest = after;
         const std::optional<float> number = takeNumber<float>(rest);
-        if (number)
+        if (number && !std::isnan(*number))
             share = std::clamp(*number, 0.0F, 1.0F);
         else
             fault(rest);

@@ -78,7 +78,7 @@ TEST(ObjMaterial, ScalesAndMovesTextureCoordinates) {
 
 TEST(ObjMaterial, ThatIsDamagedIsToldWithItsLine) {
     const TemporaryFolder folder;
-    const ImportedModel model = readWith(folder, "Kd red\nd 0.5\nd half\n");
+    const ImportedModel model = readWith(folder, "Kd red\nd 0.5\nd half\nd nan\n");
     EXPECT_EQ(materialOf(model).base_color.a, 128);
     EXPECT_THAT(model.warnings, ElementsAre("The material file 'a.mtl' is damaged: line 2 holds "
                                             "'red' where a number belongs."));
