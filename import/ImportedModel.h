@@ -48,6 +48,7 @@ enum class UpAxis {
 struct TakenUpAxis {
     enum class Reason {
         format, ///< the format defines it
+        file,   ///< the file says so, or its reader has turned it; the axis is what came of that
         habit,  ///< the format leaves it open; most files of the kind have it so
         writer, ///< the program that wrote the file has it so
         asked,  ///< whoever reads the file said so

@@ -5,6 +5,7 @@
 #include "host/app/DocumentSaving.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileNameQuestion.h"
+#include "host/commands/UpAxisText.h"
 #include "host/commands/WatchedReading.h"
 #include "host/document/DocumentList.h"
 #include "host/document/ViewFit.h"
@@ -74,7 +75,12 @@ void tellContent(const AskedFile& asked, const std::vector<std::string>& warning
         application.tell(warning);
     const ContentCounts counts =
         std::visit([](const auto& content) { return countsOf(content); }, asked.content);
-    application.tell(textFromPath(asked.file.filename()).ToUtf8() + ": " + counts.text());
+    std::string result = textFromPath(asked.file.filename()).ToUtf8() + ": " + counts.text();
+    if (const auto* model = std::get_if<ImportedModel>(&asked.content)) {
+        const std::string axis = upAxisText(model->up);
+        result += axis.empty() ? axis : ". " + axis;
+    }
+    application.tell(result);
 }
 
 void fitViews(Document& document) {

@@ -28,14 +28,22 @@ public:
         if (m_box.IsValid())
             m_contents.box = {m_box.m_min, m_box.m_max};
         if (const ReadingNotes* const notes = m_document.readingNotes()) {
-            m_contents.up_axis = notes->up.axis == UpAxis::y ? 'y' : 'z';
-            m_contents.up_reason = reasonOf(notes->up);
+            tellAxis(notes->up);
             m_contents.left_out = notes->warnings;
         }
         return std::move(m_contents);
     }
 
 private:
+    void tellAxis(const TakenUpAxis& up) {
+        using Reason = TakenUpAxis::Reason;
+        if (up.reason == Reason::file)
+            return;
+        m_contents.up_axis = up.axis == UpAxis::y ? 'y' : 'z';
+        m_contents.up_reason = reasonOf(up);
+        m_contents.up_is_guessed = up.reason == Reason::habit || up.reason == Reason::writer;
+    }
+
     static std::string reasonOf(const TakenUpAxis& up) {
         switch (up.reason) {
         case TakenUpAxis::Reason::format:
@@ -44,6 +52,7 @@ private:
             return "as most such files have it";
         case TakenUpAxis::Reason::writer:
             return "as " + up.writer + " writes it";
+        case TakenUpAxis::Reason::file:
         case TakenUpAxis::Reason::asked:
             break;
         }

@@ -51,8 +51,9 @@ struct ModelContents {
     /// The corners of the box of all objects; none without objects.
     std::optional<std::pair<KM_3dPoint, KM_3dPoint>> box;
     /// Of the model file that was read last, where one was:
-    char up_axis = 0;                  ///< 'y' or 'z'
+    char up_axis = 0;                  ///< 'y' or 'z'; 0 where the file itself settled it
     std::string up_reason;             ///< "as its format has it"
+    bool up_is_guessed = false;        ///< the format leaves it open
     std::vector<std::string> left_out; ///< sentences: what was left out and why
 };
 

@@ -55,10 +55,22 @@ void renumber(KM_Mesh& mesh, const std::vector<std::uint32_t>& numbers) {
                       });
 }
 
+/// Of all that a vertex has: of those at one place, many may differ in the rest.
 std::uint32_t hashOf(const KM_Mesh& mesh, std::uint32_t v) {
     const KM_3fPoint& p = mesh.m_V[v];
     const std::array<float, 3> place{p.x + 0.0F, p.y + 0.0F, p.z + 0.0F};
-    return hashOfBits(place);
+    std::uint32_t hash = hashOfBits(place);
+    const auto add = [&hash](auto... numbers) {
+        const std::array parts{(static_cast<float>(numbers) + 0.0F)...};
+        hash = 31U * hash + hashOfBits(parts);
+    };
+    if (!mesh.m_N.empty())
+        add(mesh.m_N[v].x, mesh.m_N[v].y, mesh.m_N[v].z);
+    if (!mesh.m_T.empty())
+        add(mesh.m_T[v].x, mesh.m_T[v].y);
+    if (!mesh.m_C.empty())
+        add(mesh.m_C[v].r, mesh.m_C[v].g, mesh.m_C[v].b, mesh.m_C[v].a);
+    return hash;
 }
 
 bool areEqual(const KM_Mesh& mesh, std::uint32_t a, std::uint32_t b) {

@@ -1,10 +1,10 @@
 #include "import/files/ModelFileCheck.h"
 
+#include <array>
 #include <cerrno>
 #include <cstdint>
 #include <cstring>
 #include <fstream>
-#include <sstream>
 
 namespace quarn {
 namespace {
@@ -13,34 +13,6 @@ namespace fs = std::filesystem;
 
 constexpr std::uintmax_t largest_model_bytes = 4ULL << 30;
 constexpr std::string_view choose_model = "Choose a model file (OBJ, glTF, GLB, PLY, STL, ...).";
-constexpr std::string_view export_again = "Export the model again or restore the file.";
-
-/// Why the bytes of a file cannot be what its extension says; empty when nothing speaks against it.
-/// The counts stand at the first line that is neither the keyword nor a comment.
-std::string whyBadOff(std::istream& file, std::uint64_t size) {
-    constexpr int most_lines = 1000;
-    constexpr std::uint64_t least_bytes_a_line = 6; // three numbers
-    std::string line;
-    for (int i = 0; i < most_lines && std::getline(file, line); ++i) {
-        const std::size_t digits = line.find_first_of("0123456789");
-        const std::size_t letters = line.find_first_not_of("OFFCNST4n \t\r0123456789");
-        if (digits == std::string::npos || letters != std::string::npos) {
-            continue;
-        }
-        std::uint64_t vertices = 0;
-        std::uint64_t faces = 0;
-        std::istringstream(line.substr(digits)) >> vertices >> faces;
-        const std::uint64_t most = size / least_bytes_a_line + 1;
-        return vertices <= most && faces <= most ? std::string()
-                                                 : "it claims more vertices or faces than it holds";
-    }
-    return {};
-}
-
-std::string whyBadBytes(const fs::path& path, std::istream& file, std::uint64_t size) {
-    const std::string format = modelFormat(path);
-    return format == "off" ? whyBadOff(file, size) : std::string();
-}
 
 } // namespace
 
@@ -82,8 +54,7 @@ Result<void> checkModelFile(const fs::path& path) {
                                std::string("it cannot be opened (") + std::strerror(errno) + ")",
                                "Check its permissions.");
     }
-    const std::string why = whyBadBytes(path, file, size);
-    return why.empty() ? Result<void>() : cannotReadModel(path, why, export_again);
+    return {};
 }
 
 } // namespace quarn

@@ -15,9 +15,8 @@ Error cannotReadModel(const std::filesystem::path& path, std::string_view why,
 /// The extension in lower case without its dot: "glb".
 std::string modelFormat(const std::filesystem::path& path);
 
-/// Looks at a model file before it is read: it is there, is a file, has bytes, can be opened, and
-/// the counts in its header (OFF) agree with its length, so that a damaged or
-/// hostile file cannot ask for memory that it has no right to.
+/// Looks at a model file before it is read: it is there, is a file, has bytes, not too many of
+/// them, and can be opened.
 Result<void> checkModelFile(const std::filesystem::path& path);
 
 } // namespace quarn

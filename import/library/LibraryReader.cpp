@@ -3,8 +3,6 @@
 #include "import/files/LargeStack.h"
 #include "import/files/ModelFileCheck.h"
 #include "import/ifc/IfcPlace.h"
-#include "import/library/CoordinateShift.h"
-#include "import/library/FaceIndexCheck.h"
 #include "import/library/ModelFileAccess.h"
 #include "import/library/PlainWords.h"
 #include "import/library/SceneReading.h"
@@ -19,7 +17,6 @@
 #include <algorithm>
 #include <array>
 #include <exception>
-#include <future>
 #include <optional>
 #include <set>
 #include <string_view>
@@ -40,17 +37,14 @@ TakenUpAxis upAxisOf(const std::string& format, UpAxis asked) {
     if (asked != UpAxis::by_format) {
         return {asked, TakenUpAxis::Reason::asked, {}};
     }
-    const bool is_open = isOneOf(format, {"obj", "ply", "stl", "off"});
-    const bool is_z = is_open || isOneOf(format, {"3mf", "amf", "blend", "cob", "hmp", "q3o", "q3s",
-                                                  "scn", "smd", "vta"});
-    return {is_z ? UpAxis::z : UpAxis::y,
-            is_open ? TakenUpAxis::Reason::habit : TakenUpAxis::Reason::format,
-            {}};
+    const bool is_z =
+        isOneOf(format, {"3mf", "amf", "blend", "cob", "hmp", "q3o", "q3s", "scn", "smd", "vta"});
+    return {is_z ? UpAxis::z : UpAxis::y, TakenUpAxis::Reason::format, {}};
 }
 
 ModelConventions conventionsOf(const std::string& format) {
     ModelConventions conventions;
-    conventions.keep_normals = !isOneOf(format, {"stl", "blend"});
+    conventions.keep_normals = format != "blend";
     conventions.gltf_cameras = isOneOf(format, {"gltf", "glb"});
     return conventions;
 }
@@ -100,27 +94,12 @@ bool completeScene(Assimp::Importer& importer, std::vector<std::string>& warning
     return scene.mNumMeshes == 0 || importer.ApplyPostProcessing(STEPS) != nullptr;
 }
 
-/// Other bytes than those on the disk, for what the library would not understand or not exactly.
-struct Replacement {
-    std::optional<std::string> bytes;
-    KM_3dPoint origin; ///< where their coordinates begin
-};
-
-Replacement replacementFor(const fs::path& path) {
-    if (std::optional<ShiftedFile> shifted = shiftFarCoordinates(path)) {
-        return {std::move(shifted->bytes), shifted->origin};
-    }
-    return {utf8OfWideFile(path), KM_3dPoint::Origin};
-}
-
 Result<SourceScene> takeChecked(Assimp::Importer& importer, const ModelReading& reading,
-                                const ModelConventions& conventions, const std::string& why_bad) {
+                                const ModelConventions& conventions) {
     const fs::path& path = reading.path;
     std::vector<std::string> warnings;
-    const bool is_complete = completeScene(importer, warnings);
-    if (!is_complete || !why_bad.empty())
-        return cannotReadModel(
-            path, why_bad.empty() ? inPlainWords(importer.GetErrorString()) : why_bad, repair);
+    if (!completeScene(importer, warnings))
+        return cannotReadModel(path, inPlainWords(importer.GetErrorString()), repair);
     const std::unique_ptr<aiScene> scene(importer.GetOrphanedScene());
     importer.FreeScene();
     SourceScene taken = takeScene(*scene, reading, conventions);
@@ -131,12 +110,12 @@ Result<SourceScene> takeChecked(Assimp::Importer& importer, const ModelReading& 
 Result<SourceScene> readChecked(const ModelReading& reading) {
     const fs::path& path = reading.path;
     std::set<std::string> refused;
-    const Replacement replacement = replacementFor(path);
+    const std::optional<std::string> narrow = utf8OfWideFile(modelFormat(path), reading.bytes);
     Assimp::Importer importer;
     auto* const access = new ModelFileAccess(reading.folder, refused);
     importer.SetIOHandler(access); // which owns it
-    if (replacement.bytes) {
-        access->replace(path, *replacement.bytes);
+    if (narrow) {
+        access->replace(path, *narrow);
     }
     configure(importer);
     const std::string extension = path.extension().string();
@@ -144,16 +123,10 @@ Result<SourceScene> readChecked(const ModelReading& reading) {
         return cannotReadModel(path, "files of this kind are not known",
                                "Choose a model file (OBJ, glTF, GLB, PLY, STL, ...).");
     }
-    auto why_bad = std::async(std::launch::async | std::launch::deferred, whyBadIndices, path);
-    if (importer.ReadFile(path.string(), 0) == nullptr) {
-        const std::string why = why_bad.get();
-        return cannotReadModel(path, why.empty() ? inPlainWords(importer.GetErrorString()) : why,
-                               repair);
-    }
+    if (importer.ReadFile(path.string(), 0) == nullptr)
+        return cannotReadModel(path, inPlainWords(importer.GetErrorString()), repair);
     const std::string format = modelFormat(path);
-    ModelConventions conventions = conventionsOf(format);
-    conventions.origin = replacement.origin;
-    Result<SourceScene> scene = takeChecked(importer, reading, conventions, why_bad.get());
+    Result<SourceScene> scene = takeChecked(importer, reading, conventionsOf(format));
     if (!scene) {
         return scene;
     }

@@ -124,7 +124,6 @@ private:
 
     void readMesh(const aiMesh& mesh, SourceMesh& piece) {
         piece.name = isGivenName(mesh.mName) ? textOf(mesh.mName) : KM_wString();
-        piece.origin = m_conventions.origin;
         if (mesh.mPrimitiveTypes & aiPrimitiveType_TRIANGLE) {
             readTriangles(mesh, piece);
         } else if (mesh.mPrimitiveTypes & aiPrimitiveType_LINE) {

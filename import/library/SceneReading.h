@@ -12,7 +12,6 @@ struct ModelConventions {
     /// The loader of glTF repeats a camera's place, which its node states already, and gives the
     /// vertical angle times the aspect for the horizontal one.
     bool gltf_cameras = false;
-    KM_3dPoint origin; ///< where the scene's coordinates begin, in those of the file
 };
 
 /// Takes a scene of the reading library apart. Each mesh's memory is freed as soon as it has been

@@ -1,13 +1,17 @@
 #pragma once
 
-#include <filesystem>
+#include <cstdint>
 #include <optional>
+#include <span>
 #include <string>
+#include <string_view>
 
 namespace quarn {
 
-/// The contents of a text file in UTF-16, which its first two bytes tell, in UTF-8.
+/// The contents of a text file in UTF-16 in UTF-8, for the reading library.
+/// @param format  the extension in lower case
 /// @return nothing for any other file, and for formats that are no text
-std::optional<std::string> utf8OfWideFile(const std::filesystem::path& path);
+std::optional<std::string> utf8OfWideFile(std::string_view format,
+                                          std::span<const std::uint8_t> bytes);
 
 } // namespace quarn

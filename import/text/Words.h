@@ -22,6 +22,14 @@ inline void skipBlanks(std::string_view& rest) {
     rest.remove_prefix(begin);
 }
 
+/// A text without the blanks at its ends.
+inline std::string_view trimmed(std::string_view text) {
+    skipBlanks(text);
+    while (!text.empty() && isBlank(text.back()))
+        text.remove_suffix(1);
+    return text;
+}
+
 /// The next word of a line, which `rest` loses; empty at the end of the line.
 inline std::string_view takeWord(std::string_view& rest) {
     skipBlanks(rest);

@@ -61,7 +61,9 @@ Json texturesOf(const ModelContents& contents) {
 Json upOf(const ModelContents& contents) {
     if (contents.up_axis == 0)
         return nullptr;
-    return {{"axis", std::string(1, contents.up_axis)}, {"why", contents.up_reason}};
+    return {{"axis", std::string(1, contents.up_axis)},
+            {"why", contents.up_reason},
+            {"guessed", contents.up_is_guessed}};
 }
 
 Json boxOf(const ModelContents& contents) {

@@ -57,8 +57,10 @@ std::string sizeLine(const ModelContents& contents) {
 std::string axisLine(const ModelContents& contents) {
     if (contents.up_axis == 0)
         return "";
-    return std::string("up: ") + (contents.up_axis == 'y' ? "Y" : "Z") + ", " + contents.up_reason +
-           "\n";
+    const bool is_y = contents.up_axis == 'y';
+    const std::string hint =
+        contents.up_is_guessed ? std::string("; --up ") + (is_y ? "z" : "y") + " turns it" : "";
+    return std::string("up: ") + (is_y ? "Y" : "Z") + ", " + contents.up_reason + hint + "\n";
 }
 
 /// What the objects of one kind are, summed up.
