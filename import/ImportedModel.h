@@ -59,9 +59,9 @@ struct TakenUpAxis {
 
 /// The place on the earth that a model file states for its origin.
 struct ImportedPlace {
-    double latitude_deg = 0.0;   ///< north positive, -90 to 90
-    double longitude_deg = 0.0;  ///< east positive, -180 to 180
-    double true_north_deg = 0.0; ///< of the y axis, clockwise from north
+    double latitude_deg = 0.0;    ///< north positive, -90 to 90
+    double longitude_deg = 0.0;   ///< east positive, -180 to 180
+    double north_angle_deg = 0.0; ///< from the Y axis to north, clockwise seen from above, 0 to 360
 };
 
 /// What a model file holds.

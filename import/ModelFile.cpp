@@ -2,10 +2,10 @@
 
 #include "ground/FileBytes.h"
 #include "import/assembly/ModelAssembly.h"
+#include "import/cad/CadReader.h"
 #include "import/files/ModelFileCheck.h"
 #include "import/library/LibraryReader.h"
 
-#include <array>
 #include <exception>
 #include <new>
 #include <string_view>
@@ -24,7 +24,10 @@ struct Format {
 };
 
 /// The formats that have a reader of their own.
-constexpr std::array<Format, 0> FORMATS = {};
+constexpr Format FORMATS[] = {
+    {"brep", readBrep}, {"iges", readIges}, {"igs", readIges},
+    {"step", readStep}, {"stp", readStep},
+};
 
 Reader readerOf(const std::string& extension) {
     for (const Format& format : FORMATS)

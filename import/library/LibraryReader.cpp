@@ -2,6 +2,7 @@
 
 #include "import/files/LargeStack.h"
 #include "import/files/ModelFileCheck.h"
+#include "import/ifc/IfcPlace.h"
 #include "import/library/CoordinateShift.h"
 #include "import/library/FaceIndexCheck.h"
 #include "import/library/GltfExtensions.h"
@@ -68,7 +69,8 @@ ModelConventions conventionsOf(const aiScene& scene, const std::string& format) 
 }
 
 UnitSystem unitsOf(const std::string& format) {
-    return isOneOf(format, {"gltf", "glb"}) ? UnitSystem::meters : UnitSystem::none;
+    // The library scales what it reads of IFC to metres, whatever the file counts in.
+    return isOneOf(format, {"gltf", "glb", "ifc"}) ? UnitSystem::meters : UnitSystem::none;
 }
 
 void configure(Assimp::Importer& importer) {
@@ -204,6 +206,9 @@ Result<SourceScene> readChecked(const ModelReading& reading) {
         return scene;
     }
     scene.value().units = unitsOf(format);
+    if (format == "ifc") {
+        scene.value().place = placeOfIfc(reading.bytes);
+    }
     scene.value().up = upAxisOf(format, reading.up);
     warnOfRefused(refused, scene.value());
     return scene;
