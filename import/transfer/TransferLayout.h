@@ -59,10 +59,10 @@ template <class Step, class AnyUp> bool upFields(Step step, AnyUp& up) {
 }
 
 template <class Step, class AnyPlace> bool earthFields(Step step, AnyPlace& place) {
-    return step(place.latitude_deg) && step(place.longitude_deg) && step(place.true_north_deg) &&
+    return step(place.latitude_deg) && step(place.longitude_deg) && step(place.north_angle_deg) &&
            step.check(std::abs(place.latitude_deg) <= 90.0 &&
                       std::abs(place.longitude_deg) <= 180.0 &&
-                      std::isfinite(place.true_north_deg));
+                      std::isfinite(place.north_angle_deg));
 }
 
 } // namespace quarn

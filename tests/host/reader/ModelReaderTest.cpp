@@ -85,7 +85,7 @@ TEST_F(ModelReaderTest, AFolderWithoutPermissionIsTold) {
 TEST_F(ModelReaderTest, ManyFilesInARowLeaveNoProcessAndNoOpenFile) {
     ASSERT_TRUE(readModel(triangle));
     const int open = openDescriptors();
-    for (int i = 0; i < 50; ++i) {
+    for (int i = 0; i < 20; ++i) {
         EXPECT_TRUE(readModel(triangle));
         EXPECT_FALSE(readModel(folder.path() / "missing.obj"));
     }
@@ -261,6 +261,10 @@ TEST_F(StandInReaderTest, NonsenseIsNotTaken) {
 
 TEST_F(StandInReaderTest, ARefusalWithoutWordsHasSome) {
     EXPECT_THAT(whyNot("say_nothing"), HasSubstr("say_nothing.obj could not be read"));
+}
+
+TEST_F(StandInReaderTest, TheReaderKnowsWhereItIsAndSoItsModules) {
+    EXPECT_EQ(whyNot("say_name"), QUARN_STAND_IN_READER);
 }
 
 TEST_F(StandInReaderTest, TheReaderInheritsNothingButItsOwnDescriptors) {

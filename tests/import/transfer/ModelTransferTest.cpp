@@ -106,7 +106,7 @@ TEST(ModelTransfer, CurvesPointsCamerasLightsAndTheRestArriveAsTheyWere) {
     ASSERT_TRUE(arrived.place);
     EXPECT_EQ(arrived.place->latitude_deg, model.place->latitude_deg);
     EXPECT_EQ(arrived.place->longitude_deg, model.place->longitude_deg);
-    EXPECT_EQ(arrived.place->true_north_deg, model.place->true_north_deg);
+    EXPECT_EQ(arrived.place->north_angle_deg, model.place->north_angle_deg);
     EXPECT_EQ(arrived.warnings, model.warnings);
 }
 
