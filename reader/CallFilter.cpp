@@ -17,8 +17,9 @@ constexpr int ALLOWED[] = {
     // what is open already
     SCMP_SYS(read), SCMP_SYS(pread64), SCMP_SYS(readv), SCMP_SYS(preadv), SCMP_SYS(write),
     SCMP_SYS(pwrite64), SCMP_SYS(writev), SCMP_SYS(close), SCMP_SYS(lseek), SCMP_SYS(fcntl),
-    SCMP_SYS(dup), SCMP_SYS(fadvise64), SCMP_SYS(poll), SCMP_SYS(ppoll), SCMP_SYS(sendto),
-    SCMP_SYS(sendmsg), SCMP_SYS(recvfrom), SCMP_SYS(recvmsg), SCMP_SYS(getdents64),
+    SCMP_SYS(dup), SCMP_SYS(pipe), SCMP_SYS(pipe2), SCMP_SYS(fadvise64), SCMP_SYS(poll),
+    SCMP_SYS(ppoll), SCMP_SYS(sendto), SCMP_SYS(sendmsg), SCMP_SYS(recvfrom), SCMP_SYS(recvmsg),
+    SCMP_SYS(getdents64),
     // looking at files
     SCMP_SYS(fstat), SCMP_SYS(newfstatat), SCMP_SYS(stat), SCMP_SYS(lstat), SCMP_SYS(statx),
     SCMP_SYS(fstatfs), SCMP_SYS(statfs), SCMP_SYS(access), SCMP_SYS(faccessat),

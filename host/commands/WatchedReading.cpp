@@ -21,6 +21,9 @@ WatchedReading::~WatchedReading() {
 }
 
 bool WatchedReading::goesOn(ReadingStep step, double share) {
+    // Where the model is read inside this process its threads ask; the front end knows only one.
+    if (std::this_thread::get_id() != m_thread)
+        return true;
     m_is_shown = m_is_shown || std::chrono::steady_clock::now() - m_begin > MOMENT;
     if (m_is_shown)
         m_front_end.modelRead(m_file, shownStep(step), share);

@@ -4,6 +4,7 @@
 
 #include <chrono>
 #include <filesystem>
+#include <thread>
 
 namespace quarn {
 
@@ -27,6 +28,7 @@ public:
 private:
     FrontEnd& m_front_end;
     std::filesystem::path m_file;
+    std::thread::id m_thread = std::this_thread::get_id();
     std::chrono::steady_clock::time_point m_begin = std::chrono::steady_clock::now();
     bool m_is_shown = false;
     bool m_is_given_up = false;

@@ -20,7 +20,7 @@ struct ModelReaderOptions {
     /// How long the reading may take; 0: longestReading of the file.
     std::chrono::milliseconds longest{0};
     /// May be null. Asked on the calling thread some fifty times a second while the reader works;
-    /// outlives the reading.
+    /// outlives the reading. A reading inside this process asks as readModelFile does.
     ReadingWatch* watch = nullptr;
 };
 

@@ -85,7 +85,8 @@ public:
 
     /// @return the process, or -1 with errno set
     pid_t start(const std::filesystem::path& program) const {
-        std::string name = program.filename().string();
+        // Whole: a program looks for what belongs to it from where its name says that it is.
+        std::string name = program.string();
         std::array<char*, 2> arguments = {name.data(), nullptr};
         pid_t process = -1;
         errno = posix_spawn(&process, program.c_str(), &m_actions, &m_attributes, arguments.data(),

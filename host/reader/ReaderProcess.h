@@ -38,7 +38,7 @@ public:
     std::uint64_t memory() const;
     SharedBlock& block() { return m_block; }
     /// Ends the program, unless it has ended, and waits for that.
-    /// @return the signal that ended it before; 0 for none
+    /// @return the signal that ended it, SIGKILL where this did; 0 for none
     int end();
     /// Ends the program without waiting for that.
     void kill();

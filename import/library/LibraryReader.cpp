@@ -39,7 +39,9 @@ TakenUpAxis upAxisOf(const std::string& format, UpAxis asked) {
     }
     const bool is_z =
         isOneOf(format, {"3mf", "amf", "blend", "cob", "hmp", "q3o", "q3s", "scn", "smd", "vta"});
-    return {is_z ? UpAxis::z : UpAxis::y, TakenUpAxis::Reason::format, {}};
+    // What the library hands out Y-up it has turned itself, mostly.
+    return is_z ? TakenUpAxis{UpAxis::z, TakenUpAxis::Reason::format, {}}
+                : TakenUpAxis{UpAxis::y, TakenUpAxis::Reason::file, {}};
 }
 
 ModelConventions conventionsOf(const std::string& format) {

@@ -5,6 +5,9 @@
 #include <fstream>
 #include <sys/resource.h>
 #include <sys/stat.h>
+#include <sys/wait.h>
+#include <thread>
+#include <unistd.h>
 
 namespace quarn::test {
 
@@ -26,6 +29,11 @@ std::string statusLine(pid_t process, const std::string& name) {
         if (line.starts_with(name + ":"))
             return line;
     return {};
+}
+
+/// Ended, with nobody there who waited for it.
+bool isZombie(pid_t process) {
+    return statusLine(process, "State").find('Z') != std::string::npos;
 }
 
 } // namespace
@@ -77,7 +85,7 @@ TEST_F(ModelReaderTest, AFolderWithoutPermissionIsTold) {
 TEST_F(ModelReaderTest, ManyFilesInARowLeaveNoProcessAndNoOpenFile) {
     ASSERT_TRUE(readModel(triangle));
     const int open = openDescriptors();
-    for (int i = 0; i < 50; ++i) {
+    for (int i = 0; i < 20; ++i) {
         EXPECT_TRUE(readModel(triangle));
         EXPECT_FALSE(readModel(folder.path() / "missing.obj"));
     }
@@ -108,6 +116,25 @@ TEST_F(ModelReaderTest, AReaderThatIsKilledFromOutsideIsTold) {
     EXPECT_THAT(messageOf(readModel(largeModel(), {.watch = &watch})),
                 StartsWith("large.obj could not be read: the reader stopped unexpectedly."));
     EXPECT_TRUE(readModel(triangle)) << "the next one is read";
+}
+
+TEST_F(ModelReaderTest, TheReaderEndsWithAHostThatIsKilled) {
+    const std::filesystem::path model = largeModel();
+    const pid_t host = fork();
+    ASSERT_GE(host, 0);
+    if (host == 0)
+        _exit(readModel(model) ? 0 : 1);
+    std::vector<pid_t> readers;
+    while (readers.empty() || statusLine(readers[0], "Seccomp") != "Seccomp:\t2")
+        readers = childProcesses(std::to_string(host));
+    kill(host, SIGKILL);
+    waitpid(host, nullptr, 0);
+    const auto begin = std::chrono::steady_clock::now();
+    while (kill(readers[0], 0) == 0 && !isZombie(readers[0]) &&
+           std::chrono::steady_clock::now() - begin < std::chrono::seconds(10))
+        std::this_thread::sleep_for(milliseconds(1));
+    EXPECT_LT(std::chrono::steady_clock::now() - begin, milliseconds(200))
+        << "the reading alone would have gone on";
 }
 
 TEST_F(ModelReaderTest, AFileThatGrowsWhileItIsReadIsReadOrTold) {
@@ -234,6 +261,10 @@ TEST_F(StandInReaderTest, NonsenseIsNotTaken) {
 
 TEST_F(StandInReaderTest, ARefusalWithoutWordsHasSome) {
     EXPECT_THAT(whyNot("say_nothing"), HasSubstr("say_nothing.obj could not be read"));
+}
+
+TEST_F(StandInReaderTest, TheReaderKnowsWhereItIsAndSoItsModules) {
+    EXPECT_EQ(whyNot("say_name"), QUARN_STAND_IN_READER);
 }
 
 TEST_F(StandInReaderTest, TheReaderInheritsNothingButItsOwnDescriptors) {

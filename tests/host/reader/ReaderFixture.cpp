@@ -30,9 +30,9 @@ Limited::~Limited() {
     setrlimit(static_cast<__rlimit_resource>(m_what), &limits);
 }
 
-std::vector<pid_t> childProcesses() {
+std::vector<pid_t> childProcesses(const std::string& parent) {
     std::vector<pid_t> children;
-    for (const auto& thread : std::filesystem::directory_iterator("/proc/self/task")) {
+    for (const auto& thread : std::filesystem::directory_iterator("/proc/" + parent + "/task")) {
         std::ifstream list(thread.path() / "children");
         for (pid_t child = 0; list >> child;)
             children.push_back(child);

@@ -50,8 +50,9 @@ private:
     Look m_look;
 };
 
-/// Processes that this one has started and not waited for.
-std::vector<pid_t> childProcesses();
+/// Processes that a process has started and not waited for.
+/// @param parent  "self", or its number
+std::vector<pid_t> childProcesses(const std::string& parent = "self");
 int openDescriptors();
 
 /// Reads models with the program that comes with the host.

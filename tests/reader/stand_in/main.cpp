@@ -4,6 +4,7 @@
 #include "import/transfer/ReaderMessages.h"
 
 #include <array>
+#include <cerrno>
 #include <chrono>
 #include <csignal>
 #include <cstdio>
@@ -113,6 +114,7 @@ void behave(const std::filesystem::path& path) {
         {"tell_for_ever", tellForEver},
         {"list_descriptors", listDescriptors},
         {"list_environment", listEnvironment},
+        {"say_name", [] { refuse(program_invocation_name); }},
         {"say_nothing", [] { refuse(""); }},
     };
     if (path.stem() == "read_mapped")
