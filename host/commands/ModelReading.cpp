@@ -48,7 +48,7 @@ ContentCounts countsOf(const ImportedModel& model) {
             .curves = model.curves.size(),
             .points = static_cast<std::size_t>(model.points.Count()),
             .cameras = model.cameras.size(),
-            .lights = 0};
+            .lights = model.lights.size()};
 }
 
 ContentCounts countsOf(const DocumentContent& content) {

@@ -89,7 +89,7 @@ private:
         for (const KM_MeshTriangle& face : faces)
             m_selected.insert(m_selected.end(), std::begin(face.vi), std::end(face.vi));
         std::ranges::sort(m_selected);
-        m_selected.erase(std::ranges::unique(m_selected).begin(), m_selected.end());
+        m_selected.erase(std::unique(m_selected.begin(), m_selected.end()), m_selected.end());
         m_count = m_selected.size();
         for (KM_MeshTriangle& face : faces)
             for (std::uint32_t& v : face.vi)
