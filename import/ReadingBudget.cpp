@@ -12,8 +12,8 @@ Result<void> ReadingBudget::take(std::uint64_t bytes, std::string_view what) {
         if (bytes > m_bytes - taken)
             return Error{"its " + std::string(what) + " need " + gigabyteText(bytes) +
                          " of memory, and of the " + gigabyteText(m_bytes) +
-                         " that reading may take (--limit-memory) only " + gigabyteText(m_bytes - taken) +
-                         " are left"};
+                         " that reading may take (--limit-memory) only " +
+                         gigabyteText(m_bytes - taken) + " are left"};
     } while (!m_taken.compare_exchange_weak(taken, taken + bytes));
     return {};
 }
