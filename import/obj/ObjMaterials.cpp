@@ -128,8 +128,8 @@ bool ObjMaterials::readFile(const NamedFile& file) {
     Result<FileText> text = FileText::of(bytes.value().bytes(), m_reading.budget);
     if (!text)
         return false;
-    const Source& source =
-        m_sources.emplace_back(std::move(bytes.value()), std::move(text.value()));
+    m_sources.push_back({std::move(bytes.value()), std::move(text.value())});
+    const Source& source = m_sources.back();
     keepMaterials(source.text.text(), file.path.filename().string());
     return true;
 }
