@@ -7,6 +7,7 @@
 #include <limits>
 #include <memory>
 #include <span>
+#include <utility>
 
 namespace quarn {
 
@@ -23,6 +24,33 @@ private:
     std::unique_ptr<std::uint8_t[]> m_bytes;
     std::size_t m_size;
 };
+
+/// The bytes of a file where the system keeps them, without a copy. Who shortens the file meanwhile
+/// ends the program that reads on (SIGBUS): for processes that may end.
+class MappedFile {
+public:
+    /// Takes over a mapping.
+    MappedFile(const std::uint8_t* bytes, std::size_t size) : m_bytes(bytes), m_size(size) {}
+    MappedFile(MappedFile&& other) noexcept
+        : m_bytes(std::exchange(other.m_bytes, nullptr)), m_size(std::exchange(other.m_size, 0)) {}
+    MappedFile& operator=(MappedFile&& other) noexcept {
+        std::swap(m_bytes, other.m_bytes);
+        std::swap(m_size, other.m_size);
+        return *this;
+    }
+    ~MappedFile();
+
+    /// Valid as long as this object.
+    std::span<const std::uint8_t> bytes() const { return {m_bytes, m_size}; }
+
+private:
+    const std::uint8_t* m_bytes;
+    std::size_t m_size;
+};
+
+/// Maps a whole file.
+/// @return an error as readFileBytes has it
+Result<MappedFile> mapFile(const std::filesystem::path& file);
 
 /// Reads a whole file.
 /// @param most_bytes  a longer file is not read

@@ -154,6 +154,10 @@ void AnimationBar::pictureRendered(double share) {
     m_progress->showPicture(share);
 }
 
+void AnimationBar::modelRead(ModelStep step, double share) {
+    m_progress->showModel(step, share);
+}
+
 /// The first picture is of the display mode, before any frame.
 void AnimationBar::viewShown(const CQuarnView& view) {
     const bool is_animated =

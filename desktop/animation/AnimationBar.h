@@ -2,6 +2,7 @@
 
 #include "desktop/animation/AnimationSummary.h"
 #include "desktop/animation/MediaIcons.h"
+#include "host/front_end/FrontEnd.h"
 
 #include <QHBoxLayout>
 #include <QLabel>
@@ -45,6 +46,7 @@ public slots:
     void record();
     void frameWritten(const std::filesystem::path& file, int written, int total);
     void pictureRendered(double share);
+    void modelRead(ModelStep step, double share);
     /// A view shows another picture: while the animation plays, its next frame.
     void viewShown(const CQuarnView& view);
 

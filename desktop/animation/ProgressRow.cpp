@@ -55,6 +55,17 @@ void ProgressRow::showPicture(double share) {
     show(share, localized(L"Rendering: %1 %", 45238).arg(percent));
 }
 
+/// How far the building is nobody knows.
+void ProgressRow::showModel(ModelStep step, double share) {
+    if (step == ModelStep::built) {
+        show(1.0, localized(L"Building the scene", 45432));
+        return;
+    }
+    const QString text = step == ModelStep::read ? localized(L"Reading: %1 %", 45430)
+                                                 : localized(L"Making the meshes: %1 %", 45431);
+    show(share, text.arg(static_cast<int>(std::floor(share * 100.0))));
+}
+
 void ProgressRow::show(double share, const QString& text) {
     m_bar->setValue(static_cast<int>(std::lround(share * STEPS)));
     m_text->setText(text);

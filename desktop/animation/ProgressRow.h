@@ -1,6 +1,7 @@
 #pragma once
 
 #include "desktop/animation/RecordingPace.h"
+#include "host/front_end/FrontEnd.h"
 
 #include <QLabel>
 #include <QProgressBar>
@@ -8,7 +9,7 @@
 
 namespace quarn::desktop {
 
-/// How far a recording or a rendered picture is, with a button that ends it.
+/// How far a recording, a rendered picture or a model being read is, with a button that ends it.
 class ProgressRow final : public QWidget {
     Q_OBJECT
 public:
@@ -19,6 +20,9 @@ public:
     void showFrame(int written, int total);
     /// @param share  of one picture, from 0 to 1
     void showPicture(double share);
+    /// How far a model file is read.
+    /// @param share  of the step, from 0 to 1
+    void showModel(ModelStep step, double share);
     int framesWritten() const { return m_frames_written; }
 
 signals:

@@ -139,6 +139,12 @@ void DesktopFrontEnd::pictureRendered(double share) {
     breatheWhenDue();
 }
 
+void DesktopFrontEnd::modelRead(const std::filesystem::path&, ModelStep step, double share) {
+    if (m_parts.model_read)
+        m_parts.model_read(step, share);
+    breatheWhenDue();
+}
+
 void DesktopFrontEnd::viewShown(CQuarnView& view, const ShownPicture& picture) {
     if (m_parts.view_shown)
         m_parts.view_shown(view, picture);

@@ -33,6 +33,7 @@ struct FrontEndParts {
     std::function<void(const std::filesystem::path& file, int written, int total)> frame_written;
     std::function<void(const RecordingReport& report)> recording_ended;
     std::function<void(double share)> picture_rendered;
+    std::function<void(ModelStep step, double share)> model_read;
     std::function<void(CQuarnView& view, const ShownPicture& picture)> view_shown;
     std::function<void(const ShownPicture& picture)> render_window_shown;
 };
@@ -70,6 +71,7 @@ public:
     void frameWritten(const std::filesystem::path& file, int written, int total) override;
     void recordingEnded(const RecordingReport& report) override;
     void pictureRendered(double share) override;
+    void modelRead(const std::filesystem::path& file, ModelStep step, double share) override;
     void viewShown(CQuarnView& view, const ShownPicture& picture) override;
     void renderWindowShown(const ShownPicture& picture) override;
 

@@ -1,5 +1,7 @@
 #include "desktop/window/Arguments.h"
 
+#include "host/session/MemorySize.h"
+
 #include <QCommandLineParser>
 
 #include <cmath>
@@ -25,6 +27,15 @@ void readBeat(const QString& seconds, Arguments& read) {
         read.recovery_every = std::chrono::milliseconds(std::llround(every_s * 1000.0));
 }
 
+/// What reading a model may take; a mistake where it is no size.
+void readMemory(const QString& size, Arguments& read) {
+    const std::optional<std::uint64_t> bytes = memorySize(size.toStdString());
+    if (bytes)
+        read.most_memory = *bytes;
+    else
+        read.mistake = "--limit-memory takes a size from 1M, such as 500M or 2G.";
+}
+
 } // namespace
 
 Arguments readArguments(const QStringList& arguments) {
@@ -46,11 +57,16 @@ Arguments readArguments(const QStringList& arguments) {
     const QCommandLineOption overwrite(
         "overwrite",
         "Replaces write-protected files, and by a recording those that none of its name wrote.");
+    const QCommandLineOption memory("limit-memory",
+                                    "Memory that reading a model may take, such as 500M or 2G. "
+                                    "Default: half of what is free.",
+                                    "size");
     const QCommandLineOption every(
         "recovery-every", "Keeps unsaved work for recovery so often. Default: 10.", "seconds");
     const QCommandLineOption no_recovery(
         "no-recovery", "Neither keeps unsaved work for recovery nor offers that of earlier runs.");
-    parser.addOptions({help, version, language, overwrite, script, exit, every, no_recovery});
+    parser.addOptions(
+        {help, version, language, overwrite, script, exit, memory, every, no_recovery});
 
     Arguments read;
     const bool is_good = parser.parse(arguments);
@@ -70,6 +86,8 @@ Arguments readArguments(const QStringList& arguments) {
     read.wants_recovery = !parser.isSet(no_recovery);
     if (read.mistake.isEmpty() && parser.isSet(every))
         readBeat(parser.value(every), read);
+    if (read.mistake.isEmpty() && parser.isSet(memory))
+        readMemory(parser.value(memory), read);
     return read;
 }
 

@@ -145,6 +145,9 @@ FrontEndParts MainWindow::parts() {
     };
     parts.recording_ended = [this](const RecordingReport& report) { noteRecording(report); };
     parts.picture_rendered = [this](double share) { showRenderProgress(share); };
+    parts.model_read = [this](ModelStep step, double share) {
+        m_animation->modelRead(step, share);
+    };
     parts.view_shown = [this](CQuarnView& view, const ShownPicture& picture) {
         m_views->showPicture(view, picture);
         m_animation->viewShown(view);

@@ -65,7 +65,8 @@ void RayMesh::packNormals() {
         const KM_3fVector& n = m_mesh->m_N[i];
         packed[i] = packNormal(n.x, n.y, n.z);
     });
-    m_corner_normals.resize(3 * m_mesh->m_F.size());
+    // Not set to zeros first: that would take longer than the rest.
+    m_corner_normals = std::make_unique_for_overwrite<std::uint32_t[]>(3 * m_mesh->m_F.size());
     forAll(m_mesh->m_F.size(), [&](std::size_t i) {
         for (std::size_t corner = 0; corner < 3; ++corner)
             m_corner_normals[3 * i + corner] = packed[m_mesh->m_F[i].vi[corner]];
@@ -73,7 +74,7 @@ void RayMesh::packNormals() {
 }
 
 const std::uint32_t* RayMesh::cornerNormals() const {
-    return m_corner_normals.empty() ? nullptr : m_corner_normals.data();
+    return m_corner_normals.get();
 }
 
 const KM_3fPoint* RayMesh::paddedVertices() const {

@@ -44,7 +44,7 @@ private:
     KM_BoundingBox m_box;
     bool m_drawable = false;
     bool m_in_range = true;
-    std::vector<std::uint32_t> m_corner_normals;
+    std::unique_ptr<std::uint32_t[]> m_corner_normals; ///< null when the mesh has no normals
     std::vector<KM_3fPoint> m_padded_copy; ///< empty when the mesh's own vertices are padded
     mutable std::unique_ptr<MeshEdges> m_edges;
 };

@@ -5,7 +5,7 @@
 #include "host/app/DocumentsFolder.h"
 #include "host/commands/WordsLeft.h"
 #include "host/document/file/DocumentExtension.h"
-#include "import/ModelExtensions.h"
+#include "import/ModelFormats.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLocalize.h"
 

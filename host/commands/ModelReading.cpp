@@ -5,10 +5,13 @@
 #include "host/app/DocumentSaving.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileNameQuestion.h"
+#include "host/commands/UpAxisText.h"
+#include "host/commands/WatchedReading.h"
 #include "host/document/DocumentList.h"
 #include "host/document/ViewFit.h"
 #include "host/document/file/DocumentExtension.h"
 #include "host/document/file/DocumentFile.h"
+#include "host/reader/ModelReader.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLocalize.h"
 
@@ -48,7 +51,7 @@ ContentCounts countsOf(const ImportedModel& model) {
             .curves = model.curves.size(),
             .points = static_cast<std::size_t>(model.points.Count()),
             .cameras = model.cameras.size(),
-            .lights = 0};
+            .lights = model.lights.size()};
 }
 
 ContentCounts countsOf(const DocumentContent& content) {
@@ -72,7 +75,12 @@ void tellContent(const AskedFile& asked, const std::vector<std::string>& warning
         application.tell(warning);
     const ContentCounts counts =
         std::visit([](const auto& content) { return countsOf(content); }, asked.content);
-    application.tell(textFromPath(asked.file.filename()).ToUtf8() + ": " + counts.text());
+    std::string result = textFromPath(asked.file.filename()).ToUtf8() + ": " + counts.text();
+    if (const auto* model = std::get_if<ImportedModel>(&asked.content)) {
+        const std::string axis = upAxisText(model->up);
+        result += axis.empty() ? axis : ". " + axis;
+    }
+    application.tell(result);
 }
 
 void fitViews(Document& document) {
@@ -100,14 +108,37 @@ CQuarnCommand::result askUpAxis(UpAxis& up) {
     return CQuarnCommand::success;
 }
 
-/// Asks for the file and, where the option is picked, for the axis that points up in it.
-CQuarnCommand::result askFile(std::filesystem::path& file, UpAxis& up) {
+/// @param tolerance  receives the answer
+CQuarnCommand::result askTolerance(double& tolerance) {
+    CQuarnGetNumber get;
+    get.SetCommandPrompt(
+        QnLocalizeString(L"How far meshes may lie beside curved surfaces, 0 for by size", 42660));
+    get.SetLowerLimit(0.0);
+    if (get.GetNumber() != CQuarnGet::number)
+        return get.CommandResult() == CQuarnCommand::success ? CQuarnCommand::failure
+                                                             : get.CommandResult();
+    tolerance = get.Number();
+    return CQuarnCommand::success;
+}
+
+/// How a person wants a model file to be read.
+struct ReadingWish {
+    UpAxis up = UpAxis::by_format;
+    double tolerance = 0.0; ///< as ReadingOptions has it
+
+    bool isUsual() const { return up == UpAxis::by_format && tolerance == 0.0; }
+};
+
+/// Asks for the file and, where their options are picked, how it is to be read.
+CQuarnCommand::result askFile(std::filesystem::path& file, ReadingWish& wish) {
     FileNameQuestion get;
     get.SetCommandPrompt(QnLocalizeString(L"Model or document file", 42050));
-    get.AddCommandOption(QnLocalizeCommandOptionName(L"Up", 42051));
+    const int up = get.AddCommandOption(QnLocalizeCommandOptionName(L"Up", 42051));
+    get.AddCommandOption(QnLocalizeCommandOptionName(L"Tolerance", 42660));
     CQuarnGet::result answer = get.GetString();
     while (answer == CQuarnGet::option) {
-        const CQuarnCommand::result asked = askUpAxis(up);
+        const CQuarnCommand::result asked =
+            get.Option()->m_option_index == up ? askUpAxis(wish.up) : askTolerance(wish.tolerance);
         if (asked != CQuarnCommand::success)
             return asked;
         answer = get.GetString();
@@ -117,9 +148,9 @@ CQuarnCommand::result askFile(std::filesystem::path& file, UpAxis& up) {
     return get.CommandResult();
 }
 
-Result<void> readDocument(AskedFile& asked, UpAxis up) {
-    if (up != UpAxis::by_format)
-        return Error{"A document tells itself which axis points up; leave Up out."};
+Result<void> readDocument(AskedFile& asked, const ReadingWish& wish) {
+    if (!wish.isUsual())
+        return Error{"A document has its axes and its meshes; leave Up and Tolerance out."};
     auto content = readDocumentFile(asked.file);
     if (!content)
         return content.error();
@@ -127,8 +158,14 @@ Result<void> readDocument(AskedFile& asked, UpAxis up) {
     return {};
 }
 
-Result<void> readModel(AskedFile& asked, UpAxis up) {
-    auto model = readModelFile(asked.file, up);
+Result<void> readModelOf(AskedFile& asked, const ReadingWish& wish) {
+    const Application& application = *Application::current();
+    WatchedReading watch(application.frontEnd(), asked.file);
+    auto model = readModel(asked.file, {.up = wish.up,
+                                        .tolerance = wish.tolerance,
+                                        .most_memory = application.options().most_memory,
+                                        .watch = &watch});
+    asked.is_given_up = watch.isGivenUp();
     if (!model)
         return model.error();
     asked.content = std::move(model.value());
@@ -139,18 +176,21 @@ Result<void> readModel(AskedFile& asked, UpAxis up) {
 
 AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use) {
     AskedFile asked;
-    UpAxis up = UpAxis::by_format;
+    ReadingWish wish;
     const FileChoice choice = chooseFile(context, use);
     if (choice.kind == FileChoice::Kind::nobody)
-        asked.result = askFile(asked.file, up);
+        asked.result = askFile(asked.file, wish);
     else if (choice.kind == FileChoice::Kind::given_up)
         asked.result = CQuarnCommand::cancel;
     asked.file = choice.kind == FileChoice::Kind::chosen ? choice.file : asked.file;
     if (asked.result != CQuarnCommand::success)
         return asked;
-    const auto read = isDocumentFile(asked.file) ? readDocument(asked, up) : readModel(asked, up);
+    const auto read =
+        isDocumentFile(asked.file) ? readDocument(asked, wish) : readModelOf(asked, wish);
     if (!read)
         asked.result = fail(read.message());
+    if (!read && asked.is_given_up)
+        asked.result = CQuarnCommand::cancel;
     return asked;
 }
 

@@ -2,7 +2,7 @@
 
 #include "host/commands/FileAsking.h"
 #include "host/document/file/DocumentContent.h"
-#include "import/ModelFile.h"
+#include "import/ImportedModel.h"
 #include "sdk/qncore/QnCommand.h"
 
 #include <filesystem>
@@ -17,6 +17,7 @@ class DocumentList;
 struct AskedFile {
     CQuarnCommand::result result = CQuarnCommand::success;
     std::filesystem::path file;
+    bool is_given_up = false;                             ///< by the person, while it was read
     std::variant<ImportedModel, DocumentContent> content; ///< only after success
 };
 

@@ -221,6 +221,9 @@ void Document::addModel(const ImportedModel& model) {
         m_objects.addPoint(KM_wString(), point);
     for (const ImportedCamera& camera : model.cameras)
         m_named_views.push_back({camera.name, camera.viewport});
+    for (const KM_Light& light : model.lights)
+        m_lights.add(light);
+    m_reading_notes = std::make_shared<const ReadingNotes>(ReadingNotes{model.up, model.warnings});
     fitTolerance();
 }
 

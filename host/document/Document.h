@@ -26,6 +26,7 @@ enum class MeshEdgeChoice : int;
 struct DocumentContent;
 struct FileRemainder;
 struct ImportedModel;
+struct ReadingNotes;
 struct ObjectContent;
 struct SavedState;
 
@@ -143,6 +144,8 @@ public:
     /// of a millimetre in a document of metres is not smaller than what counts as one point. A
     /// document without objects takes over the units of the model.
     void addModel(const ImportedModel& model);
+    /// Of the model file that was added last; null where none was.
+    const ReadingNotes* readingNotes() const { return m_reading_notes.get(); }
 
     /// Takes over what a document file holds, in place of what the document has; for a document
     /// that was opened for the file just now. What plug-ins keep is not looked at.
@@ -196,6 +199,7 @@ private:
     mutable std::shared_ptr<const ObjectCopies> m_object_copies; ///< null: none were made yet
     mutable std::uint64_t m_copied_changes = 0; ///< of the objects, when they were made
     std::vector<NamedView> m_named_views;
+    std::shared_ptr<const ReadingNotes> m_reading_notes;
     std::vector<std::unique_ptr<ViewState>> m_views;
     ViewState* m_active_view = nullptr;
     std::vector<ViewState*> m_due_views; ///< to be closed when the command ends

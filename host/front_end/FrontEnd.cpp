@@ -16,6 +16,8 @@ void FrontEnd::warn(std::wstring_view text) {
 
 void FrontEnd::pictureRendered(double) {}
 
+void FrontEnd::modelRead(const std::filesystem::path&, ModelStep, double) {}
+
 std::unique_ptr<DialogWindow> FrontEnd::makeDialog(const DialogTemplate&, HWND) {
     return nullptr;
 }

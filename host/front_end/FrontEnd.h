@@ -44,6 +44,13 @@ struct Answer {
     KM_wString text;
 };
 
+/// The steps in which a model file becomes something to see, one after the other.
+enum class ModelStep {
+    read,  ///< the file is understood
+    made,  ///< its meshes are made
+    built, ///< they are taken over, so that they can be drawn
+};
+
 /// The port through which everything is asked of, and told to, a person. The host calls it on the
 /// main thread only. Implementations throw nothing.
 class QNCORE_API FrontEnd {
@@ -82,6 +89,12 @@ public:
     /// Told some times a second while a picture is rendered. Shows nothing unless it is overridden.
     /// @param share  how much of the picture is done, from 0 to 1; 1 comes last, however it ended
     virtual void pictureRendered(double share);
+    /// Told some times a second while a model file is read that takes longer than a moment, and
+    /// once when that has ended. Shows nothing unless it is overridden.
+    /// @param share  how much of the step is done, from 0 to 1; that of the step `built` is 0 when
+    /// it
+    ///               begins, and 1 comes last, however it ended
+    virtual void modelRead(const std::filesystem::path& file, ModelStep step, double share);
 
     // ---- Windows. A front end without any leaves these as they are: it shows nothing, and nobody
     // chooses.

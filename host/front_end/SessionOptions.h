@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <filesystem>
 #include <optional>
 #include <string>
@@ -34,6 +35,8 @@ struct SessionOptions {
     /// Whether write-protected files are replaced, and by a recording also files of others that
     /// have the names of its pictures or its page.
     bool overwrites = false;
+    /// How much memory reading a model file may take, in bytes; 0: half of what is free then.
+    std::uint64_t most_memory = 0;
 };
 
 } // namespace quarn

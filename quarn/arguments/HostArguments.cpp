@@ -36,14 +36,6 @@ CLI::Option* addModel(CLI::App& command, FileWish& wish, const std::string& desc
                                 description);
 }
 
-Action addReport(CLI::App& command,
-                 Outcome (*report)(const std::filesystem::path&, const CommonOptions&)) {
-    const auto wish = std::make_shared<FileWish>();
-    addModel(command, *wish, "The model file or document")->required();
-    addCommonOptions(command, wish->common);
-    return [=] { return report(wish->model, wish->common); };
-}
-
 Reading<std::filesystem::path> savedDocument() {
     using Path = std::filesystem::path;
     return [](const std::string&, const std::string& word) -> std::variant<Path, Refusal> {
@@ -58,11 +50,22 @@ Reading<std::filesystem::path> savedDocument() {
 } // namespace
 
 Action addCurves(CLI::App& command) {
-    return addReport(command, &reportCurves);
+    const auto wish = std::make_shared<FileWish>();
+    addModel(command, *wish, "The model file or document")->required();
+    addCommonOptions(command, wish->common);
+    return [=] { return reportCurves(wish->model, wish->common); };
 }
 
 Action addInfo(CLI::App& command) {
-    return addReport(command, &reportModel);
+    const auto wish = std::make_shared<FileWish>();
+    const auto is_json = std::make_shared<bool>(false);
+    addModel(command, *wish, "The model file or document")->required();
+    command.add_flag("--json", *is_json, "Tell it to a program, as JSON");
+    addCommonOptions(command, wish->common);
+    return [=] {
+        return reportModel(wish->model, *is_json ? ReportForm::json : ReportForm::text,
+                           wish->common);
+    };
 }
 
 Action addFrame(CLI::App& command) {

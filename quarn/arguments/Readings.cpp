@@ -1,5 +1,7 @@
 #include "quarn/arguments/Readings.h"
 
+#include "host/session/MemorySize.h"
+
 #include <algorithm>
 
 namespace quarn::program {
@@ -70,6 +72,10 @@ Reading<PixelSize> sizeOfPicture() {
             return size && is_good(size->width_px) && is_good(size->height_px) ? size
                                                                                : std::nullopt;
         });
+}
+
+Reading<std::uint64_t> sizeOfMemory() {
+    return reading<std::uint64_t>("a size such as 500M or 2G, from 1M", &memorySize);
 }
 
 Reading<std::string> oneOf(const std::vector<std::string>& words) {

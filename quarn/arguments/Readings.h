@@ -3,6 +3,7 @@
 #include "quarn/arguments/OptionAdder.h"
 #include "quarn/words/DateWords.h"
 
+#include <cstdint>
 #include <optional>
 #include <string>
 #include <vector>
@@ -18,6 +19,8 @@ Reading<int> wholeNumberFrom(int low, std::optional<int> high = {}, const std::s
 Reading<double> numberFrom(double low, double high, const std::string& unit = "");
 Reading<Triple> point();
 Reading<PixelSize> sizeOfPicture();
+/// In bytes.
+Reading<std::uint64_t> sizeOfMemory();
 
 /// One of these words in any case; the value is in lower case, as they are.
 Reading<std::string> oneOf(const std::vector<std::string>& words);

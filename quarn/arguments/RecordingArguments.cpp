@@ -63,6 +63,9 @@ void addCommonOptions(CLI::App& command, CommonOptions& common) {
     command.add_flag("--verbose", common.is_verbose, "Show what the host's commands print");
     command.add_option("--language", common.language,
                        "Language of texts, such as de or ja (default: the environment's)");
+    const OptionAdder add(command);
+    add("--limit-memory", common.most_memory, "SIZE", sizeOfMemory(),
+        "Memory that reading a model may take, such as 500M or 2G (default: half of what is free)");
 }
 
 void addShowScript(CLI::App& command, bool& is_only_shown) {
@@ -86,6 +89,9 @@ void addModelAndFolder(const OptionAdder& add, RecordingRequest& request) {
     add("--up", request.up_axis, "AXIS", oneOf({"y", "z"}),
         "Axis that points up in the file, y or z (default: y for glTF and such, z for OBJ, PLY, "
         "STL)");
+    add("--tolerance", request.tolerance, "LENGTH", numberFrom(1e-9, 1e9),
+        "How far meshes may lie beside the curved surfaces of STEP, IGES and BREP, in their units "
+        "(default: a thousandth of the model's size)");
 }
 
 void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse& use,
@@ -112,6 +118,8 @@ void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse
 std::optional<std::string> settle(RecordingRequest& request) {
     if (!request.up_axis.empty() && isDocument(request.model))
         return "--up is for model files; a document knows its axes.";
+    if (request.tolerance > 0.0 && isDocument(request.model))
+        return "--tolerance is for model files; a document has its meshes.";
     if (request.samples > 0 && !request.mode.is_rendered)
         return "--samples is for rendered pictures: with it --mode must be RenderFull or "
                "RenderPreview, not \"" +

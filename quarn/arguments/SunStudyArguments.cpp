@@ -1,10 +1,13 @@
 // The recordings whose sun moves, and the places that they know.
 #include "host/cities/Cities.h"
+#include "host/session/StatedSite.h"
 #include "quarn/arguments/Readings.h"
 #include "quarn/arguments/RecordingArguments.h"
 #include "quarn/arguments/Subcommands.h"
 #include "quarn/reports/PlaceList.h"
 #include "quarn/scripts/SunStudyScript.h"
+
+#include <cmath>
 
 namespace quarn::program {
 
@@ -20,6 +23,7 @@ struct TypedStudy {
     const City* city = nullptr;
     std::optional<double> latitude_deg;
     std::optional<double> longitude_deg;
+    std::optional<double> north_deg;
     COleDateTime first_date;
     COleDateTime last_date;
     ClockTime first_time{};
@@ -39,13 +43,14 @@ Reading<const City*> cityName() {
 
 void addSiteOptions(const OptionAdder& add, TypedStudy& typed) {
     add("--place", typed.city, "NAME", cityName(),
-        "City where the model stands; quarn places lists them");
+        "City where the model stands; quarn places lists them. An IFC file may state its own place "
+        "and north, which count where these options are left out");
     add("--latitude", typed.latitude_deg, "DEG", numberFrom(-90, 90, "degrees"),
         "Or: degrees north, -90 to 90");
     add("--longitude", typed.longitude_deg, "DEG", numberFrom(-180, 180, "degrees"),
         "and degrees east, -180 to 180; west is negative");
-    add("--north", typed.request.site.north_deg, "DEG", numberFrom(-360, 360, "degrees"),
-        "Where north is in the model, in degrees clockwise from its Y axis", "0");
+    add("--north", typed.north_deg, "DEG", numberFrom(-360, 360, "degrees"),
+        "Where north is in the model, in degrees clockwise from its Y axis (default: 0)");
 }
 
 void addViewOptions(const OptionAdder& add, StudyView& view) {
@@ -62,20 +67,37 @@ void addViewOptions(const OptionAdder& add, StudyView& view) {
         "Distance of the camera, 1 where the model just fits into the picture (default: 1.1)");
 }
 
+/// To some ten centimetres on the ground.
+double shortened(double degrees) {
+    return std::round(degrees * 1e6) / 1e6;
+}
+
+/// Takes the place that the model's file states.
+std::optional<std::string> settleByModel(const std::filesystem::path& model, StudySite& site) {
+    const std::optional<StatedSite> stated = statedSite(model);
+    if (!stated)
+        return "say where the model stands with --place, or with --latitude and --longitude; "
+               "quarn places lists the places.";
+    site = {"As " + model.filename().native() + " states", shortened(stated->latitude_deg),
+            shortened(stated->longitude_deg), shortened(stated->north_angle_deg)};
+    return std::nullopt;
+}
+
 std::optional<std::string> settleSite(const TypedStudy& typed, StudySite& site) {
     const bool has_coordinate = typed.latitude_deg || typed.longitude_deg;
     if (typed.city && has_coordinate)
         return "give either --place, or --latitude and --longitude.";
-    if (!typed.city && !has_coordinate)
-        return "say where the model stands with --place, or with --latitude and --longitude; "
-               "quarn places lists the places.";
-    if (!typed.city && !(typed.latitude_deg && typed.longitude_deg))
+    if (!typed.city && has_coordinate && !(typed.latitude_deg && typed.longitude_deg))
         return "--latitude and --longitude go together.";
+    std::optional<std::string> mistake;
     if (typed.city)
-        site.place = nameWithCountry(*typed.city);
-    site.latitude_deg = typed.city ? typed.city->latitude_deg : *typed.latitude_deg;
-    site.longitude_deg = typed.city ? typed.city->longitude_deg : *typed.longitude_deg;
-    return std::nullopt;
+        site = {nameWithCountry(*typed.city), typed.city->latitude_deg, typed.city->longitude_deg};
+    else if (has_coordinate)
+        site = {"", *typed.latitude_deg, *typed.longitude_deg};
+    else
+        mistake = settleByModel(typed.request.recording.model, site);
+    site.north_deg = typed.north_deg.value_or(site.north_deg);
+    return mistake;
 }
 
 /// An end of the span, as its option has it.

@@ -4,7 +4,11 @@
 
 namespace quarn::program {
 
-/// `quarn info`: reads a model file and tells what is in it.
-Outcome reportModel(const std::filesystem::path& model, const CommonOptions& common);
+enum class ReportForm { text, json };
+
+/// `quarn info`: reads a model file or a document and tells what is in it, to people or to
+/// programs.
+Outcome reportModel(const std::filesystem::path& model, ReportForm form,
+                    const CommonOptions& common);
 
 } // namespace quarn::program

@@ -12,7 +12,8 @@ namespace quarn::program {
 /// What every recording needs, whatever moves in it.
 struct RecordingRequest {
     std::filesystem::path model;
-    std::string up_axis; ///< "y", "z" or, by the format, empty
+    std::string up_axis;    ///< "y", "z" or, by the format, empty
+    double tolerance = 0.0; ///< of curved surfaces, in model units; 0: by the model's size
     std::filesystem::path folder;
     std::string name; ///< of the animation, its pictures and its page; UTF-8
     int frames = 0;

@@ -17,7 +17,7 @@ std::string samplesAnswer(const RecordingRequest& request) {
 RecordingScript composeRecording(const RecordingRequest& request, const AnimationLines& lines) {
     RecordingScript script;
     script.notes = lines.notes;
-    script.reading = readingLine(request.model, request.up_axis);
+    script.reading = readingLine(request.model, request.up_axis, request.tolerance);
     std::vector<std::string>& set_up = script.set_up;
     for (const std::string& name : request.hidden)
         set_up.push_back("_-Hide \"" + name + "\"");

@@ -16,6 +16,18 @@ constexpr std::chrono::milliseconds PROGRESS_STEP{50};
 /// What the host begins a line with that shows a command of a script.
 constexpr std::string_view SHOWN_COMMAND = "Command: ";
 
+/// "reading house.glb"
+std::string stepText(ModelStep step, const std::filesystem::path& file) {
+    const char* const verb = step == ModelStep::read   ? "reading "
+                             : step == ModelStep::made ? "making the meshes of "
+                                                       : "building ";
+    return verb + file.filename().native();
+}
+
+std::string percentText(double share) {
+    return std::to_string(std::lround(100.0 * share)) + " %";
+}
+
 std::string trimmed(const std::string& line) {
     constexpr const char* BLANKS = " \t\r\n";
     const std::size_t first = line.find_first_not_of(BLANKS);
@@ -173,7 +185,15 @@ void ConsoleFrontEnd::pictureRendered(double share) {
     if (share >= 1.0 && pace.empty())
         m_progress.clear();
     else if (share < 1.0 && isProgressDue())
-        m_progress.show(pace + "rendering " + std::to_string(std::lround(100.0 * share)) + " %");
+        m_progress.show(pace + "rendering " + percentText(share));
+}
+
+/// The line is taken away at the end.
+void ConsoleFrontEnd::modelRead(const std::filesystem::path& file, ModelStep step, double share) {
+    if (step == ModelStep::built && share >= 1.0)
+        m_progress.clear();
+    else if (isProgressDue())
+        m_progress.show(stepText(step, file) + (share > 0.0 ? ", " + percentText(share) : ""));
 }
 
 } // namespace quarn::program

@@ -62,6 +62,7 @@ public:
     void frameWritten(const std::filesystem::path& file, int written, int total) override;
     void recordingEnded(const RecordingReport& report) override;
     void pictureRendered(double share) override;
+    void modelRead(const std::filesystem::path& file, ModelStep step, double share) override;
 
 private:
     void rememberWords(std::string_view text);

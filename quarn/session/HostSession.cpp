@@ -19,6 +19,7 @@ SessionOptions sessionOptions(const CommonOptions& common) {
     options.language = common.language;
     options.dialog_folders = {dialogFolder()};
     options.overwrites = common.overwrites;
+    options.most_memory = common.most_memory;
     return options;
 }
 
@@ -68,6 +69,8 @@ std::optional<Outcome> HostSession::runReading(const std::string& line,
     const std::optional<Outcome> trouble = run(line);
     const std::string words = m_front_end.takeKeptWords();
     m_front_end.clearProgress();
+    if (trouble && isInterruptionRequested())
+        return stopped("Stopped while " + model.filename().native() + " was read.");
     if (trouble)
         return trouble;
     if (m_front_end.hidesWords())

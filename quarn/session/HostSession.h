@@ -4,6 +4,7 @@
 #include "quarn/session/ConsoleFrontEnd.h"
 #include "quarn/words/Outcome.h"
 
+#include <cstdint>
 #include <optional>
 
 namespace quarn::program {
@@ -11,8 +12,9 @@ namespace quarn::program {
 /// How a person wants the host to be run.
 struct CommonOptions {
     bool is_verbose = false;
-    std::string language;    ///< empty: the environment's
-    bool overwrites = false; ///< as SessionOptions has it
+    std::string language;          ///< empty: the environment's
+    bool overwrites = false;       ///< as SessionOptions has it
+    std::uint64_t most_memory = 0; ///< as SessionOptions has it
 };
 
 /// The host as this program runs it: with the files that are installed beside the program.

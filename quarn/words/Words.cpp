@@ -115,11 +115,14 @@ bool isDocument(const std::filesystem::path& file) {
     return lowerCase(file.extension().native()) == ".quarn";
 }
 
-std::string readingLine(const std::filesystem::path& model, const std::string& up) {
+std::string readingLine(const std::filesystem::path& model, const std::string& up,
+                        double tolerance) {
     if (isDocument(model))
         return "_-Open " + quotedPath(model);
     const std::string axis = up.empty() ? "" : up == "y" ? "[Up] _Y " : "[Up] _Z ";
-    return "_-Import " + axis + quotedPath(model);
+    const std::string nearness =
+        tolerance > 0.0 ? "[Tolerance] " + numberText(tolerance) + " " : "";
+    return "_-Import " + axis + nearness + quotedPath(model);
 }
 
 std::string quotedPath(const std::filesystem::path& path) {

@@ -56,8 +56,10 @@ std::optional<std::string> whyPathIsRefused(std::string_view subject,
 bool isDocument(const std::filesystem::path& file);
 
 /// The host command that opens a document, or reads a model file into the document that is there.
-/// @param up  the axis that points up in a model file, "y" or "z"; empty: by its format
-std::string readingLine(const std::filesystem::path& model, const std::string& up = "");
+/// @param up         the axis that points up in a model file, "y" or "z"; empty: by its format
+/// @param tolerance  how far meshes may lie beside its curved surfaces; 0: by its size
+std::string readingLine(const std::filesystem::path& model, const std::string& up = "",
+                        double tolerance = 0.0);
 
 /// The path as one word of a script, which no prompt takes for an option.
 std::string quotedPath(const std::filesystem::path& path);

@@ -93,25 +93,5 @@ TEST(TextPly, FacesWithoutCornersAreLeftOutAndCounted) {
                 testing::ElementsAre("2 faces were left out: they have no corners."));
 }
 
-TEST(TextOff, IndexThatIsNoVertexIsToldWithItsLine) {
-    for (const char* const index : {"3", "-1", "4294967298"}) {
-        expectRefused("a.off", "OFF\n# made by hand\n3 1 0\n" + vertices + "3 0 1 " + index + "\n",
-                      "line 7 holds the index " + std::string(index));
-    }
-}
-
-TEST(TextOff, CountsThatAreNoneAndMissingLinesAreTold) {
-    expectRefused("a.off", "OFF\n3 4\n0.1 0.2 0.3\n0.2 0.3 0.4\n",
-                  "line 3 holds '0.1' where the numbers of vertices, faces and edges belong");
-    expectRefused("a.off", "OFF\n3 2 0\n" + vertices + "3 0 1 2\n", "ends before them");
-}
-
-TEST(TextOff, BlankLinesAndColoursAreNoHarm) {
-    const TemporaryFolder folder;
-    const ImportedModel model =
-        readOrFail(folder.write("a.off", "OFF 3 1 0\n\n" + vertices + "\n3 0 1 2 255 0 0\n"));
-    EXPECT_EQ(model.triangleCount(), 1U);
-}
-
 } // namespace
 } // namespace quarn::test

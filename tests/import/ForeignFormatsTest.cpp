@@ -63,6 +63,21 @@ TEST(WideText, IsReadInBothByteOrders) {
     }
 }
 
+TEST(WideText, OfAnXmlFileIsReadWhateverItsDeclarationSays) {
+    const TemporaryFolder folder;
+    const std::string mesh =
+        "<mesh><vertices><vertex><coordinates><x>0</x><y>0</y><z>0</z></coordinates></vertex>"
+        "<vertex><coordinates><x>1</x><y>0</y><z>0</z></coordinates></vertex>"
+        "<vertex><coordinates><x>0</x><y>1</y><z>0</z></coordinates></vertex></vertices>"
+        "<volume><triangle><v1>0</v1><v2>1</v2><v3>2</v3></triangle></volume></mesh>";
+    const ImportedModel model = readOrFail(folder.write(
+        "a.amf", wide("<?xml version=\"1.0\" encoding=\"UTF-16\"?><amf unit=\"millimeter\">"
+                      "<object id=\"1\">" +
+                          mesh + "</object></amf>",
+                      false)));
+    EXPECT_EQ(model.triangleCount(), 1U);
+}
+
 TEST(WideText, KeepsCharactersBeyondSixteenBits) {
     const TemporaryFolder folder;
     std::string bytes = wide("o ", false);

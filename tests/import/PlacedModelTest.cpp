@@ -38,28 +38,33 @@ TEST(PlacedModel, TrianglesThatAreNearTheOriginStandWhereTheirVerticesSay) {
 
 TEST(PlacedModel, SurveyedModelThatIsYUpIsTurnedAsAWhole) {
     const TemporaryFolder folder;
-    const auto model = readModelFile(folder.write("site.obj", surveyed), UpAxis::y);
+    const auto model = readModelFile(folder.write("site.obj", surveyed), {.up = UpAxis::y});
     ASSERT_TRUE(model.ok());
     // x stays, z comes from y, y from -z.
     expectNear(boundsOf(model.value()).m_min, {4500012.125, -101.0, 5200034.25}, 1e-6);
 }
 
-TEST(PlacedModel, VertexThatCannotBeUnderstoodLeavesTheFileAsItIs) {
-    // No number, and three numbers that a fourth divides.
+TEST(PlacedModel, DigitsAreKeptBesideVerticesThatCannotBeUnderstoodOrHaveAWeight) {
     for (const std::string last : {"v one 2 3\n", "v 9000000 0 0 2\n"}) {
         const TemporaryFolder folder;
-        const ImportedModel model = readOrFail(
-            folder.write("a.obj", "v 4500000 0 0\nv 4500001 0 0\nv 4500000 1 0\nf 1 2 3\n" + last));
+        const ImportedModel model = readOrFail(folder.write(
+            "a.obj", "v 4500000.125 0 0\nv 4500001 0 0\nv 4500000.25 1 0\nf 1 2 3\n" + last));
         ASSERT_EQ(model.meshes.size(), 1U);
-        EXPECT_NEAR(boundsOf(model).m_min.x, 4500000.0, 0.5);
+        EXPECT_NEAR(boundsOf(model).m_min.x, 4500000.125, 1e-6);
     }
 }
 
-TEST(PlacedModel, CoordinatesThatTheFormatRoundsAreTold) {
+TEST(PlacedModel, CoordinatesThatTheReadingRoundsAreTold) {
     const TemporaryFolder folder;
     const ImportedModel model = readOrFail(folder.write(
-        "site.off",
-        "OFF\n3 1 0\n4500000 5200000 0\n4500010 5200000 0\n4500000 5200010 0\n3 0 1 2\n"));
+        "site.amf",
+        "<?xml version=\"1.0\" encoding=\"UTF-8\"?><amf unit=\"millimeter\"><object id=\"1\">"
+        "<mesh><vertices>"
+        "<vertex><coordinates><x>4500000</x><y>5200000</y><z>0</z></coordinates></vertex>"
+        "<vertex><coordinates><x>4500010</x><y>5200000</y><z>0</z></coordinates></vertex>"
+        "<vertex><coordinates><x>4500000</x><y>5200010</y><z>0</z></coordinates></vertex>"
+        "</vertices><volume><triangle><v1>0</v1><v2>1</v2><v3>2</v3></triangle></volume></mesh>"
+        "</object></amf>"));
     ASSERT_EQ(model.warnings.size(), 1U);
     EXPECT_THAT(model.warnings[0], HasSubstr("far from the origin"));
     EXPECT_THAT(model.warnings[0], HasSubstr("0.5"));

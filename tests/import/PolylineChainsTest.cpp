@@ -1,4 +1,4 @@
-#include "import/PolylineChains.h"
+#include "import/assembly/PolylineChains.h"
 
 #include <gtest/gtest.h>
 

@@ -55,6 +55,34 @@ TEST(TextureReading, AbsolutePathOfAnotherMachineIsFoundBesideTheModelByItsName)
     }
 }
 
+TEST(TextureReading, NameThatDiffersInCaseAloneIsUsedAndToldOnce) {
+    const TemporaryFolder folder;
+    std::filesystem::create_directory(folder.path() / "Textures");
+    writePicture(folder, "Textures/Wood.PNG", 1, {10, 20, 30, 255});
+    folder.write("a.mtl", "newmtl one\nmap_Kd textures/wood.png\nnewmtl two\n"
+                          "map_Kd -clamp on textures/wood.png\n");
+    const ImportedModel model = readOrFail(folder.write("a.obj", two_materials));
+    ASSERT_EQ(model.meshes.size(), 2U);
+    for (const ImportedMesh& mesh : model.meshes)
+        ASSERT_NE(mesh.placed.material->base_color_texture, nullptr);
+    EXPECT_THAT(model.warnings,
+                ElementsAre("The file 'Wood.PNG' was read for 'textures/wood.png': the names "
+                            "differ in capital and small letters."));
+}
+
+TEST(TextureReading, NameThatFitsIsPreferredToOneThatDiffersInCase) {
+    const TemporaryFolder folder;
+    writePicture(folder, "WOOD.png", 1, {1, 1, 1, 255});
+    writePicture(folder, "wood.png", 1, {10, 20, 30, 255});
+    folder.write("a.mtl", "newmtl one\nmap_Kd wood.png\nnewmtl two\nKd 1 0 0\n");
+    const ImportedModel model = readOrFail(folder.write("a.obj", two_materials));
+    ASSERT_EQ(model.meshes.size(), 2U);
+    ASSERT_NE(model.meshes[0].placed.material->base_color_texture, nullptr);
+    EXPECT_THAT(model.meshes[0].placed.material->base_color_texture->rgba,
+                ElementsAre(10, 20, 30, 255));
+    EXPECT_THAT(model.warnings, SizeIs(0));
+}
+
 TEST(TextureReading, OpacityMapOfAnObjCutsHolesIntoTheColours) {
     const TemporaryFolder folder;
     writePicture(folder, "leaf.png", 2, {10, 20, 30, 255, 40, 50, 60, 255});

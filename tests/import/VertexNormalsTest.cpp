@@ -1,4 +1,4 @@
-#include "import/VertexNormals.h"
+#include "import/assembly/VertexNormals.h"
 
 #include <cmath>
 #include <gtest/gtest.h>

@@ -15,7 +15,7 @@ file(MAKE_DIRECTORY "${WORK}/moved to")
 file(RENAME "${WORK}/first" "${WORK}/moved to/quarn")
 set(tree "${WORK}/moved to/quarn")
 
-foreach(file IN ITEMS bin/quarn lib/libQnCore.so lib/libKelmar.so lib/quarn/plug-ins/Zoetrix.qnp
+foreach(file IN ITEMS bin/quarn bin/quarn-reader lib/libQnCore.so lib/libKelmar.so lib/quarn/plug-ins/Zoetrix.qnp
         include/quarn/kelmar/kelmar.h include/quarn/sdk/qncore/qncore.h
         share/quarn/dialogs/4203.dialog.json share/quarn/dialogs/Zoetrix/6004.dialog.json)
     if(NOT EXISTS "${tree}/${file}")
@@ -56,6 +56,9 @@ run("running the example" "${tree}/bin/quarn" run "${WORK}/hello.txt")
 if(NOT text MATCHES "Hello from a plug-in")
     message(FATAL_ERROR "the example's command did not speak:\n${text}")
 endif()
+
+file(WRITE "${WORK}/triangle.obj" "o Roof\nv 0 0 0\nv 1 0 0\nv 0 1 0\nf 1 2 3\n")
+run("reading a model" "${tree}/bin/quarn" info "${WORK}/triangle.obj")
 
 file(WRITE "${WORK}/help.txt" "Help\n")
 run("listing the commands" "${tree}/bin/quarn" run "${WORK}/help.txt")

@@ -24,7 +24,7 @@ const Places BELOW_CITIES = BELOW_FRONT_END + "host/front_end/";
 const Places BELOW_SUN = BELOW_CITIES + "host/cities/";
 const Places BELOW_CURVES = BELOW_SUN + "host/sun/";
 const Places BELOW_DOCUMENT = BELOW_CURVES + "host/curves/";
-const Places BELOW_APP = BELOW_DOCUMENT + "host/document/" + "host/recording/";
+const Places BELOW_APP = BELOW_DOCUMENT + "host/document/" + "host/reader/" + "host/recording/";
 const Places BELOW_PROMPT = BELOW_APP + "host/app/";
 const Places BELOW_DIALOGS = BELOW_PROMPT + "host/prompt/";
 const Places BELOW_COMMANDS = BELOW_DIALOGS + "host/dialogs/" + "host/recovery/";
@@ -59,6 +59,7 @@ const Room FLOORS[] = {
     {2, "engine/render/", BELOW_DISPLAY + "engine/display/"},
 
     {3, "import/", BELOW_IMPORT},
+    {4, "reader/", BELOW_IMPORT + "import/"},
 
     {4, "host/border/", BELOW_HOST},
     {4, "host/front_end/", BELOW_FRONT_END},
@@ -66,6 +67,7 @@ const Room FLOORS[] = {
     {4, "host/sun/", BELOW_SUN},
     {4, "host/curves/", BELOW_CURVES},
     {5, "host/document/", BELOW_DOCUMENT},
+    {5, "host/reader/", BELOW_DOCUMENT},
     {5, "host/recording/", BELOW_DOCUMENT},
     {6, "host/app/", BELOW_APP},
     {7, "host/recovery/", BELOW_PROMPT},

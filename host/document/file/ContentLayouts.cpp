@@ -1,12 +1,12 @@
 #include "host/document/file/ContentLayouts.h"
 
 #include "engine/render/RenderRequest.h"
+#include "ground/Fields.h"
+#include "ground/LightFields.h"
+#include "ground/ViewportLayout.h"
 #include "host/document/LightStore.h"
 #include "host/document/ViewState.h"
 #include "host/document/file/CurveLayout.h"
-#include "host/document/file/Fields.h"
-#include "host/document/file/LightFields.h"
-#include "host/document/file/ViewportLayout.h"
 
 #include <cmath>
 

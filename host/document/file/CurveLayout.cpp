@@ -1,6 +1,6 @@
 #include "host/document/file/CurveLayout.h"
 
-#include "host/document/file/Fields.h"
+#include "ground/Fields.h"
 #include "kelmar/KM_LineCurve.h"
 #include "kelmar/KM_NurbsCurve.h"
 #include "kelmar/KM_PolylineCurve.h"

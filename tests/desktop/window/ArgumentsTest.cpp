@@ -29,6 +29,15 @@ TEST(Arguments, TheBeatOfRecoveryIsReadInSecondsAndTheirFractions) {
             << none;
 }
 
+TEST(Arguments, TheMemoryThatReadingMayTakeIsASize) {
+    EXPECT_EQ(readArguments({"quarn-desktop"}).most_memory, 0U);
+    EXPECT_EQ(readArguments({"quarn-desktop", "--limit-memory", "2G"}).most_memory, 2ULL << 30);
+    EXPECT_EQ(readArguments({"quarn-desktop", "--limit-memory", "500m"}).most_memory, 500U << 20);
+    for (const char* const none : {"", "0M", "2", "two", "-1G", "2GB"})
+        EXPECT_FALSE(readArguments({"quarn-desktop", "--limit-memory", none}).mistake.isEmpty())
+            << none;
+}
+
 TEST(Arguments, RecoveryIsWantedWhereNobodyRefusesIt) {
     EXPECT_TRUE(readArguments({"quarn-desktop"}).wants_recovery);
     EXPECT_FALSE(readArguments({"quarn-desktop", "--no-recovery"}).wants_recovery);

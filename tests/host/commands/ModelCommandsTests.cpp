@@ -28,7 +28,10 @@ protected:
 TEST_F(ModelCommandsTest, ImportAddsToTheOpenDocumentAndShowsTheModel) {
     const unsigned int number = document().serialNumber();
     ASSERT_EQ(runOn(L"_-Import", triangle), CQuarnCommand::success);
-    EXPECT_EQ(printed(), "my model.obj: 1 object with 1 triangle\n");
+    EXPECT_EQ(
+        printed(),
+        "my model.obj: 1 object with 1 triangle. Z is taken as up, as in most files of this kind; "
+        "the option Up of Open and Import changes that.\n");
     EXPECT_EQ(document().serialNumber(), number);
     ASSERT_NE(document().objects().findByName(L"Roof"), nullptr);
     EXPECT_EQ(document().activeView().viewport().TargetPoint(), KM_3dPoint(500, 500, 0));
@@ -43,6 +46,17 @@ TEST_F(ModelCommandsTest, TheAxisThatPointsUpInTheFileIsAnOption) {
     EXPECT_EQ(document().objects().visibleBox().m_max, KM_3dPoint(1000, 1000, 0));
     ASSERT_EQ(runOn(L"_-Open [Up] _Y [Up] _ByFormat", triangle), CQuarnCommand::success);
     EXPECT_EQ(document().objects().visibleBox().m_max, KM_3dPoint(1000, 1000, 0));
+}
+
+TEST_F(ModelCommandsTest, TheAxisOfTheProgramThatWroteTheFileIsTakenAndTold) {
+    const auto file =
+        folder.write("signed.obj", "# Blender 3.6.0\nv 0 0 0\nv 1 0 0\nv 0 2 0\nf 1 2 3\n");
+    ASSERT_EQ(runOn(L"_-Open", file), CQuarnCommand::success);
+    EXPECT_THAT(printed(), HasSubstr("triangle. Y is taken as up, as Blender writes it; the option "
+                                     "Up of Open and Import changes that."));
+    EXPECT_EQ(document().objects().visibleBox().m_max, KM_3dPoint(1, 0, 2));
+    ASSERT_EQ(runOn(L"_-Open [Up] _Z", file), CQuarnCommand::success);
+    EXPECT_THAT(printed(), EndsWith("signed.obj: 1 object with 1 triangle\n")) << "who asks knows";
 }
 
 TEST_F(ModelCommandsTest, AnUnknownAxisIsToldAndNothingIsRead) {

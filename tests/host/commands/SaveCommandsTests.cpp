@@ -114,7 +114,7 @@ TEST_F(SaveCommandsTest, ImportAddsADocumentAndTheFileStaysTheOpenOnes) {
 TEST_F(SaveCommandsTest, TheUpAxisOfADocumentIsItsOwn) {
     runOn(L"_-SaveAs", "house.quarn");
     EXPECT_EQ(runOn(L"_-Open [Up] _Y", "house.quarn"), CQuarnCommand::failure);
-    EXPECT_EQ(printed(), "A document tells itself which axis points up; leave Up out.\n");
+    EXPECT_EQ(printed(), "A document has its axes and its meshes; leave Up and Tolerance out.\n");
 }
 
 // ---- Which file

@@ -152,6 +152,17 @@ TEST_F(DocumentTest, TheFirstModelBringsItsUnits) {
     EXPECT_EQ(document.units(), UnitSystem::meters);
 }
 
+TEST_F(DocumentTest, LightsOfAModelAreThereAndStaySwitchedOff) {
+    ImportedModel model = boxModel(1.0);
+    KM_Light lamp;
+    lamp.SetStyle(KM_LightStyle::world_point);
+    lamp.Enable(false);
+    model.lights = {lamp};
+    document.addModel(model);
+    ASSERT_EQ(document.lights().live().size(), 1U);
+    EXPECT_TRUE(document.lights().shiningLights().empty());
+}
+
 TEST_F(DocumentTest, AModelIsSharedAndNotCopied) {
     ImportedModel model = boxModel(1.0);
     const KM_3dPoint path[] = {{0, 0, 0}, {1, 0, 0}, {1, 1, 0}};

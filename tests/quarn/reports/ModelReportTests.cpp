@@ -28,11 +28,21 @@ TEST(ModelReport, TellsTheFileAndWhatIsInIt) {
     EXPECT_THAT(linesOf(ended.out),
                 ElementsAre(StrEq("name: house.obj"), StrEq("format: OBJ"),
                             StrEq("file size: " + std::to_string(file_size) + " bytes"),
-                            MatchesRegex("read in: [0-9]+ ms"), StrEq("hall  mesh, 12 triangles"),
-                            StrEq("tower  mesh, 12 triangles"),
+                            MatchesRegex("read in: [0-9]+ ms"),
+                            StrEq("up: z, as in most OBJ files; --up y turns it"),
+                            StrEq("hall  mesh, 12 triangles"), StrEq("tower  mesh, 12 triangles"),
                             MatchesRegex("2 meshes with 24 triangles and [0-9]+ vertices, .*, "
                                          "0 curves, 0 points; 0 hidden, 0 selected"),
                             StrEq("from 0,0,0 to 4,2,4, size 4 x 2 x 4")));
+}
+
+TEST(ModelReport, TellsTheProgramWhoseFilesHaveTheirAxisSo) {
+    const Studio studio;
+    writeFile(studio / "signed.obj", "# Blender 3.6.0\nv 0 0 0\nv 1 0 0\nv 0 1 0\nf 1 2 3\n");
+    const Ended ended = report(studio, "signed.obj");
+    ASSERT_EQ(ended.exit_code, 0) << ended.err;
+    EXPECT_THAT(linesOf(ended.out),
+                Contains(StrEq("up: y, as Blender writes OBJ files; --up z turns it")));
 }
 
 TEST(ModelReport, ReadsModelsWithoutAFolderToWriteTo) {

@@ -1,0 +1,48 @@
+#pragma once
+
+#include "kelmar/KM_Point.h"
+
+#include <array>
+#include <cstddef>
+#include <cstdint>
+#include <span>
+#include <vector>
+
+namespace quarn {
+
+/// Cuts polygons into triangles: convex ones from their first corner, others by taking off ears one
+/// after the other (G. H. Meisters, "Polygons Have Ears", The American Mathematical Monthly 82(6),
+/// 1975), so that nothing outside of a planar outline is covered. Keeps its memory from one polygon
+/// to the next.
+class PolygonTriangles {
+public:
+    /// The numbers of three corners of the polygon, which turn as the polygon does.
+    using Triangle = std::array<std::uint32_t, 3>;
+
+    /// @param corners  in their order round the polygon, also such that are no usable numbers
+    /// @return two triangles less than there are corners; valid until the next call
+    std::span<const Triangle> cut(std::span<const KM_3dPoint> corners);
+
+private:
+    struct Flat {
+        double x;
+        double y;
+        bool operator==(const Flat&) const = default;
+    };
+
+    void flatten(std::span<const KM_3dPoint> corners);
+    double turnAt(std::uint32_t before, std::uint32_t here, std::uint32_t after) const;
+    bool isConvex() const;
+    void cutFan();
+    void cutEars();
+    bool isEar(std::uint32_t corner) const;
+    void takeOff(std::uint32_t corner);
+
+    std::vector<Flat> m_flat; ///< the corners in the polygon's plane, anticlockwise
+    std::vector<Triangle> m_triangles;
+    std::vector<std::uint32_t> m_before; ///< the corner that is left before each
+    std::vector<std::uint32_t> m_after;
+    std::vector<std::uint32_t> m_reflex; ///< corners that no ear may hold
+};
+
+} // namespace quarn

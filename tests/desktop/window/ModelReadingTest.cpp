@@ -1,0 +1,67 @@
+// A window while a model file is read that never ends: the stand-in for the reading program hangs.
+#include "tests/desktop/window/WindowFixture.h"
+
+#include <QLabel>
+#include <QPushButton>
+
+#include <gmock/gmock.h>
+
+namespace quarn::desktop::test {
+namespace {
+
+class ModelReadingTest : public WindowTest {
+protected:
+    ModelReadingTest() {
+        qputenv("QUARN_READER", QUARN_STAND_IN_READER);
+        for (const char* const name : {"hang.obj", "crash.obj"})
+            quarn::test::writeFile(folder / name, "v 0 0 0\n");
+    }
+    ~ModelReadingTest() override { qunsetenv("QUARN_READER"); }
+
+    void open(const char* name) { run("_-Open \"" + qtText(folder / name) + '"'); }
+
+    /// Looks at the window some times a second while it works.
+    void whileItWorks(const std::function<void()>& look) {
+        QObject::connect(&m_clock, &QTimer::timeout, &window, look);
+        m_clock.start(50);
+    }
+
+    QTimer m_clock;
+};
+
+TEST_F(ModelReadingTest, ShowsHowFarItIsAndIsCancelledByItsButton) {
+    QString text;
+    whileItWorks([&] {
+        auto* const label = window.findChild<QLabel*>("progressText");
+        if (!label || !label->isVisible())
+            return;
+        text = label->text();
+        window.findChild<QPushButton*>("progressCancel")->click();
+    });
+    open("hang.obj");
+    EXPECT_EQ(text, "Making the meshes: 25 %");
+    EXPECT_TRUE(printed().contains("hang.obj was not read: it was given up."));
+    EXPECT_FALSE(window.findChild<QLabel*>("progressText")->isVisible());
+}
+
+TEST_F(ModelReadingTest, LeavesTheWindowAlive) {
+    int looks = 0;
+    whileItWorks([&] {
+        if (++looks == 20)
+            window.starter().stop();
+    });
+    open("hang.obj");
+    EXPECT_EQ(looks, 20);
+}
+
+TEST_F(ModelReadingTest, ThatCrashesLeavesTheDocumentAsItWas) {
+    run("_Point 1,2,3");
+    open("crash.obj");
+    EXPECT_TRUE(
+        printed().contains("crash.obj could not be read: the reader stopped unexpectedly."));
+    run("_-List _Objects");
+    EXPECT_TRUE(printed().contains("1 point;"));
+}
+
+} // namespace
+} // namespace quarn::desktop::test
