@@ -171,6 +171,19 @@ TEST(ShowScript, LongNameOfAModelIsCutBetweenTwoCharacters) {
               "_-AnimationName \"" + expected + "\"");
 }
 
+TEST(ShowScript, ReadsCurvedSurfacesAsNearAsWasAsked) {
+    const auto lines = scriptOf(
+        {"gear.step", "--frames", "8", "--out", "out", "--tolerance", "0.05", "--up", "y"});
+    EXPECT_EQ(lines[0], "_-Import [Up] _Y [Tolerance] 0.05 \"gear.step\"");
+}
+
+TEST(ShowScript, ToleranceIsOfModelFilesAlone) {
+    const Ended ended = run({"turntable", "house.quarn", "--frames", "8", "--out", "out",
+                             "--tolerance", "0.05", "--show-script"});
+    EXPECT_EQ(ended.exit_code, 2);
+    EXPECT_THAT(ended.err, HasSubstr("--tolerance is for model files"));
+}
+
 TEST(ShowScript, RunsNothing) {
     TempFolder folder;
     Start start;

@@ -1,4 +1,5 @@
 #include "tests/quarn/ProgramRun.h"
+#include "tests/support/TempFolder.h"
 
 #include <cmath>
 #include <gmock/gmock.h>
@@ -371,6 +372,39 @@ TEST(Places, AreFoundByWhatTheyMayBeCalled) {
     EXPECT_EQ(none.exit_code, 1);
     EXPECT_THAT(none.err, HasSubstr("Xyzzyxyzzy"));
     expectRefusal(run({"places", "new", "york"}), {"unexpected argument york"});
+}
+
+// ---- A place that the model states
+
+/// An IFC file that states a place, with north along its X axis.
+std::string sitedModel(const TempFolder& folder, const char* latitude = "(47,30,0)") {
+    writeFile(folder / "site.ifc",
+              "ISO-10303-21;\nDATA;\n"
+              "#4= IFCGEOMETRICREPRESENTATIONCONTEXT($,'Model',3,1.E-05,#6,#7);\n"
+              "#7= IFCDIRECTION((1.,0.,0.));\n"
+              "#8= IFCSITE('a',#1,'b',$,$,#9,$,$,.ELEMENT.," +
+                  std::string(latitude) + ",(8,15,0),430.,$,$);\nENDSEC;\n");
+    return (folder / "site.ifc").string();
+}
+
+TEST(StatedPlace, CountsWhereNoOptionGivesOne) {
+    const TempFolder folder;
+    const Words script = scriptOf(day({"--date", "2026-06-21"}, sitedModel(folder)));
+    EXPECT_THAT(script, Contains("# As site.ifc states: 47.5 N, 8.25 E"));
+    EXPECT_THAT(script, Contains(StartsWith("_-SetOneDaySunAnimation 47.5 8.25 90 ")));
+}
+
+TEST(StatedPlace, GivesWayToOptionsEachOnItsOwn) {
+    const TempFolder folder;
+    EXPECT_THAT(scriptOf(dayInAthens({}, sitedModel(folder))),
+                Contains(StartsWith("_-SetOneDaySunAnimation 37.98 23.73 0 ")));
+    EXPECT_THAT(scriptOf(day({"--date", "2026-06-21", "--north", "0"}, sitedModel(folder))),
+                Contains(StartsWith("_-SetOneDaySunAnimation 47.5 8.25 0 ")));
+}
+
+TEST(StatedPlace, IsAskedForWhereTheModelStatesNone) {
+    const TempFolder folder;
+    expectRefusal(day({"--date", "2026-06-21"}, sitedModel(folder, "$")), {"--place"});
 }
 
 } // namespace
