@@ -8,6 +8,7 @@
 namespace quarn::test {
 namespace {
 
+using testing::EndsWith;
 using testing::HasSubstr;
 
 class ModelCommandsTest : public HostTest {
