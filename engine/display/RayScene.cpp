@@ -16,6 +16,9 @@ namespace {
 
 /// A mesh of this many triangles has a scene of its own; smaller ones share scenes.
 constexpr std::size_t large_mesh_triangles = 8192;
+/// Scenes of meshes beyond this are built compact: that takes half the time and, at five million
+/// triangles, 300 MB less, for rays that take about a third longer.
+constexpr std::size_t compact_mesh_triangles = 4'000'000;
 
 /// How many triangles a shared scene has at most. Rays are quickest in few large scenes; but once
 /// some of its meshes is hidden or shown again a scene is split into small ones, whose rebuild
@@ -186,7 +189,7 @@ void RayScene::build(std::vector<Member> members) {
     m_surface_places.clear();
     m_surface_places.reserve(m_members.size()); // and these into that
     m_places.assign(m_members.size(), {});
-    m_top = makeScene();
+    m_top = makeScene(false);
     m_placed_meshes.clear();
     std::vector<bool> wanted;
     for (Member& member : m_members) {
@@ -230,15 +233,17 @@ std::vector<std::size_t> RayScene::smallMembersBySpace() const {
 }
 
 /// Rays can gather all that they meet there.
-RaySceneHandle RayScene::makeScene() const {
+RaySceneHandle RayScene::makeScene(bool is_compact) const {
     RaySceneHandle scene(rtcNewScene(m_device.get()));
-    rtcSetSceneFlags(scene.get(), RTC_SCENE_FLAG_CONTEXT_FILTER_FUNCTION);
+    const unsigned compact = is_compact ? RTC_SCENE_FLAG_COMPACT : RTC_SCENE_FLAG_NONE;
+    rtcSetSceneFlags(scene.get(),
+                     static_cast<RTCSceneFlags>(RTC_SCENE_FLAG_CONTEXT_FILTER_FUNCTION | compact));
     return scene;
 }
 
-std::shared_ptr<RayScene::Group> RayScene::makeGroup() const {
+std::shared_ptr<RayScene::Group> RayScene::makeGroup(bool is_compact) const {
     auto group = std::make_shared<Group>();
-    group->scene = makeScene();
+    group->scene = makeScene(is_compact);
     group->changed = true;
     return group;
 }
@@ -291,7 +296,7 @@ void RayScene::addSole(std::size_t member, SoleGroups& groups) {
     std::shared_ptr<Group>& group = groups[keyOf(m_members[member])];
     const bool is_new = !group;
     if (is_new)
-        group = makeGroup();
+        group = makeGroup(m_members[member].mesh->mesh().m_F.size() > compact_mesh_triangles);
     m_places[member] = {m_instances.size(), 0};
     putInstance(m_instances.size(), group, frame_from_mesh, m_surfaces.size());
     m_instances.back().visible_members = 1;
@@ -321,7 +326,7 @@ void RayScene::addBundles(std::span<const std::size_t> members, std::span<RayGeo
         std::size_t end = first;
         while (end < members.size() && (end == first || triangles < most_triangles))
             triangles += m_members[members[end++]].mesh->mesh().m_F.size();
-        putInstance(slot, makeGroup(), KM_Xform(), first_surface + first);
+        putInstance(slot, makeGroup(false), KM_Xform(), first_surface + first);
         fillBundle(slot, members.subspan(first, end - first),
                    geometries.subspan(first, end - first));
         m_instances[slot].group->is_split = triangles < 2 * split_bundle_triangles;

@@ -110,8 +110,8 @@ private:
                      const KM_Xform& frame_from_mesh, std::size_t first_surface);
     RayGeometry makeTriangles(std::size_t member) const;
     RayGeometry makeSurface(std::size_t member, const RaySurface& surface) const;
-    RaySceneHandle makeScene() const;
-    std::shared_ptr<Group> makeGroup() const;
+    RaySceneHandle makeScene(bool is_compact) const;
+    std::shared_ptr<Group> makeGroup(bool is_compact) const;
     SoleGroups soleGroups() const;
     std::vector<std::size_t> smallMembersBySpace() const;
     void chooseRoot();

@@ -23,10 +23,13 @@ PlyContents::PlyContents(const ModelReading& reading, std::string_view file, Ply
     : m_reading(reading), m_file(file), m_header(std::move(header)), m_parts(std::move(parts)),
       m_progress(reading.watch, ReadingStep::read, bytesOf(m_parts)) {}
 
-std::pair<std::size_t, std::size_t> PlyContents::partsOf(std::size_t kind) const {
-    const auto [begin, end] = std::ranges::equal_range(m_parts, kind, {}, &PlyPart::kind);
-    return {static_cast<std::size_t>(begin - m_parts.begin()),
-            static_cast<std::size_t>(end - m_parts.begin())};
+std::span<const PlyPart> PlyContents::partsOf(std::size_t kind) const {
+    const auto is_before = [](const PlyPart& part, std::size_t wanted) {
+        return part.kind < wanted;
+    };
+    const auto begin = std::lower_bound(m_parts.begin(), m_parts.end(), kind, is_before);
+    const auto end = std::lower_bound(begin, m_parts.end(), kind + 1, is_before);
+    return {begin, end};
 }
 
 bool PlyContents::isWanted(const char* place) {

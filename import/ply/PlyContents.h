@@ -7,6 +7,7 @@
 #include <tbb/parallel_for.h>
 
 #include <mutex>
+#include <span>
 #include <string>
 #include <string_view>
 
@@ -23,17 +24,13 @@ public:
     /// Calls `read` with the parts that hold elements of a kind, from several threads; once
     /// something is wrong, only with those that stand before it.
     template <class Read> void readParts(std::size_t kind, const Read& read) {
-        const auto [begin, end] = partsOf(kind);
-        tbb::parallel_for(begin, end, [&](std::size_t i) {
-            const PlyPart& part = m_parts[i];
-            if (isWanted(part.bytes.data()))
-                read(part, i - begin);
+        const std::span<const PlyPart> parts = partsOf(kind);
+        tbb::parallel_for(std::size_t{0}, parts.size(), [&](std::size_t i) {
+            if (isWanted(parts[i].bytes.data()))
+                read(parts[i], i);
         });
     }
-    std::size_t countParts(std::size_t kind) const {
-        const auto [begin, end] = partsOf(kind);
-        return end - begin;
-    }
+    std::size_t countParts(std::size_t kind) const { return partsOf(kind).size(); }
 
     /// Counts a part as read.
     void finish(const PlyPart& part);
@@ -50,7 +47,7 @@ public:
     ReadingBudget& budget() const { return m_reading.budget; }
 
 private:
-    std::pair<std::size_t, std::size_t> partsOf(std::size_t kind) const;
+    std::span<const PlyPart> partsOf(std::size_t kind) const;
     bool isWanted(const char* place);
 
     const ModelReading& m_reading;

@@ -5,6 +5,7 @@
 #include "import/ply/PlyNumbers.h"
 
 #include <algorithm>
+#include <span>
 #include <utility>
 
 namespace quarn {
@@ -47,28 +48,32 @@ constexpr std::int64_t RESTART = -1;
 /// Reads one part of an element.
 template <class Source> class PartReading {
 public:
+    /// @param room  for triangles; those that find none go to `faces`
     PartReading(PlyContents& contents, const PlyPart& part, const std::vector<KM_3fPoint>& vertices,
-                PlyFaces& faces)
+                std::span<KM_MeshTriangle> room, PlyFaces& faces)
         : m_contents(contents), m_part(part), m_element(contents.header().elements[part.kind]),
-          m_vertices(vertices), m_source(part.bytes, contents.header()), m_faces(faces),
-          m_is_strip(m_element.name == "tristrips") {
+          m_vertices(vertices), m_source(part.bytes, contents.header()), m_room(room),
+          m_faces(faces), m_is_strip(m_element.name == "tristrips") {
         for (const PlyProperty& property : m_element.properties)
             m_roles.push_back(roleOf(m_element, property));
     }
 
-    void read() {
+    /// @return how many triangles are in their room
+    std::size_t read() {
         for (std::uint64_t i = 0; i < m_part.count; ++i) {
-            if (!m_source.begin())
-                return m_contents.fail(m_part, m_part.first + i, m_part.bytes.data(), "is missing");
-            m_why.clear();
-            if (!readOne())
-                return m_contents.fail(m_part, m_part.first + i, m_source.place(), m_why);
+            m_why = "is missing";
+            if (!m_source.begin() || !readOne()) {
+                m_contents.fail(m_part, m_part.first + i, m_source.place(), m_why);
+                break;
+            }
             addOne();
         }
+        return m_filled;
     }
 
 private:
     bool readOne() {
+        m_why.clear();
         m_corners.clear();
         m_texture.clear();
         m_taken = 0;
@@ -182,7 +187,7 @@ private:
 
     /// @param a, b, c  corners of the face
     void addTriangle(std::uint32_t a, std::uint32_t b, std::uint32_t c) {
-        m_faces.triangles.push_back({{m_corners[a], m_corners[b], m_corners[c]}});
+        push({{m_corners[a], m_corners[b], m_corners[c]}});
         if (std::ranges::find(m_roles, Role::texture) == m_roles.end())
             return;
         for (const std::uint32_t corner : {a, b, c}) {
@@ -209,8 +214,15 @@ private:
             if (a == b || b == c || c == a)
                 continue;
             const bool is_even = (i - begin) % 2 == 0;
-            m_faces.triangles.push_back({{is_even ? a : b, is_even ? b : a, c}});
+            push({{is_even ? a : b, is_even ? b : a, c}});
         }
+    }
+
+    void push(const KM_MeshTriangle& triangle) {
+        if (m_filled < m_room.size())
+            m_room[m_filled++] = triangle;
+        else
+            m_faces.triangles.push_back(triangle);
     }
 
     PlyContents& m_contents;
@@ -218,6 +230,8 @@ private:
     const PlyElement& m_element;
     const std::vector<KM_3fPoint>& m_vertices;
     Source m_source;
+    std::span<KM_MeshTriangle> m_room;
+    std::size_t m_filled = 0;
     PlyFaces& m_faces;
     bool m_is_strip;
     std::vector<Role> m_roles; ///< of the properties
@@ -240,6 +254,102 @@ std::uint64_t bytesOf(const PlyFaces& faces) {
            faces.points.size() * sizeof(faces.points[0]);
 }
 
+/// Reads all parts of an element. Nearly all files have triangles alone, which are read right where
+/// they belong; where there are more than elements, they are joined behind them.
+class ElementReading {
+public:
+    ElementReading(PlyContents& contents, std::size_t kind, const std::vector<KM_3fPoint>& vertices,
+                   PlyFaces& faces)
+        : m_contents(contents), m_kind(kind), m_element(contents.header().elements[kind]),
+          m_vertices(vertices), m_faces(faces), m_before(faces.triangles.size()),
+          m_parts(contents.countParts(kind)) {}
+
+    void read() {
+        if (!makeRoom())
+            return;
+        m_contents.readParts(m_kind,
+                             [this](const PlyPart& part, std::size_t i) { readPart(part, i); });
+        if (m_contents.why().empty())
+            join();
+    }
+
+private:
+    struct Part {
+        std::size_t begin = 0;  ///< of its triangles among those of the file
+        std::size_t filled = 0; ///< how many stand there
+        PlyFaces rest;
+    };
+
+    bool makeRoom() {
+        if (!hasRole(m_element, Role::indices))
+            return true;
+        const Result<void> taken =
+            m_contents.budget().take(m_element.count * sizeof(KM_MeshTriangle), "triangles");
+        if (taken)
+            m_faces.triangles.resize(m_before + static_cast<std::size_t>(m_element.count));
+        else
+            m_contents.fail(taken.message());
+        return taken.ok();
+    }
+
+    void readPart(const PlyPart& part, std::size_t i) {
+        Part& to = m_parts[i];
+        to.begin = m_before + static_cast<std::size_t>(part.first);
+        std::span<KM_MeshTriangle> room;
+        if (hasRole(m_element, Role::indices))
+            room = std::span(m_faces.triangles)
+                       .subspan(to.begin, static_cast<std::size_t>(part.count));
+        if (m_contents.header().format == PlyFormat::text)
+            to.filled =
+                PartReading<PlyTextNumbers>(m_contents, part, m_vertices, room, to.rest).read();
+        else
+            to.filled =
+                PartReading<PlyBinaryNumbers>(m_contents, part, m_vertices, room, to.rest).read();
+        const Result<void> taken = m_contents.budget().take(bytesOf(to.rest), "triangles");
+        if (!taken)
+            m_contents.fail(part.bytes.data(), taken.message());
+        m_contents.finish(part);
+    }
+
+    void join() {
+        std::size_t count = m_before;
+        std::size_t rest = 0;
+        for (const Part& part : m_parts) {
+            count += part.filled + part.rest.triangles.size();
+            rest += part.rest.triangles.size();
+        }
+        if (rest > 0 || count != m_faces.triangles.size())
+            joinTriangles(count);
+        for (Part& part : m_parts) {
+            append(m_faces.texture, part.rest.texture);
+            append(m_faces.lines, part.rest.lines);
+            append(m_faces.points, part.rest.points);
+            m_faces.without_corners += part.rest.without_corners;
+        }
+    }
+
+    void joinTriangles(std::size_t count) {
+        const auto from = m_faces.triangles.begin();
+        std::vector<KM_MeshTriangle> joined;
+        joined.reserve(count);
+        joined.insert(joined.end(), from, from + static_cast<std::ptrdiff_t>(m_before));
+        for (Part& part : m_parts) {
+            const auto begin = from + static_cast<std::ptrdiff_t>(part.begin);
+            joined.insert(joined.end(), begin, begin + static_cast<std::ptrdiff_t>(part.filled));
+            append(joined, part.rest.triangles);
+        }
+        m_faces.triangles = std::move(joined);
+    }
+
+    PlyContents& m_contents;
+    std::size_t m_kind;
+    const PlyElement& m_element;
+    const std::vector<KM_3fPoint>& m_vertices;
+    PlyFaces& m_faces;
+    std::size_t m_before; ///< triangles of elements that were read before
+    std::vector<Part> m_parts;
+};
+
 } // namespace
 
 bool connectsVertices(const PlyElement& element) {
@@ -251,30 +361,7 @@ bool connectsVertices(const PlyElement& element) {
 
 void readPlyFaces(PlyContents& contents, std::size_t kind, const std::vector<KM_3fPoint>& vertices,
                   PlyFaces& faces) {
-    std::vector<PlyFaces> of_parts(contents.countParts(kind));
-    contents.readParts(kind, [&](const PlyPart& part, std::size_t i) {
-        if (contents.header().format == PlyFormat::text)
-            PartReading<PlyTextNumbers>(contents, part, vertices, of_parts[i]).read();
-        else
-            PartReading<PlyBinaryNumbers>(contents, part, vertices, of_parts[i]).read();
-        const Result<void> taken = contents.budget().take(bytesOf(of_parts[i]), "triangles");
-        if (!taken)
-            contents.fail(part.bytes.data(), taken.message());
-        contents.finish(part);
-    });
-    std::size_t triangles = faces.triangles.size();
-    for (const PlyFaces& part : of_parts)
-        triangles += part.triangles.size();
-    if (!contents.why().empty())
-        return;
-    faces.triangles.reserve(triangles);
-    for (PlyFaces& part : of_parts) {
-        append(faces.triangles, part.triangles);
-        append(faces.texture, part.texture);
-        append(faces.lines, part.lines);
-        append(faces.points, part.points);
-        faces.without_corners += part.without_corners;
-    }
+    ElementReading(contents, kind, vertices, faces).read();
 }
 
 } // namespace quarn

@@ -1,6 +1,7 @@
 #include "import/ply/PlyVertices.h"
 
 #include "engine/scene/PlacedMesh.h"
+#include "import/assembly/Extent.h"
 #include "import/assembly/MeshPlacing.h"
 #include "import/assembly/StoredColor.h"
 #include "import/ply/PlyNumbers.h"
@@ -179,7 +180,7 @@ private:
     }
 
     template <class Source> void readPart(const PlyPart& part, Source source) {
-        KM_BoundingBox box;
+        Extent extent;
         std::uint64_t unusable = 0;
         Numbers numbers{};
         numbers[alpha] = m_columns.type(alpha) >= PlyType::float32 ? 1.0 : 255.0;
@@ -191,10 +192,10 @@ private:
             const bool is_usable = put(static_cast<std::size_t>(part.first + i), numbers);
             unusable += is_usable ? 0 : 1;
             if (is_usable)
-                box.Set({numbers[x], numbers[y], numbers[z]});
+                extent.add({numbers[x], numbers[y], numbers[z]});
         }
         const std::lock_guard lock(m_gathering);
-        m_box.Union(box);
+        m_box.Union(extent.box());
         m_vertices.unusable += unusable;
     }
 

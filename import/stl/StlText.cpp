@@ -88,7 +88,7 @@ private:
     KM_BoundingBox box() const {
         KM_BoundingBox all;
         for (const StlPart& part : m_parts)
-            all.Union(part.box);
+            all.Union(part.extent.box());
         return all;
     }
 

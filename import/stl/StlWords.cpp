@@ -137,7 +137,7 @@ private:
             constexpr float NO_NUMBER = std::numeric_limits<float>::quiet_NaN();
             return {NO_NUMBER, NO_NUMBER, NO_NUMBER};
         }
-        m_part.box.Set(point);
+        m_part.extent.add(point);
         return {static_cast<float>(p.x) + 0.0F, static_cast<float>(p.y) + 0.0F,
                 static_cast<float>(p.z) + 0.0F};
     }

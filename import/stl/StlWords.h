@@ -1,6 +1,6 @@
 #pragma once
 
-#include "kelmar/KM_BoundingBox.h"
+#include "import/assembly/Extent.h"
 #include "kelmar/KM_Point.h"
 
 #include <cstddef>
@@ -20,7 +20,7 @@ struct StlPart {
 
     std::vector<Solid> solids;       ///< that begin in this part
     std::vector<KM_3fPoint> corners; ///< three for each triangle
-    KM_BoundingBox box;              ///< of the corners that are usable numbers
+    Extent extent;                   ///< of the corners that are usable numbers
     bool ends_solid = false;         ///< the last word of solids here ends one
     const char* fault = nullptr;     ///< where something is wrong; null: nothing is
     std::string why;                 ///< what; a part of a sentence after its subject
