@@ -38,7 +38,7 @@ KM_wString animationText(Document& document) {
     if (!kind)
         return {};
     const KM_3dmAnimationProperties& record = *found.value();
-    return KM_wString::FormatToString(L"animation: %s, %d %s in %s\n", kind, record.FrameCount(),
+    return KM_wString::FormatToString(L"%s, %d %s in %s", kind, record.FrameCount(),
                                       record.FrameCount() == 1 ? L"frame" : L"frames",
                                       record.ViewportName().Array());
 }

@@ -170,7 +170,8 @@ CQuarnCommand::result runList(const CQuarnCommandContext& context) {
     const KM_BoundingBox box = document.objects().visibleBox();
     if (box.IsValid())
         application.print(sizeText(box, document.units()).View());
-    application.print(animationText(document).View());
+    if (const KM_wString animation = animationText(document); !animation.IsEmpty())
+        application.print((L"animation: " + animation + L"\n").View());
     return CQuarnCommand::success;
 }
 

@@ -1,5 +1,6 @@
 #include "host/session/ModelContents.h"
 
+#include "host/commands/AnimationText.h"
 #include "host/document/Document.h"
 #include "import/ImportedModel.h"
 
@@ -108,7 +109,9 @@ private:
 } // namespace
 
 ModelContents contentsOf(CQuarnDoc& document) {
-    return Telling(Document::of(document)).tell();
+    ModelContents contents = Telling(Document::of(document)).tell();
+    contents.animation = utf8(animationText(Document::of(document)));
+    return contents;
 }
 
 } // namespace quarn

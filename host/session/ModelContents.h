@@ -47,7 +47,8 @@ struct ModelContents {
     std::vector<TextureContents> textures;
     std::vector<std::string> cameras; ///< names
     std::size_t lights = 0;
-    std::string units; ///< "metres"; empty where nobody said
+    std::string animation; ///< "turntable, 120 frames in Perspective"; empty where none is set up
+    std::string units;     ///< "metres"; empty where nobody said
     /// The corners of the box of all objects; none without objects.
     std::optional<std::pair<KM_3dPoint, KM_3dPoint>> box;
     /// Of the model file that was read last, where one was:

@@ -76,19 +76,21 @@ Json boxOf(const ModelContents& contents) {
 
 std::string jsonOf(const ReadFile& file) {
     const ModelContents& contents = file.contents;
-    const Json json = {{"name", file.path.filename().native()},
-                       {"format", formatName(file.path)},
-                       {"file_bytes", file.bytes},
-                       {"read_ms", millisecondsOf(file.read_time)},
-                       {"units", contents.units.empty() ? Json(nullptr) : Json(contents.units)},
-                       {"up", upOf(contents)},
-                       {"box", boxOf(contents)},
-                       {"objects", objectsOf(contents)},
-                       {"materials", materialsOf(contents)},
-                       {"textures", texturesOf(contents)},
-                       {"cameras", contents.cameras},
-                       {"lights", contents.lights},
-                       {"left_out", contents.left_out}};
+    const Json json = {
+        {"name", file.path.filename().native()},
+        {"format", formatName(file.path)},
+        {"file_bytes", file.bytes},
+        {"read_ms", millisecondsOf(file.read_time)},
+        {"units", contents.units.empty() ? Json(nullptr) : Json(contents.units)},
+        {"up", upOf(contents)},
+        {"box", boxOf(contents)},
+        {"objects", objectsOf(contents)},
+        {"materials", materialsOf(contents)},
+        {"textures", texturesOf(contents)},
+        {"cameras", contents.cameras},
+        {"lights", contents.lights},
+        {"animation", contents.animation.empty() ? Json(nullptr) : Json(contents.animation)},
+        {"left_out", contents.left_out}};
     return json.dump(2, ' ', false, Json::error_handler_t::replace) + "\n";
 }
 

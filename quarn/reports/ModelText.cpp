@@ -117,6 +117,8 @@ std::string restLines(const ModelContents& contents) {
     text += text.empty() ? "" : "\n";
     if (contents.lights > 0)
         text += "lights: " + groupedText(contents.lights) + "\n";
+    if (!contents.animation.empty())
+        text += "animation: " + contents.animation + "\n";
     return text;
 }
 

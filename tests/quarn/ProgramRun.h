@@ -41,6 +41,7 @@ public:
     RunningProgram(const RunningProgram&) = delete;
     RunningProgram& operator=(const RunningProgram&) = delete;
 
+    pid_t id() const { return m_child; }
     void sendSignal(int signal) const;
     /// Waits until the condition holds, at most a minute.
     /// @return false when the program ended, or the minute passed, before it did

@@ -34,11 +34,14 @@ protected:
 
 class ReaderSignal : public Reader, public testing::WithParamInterface<int> {};
 
-/// Whether a process that this one did not start itself works on the program's behalf.
-bool hasReader(const std::filesystem::path& program) {
+/// Whether a reader works on behalf of a program that runs, not of those of other tests.
+bool hasReader(const RunningProgram& program) {
     for (const auto& entry : std::filesystem::directory_iterator("/proc")) {
         std::error_code gone;
-        if (std::filesystem::read_symlink(entry.path() / "exe", gone) == program)
+        if (std::filesystem::read_symlink(entry.path() / "exe", gone) != QUARN_STAND_IN_READER)
+            continue;
+        const std::string status = readFile(entry.path() / "status");
+        if (status.find("\nPPid:\t" + std::to_string(program.id()) + "\n") != std::string::npos)
             return true;
     }
     return false;
@@ -76,12 +79,12 @@ TEST_F(Reader, LimitsOfMemoryAreSizes) {
 
 TEST_P(ReaderSignal, EndsAReadingThatNeverEnds) {
     RunningProgram program(info("hang"));
-    ASSERT_TRUE(program.waitUntil([] { return hasReader(QUARN_STAND_IN_READER); }));
+    ASSERT_TRUE(program.waitUntil([&] { return hasReader(program); }));
     program.sendSignal(GetParam());
     const Ended ended = program.wait();
     EXPECT_EQ(ended.exit_code, 128 + GetParam());
     EXPECT_EQ(ended.err, "Stopped while hang.obj was read.\n");
-    EXPECT_FALSE(hasReader(QUARN_STAND_IN_READER));
+    EXPECT_FALSE(hasReader(program));
 }
 
 INSTANTIATE_TEST_SUITE_P(Signals, ReaderSignal, testing::Values(SIGINT, SIGTERM, SIGHUP));
@@ -90,7 +93,7 @@ TEST_F(Reader, HowFarItIsStandsOnATerminal) {
     Start watched = info("hang");
     watched.has_terminal = true;
     RunningProgram program(watched);
-    ASSERT_TRUE(program.waitUntil([] { return hasReader(QUARN_STAND_IN_READER); }));
+    ASSERT_TRUE(program.waitUntil([&] { return hasReader(program); }));
     usleep(700'000); // it is shown after a moment
     program.sendSignal(SIGTERM);
     EXPECT_THAT(program.wait().err, HasSubstr("making the meshes of hang.obj, 25 %"));
