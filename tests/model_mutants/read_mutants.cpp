@@ -53,6 +53,14 @@ End endOf(const Result<ImportedModel>& model, const fs::path& file) {
                                                                           : End::refused;
 }
 
+/// Whether a reader of our own has the whole file in its hands: a glTF that is not of version 2
+/// goes to the library.
+bool isOwnReaders(const fs::path& file) {
+    const std::string format = modelFormat(file);
+    const bool is_gltf = format == "gltf" || format == "glb";
+    return hasOwnReader(format) && (!is_gltf || bytesOf(file).find("\"2.") != std::string::npos);
+}
+
 class MutantReading {
 public:
     MutantReading(std::vector<fs::path> models, fs::path kept)
@@ -104,7 +112,7 @@ private:
         ++m_ends[end];
         if (Clock::now() - begin > LONGEST_WITH_ITS_END)
             keep(file, number, "held the program up");
-        else if (end == End::stopped_reader && hasOwnReader(modelFormat(file)))
+        else if (end == End::stopped_reader && isOwnReaders(file))
             keep(file, number, "ended a reader of our own");
         else if (!model && model.message().empty())
             keep(file, number, "was refused without a word");
