@@ -41,8 +41,12 @@ std::string lengthText(double length) {
     return text;
 }
 
-std::string pointText(const KM_3dPoint& point) {
-    return lengthText(point.x) + "," + lengthText(point.y) + "," + lengthText(point.z);
+/// @param size  of the model, beside which what rounding leaves is nothing
+std::string pointText(const KM_3dPoint& point, double size) {
+    const auto coordinate = [size](double value) {
+        return lengthText(std::abs(value) < 1e-9 * size ? 0.0 : value);
+    };
+    return coordinate(point.x) + "," + coordinate(point.y) + "," + coordinate(point.z);
 }
 
 std::string sizeLine(const ModelContents& contents) {
@@ -51,7 +55,8 @@ std::string sizeLine(const ModelContents& contents) {
     const auto& [low, high] = *contents.box;
     const KM_3dVector size = high - low;
     return "size: " + lengthText(size.x) + " x " + lengthText(size.y) + " x " + lengthText(size.z) +
-           ", from " + pointText(low) + " to " + pointText(high) + "\n";
+           ", from " + pointText(low, size.Length()) + " to " + pointText(high, size.Length()) +
+           "\n";
 }
 
 std::string axisLine(const ModelContents& contents) {
