@@ -58,7 +58,8 @@ json jsonOf(const RecordingFile& recording) {
 
 // ---- From JSON. What has another type than it should throws, which ends in parseRecording.
 
-/// The library would convert a number of another type, and one too large for this is a double to it.
+/// The library would convert a number of another type, and one too large for this is a double to
+/// it.
 template <class Integer> Integer integerOf(const json& value) {
     if (!value.is_number_integer())
         throw std::out_of_range("number");

@@ -1,5 +1,6 @@
 #include "import/library/LibraryReader.h"
 
+#include "import/files/FileEnd.h"
 #include "import/files/LargeStack.h"
 #include "import/files/ModelFileCheck.h"
 #include "import/ifc/IfcPlace.h"
@@ -54,6 +55,12 @@ ModelConventions conventionsOf(const std::string& format) {
 UnitSystem unitsOf(const std::string& format) {
     // The library scales what it reads of IFC to metres, whatever the file counts in.
     return isOneOf(format, {"gltf", "glb", "ifc"}) ? UnitSystem::meters : UnitSystem::none;
+}
+
+/// The library reads what there is of a text, and says nothing of what there is not.
+bool isCutOff(const std::string& format, std::span<const std::uint8_t> bytes) {
+    const std::string_view mark = format == "dxf" ? "EOF" : format == "ifc" ? "END-ISO" : "";
+    return endOfFile(bytes).find(mark) == std::string_view::npos;
 }
 
 void configure(Assimp::Importer& importer) {
@@ -137,6 +144,9 @@ Result<SourceScene> readChecked(const ModelReading& reading) {
         scene.value().place = placeOfIfc(reading.bytes);
     }
     scene.value().up = upAxisOf(format, reading.up);
+    if (isCutOff(format, reading.bytes)) {
+        scene.value().warnings.emplace_back(CUT_OFF_TEXT);
+    }
     warnOfRefused(refused, scene.value());
     return scene;
 }

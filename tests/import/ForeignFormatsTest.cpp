@@ -8,6 +8,8 @@
 namespace quarn::test {
 namespace {
 
+using ::testing::ElementsAre;
+using ::testing::HasSubstr;
 using ::testing::IsEmpty;
 
 TEST(UpAxis, OfDxfIsZ) {
@@ -18,6 +20,17 @@ TEST(UpAxis, OfDxfIsZ) {
     const KM_BoundingBox box = boundsOf(model);
     expectNear(box.m_min, {0, 0, 0}, 1e-6);
     expectNear(box.m_max, {4, 1, 9}, 1e-6);
+}
+
+TEST(CutOff, IsToldOfADxfWithoutItsEnd) {
+    const TemporaryFolder folder;
+    const std::string whole =
+        "0\nSECTION\n2\nENTITIES\n0\n3DFACE\n8\nwalls\n10\n0\n20\n0\n30\n0\n11\n4\n"
+        "21\n0\n31\n0\n12\n4\n22\n1\n32\n9\n13\n4\n23\n1\n33\n9\n0\nENDSEC\n0\nEOF\n";
+    EXPECT_THAT(readOrFail(folder.write("whole.dxf", whole)).warnings, IsEmpty());
+    const ImportedModel cut =
+        readOrFail(folder.write("cut.dxf", whole.substr(0, whole.size() - 13)));
+    EXPECT_THAT(cut.warnings, ElementsAre(HasSubstr("was cut off")));
 }
 
 TEST(UpAxis, OfSmdIsZ) {

@@ -1,6 +1,7 @@
 #include "import/cad/module/CadDocument.h"
 
 #include "import/cad/module/CadProgress.h"
+#include "import/files/FileEnd.h"
 
 #include <BRepTools.hxx>
 #include <BRep_Builder.hxx>
@@ -99,12 +100,6 @@ bool readBrepInto(const ModelReading& reading, Handle(TDocStd_Document) & docume
     return true;
 }
 
-std::string_view endOf(std::span<const std::uint8_t> bytes) {
-    constexpr std::size_t MOST = 400;
-    const std::size_t count = std::min(bytes.size(), MOST);
-    return {reinterpret_cast<const char*>(bytes.data() + bytes.size() - count), count};
-}
-
 /// The last line of an IGES file has a T in column 73.
 bool endsAsIges(std::string_view end) {
     constexpr std::size_t SECTION_COLUMN = 72;
@@ -132,14 +127,12 @@ Result<Handle(TDocStd_Document)> readCadDocument(const ModelReading& reading, Ca
 }
 
 std::string cutOffText(const ModelReading& reading, CadFormat format) {
-    const std::string_view end = endOf(reading.bytes);
+    const std::string_view end = endOfFile(reading.bytes);
     const bool is_whole =
         format == CadFormat::brep ||
         (format == CadFormat::iges ? endsAsIges(end)
                                    : end.find("END-ISO") != std::string_view::npos);
-    return is_whole ? std::string()
-                    : "The file's end is missing: it was cut off, and parts of the model may be "
-                      "missing with it.";
+    return is_whole ? "" : CUT_OFF_TEXT;
 }
 
 } // namespace quarn

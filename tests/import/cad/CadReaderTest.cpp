@@ -170,8 +170,7 @@ TEST_F(CadFiles, ReadingMayBeGivenUp) {
 
 TEST_F(CadFiles, WhatTheMemoryDoesNotHoldIsRefused) {
     addPart(BRepPrimAPI_MakeSphere(10.0).Shape(), "Ball");
-    const auto read =
-        readModelFile(writeStep("a.step"), {.tolerance = 0.01, .most_memory = 20000});
+    const auto read = readModelFile(writeStep("a.step"), {.tolerance = 0.01, .most_memory = 20000});
     ASSERT_FALSE(read.ok());
     EXPECT_THAT(read.message(), HasSubstr("its triangles need"));
 }

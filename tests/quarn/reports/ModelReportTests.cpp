@@ -28,17 +28,17 @@ TEST(ModelReport, TellsTheFileAndWhatIsInIt) {
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     EXPECT_THAT(ended.err, IsEmpty());
     // A hall of 4 x 2 x 1 and a tower on it that ends at 4.
-    EXPECT_THAT(
-        linesOf(ended.out),
-        ElementsAre(StrEq("name: house.obj"), StrEq("format: OBJ"),
-                    StrEq("file size: " + std::to_string(file_size) + " bytes"),
-                    MatchesRegex("read in: [0-9]+ ms"),
-                    StrEq("up: Z, as most such files have it; --up y turns it"),
-                    StrEq("units: not stated"), StrEq("size: 4 x 2 x 4, from 0,0,0 to 4,2,4"),
-                    MatchesRegex("objects: 2 meshes with 24 triangles and [0-9]+ vertices, "
-                                 "0 curves, 0 points"),
-                    StrEq("materials: 0"), StrEq("hall  mesh, 12 triangles"),
-                    StrEq("tower  mesh, 12 triangles")));
+    EXPECT_THAT(linesOf(ended.out),
+                ElementsAre(StrEq("name: house.obj"), StrEq("format: OBJ"),
+                            StrEq("file size: " + std::to_string(file_size) + " bytes"),
+                            MatchesRegex("read in: [0-9]+ ms"),
+                            StrEq("up: Z, as most such files have it; --up y turns it"),
+                            StrEq("units: not stated"),
+                            StrEq("size: 4 x 2 x 4, from 0,0,0 to 4,2,4"),
+                            MatchesRegex("objects: 2 meshes with 24 triangles and [0-9]+ vertices, "
+                                         "0 curves, 0 points"),
+                            StrEq("materials: 0"), StrEq("hall  mesh, 12 triangles"),
+                            StrEq("tower  mesh, 12 triangles")));
 }
 
 /// Two triangles of a material with a picture of 2 x 1 pixels, and a grid of 40 x 40 squares.
