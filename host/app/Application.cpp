@@ -69,10 +69,10 @@ void Application::loadTexts(const std::string& owner,
 }
 
 void Application::addHostCommands(std::vector<std::unique_ptr<CQuarnCommand>> commands) {
-    m_host_commands = std::move(commands);
-    for (const std::unique_ptr<CQuarnCommand>& command : m_host_commands) {
+    for (std::unique_ptr<CQuarnCommand>& command : commands) {
         if (Result<void> added = m_commands.add(*command); !added)
             tell(added.message());
+        m_host_commands.push_back(std::move(command));
     }
 }
 
@@ -111,9 +111,10 @@ bool Application::mayWrite(const std::filesystem::path& file) const {
     return !m_recording || m_recording->mayWrite(file);
 }
 
-void Application::pictureWritten(const std::filesystem::path& file) {
+void Application::pictureWritten(const std::filesystem::path& file, const Image& picture) {
     if (m_recording)
-        m_recording->fileWritten(file);
+        if (const auto frame = m_recording->fileWritten(file))
+            m_followers.frameRecorded(*frame, file, picture);
     RunningCommand* command = m_runner.outermost();
     if (!command)
         return;

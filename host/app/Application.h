@@ -4,6 +4,7 @@
 #include "host/app/CommandRegistry.h"
 #include "host/app/CommandRunner.h"
 #include "host/app/PlugInLoader.h"
+#include "host/app/RecordingFollowers.h"
 #include "host/app/StringTables.h"
 #include "host/border/Contract.h"
 #include "host/document/DocumentList.h"
@@ -40,7 +41,7 @@ public:
     /// every other thread, which is reported as a breach.
     static Application* forCall(const char* call);
 
-    /// Registers the host's own commands; one that cannot be is told.
+    /// Registers commands of the host's own; one that cannot be is told.
     void addHostCommands(std::vector<std::unique_ptr<CQuarnCommand>> commands);
 
     FrontEnd& frontEnd() const { return m_front_end; }
@@ -66,11 +67,15 @@ public:
     }
     /// To be called after a picture was written to a file: counts it for the command that runs, and
     /// tells the front end. Without a running command nothing happens.
-    void pictureWritten(const std::filesystem::path& file);
+    /// @param picture  what the file holds
+    void pictureWritten(const std::filesystem::path& file, const Image& picture);
 
     /// The recording of a whole animation that runs now, or null. RecordingScope begins and ends
     /// it.
     RunningRecording* recording() const { return m_recording.get(); }
+    /// Who follows the recording that runs now, or the next one. RecordingScope lets them go at
+    /// its end.
+    RecordingFollowers& recordingFollowers() { return m_followers; }
     void setRecording(std::unique_ptr<RunningRecording> recording) {
         m_recording = std::move(recording);
     }
@@ -99,6 +104,7 @@ private:
     std::unique_ptr<DocumentList> m_documents;
     std::unique_ptr<PlugInLoader> m_plug_ins;
     std::unique_ptr<RunningRecording> m_recording;
+    RecordingFollowers m_followers;
     std::map<HWND, std::unique_ptr<CWnd>> m_windows;
     const CDialog* m_open_dialog = nullptr;
     bool m_exit_requested = false;

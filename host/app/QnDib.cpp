@@ -33,7 +33,7 @@ bool CQuarnDib::WriteToFile(const wchar_t* path, int) const {
         return false;
     const auto written = quarn::writeImageFile(file, *m_image, application->protection());
     if (written)
-        application->pictureWritten(file);
+        application->pictureWritten(file, *m_image);
     else
         application->tell(written.message());
     return written.ok();

@@ -44,10 +44,15 @@ std::string modeOf(const KM_3dmAnimationProperties& record) {
     return mode ? mode->EnglishName().ToUtf8() : "";
 }
 
-void takePictureSize(const KM_3dmAnimationProperties& record, Document& document,
-                     RecordingSettings& settings) {
+KM_wString recordedViewName(const KM_3dmAnimationProperties& record) {
     KM_wString name = record.ViewportName();
     name.TrimLeftAndRight();
+    return name;
+}
+
+void takePictureSize(const KM_3dmAnimationProperties& record, Document& document,
+                     RecordingSettings& settings) {
+    const KM_wString name = recordedViewName(record);
     if (record.RenderFull() || record.RenderPreview()) {
         settings.width_px = document.renderWindow().settings.width_px;
         settings.height_px = document.renderWindow().settings.height_px;
@@ -84,23 +89,43 @@ std::unique_ptr<RunningRecording> makeRecording(Application& application, CQuarn
     return std::make_unique<RunningRecording>(std::move(plan), tell);
 }
 
+/// The camera of the view that the record names.
+RecordingFollowers::Camera cameraOf(CQuarnDoc& document) {
+    const IQnZoetrixDynamicAccess* const access = Zoetrix_QuarnDynamicAccess();
+    if (!access)
+        return nullptr;
+    return [&document = Document::of(document),
+            name = recordedViewName(access->AnimationProperties(document))] {
+        const ViewState* const view = document.findView(name.View());
+        return view ? view->viewport() : KM_Viewport();
+    };
+}
+
 } // namespace
 
 RecordingScope::RecordingScope(Application& application, CQuarnCommand& command,
                                CQuarnDoc& document)
     : m_application(application),
       m_is_recording(!application.recording() && command.CommandUUID() == recording_command_id) {
-    if (m_is_recording)
-        application.setRecording(makeRecording(application, document));
+    if (!m_is_recording)
+        return;
+    application.setRecording(makeRecording(application, document));
+    application.recordingFollowers().begin(cameraOf(document));
 }
 
 RecordingScope::~RecordingScope() {
-    if (!m_is_recording || !m_application.recording())
+    if (!m_is_recording)
         return;
-    const auto ended = acrossBorder([this] {
-        if (const auto report = m_application.recording()->end())
+    RecordingFollowers& followers = m_application.recordingFollowers();
+    const auto ended = acrossBorder([&] {
+        if (!m_application.recording())
+            return;
+        if (const auto report = m_application.recording()->end()) {
+            followers.end(*report);
             m_application.frontEnd().recordingEnded(*report);
+        }
     });
+    followers.clear();
     m_application.setRecording(nullptr);
     if (!ended)
         m_application.tell(ended.message());

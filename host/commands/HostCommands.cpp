@@ -108,12 +108,17 @@ private:
 
 } // namespace
 
-std::vector<std::unique_ptr<CQuarnCommand>> makeHostCommands() {
+std::vector<std::unique_ptr<CQuarnCommand>>
+makeCommands(std::span<const HostCommandEntry> entries) {
     const PendingObjects::Scope unannounced;
     std::vector<std::unique_ptr<CQuarnCommand>> commands;
-    for (const HostCommandEntry& entry : HOST_COMMANDS)
+    for (const HostCommandEntry& entry : entries)
         commands.push_back(std::make_unique<HostCommand>(entry));
     return commands;
+}
+
+std::vector<std::unique_ptr<CQuarnCommand>> makeHostCommands() {
+    return makeCommands(HOST_COMMANDS);
 }
 
 } // namespace quarn

@@ -3,6 +3,7 @@
 #include "sdk/qncore/QnCommand.h"
 
 #include <memory>
+#include <span>
 #include <vector>
 
 namespace quarn {
@@ -18,8 +19,12 @@ struct HostCommandEntry {
     bool is_hidden = false;
 };
 
-/// Makes the command objects of the table in HostCommands.cpp, in its order. They are announced
-/// nowhere: whoever takes them registers them.
+/// Makes the command objects of a table, in its order. They are announced nowhere: whoever takes
+/// them registers them.
+/// @param entries  must outlive the commands
+std::vector<std::unique_ptr<CQuarnCommand>> makeCommands(std::span<const HostCommandEntry> entries);
+
+/// The commands of the table in HostCommands.cpp.
 std::vector<std::unique_ptr<CQuarnCommand>> makeHostCommands();
 
 CQuarnCommand::result runExit(const CQuarnCommandContext& context);

@@ -78,7 +78,7 @@ CQuarnCommand::result runSaveRenderWindowAs(const CQuarnCommandContext& context)
     document.list().noteUnsavedPicture(written ? std::string() : written.message());
     if (!written)
         return fail(written.message());
-    application.pictureWritten(file);
+    application.pictureWritten(file, window.picture);
     return CQuarnCommand::success;
 }
 

@@ -91,16 +91,18 @@ bool RunningRecording::mayWrite(const fs::path& file) {
     return m_state != State::refused || !isInPlace(file);
 }
 
-void RunningRecording::fileWritten(const fs::path& file) {
+std::optional<int> RunningRecording::fileWritten(const fs::path& file) {
     if (m_state != State::running || !isInPlace(file))
-        return;
+        return std::nullopt;
     if (isPage(file)) {
         m_page_is_written = true;
-        return;
+        return std::nullopt;
     }
+    const auto frame = frameOf(file);
     ++m_written;
-    m_file.written.add(*frameOf(file));
+    m_file.written.add(*frame);
     beat();
+    return frame;
 }
 
 void RunningRecording::beat() {

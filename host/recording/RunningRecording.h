@@ -38,7 +38,8 @@ public:
     /// recording's always may. Takes the file's folder if none was begun.
     bool mayWrite(const std::filesystem::path& file);
     /// To be called after a picture or the page was written.
-    void fileWritten(const std::filesystem::path& file);
+    /// @return the number of the frame, from 0, that the file is the picture of; else nothing
+    std::optional<int> fileWritten(const std::filesystem::path& file);
 
     /// To be called again and again, also between the frames: now and then renews NAME.recording.
     void beat();

@@ -2,6 +2,7 @@
 
 #include "host/app/Application.h"
 #include "host/commands/HostCommands.h"
+#include "host/share/ShareCommands.h"
 
 namespace quarn {
 
@@ -9,6 +10,7 @@ struct Session::State {
     State(FrontEnd& front_end, SessionOptions options)
         : application(front_end, std::move(options)) {
         application.addHostCommands(makeHostCommands());
+        application.addHostCommands(makeShareCommands());
     }
     Application application;
 };

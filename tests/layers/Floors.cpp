@@ -28,7 +28,8 @@ const Places BELOW_APP = BELOW_DOCUMENT + "host/document/" + "host/reader/" + "h
 const Places BELOW_PROMPT = BELOW_APP + "host/app/";
 const Places BELOW_DIALOGS = BELOW_PROMPT + "host/prompt/";
 const Places BELOW_COMMANDS = BELOW_DIALOGS + "host/dialogs/" + "host/recovery/";
-const Places BELOW_SESSION = BELOW_COMMANDS + "host/commands/";
+const Places BELOW_SHARE = BELOW_COMMANDS + "host/commands/";
+const Places BELOW_SESSION = BELOW_SHARE + "host/share/";
 
 // What a program sees of the host: its door, what it implements itself, and the cities of the
 // world.
@@ -74,6 +75,7 @@ const Room FLOORS[] = {
     {7, "host/prompt/", BELOW_PROMPT},
     {8, "host/dialogs/", BELOW_DIALOGS},
     {9, "host/commands/", BELOW_COMMANDS},
+    {9, "host/share/", BELOW_SHARE},
     {10, "host/session/", BELOW_SESSION},
     {10, "host/cocoa/", INTERFACE + "ground/Result.h" + "host/front_end/", {}, any_and_cocoa},
 
