@@ -1,4 +1,5 @@
 #include "ground/AtomicFile.h"
+#include "ground/Checksum.h"
 #include "ground/FileBytes.h"
 #include "ground/PathText.h"
 #include "host/recording/FramesManifest.h"
@@ -42,18 +43,11 @@ json jsonOf(const FrameSun& sun) {
             {"altitude_deg", sun.altitude_deg}};
 }
 
-std::string hexadecimal(std::uint64_t number) {
-    char digits[16];
-    const auto end = std::to_chars(digits, digits + sizeof digits, number, 16).ptr;
-    const std::string text(digits, end);
-    return std::string(sizeof digits - text.size(), '0') + text;
-}
-
 json jsonOf(const ManifestFrame& frame) {
     json object = {{"frame", frame.number},
                    {"file", frame.file},
                    {"bytes", frame.bytes},
-                   {"xxh64", hexadecimal(frame.xxh64)}};
+                   {"xxh64", checksumText(frame.xxh64)}};
     if (frame.camera)
         object["camera"] = jsonOf(*frame.camera);
     if (frame.sun)
