@@ -5,6 +5,7 @@
 #include "host/app/DocumentSaving.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileNameQuestion.h"
+#include "host/commands/StudyPlace.h"
 #include "host/commands/UpAxisText.h"
 #include "host/commands/WatchedReading.h"
 #include "host/document/DocumentList.h"
@@ -68,8 +69,14 @@ ContentCounts countsOf(const DocumentContent& content) {
     return counts;
 }
 
+void addSentence(std::string& line, const std::string& sentence) {
+    if (!sentence.empty())
+        line += (line.ends_with('.') ? " " : ". ") + sentence;
+}
+
 /// Tells what may be wrong with what was read, then what it is.
-void tellContent(const AskedFile& asked, const std::vector<std::string>& warnings) {
+void tellContent(Document& document, const AskedFile& asked,
+                 const std::vector<std::string>& warnings) {
     Application& application = *Application::current();
     for (const std::string& warning : warnings)
         application.tell(warning);
@@ -77,8 +84,9 @@ void tellContent(const AskedFile& asked, const std::vector<std::string>& warning
         std::visit([](const auto& content) { return countsOf(content); }, asked.content);
     std::string result = textFromPath(asked.file.filename()).ToUtf8() + ": " + counts.text();
     if (const auto* model = std::get_if<ImportedModel>(&asked.content)) {
-        const std::string axis = upAxisText(model->up);
-        result += axis.empty() ? axis : ". " + axis;
+        addSentence(result, upAxisText(model->up));
+        if (model->place && asked.is_interactive)
+            addSentence(result, offerStudyPlace(document, *model->place));
     }
     application.tell(result);
 }
@@ -191,6 +199,7 @@ AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use) {
         asked.result = fail(read.message());
     if (!read && asked.is_given_up)
         asked.result = CQuarnCommand::cancel;
+    asked.is_interactive = context.IsInteractive();
     return asked;
 }
 
@@ -198,9 +207,10 @@ void addToDocument(Document& document, const AskedFile& asked) {
     const bool was_empty = document.objects().empty();
     if (const auto* model = std::get_if<ImportedModel>(&asked.content)) {
         document.addModel(*model);
-        tellContent(asked, model->warnings);
+        tellContent(document, asked, model->warnings);
     } else {
-        tellContent(asked, importContent(document, std::get<DocumentContent>(asked.content)));
+        tellContent(document, asked,
+                    importContent(document, std::get<DocumentContent>(asked.content)));
     }
     if (was_empty)
         fitViews(document);
@@ -214,7 +224,7 @@ void openAsDocument(DocumentList& list, const AskedFile& asked) {
         document.markSaved(); // nobody wants to be asked about a model that was only looked at
         return;
     }
-    tellContent(asked, openContent(document, *content));
+    tellContent(document, asked, openContent(document, *content));
     std::error_code ignored;
     document.setFile(std::filesystem::absolute(asked.file, ignored));
     if (content->views.empty())

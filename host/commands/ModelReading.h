@@ -19,6 +19,7 @@ struct AskedFile {
     std::filesystem::path file;
     bool is_given_up = false;                             ///< by the person, while it was read
     std::variant<ImportedModel, DocumentContent> content; ///< only after success
+    bool is_interactive = false;                          ///< a person in a window asked for it
 };
 
 /// Asks for a model or document file and reads and checks it whole; no open document is touched.
