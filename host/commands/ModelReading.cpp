@@ -6,8 +6,10 @@
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileNameQuestion.h"
 #include "host/commands/StudyPlace.h"
+#include "host/commands/UpAxisAsking.h"
 #include "host/commands/UpAxisText.h"
 #include "host/commands/WatchedReading.h"
+#include "host/document/DocumentDrawing.h"
 #include "host/document/DocumentList.h"
 #include "host/document/ViewFit.h"
 #include "host/document/file/DocumentExtension.h"
@@ -200,10 +202,13 @@ AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use) {
     if (!read && asked.is_given_up)
         asked.result = CQuarnCommand::cancel;
     asked.is_interactive = context.IsInteractive();
+    auto* const model = std::get_if<ImportedModel>(&asked.content);
+    if (read && model && asked.is_interactive)
+        asked.scene = askUpAxis(asked.file, *model);
     return asked;
 }
 
-void addToDocument(Document& document, const AskedFile& asked) {
+void addToDocument(Document& document, AskedFile& asked) {
     const bool was_empty = document.objects().empty();
     if (const auto* model = std::get_if<ImportedModel>(&asked.content)) {
         document.addModel(*model);
@@ -212,11 +217,13 @@ void addToDocument(Document& document, const AskedFile& asked) {
         tellContent(document, asked,
                     importContent(document, std::get<DocumentContent>(asked.content)));
     }
+    if (was_empty && asked.scene)
+        document.drawing().startWith(std::move(asked.scene));
     if (was_empty)
         fitViews(document);
 }
 
-void openAsDocument(DocumentList& list, const AskedFile& asked) {
+void openAsDocument(DocumentList& list, AskedFile& asked) {
     Document& document = list.openNew();
     const auto* content = std::get_if<DocumentContent>(&asked.content);
     if (!content) {
