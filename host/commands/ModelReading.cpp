@@ -5,8 +5,11 @@
 #include "host/app/DocumentSaving.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileNameQuestion.h"
+#include "host/commands/StudyPlace.h"
+#include "host/commands/UpAxisAsking.h"
 #include "host/commands/UpAxisText.h"
 #include "host/commands/WatchedReading.h"
+#include "host/document/DocumentDrawing.h"
 #include "host/document/DocumentList.h"
 #include "host/document/ViewFit.h"
 #include "host/document/file/DocumentExtension.h"
@@ -68,8 +71,14 @@ ContentCounts countsOf(const DocumentContent& content) {
     return counts;
 }
 
+void addSentence(std::string& line, const std::string& sentence) {
+    if (!sentence.empty())
+        line += (line.ends_with('.') ? " " : ". ") + sentence;
+}
+
 /// Tells what may be wrong with what was read, then what it is.
-void tellContent(const AskedFile& asked, const std::vector<std::string>& warnings) {
+void tellContent(Document& document, const AskedFile& asked,
+                 const std::vector<std::string>& warnings) {
     Application& application = *Application::current();
     for (const std::string& warning : warnings)
         application.tell(warning);
@@ -77,8 +86,9 @@ void tellContent(const AskedFile& asked, const std::vector<std::string>& warning
         std::visit([](const auto& content) { return countsOf(content); }, asked.content);
     std::string result = textFromPath(asked.file.filename()).ToUtf8() + ": " + counts.text();
     if (const auto* model = std::get_if<ImportedModel>(&asked.content)) {
-        const std::string axis = upAxisText(model->up);
-        result += axis.empty() ? axis : ". " + axis;
+        addSentence(result, upAxisText(model->up));
+        if (model->place && asked.is_interactive)
+            addSentence(result, offerStudyPlace(document, *model->place));
     }
     application.tell(result);
 }
@@ -191,22 +201,29 @@ AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use) {
         asked.result = fail(read.message());
     if (!read && asked.is_given_up)
         asked.result = CQuarnCommand::cancel;
+    asked.is_interactive = context.IsInteractive();
+    auto* const model = std::get_if<ImportedModel>(&asked.content);
+    if (read && model && asked.is_interactive)
+        asked.scene = askUpAxis(asked.file, *model);
     return asked;
 }
 
-void addToDocument(Document& document, const AskedFile& asked) {
+void addToDocument(Document& document, AskedFile& asked) {
     const bool was_empty = document.objects().empty();
     if (const auto* model = std::get_if<ImportedModel>(&asked.content)) {
         document.addModel(*model);
-        tellContent(asked, model->warnings);
+        tellContent(document, asked, model->warnings);
     } else {
-        tellContent(asked, importContent(document, std::get<DocumentContent>(asked.content)));
+        tellContent(document, asked,
+                    importContent(document, std::get<DocumentContent>(asked.content)));
     }
+    if (was_empty && asked.scene)
+        document.drawing().startWith(std::move(asked.scene));
     if (was_empty)
         fitViews(document);
 }
 
-void openAsDocument(DocumentList& list, const AskedFile& asked) {
+void openAsDocument(DocumentList& list, AskedFile& asked) {
     Document& document = list.openNew();
     const auto* content = std::get_if<DocumentContent>(&asked.content);
     if (!content) {
@@ -214,7 +231,7 @@ void openAsDocument(DocumentList& list, const AskedFile& asked) {
         document.markSaved(); // nobody wants to be asked about a model that was only looked at
         return;
     }
-    tellContent(asked, openContent(document, *content));
+    tellContent(document, asked, openContent(document, *content));
     std::error_code ignored;
     document.setFile(std::filesystem::absolute(asked.file, ignored));
     if (content->views.empty())

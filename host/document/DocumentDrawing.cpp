@@ -6,12 +6,17 @@
 
 #include <new>
 #include <string>
+#include <utility>
 
 namespace quarn {
 
 DocumentDrawing::DocumentDrawing(const Document& document) : m_document(document) {}
 
 DocumentDrawing::~DocumentDrawing() = default;
+
+void DocumentDrawing::startWith(std::unique_ptr<DocumentScene> scene) {
+    m_scene = std::move(scene);
+}
 
 void DocumentDrawing::release() {
     m_scene.reset();

@@ -50,6 +50,9 @@ public:
     Result<const DocumentScene*> scene();
     /// Brings the scene up to date where it was built before.
     Result<void> regenerate();
+    /// Begins with a scene of the meshes that the document got just now, so that they need not be
+    /// built again.
+    void startWith(std::unique_ptr<DocumentScene> scene);
     /// Frees the scene.
     void release();
 

@@ -10,6 +10,7 @@
 namespace quarn {
 
 class ObjectTable;
+struct ImportedModel;
 
 /// A document's objects made ready for drawing, once for all its views.
 class DocumentScene {
@@ -20,6 +21,10 @@ public:
     /// @return an error when the scene cannot be built
     Result<void> update(const ObjectTable& objects, std::span<const KM_Light> lights,
                         std::span<const KM_UUID> hidden = {});
+
+    /// Takes over a model that is in no document, in place of all that was there. What was built of
+    /// large meshes is used again by the next update of a scene that has them too.
+    Result<void> update(const ImportedModel& model, std::span<const KM_Light> lights);
 
     /// Draws the scene as the last update left it; as DisplayPipeline::draw. A picture that does
     /// not fit into memory is refused before any work begins.
@@ -38,6 +43,7 @@ private:
     SceneContent m_content;
     DisplayScene m_display;
     DisplayPipeline m_pipeline; ///< keeps its buffers from picture to picture
+    std::uint64_t m_models = 0; ///< that were taken over
 };
 
 } // namespace quarn

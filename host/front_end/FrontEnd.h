@@ -108,6 +108,8 @@ public:
     /// Lets a person choose a file to open, or one to save in; an existing one of the latter only
     /// after the person agreed to replace it.
     virtual FileChoice chooseFile(const FileQuestion& question);
+    /// Lets a person choose which axis of a model file points up. @return nothing when none was
+    virtual std::optional<ModelUp> chooseUpAxis(const UpAxisQuestion& question);
     /// Told whenever a view shows a picture, drawn anew or not.
     virtual void viewShown(CQuarnView& view, const ShownPicture& picture);
     /// Told when the render window shows another picture; one of no size when it was closed. Where
