@@ -6,12 +6,15 @@
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileNameQuestion.h"
 #include "host/commands/UpAxisText.h"
+#include "host/commands/WatchedBuilding.h"
 #include "host/commands/WatchedReading.h"
+#include "host/document/DocumentDrawing.h"
 #include "host/document/DocumentList.h"
 #include "host/document/ViewFit.h"
 #include "host/document/file/DocumentExtension.h"
 #include "host/document/file/DocumentFile.h"
 #include "host/reader/ModelReader.h"
+#include "host/reader/ReaderEnds.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLocalize.h"
 
@@ -158,18 +161,46 @@ Result<void> readDocument(AskedFile& asked, const ReadingWish& wish) {
     return {};
 }
 
-Result<void> readModelOf(AskedFile& asked, const ReadingWish& wish) {
-    const Application& application = *Application::current();
-    WatchedReading watch(application.frontEnd(), asked.file);
-    auto model = readModel(asked.file, {.up = wish.up,
-                                        .tolerance = wish.tolerance,
-                                        .most_memory = application.options().most_memory,
-                                        .watch = &watch});
-    asked.is_given_up = watch.isGivenUp();
+Result<void> readModelOf(AskedFile& asked, const ReadingWish& wish, WatchedReading& watch) {
+    auto model =
+        readModel(asked.file, {.up = wish.up,
+                               .tolerance = wish.tolerance,
+                               .most_memory = Application::current()->options().most_memory,
+                               .watch = &watch});
     if (!model)
         return model.error();
     asked.content = std::move(model.value());
     return {};
+}
+
+std::vector<SceneMesh> meshesOf(const ImportedModel& model) {
+    std::vector<SceneMesh> meshes;
+    for (const ImportedMesh& mesh : model.meshes)
+        meshes.push_back({mesh.placed, KM_nil_uuid});
+    return meshes;
+}
+
+std::vector<SceneMesh> meshesOf(const DocumentContent& content) {
+    std::vector<SceneMesh> meshes;
+    for (const ObjectContent& object : content.objects)
+        if (object.placed.mesh)
+            meshes.push_back({object.placed, object.id, object.visible});
+    return meshes;
+}
+
+/// Reads the file and, where it will be drawn, builds its scene.
+Result<void> load(AskedFile& asked, const ReadingWish& wish, const Document* document) {
+    const Application& application = *Application::current();
+    WatchedReading watch(application.frontEnd(), asked.file);
+    Result<void> loaded =
+        isDocumentFile(asked.file) ? readDocument(asked, wish) : readModelOf(asked, wish, watch);
+    if (loaded && application.options().builds_scenes) {
+        const auto meshes =
+            std::visit([](const auto& content) { return meshesOf(content); }, asked.content);
+        asked.scene = buildWatched(document, meshes, watch);
+    }
+    asked.is_given_up = watch.isGivenUp();
+    return loaded && asked.is_given_up ? readingGivenUp(asked.file) : loaded;
 }
 
 } // namespace
@@ -185,8 +216,9 @@ AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use) {
     asked.file = choice.kind == FileChoice::Kind::chosen ? choice.file : asked.file;
     if (asked.result != CQuarnCommand::success)
         return asked;
-    const auto read =
-        isDocumentFile(asked.file) ? readDocument(asked, wish) : readModelOf(asked, wish);
+    const Document* const document =
+        use == FileUse::import ? &Document::of(context.Document()) : nullptr;
+    const auto read = load(asked, wish, document);
     if (!read)
         asked.result = fail(read.message());
     if (!read && asked.is_given_up)
@@ -194,7 +226,7 @@ AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use) {
     return asked;
 }
 
-void addToDocument(Document& document, const AskedFile& asked) {
+void addToDocument(Document& document, AskedFile& asked) {
     const bool was_empty = document.objects().empty();
     if (const auto* model = std::get_if<ImportedModel>(&asked.content)) {
         document.addModel(*model);
@@ -202,11 +234,13 @@ void addToDocument(Document& document, const AskedFile& asked) {
     } else {
         tellContent(asked, importContent(document, std::get<DocumentContent>(asked.content)));
     }
+    if (asked.scene)
+        document.drawing().takeScene(std::move(asked.scene));
     if (was_empty)
         fitViews(document);
 }
 
-void openAsDocument(DocumentList& list, const AskedFile& asked) {
+void openAsDocument(DocumentList& list, AskedFile& asked) {
     Document& document = list.openNew();
     const auto* content = std::get_if<DocumentContent>(&asked.content);
     if (!content) {
@@ -215,6 +249,8 @@ void openAsDocument(DocumentList& list, const AskedFile& asked) {
         return;
     }
     tellContent(asked, openContent(document, *content));
+    if (asked.scene)
+        document.drawing().takeScene(std::move(asked.scene));
     std::error_code ignored;
     document.setFile(std::filesystem::absolute(asked.file, ignored));
     if (content->views.empty())

@@ -103,6 +103,14 @@ Result<const DocumentScene*> DocumentDrawing::scene() {
     }
 }
 
+std::unique_ptr<DocumentScene> DocumentDrawing::sceneWith(std::span<const SceneMesh> added) const {
+    return std::make_unique<DocumentScene>(m_document.objects(), added, m_scene.get());
+}
+
+void DocumentDrawing::takeScene(std::unique_ptr<DocumentScene> scene) {
+    m_scene = std::move(scene);
+}
+
 Result<void> DocumentDrawing::regenerate() {
     return m_scene ? update(SceneChanges()) : Result<void>();
 }

@@ -10,10 +10,25 @@
 namespace quarn {
 
 class ObjectTable;
+struct BuildProgress;
 
 /// A document's objects made ready for drawing, once for all its views.
 class DocumentScene {
 public:
+    DocumentScene() = default;
+    /// A scene that is to be built before its document has all that it shows.
+    /// @param objects  of the document
+    /// @param added    meshes that will stand behind them; the scene is the document's own once its
+    ///                 objects have them
+    /// @param earlier  the document's scene, whose large meshes need not be built again; may be
+    ///                 null
+    DocumentScene(const ObjectTable& objects, std::span<const SceneMesh> added,
+                  const DocumentScene* earlier);
+
+    /// Builds a scene of the other constructor, on any thread.
+    /// @return an error when it cannot be built, or was given up
+    Result<void> build(BuildProgress& progress);
+
     /// Takes over what changed since the last call: everything when an object was added, removed
     /// or changed, else the lights and what is shown or hidden.
     /// @param hidden  objects that are not shown although they are visible
