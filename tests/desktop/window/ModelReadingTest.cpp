@@ -55,8 +55,8 @@ TEST_F(ModelReadingTest, LeavesTheWindowAlive) {
     EXPECT_EQ(looks, 20);
 }
 
-/// A field of half a million triangles, read by the program that comes with the host.
-std::filesystem::path largeModel(const std::filesystem::path& folder) {
+/// A field of half a million triangles.
+std::string largeObj() {
     constexpr int SQUARES = 500;
     std::string text;
     for (int i = 0; i <= SQUARES; ++i)
@@ -69,13 +69,12 @@ std::filesystem::path largeModel(const std::filesystem::path& folder) {
                     std::to_string(corner + SQUARES + 2) + ' ' +
                     std::to_string(corner + SQUARES + 1) + '\n';
         }
-    quarn::test::writeFile(folder / "large.obj", text);
-    return folder / "large.obj";
+    return text;
 }
 
 TEST_F(ModelReadingTest, IsCancelledWhileTheSceneIsBuilt) {
-    qunsetenv("QUARN_READER");
-    largeModel(folder);
+    qunsetenv("QUARN_READER"); // the program that comes with the host reads it
+    quarn::test::writeFile(folder / "large.obj", largeObj());
     run("_Point 1,2,3");
     QString text;
     bool has_waited = false;
