@@ -60,6 +60,7 @@ int runWindow(QApplication& application, const Arguments& arguments) {
     quarn::SessionOptions options = sessionOptions(arguments.language.toStdString());
     options.overwrites = arguments.overwrites;
     options.most_memory = arguments.most_memory;
+    options.builds_scenes = true;
     quarn::Session session(front_end, std::move(options));
     const quarn::PlugInLoad load = session.loadPlugIn(plugInFolder() / "Zoetrix.qnp");
     MainWindow window(session, front_end);

@@ -8,6 +8,7 @@
 #include "host/commands/StudyPlace.h"
 #include "host/commands/UpAxisAsking.h"
 #include "host/commands/UpAxisText.h"
+#include "host/commands/WatchedBuilding.h"
 #include "host/commands/WatchedReading.h"
 #include "host/document/DocumentDrawing.h"
 #include "host/document/DocumentList.h"
@@ -15,6 +16,7 @@
 #include "host/document/file/DocumentExtension.h"
 #include "host/document/file/DocumentFile.h"
 #include "host/reader/ModelReader.h"
+#include "host/reader/ReaderEnds.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLocalize.h"
 
@@ -168,18 +170,46 @@ Result<void> readDocument(AskedFile& asked, const ReadingWish& wish) {
     return {};
 }
 
-Result<void> readModelOf(AskedFile& asked, const ReadingWish& wish) {
-    const Application& application = *Application::current();
-    WatchedReading watch(application.frontEnd(), asked.file);
-    auto model = readModel(asked.file, {.up = wish.up,
-                                        .tolerance = wish.tolerance,
-                                        .most_memory = application.options().most_memory,
-                                        .watch = &watch});
-    asked.is_given_up = watch.isGivenUp();
+Result<void> readModelOf(AskedFile& asked, const ReadingWish& wish, WatchedReading& watch) {
+    auto model =
+        readModel(asked.file, {.up = wish.up,
+                               .tolerance = wish.tolerance,
+                               .most_memory = Application::current()->options().most_memory,
+                               .watch = &watch});
     if (!model)
         return model.error();
     asked.content = std::move(model.value());
     return {};
+}
+
+std::vector<SceneMesh> meshesOf(const ImportedModel& model) {
+    std::vector<SceneMesh> meshes;
+    for (const ImportedMesh& mesh : model.meshes)
+        meshes.push_back({mesh.placed, KM_nil_uuid});
+    return meshes;
+}
+
+std::vector<SceneMesh> meshesOf(const DocumentContent& content) {
+    std::vector<SceneMesh> meshes;
+    for (const ObjectContent& object : content.objects)
+        if (object.placed.mesh)
+            meshes.push_back({object.placed, object.id, object.visible});
+    return meshes;
+}
+
+/// Reads the file and, where it will be drawn, builds its scene.
+Result<void> load(AskedFile& asked, const ReadingWish& wish, const Document* document) {
+    const Application& application = *Application::current();
+    WatchedReading watch(application.frontEnd(), asked.file);
+    Result<void> loaded =
+        isDocumentFile(asked.file) ? readDocument(asked, wish) : readModelOf(asked, wish, watch);
+    if (loaded && application.options().builds_scenes) {
+        const auto meshes =
+            std::visit([](const auto& content) { return meshesOf(content); }, asked.content);
+        asked.scene = buildWatched(document, meshes, watch);
+    }
+    asked.is_given_up = watch.isGivenUp();
+    return loaded && asked.is_given_up ? readingGivenUp(asked.file) : loaded;
 }
 
 } // namespace
@@ -195,8 +225,9 @@ AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use) {
     asked.file = choice.kind == FileChoice::Kind::chosen ? choice.file : asked.file;
     if (asked.result != CQuarnCommand::success)
         return asked;
-    const auto read =
-        isDocumentFile(asked.file) ? readDocument(asked, wish) : readModelOf(asked, wish);
+    const Document* const document =
+        use == FileUse::import ? &Document::of(context.Document()) : nullptr;
+    const auto read = load(asked, wish, document);
     if (!read)
         asked.result = fail(read.message());
     if (!read && asked.is_given_up)
@@ -204,7 +235,7 @@ AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use) {
     asked.is_interactive = context.IsInteractive();
     auto* const model = std::get_if<ImportedModel>(&asked.content);
     if (read && model && asked.is_interactive)
-        asked.scene = askUpAxis(asked.file, *model);
+        askUpAxis(asked.file, *model, asked.scene.get());
     return asked;
 }
 
@@ -217,8 +248,8 @@ void addToDocument(Document& document, AskedFile& asked) {
         tellContent(document, asked,
                     importContent(document, std::get<DocumentContent>(asked.content)));
     }
-    if (was_empty && asked.scene)
-        document.drawing().startWith(std::move(asked.scene));
+    if (asked.scene)
+        document.drawing().takeScene(std::move(asked.scene));
     if (was_empty)
         fitViews(document);
 }
@@ -232,6 +263,8 @@ void openAsDocument(DocumentList& list, AskedFile& asked) {
         return;
     }
     tellContent(document, asked, openContent(document, *content));
+    if (asked.scene)
+        document.drawing().takeScene(std::move(asked.scene));
     std::error_code ignored;
     document.setFile(std::filesystem::absolute(asked.file, ignored));
     if (content->views.empty())

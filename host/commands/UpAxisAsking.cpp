@@ -20,12 +20,13 @@ UpAxis axisOf(ModelUp up) {
 /// A model that can stand with either axis up.
 class TurnableModel {
 public:
-    explicit TurnableModel(ImportedModel& model) : m_model(model) {}
+    TurnableModel(ImportedModel& model, const DocumentScene* built)
+        : m_model(model), m_built(built) {}
 
     ShownPicture draw(ModelUp up, int width_px, int height_px) {
         try {
             if (!m_scene)
-                m_scene = std::make_unique<DocumentScene>();
+                m_scene = newScene();
             if (drawModel(standing(axisOf(up)), *m_scene, width_px, height_px, m_picture))
                 return {m_picture.width, m_picture.height, m_picture.rgba};
         } catch (const std::bad_alloc&) {
@@ -40,9 +41,14 @@ public:
         m_model.up = {up, TakenUpAxis::Reason::asked, {}};
     }
 
-    std::unique_ptr<DocumentScene> takeScene() { return std::move(m_scene); }
-
 private:
+    std::unique_ptr<DocumentScene> newScene() const {
+        auto scene = std::make_unique<DocumentScene>();
+        if (m_built)
+            scene->shareWith(*m_built);
+        return scene;
+    }
+
     const ImportedModel& standing(UpAxis up) {
         if (up == m_model.up.axis)
             return m_model;
@@ -52,6 +58,7 @@ private:
     }
 
     ImportedModel& m_model;
+    const DocumentScene* m_built;
     std::optional<ImportedModel> m_turned;
     std::unique_ptr<DocumentScene> m_scene; ///< null until something is drawn
     Image m_picture;
@@ -59,10 +66,11 @@ private:
 
 } // namespace
 
-std::unique_ptr<DocumentScene> askUpAxis(const std::filesystem::path& file, ImportedModel& model) {
+void askUpAxis(const std::filesystem::path& file, ImportedModel& model,
+               const DocumentScene* built) {
     if (model.up.reason != TakenUpAxis::Reason::habit)
-        return nullptr;
-    TurnableModel turnable(model);
+        return;
+    TurnableModel turnable(model, built);
     const auto draw = [&](ModelUp up, int width_px, int height_px) {
         return turnable.draw(up, width_px, height_px);
     };
@@ -70,7 +78,6 @@ std::unique_ptr<DocumentScene> askUpAxis(const std::filesystem::path& file, Impo
     const auto chosen = Application::current()->frontEnd().chooseUpAxis({file, taken, draw});
     if (chosen)
         turnable.settle(axisOf(*chosen));
-    return turnable.takeScene();
 }
 
 } // namespace quarn

@@ -4,14 +4,13 @@
 #include "import/ImportedModel.h"
 
 #include <filesystem>
-#include <memory>
 
 namespace quarn {
 
 /// Asks the person which axis of a model points up, with a picture of each, where nothing but habit
 /// says so. A model whose other axis they choose is turned.
-/// @return the scene that the pictures were drawn of, which an empty document may begin with; null
-///         where none was drawn
-std::unique_ptr<DocumentScene> askUpAxis(const std::filesystem::path& file, ImportedModel& model);
+/// @param built  a scene of the model as it was read, so that its large meshes need not be built
+///               again; may be null
+void askUpAxis(const std::filesystem::path& file, ImportedModel& model, const DocumentScene* built);
 
 } // namespace quarn

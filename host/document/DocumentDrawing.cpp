@@ -14,10 +14,6 @@ DocumentDrawing::DocumentDrawing(const Document& document) : m_document(document
 
 DocumentDrawing::~DocumentDrawing() = default;
 
-void DocumentDrawing::startWith(std::unique_ptr<DocumentScene> scene) {
-    m_scene = std::move(scene);
-}
-
 void DocumentDrawing::release() {
     m_scene.reset();
 }
@@ -106,6 +102,14 @@ Result<const DocumentScene*> DocumentDrawing::scene() {
         release();
         return Error{"There is too little memory for the scene. Close other programs."};
     }
+}
+
+std::unique_ptr<DocumentScene> DocumentDrawing::sceneWith(std::span<const SceneMesh> added) const {
+    return std::make_unique<DocumentScene>(m_document.objects(), added, m_scene.get());
+}
+
+void DocumentDrawing::takeScene(std::unique_ptr<DocumentScene> scene) {
+    m_scene = std::move(scene);
 }
 
 Result<void> DocumentDrawing::regenerate() {

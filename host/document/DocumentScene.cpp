@@ -17,6 +17,21 @@ constexpr double CHORD_TOLERANCE_OF_SIZE = 5e-5;
 
 } // namespace
 
+/// Its revision is no document's, so that the first update compares what there is.
+DocumentScene::DocumentScene(const ObjectTable& objects, std::span<const SceneMesh> added,
+                             const DocumentScene* earlier) {
+    takeObjects(objects);
+    takeVisibility(objects, {});
+    m_content.revision = 0;
+    m_content.meshes.insert(m_content.meshes.end(), added.begin(), added.end());
+    if (earlier)
+        m_display.shareWith(earlier->m_display);
+}
+
+Result<void> DocumentScene::build(BuildProgress& progress) {
+    return m_display.update(m_content, &progress);
+}
+
 Result<void> DocumentScene::update(const ObjectTable& objects, std::span<const KM_Light> lights,
                                    std::span<const KM_UUID> hidden) {
     if (m_content.revision != objects.revision())

@@ -10,11 +10,26 @@
 namespace quarn {
 
 class ObjectTable;
+struct BuildProgress;
 struct ImportedModel;
 
 /// A document's objects made ready for drawing, once for all its views.
 class DocumentScene {
 public:
+    DocumentScene() = default;
+    /// A scene that is to be built before its document has all that it shows.
+    /// @param objects  of the document
+    /// @param added    meshes that will stand behind them; the scene is the document's own once its
+    ///                 objects have them
+    /// @param earlier  the document's scene, whose large meshes need not be built again; may be
+    ///                 null
+    DocumentScene(const ObjectTable& objects, std::span<const SceneMesh> added,
+                  const DocumentScene* earlier);
+
+    /// Builds a scene of the other constructor, on any thread.
+    /// @return an error when it cannot be built, or was given up
+    Result<void> build(BuildProgress& progress);
+
     /// Takes over what changed since the last call: everything when an object was added, removed
     /// or changed, else the lights and what is shown or hidden.
     /// @param hidden  objects that are not shown although they are visible
@@ -22,8 +37,10 @@ public:
     Result<void> update(const ObjectTable& objects, std::span<const KM_Light> lights,
                         std::span<const KM_UUID> hidden = {});
 
-    /// Takes over a model that is in no document, in place of all that was there. What was built of
-    /// large meshes is used again by the next update of a scene that has them too.
+    /// What was built of large meshes of another scene need not be built again by the next update.
+    void shareWith(const DocumentScene& other) { m_display.shareWith(other.m_display); }
+
+    /// Takes over a model that is in no document, in place of all that was there.
     Result<void> update(const ImportedModel& model, std::span<const KM_Light> lights);
 
     /// Draws the scene as the last update left it; as DisplayPipeline::draw. A picture that does

@@ -79,23 +79,19 @@ TEST_F(ModelPictureTest, AModelOutOfRangeHasNone) {
     EXPECT_FALSE(drawModel(ImportedModel(), scene, 24, 18, picture));
 }
 
-TEST_F(ModelPictureTest, WhatWasBuiltForAPictureIsNotBuiltAgainForTheDocument) {
+TEST_F(ModelPictureTest, WhatWasBuiltOfAModelIsNotBuiltAgainForItsPicture) {
     const auto mesh = largeMesh();
-    auto scene = std::make_unique<DocumentScene>();
     Image picture;
-    ASSERT_TRUE(drawModel(modelOf(largeMesh()), *scene, 24, 18, picture));
-    ASSERT_TRUE(drawModel(modelOf(mesh), *scene, 24, 18, picture));
-    const std::size_t built = buildCount(*scene);
-    ASSERT_EQ(built, 2U) << "one for each mesh";
-    document.objects().addMesh(L"Tower", {mesh});
-    document.drawing().startWith(std::move(scene));
-    const auto drawn = document.drawing().scene();
-    ASSERT_TRUE(drawn) << drawn.message();
-    EXPECT_EQ(buildCount(*drawn.value()), built);
-    EXPECT_EQ(drawn.value()->content().meshes[0].id, document.objects().objects()[0]->id);
+    DocumentScene first;
+    ASSERT_TRUE(drawModel(modelOf(mesh), first, 24, 18, picture));
+    ASSERT_EQ(buildCount(first), 1U);
+    DocumentScene second;
+    second.shareWith(first);
+    ASSERT_TRUE(drawModel(modelOf(mesh), second, 24, 18, picture));
+    EXPECT_EQ(buildCount(second), 0U);
 }
 
-TEST_F(ModelPictureTest, ADocumentThatBeginsWithAPicturesSceneShowsItsOwnObjects) {
+TEST_F(ModelPictureTest, ADocumentThatTakesAPicturesSceneShowsItsOwnObjects) {
     view.setFrameSize(40, 30);
     document.objects().addMesh(L"Tower", {boxMesh({0, 0, 0}, {1, 2, 9})});
     auto scene = std::make_unique<DocumentScene>();
@@ -103,7 +99,7 @@ TEST_F(ModelPictureTest, ADocumentThatBeginsWithAPicturesSceneShowsItsOwnObjects
     ASSERT_TRUE(drawModel(modelOf(boxMesh({0, 0, 0}, {9, 2, 1})), *scene, 24, 18, picture));
     view.redraw(0);
     const std::vector<std::uint8_t> alone = view.frameBuffer().rgba;
-    document.drawing().startWith(std::move(scene));
+    document.drawing().takeScene(std::move(scene));
     view.redraw(0);
     EXPECT_EQ(view.frameBuffer().rgba, alone);
 }
