@@ -3,13 +3,18 @@
 // for this one file what nobody can do without, which is to map it, copy its vertices and indices,
 // add the normals of its faces and build a ray scene of them. Each is measured in a program of its
 // own, so that the most memory it ever held is that format's; the best of several such programs
-// counts.
+// counts. The floor of an OBJ and of a document is that of the same triangles in a PLY. A second
+// table has the same files read by the program that reads models for the host.
 
+#include "MemoryOfBoth.h"
+#include "ModelBytes.h"
+#include "Timing.h"
 #include "engine/display/DisplayScene.h"
 #include "ground/FileBytes.h"
 #include "host/document/file/DocumentCoding.h"
 #include "host/document/file/DocumentExtension.h"
 #include "host/document/file/DocumentFile.h"
+#include "host/reader/ModelReader.h"
 #include "import/ModelFile.h"
 
 #include <embree3/rtcore.h>
@@ -17,8 +22,6 @@
 
 #include <algorithm>
 #include <array>
-#include <charconv>
-#include <chrono>
 #include <cmath>
 #include <cstdint>
 #include <cstdio>
@@ -35,133 +38,7 @@
 namespace {
 
 namespace fs = std::filesystem;
-using Clock = std::chrono::steady_clock;
-
-constexpr int million_squares = 707;       // a side: 2 * 707 * 707 = 999 698 triangles
-constexpr int five_million_squares = 1581; // likewise 4 999 122
-
-/// A rolling landscape over a square grid.
-std::array<float, 3> vertexAt(int i, int j) {
-    return {0.1F * static_cast<float>(i), 0.1F * static_cast<float>(j),
-            std::sin(0.05F * static_cast<float>(i)) * std::cos(0.04F * static_cast<float>(j))};
-}
-
-/// Calls `take` with the three vertex numbers, from 0, of each triangle.
-template <class Take> void forEachTriangle(int squares, Take take) {
-    const std::int32_t side = squares + 1;
-    for (int j = 0; j < squares; ++j) {
-        for (int i = 0; i < squares; ++i) {
-            const std::int32_t a = j * side + i;
-            take(a, a + 1, a + side + 1);
-            take(a, a + side + 1, a + side);
-        }
-    }
-}
-
-std::string plyBytes(int squares) {
-    std::string bytes = "ply\nformat binary_little_endian 1.0\nelement vertex " +
-                        std::to_string((squares + 1) * (squares + 1)) +
-                        "\nproperty float x\nproperty float y\nproperty float z\nelement face " +
-                        std::to_string(2 * squares * squares) +
-                        "\nproperty list uchar int vertex_indices\nend_header\n";
-    for (int j = 0; j <= squares; ++j) {
-        for (int i = 0; i <= squares; ++i) {
-            const auto vertex = vertexAt(i, j);
-            bytes.append(reinterpret_cast<const char*>(vertex.data()), sizeof vertex);
-        }
-    }
-    forEachTriangle(squares, [&bytes](std::int32_t a, std::int32_t b, std::int32_t c) {
-        const std::array<std::int32_t, 3> corners{a, b, c};
-        bytes += '\3';
-        bytes.append(reinterpret_cast<const char*>(corners.data()), sizeof corners);
-    });
-    return bytes;
-}
-
-std::string bytesOfNumber(std::size_t number) {
-    const auto value = static_cast<std::uint32_t>(number);
-    return {reinterpret_cast<const char*>(&value), sizeof value};
-}
-
-std::string glbBytes(int squares) {
-    std::string binary;
-    for (int j = 0; j <= squares; ++j) {
-        for (int i = 0; i <= squares; ++i) {
-            const auto vertex = vertexAt(i, j);
-            binary.append(reinterpret_cast<const char*>(vertex.data()), sizeof vertex);
-        }
-    }
-    const std::string places = std::to_string(binary.size());
-    forEachTriangle(squares, [&binary](std::int32_t a, std::int32_t b, std::int32_t c) {
-        const std::array<std::int32_t, 3> corners{a, b, c};
-        binary.append(reinterpret_cast<const char*>(corners.data()), sizeof corners);
-    });
-    const std::string all = std::to_string(binary.size());
-    std::string text =
-        R"({"asset":{"version":"2.0"},"nodes":[{"mesh":0}],"meshes":[{"primitives":[{"indices":1,)"
-        R"("attributes":{"POSITION":0}}]}],"accessors":[{"bufferView":0,"componentType":5126,)"
-        R"("type":"VEC3","count":)" +
-        std::to_string((squares + 1) * (squares + 1)) +
-        R"(},{"bufferView":0,"componentType":5125,"type":"SCALAR","byteOffset":)" + places +
-        R"(,"count":)" + std::to_string(6 * squares * squares) +
-        R"(}],"bufferViews":[{"buffer":0,"byteLength":)" + all + R"(}],"buffers":[{"byteLength":)" +
-        all + "}]}";
-    text.resize((text.size() + 3) / 4 * 4, ' ');
-    return "glTF" + bytesOfNumber(2) + bytesOfNumber(28 + text.size() + binary.size()) +
-           bytesOfNumber(text.size()) + "JSON" + text + bytesOfNumber(binary.size()) +
-           std::string("BIN\0", 4) + binary;
-}
-
-void appendNumber(std::string& text, float value) {
-    std::array<char, 32> digits{};
-    const auto end = std::to_chars(digits.data(), digits.data() + digits.size(), value,
-                                   std::chars_format::fixed, 6);
-    text.append(1, ' ').append(digits.data(), end.ptr);
-}
-
-std::string objBytes(int squares) {
-    std::string text;
-    for (int j = 0; j <= squares; ++j) {
-        for (int i = 0; i <= squares; ++i) {
-            text += 'v';
-            for (const float number : vertexAt(i, j)) {
-                appendNumber(text, number);
-            }
-            text += '\n';
-        }
-    }
-    forEachTriangle(squares, [&text](std::int32_t a, std::int32_t b, std::int32_t c) {
-        text += "f " + std::to_string(a + 1) + ' ' + std::to_string(b + 1) + ' ' +
-                std::to_string(c + 1) + '\n';
-    });
-    return text;
-}
-
-std::string stlBytes(int squares) {
-    std::string bytes(80, ' ');
-    const auto count = static_cast<std::uint32_t>(2 * squares * squares);
-    bytes.append(reinterpret_cast<const char*>(&count), sizeof count);
-    forEachTriangle(squares, [&](std::int32_t a, std::int32_t b, std::int32_t c) {
-        std::array<float, 12> facet{}; // a normal that is not given, then the corners
-        int next = 3;
-        for (const std::int32_t corner : {a, b, c}) {
-            for (const float number : vertexAt(corner % (squares + 1), corner / (squares + 1)))
-                facet[static_cast<std::size_t>(next++)] = number;
-        }
-        bytes.append(reinterpret_cast<const char*>(facet.data()), sizeof facet);
-        bytes.append(2, '\0');
-    });
-    return bytes;
-}
-
-double millisecondsSince(Clock::time_point start) {
-    return std::chrono::duration<double, std::milli>(Clock::now() - start).count();
-}
-
-[[noreturn]] void fail(std::string_view why) {
-    std::fprintf(stderr, "%.*s\n", static_cast<int>(why.size()), why.data());
-    std::exit(1);
-}
+using namespace bench;
 
 /// A file that goes away at the end of its measurement.
 class BenchFile {
@@ -205,8 +82,7 @@ double peakMegabytes() {
 
 using Meshes = std::vector<std::shared_ptr<const KM_Mesh>>;
 
-Meshes meshesOfModel(const fs::path& path) {
-    const auto model = quarn::readModelFile(path);
+Meshes meshesOf(const quarn::Result<quarn::ImportedModel>& model) {
     if (!model)
         fail(model.message());
     Meshes meshes;
@@ -228,7 +104,7 @@ Meshes meshesOfDocument(const fs::path& path) {
 /// The document that has in it what a model file has in it.
 std::string documentBytes(const fs::path& model) {
     quarn::DocumentContent content;
-    for (const auto& mesh : meshesOfModel(model)) {
+    for (const auto& mesh : meshesOf(quarn::readModelFile(model))) {
         quarn::ObjectContent object;
         object.id = KM_CreateUuid();
         object.placed.mesh = mesh;
@@ -241,11 +117,11 @@ std::string documentBytes(const fs::path& model) {
 }
 
 /// What reading the file and building its scene cost this program.
-Cost costHere(const fs::path& path) {
+/// @param read  to meshes
+template <class Read> Cost costHere(const fs::path& path, const Read& read) {
     Cost cost;
     const auto start = Clock::now();
-    const Meshes meshes =
-        quarn::isDocumentFile(path) ? meshesOfDocument(path) : meshesOfModel(path);
+    const Meshes meshes = read(path);
     cost.load_ms = millisecondsSince(start);
     if (meshes.size() != 1 || meshes[0]->TriangleCount() < 2 * million_squares * million_squares)
         fail("the model was not read whole");
@@ -366,8 +242,28 @@ Cost floorHere(const fs::path& path) {
     return cost;
 }
 
+Cost costInside(const fs::path& path) {
+    return costHere(path, [](const fs::path& file) {
+        return quarn::isDocumentFile(file) ? meshesOfDocument(file)
+                                           : meshesOf(quarn::readModelFile(file));
+    });
+}
+
+/// The model is read by the program that reads models.
+Cost costOfBoth(const fs::path& path) {
+    return costHere(path, [](const fs::path& file) { return meshesOf(quarn::readModel(file)); });
+}
+
+/// The same, with the memory of both programs; to look at it takes time.
+Cost memoryOfBoth(const fs::path& path) {
+    MemoryWatch watch;
+    Cost cost = costOfBoth(path);
+    cost.peak_mb = watch.peakMegabytes();
+    return cost;
+}
+
 /// Lets this program again measure one file.
-/// @param what  "file" or "floor"
+/// @param what  as main has it
 Cost costInProgramOfItsOwn(const char* what, const fs::path& path) {
     std::string command("'");
     command.append(fs::read_symlink("/proc/self/exe").string());
@@ -388,52 +284,87 @@ void keepBest(const Cost& cost, Cost& best) {
     best.peak_mb = std::max(best.peak_mb, cost.peak_mb);
 }
 
-void measure(const char* name, const char* extension, const std::string& bytes) {
+/// All that is measured of a file.
+struct Row {
+    const char* name;
+    double file_mb = 0.0;
+    Cost inside;
+    Cost floor;
+    Cost both; ///< of a document, which the host reads itself, as it is at first
+};
+
+/// @param bytes        of the file
+/// @param floor_bytes  of the file of the floor, where it is another one: a PLY
+Row measure(const char* name, const char* extension, const std::string& bytes,
+            const std::string& floor_bytes = {}) {
     constexpr int rounds = 5;
     const BenchFile file(extension, bytes);
-    const fs::path kind = file.path().extension();
-    const bool has_floor = kind == ".ply" || kind == ".glb" || kind == ".stl";
-    Cost best;
-    Cost floor;
-    for (int i = 0; i < rounds; ++i) { // by turns, so that what disturbs the machine meets both
-        keepBest(costInProgramOfItsOwn("file", file.path()), best);
-        if (has_floor)
-            keepBest(costInProgramOfItsOwn("floor", file.path()), floor);
+    const BenchFile floor_file(".floor.ply", floor_bytes);
+    const fs::path& floor_path = floor_bytes.empty() ? file.path() : floor_file.path();
+    const bool is_document = quarn::isDocumentFile(file.path());
+    Row row{name, static_cast<double>(bytes.size()) / 1e6, {}, {}, {}};
+    for (int i = 0; i < rounds; ++i) { // by turns, so that what disturbs the machine meets all
+        keepBest(costInProgramOfItsOwn("file", file.path()), row.inside);
+        keepBest(costInProgramOfItsOwn("floor", floor_path), row.floor);
+        if (!is_document)
+            keepBest(costInProgramOfItsOwn("both", file.path()), row.both);
     }
-    std::printf("| %s | %.1f | %.0f | %.0f | %.0f | %.0f |", name,
-                static_cast<double>(bytes.size()) / 1e6, best.load_ms, best.build_ms, best.sum_ms,
-                best.peak_mb);
-    if (has_floor)
-        std::printf(" %.0f | %.0f | %.2f |\n", floor.sum_ms, floor.peak_mb,
-                    best.sum_ms / floor.sum_ms);
-    else
-        std::printf(" | | |\n");
-    std::fflush(stdout);
+    if (!is_document)
+        row.both.peak_mb = costInProgramOfItsOwn("memory", file.path()).peak_mb;
+    return row;
 }
 
-void print(const Cost& cost) {
-    std::printf("%f %f %f %f\n", cost.load_ms, cost.build_ms, cost.sum_ms, cost.peak_mb);
+void printInside(const std::vector<Row>& rows) {
+    std::printf("Milliseconds and megabytes; the ratio is that of load + scene to the floor's\n\n"
+                "| format | file (MB) | load | MB/s | scene | load + scene | peak (MB) | floor | "
+                "floor's peak (MB) | ratio |\n"
+                "|---|---|---|---|---|---|---|---|---|---|\n");
+    for (const Row& row : rows)
+        std::printf("| %s | %.1f | %.0f | %.0f | %.0f | %.0f | %.0f | %.0f | %.0f | %.2f |\n",
+                    row.name, row.file_mb, row.inside.load_ms,
+                    1e3 * row.file_mb / row.inside.load_ms, row.inside.build_ms, row.inside.sum_ms,
+                    row.inside.peak_mb, row.floor.sum_ms, row.floor.peak_mb,
+                    row.inside.sum_ms / row.floor.sum_ms);
+}
+
+void printBoth(const std::vector<Row>& rows) {
+    std::printf("\nThe same, read in a process of its own; the peak is that of both\n\n"
+                "| read in its own process | load | load + scene | peak of both (MB) | ratio |\n"
+                "|---|---|---|---|---|\n");
+    for (const Row& row : rows)
+        if (row.both.peak_mb > 0.0)
+            std::printf("| %s | %.0f | %.0f | %.0f | %.2f |\n", row.name, row.both.load_ms,
+                        row.both.sum_ms, row.both.peak_mb, row.both.sum_ms / row.floor.sum_ms);
+}
+
+/// @param what  "file", "floor", "both" or "memory"
+Cost costOf(std::string_view what, const fs::path& path) {
+    if (what == "floor")
+        return floorHere(path);
+    if (what == "both")
+        return costOfBoth(path);
+    return what == "memory" ? memoryOfBoth(path) : costInside(path);
 }
 
 } // namespace
 
 int main(int count, char** arguments) {
     if (count == 3) {
-        print(std::string_view(arguments[1]) == "floor" ? floorHere(arguments[2])
-                                                        : costHere(arguments[2]));
+        const Cost cost = costOf(arguments[1], arguments[2]);
+        std::printf("%f %f %f %f\n", cost.load_ms, cost.build_ms, cost.sum_ms, cost.peak_mb);
         return 0;
     }
-    std::printf("Milliseconds and megabytes; the ratio is that of load + scene to the floor's\n\n"
-                "| format | file (MB) | load | scene | load + scene | peak (MB) | floor | floor's "
-                "peak (MB) | ratio |\n"
-                "|---|---|---|---|---|---|---|---|---|\n");
-    measure("PLY, 1 M triangles", ".ply", plyBytes(million_squares));
-    measure("PLY, 5 M", ".ply", plyBytes(five_million_squares));
-    measure("GLB, 1 M", ".glb", glbBytes(million_squares));
-    measure("STL, 1 M", ".stl", stlBytes(million_squares));
-    measure("STL, 5 M", ".stl", stlBytes(five_million_squares));
-    measure("OBJ, 1 M", ".obj", objBytes(million_squares));
-    measure("saved document, 1 M", ".quarn",
-            documentBytes(BenchFile(".ply", plyBytes(million_squares)).path()));
+    const std::string million = plyBytes(million_squares);
+    std::vector<Row> rows;
+    rows.push_back(measure("PLY, 1 M triangles", ".ply", million));
+    rows.push_back(measure("PLY, 5 M", ".ply", plyBytes(five_million_squares)));
+    rows.push_back(measure("GLB, 1 M", ".glb", glbBytes(million_squares)));
+    rows.push_back(measure("STL, 1 M", ".stl", stlBytes(million_squares)));
+    rows.push_back(measure("STL, 5 M", ".stl", stlBytes(five_million_squares)));
+    rows.push_back(measure("OBJ, 1 M", ".obj", objBytes(million_squares), million));
+    rows.push_back(measure("saved document, 1 M", ".quarn",
+                           documentBytes(BenchFile(".ply", million).path()), million));
+    printInside(rows);
+    printBoth(rows);
     return 0;
 }

@@ -20,13 +20,13 @@ namespace {
 
 using namespace quarn::desktop;
 
-/// A document is opened; a model is read into the new document that is there.
-void openFile(MainWindow& window, const QString& file) {
+/// @param is_attended  whether a person is there, who may be asked which way a model is up
+void openFile(MainWindow& window, const QString& file, bool is_attended) {
     if (file.isEmpty())
         return;
     const QString word = quotedPath(std::filesystem::absolute(nativePath(file)));
     if (!word.isEmpty())
-        window.starter().start("_-Open " + word);
+        window.starter().start((is_attended ? "_Open " : "_-Open ") + word);
 }
 
 /// The program holds one document: a recovered one is not replaced by the file.
@@ -46,7 +46,7 @@ void begin(quarn::Session& session, MainWindow& window, const Arguments& argumen
     if (offer && is_attended && offer->offer(nativePath(arguments.file)))
         tellNotOpened(session, window, arguments.file);
     else
-        openFile(window, arguments.file);
+        openFile(window, arguments.file, is_attended);
     if (offer && !is_attended && offer->count() > 0)
         window.tellAndPrint(localized(
             L"An earlier run ended with unsaved work: File > Recover unsaved work.", 45402));
@@ -60,6 +60,7 @@ int runWindow(QApplication& application, const Arguments& arguments) {
     quarn::SessionOptions options = sessionOptions(arguments.language.toStdString());
     options.overwrites = arguments.overwrites;
     options.most_memory = arguments.most_memory;
+    options.builds_scenes = true;
     quarn::Session session(front_end, std::move(options));
     const quarn::PlugInLoad load = session.loadPlugIn(plugInFolder() / "Zoetrix.qnp");
     MainWindow window(session, front_end);

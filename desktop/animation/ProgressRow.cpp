@@ -55,14 +55,10 @@ void ProgressRow::showPicture(double share) {
     show(share, localized(L"Rendering: %1 %", 45238).arg(percent));
 }
 
-/// How far the building is nobody knows.
 void ProgressRow::showModel(ModelStep step, double share) {
-    if (step == ModelStep::built) {
-        show(1.0, localized(L"Building the scene", 45432));
-        return;
-    }
-    const QString text = step == ModelStep::read ? localized(L"Reading: %1 %", 45430)
-                                                 : localized(L"Making the meshes: %1 %", 45431);
+    const QString text = step == ModelStep::read   ? localized(L"Reading: %1 %", 45430)
+                         : step == ModelStep::made ? localized(L"Making the meshes: %1 %", 45431)
+                                                   : localized(L"Building the scene: %1 %", 45446);
     show(share, text.arg(static_cast<int>(std::floor(share * 100.0))));
 }
 

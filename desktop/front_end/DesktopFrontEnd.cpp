@@ -75,6 +75,14 @@ FileChoice DesktopFrontEnd::chooseFile(const FileQuestion& question) {
     return choice;
 }
 
+std::optional<ModelUp> DesktopFrontEnd::chooseUpAxis(const UpAxisQuestion& question) {
+    if (m_is_stop_requested || !m_parts.choose_up_axis)
+        return std::nullopt;
+    const auto up = m_parts.choose_up_axis(m_main_window, question);
+    m_escape.forgetTap();
+    return up;
+}
+
 std::optional<Place> DesktopFrontEnd::chooseLocation(std::wstring_view title, const Place& start) {
     if (!m_parts.choose_place)
         return std::nullopt;

@@ -28,6 +28,8 @@ struct FrontEndParts {
     std::function<FileChoice(QWidget* owner, const FileQuestion& question)> choose_file;
     std::function<std::optional<Place>(QWidget* owner, std::wstring_view title, const Place& start)>
         choose_place;
+    std::function<std::optional<ModelUp>(QWidget* owner, const UpAxisQuestion& question)>
+        choose_up_axis;
     std::function<std::unique_ptr<DialogWindow>(const DialogTemplate& form, QWidget* owner)>
         make_dialog;
     std::function<void(const std::filesystem::path& file, int written, int total)> frame_written;
@@ -62,6 +64,7 @@ public:
     chooseFolder(std::wstring_view title, std::wstring_view message,
                  const std::filesystem::path& start_folder) override;
     FileChoice chooseFile(const FileQuestion& question) override;
+    std::optional<ModelUp> chooseUpAxis(const UpAxisQuestion& question) override;
     std::optional<Place> chooseLocation(std::wstring_view title, const Place& start) override;
     std::unique_ptr<DialogWindow> makeDialog(const DialogTemplate& form, HWND owner) override;
     void pumpEvents(unsigned milliseconds) override;

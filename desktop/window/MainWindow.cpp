@@ -8,6 +8,7 @@
 #include "desktop/dialogs/FormWindow.h"
 #include "desktop/dialogs/LocationDialog.h"
 #include "desktop/dialogs/MessageBox.h"
+#include "desktop/dialogs/UpAxisAsking.h"
 #include "desktop/documents/FileDrop.h"
 #include "desktop/documents/RecentFiles.h"
 #include "desktop/documents/SessionEnd.h"
@@ -63,7 +64,8 @@ MainWindow::MainWindow(Session& session, DesktopFrontEnd& front_end)
       m_closing(new WindowClosing(*m_starter, *m_pane, *m_changes, *this)),
       m_file_drop(new FileDrop(*m_starter, *m_changes, *this)),
       m_end(new ProgramEnd(*m_starter, *m_pane, this)),
-      m_session_end(new SessionEnd(session, *m_starter, *m_closing, *m_changes, *m_end, this)) {
+      m_session_end(new SessionEnd(session, *m_starter, *m_closing, *m_changes, *m_end, this)),
+      m_up_axis(new UpAxisAsking(this)) {
     setObjectName("mainWindow");
     layOut();
     buildMenus();
@@ -106,6 +108,7 @@ void MainWindow::layOut() {
 
 void MainWindow::buildMenus() {
     m_menus->addBelow("Open", {m_recent_files->menu().menuAction()});
+    m_menus->addBelow("Import", {&m_up_axis->switchAction()});
     addWindowActions(*this, *m_command_dock);
     addFrameSizeButton(*this);
     m_menus->menu(MenuPlace::animation).addSeparator();
@@ -139,6 +142,9 @@ FrontEndParts MainWindow::parts() {
         return choice;
     };
     parts.choose_place = askPlace;
+    parts.choose_up_axis = [this](QWidget* owner, const UpAxisQuestion& question) {
+        return m_up_axis->ask(owner, question);
+    };
     parts.make_dialog = makeFormWindow;
     parts.frame_written = [this](const std::filesystem::path& file, int written, int total) {
         m_animation->frameWritten(file, written, total);

@@ -25,6 +25,7 @@ class RecoveryOffer;
 class RenderPictureWindow;
 class SessionEnd;
 class UnsavedChanges;
+class UpAxisAsking;
 class ViewArea;
 class WindowClosing;
 
@@ -93,6 +94,7 @@ private:
     FileDrop* m_file_drop;
     ProgramEnd* m_end;
     SessionEnd* m_session_end;
+    UpAxisAsking* m_up_axis;
     RecoveryBeat* m_recovery = nullptr;
     RecoveryOffer* m_recovery_offer = nullptr;
     RenderPictureWindow* m_render_window = nullptr;

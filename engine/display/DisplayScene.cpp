@@ -1,5 +1,6 @@
 #include "engine/display/DisplayScene.h"
 
+#include "engine/display/BuildProgress.h"
 #include "engine/display/MipTexture.h"
 #include "engine/images/ColorSpace.h"
 #include "engine/scene/DrawableRange.h"
@@ -12,6 +13,9 @@
 namespace quarn {
 
 namespace {
+
+/// Of the building of meshes, which are read once, all of which are searched later.
+constexpr double SHARE_OF_MESHES = 0.2;
 
 constexpr std::size_t no_member = static_cast<std::size_t>(-1);
 
@@ -52,13 +56,21 @@ double greatestCoordinate(const KM_BoundingBox& box) {
 DisplayScene::DisplayScene() = default;
 DisplayScene::~DisplayScene() = default;
 
-Result<void> DisplayScene::update(const SceneContent& content) {
+void DisplayScene::shareWith(const DisplayScene& earlier) {
+    m_mesh_cache = earlier.m_mesh_cache;
+    m_texture_cache = earlier.m_texture_cache;
+    m_rays.shareWith(earlier.m_rays);
+}
+
+Result<void> DisplayScene::update(const SceneContent& content, BuildProgress* progress) {
     if (canKeep(content))
         updateVisibility(content);
     else
-        rebuild(content);
+        rebuild(content, progress);
     m_lights = content.lights;
-    const std::string error = m_rays.takeError();
+    std::string error = m_rays.takeError();
+    if (progress && progress->is_given_up)
+        error = "The scene was not built: it was given up.";
     if (error.empty())
         return {};
     clear();
@@ -66,8 +78,9 @@ Result<void> DisplayScene::update(const SceneContent& content) {
 }
 
 bool DisplayScene::canKeep(const SceneContent& content) const {
-    return m_built && content.revision == m_revision && content.meshes.size() == m_meshes.size() &&
-           content.curves.size() == m_curves.size() && content.points.size() == m_points.size();
+    return m_built && !m_rays.mustBeBuiltAgain() && content.revision == m_revision &&
+           content.meshes.size() == m_meshes.size() && content.curves.size() == m_curves.size() &&
+           content.points.size() == m_points.size();
 }
 
 void DisplayScene::clear() {
@@ -79,13 +92,11 @@ void DisplayScene::clear() {
     updateBoxes();
 }
 
-void DisplayScene::rebuild(const SceneContent& content) {
+void DisplayScene::rebuild(const SceneContent& content, BuildProgress* progress) {
+    // What rays search is taken over by the address of its mesh, which therefore stays till then.
     const MeshCache earlier_meshes = std::exchange(m_mesh_cache, {});
     TextureCache earlier_textures = std::exchange(m_texture_cache, {});
-    m_meshes.clear();
-    m_out_of_range.clear();
-    for (const SceneMesh& object : content.meshes)
-        addMesh(object, earlier_meshes);
+    addMeshes(content, earlier_meshes, progress);
     choosePlaces(content);
     dropMeshesBeyondReach(content);
     std::vector<RayScene::Member> members;
@@ -98,11 +109,26 @@ void DisplayScene::rebuild(const SceneContent& content) {
                                surfaceOf(content.meshes[i], *object.mesh, earlier_textures),
                                object.visible, object.frame_from_mesh});
     }
-    m_rays.build(std::move(members));
+    if (!progress || !progress->is_given_up)
+        m_rays.build(std::move(members), progress);
     takeLines(content);
     m_revision = content.revision;
     m_built = true;
     updateBoxes();
+}
+
+void DisplayScene::addMeshes(const SceneContent& content, const MeshCache& earlier,
+                             BuildProgress* progress) {
+    m_meshes.clear();
+    m_out_of_range.clear();
+    const auto count = static_cast<double>(content.meshes.size());
+    for (const SceneMesh& object : content.meshes) {
+        if (progress && progress->is_given_up)
+            return;
+        addMesh(object, earlier);
+        if (progress)
+            progress->share = SHARE_OF_MESHES * static_cast<double>(m_meshes.size()) / count;
+    }
 }
 
 void DisplayScene::addMesh(const SceneMesh& object, const MeshCache& earlier) {
@@ -225,7 +251,7 @@ const MipTexture* DisplayScene::textureOf(const Material& material, TextureCache
         cached = std::move(found->second);
     if (!cached.mips) {
         cached.source = material.base_color_texture;
-        cached.mips = std::make_unique<MipTexture>(*cached.source);
+        cached.mips = std::make_shared<const MipTexture>(*cached.source);
     }
     return cached.mips.get();
 }

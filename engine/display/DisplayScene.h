@@ -26,12 +26,19 @@ public:
     DisplayScene(const DisplayScene&) = delete;
     DisplayScene& operator=(const DisplayScene&) = delete;
 
+    /// Lets a scene that has nothing yet use what another one has built: what it needs of meshes,
+    /// textures and the search structures of large meshes. Both may then be used by threads of
+    /// their own.
+    void shareWith(const DisplayScene& earlier);
+
     /// Takes over what changed since the last call: everything when the revision is new, else the
     /// lights and what is shown or hidden. Meshes stay shared with the document. A mesh with
     /// indices outside its vertices or arrays of different lengths is not drawn, nor is an object
     /// that is out of range, see DrawableRange.h.
-    /// @return an error when the ray scene cannot be built; then the scene is empty
-    Result<void> update(const SceneContent& content);
+    /// @param progress  may be null; told to another thread, which may give the building up
+    /// @return an error when the ray scene cannot be built, or was given up; then the scene is
+    /// empty
+    Result<void> update(const SceneContent& content, BuildProgress* progress = nullptr);
 
     /// The box of everything that is shown; empty when nothing is.
     const KM_BoundingBox& boundingBox() const { return m_box; }
@@ -69,12 +76,13 @@ private:
     using MeshCache = std::map<const KM_Mesh*, std::shared_ptr<const RayMesh>>;
     struct CachedTexture {
         std::shared_ptr<const Texture> source; ///< keeps its address from being used again
-        std::unique_ptr<MipTexture> mips;
+        std::shared_ptr<const MipTexture> mips;
     };
     using TextureCache = std::map<const Texture*, CachedTexture>;
 
     bool canKeep(const SceneContent& content) const;
-    void rebuild(const SceneContent& content);
+    void rebuild(const SceneContent& content, BuildProgress* progress);
+    void addMeshes(const SceneContent& content, const MeshCache& earlier, BuildProgress* progress);
     void updateVisibility(const SceneContent& content);
     void updateBoxes();
     void addMesh(const SceneMesh& object, const MeshCache& earlier);

@@ -22,8 +22,6 @@ public:
     }
 
     T get() const { return m_object; }
-    /// Keeps the object for good.
-    void abandon() { m_object = nullptr; }
     explicit operator bool() const { return m_object != nullptr; }
 
 private:

@@ -3,6 +3,7 @@
 #include "engine/display/MeshEdges.h"
 #include "engine/display/PackedNormal.h"
 #include "engine/scene/DrawableRange.h"
+#include "ground/LargePages.h"
 
 #include <tbb/blocked_range.h>
 #include <tbb/parallel_for.h>
@@ -66,7 +67,9 @@ void RayMesh::packNormals() {
         packed[i] = packNormal(n.x, n.y, n.z);
     });
     // Not set to zeros first: that would take longer than the rest.
-    m_corner_normals = std::make_unique_for_overwrite<std::uint32_t[]>(3 * m_mesh->m_F.size());
+    const std::size_t corners = 3 * m_mesh->m_F.size();
+    m_corner_normals = std::make_unique_for_overwrite<std::uint32_t[]>(corners);
+    askForLargePages(m_corner_normals.get(), corners * sizeof(std::uint32_t));
     forAll(m_mesh->m_F.size(), [&](std::size_t i) {
         for (std::size_t corner = 0; corner < 3; ++corner)
             m_corner_normals[3 * i + corner] = packed[m_mesh->m_F[i].vi[corner]];

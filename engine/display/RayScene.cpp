@@ -1,5 +1,6 @@
 #include "engine/display/RayScene.h"
 
+#include "engine/display/BuildProgress.h"
 #include "engine/display/OpacityFilter.h"
 
 #include <algorithm>
@@ -56,24 +57,6 @@ SurfacePlace placeOf(const KM_Xform& x) {
     return place;
 }
 
-/// What the library could not do, in words for the person and with what may help.
-std::string sentenceFor(RTCError error, const char* message) {
-    if (error == RTC_ERROR_UNSUPPORTED_CPU)
-        return "The scene cannot be drawn: the ray tracing library does not run on this processor.";
-    if (error == RTC_ERROR_OUT_OF_MEMORY || !message)
-        return "The scene cannot be drawn: there is too little memory. Close other programs or "
-               "hide "
-               "objects.";
-    return "The scene cannot be drawn: " + std::string(message) +
-           ". Close other programs or hide objects.";
-}
-
-void noteError(void* note, RTCError error, const char* message) {
-    auto& text = *static_cast<std::string*>(note);
-    if (text.empty())
-        text = sentenceFor(error, message);
-}
-
 /// Spreads 10 bits so that two free bits follow each.
 std::uint32_t spread(std::uint32_t bits) {
     bits = (bits | (bits << 16)) & 0x030000FFU;
@@ -105,43 +88,50 @@ void setEnabled(RTCGeometry geometry, bool enabled) {
 
 } // namespace
 
-RayScene::RayScene() : m_error(std::make_shared<std::string>()) {}
+void RayScene::shareWith(const RayScene& earlier) {
+    if (earlier.mustBeBuiltAgain())
+        return;
+    m_library = earlier.m_library;
+    m_shared = earlier.soleGroups();
+    std::erase_if(m_shared, [](const auto& shared) { return shared.second->changed; });
+}
 
-/// A processor that the library runs on lacks nothing but memory, or threads, which take some.
 void RayScene::startLibrary() {
-    if (m_device)
-        return;
-    m_error->clear();
-    m_device = RayDevice(rtcNewDevice(nullptr));
-    if (m_device) {
-        rtcSetDeviceErrorFunction(m_device.get(), noteError, m_error.get());
-        return;
-    }
-    const RTCError error = rtcGetDeviceError(nullptr);
-    *m_error =
-        sentenceFor(error == RTC_ERROR_UNSUPPORTED_CPU ? error : RTC_ERROR_OUT_OF_MEMORY, nullptr);
+    if (mustBeBuiltAgain())
+        abandonLibrary();
+    if (!m_library)
+        m_library = RayLibrary::start(m_start_error);
 }
 
 std::string RayScene::takeError() {
-    std::string error = std::exchange(*m_error, {});
+    std::string error = std::exchange(m_start_error, {});
+    if (m_library && error.empty())
+        error = m_library->takeError();
     if (!error.empty())
         abandonLibrary();
     return error;
 }
 
-/// Where the library's memory ran out one of its locks may stay closed, and its device would wait
-/// for it without end when it is released.
 void RayScene::abandonLibrary() {
     m_root = nullptr;
+    m_shared.clear();
     m_instances.clear();
     m_top = RaySceneHandle();
-    m_device.abandon();
+    if (m_library)
+        m_library->abandon();
+    m_library.reset();
     m_members.clear();
+    clearMembers();
+}
+
+/// All that is kept of the members, but themselves and their scenes.
+void RayScene::clearMembers() {
     m_surfaces.clear();
     m_surface_members.clear();
     m_surface_places.clear();
     m_first_surfaces.clear();
     m_places.clear();
+    m_placed_meshes.clear();
 }
 
 bool RayScene::standsAlone(const Member& member) const {
@@ -174,30 +164,51 @@ std::size_t RayScene::geometryCount() const {
     return count;
 }
 
-void RayScene::build(std::vector<Member> members) {
+void RayScene::build(std::vector<Member> members, BuildProgress* progress) {
     startLibrary();
-    if (!m_device)
+    if (!m_library)
         return;
-    SoleGroups groups = soleGroups();
-    // The meshes of the taken-over groups must outlive the search for them.
-    const std::vector<Member> earlier_members = std::exchange(m_members, std::move(members));
+    std::vector<bool> wanted;
+    for (const Member& member : members)
+        wanted.push_back(member.visible);
+    bool is_due = !m_root;
+    if (!hasMembers(members)) {
+        is_due = true;
+        SoleGroups groups = soleGroups();
+        groups.merge(std::exchange(m_shared, {}));
+        // The meshes of the taken-over groups must outlive the search for them.
+        const std::vector<Member> earlier_members = std::exchange(m_members, std::move(members));
+        addAll(std::move(groups));
+    }
+    for (std::size_t i = 0; i < m_members.size(); ++i) {
+        is_due |= m_members[i].visible != wanted[i];
+        setVisible(i, wanted[i]);
+    }
+    if (is_due)
+        commit(progress);
+}
+
+/// Whether these are the members that there are, shown or hidden.
+bool RayScene::hasMembers(std::span<const Member> members) const {
+    return m_top && std::ranges::equal(members, m_members, [](const Member& a, const Member& b) {
+               return a.mesh == b.mesh && a.surface == b.surface &&
+                      a.frame_from_mesh == b.frame_from_mesh;
+           });
+}
+
+/// Makes the scenes of all members, which are all shown then.
+void RayScene::addAll(SoleGroups groups) {
     m_instances.clear();
-    m_first_surfaces.clear();
-    m_surfaces.clear();
-    m_surfaces.reserve(m_members.size()); // geometries point into it
-    m_surface_members.clear();
-    m_surface_places.clear();
+    clearMembers();
+    m_surfaces.reserve(m_members.size());       // geometries point into it
     m_surface_places.reserve(m_members.size()); // and these into that
     m_places.assign(m_members.size(), {});
     m_top = makeScene(false);
-    m_placed_meshes.clear();
-    std::vector<bool> wanted;
     for (Member& member : m_members) {
         if (!member.frame_from_mesh.IsIdentity())
             m_placed_meshes.insert(member.mesh.get());
-        wanted.push_back(std::exchange(member.visible, true));
+        member.visible = true;
     }
-
     for (std::size_t i = 0; i < m_members.size(); ++i)
         if (standsAlone(m_members[i]))
             addSole(i, groups);
@@ -209,9 +220,6 @@ void RayScene::build(std::vector<Member> members) {
     for (std::size_t i = 0; i < small.size(); ++i)
         geometries.push_back(makeSurface(small[i], m_surfaces[first_surface + i]));
     addBundles(small, geometries, bundle_triangles, first_surface, m_instances.size());
-    for (std::size_t i = 0; i < m_members.size(); ++i)
-        setVisible(i, wanted[i]);
-    commit();
 }
 
 std::vector<std::size_t> RayScene::smallMembersBySpace() const {
@@ -234,7 +242,7 @@ std::vector<std::size_t> RayScene::smallMembersBySpace() const {
 
 /// Rays can gather all that they meet there.
 RaySceneHandle RayScene::makeScene(bool is_compact) const {
-    RaySceneHandle scene(rtcNewScene(m_device.get()));
+    RaySceneHandle scene(rtcNewScene(m_library->device()));
     const unsigned compact = is_compact ? RTC_SCENE_FLAG_COMPACT : RTC_SCENE_FLAG_NONE;
     rtcSetSceneFlags(scene.get(),
                      static_cast<RTCSceneFlags>(RTC_SCENE_FLAG_CONTEXT_FILTER_FUNCTION | compact));
@@ -250,7 +258,7 @@ std::shared_ptr<RayScene::Group> RayScene::makeGroup(bool is_compact) const {
 
 RayGeometry RayScene::makeTriangles(std::size_t member) const {
     const RayMesh& mesh = *m_members[member].mesh;
-    RayGeometry geometry(rtcNewGeometry(m_device.get(), RTC_GEOMETRY_TYPE_TRIANGLE));
+    RayGeometry geometry(rtcNewGeometry(m_library->device(), RTC_GEOMETRY_TYPE_TRIANGLE));
     rtcSetSharedGeometryBuffer(geometry.get(), RTC_BUFFER_TYPE_VERTEX, 0, RTC_FORMAT_FLOAT3,
                                mesh.paddedVertices(), 0, sizeof(KM_3fPoint),
                                mesh.mesh().m_V.size());
@@ -276,7 +284,7 @@ void RayScene::addSurface(std::size_t member) {
 /// @param slot  of the instance: a new one, or one whose place in the scene is free
 void RayScene::putInstance(std::size_t slot, std::shared_ptr<Group> group,
                            const KM_Xform& frame_from_mesh, std::size_t first_surface) {
-    RayGeometry instance(rtcNewGeometry(m_device.get(), RTC_GEOMETRY_TYPE_INSTANCE));
+    RayGeometry instance(rtcNewGeometry(m_library->device(), RTC_GEOMETRY_TYPE_INSTANCE));
     rtcSetGeometryInstancedScene(instance.get(), group->scene.get());
     rtcSetGeometryTransform(instance.get(), 0, RTC_FORMAT_FLOAT3X4_COLUMN_MAJOR,
                             columnsOf(frame_from_mesh).data());
@@ -307,6 +315,7 @@ void RayScene::addSole(std::size_t member, SoleGroups& groups) {
     }
     if (!is_new)
         return;
+    group->triangles = m_members[member].mesh->mesh().m_F.size();
     group->geometries.push_back(makeTriangles(member));
     RTCGeometry geometry = group->geometries.back().get();
     if (!setOpacityFilter(geometry, m_surfaces.back()))
@@ -329,6 +338,7 @@ void RayScene::addBundles(std::span<const std::size_t> members, std::span<RayGeo
         putInstance(slot, makeGroup(false), KM_Xform(), first_surface + first);
         fillBundle(slot, members.subspan(first, end - first),
                    geometries.subspan(first, end - first));
+        m_instances[slot].group->triangles = triangles;
         m_instances[slot].group->is_split = triangles < 2 * split_bundle_triangles;
         first = end;
         slot = m_instances.size();
@@ -376,14 +386,27 @@ void RayScene::setVisible(std::size_t member, bool visible) {
     instance.group->changed = true;
 }
 
-void RayScene::commit() {
-    if (!m_device)
+std::size_t RayScene::trianglesToBuild() const {
+    std::set<const Group*> groups;
+    std::size_t triangles = 0;
+    for (const Instance& instance : m_instances)
+        if (instance.group->changed && instance.visible_members > 0 &&
+            groups.insert(instance.group.get()).second)
+            triangles += instance.group->triangles;
+    return triangles;
+}
+
+void RayScene::commit(BuildProgress* progress) {
+    if (!m_library)
         return;
+    WatchedCommits commits(progress, progress ? trianglesToBuild() : 0);
+    m_root = nullptr;
     for (std::size_t i = 0; i < m_instances.size(); ++i) {
         Instance& instance = m_instances[i];
         const bool wanted = instance.visible_members > 0;
         if (instance.group->changed && wanted) {
-            rtcCommitScene(instance.group->scene.get());
+            if (!commits.commit(instance.group->scene.get(), instance.group->triangles))
+                return;
             ++m_build_count;
             rtcCommitGeometry(instance.geometry.get());
             instance.group->changed = false;

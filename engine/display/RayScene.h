@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/display/RayHandle.h"
+#include "engine/display/RayLibrary.h"
 #include "engine/display/RayMesh.h"
 #include "engine/display/RaySurface.h"
 #include "engine/display/SurfacePlace.h"
@@ -16,6 +17,8 @@
 
 namespace quarn {
 
+struct BuildProgress;
+
 /// The surfaces that rays meet. Meshes of many triangles, and those that a transform puts into
 /// their place, get a scene of their own under an instance; the small others share a few. The first
 /// time that one of these is hidden or shown its scene is split, so that from then on showing or
@@ -30,15 +33,19 @@ public:
         KM_Xform frame_from_mesh; ///< affine; members that share a mesh share its search structure
     };
 
-    RayScene();
-
-    /// Replaces everything. Scenes of large meshes that were there before are taken over. The first
-    /// call starts the library; where it cannot start, the next one tries again.
-    void build(std::vector<Member> members);
+    /// Lets a scene that has nothing yet use those of large meshes that another one has built. Both
+    /// may then be used by threads of their own.
+    void shareWith(const RayScene& earlier);
+    /// Replaces everything. Scenes of large meshes that were there before are taken over, and all
+    /// of them where no member changed but in being shown or hidden. The first call starts the
+    /// library; where it cannot start, the next one tries again.
+    /// @param progress  may be null; where it is given up, the scene is empty
+    void build(std::vector<Member> members, BuildProgress* progress = nullptr);
     /// Shows or hides one member, by its index in `build`. Takes effect with the next `commit`.
     void setVisible(std::size_t member, bool visible);
     /// Makes the changes of visibility good.
-    void commit();
+    /// @param progress  as of `build`
+    void commit(BuildProgress* progress = nullptr);
 
     /// What rays are shot into; null when nothing is visible. The surface of a hit is
     /// firstSurfaces()[instID] + geomID, or soleFirstSurface() + geomID without instances.
@@ -59,16 +66,19 @@ public:
     /// How many meshes have search structures, however often they are shown.
     std::size_t geometryCount() const;
 
-    /// What the library could not do since the last call, in a sentence for the person; empty when
-    /// it could do all. After an error the scene is empty, and the next `build` starts the library
-    /// anew.
+    /// What the library could not do for this thread since the last call, in a sentence for the
+    /// person; empty when it could do all. After an error the scene is empty, and the next `build`
+    /// starts the library anew.
     std::string takeError();
+    /// Whether a scene that shares with this one met an error: then all has to be built again.
+    bool mustBeBuiltAgain() const { return m_library && m_library->isAbandoned(); }
 
 private:
     struct Group {
         RaySceneHandle scene;
         std::vector<RayGeometry> geometries;
         const RayMesh* sole_mesh = nullptr; ///< of a mesh that stands alone: to find it again
+        std::size_t triangles = 0;
         bool changed = false;
         bool is_split = false; ///< of several meshes: it is small
     };
@@ -97,9 +107,12 @@ private:
 
     void startLibrary();
     void abandonLibrary();
+    bool hasMembers(std::span<const Member> members) const;
+    void clearMembers();
     bool standsAlone(const Member& member) const;
     GroupKey keyOf(const Member& member) const;
     void addSole(std::size_t member, SoleGroups& groups);
+    void addAll(SoleGroups groups);
     void addBundles(std::span<const std::size_t> members, std::span<RayGeometry> geometries,
                     std::size_t most_triangles, std::size_t first_surface, std::size_t slot);
     void fillBundle(std::size_t slot, std::span<const std::size_t> members,
@@ -114,10 +127,12 @@ private:
     std::shared_ptr<Group> makeGroup(bool is_compact) const;
     SoleGroups soleGroups() const;
     std::vector<std::size_t> smallMembersBySpace() const;
+    std::size_t trianglesToBuild() const;
     void chooseRoot();
 
-    std::shared_ptr<std::string> m_error; ///< outlives the device, which writes into it
-    RayDevice m_device;
+    std::shared_ptr<RayLibrary> m_library; ///< null until something is built
+    std::string m_start_error;             ///< why it could not start
+    SoleGroups m_shared;                   ///< of another scene, until something is built
     RaySceneHandle m_top;
     RTCScene m_root = nullptr;
     std::uint32_t m_sole_first_surface = 0;

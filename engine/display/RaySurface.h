@@ -27,6 +27,8 @@ struct RaySurface {
     bool see_through = false;             ///< what lies behind shines through
     bool has_cutout = false;
     float alpha_cutoff = 0.5F;
+
+    friend bool operator==(const RaySurface&, const RaySurface&) = default;
 };
 
 } // namespace quarn

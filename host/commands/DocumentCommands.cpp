@@ -5,7 +5,7 @@
 namespace quarn {
 
 CQuarnCommand::result runImport(const CQuarnCommandContext& context) {
-    const AskedFile asked = askFileToRead(context, FileUse::import);
+    AskedFile asked = askFileToRead(context, FileUse::import);
     if (asked.result == CQuarnCommand::success)
         addToDocument(Document::of(context.Document()), asked);
     return asked.result;
@@ -18,7 +18,7 @@ CQuarnCommand::result runNew(const CQuarnCommandContext& context) {
 
 /// The file is read first: when it cannot be, the document at work stays.
 CQuarnCommand::result runOpen(const CQuarnCommandContext& context) {
-    const AskedFile asked = askFileToRead(context, FileUse::open);
+    AskedFile asked = askFileToRead(context, FileUse::open);
     if (asked.result == CQuarnCommand::success)
         openAsDocument(Document::of(context.Document()).list(), asked);
     return asked.result;

@@ -5,13 +5,18 @@
 #include "host/app/DocumentSaving.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileNameQuestion.h"
+#include "host/commands/StudyPlace.h"
+#include "host/commands/UpAxisAsking.h"
 #include "host/commands/UpAxisText.h"
+#include "host/commands/WatchedBuilding.h"
 #include "host/commands/WatchedReading.h"
+#include "host/document/DocumentDrawing.h"
 #include "host/document/DocumentList.h"
 #include "host/document/ViewFit.h"
 #include "host/document/file/DocumentExtension.h"
 #include "host/document/file/DocumentFile.h"
 #include "host/reader/ModelReader.h"
+#include "host/reader/ReaderEnds.h"
 #include "sdk/qncore/QnGet.h"
 #include "sdk/qncore/QnLocalize.h"
 
@@ -68,8 +73,14 @@ ContentCounts countsOf(const DocumentContent& content) {
     return counts;
 }
 
+void addSentence(std::string& line, const std::string& sentence) {
+    if (!sentence.empty())
+        line += (line.ends_with('.') ? " " : ". ") + sentence;
+}
+
 /// Tells what may be wrong with what was read, then what it is.
-void tellContent(const AskedFile& asked, const std::vector<std::string>& warnings) {
+void tellContent(Document& document, const AskedFile& asked,
+                 const std::vector<std::string>& warnings) {
     Application& application = *Application::current();
     for (const std::string& warning : warnings)
         application.tell(warning);
@@ -77,8 +88,9 @@ void tellContent(const AskedFile& asked, const std::vector<std::string>& warning
         std::visit([](const auto& content) { return countsOf(content); }, asked.content);
     std::string result = textFromPath(asked.file.filename()).ToUtf8() + ": " + counts.text();
     if (const auto* model = std::get_if<ImportedModel>(&asked.content)) {
-        const std::string axis = upAxisText(model->up);
-        result += axis.empty() ? axis : ". " + axis;
+        addSentence(result, upAxisText(model->up));
+        if (model->place && asked.is_interactive)
+            addSentence(result, offerStudyPlace(document, *model->place));
     }
     application.tell(result);
 }
@@ -158,18 +170,46 @@ Result<void> readDocument(AskedFile& asked, const ReadingWish& wish) {
     return {};
 }
 
-Result<void> readModelOf(AskedFile& asked, const ReadingWish& wish) {
-    const Application& application = *Application::current();
-    WatchedReading watch(application.frontEnd(), asked.file);
-    auto model = readModel(asked.file, {.up = wish.up,
-                                        .tolerance = wish.tolerance,
-                                        .most_memory = application.options().most_memory,
-                                        .watch = &watch});
-    asked.is_given_up = watch.isGivenUp();
+Result<void> readModelOf(AskedFile& asked, const ReadingWish& wish, WatchedReading& watch) {
+    auto model =
+        readModel(asked.file, {.up = wish.up,
+                               .tolerance = wish.tolerance,
+                               .most_memory = Application::current()->options().most_memory,
+                               .watch = &watch});
     if (!model)
         return model.error();
     asked.content = std::move(model.value());
     return {};
+}
+
+std::vector<SceneMesh> meshesOf(const ImportedModel& model) {
+    std::vector<SceneMesh> meshes;
+    for (const ImportedMesh& mesh : model.meshes)
+        meshes.push_back({mesh.placed, KM_nil_uuid});
+    return meshes;
+}
+
+std::vector<SceneMesh> meshesOf(const DocumentContent& content) {
+    std::vector<SceneMesh> meshes;
+    for (const ObjectContent& object : content.objects)
+        if (object.placed.mesh)
+            meshes.push_back({object.placed, object.id, object.visible});
+    return meshes;
+}
+
+/// Reads the file and, where it will be drawn, builds its scene.
+Result<void> load(AskedFile& asked, const ReadingWish& wish, const Document* document) {
+    const Application& application = *Application::current();
+    WatchedReading watch(application.frontEnd(), asked.file);
+    Result<void> loaded =
+        isDocumentFile(asked.file) ? readDocument(asked, wish) : readModelOf(asked, wish, watch);
+    if (loaded && application.options().builds_scenes) {
+        const auto meshes =
+            std::visit([](const auto& content) { return meshesOf(content); }, asked.content);
+        asked.scene = buildWatched(document, meshes, watch);
+    }
+    asked.is_given_up = watch.isGivenUp();
+    return loaded && asked.is_given_up ? readingGivenUp(asked.file) : loaded;
 }
 
 } // namespace
@@ -185,28 +225,36 @@ AskedFile askFileToRead(const CQuarnCommandContext& context, FileUse use) {
     asked.file = choice.kind == FileChoice::Kind::chosen ? choice.file : asked.file;
     if (asked.result != CQuarnCommand::success)
         return asked;
-    const auto read =
-        isDocumentFile(asked.file) ? readDocument(asked, wish) : readModelOf(asked, wish);
+    const Document* const document =
+        use == FileUse::import ? &Document::of(context.Document()) : nullptr;
+    const auto read = load(asked, wish, document);
     if (!read)
         asked.result = fail(read.message());
     if (!read && asked.is_given_up)
         asked.result = CQuarnCommand::cancel;
+    asked.is_interactive = context.IsInteractive();
+    auto* const model = std::get_if<ImportedModel>(&asked.content);
+    if (read && model && asked.is_interactive)
+        askUpAxis(asked.file, *model, asked.scene.get());
     return asked;
 }
 
-void addToDocument(Document& document, const AskedFile& asked) {
+void addToDocument(Document& document, AskedFile& asked) {
     const bool was_empty = document.objects().empty();
     if (const auto* model = std::get_if<ImportedModel>(&asked.content)) {
         document.addModel(*model);
-        tellContent(asked, model->warnings);
+        tellContent(document, asked, model->warnings);
     } else {
-        tellContent(asked, importContent(document, std::get<DocumentContent>(asked.content)));
+        tellContent(document, asked,
+                    importContent(document, std::get<DocumentContent>(asked.content)));
     }
+    if (asked.scene)
+        document.drawing().takeScene(std::move(asked.scene));
     if (was_empty)
         fitViews(document);
 }
 
-void openAsDocument(DocumentList& list, const AskedFile& asked) {
+void openAsDocument(DocumentList& list, AskedFile& asked) {
     Document& document = list.openNew();
     const auto* content = std::get_if<DocumentContent>(&asked.content);
     if (!content) {
@@ -214,7 +262,9 @@ void openAsDocument(DocumentList& list, const AskedFile& asked) {
         document.markSaved(); // nobody wants to be asked about a model that was only looked at
         return;
     }
-    tellContent(asked, openContent(document, *content));
+    tellContent(document, asked, openContent(document, *content));
+    if (asked.scene)
+        document.drawing().takeScene(std::move(asked.scene));
     std::error_code ignored;
     document.setFile(std::filesystem::absolute(asked.file, ignored));
     if (content->views.empty())

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/front_end/FrontEnd.h"
 #include "import/ReadingWatch.h"
 
 #include <chrono>
@@ -8,11 +9,9 @@
 
 namespace quarn {
 
-class FrontEnd;
-
-/// Lets the front end work on its events while a model file is read, and shows how far it is where
-/// that takes longer than a moment. The person ends it with Escape or by asking the program to
-/// stop.
+/// Lets the front end work on its events while a model file is read and its scene is built, and
+/// shows how far that is where it takes longer than a moment. The person ends it with Escape or by
+/// asking the program to stop.
 class WatchedReading final : public ReadingWatch {
 public:
     WatchedReading(FrontEnd& front_end, std::filesystem::path file)
@@ -23,9 +22,13 @@ public:
     WatchedReading& operator=(const WatchedReading&) = delete;
 
     bool goesOn(ReadingStep step, double share) override;
+    /// The same of the building of the scene, on the thread of the front end.
+    bool buildingGoesOn(double share) { return goesOn(ModelStep::built, share); }
     bool isGivenUp() const { return m_is_given_up; }
 
 private:
+    bool goesOn(ModelStep step, double share);
+
     FrontEnd& m_front_end;
     std::filesystem::path m_file;
     std::thread::id m_thread = std::this_thread::get_id();

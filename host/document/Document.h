@@ -168,6 +168,7 @@ public:
 
     /// Draws the document.
     DocumentDrawing& drawing() { return *m_drawing; }
+    const DocumentDrawing& drawing() const { return *m_drawing; }
     RenderWindow& renderWindow() { return m_render_window; }
     const RenderWindow& renderWindow() const { return m_render_window; }
 

@@ -6,6 +6,7 @@
 
 #include <new>
 #include <string>
+#include <utility>
 
 namespace quarn {
 
@@ -101,6 +102,14 @@ Result<const DocumentScene*> DocumentDrawing::scene() {
         release();
         return Error{"There is too little memory for the scene. Close other programs."};
     }
+}
+
+std::unique_ptr<DocumentScene> DocumentDrawing::sceneWith(std::span<const SceneMesh> added) const {
+    return std::make_unique<DocumentScene>(m_document.objects(), added, m_scene.get());
+}
+
+void DocumentDrawing::takeScene(std::unique_ptr<DocumentScene> scene) {
+    m_scene = std::move(scene);
 }
 
 Result<void> DocumentDrawing::regenerate() {

@@ -6,6 +6,7 @@
 
 #include <functional>
 #include <memory>
+#include <span>
 #include <vector>
 
 class KM_Viewport;
@@ -17,6 +18,7 @@ class DocumentScene;
 struct DisplayModeAttributes;
 struct Image;
 struct RenderRequest;
+struct SceneMesh;
 enum class RenderEnd;
 
 /// How a document is drawn. The scene is built once for each revision of the objects and shared by
@@ -48,6 +50,12 @@ public:
     /// The scene as it is drawn now, brought up to date. Valid until the next call.
     /// @return an error when it cannot be built
     Result<const DocumentScene*> scene();
+    /// A scene of what the document will have once these meshes stand behind its objects. Whoever
+    /// builds it may draw the document meanwhile.
+    std::unique_ptr<DocumentScene> sceneWith(std::span<const SceneMesh> added) const;
+    /// Takes over such a scene after it was built and the meshes were added: what it has is not
+    /// built again.
+    void takeScene(std::unique_ptr<DocumentScene> scene);
     /// Brings the scene up to date where it was built before.
     Result<void> regenerate();
     /// Frees the scene.

@@ -3,6 +3,7 @@
 #include "engine/images/PictureMemory.h"
 #include "host/document/DisplayPolyline.h"
 #include "host/document/ObjectTable.h"
+#include "import/ImportedModel.h"
 
 #include <algorithm>
 
@@ -16,11 +17,40 @@ constexpr double CHORD_TOLERANCE_OF_SIZE = 5e-5;
 
 } // namespace
 
+/// Its revision is no document's, so that the first update compares what there is.
+DocumentScene::DocumentScene(const ObjectTable& objects, std::span<const SceneMesh> added,
+                             const DocumentScene* earlier) {
+    takeObjects(objects);
+    takeVisibility(objects, {});
+    m_content.revision = 0;
+    m_content.meshes.insert(m_content.meshes.end(), added.begin(), added.end());
+    if (earlier)
+        m_display.shareWith(earlier->m_display);
+}
+
+Result<void> DocumentScene::build(BuildProgress& progress) {
+    return m_display.update(m_content, &progress);
+}
+
 Result<void> DocumentScene::update(const ObjectTable& objects, std::span<const KM_Light> lights,
                                    std::span<const KM_UUID> hidden) {
     if (m_content.revision != objects.revision())
         takeObjects(objects);
     takeVisibility(objects, hidden);
+    m_content.lights.assign(lights.begin(), lights.end());
+    return m_display.update(m_content);
+}
+
+/// Revisions of documents rise from one; those of models fall from the largest number.
+Result<void> DocumentScene::update(const ImportedModel& model, std::span<const KM_Light> lights) {
+    m_content = {};
+    m_content.revision = ~m_models++;
+    for (const ImportedMesh& mesh : model.meshes)
+        m_content.meshes.push_back({mesh.placed, KM_nil_uuid});
+    for (const ImportedCurve& curve : model.curves)
+        m_content.curves.push_back({KM_nil_uuid, curve.points});
+    for (const KM_3dPoint& point : model.points)
+        m_content.points.push_back({KM_nil_uuid, point});
     m_content.lights.assign(lights.begin(), lights.end());
     return m_display.update(m_content);
 }

@@ -30,6 +30,10 @@ FileChoice FrontEnd::chooseFile(const FileQuestion&) {
     return {};
 }
 
+std::optional<ModelUp> FrontEnd::chooseUpAxis(const UpAxisQuestion&) {
+    return std::nullopt;
+}
+
 void FrontEnd::viewShown(CQuarnView&, const ShownPicture&) {}
 
 void FrontEnd::renderWindowShown(const ShownPicture&) {}

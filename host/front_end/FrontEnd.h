@@ -48,7 +48,7 @@ struct Answer {
 enum class ModelStep {
     read,  ///< the file is understood
     made,  ///< its meshes are made
-    built, ///< they are taken over, so that they can be drawn
+    built, ///< what rays search is built, so that they can be drawn
 };
 
 /// The port through which everything is asked of, and told to, a person. The host calls it on the
@@ -89,11 +89,10 @@ public:
     /// Told some times a second while a picture is rendered. Shows nothing unless it is overridden.
     /// @param share  how much of the picture is done, from 0 to 1; 1 comes last, however it ended
     virtual void pictureRendered(double share);
-    /// Told some times a second while a model file is read that takes longer than a moment, and
-    /// once when that has ended. Shows nothing unless it is overridden.
-    /// @param share  how much of the step is done, from 0 to 1; that of the step `built` is 0 when
-    /// it
-    ///               begins, and 1 comes last, however it ended
+    /// Told some times a second while a model or document file is loaded that takes longer than a
+    /// moment, and once when that has ended. Shows nothing unless it is overridden.
+    /// @param share  how much of the step is done, from 0 to 1; that of the step `built` is 1 once
+    ///               and last, however it ended
     virtual void modelRead(const std::filesystem::path& file, ModelStep step, double share);
 
     // ---- Windows. A front end without any leaves these as they are: it shows nothing, and nobody
@@ -108,6 +107,8 @@ public:
     /// Lets a person choose a file to open, or one to save in; an existing one of the latter only
     /// after the person agreed to replace it.
     virtual FileChoice chooseFile(const FileQuestion& question);
+    /// Lets a person choose which axis of a model file points up. @return nothing when none was
+    virtual std::optional<ModelUp> chooseUpAxis(const UpAxisQuestion& question);
     /// Told whenever a view shows a picture, drawn anew or not.
     virtual void viewShown(CQuarnView& view, const ShownPicture& picture);
     /// Told when the render window shows another picture; one of no size when it was closed. Where

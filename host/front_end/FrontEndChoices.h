@@ -4,6 +4,7 @@
 
 #include <cstdint>
 #include <filesystem>
+#include <functional>
 #include <span>
 #include <string>
 #include <vector>
@@ -48,6 +49,18 @@ struct ShownPicture {
     int width_px = 0;
     int height_px = 0;
     std::span<const std::uint8_t> rgba = {};
+};
+
+/// The axis of a model file that points up.
+enum class ModelUp { y, z };
+
+/// Which axis of a model file points up, asked where neither the file nor its format says so.
+struct UpAxisQuestion {
+    std::filesystem::path file;
+    ModelUp taken = ModelUp::z; ///< what most files of the kind have; stays where nobody chooses
+    /// Draws the model as it stands with that axis up, from before it, to its right and above. The
+    /// picture is valid until the next call; one of no size where the model cannot be drawn.
+    std::function<ShownPicture(ModelUp up, int width_px, int height_px)> draw;
 };
 
 } // namespace quarn

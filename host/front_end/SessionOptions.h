@@ -37,6 +37,10 @@ struct SessionOptions {
     bool overwrites = false;
     /// How much memory reading a model file may take, in bytes; 0: half of what is free then.
     std::uint64_t most_memory = 0;
+    /// Whether what is opened or imported will be drawn: then the scene of a large model is built
+    /// as a part of its loading, while the front end works on its events. Else the first picture
+    /// builds it.
+    bool builds_scenes = false;
 };
 
 } // namespace quarn

@@ -1,5 +1,6 @@
 #include "import/assembly/ModelAssembly.h"
 
+#include "import/ModelTurn.h"
 #include "import/assembly/CameraPlacing.h"
 #include "import/assembly/MeshPlacing.h"
 
@@ -11,16 +12,6 @@ namespace quarn {
 namespace {
 
 constexpr std::uint64_t MOST_TRIANGLES = 100'000'000;
-
-/// Y up to Z up: x stays, y becomes z, z becomes -y.
-KM_Xform zUpFromYUp() {
-    KM_Xform xform;
-    xform.m_xform[1][1] = 0.0;
-    xform.m_xform[1][2] = -1.0;
-    xform.m_xform[2][1] = 1.0;
-    xform.m_xform[2][2] = 0.0;
-    return xform;
-}
 
 KM_Xform movedTo(const KM_3dPoint& point) {
     return KM_Xform::Translation(point - KM_3dPoint::Origin);

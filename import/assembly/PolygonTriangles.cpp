@@ -7,8 +7,8 @@ namespace quarn {
 
 namespace {
 
-/// The time that ears take grows with the square of the corners.
-constexpr std::size_t MOST_CORNERS_WITH_EARS = 10'000;
+/// Some seconds' worth: ears of outlines that wind a great deal have many corners near them.
+constexpr std::uint64_t MOST_LOOKS = 200'000'000;
 
 /// Normal to the plane of a polygon, as long as twice its area (M. Newell, in I. Sutherland,
 /// R. Sproull and R. Schumacker, "A Characterization of Ten Hidden-Surface Algorithms", ACM
@@ -28,7 +28,7 @@ PolygonTriangles::cut(std::span<const KM_3dPoint> corners) {
     if (corners.size() < 3)
         return {};
     flatten(corners);
-    if (corners.size() == 3 || corners.size() > MOST_CORNERS_WITH_EARS || isConvex())
+    if (corners.size() == 3 || isConvex())
         cutFan();
     else
         cutEars();
@@ -86,11 +86,13 @@ void PolygonTriangles::cutEars() {
     for (std::uint32_t i = 0; i < count; ++i)
         if (!(turnAt(m_before[i], i, m_after[i]) > 0.0))
             m_reflex.push_back(i);
+    m_near.fill(m_flat, m_reflex);
+    m_looks_left = MOST_LOOKS;
     std::uint32_t corner = 0;
     std::uint32_t refused = 0;
     for (std::uint32_t left = count; left > 3;) {
         // Outlines that cross themselves may be left without an ear; then any corner goes.
-        if (refused < left && !isEar(corner)) {
+        if (refused < left && m_looks_left > 0 && !isEar(corner)) {
             ++refused;
             corner = m_after[corner];
             continue;
@@ -103,21 +105,27 @@ void PolygonTriangles::cutEars() {
     m_triangles.push_back({m_before[corner], corner, m_after[corner]});
 }
 
-bool PolygonTriangles::isEar(std::uint32_t corner) const {
+bool PolygonTriangles::isEar(std::uint32_t corner) {
     const std::uint32_t before = m_before[corner];
     const std::uint32_t after = m_after[corner];
-    if (!(turnAt(before, corner, after) > 0.0))
-        return false;
-    for (const std::uint32_t other : m_reflex) {
-        // Corners at one place: outlines of holes hang on their polygon by an edge taken twice.
-        const bool is_own = m_flat[other] == m_flat[before] || m_flat[other] == m_flat[corner] ||
-                            m_flat[other] == m_flat[after];
-        const bool is_gone = m_after[m_before[other]] != other;
-        if (!is_own && !is_gone && turnAt(before, corner, other) >= 0.0 &&
-            turnAt(corner, after, other) >= 0.0 && turnAt(after, before, other) >= 0.0)
-            return false;
-    }
-    return true;
+    --m_looks_left;
+    return turnAt(before, corner, after) > 0.0 &&
+           !m_near.anyNear(m_flat[before], m_flat[corner], m_flat[after],
+                           [this, corner](std::uint32_t other) {
+                               m_looks_left -= m_looks_left > 0;
+                               return keepsEarOff(other, corner);
+                           });
+}
+
+bool PolygonTriangles::keepsEarOff(std::uint32_t other, std::uint32_t corner) const {
+    const std::uint32_t before = m_before[corner];
+    const std::uint32_t after = m_after[corner];
+    // Corners at one place: outlines of holes hang on their polygon by an edge taken twice.
+    const bool is_own = m_flat[other] == m_flat[before] || m_flat[other] == m_flat[corner] ||
+                        m_flat[other] == m_flat[after];
+    const bool is_gone = m_after[m_before[other]] != other;
+    return !is_own && !is_gone && turnAt(before, corner, other) >= 0.0 &&
+           turnAt(corner, after, other) >= 0.0 && turnAt(after, before, other) >= 0.0;
 }
 
 void PolygonTriangles::takeOff(std::uint32_t corner) {

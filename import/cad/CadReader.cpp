@@ -25,8 +25,12 @@ fs::path moduleFile() {
                                                   : folder.parent_path() / "lib" / NAME;
 }
 
+struct CadModule {
+    ReadCad read;
+};
+
 /// The module stays open: its libraries do not bear being closed.
-Result<ReadCad> openModule() {
+Result<CadModule> openModule() {
     const fs::path file = moduleFile();
     std::error_code failure;
     if (!fs::exists(file, failure))
@@ -39,15 +43,15 @@ Result<ReadCad> openModule() {
     void* const symbol = dlsym(module, READ_CAD_NAME);
     if (symbol == nullptr)
         return Error{"the module " + file.string() + " is of another build. Build it again"};
-    return reinterpret_cast<ReadCad>(symbol);
+    return CadModule{reinterpret_cast<ReadCad>(symbol)};
 }
 
 Result<SourceScene> read(const ModelReading& reading, CadFormat format) {
-    static const Result<ReadCad> module = openModule();
+    static const Result<CadModule> module = openModule();
     if (!module)
         return Error{"Cannot read '" + reading.path.string() + "': " + module.message() + "."};
     Result<SourceScene> scene = SourceScene{};
-    module.value()(reading, format, scene);
+    module.value().read(reading, format, scene);
     return scene;
 }
 

@@ -49,20 +49,6 @@ std::string inSmallLetters(std::string text) {
     return text;
 }
 
-/// The first of a folder's names that differs from `name` in case alone.
-std::optional<fs::path> entryOfOtherCase(const fs::path& folder, const fs::path& name) {
-    const std::string wanted = inSmallLetters(name.string());
-    std::optional<fs::path> first;
-    std::error_code failure;
-    for (fs::directory_iterator at(folder, failure), end; !failure && at != end;
-         at.increment(failure)) {
-        const fs::path found = at->path().filename();
-        if (inSmallLetters(found.string()) == wanted && (!first || found < *first))
-            first = found;
-    }
-    return first;
-}
-
 } // namespace
 
 std::string otherCaseText(std::string_view reference, const NamedFile& file) {
@@ -70,7 +56,8 @@ std::string otherCaseText(std::string_view reference, const NamedFile& file) {
            std::string(reference) + "': the names differ in capital and small letters.";
 }
 
-ModelFolder::ModelFolder(const fs::path& model_file) {
+ModelFolder::ModelFolder(const fs::path& model_file, std::size_t most_entries)
+    : m_entries_left(most_entries) {
     std::error_code ignored;
     m_model = fs::absolute(model_file, ignored).lexically_normal();
     m_folder = fs::weakly_canonical(m_model.parent_path(), ignored);
@@ -104,6 +91,30 @@ std::optional<fs::path> ModelFolder::fileInside(const std::string& relative) con
         return std::nullopt;
     }
     return path;
+}
+
+const ModelFolder::Names& ModelFolder::namesIn(const fs::path& folder) const {
+    const auto [listed, is_new] = m_listed.try_emplace(folder);
+    Names& names = listed->second;
+    if (!is_new)
+        return names;
+    std::error_code failure;
+    for (fs::directory_iterator at(folder, failure), end;
+         !failure && at != end && m_entries_left > 0; at.increment(failure), --m_entries_left) {
+        const fs::path found = at->path().filename();
+        const auto [same, is_first] = names.try_emplace(inSmallLetters(found.string()), found);
+        if (!is_first && found < same->second)
+            same->second = found;
+    }
+    return names;
+}
+
+/// The first of a folder's names that differs from `name` in case alone.
+std::optional<fs::path> ModelFolder::entryOfOtherCase(const fs::path& folder,
+                                                      const fs::path& name) const {
+    const Names& names = namesIn(folder);
+    const auto found = names.find(inSmallLetters(name.string()));
+    return found != names.end() ? std::optional(found->second) : std::nullopt;
 }
 
 std::optional<fs::path> ModelFolder::fileOfOtherCase(const std::string& relative) const {

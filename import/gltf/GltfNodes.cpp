@@ -32,11 +32,22 @@ KM_Xform placeOf(const Json& node) {
            KM_Xform::Diagonal(scale[0], scale[1], scale[2]);
 }
 
+/// Where positions are far from the origin, files state them from a place of their own.
+KM_Xform worldFromScene(const Json& json) {
+    double center[3] = {0, 0, 0};
+    readNumbers(member(extension(json, "CESIUM_RTC"), "center"), center);
+    return KM_Xform::Translation(center[0], center[1], center[2]);
+}
+
+std::string timesMore(std::uint64_t count) {
+    return count == 1 ? "once more" : std::to_string(count) + " times more";
+}
+
 class NodeWalk {
 public:
     NodeWalk(const ModelReading& reading, const Json& json)
         : m_reading(reading), m_json(json), m_nodes(elements(member(json, "nodes"))),
-          m_is_reached(m_nodes.size(), false) {
+          m_world_from_scene(worldFromScene(json)), m_is_reached(m_nodes.size(), false) {
         m_result.world_from_node.resize(m_nodes.size());
     }
 
@@ -83,7 +94,7 @@ private:
 
     Result<void> followFrom(std::optional<std::uint64_t> root, bool is_shown) {
         m_open.clear();
-        if (const Result<void> pushed = push(root, {}); !pushed)
+        if (const Result<void> pushed = push(root, m_world_from_scene); !pushed)
             return pushed;
         while (!m_open.empty()) {
             const Open open = m_open.back();
@@ -118,6 +129,7 @@ private:
     const ModelReading& m_reading;
     const Json& m_json;
     std::span<const Json> m_nodes;
+    KM_Xform m_world_from_scene;
     std::vector<bool> m_is_reached;
     std::vector<Open> m_open;
     std::uint64_t m_reached_again = 0;
@@ -132,8 +144,8 @@ Result<Nodes> followNodes(const ModelReading& reading, const Json& json,
     Result<Nodes> nodes = walk.walk();
     if (walk.reachedAgain() > 0)
         warnings.push_back("Nodes of its scene that belong to several others, or to themselves, "
-                           "are shown once (" +
-                           std::to_string(walk.reachedAgain()) + " times more were left out).");
+                           "are shown once: the file has them " +
+                           timesMore(walk.reachedAgain()) + ".");
     return nodes;
 }
 

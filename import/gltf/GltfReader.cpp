@@ -42,6 +42,8 @@ public:
                 return done.error();
         }
         m_meshes.tellLosses();
+        if (const std::string passed_over = passedOverText(m_json); !passed_over.empty())
+            m_result.warnings.push_back(passed_over);
         finishLights();
         if (const std::string rounded = roundingText(m_result); !rounded.empty())
             m_result.warnings.push_back(rounded);

@@ -75,6 +75,11 @@ std::optional<double> degreesOf(std::string_view list) {
     return degrees;
 }
 
+/// To some ten centimetres on the ground: what is behind that is the rounding of the sum.
+double shortened(double degrees) {
+    return std::round(degrees * 1e6) / 1e6;
+}
+
 /// Degrees from the Y axis to the direction that an IfcDirection gives, clockwise.
 double northAngleOf(std::string_view text) {
     constexpr std::size_t TRUE_NORTH = 5;
@@ -113,7 +118,8 @@ std::optional<ImportedPlace> placeOfIfc(std::span<const std::uint8_t> bytes) {
     if (!latitude || !longitude || !(std::abs(*latitude) <= 90.0) ||
         !(std::abs(*longitude) <= 180.0))
         return std::nullopt;
-    return ImportedPlace{*latitude, *longitude, northAngleOf(text)};
+    return ImportedPlace{shortened(*latitude), shortened(*longitude),
+                         shortened(northAngleOf(text))};
 }
 
 } // namespace quarn

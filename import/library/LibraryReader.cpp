@@ -4,6 +4,8 @@
 #include "import/files/LargeStack.h"
 #include "import/files/ModelFileCheck.h"
 #include "import/ifc/IfcPlace.h"
+#include "import/library/DaeText.h"
+#include "import/library/LibraryLosses.h"
 #include "import/library/ModelFileAccess.h"
 #include "import/library/PlainWords.h"
 #include "import/library/SceneReading.h"
@@ -103,28 +105,44 @@ bool completeScene(Assimp::Importer& importer, std::vector<std::string>& warning
     return scene.mNumMeshes == 0 || importer.ApplyPostProcessing(STEPS) != nullptr;
 }
 
+/// @param text  what the importer read
 Result<SourceScene> takeChecked(Assimp::Importer& importer, const ModelReading& reading,
-                                const ModelConventions& conventions) {
+                                const std::string& format, std::string_view text) {
     const fs::path& path = reading.path;
     std::vector<std::string> warnings;
     if (!completeScene(importer, warnings))
         return cannotReadModel(path, inPlainWords(importer.GetErrorString()), repair);
     const std::unique_ptr<aiScene> scene(importer.GetOrphanedScene());
     importer.FreeScene();
-    SourceScene taken = takeScene(*scene, reading, conventions);
+    if (std::string lost = libraryLossText(format, text, *scene); !lost.empty())
+        warnings.push_back(std::move(lost));
+    SourceScene taken = takeScene(*scene, reading, conventionsOf(format));
     taken.warnings.insert(taken.warnings.begin(), warnings.begin(), warnings.end());
     return taken;
 }
 
+std::string_view textOf(std::span<const std::uint8_t> bytes) {
+    return {reinterpret_cast<const char*>(bytes.data()), bytes.size()};
+}
+
+/// What the library is given in place of the file; nothing where it may have the file as it is.
+std::optional<std::string> replacementOf(const std::string& format, const ModelReading& reading) {
+    std::optional<std::string> narrow = utf8OfWideFile(format, reading.bytes);
+    if (format == "dae")
+        return withoutBlanksBehindTags(narrow ? *narrow : textOf(reading.bytes));
+    return narrow;
+}
+
 Result<SourceScene> readChecked(const ModelReading& reading) {
     const fs::path& path = reading.path;
+    const std::string format = modelFormat(path);
     std::set<std::string> refused;
-    const std::optional<std::string> narrow = utf8OfWideFile(modelFormat(path), reading.bytes);
+    const std::optional<std::string> replacement = replacementOf(format, reading);
     Assimp::Importer importer;
     auto* const access = new ModelFileAccess(reading.folder, refused);
     importer.SetIOHandler(access); // which owns it
-    if (narrow) {
-        access->replace(path, *narrow);
+    if (replacement) {
+        access->replace(path, *replacement);
     }
     configure(importer);
     const std::string extension = path.extension().string();
@@ -134,8 +152,8 @@ Result<SourceScene> readChecked(const ModelReading& reading) {
     }
     if (importer.ReadFile(path.string(), 0) == nullptr)
         return cannotReadModel(path, inPlainWords(importer.GetErrorString()), repair);
-    const std::string format = modelFormat(path);
-    Result<SourceScene> scene = takeChecked(importer, reading, conventionsOf(format));
+    const std::string_view text = replacement ? *replacement : textOf(reading.bytes);
+    Result<SourceScene> scene = takeChecked(importer, reading, format, text);
     if (!scene) {
         return scene;
     }

@@ -83,7 +83,7 @@ std::shared_ptr<Texture> textureFromPixels(const aiTexture& source) {
 
 MaterialReading::MaterialReading(const aiScene& scene, const ModelReading& reading,
                                  std::vector<std::string>& warnings)
-    : m_scene(scene), m_textures(reading, warnings) {}
+    : m_scene(scene), m_folder(reading.folder), m_textures(reading, warnings) {}
 
 const ReadMaterial& MaterialReading::at(unsigned index) {
     const auto found = m_materials.find(index);
@@ -102,7 +102,11 @@ ReadMaterial MaterialReading::read(const aiMaterial& source) {
     aiString name;
     source.Get(AI_MATKEY_NAME, name);
     const std::string_view text(name.data, name.length);
-    const bool made_up = text == AI_DEFAULT_MATERIAL_NAME || text.empty();
+    aiColor4D stated(0.0F, 0.0F, 0.0F, 0.0F);
+    source.Get(AI_MATKEY_COLOR_DIFFUSE, stated);
+    // What is nothing at all stands for a material that is missing.
+    const bool is_empty = text.empty() && stated == aiColor4D(0.0F, 0.0F, 0.0F, 0.0F);
+    const bool made_up = text == AI_DEFAULT_MATERIAL_NAME || is_empty;
     if (made_up && source.GetTextureCount(aiTextureType_DIFFUSE) == 0) {
         return result;
     }
@@ -154,13 +158,42 @@ std::shared_ptr<const Texture> MaterialReading::texture(const std::string& refer
                                                         TextureWraps wraps) {
     const aiTexture* embedded = m_scene.GetEmbeddedTexture(reference.c_str());
     if (embedded == nullptr || embedded->pcData == nullptr) {
-        return m_textures.fromFile(reference, wraps);
+        return textureFromFile(reference, wraps);
     }
     if (embedded->mHeight > 0) {
         return m_textures.keep(reference, textureFromPixels(*embedded), wraps);
     }
     const auto* bytes = reinterpret_cast<const std::uint8_t*>(embedded->pcData);
     return m_textures.fromBytes(reference, {bytes, embedded->mWidth}, wraps);
+}
+
+std::shared_ptr<const Texture> MaterialReading::textureFromFile(const std::string& reference,
+                                                                TextureWraps wraps) {
+    constexpr std::string_view COMPUTED = "Procedural,";
+    if (reference.starts_with("$")) // the reading library's own word for a texture without a name
+        return nullptr;
+    if (reference.starts_with(COMPUTED)) {
+        m_textures.warnLeftOut(reference.substr(reference.rfind('=') + 1),
+                               "it is a pattern to be computed, not a picture");
+        return nullptr;
+    }
+    return m_textures.fromFile(firstThatIsThere(reference), wraps);
+}
+
+/// X3D names one texture by several addresses, each in quotes: the first that can be had counts.
+std::string MaterialReading::firstThatIsThere(const std::string& reference) const {
+    std::string first;
+    for (std::size_t begin = 0; begin < reference.size();) {
+        const std::size_t end = std::min(reference.find('"', begin), reference.size());
+        const std::string address = reference.substr(begin, end - begin);
+        begin = end + 1;
+        if (address.find_first_not_of(' ') == std::string::npos)
+            continue;
+        if (m_folder.find(address))
+            return address;
+        first = first.empty() ? address : first;
+    }
+    return first;
 }
 
 } // namespace quarn

@@ -37,7 +37,12 @@ private:
     void readOpacityMap(const aiMaterial& source, ReadMaterial& result);
     std::shared_ptr<const Texture> texture(const std::string& reference, TextureWraps wraps);
 
+    std::shared_ptr<const Texture> textureFromFile(const std::string& reference,
+                                                   TextureWraps wraps);
+    std::string firstThatIsThere(const std::string& reference) const;
+
     const aiScene& m_scene;
+    const ModelFolder& m_folder;
     TextureStore m_textures;
     std::map<unsigned, ReadMaterial> m_materials;
 };

@@ -37,6 +37,8 @@ TextureStore::keep(const std::string& name, std::shared_ptr<Texture> picture, Te
 std::shared_ptr<const Texture>
 TextureStore::combined(const std::shared_ptr<const Texture>& colors,
                        const std::shared_ptr<const Texture>& opacity) {
+    if (colors == opacity) // whose alpha counts already; without one it is opaque
+        return colors;
     std::shared_ptr<const Texture>& both = m_combined[{colors, opacity}];
     if (!both)
         both = withOpacity(colors.get(), *opacity);

@@ -1,3 +1,4 @@
+#include "ground/LargePages.h"
 #include "ground/LightFields.h"
 #include "ground/ViewportLayout.h"
 #include "import/transfer/ModelTransfer.h"
@@ -56,6 +57,7 @@ private:
         if (count > (m_arrays_end - m_taken) / element_bytes)
             return false;
         array.reserve(count + SPARE_ELEMENTS);
+        askForLargePages(array.data(), count * element_bytes);
         const std::size_t step = TRANSFER_STEP_BYTES / element_bytes;
         for (std::size_t done = 0; done < count; done = array.size()) {
             array.resize(std::min<std::size_t>(count, done + step));

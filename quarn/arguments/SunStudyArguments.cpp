@@ -7,8 +7,6 @@
 #include "quarn/reports/PlaceList.h"
 #include "quarn/scripts/SunStudyScript.h"
 
-#include <cmath>
-
 namespace quarn::program {
 
 namespace {
@@ -67,19 +65,14 @@ void addViewOptions(const OptionAdder& add, StudyView& view) {
         "Distance of the camera, 1 where the model just fits into the picture (default: 1.1)");
 }
 
-/// To some ten centimetres on the ground.
-double shortened(double degrees) {
-    return std::round(degrees * 1e6) / 1e6;
-}
-
 /// Takes the place that the model's file states.
 std::optional<std::string> settleByModel(const std::filesystem::path& model, StudySite& site) {
     const std::optional<StatedSite> stated = statedSite(model);
     if (!stated)
         return "say where the model stands with --place, or with --latitude and --longitude; "
                "quarn places lists the places.";
-    site = {"As " + model.filename().native() + " states", shortened(stated->latitude_deg),
-            shortened(stated->longitude_deg), shortened(stated->north_angle_deg)};
+    site = {"As " + model.filename().native() + " states", stated->latitude_deg,
+            stated->longitude_deg, stated->north_angle_deg};
     return std::nullopt;
 }
 

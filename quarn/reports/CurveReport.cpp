@@ -7,7 +7,7 @@ namespace quarn::program {
 Outcome reportCurves(const std::filesystem::path& model, const CommonOptions& common) {
     watchForInterruption();
     ConsoleFrontEnd front_end(printsFor(common));
-    HostSession host(front_end, common);
+    HostSession host(front_end, common, HostSession::Use::numbers);
     if (const auto trouble = host.readModel(model))
         return *trouble;
     front_end.keepWords();

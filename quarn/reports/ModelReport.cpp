@@ -9,7 +9,7 @@ Outcome reportModel(const std::filesystem::path& model, ReportForm form,
                     const CommonOptions& common) {
     watchForInterruption();
     ConsoleFrontEnd front_end(printsFor(common));
-    HostSession host(front_end, common);
+    HostSession host(front_end, common, HostSession::Use::numbers);
     const auto start = std::chrono::steady_clock::now();
     if (const auto trouble = host.readModel(model))
         return *trouble;

@@ -12,7 +12,7 @@ namespace quarn::program {
 
 namespace {
 
-SessionOptions sessionOptions(const CommonOptions& common) {
+SessionOptions sessionOptions(const CommonOptions& common, HostSession::Use use) {
     SessionOptions options;
     options.plug_in_folders = {plugInFolder()};
     options.locale_folders = {hostLocaleFolder()};
@@ -20,6 +20,7 @@ SessionOptions sessionOptions(const CommonOptions& common) {
     options.dialog_folders = {dialogFolder()};
     options.overwrites = common.overwrites;
     options.most_memory = common.most_memory;
+    options.builds_scenes = use == HostSession::Use::pictures;
     return options;
 }
 
@@ -35,8 +36,8 @@ void tellDefects(const std::string& words, const std::string& model) {
 
 } // namespace
 
-HostSession::HostSession(ConsoleFrontEnd& front_end, const CommonOptions& common)
-    : m_front_end(front_end), m_session(front_end, sessionOptions(common)) {}
+HostSession::HostSession(ConsoleFrontEnd& front_end, const CommonOptions& common, Use use)
+    : m_front_end(front_end), m_session(front_end, sessionOptions(common, use)) {}
 
 std::optional<Outcome> HostSession::loadAnimationPlugIn() {
     const PlugInLoad load = m_session.loadPlugIn(plugInFolder() / "Zoetrix.qnp");

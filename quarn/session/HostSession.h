@@ -20,7 +20,10 @@ struct CommonOptions {
 /// The host as this program runs it: with the files that are installed beside the program.
 class HostSession {
 public:
-    HostSession(ConsoleFrontEnd& front_end, const CommonOptions& common);
+    /// What is done with the models that it reads.
+    enum class Use { pictures, numbers };
+
+    HostSession(ConsoleFrontEnd& front_end, const CommonOptions& common, Use use = Use::pictures);
 
     /// Loads the plug-in that sets up and records animations.
     /// @return nothing when it is there, else why it is not

@@ -59,6 +59,92 @@ TEST(VertexColours, ThatAreNothingAtAllStandForMissingOnes) {
     EXPECT_THAT(model.meshes[0].placed.mesh->m_C, IsEmpty());
 }
 
+TEST(Amf, VolumesThatAreNotReadAreTold) {
+    const TemporaryFolder folder;
+    const std::string volume =
+        "<volume><triangle><v1>0</v1><v2>1</v2><v3>2</v3></triangle></volume>";
+    const auto read = [&](const std::string& volumes) {
+        return readOrFail(folder.write(
+            "a.amf",
+            "<?xml version=\"1.0\" encoding=\"UTF-8\"?><amf><object id=\"1\"><mesh><vertices>"
+            "<vertex><coordinates><x>0</x><y>0</y><z>0</z></coordinates></vertex>"
+            "<vertex><coordinates><x>1</x><y>0</y><z>0</z></coordinates></vertex>"
+            "<vertex><coordinates><x>0</x><y>1</y><z>0</z></coordinates></vertex></vertices>" +
+                volumes + "</mesh></object></amf>"));
+    };
+    EXPECT_THAT(read(volume).warnings, IsEmpty());
+    const ImportedModel model = read(volume + volume + volume);
+    EXPECT_EQ(model.triangleCount(), 1U);
+    EXPECT_THAT(model.warnings, ElementsAre(HasSubstr("2 of its 3 triangles were left out")));
+}
+
+/// A square of an X3D scene.
+constexpr const char* SQUARE =
+    "<Shape><Appearance><Material diffuseColor='1 0 0'/>"
+    "<ImageTexture url='\"gone.png\" \"wood.png\"'/></Appearance>"
+    "<IndexedFaceSet coordIndex='0 1 2 3 -1'>"
+    "<Coordinate point='0 0 0 1 0 0 1 1 0 0 1 0'/></IndexedFaceSet></Shape>";
+
+ImportedModel readX3d(const TemporaryFolder& folder, const std::string& scene) {
+    return readOrFail(folder.write("a.x3d", "<?xml version='1.0' encoding='UTF-8'?><X3D "
+                                            "profile='Immersive' version='3.0'><Scene>" +
+                                                scene + "</Scene></X3D>"));
+}
+
+TEST(X3d, MaterialsWithoutANameKeepTheirColours) {
+    const TemporaryFolder folder;
+    folder.write("wood.png", "no picture");
+    const ImportedModel model = readX3d(folder, SQUARE);
+    ASSERT_EQ(model.meshes.size(), 1U);
+    ASSERT_NE(model.meshes[0].placed.material, nullptr);
+    EXPECT_EQ(model.meshes[0].placed.material->base_color, KM_Color(255, 0, 0));
+}
+
+TEST(X3d, OfSeveralAddressesOfATextureTheFirstThatIsThereCounts) {
+    const TemporaryFolder folder;
+    EXPECT_THAT(readX3d(folder, SQUARE).warnings,
+                ElementsAre(HasSubstr("'gone.png' was left out")));
+    folder.write("wood.png", "no picture");
+    EXPECT_THAT(readX3d(folder, SQUARE).warnings,
+                ElementsAre(HasSubstr("'wood.png' was left out")));
+}
+
+TEST(X3d, GroupsThatAreShownAgainAreTold) {
+    const TemporaryFolder folder;
+    folder.write("wood.png", "no picture");
+    const std::string group = std::string("<Group DEF='one'>") + SQUARE + "</Group>";
+    EXPECT_EQ(readX3d(folder, group).warnings.size(), 1U);
+    EXPECT_THAT(readX3d(folder, group + "<Transform translation='2 0 0'><Group USE='one'/>"
+                                        "</Transform>")
+                    .warnings,
+                testing::Contains(HasSubstr("shows groups again (USE)")));
+}
+
+TEST(Dae, NumbersMayStandBehindBlanks) {
+    const TemporaryFolder folder;
+    const ImportedModel model = readOrFail(folder.write(
+        "a.dae",
+        "<?xml version=\"1.0\"?><COLLADA xmlns=\"http://www.collada.org/2005/11/COLLADASchema\" "
+        "version=\"1.4.1\"><library_effects><effect id=\"e\"><profile_COMMON><technique "
+        "sid=\"t\"><lambert><diffuse><color>  \n 1 0 0 1 </color></diffuse></lambert></technique>"
+        "</profile_COMMON></effect></library_effects><library_materials><material id=\"m\" "
+        "name=\"red\"><instance_effect url=\"#e\"/></material></library_materials>"
+        "<library_geometries><geometry id=\"g\"><mesh><source id=\"p\"><float_array id=\"a\" "
+        "count=\"9\">  0 0 0 1 0 0 0 1 0</float_array><technique_common><accessor source=\"#a\" "
+        "count=\"3\" stride=\"3\"><param name=\"X\" type=\"float\"/><param name=\"Y\" "
+        "type=\"float\"/><param name=\"Z\" type=\"float\"/></accessor></technique_common></source>"
+        "<vertices id=\"v\"><input semantic=\"POSITION\" source=\"#p\"/></vertices><triangles "
+        "count=\"1\" material=\"s\"><input semantic=\"VERTEX\" source=\"#v\" offset=\"0\"/><p> 0 "
+        "1 2</p></triangles></mesh></geometry></library_geometries><library_visual_scenes>"
+        "<visual_scene id=\"w\"><node><instance_geometry url=\"#g\"><bind_material>"
+        "<technique_common><instance_material symbol=\"s\" target=\"#m\"/></technique_common>"
+        "</bind_material></instance_geometry></node></visual_scene></library_visual_scenes>"
+        "<scene><instance_visual_scene url=\"#w\"/></scene></COLLADA>"));
+    ASSERT_EQ(model.meshes.size(), 1U);
+    ASSERT_NE(model.meshes[0].placed.material, nullptr);
+    EXPECT_EQ(model.meshes[0].placed.material->base_color, KM_Color(255, 0, 0));
+}
+
 std::string wide(const std::string& ascii, bool big_endian) {
     std::string bytes = big_endian ? "\xFE\xFF" : "\xFF\xFE";
     for (const char c : ascii)

@@ -84,6 +84,43 @@ TEST(PolygonTriangles, OutlinesOfAnyPlaneAreFilledExactly) {
     }
 }
 
+/// A ribbon, wound up: its outline runs out along one side and back along the other.
+Corners ribbon(int corners, double turns) {
+    Corners outline;
+    for (int i = 0; i < corners; ++i) {
+        const bool is_back = i >= corners / 2;
+        const int step = is_back ? corners - 1 - i : i;
+        const double angle = 2.0 * std::numbers::pi * turns * step / (corners / 2);
+        const double radius = 3.0 + angle + (is_back ? -1.5 : 0.0);
+        outline.emplace_back(radius * std::cos(angle), radius * std::sin(angle), 0.0);
+    }
+    return outline;
+}
+
+double areaOfOutline(const Corners& outline) {
+    double area = 0.0;
+    for (std::size_t i = 0; i < outline.size(); ++i) {
+        const KM_3dPoint& a = outline[i];
+        const KM_3dPoint& b = outline[(i + 1) % outline.size()];
+        area += 0.5 * (a.x * b.y - a.y * b.x);
+    }
+    return std::abs(area);
+}
+
+TEST(PolygonTriangles, OutlinesOfManyCornersAreFilledExactlyToo) {
+    std::mt19937 random(5);
+    std::uniform_real_distribution<double> radius(0.3, 1.0);
+    Corners star;
+    for (int i = 0; i < 20'000; ++i) {
+        const double angle = 2.0 * std::numbers::pi * i / 20'000;
+        const double r = radius(random);
+        star.emplace_back(r * std::cos(angle), r * std::sin(angle), 0.0);
+    }
+    EXPECT_NEAR(areaOf(star, KM_3dVector::ZAxis), areaOfOutline(star), 1e-9);
+    const Corners wound = ribbon(20'000, 2.0);
+    EXPECT_NEAR(areaOf(wound, KM_3dVector::ZAxis), areaOfOutline(wound), 1e-6);
+}
+
 TEST(PolygonTriangles, AnyCornersGiveTwoTrianglesLessThanTheyAre) {
     std::mt19937 random(3);
     const double numbers[] = {0,

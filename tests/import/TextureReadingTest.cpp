@@ -1,4 +1,5 @@
 #include "engine/images/ImageFile.h"
+#include "import/files/ModelFolder.h"
 #include "tests/import/ModelFixtures.h"
 
 #include <gmock/gmock.h>
@@ -81,6 +82,42 @@ TEST(TextureReading, NameThatFitsIsPreferredToOneThatDiffersInCase) {
     EXPECT_THAT(model.meshes[0].placed.material->base_color_texture->rgba,
                 ElementsAre(10, 20, 30, 255));
     EXPECT_THAT(model.warnings, SizeIs(0));
+}
+
+TEST(ModelFolder, IsListedOnceForNamesThatDifferInCase) {
+    const TemporaryFolder folder;
+    folder.write("Wood.png", "");
+    const ModelFolder files(folder.write("a.obj", ""));
+    EXPECT_TRUE(files.find("wood.PNG").has_value());
+    folder.write("Stone.png", "");
+    EXPECT_FALSE(files.find("stone.PNG").has_value());
+    EXPECT_TRUE(files.find("Stone.png").has_value());
+}
+
+TEST(ModelFolder, LooksAtNoMoreEntriesThanItMay) {
+    const TemporaryFolder folder;
+    for (const char* const below : {"", "one/", "two/"})
+        folder.write(std::string(below) + "Wood.png", "");
+    const auto model = folder.write("a.obj", "");
+    const auto found = [&model](std::size_t most_entries) {
+        const ModelFolder files(model, most_entries);
+        return std::vector<bool>{files.find("one/wood.png").has_value(),
+                                 files.find("two/wood.png").has_value()};
+    };
+    EXPECT_THAT(found(2), ElementsAre(true, true));
+    EXPECT_THAT(found(1), ElementsAre(true, false));
+}
+
+TEST(TextureReading, PictureThatIsItsOwnOpacityStaysWhole) {
+    const TemporaryFolder folder;
+    writePicture(folder, "paper.png", 1, {100, 110, 120, 255});
+    folder.write("a.mtl", "newmtl one\nmap_Kd paper.png\nmap_d paper.png\nnewmtl two\n");
+    const ImportedModel model = readOrFail(folder.write("a.obj", two_materials));
+    ASSERT_EQ(model.meshes.size(), 2U);
+    const Material& paper = *model.meshes[0].placed.material;
+    EXPECT_FALSE(paper.see_through);
+    ASSERT_NE(paper.base_color_texture, nullptr);
+    EXPECT_THAT(paper.base_color_texture->rgba, ElementsAre(100, 110, 120, 255));
 }
 
 TEST(TextureReading, OpacityMapOfAnObjCutsHolesIntoTheColours) {

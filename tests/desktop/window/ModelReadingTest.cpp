@@ -3,6 +3,7 @@
 
 #include <QLabel>
 #include <QPushButton>
+#include <QThread>
 
 #include <gmock/gmock.h>
 
@@ -52,6 +53,45 @@ TEST_F(ModelReadingTest, LeavesTheWindowAlive) {
     });
     open("hang.obj");
     EXPECT_EQ(looks, 20);
+}
+
+/// A field of half a million triangles.
+std::string largeObj() {
+    constexpr int SQUARES = 500;
+    std::string text;
+    for (int i = 0; i <= SQUARES; ++i)
+        for (int j = 0; j <= SQUARES; ++j)
+            text += "v " + std::to_string(i) + ' ' + std::to_string(j) + " 0\n";
+    for (int i = 0; i < SQUARES; ++i)
+        for (int j = 1; j <= SQUARES; ++j) {
+            const int corner = i * (SQUARES + 1) + j;
+            text += "f " + std::to_string(corner) + ' ' + std::to_string(corner + 1) + ' ' +
+                    std::to_string(corner + SQUARES + 2) + ' ' +
+                    std::to_string(corner + SQUARES + 1) + '\n';
+        }
+    return text;
+}
+
+TEST_F(ModelReadingTest, IsCancelledWhileTheSceneIsBuilt) {
+    qunsetenv("QUARN_READER"); // the program that comes with the host reads it
+    quarn::test::writeFile(folder / "large.obj", largeObj());
+    run("_Point 1,2,3");
+    QString text;
+    bool has_waited = false;
+    whileItWorks([&] {
+        if (!std::exchange(has_waited, true))
+            QThread::msleep(310); // so that it is worth showing
+        const QString shown = window.findChild<QLabel*>("progressText")->text();
+        if (!shown.startsWith("Building the scene"))
+            return;
+        text = shown;
+        window.findChild<QPushButton*>("progressCancel")->click();
+    });
+    open("large.obj");
+    EXPECT_TRUE(text.startsWith("Building the scene: ")) << text.toStdString();
+    EXPECT_TRUE(printed().contains("large.obj was not read: it was given up."));
+    run("_-List _Objects");
+    EXPECT_TRUE(printed().contains("1 point;"));
 }
 
 TEST_F(ModelReadingTest, ThatCrashesLeavesTheDocumentAsItWas) {

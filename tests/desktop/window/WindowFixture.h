@@ -28,6 +28,7 @@ protected:
     static SessionOptions strictOptions(const std::filesystem::path& documents) {
         SessionOptions options = sessionOptions("C", documents);
         options.strict = true;
+        options.builds_scenes = true;
         return options;
     }
 

@@ -100,6 +100,10 @@ Desk::Desk() : m_home(m_folder / "home/architect") {
     for (const char* const folder : {"Documents", "bin", ".run"})
         std::filesystem::create_directories(home() / folder);
     std::filesystem::permissions(home() / ".run", std::filesystem::perms::owner_all);
+    std::filesystem::create_directories(home() / ".config/Quarn");
+    writeFile(
+        home() / ".config/Quarn/quarn-desktop.conf",
+        "[files]\nasks_which_way_is_up=false\n"); // the models of these tests stand as they are
     writeProgram(home() / "bin" / "xdg-open",
                  "#!/bin/sh\nprintf '%s\\n' \"$@\" >>'" + (home() / "opened").string() + "'\n");
 }

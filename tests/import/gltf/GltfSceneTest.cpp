@@ -54,9 +54,38 @@ TEST(GltfScene, NodesThatAreReachedTwiceAreShownOnceAndTold) {
     gltf.json["nodes"][1]["children"] = {2};
     const ImportedModel two_parents = gltf.read();
     EXPECT_EQ(namesIn(two_parents), "021");
-    EXPECT_THAT(two_parents.warnings, ElementsAre(HasSubstr("are shown once (1 times more")));
+    EXPECT_THAT(two_parents.warnings, ElementsAre(HasSubstr("the file has them once more.")));
     gltf.json["nodes"][2]["children"] = {0, 2};
-    EXPECT_EQ(namesIn(gltf.read()), "021");
+    const ImportedModel rings = gltf.read();
+    EXPECT_EQ(namesIn(rings), "021");
+    EXPECT_THAT(rings.warnings, ElementsAre(HasSubstr("the file has them 3 times more.")));
+}
+
+TEST(GltfScene, CenterThatPositionsAreStatedFromMovesTheWholeScene) {
+    GltfWriter gltf = threeNodes();
+    gltf.json["extensionsRequired"] = {"CESIUM_RTC"};
+    gltf.json["extensions"]["CESIUM_RTC"]["center"] = {4000000.5, -2000000.25, 6000000.125};
+    gltf.json["nodes"][0]["children"] = {1};
+    gltf.json["nodes"][0]["translation"] = {0, 0, 1};
+    const ImportedModel model = gltf.read();
+    ASSERT_THAT(model.meshes, SizeIs(3));
+    EXPECT_THAT(model.warnings, IsEmpty());
+    // Turned from y up to z up.
+    expectNear(model.meshes[1].placed.box().m_min, {4000000.5, -6000001.125, -2000000.25}, 1e-6);
+    expectNear(model.meshes[2].placed.box().m_min, {4000000.5, -6000000.125, -2000000.25}, 1e-6);
+}
+
+TEST(GltfScene, ExtensionsThatMoveNothingAreToldAndPassedOver) {
+    GltfWriter gltf = threeNodes();
+    gltf.json["extensionsRequired"] = {"KHR_materials_unlit", "EXT_texture_webp",
+                                       "VRMC_materials_mtoon"};
+    gltf.json["extensionsUsed"] = {"KHR_materials_unlit", "KHR_techniques_webgl",
+                                   "KHR_materials_sheen"};
+    const ImportedModel model = gltf.read();
+    EXPECT_EQ(namesIn(model), "012");
+    EXPECT_THAT(model.warnings,
+                ElementsAre("What these glTF extensions say was left out: KHR_materials_unlit, "
+                            "VRMC_materials_mtoon, KHR_techniques_webgl."));
 }
 
 TEST(GltfScene, MatrixAndPartsOfATransformPlaceAlike) {
