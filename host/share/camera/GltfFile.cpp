@@ -57,12 +57,14 @@ Result<MovingNode> cameraNode(const CameraTrack& track, const GltfLens& lens) {
     GltfTurn before{};
     for (std::size_t frame = 0; frame < track.keys.size(); ++frame) {
         GltfPose pose = cameraPose(track, lens, track.keys[frame]);
-        if (!areUsable(lens) || !std::all_of(pose.place.begin(), pose.place.end(), fits))
+        if (!std::all_of(pose.place.begin(), pose.place.end(), fits))
             return tooFarAway(static_cast<int>(frame));
         before = pose.turn = continued(pose.turn, before);
         MovingNode::append(pose.place, node.places);
         MovingNode::append(pose.turn, node.turns);
     }
+    if (!areUsable(lens))
+        return tooFarAway(0);
     return node;
 }
 

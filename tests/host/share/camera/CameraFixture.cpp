@@ -39,8 +39,8 @@ void CameraFixture::runAll(std::initializer_list<const wchar_t*> lines) {
 void CameraFixture::makeCurve(const std::string& name, const std::string& points, bool replaces) {
     const std::filesystem::path file = folder / (name + ".txt");
     writeFile(file, points);
-    const std::string line = std::string("_-ImportCurve ") + (replaces ? "[Replace] " : "") + "\"" +
-                             name + "\" \"" + file.native() + "\"";
+    const std::string line = std::string("_-ImportCurve ") + (replaces ? "[Replace] " : "[Name] ") +
+                             "\"" + name + "\" \"" + file.native() + "\"";
     ASSERT_EQ(run(KM_wString::FromUtf8(line)), CQuarnCommand::success) << said();
 }
 

@@ -1,4 +1,5 @@
 #include "host/share/Base64Text.h"
+#include "import/ImportedModel.h"
 #include "tests/host/share/camera/CameraFixture.h"
 
 #include <chrono>
