@@ -66,7 +66,8 @@ TEST_F(CameraExport, TellsMistakesInOneLine) {
         {{"--out", "camera.fbx"}, "Give a file that ends in .glb, .gltf, .json or .csv."},
         {{"--out", "nowhere/camera.glb"}, "nowhere"},
         {{"--out", "model.glb"}, "model.glb is not replaced"},
-        {{"--out", "camera.glb", "--fps", "0"}, "--fps must be a whole number from 1 to 1000"}};
+        {{"--out", "camera.glb", "--fps", "0"},
+         "--fps must be a whole number of frames a second from 1 to 1000"}};
     for (const auto& [options, reason] : mistakes) {
         const Ended ended = camera(options);
         EXPECT_NE(ended.exit_code, 0) << reason;

@@ -36,7 +36,7 @@ TEST(StartAngle, IsThatOfTheFirstFrameInBothDirections) {
     for (const char* direction : {"clockwise", "anticlockwise"})
         for (const int frames : {1, 2, 3, 4, 5, 7}) {
             const Studio studio;
-            const double angle = 30.0 - 65.0 * frames;
+            const double angle = 30.0 - 50.0 * frames;
             record(studio, frames,
                    {"--start-angle", std::to_string(angle), "--direction", direction});
             EXPECT_NEAR(apart_deg(azimuth_deg(camera(studio, 0)), angle), 0.0, 1e-9)
