@@ -256,7 +256,7 @@ TEST_F(RecordCommand, RenderThatIsCancelledStopsWithAPageOfNoFrames) {
     record().SetRenderFull(true);
     front_end.setKeyDown(VK_ESCAPE, true);
     ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
-    EXPECT_THAT(files(), ElementsAre("Walk.frames.json", "Walk.html", "Walk.recording"));
+    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk.recording"));
     EXPECT_THAT(readFile(frames / "Walk.html"), HasSubstr("var ImageCount = 0;"));
     EXPECT_THAT(images(), IsEmpty());
     EXPECT_EQ(0, record().CurrentFrame());
