@@ -328,7 +328,6 @@ TEST(SunStudyArguments, ThatMustBeThereAreNamed) {
     expectRefusal(
         run({"season", "town.obj", "--out", "out", "--place", "Athens", "--to", "2026-01-01"}),
         {"--from"});
-    expectRefusal(run({"day", "town.obj", "--place", "Athens", "--date", "2026-06-21"}), {"--out"});
 }
 
 // ---- Help and places
