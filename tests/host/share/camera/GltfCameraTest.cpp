@@ -190,9 +190,10 @@ TEST_F(GltfCamera, HasAKeyAtTheTimeOfEachFrame) {
 }
 
 TEST_F(GltfCamera, SeesTheWholeModelBetweenItsPlanes) {
-    for (const wchar_t* const projection :
-         {L"Camera Parallel=No _Enter", L"Camera Parallel=Yes _Enter"}) {
-        runAll({projection, L"Camera Location 3,0,1 Target 0,0,1 _Enter", TURN});
+    for (const wchar_t* const line :
+         {L"Camera Parallel=No Location 3,0,1 Target 0,0,1 _Enter",
+          L"Camera Parallel=Yes Location 0.5,0,1 _Enter"}) { // within the model
+        runAll({line, TURN});
         const Json gltf = exportedGltf();
         const Json& camera = gltf["cameras"][0];
         const Json& planes = camera[camera["type"].get<std::string>()];
