@@ -22,10 +22,11 @@ std::string whyNotEncodable(const ImageView& image) {
                                            : "the picture's pixels do not fit its size";
 }
 
-Result<void> appendFile(const ImageView& image, ImageFormat format, std::vector<std::byte>& bytes) {
+Result<void> appendFile(const ImageView& image, ImageFormat format, int jpeg_quality,
+                        std::vector<std::byte>& bytes) {
     switch (format) {
     case ImageFormat::jpeg:
-        return encodeJpeg(image, bytes);
+        return encodeJpeg(image, jpeg_quality, bytes);
     case ImageFormat::png:
         return encodePng(image, bytes);
     case ImageFormat::bmp:
@@ -53,25 +54,26 @@ std::optional<ImageFormat> imageFormatFor(std::string_view extension) {
     return found == formats.end() ? std::nullopt : std::optional(found->second);
 }
 
-Result<std::vector<std::byte>> encodeImage(const ImageView& image, ImageFormat format) {
+Result<std::vector<std::byte>> encodeImage(const ImageView& image, ImageFormat format,
+                                           int jpeg_quality) {
     if (std::string why = whyNotEncodable(image); !why.empty()) {
         return Error{std::move(why)};
     }
     std::vector<std::byte> bytes;
-    if (const Result<void> encoded = appendFile(image, format, bytes); !encoded) {
+    if (const Result<void> encoded = appendFile(image, format, jpeg_quality, bytes); !encoded) {
         return encoded.error();
     }
     return bytes;
 }
 
 Result<void> writeImageFile(const std::filesystem::path& path, const ImageView& image,
-                            Protection protection) {
+                            Protection protection, int jpeg_quality) {
     const auto format = imageFormatFor(path.extension().string());
     if (!format) {
         return Error{"Cannot write '" + path.string() + "': pictures of the kind '" +
                      path.extension().string() + "' are not known. Choose jpg, png, bmp or tga."};
     }
-    const auto encoded = encodeImage(image, *format);
+    const auto encoded = encodeImage(image, *format, jpeg_quality);
     if (!encoded) {
         return Error{"Cannot write '" + path.string() + "': " + encoded.message() + "."};
     }

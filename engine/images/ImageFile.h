@@ -32,19 +32,25 @@ struct ImageView {
     ImageView(const Image& image) : ImageView(image.width, image.height, image.rgba) {}
 };
 
+/// The quality of JPEG pictures, from 1 to 100, where nobody chooses another one.
+inline constexpr int STANDARD_JPEG_QUALITY = 90;
+
 /// Turns a picture into the bytes of an image file. All formats are written with 24 bits a pixel;
-/// opacity is left out. JPEG has quality 90 and full colour resolution. BMP and TGA are not
-/// compressed.
+/// opacity is left out. JPEG has full colour resolution. BMP and TGA are not compressed.
+/// @param jpeg_quality  1 to 100; of no account to the other formats
 /// @return why the picture cannot be encoded, a part of a sentence: it is empty, its size and its
 ///   pixels disagree, or a side is longer than the format allows (65500 for JPEG, 65535 for TGA)
-Result<std::vector<std::byte>> encodeImage(const ImageView& image, ImageFormat format);
+Result<std::vector<std::byte>> encodeImage(const ImageView& image, ImageFormat format,
+                                           int jpeg_quality = STANDARD_JPEG_QUALITY);
 
 /// Encodes and writes a picture in the format of the path's extension. The file appears whole or
 /// not at all, and replaces one of the same name.
-/// @param protection  whether a file that is protected from writing is left alone
+/// @param protection    whether a file that is protected from writing is left alone
+/// @param jpeg_quality  as encodeImage has it
 /// @return an error that names the file: unknown extension, the picture cannot be encoded, the
 ///   folder is missing, no permission, write-protected, the disk is full
 Result<void> writeImageFile(const std::filesystem::path& path, const ImageView& image,
-                            Protection protection = Protection::respected);
+                            Protection protection = Protection::respected,
+                            int jpeg_quality = STANDARD_JPEG_QUALITY);
 
 } // namespace quarn

@@ -6,7 +6,6 @@
 namespace quarn {
 namespace {
 
-constexpr int quality = 90;
 constexpr int longest_side = 65500;
 constexpr std::uint64_t most_pixels = 500'000'000; // the buffer's size is an int
 
@@ -19,7 +18,7 @@ struct FreeBuffer {
 
 } // namespace
 
-Result<void> encodeJpeg(const ImageView& image, std::vector<std::byte>& bytes) {
+Result<void> encodeJpeg(const ImageView& image, int quality, std::vector<std::byte>& bytes) {
     if (image.width > longest_side || image.height > longest_side) {
         return Error{"a JPEG picture has at most 65500 pixels a side"};
     }

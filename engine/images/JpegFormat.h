@@ -8,8 +8,9 @@
 
 namespace quarn {
 
-/// Appends a JPEG file of the picture to `bytes`: quality 90, 4:4:4.
+/// Appends a JPEG file of the picture to `bytes`: 4:4:4.
+/// @param quality  1 to 100
 /// @return why it cannot be made, a part of a sentence
-Result<void> encodeJpeg(const ImageView& image, std::vector<std::byte>& bytes);
+Result<void> encodeJpeg(const ImageView& image, int quality, std::vector<std::byte>& bytes);
 
 } // namespace quarn

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "engine/images/ImageFile.h"
 #include "ground/AtomicFile.h"
 #include "host/app/CommandRegistry.h"
 #include "host/app/CommandRunner.h"
@@ -65,6 +66,9 @@ public:
     Protection protection() const {
         return m_options.overwrites ? Protection::overridden : Protection::respected;
     }
+    /// Of the pictures that are written, 1 to 100.
+    int jpegQuality() const { return m_jpeg_quality; }
+    void setJpegQuality(int quality) { m_jpeg_quality = quality; }
     /// To be called after a picture was written to a file: counts it for the command that runs, and
     /// tells the front end. Without a running command nothing happens.
     /// @param picture  what the file holds
@@ -108,6 +112,7 @@ private:
     std::map<HWND, std::unique_ptr<CWnd>> m_windows;
     const CDialog* m_open_dialog = nullptr;
     bool m_exit_requested = false;
+    int m_jpeg_quality = STANDARD_JPEG_QUALITY;
     WithheldText* m_withheld_text = nullptr; ///< null while text is shown at once
 };
 

@@ -1,6 +1,9 @@
 #include "host/app/ManifestMaker.h"
 
+#include "engine/images/ImageFile.h"
+#include "engine/scene/UnitLength.h"
 #include "ground/Checksum.h"
+#include "host/app/Application.h"
 #include "host/app/StudyMoments.h"
 #include "host/document/Document.h"
 #include "host/document/DocumentDrawing.h"
@@ -12,26 +15,6 @@
 namespace quarn {
 
 namespace {
-
-double metresPer(UnitSystem units) {
-    switch (units) {
-    case UnitSystem::none:
-        break;
-    case UnitSystem::millimeters:
-        return 0.001;
-    case UnitSystem::centimeters:
-        return 0.01;
-    case UnitSystem::meters:
-        return 1.0;
-    case UnitSystem::kilometers:
-        return 1000.0;
-    case UnitSystem::inches:
-        return 0.0254;
-    case UnitSystem::feet:
-        return 0.3048;
-    }
-    return 0.0;
-}
 
 void addPoints(const KM_3dPointArray& points, Checksum& sum) {
     sum.add(points.Count());
@@ -63,7 +46,7 @@ ManifestMaker::ManifestMaker(const KM_3dmAnimationProperties& record, const std:
     m_manifest.mode = settings.mode;
     m_manifest.extension = settings.extension;
     m_manifest.frame_rate = standardFrameRate(settings.frames);
-    m_manifest.metres_per_unit = metresPer(document.units());
+    m_manifest.metres_per_unit = metresPerUnit(document.units());
 }
 
 void ManifestMaker::frameRecorded(const RecordedFrame& frame) {
@@ -113,6 +96,9 @@ std::string ManifestMaker::settingsFingerprint() const {
     sum.add(m_settings.height_px);
     sum.addText(m_settings.mode);
     sum.addText(m_settings.extension);
+    sum.add(imageFormatFor(m_settings.extension) == ImageFormat::jpeg
+                ? Application::current()->jpegQuality()
+                : 0);
     const RenderSettings& render = m_document.renderWindow().settings;
     sum.add(m_record.RenderFull() ? render.samples : 0);
     sum.add(m_record.RenderPreview() ? render.preview_samples : 0);

@@ -31,7 +31,8 @@ bool CQuarnDib::WriteToFile(const wchar_t* path, int) const {
     const std::filesystem::path file = quarn::pathFromText(path);
     if (!application->mayWrite(file))
         return false;
-    const auto written = quarn::writeImageFile(file, *m_image, application->protection());
+    const auto written = quarn::writeImageFile(file, *m_image, application->protection(),
+                                               application->jpegQuality());
     if (written)
         application->pictureWritten(file, *m_image);
     else

@@ -27,6 +27,8 @@ const wchar_t* titleFor(FileUse use) {
         return QnLocalizeString(L"Save the frame as a picture", 42504);
     case FileUse::save_rendering:
         return QnLocalizeString(L"Save the rendered picture", 42505);
+    case FileUse::export_camera:
+        return QnLocalizeString(L"Export the camera", 42823);
     case FileUse::import_curve:
         return QnLocalizeString(L"Import a curve", 42506);
     case FileUse::load_plug_in:
@@ -68,6 +70,14 @@ std::vector<FileKind> pictures() {
             {QnLocalizeString(L"TGA pictures", 42516), {"tga"}}};
 }
 
+/// What the camera of an animation is written to.
+std::vector<FileKind> cameras() {
+    return {{QnLocalizeString(L"glTF in one binary file", 42824), {"glb"}},
+            {QnLocalizeString(L"glTF files", 42825), {"gltf"}},
+            {QnLocalizeString(L"JSON files", 42826), {"json"}},
+            {QnLocalizeString(L"CSV tables", 42827), {"csv"}}};
+}
+
 std::vector<FileKind> kindsFor(FileUse use) {
     switch (use) {
     case FileUse::open:
@@ -79,6 +89,8 @@ std::vector<FileKind> kindsFor(FileUse use) {
     case FileUse::save_frame:
     case FileUse::save_rendering:
         return pictures();
+    case FileUse::export_camera:
+        return cameras();
     case FileUse::import_curve:
         return {{QnLocalizeString(L"Curve files", 42517), {"txt", "csv", "json"}}, allFiles()};
     case FileUse::load_plug_in:
@@ -91,7 +103,7 @@ std::vector<FileKind> kindsFor(FileUse use) {
 
 bool isSaving(FileUse use) {
     return use == FileUse::save || use == FileUse::save_selected || use == FileUse::save_frame ||
-           use == FileUse::save_rendering;
+           use == FileUse::save_rendering || use == FileUse::export_camera;
 }
 
 /// The folder of the document at work, else that of the user's documents.

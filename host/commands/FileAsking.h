@@ -19,6 +19,7 @@ enum class FileUse {
     save_selected,
     save_frame,
     save_rendering,
+    export_camera,
     import_curve,
     load_plug_in,
     run,

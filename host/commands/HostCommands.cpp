@@ -39,6 +39,8 @@ constexpr HostCommandEntry HOST_COMMANDS[] = {
      L"Reads a model or another document into the document", 41009, runImport},
     {L"ImportCurve", "7A48BEC8-A695-4487-A64E-0463A94E52AC",
      L"Reads a curve from a text or JSON file", 41048, runImportCurve},
+    {L"JpegQuality", "7D2E64B1-0C93-4F58-A6E7-35B90F1D8C42",
+     L"Chooses how finely JPEG pictures are written", 42840, runJpegQuality},
     {L"Line", "A51B85E0-73EB-45AA-A30D-4CEC8157A1C9", L"Draws a straight line", 41040, runLine},
     {L"List", "14B4E821-C616-4A94-AC34-7E077FFC06C6",
      L"Lists the objects, views and lights of the document", 41010, runList},

@@ -44,6 +44,7 @@ CQuarnCommand::result runFitView(const CQuarnCommandContext& context);
 CQuarnCommand::result runHide(const CQuarnCommandContext& context);
 CQuarnCommand::result runImport(const CQuarnCommandContext& context);
 CQuarnCommand::result runImportCurve(const CQuarnCommandContext& context);
+CQuarnCommand::result runJpegQuality(const CQuarnCommandContext& context);
 CQuarnCommand::result runLine(const CQuarnCommandContext& context);
 CQuarnCommand::result runList(const CQuarnCommandContext& context);
 CQuarnCommand::result runMovePoint(const CQuarnCommandContext& context);

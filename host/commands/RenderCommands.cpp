@@ -74,7 +74,8 @@ CQuarnCommand::result runSaveRenderWindowAs(const CQuarnCommandContext& context)
         document.list().noteUnsavedPicture("The picture was not written.");
         return CQuarnCommand::failure;
     }
-    const auto written = writeImageFile(file, window.picture, application.protection());
+    const auto written =
+        writeImageFile(file, window.picture, application.protection(), application.jpegQuality());
     document.list().noteUnsavedPicture(written ? std::string() : written.message());
     if (!written)
         return fail(written.message());

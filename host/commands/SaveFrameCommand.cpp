@@ -7,6 +7,7 @@
 #include "host/commands/FileAsking.h"
 #include "host/commands/HostCommands.h"
 #include "host/commands/PictureSizePrompt.h"
+#include "host/commands/StoredAnimation.h"
 #include "host/commands/WatchedRendering.h"
 #include "host/document/DisplayModeList.h"
 #include "host/document/Document.h"
@@ -14,18 +15,10 @@
 #include "host/document/SceneChanges.h"
 #include "sdk/qncore/QnDib.h"
 #include "sdk/qncore/QnGet.h"
-#include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
 namespace quarn {
 
 namespace {
-
-/// The animation that the frame belongs to. The record is not copied: its point lists may be long.
-struct Animation {
-    IQnZoetrixDynamicAccess* access = nullptr;
-    const KM_3dmAnimationProperties* record = nullptr; ///< valid while the command runs
-    ViewState* view = nullptr;
-};
 
 /// What the person wants to have written.
 struct FrameWish {
@@ -40,37 +33,6 @@ struct FrameScene {
     KM_Viewport viewport;
     SceneChanges changes;
 };
-
-Result<ViewState*> viewOf(const KM_3dmAnimationProperties& record, const Document& document) {
-    KM_wString name = record.ViewportName();
-    name.TrimLeftAndRight();
-    if (name.IsEmpty())
-        return Error{"The animation names no view. Set it up again."};
-    ViewState* view = document.findView(name.View());
-    if (!view)
-        return Error{"The animation was made for the view \"" + name.ToUtf8() +
-                     "\", which the document does not have. Set the animation up again."};
-    return view;
-}
-
-Result<Animation> storedAnimation(Document& document) {
-    Animation animation;
-    animation.access = Zoetrix_QuarnDynamicAccess();
-    if (!animation.access)
-        return Error{"No plug-in keeps an animation. Load one with LoadPlugIn first."};
-    const auto record =
-        acrossBorder([&] { return &animation.access->AnimationProperties(document.face()); });
-    if (!record)
-        return Error{"The animation cannot be read: " + record.message()};
-    animation.record = record.value();
-    if (!animation.record->IsPlayable())
-        return Error{"The document has no animation. Set one up, or open a document that has one."};
-    const auto view = viewOf(*animation.record, document);
-    if (!view)
-        return Error{view.message()};
-    animation.view = view.value();
-    return animation;
-}
 
 /// @param wish  receives frame and size; holds the size to begin with
 CQuarnCommand::result askFrame(const KM_3dmAnimationProperties& record, FrameWish& wish) {
@@ -117,21 +79,16 @@ CQuarnCommand::result askImageFile(const CQuarnCommandContext& context, FrameWis
     return checked ? CQuarnCommand::success : fail(checked.message());
 }
 
-bool isRendered(const KM_3dmAnimationProperties& record) {
-    return record.RenderFull() || record.RenderPreview();
-}
-
-CQuarnCommand::result askWish(const CQuarnCommandContext& context, const Animation& animation,
+CQuarnCommand::result askWish(const CQuarnCommandContext& context, const StoredAnimation& animation,
                               FrameWish& wish) {
-    const RenderSettings& settings = animation.view->document().renderWindow().settings;
-    const bool rendered = isRendered(*animation.record);
-    wish.width_px = rendered ? settings.width_px : animation.view->frameWidth();
-    wish.height_px = rendered ? settings.height_px : animation.view->frameHeight();
+    const PictureSize size = animation.pictureSize();
+    wish.width_px = size.width_px;
+    wish.height_px = size.height_px;
     const CQuarnCommand::result asked = askFrame(*animation.record, wish);
     return asked == CQuarnCommand::success ? askImageFile(context, wish) : asked;
 }
 
-Result<FrameScene> sunAtFrame(const Animation& animation, int frame) {
+Result<FrameScene> sunAtFrame(const StoredAnimation& animation, int frame) {
     FrameScene scene;
     scene.viewport = animation.view->viewport();
     SceneChanges::Sun sun;
@@ -147,7 +104,7 @@ Result<FrameScene> sunAtFrame(const Animation& animation, int frame) {
     return scene;
 }
 
-Result<FrameScene> cameraAtFrame(const Animation& animation, int frame) {
+Result<FrameScene> cameraAtFrame(const StoredAnimation& animation, int frame) {
     FrameScene scene;
     const auto found = acrossBorder([&] {
         return animation.access->AnimatedViewAtFrame(animation.view->document().face(),
@@ -172,7 +129,7 @@ void fitToPicture(KM_Viewport& viewport, const ViewState& view, const FrameWish&
 
 /// What the animation is recorded with; the view's own mode where the record's is none of the
 /// host's; null when there is neither.
-const CDisplayPipelineAttributes* recordedMode(const Animation& animation) {
+const CDisplayPipelineAttributes* recordedMode(const StoredAnimation& animation) {
     const KM_UUID id = animation.record->IsSunStudy() ? rendered_mode_id
                        : KM_UuidIsNil(animation.record->DisplayMode())
                            ? wireframe_mode_id
@@ -181,7 +138,7 @@ const CDisplayPipelineAttributes* recordedMode(const Animation& animation) {
     return mode ? mode : animation.view->currentAttributes();
 }
 
-CQuarnCommand::result drawFrame(const Animation& animation, const FrameWish& wish,
+CQuarnCommand::result drawFrame(const StoredAnimation& animation, const FrameWish& wish,
                                 const FrameScene& scene, Image& picture) {
     const CDisplayPipelineAttributes* mode = recordedMode(animation);
     if (!mode)
@@ -194,7 +151,7 @@ CQuarnCommand::result drawFrame(const Animation& animation, const FrameWish& wis
     return drawn ? CQuarnCommand::success : fail(drawn.message());
 }
 
-CQuarnCommand::result renderFrame(const Animation& animation, const FrameWish& wish,
+CQuarnCommand::result renderFrame(const StoredAnimation& animation, const FrameWish& wish,
                                   const FrameScene& scene, Image& picture) {
     Document& document = animation.view->document();
     const RenderSettings& settings = document.renderWindow().settings;
@@ -207,7 +164,7 @@ CQuarnCommand::result renderFrame(const Animation& animation, const FrameWish& w
     return end.value() == RenderEnd::done ? CQuarnCommand::success : CQuarnCommand::cancel;
 }
 
-CQuarnCommand::result saveFrame(const Animation& animation, const FrameWish& wish) {
+CQuarnCommand::result saveFrame(const StoredAnimation& animation, const FrameWish& wish) {
     auto scene = animation.record->IsSunStudy() ? sunAtFrame(animation, wish.frame)
                                                 : cameraAtFrame(animation, wish.frame);
     if (!scene)
@@ -215,8 +172,8 @@ CQuarnCommand::result saveFrame(const Animation& animation, const FrameWish& wis
     fitToPicture(scene.value().viewport, *animation.view, wish);
     CQuarnDib picture;
     const CQuarnCommand::result made =
-        isRendered(*animation.record) ? renderFrame(animation, wish, scene.value(), picture.Image())
-                                      : drawFrame(animation, wish, scene.value(), picture.Image());
+        animation.isRendered() ? renderFrame(animation, wish, scene.value(), picture.Image())
+                               : drawFrame(animation, wish, scene.value(), picture.Image());
     if (made != CQuarnCommand::success)
         return made;
     animation.view->tellCameraOutOfRange();

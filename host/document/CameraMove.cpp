@@ -39,4 +39,13 @@ bool moveCamera(KM_Viewport& viewport, const KM_3dPoint& target, const KM_3dPoin
     return true;
 }
 
+bool setTargetAndCamera(KM_Viewport& viewport, const KM_3dPoint& target, const KM_3dPoint& camera,
+                        bool update_target, bool update_up) {
+    if (!moveCamera(viewport, target, camera, update_up))
+        return false;
+    if (update_target)
+        viewport.SetTargetPoint(target);
+    return true;
+}
+
 } // namespace quarn

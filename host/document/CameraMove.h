@@ -12,4 +12,8 @@ namespace quarn {
 bool moveCamera(KM_Viewport& viewport, const KM_3dPoint& target, const KM_3dPoint& camera,
                 bool level_horizon);
 
+/// As CQuarnViewport::SetTargetAndCameraLocation, for a camera that no view has.
+bool setTargetAndCamera(KM_Viewport& viewport, const KM_3dPoint& target, const KM_3dPoint& camera,
+                        bool update_target, bool update_up);
+
 } // namespace quarn

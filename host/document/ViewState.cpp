@@ -61,13 +61,7 @@ KM_Viewport ViewState::frameCamera() const {
 
 bool ViewState::setTargetAndCamera(const KM_3dPoint& target, const KM_3dPoint& camera,
                                    bool update_target, bool update_up) {
-    KM_Viewport moved = m_viewport;
-    if (!moveCamera(moved, target, camera, update_up))
-        return false;
-    if (update_target)
-        moved.SetTargetPoint(target);
-    m_viewport = moved;
-    return true;
+    return quarn::setTargetAndCamera(m_viewport, target, camera, update_target, update_up);
 }
 
 bool ViewState::setDisplayMode(const KM_UUID& id) {

@@ -11,6 +11,22 @@ std::optional<std::string> whyRecordingIsRefused(const RecordingTarget& target) 
     return checked ? std::nullopt : std::optional(checked.message());
 }
 
+bool isFolderForRecordings(const std::filesystem::path& folder) {
+    namespace fs = std::filesystem;
+    std::error_code error;
+    if (!fs::exists(folder, error))
+        return !error;
+    bool is_empty = true;
+    for (fs::directory_iterator at(folder, error), end; !error && at != end; at.increment(error)) {
+        is_empty = false;
+        if (at->path().extension() != ".recording")
+            continue;
+        if (const auto recording = readRecordingFile(at->path()); recording && recording.value())
+            return true;
+    }
+    return is_empty && !error;
+}
+
 std::optional<std::string> whyTooManyFrames(int frames) {
     const std::optional<KM_wString> why = framesBeyondMemory(frames);
     return why ? std::optional(why->ToUtf8() + ".") : std::nullopt;

@@ -23,6 +23,10 @@ struct RecordingTarget {
 ///         do; nothing when it may
 QNCORE_API std::optional<std::string> whyRecordingIsRefused(const RecordingTarget& target);
 
+/// Whether a folder that nobody asked for may be recorded into: it is not there, nothing is in it,
+/// or recordings have been made into it before.
+QNCORE_API bool isFolderForRecordings(const std::filesystem::path& folder);
+
 /// Looks whether an animation of so many frames fits into the memory that is free.
 /// @return what it would take and what is free, in a sentence of the user's language; nothing when
 ///         it fits

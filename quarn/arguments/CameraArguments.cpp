@@ -20,12 +20,8 @@ void addTravelOptions(CLI::App& command, AskedPath& asked) {
     CameraPathRequest& request = asked.request;
     command.add_flag("--even-speed", request.has_even_speed,
                      "Run through the camera's curve at even speed, whatever its parameters");
-    add("--frames", request.recording.frames, "N", wholeNumberFrom(1),
-        "Pictures from the start to the end, from 1")
-        ->required();
-    add("--lens", request.lens_mm, "MM", numberFrom(1, 10000, "millimetres"),
-        "Lens length, as of a camera for 35 mm film (default: 24, which suits a walk; a "
-        "document's own)");
+    addFrames(add, request.recording, "Pictures from the start to the end, from 1");
+    addLens(add, request.lens_mm, "(default: 24, which suits a walk; a document's own)");
     addRecordingOptions(command, request.recording, asked.use);
 }
 
@@ -84,17 +80,19 @@ Action addTurntable(CLI::App& command) {
     TurntableRequest& request = asked->request;
     const OptionAdder add(command);
     addModelAndFolder(add, request.recording);
-    add("--frames", request.recording.frames, "N", wholeNumberFrom(1),
-        "Pictures of one whole turn, from 1")
-        ->required();
+    addFrames(add, request.recording, "Pictures of one whole turn, from 1");
     add("--direction", request.direction, "NAME", oneOf({"clockwise", "anticlockwise"}),
         "Way that the model seems to turn, seen from above, clockwise or anticlockwise; the "
         "camera goes round it the other way",
         "clockwise");
+    add("--start-angle", request.start_angle_deg, "DEG", numberFrom(-360, 360, "degrees"),
+        "Where the camera of the first picture stands, seen from above: anticlockwise from the X "
+        "axis (default: in front and to the right)");
     add("--elevation", request.elevation_deg, "DEG", numberFrom(-89, 89, "degrees"),
         "Angle of the camera above the model, -89 to 89", "22");
     add("--distance", request.distance_factor, "FACTOR", numberFrom(0.01, 1000),
         "Camera distance times this: 0.01 to 1000, below 1 is nearer");
+    addLens(add, request.lens_mm, "(default: 50; a document's own); the model fills the picture");
     add("--target", request.target, "X,Y,Z", point(),
         "Point to turn about (default: the model's middle)");
     addRecordingOptions(command, request.recording, asked->use);

@@ -4,19 +4,19 @@ namespace quarn::program {
 
 inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
 
-  quarn turntable MODEL --frames N --out DIR   record a turntable as pictures and a page
-  quarn flythrough MODEL --path NAME --frames N --out DIR
-                                               record a walk along a curve, looking ahead
-  quarn path MODEL --camera NAME --target NAME --frames N --out DIR
+  quarn turntable MODEL                        record a turntable as pictures and a page
+  quarn flythrough MODEL --path NAME           record a walk along a curve, looking ahead
+  quarn path MODEL --camera NAME --target NAME
                                                record a camera that follows one curve and looks
                                                along another, or at a point
-  quarn day MODEL --place NAME --date DATE --out DIR
+  quarn day MODEL --place NAME --date DATE
                                                record the sun and the shadows through one day
-  quarn season MODEL --place NAME --from DATE --to DATE --out DIR
+  quarn season MODEL --place NAME --from DATE --to DATE
                                                record those of one time of day through the seasons
   quarn places [TEXT]                          list the cities that a sun study knows by name
   quarn curves MODEL                           list what a camera can follow
   quarn frame DOC --number K --out FILE        write one frame of a saved animation
+  quarn camera DOC --out FILE.glb              write its camera for other programs
   quarn run SCRIPT [MODEL]                     run a script of host commands
   quarn console [MODEL]                        type host commands
   quarn info MODEL                             tell what a model file holds
@@ -30,6 +30,7 @@ Examples:
   quarn flythrough house.glb --camera-curve walk.txt --even-speed --frames 240 --out out/walk
   quarn day house.glb --place Athens --date 2026-06-21 --every 10 --out out/sun
   quarn frame house.quarn --number 60 --out middle.png
+  quarn camera house.quarn --out camera.glb
   quarn info house.glb
   quarn run steps.txt house.glb
   quarn console house.glb
@@ -41,12 +42,15 @@ page; a second Ctrl-C ends the program at once.)";
 inline constexpr const char* TURNTABLE_FOOTER = R"(
 The model is framed so that it fills the pictures well during the whole turn. The pictures are
 named NAME000, NAME001, ... and NAME.html plays them in a browser. NAME.recording beside them says
-which files are the recording's: others are not replaced without --overwrite.
+which files are the recording's: others are not replaced without --overwrite. Without --out they
+stand in a folder beside the model that has its name; one that holds files of yours is left alone.
 
 Examples:
+  quarn turntable house.glb
   quarn turntable house.glb --frames 120 --out out/house
   quarn turntable part.stl --frames 36 --out out --mode Shaded --format png --size 640x480
   quarn turntable town.obj --frames 240 --out out --elevation 35 --distance 0.8 --name Town
+  quarn turntable town.obj --start-angle -30 --lens 85 --quality 95 --out out/near
   quarn turntable town.obj --frames 240 --out out --show-script > town.txt)";
 
 inline constexpr const char* FLYTHROUGH_FOOTER = R"(
@@ -135,6 +139,15 @@ takes no direction for it as pointing up.
 Examples:
   quarn frame house.quarn --number 0 --out first.jpg
   quarn frame house.quarn --number 60 --size 3840x2160 --out middle.png)";
+
+inline constexpr const char* CAMERA_FOOTER = R"(
+Each frame of the recording has one key: the camera that it is drawn with. glTF is in metres with Y
+up, and of a sun study it holds the camera that stands still and the sun as a light that turns; JSON
+and CSV are in the model's units with Z up, and hold every digit.
+
+Examples:
+  quarn camera house.quarn --out camera.glb
+  quarn camera house.quarn --out camera.csv --fps 25)";
 
 inline constexpr const char* RUN_FOOTER = R"(
 A script holds one host command a line; the words after a command's name answer its questions.

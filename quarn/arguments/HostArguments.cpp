@@ -5,6 +5,7 @@
 #include "quarn/console/Console.h"
 #include "quarn/reports/CurveReport.h"
 #include "quarn/reports/ModelReport.h"
+#include "quarn/runs/CameraExport.h"
 #include "quarn/runs/ScriptRun.h"
 #include "quarn/runs/SingleFrame.h"
 
@@ -83,6 +84,24 @@ Action addFrame(CLI::App& command) {
     addShowScript(command, asked->use.is_only_shown);
     addCommonOptions(command, asked->use.common);
     return [asked] { return writeSingleFrame(asked->request, asked->use); };
+}
+
+Action addCamera(CLI::App& command) {
+    const auto asked = std::make_shared<Asked<CameraExportRequest>>();
+    CameraExportRequest& request = asked->request;
+    const OptionAdder add(command);
+    add("DOC", request.document, "", savedDocument(), "The document, a .quarn file")->required();
+    add("--out", request.file, "FILE", scriptWord("the path of --out"),
+        "The camera: .glb, .gltf, .json or .csv")
+        ->required();
+    add("--fps", request.frame_rate, "N", wholeNumberFrom(1, 1000, "frames a second"),
+        "Frames a second, 1 to 1000 (default: the largest of 10, 12, 15, 20, 24, 25 and 30 that "
+        "lets the animation last 4 seconds)");
+    command.add_flag("--overwrite", asked->use.common.overwrites,
+                     "Replace a file that is no camera, and a protected one");
+    addShowScript(command, asked->use.is_only_shown);
+    addCommonOptions(command, asked->use.common);
+    return [asked] { return exportCamera(asked->request, asked->use); };
 }
 
 Action addRun(CLI::App& command) {

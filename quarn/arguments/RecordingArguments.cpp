@@ -84,14 +84,22 @@ void addModelAndFolder(const OptionAdder& add, RecordingRequest& request) {
         "The model file: OBJ, glTF, GLB, PLY, STL, ...; or a document")
         ->required();
     add("--out", request.folder, "DIR", scriptWord("the path of --out"),
-        "Folder for the pictures and the page")
-        ->required();
+        "Folder for the pictures and the page (default: one beside the model, with its name)");
     add("--up", request.up_axis, "AXIS", oneOf({"y", "z"}),
         "Axis that points up in the file, y or z (default: y for glTF and such, z for OBJ, PLY, "
         "STL)");
     add("--tolerance", request.tolerance, "LENGTH", numberFrom(1e-9, 1e9),
         "How far meshes may lie beside the curved surfaces of STEP, IGES and BREP, in their units "
         "(default: a thousandth of the model's size)");
+}
+
+void addFrames(const OptionAdder& add, RecordingRequest& request, const std::string& description) {
+    add("--frames", request.frames, "N", wholeNumberFrom(1), description, "72");
+}
+
+void addLens(const OptionAdder& add, std::optional<double>& lens_mm, const std::string& rest) {
+    add("--lens", lens_mm, "MM", numberFrom(1, 10000, "millimetres"),
+        "Lens length, as of a camera for 35 mm film " + rest);
 }
 
 void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse& use,
@@ -105,6 +113,8 @@ void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse
         "64 and 8, or the document's own)");
     add("--format", request.format, "NAME", oneOf({"jpg", "png", "bmp", "tga"}),
         "jpg, png, bmp or tga", "jpg");
+    add("--quality", request.quality, "N", wholeNumberFrom(1, 100),
+        "Of jpg, 1 to 100: larger files look better (default: 90)");
     addHidden(command, request.hidden);
     add("--name", request.name, "NAME", animationName(),
         "Name of the animation (default: the model file's)");
@@ -124,6 +134,12 @@ std::optional<std::string> settle(RecordingRequest& request) {
         return "--samples is for rendered pictures: with it --mode must be RenderFull or "
                "RenderPreview, not \"" +
                request.mode.name + "\".";
+    if (request.quality && request.format != "jpg")
+        return "--quality is for jpg pictures, not for " + request.format + ".";
+    if (request.folder.empty()) {
+        request.folder = request.model.parent_path() / request.model.stem();
+        request.has_own_folder = true;
+    }
     if (request.name.empty())
         request.name = animationNameFor(request.model);
     return std::nullopt;

@@ -23,6 +23,11 @@ void addOverwrite(CLI::App& command, CommonOptions& common);
 /// What goes in and out, which a person looks for first.
 void addModelAndFolder(const OptionAdder& add, RecordingRequest& request);
 
+/// How many pictures a camera takes on its way.
+void addFrames(const OptionAdder& add, RecordingRequest& request, const std::string& description);
+/// @param rest  of the description: what is taken where nobody chooses
+void addLens(const OptionAdder& add, std::optional<double>& lens_mm, const std::string& rest);
+
 /// The rest of what every recording takes.
 void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse& use,
                          CaptureSubject subject = CaptureSubject::moving_camera);

@@ -63,6 +63,7 @@ void addViewOptions(const OptionAdder& add, StudyView& view) {
         "Point to look at (default: the model's middle)");
     add("--distance", view.distance_factor, "FACTOR", numberFrom(0.01, 1000),
         "Distance of the camera, 1 where the model just fits into the picture (default: 1.1)");
+    addLens(add, view.lens_mm, "(default: 50; a document's own)");
 }
 
 /// Takes the place that the model's file states.
@@ -119,6 +120,8 @@ Outcome recordStudy(TypedStudy& typed) {
         mistake = settleSite(typed, request.site);
     if (!mistake && request.view.name && request.view.aims())
         mistake = "--view takes the place of --azimuth, --elevation and --target.";
+    if (!mistake && request.view.lens_mm && request.view.isParallel())
+        mistake = "--lens is for perspective views; --view " + *request.view.name + " has none.";
     if (!mistake)
         mistake =
             settleSpan(request, std::int64_t{request.step} * (is_one_day ? 1 : MINUTES_OF_DAY));

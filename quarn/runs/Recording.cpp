@@ -58,6 +58,10 @@ private:
 std::optional<Outcome> refuse(const RecordingRequest& request, bool overwrites) {
     if (const auto refusal = whyTooManyFrames(request.frames))
         return Outcome::failure(*refusal);
+    if (request.has_own_folder && !isFolderForRecordings(request.folder))
+        return Outcome::failure(request.folder.native() +
+                                " is there already, and nothing was recorded into it; choose the "
+                                "folder for the pictures with --out.");
     const RecordingTarget target{request.folder, request.name, request.format, request.frames,
                                  overwrites};
     if (const auto refusal = whyRecordingIsRefused(target))

@@ -1,5 +1,7 @@
 #include "quarn/scripts/CameraPathScript.h"
 
+#include "quarn/scripts/CameraToFit.h"
+
 namespace quarn::program {
 
 namespace {
@@ -26,8 +28,8 @@ void addMaking(const Followed& followed, const std::string& role, std::vector<st
 }
 
 std::string lens(const CameraPathRequest& request) {
-    const std::string lens = request.lens_mm ? " _Lens " + numberText(*request.lens_mm) : "";
-    return "_-Camera _Parallel=No" + lens + " _Enter";
+    return "_-Camera" + (request.lens_mm ? lensAnswer(*request.lens_mm) : " _Parallel=No") +
+           " _Enter";
 }
 
 std::string setUp(const CameraPathRequest& request) {

@@ -25,9 +25,14 @@ Triple cameraLocation(const Triple& target, double azimuth_deg, double elevation
 
 } // namespace
 
-std::string cameraToBeFitted(const Triple& target, double azimuth_deg, double elevation_deg) {
+std::string cameraToBeFitted(const Triple& target, double azimuth_deg, double elevation_deg,
+                             const std::optional<double>& lens_mm) {
     return "_-Camera _Location " + tripleText(cameraLocation(target, azimuth_deg, elevation_deg)) +
-           " _Target " + tripleText(target) + " _Enter";
+           " _Target " + tripleText(target) + (lens_mm ? lensAnswer(*lens_mm) : "") + " _Enter";
+}
+
+std::string lensAnswer(double lens_mm) {
+    return " _Parallel=No _Lens " + numberText(lens_mm);
 }
 
 } // namespace quarn::program

@@ -4,6 +4,7 @@
 #include "quarn/words/Words.h"
 
 #include <filesystem>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -15,12 +16,14 @@ struct RecordingRequest {
     std::string up_axis;    ///< "y", "z" or, by the format, empty
     double tolerance = 0.0; ///< of curved surfaces, in model units; 0: by the model's size
     std::filesystem::path folder;
-    std::string name; ///< of the animation, its pictures and its page; UTF-8
+    bool has_own_folder = false; ///< nobody named the folder: it is the one beside the model
+    std::string name;            ///< of the animation, its pictures and its page; UTF-8
     int frames = 0;
     PixelSize size{};
     CaptureMode mode;
-    int samples = 0;    ///< of each pixel, by the render method; 0: as the document has it
-    std::string format; ///< "jpg", "png", "bmp" or "tga"
+    int samples = 0;            ///< of each pixel, by the render method; 0: as the document has it
+    std::string format;         ///< "jpg", "png", "bmp" or "tga"
+    std::optional<int> quality; ///< of jpg; 1 to 100; nothing: the host's
     std::vector<std::string> hidden; ///< names of objects; UTF-8
     std::filesystem::path document;  ///< to save, a .quarn file; empty: none
 };

@@ -29,6 +29,8 @@ RecordingScript composeRecording(const RecordingRequest& request, const Animatio
     set_up.push_back(lines.setting_up);
     if (request.mode.is_rendered)
         set_up.push_back("_-RenderSettings _Size " + size + samplesAnswer(request) + " _Enter");
+    if (request.quality)
+        set_up.push_back("_-JpegQuality " + std::to_string(*request.quality));
     if (!request.document.empty())
         script.saving = "_-SaveAs " + quotedPath(request.document);
     script.recording = "_-RecordAnimation _TargetFolder " + quotedPath(request.folder) + " _Enter";

@@ -26,25 +26,45 @@ std::string fitView(const StudyView& view) {
            numberText(view.distance_factor.value_or(DISTANCE_FACTOR)) + " _Enter";
 }
 
-/// A camera of the model is taken as it is, unless it is to be fitted.
+std::string lens(const StudyView& view) {
+    return "_-Camera" + lensAnswer(*view.lens_mm) + " _Enter";
+}
+
+/// A camera of the model is taken where it is, unless it is to be fitted.
 std::vector<std::string> namedView(const StudyView& view) {
     std::vector<std::string> lines = {"_-StandardView \"" + *view.name + "\""};
+    if (view.lens_mm)
+        lines.push_back(lens(view));
     if (isStandardView(*view.name) || view.distance_factor)
+        lines.push_back(fitView(view));
+    return lines;
+}
+
+/// The camera of a document, but for what was asked for.
+std::vector<std::string> ownView(const StudyView& view) {
+    std::vector<std::string> lines;
+    if (view.lens_mm)
+        lines.push_back(lens(view));
+    if (view.lens_mm || view.distance_factor)
         lines.push_back(fitView(view));
     return lines;
 }
 
 } // namespace
 
+bool StudyView::isParallel() const {
+    return name && isStandardView(*name) && lowerCase(*name) != "perspective";
+}
+
 std::vector<std::string> linesFor(const StudyView& view, bool is_of_document) {
     if (view.name)
         return namedView(view);
     if (is_of_document && !view.aims())
-        return view.distance_factor ? std::vector{fitView(view)} : std::vector<std::string>();
+        return ownView(view);
     // The model's azimuth is a compass's, which runs the other way round from the Y axis.
     return {cameraToBeFitted(view.target.value_or(Triple{}),
                              90.0 - view.azimuth_deg.value_or(AZIMUTH_DEG),
-                             view.elevation_deg.value_or(ELEVATION_DEG)),
+                             view.elevation_deg.value_or(ELEVATION_DEG), view.lens_mm),
             fitView(view)};
 }
 

@@ -14,8 +14,11 @@ struct StudyView {
     std::optional<double> azimuth_deg;   ///< of the camera, clockwise from the Y axis
     std::optional<double> elevation_deg; ///< of the camera above its target, 0 to 89
     std::optional<double> distance_factor;
+    std::optional<double> lens_mm; ///< of the perspective camera that it takes
     std::optional<Triple> target;
 
+    /// Whether the named view is one that knows no lens.
+    bool isParallel() const;
     /// Whether the camera is placed about a target, which a named view is not.
     bool aims() const { return azimuth_deg || elevation_deg || target; }
 };

@@ -65,6 +65,40 @@ TEST(ShowScript, IsTheWholeScriptOfTheDefaults) {
     EXPECT_EQ(lines[7], "_-RecordAnimation _TargetFolder \"out/house\" _Enter");
 }
 
+TEST(ShowScript, NeedsNoMoreThanAModel) {
+    const auto lines = scriptOf({"models/house.obj"});
+    EXPECT_THAT(lines[5], StartsWith("_-SetTurntableAnimation 72 "));
+    EXPECT_EQ(lines[7], "_-RecordAnimation _TargetFolder \"models/house\" _Enter");
+    EXPECT_EQ(scriptOf({"house.obj"})[7], "_-RecordAnimation _TargetFolder \"house\" _Enter");
+    EXPECT_EQ(scriptOf({"/a b/old.house.glb"})[7],
+              "_-RecordAnimation _TargetFolder \"/a b/old.house\" _Enter");
+}
+
+TEST(ShowScript, LensIsChosenBeforeTheModelIsFitted) {
+    const auto lines = scriptWith({"--lens", "85.5"});
+    EXPECT_THAT(lines[2], testing::EndsWith(" _Parallel=No _Lens 85.5 _Enter"));
+    EXPECT_THAT(lines[3], StartsWith("_-FitView"));
+    EXPECT_THAT(scriptWith({})[2], Not(HasSubstr("_Lens")));
+}
+
+TEST(ShowScript, QualityIsSetBeforeTheRecording) {
+    const auto lines = scriptWith({"--quality", "75"});
+    ASSERT_THAT(lines, SizeIs(9));
+    EXPECT_EQ(lines[6], "_-JpegQuality 75");
+}
+
+TEST(ShowScript, QualityIsForJpgAlone) {
+    for (const char* format : {"png", "bmp", "tga"}) {
+        const Ended ended = run({"turntable", "house.obj", "--quality", "75", "--format", format});
+        EXPECT_EQ(ended.exit_code, 2);
+        EXPECT_EQ(ended.err,
+                  std::string("quarn: --quality is for jpg pictures, not for ") + format + ".\n");
+    }
+    for (const char* quality : {"0", "101", "good"})
+        EXPECT_THAT(run({"turntable", "house.obj", "--quality", quality}).err,
+                    HasSubstr("--quality must be a whole number from 1 to 100"));
+}
+
 TEST(ShowScript, ReadsTheModelWithTheAxisThatPointsUp) {
     EXPECT_EQ(scriptWith({"--up", "y"})[0], "_-Import [Up] _Y \"house.obj\"");
     EXPECT_EQ(scriptWith({"--up", "Z"})[0], "_-Import [Up] _Z \"house.obj\"");

@@ -328,7 +328,6 @@ TEST(SunStudyArguments, ThatMustBeThereAreNamed) {
     expectRefusal(
         run({"season", "town.obj", "--out", "out", "--place", "Athens", "--to", "2026-01-01"}),
         {"--from"});
-    expectRefusal(run({"day", "town.obj", "--place", "Athens", "--date", "2026-06-21"}), {"--out"});
 }
 
 // ---- Help and places
@@ -405,6 +404,27 @@ TEST(StatedPlace, GivesWayToOptionsEachOnItsOwn) {
 TEST(StatedPlace, IsAskedForWhereTheModelStatesNone) {
     const TempFolder folder;
     expectRefusal(day({"--date", "2026-06-21"}, sitedModel(folder, "$")), {"--place"});
+}
+
+TEST(SunStudyScript, LensIsChosenBeforeTheViewIsFitted) {
+    const Words lines = scriptOf(dayInAthens({"--lens", "35"}));
+    EXPECT_THAT(lines, Contains(AllOf(StartsWith("_-Camera _Location"),
+                                      testing::EndsWith(" _Parallel=No _Lens 35 _Enter"))));
+    const Words named = scriptOf(dayInAthens({"--lens", "35", "--view", "perspective"}));
+    const auto lens = std::ranges::find(named, "_-Camera _Parallel=No _Lens 35 _Enter");
+    ASSERT_NE(lens, named.end());
+    EXPECT_EQ(*(lens - 1), "_-StandardView \"perspective\"");
+    EXPECT_THAT(*(lens + 1), StartsWith("_-FitView"));
+    const Words own = scriptOf(dayInAthens({"--lens", "35"}, "town.quarn"));
+    const auto of_document = std::ranges::find(own, "_-Camera _Parallel=No _Lens 35 _Enter");
+    ASSERT_NE(of_document, own.end());
+    EXPECT_THAT(*(of_document + 1), StartsWith("_-FitView"));
+}
+
+TEST(SunStudyScript, ParallelViewsHaveNoLens) {
+    for (const char* view : {"Top", "front", "Right"})
+        expectRefusal(dayInAthens({"--lens", "35", "--view", view}),
+                      {"--lens is for perspective views", view});
 }
 
 } // namespace
