@@ -205,6 +205,7 @@ public:
     KM_ClassArray<KM_wString>& Images() { return m_images; }
 
     /// Label (date and time) of each frame of a sun study, in the order of frames.
+    const KM_ClassArray<KM_wString>& Dates() const { return m_dates; }
     KM_ClassArray<KM_wString>& Dates() { return m_dates; }
 
     /// Whether frames are recorded with the full renderer. Default: false.

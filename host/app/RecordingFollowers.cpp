@@ -8,6 +8,10 @@ void RecordingFollowers::add(std::unique_ptr<RecordingFollower> follower) {
     m_followers.push_back(std::move(follower));
 }
 
+void RecordingFollowers::addFirst(std::unique_ptr<RecordingFollower> follower) {
+    m_followers.insert(m_followers.begin(), std::move(follower));
+}
+
 void RecordingFollowers::frameRecorded(int number, const std::filesystem::path& file,
                                        const Image& picture) {
     if (m_followers.empty() || !m_camera)

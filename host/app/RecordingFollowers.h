@@ -16,6 +16,8 @@ public:
 
     /// Follows the recording that the next command that records makes.
     void add(std::unique_ptr<RecordingFollower> follower);
+    /// The same, before those that were added: they may read what this one writes at the end.
+    void addFirst(std::unique_ptr<RecordingFollower> follower);
     /// A recording begins.
     void begin(Camera camera) { m_camera = std::move(camera); }
     void frameRecorded(int number, const std::filesystem::path& file, const Image& picture);

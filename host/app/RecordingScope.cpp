@@ -1,6 +1,7 @@
 #include "host/app/RecordingScope.h"
 
 #include "host/app/Application.h"
+#include "host/app/ManifestMaker.h"
 #include "host/border/Border.h"
 #include "host/document/DisplayModeList.h"
 #include "host/document/Document.h"
@@ -77,28 +78,25 @@ RunningRecording::Plan planOf(const KM_3dmAnimationProperties& record, Document&
     return plan;
 }
 
-std::unique_ptr<RunningRecording> makeRecording(Application& application, CQuarnDoc& document) {
-    const IQnZoetrixDynamicAccess* const access = Zoetrix_QuarnDynamicAccess();
-    if (!access)
-        return nullptr;
-    RunningRecording::Plan plan = planOf(access->AnimationProperties(document),
-                                         Document::of(document), application.options().overwrites);
-    if (plan.animation.find('/') != std::string::npos)
-        return nullptr; // nothing of this name is written
-    const auto tell = [&application](const std::string& text) { application.tell(text); };
-    return std::make_unique<RunningRecording>(std::move(plan), tell);
-}
-
 /// The camera of the view that the record names.
-RecordingFollowers::Camera cameraOf(CQuarnDoc& document) {
-    const IQnZoetrixDynamicAccess* const access = Zoetrix_QuarnDynamicAccess();
-    if (!access)
-        return nullptr;
-    return [&document = Document::of(document),
-            name = recordedViewName(access->AnimationProperties(document))] {
+RecordingFollowers::Camera cameraOf(const KM_3dmAnimationProperties& record, Document& document) {
+    return [&document, name = recordedViewName(record)] {
         const ViewState* const view = document.findView(name.View());
         return view ? view->viewport() : KM_Viewport();
     };
+}
+
+void beginRecording(Application& application, Document& document,
+                    const KM_3dmAnimationProperties& record) {
+    RunningRecording::Plan plan = planOf(record, document, application.options().overwrites);
+    if (plan.animation.find('/') != std::string::npos)
+        return; // nothing of this name is written
+    const auto tell = [&application](const std::string& text) { application.tell(text); };
+    RecordingFollowers& followers = application.recordingFollowers();
+    followers.begin(cameraOf(record, document));
+    followers.addFirst(
+        std::make_unique<ManifestMaker>(record, plan.animation, plan.settings, document, tell));
+    application.setRecording(std::make_unique<RunningRecording>(std::move(plan), tell));
 }
 
 } // namespace
@@ -109,8 +107,8 @@ RecordingScope::RecordingScope(Application& application, CQuarnCommand& command,
       m_is_recording(!application.recording() && command.CommandUUID() == recording_command_id) {
     if (!m_is_recording)
         return;
-    application.setRecording(makeRecording(application, document));
-    application.recordingFollowers().begin(cameraOf(document));
+    if (const IQnZoetrixDynamicAccess* const access = Zoetrix_QuarnDynamicAccess())
+        beginRecording(application, Document::of(document), access->AnimationProperties(document));
 }
 
 RecordingScope::~RecordingScope() {

@@ -2,10 +2,8 @@
 
 #include "ground/FileBytes.h"
 #include "ground/PathText.h"
+#include "host/recording/JsonNumbers.h"
 #include "sdk/qncore/QnLocalize.h"
-
-#include <limits>
-#include <nlohmann/json.hpp>
 
 namespace quarn {
 
@@ -57,21 +55,6 @@ json jsonOf(const RecordingFile& recording) {
 }
 
 // ---- From JSON. What has another type than it should throws, which ends in parseRecording.
-
-/// The library would convert a number of another type, and one too large for this is a double to
-/// it.
-template <class Integer> Integer integerOf(const json& value) {
-    if (!value.is_number_integer())
-        throw std::out_of_range("number");
-    return value.get<Integer>();
-}
-
-int intOf(const json& value) {
-    const auto number = integerOf<std::int64_t>(value);
-    if (number < 0 || number > std::numeric_limits<int>::max())
-        throw std::out_of_range("number");
-    return static_cast<int>(number);
-}
 
 FrameSet framesOf(const json& ranges) {
     FrameSet frames;

@@ -2,6 +2,7 @@
 
 #include "ground/PathText.h"
 #include "host/recording/FrameNames.h"
+#include "host/recording/FramesManifest.h"
 #include "host/recording/RecordedPage.h"
 #include "sdk/qncore/QnLocalize.h"
 
@@ -31,6 +32,17 @@ OwnFiles filesOfPage(const RecordingPlace& place) {
     return pictures ? OwnFiles{true, *pictures} : OwnFiles{};
 }
 
+/// Whether nothing is lost when a recording replaces the list of frames: there is none, or one of
+/// frames of this name.
+bool mayReplaceManifest(const RecordingPlace& place) {
+    const fs::path file = place.folder / manifestName(place.animation);
+    std::error_code error;
+    if (!fs::exists(fs::symlink_status(file, error)))
+        return true;
+    const auto manifest = readFramesManifest(file);
+    return manifest && manifest.value().name == place.animation;
+}
+
 /// The names of files that the recording would replace though they are not its own. A folder of
 /// such a name cannot be replaced and is told where it is in the way.
 std::vector<std::string> filesInTheWay(const RecordingPlace& place, const OwnFiles& own) {
@@ -48,6 +60,8 @@ std::vector<std::string> filesInTheWay(const RecordingPlace& place, const OwnFil
         if (is_wanted && !is_own && !at->is_directory(unknown))
             found.push_back(name);
     }
+    if (!mayReplaceManifest(place))
+        found.push_back(manifestName(place.animation));
     return found;
 }
 

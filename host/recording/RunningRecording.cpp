@@ -3,6 +3,7 @@
 #include "ground/PathText.h"
 #include "host/recording/FolderLock.h"
 #include "host/recording/FrameNames.h"
+#include "host/recording/FramesManifest.h"
 #include "sdk/qncore/QnLocalize.h"
 
 #include <algorithm>
@@ -64,6 +65,8 @@ bool RunningRecording::begin(const fs::path& folder) {
     m_state = State::running;
     m_owned_page = own.value().owns_page;
     m_file.earlier = own.value().pictures;
+    std::error_code error;
+    fs::remove(folder / manifestName(m_place.animation), error); // it tells of replaced frames
     renew();
     return true;
 }
