@@ -59,7 +59,7 @@ class Controls {
     // A turntable is its own slider: it is turned, not pushed along.
     prepareSlider() {
         const stage = element('stage');
-        const { count, kind } = this.viewer.recording;
+        const { count } = this.viewer.recording;
         if (count < 2) {
             for (const id of ['play', 'loop', 'rate']) element(id).hidden = true;
             return;
@@ -77,8 +77,8 @@ class Controls {
             element('clock').hidden = this.viewer.sun !== null;
             element('viewer').classList.add('wide');
         }
-        const names = { turntable: 'turn', study: 'time' };
-        this.slider.setAttribute('aria-label', say(names[kind] ?? 'position'));
+        const name = this.isTurntable ? 'turn' : this.viewer.sun ? 'time' : 'position';
+        this.slider.setAttribute('aria-label', say(name));
     }
 
     show(frame) {

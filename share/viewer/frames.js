@@ -136,7 +136,7 @@ class Frames {
     }
 
     keep(frame, source) {
-        const bytes = this.recording.bytes?.[frame] ?? source.size ?? GUESSED_BYTES;
+        const bytes = source.size ?? (this.recording.bytes || GUESSED_BYTES);
         source.bytes = bytes;
         this.seen.add(frame);
         this.encoded.set(frame, source);
@@ -149,7 +149,7 @@ class Frames {
     }
 
     source(frame) {
-        if (frame === 0 && this.first.getAttribute('src')) return loaded(this.first);
+        if (frame === this.recording.first) return loaded(this.first);
         if (this.recording.inside) return this.fromPage(frame);
         const address = encodeURIComponent(this.names[frame]);
         return location.protocol === 'file:' ? fromDisk(address) : fromServer(address);
@@ -158,7 +158,7 @@ class Frames {
     // The text of a frame in the page is taken out of it: it is not kept twice.
     async fromPage(frame) {
         const text = await arrived(`frame-${frame}`);
-        const blob = blobOf(text.textContent, this.recording.type);
+        const blob = blobOf(text.textContent, 'image/jpeg');
         text.remove();
         return blob;
     }
@@ -228,10 +228,14 @@ class Frames {
 }
 
 function blobOf(base64, type) {
-    const text = atob(base64.trim());
+    return new Blob([Uint8Array.fromBase64?.(base64) ?? bytesOf(atob(base64))], { type });
+}
+
+// For browsers that cannot read Base64 into bytes.
+function bytesOf(text) {
     const bytes = new Uint8Array(text.length);
     for (let i = 0; i < text.length; ++i) bytes[i] = text.charCodeAt(i);
-    return new Blob([bytes], { type });
+    return bytes;
 }
 
 async function loaded(image) {

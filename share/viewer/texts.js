@@ -13,10 +13,10 @@ function chosenLanguage(wanted) {
     return 'en';
 }
 
-// The text of a key, with {0}, {1}, ... replaced by the values.
+// The text of a key, with %1, %2, ... replaced by the values.
 function say(key, ...values) {
     const text = ALL_TEXTS[LANGUAGE][key] ?? ENGLISH[key];
-    return text.replace(/\{(\d)\}/g, (_, place) => values[Number(place)]);
+    return text.replace(/%(\d)/g, (_, place) => values[Number(place) - 1]);
 }
 
 function element(id) {

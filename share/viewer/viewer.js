@@ -110,6 +110,7 @@ class Viewer {
         const shown = Number(element('stage').dataset.shown ?? -1);
         if (frames.nearest(motion.frame) !== shown) this.draw();
         if (!frames.isLoaded) return;
+        element('stage').dataset.loaded = 'all';
         this.tellBroken();
         if (this.wasUsed || this.isCalm || this.hasBegun) return;
         this.hasBegun = true;
