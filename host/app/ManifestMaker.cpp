@@ -91,7 +91,7 @@ void ManifestMaker::recordingEnded(const RecordingReport& report) {
     m_manifest.settings = settingsFingerprint();
     const auto written =
         writeFramesManifest(report.folder / manifestName(m_manifest.name), m_manifest);
-    if (!written)
+    if (!written && report.isComplete()) // else the reason was told with the frames
         m_tell(written.message());
 }
 

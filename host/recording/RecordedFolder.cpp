@@ -193,21 +193,21 @@ void tellMissing(RecordedFolder& recorded) {
 }
 
 void tellChanged(RecordedFolder& recorded) {
-    int changed = 0;
-    const ManifestFrame* first = nullptr;
-    for (const ManifestFrame& frame : recorded.manifest.images) {
+    const std::vector<ManifestFrame>& frames = recorded.manifest.images;
+    const auto is_changed = [&](const ManifestFrame& frame) {
         std::error_code error;
-        if (fs::file_size(recorded.folder / frame.file, error) == frame.bytes)
-            continue;
-        first = first ? first : &frame;
-        ++changed;
-    }
-    if (!recorded.has_manifest || changed == 0)
+        return fs::file_size(recorded.folder / frame.file, error) != frame.bytes;
+    };
+    const auto first = std::ranges::find_if(frames, is_changed);
+    if (!recorded.has_manifest || first == frames.end())
         return;
     recorded.warnings.push_back(sentence(
-        QnLocalizeString(L"%d frames in %s were changed since they were recorded; the first is %s.",
+        QnLocalizeString(L"%d of %d frames in %s were changed since they were recorded; the first "
+                         L"is %s.",
                          42694),
-        changed, textFromPath(recorded.folder).Array(), KM_wString::FromUtf8(first->file).Array()));
+        static_cast<int>(std::ranges::count_if(frames, is_changed)),
+        static_cast<int>(frames.size()), textFromPath(recorded.folder).Array(),
+        KM_wString::FromUtf8(first->file).Array()));
 }
 
 Error severalRecordings(const fs::path& folder, const std::vector<Found>& found) {

@@ -32,7 +32,7 @@ void record(Desk& desk) {
 }
 
 std::vector<std::string> frameNames(const std::string& name, const std::string& type, int count) {
-    std::vector<std::string> names = {name + ".html", name + ".recording"};
+    std::vector<std::string> names = {name + ".frames.json", name + ".html", name + ".recording"};
     for (int frame = 0; frame < count; ++frame) {
         const std::string number = std::to_string(frame);
         names.push_back(name + std::string(3 - number.size(), '0') + number + '.' + type);
@@ -45,7 +45,7 @@ void expectRecording(const std::filesystem::path& folder, const std::string& typ
                      QSize size_px) {
     EXPECT_EQ(filesIn(folder), frameNames(folder.filename(), type, count));
     for (const std::string& name : filesIn(folder)) {
-        if (name.ends_with(".html") || name.ends_with(".recording"))
+        if (name.ends_with(".json") || name.ends_with(".html") || name.ends_with(".recording"))
             continue;
         const std::optional<PictureHeader> header = readPictureHeader(folder / name);
         ASSERT_TRUE(header) << name;

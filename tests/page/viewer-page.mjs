@@ -126,6 +126,29 @@ export async function openViewer(browser, address, options = {}) {
     };
 }
 
+// Opens the page of a recording from a server, and closes both whatever becomes of the test.
+export async function withServed(browser, recording, use, before) {
+    const server = await serve(recording.out, before);
+    let viewer;
+    try {
+        viewer = await openViewer(browser, server.address(basename(recording.file)));
+        await use(viewer, server);
+    } finally {
+        await viewer?.close();
+        await server.stop();
+    }
+}
+
+// Opens a page from disk, and closes it whatever becomes of the test.
+export async function withOpened(browser, address, options, use) {
+    const viewer = await openViewer(browser, address, options);
+    try {
+        await use(viewer);
+    } finally {
+        await viewer.close();
+    }
+}
+
 // Where the red post stands in the picture that is shown, as its canvas has it: the mean of its
 // points' places across, from 0 to 1. Only of pages whose pictures are inside.
 export async function redPlace(viewer) {

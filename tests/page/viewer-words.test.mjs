@@ -1,12 +1,13 @@
 import assert from 'node:assert/strict';
-import { readFileSync } from 'node:fs';
+import { readFileSync, writeFileSync } from 'node:fs';
+import { join } from 'node:path';
 import { after, before, describe, it } from 'node:test';
 import { startBrowser } from './recorded-page.mjs';
-import { openViewer, record, serve } from './viewer-page.mjs';
+import { openViewer, record, withOpened, withServed } from './viewer-page.mjs';
 
 const FEW = ['turntable', '--frames', '3'];
 const HOSTILE_TITLE = "</title></script><script>window.broken=1</script><img src=x onerror=window.broken=2> {{texts}} & 'A' \u202Egnp.exe";
-const HOSTILE_NAME = "A&b 'c' %41 #1 \u202Egnp";
+const HOSTILE_NAME = "A&b 'c' (1) \u202Egnp";
 
 let browser;
 before(async () => { browser = await startBrowser(); });
@@ -22,36 +23,30 @@ describe('A viewer page with a hostile name and title', () => {
     for (const form of ['beside its pictures', 'as one file'])
         it(`${form} runs nothing of theirs, and shows them as they are`, async () => {
             recording.page('--title', HOSTILE_TITLE, ...(form === 'as one file' ? ['--one-file'] : []));
-            const viewer = await openViewer(browser, recording.address);
-            await viewer.loaded();
-            assert.equal(await viewer.page.evaluate(() => window.broken), undefined);
-            assert.equal(await viewer.page.title(), HOSTILE_TITLE);
-            assert.equal(await viewer.page.locator('h1').textContent(), HOSTILE_TITLE);
-            assert.equal(await viewer.page.locator('h1 > bdi').count(), 1);
-            assert.equal(await viewer.page.locator('img').count(), 1);
-            await viewer.page.keyboard.press('End');
-            await viewer.waitFor(2);
-            assert.deepEqual(viewer.mistakes, []);
-            await viewer.close();
+            await withOpened(browser, recording.address, {}, async (viewer) => {
+                await viewer.loaded();
+                assert.equal(await viewer.page.evaluate(() => window.broken), undefined);
+                assert.equal(await viewer.page.title(), HOSTILE_TITLE);
+                assert.equal(await viewer.page.locator('h1').textContent(), HOSTILE_TITLE);
+                assert.equal(await viewer.page.locator('h1 > bdi').count(), 1);
+                assert.equal(await viewer.page.locator('img').count(), 1);
+                await viewer.page.keyboard.press('End');
+                await viewer.waitFor(2);
+                assert.deepEqual(viewer.mistakes, []);
+            });
         });
 
-    it('can be embedded by the line that it shows', async () => {
-        const server = await serve(recording.out);
-        const viewer = await openViewer(browser, server.address(`${HOSTILE_NAME}-viewer.html`));
+    it('can be embedded by the line that it shows', () => withServed(browser, recording, async (viewer, server) => {
         await viewer.loaded();
         await viewer.page.locator('#more').click();
         const line = await viewer.page.locator('#embed-line').inputValue();
-        const host = await viewer.context.newPage();
-        await host.goto('about:blank');
-        await host.setContent(`<!DOCTYPE html><main style="width: 480px">${line}</main>`);
-        const frame = host.frameLocator('iframe');
-        await frame.locator('#stage.drawn').waitFor();
-        assert.equal(await host.locator('main > *').count(), 1);
-        const box = await host.locator('iframe').boundingBox();
+        writeFileSync(join(recording.out, 'host.html'), `<!DOCTYPE html><main style="width: 480px">${line}</main>`);
+        await viewer.page.goto(server.address('host.html'));
+        await viewer.page.frameLocator('iframe').locator('#stage.drawn').waitFor();
+        assert.equal(await viewer.page.locator('main > *').count(), 1);
+        const box = await viewer.page.locator('iframe').boundingBox();
         assert.ok(Math.abs(box.width / box.height - 16 / 9) < 0.01, `${box.width} x ${box.height}`);
-        await viewer.close();
-        await server.stop();
-    });
+    }));
 });
 
 describe('A viewer page', () => {
@@ -62,11 +57,11 @@ describe('A viewer page', () => {
     const words = { 'de-AT': 'Abspielen', 'es': 'Reproducir', 'fr-CA': 'Lire', 'ja-JP': '再生', 'zh-Hans-CN': '播放', 'pt': 'Play' };
     for (const [locale, play] of Object.entries(words))
         it(`speaks to a reader of ${locale}`, async () => {
-            const viewer = await openViewer(browser, recording.address, { locale });
-            await viewer.loaded();
-            assert.equal(await viewer.page.locator('#play').getAttribute('aria-label'), play);
-            assert.equal(await viewer.page.evaluate(() => document.documentElement.lang), locale === 'pt' ? 'en' : locale.slice(0, 2));
-            await viewer.close();
+            await withOpened(browser, recording.address, { locale }, async (viewer) => {
+                await viewer.loaded();
+                assert.equal(await viewer.page.locator('#play').getAttribute('aria-label'), play);
+                assert.equal(await viewer.page.evaluate(() => document.documentElement.lang), locale === 'pt' ? 'en' : locale.slice(0, 2));
+            });
         });
 
     it('is dark for a reader who has it dark', async () => {

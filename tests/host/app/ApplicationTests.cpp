@@ -91,8 +91,8 @@ TEST(Pictures, AreCountedForEachCommandAndToldWithTheFramesOfTheRecord) {
     CountingFrontEnd front_end;
     Session session(front_end, {{}, {}, "C", {}});
     TestCommand record(L"RecordTwo", [](const CQuarnCommandContext&) {
-        Application::current()->pictureWritten("a0.png");
-        Application::current()->pictureWritten("a1.png");
+        Application::current()->pictureWritten("a0.png", Image{});
+        Application::current()->pictureWritten("a1.png", Image{});
         return CQuarnCommand::success;
     });
     ASSERT_TRUE(Application::current()->commands().add(record));
@@ -103,7 +103,7 @@ TEST(Pictures, AreCountedForEachCommandAndToldWithTheFramesOfTheRecord) {
         EXPECT_EQ(Zoetrix_QuarnDynamicAccess(), &keeper);
         session.runCommand(L"RecordTwo");
     }
-    Application::current()->pictureWritten("outside.png");
+    Application::current()->pictureWritten("outside.png", Image{});
     EXPECT_EQ(front_end.told,
               (std::vector<std::string>{"a0.png 1/0", "a1.png 2/0", "a0.png 1/2", "a1.png 2/2"}));
 }

@@ -27,7 +27,7 @@ TEST(FlythroughPage, CurveFileOnItCanBeFlownAlong) {
                        "walk"};
     const Ended ended = run(start);
     EXPECT_EQ(ended.exit_code, 0) << ended.err;
-    EXPECT_THAT(filesIn(studio / "walk"), SizeIs(5));
+    EXPECT_THAT(filesIn(studio / "walk"), SizeIs(6));
 }
 
 } // namespace

@@ -86,8 +86,9 @@ TEST(Flythrough, WritesEveryFrameAndThePage) {
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     EXPECT_THAT(ended.out, HasSubstr("6 frames and out/street.html in "));
     EXPECT_THAT(filesIn(street / "out"),
-                ElementsAre("street.html", "street.recording", "street000.bmp", "street001.bmp",
-                            "street002.bmp", "street003.bmp", "street004.bmp", "street005.bmp"));
+                ElementsAre("street.frames.json", "street.html", "street.recording",
+                            "street000.bmp", "street001.bmp", "street002.bmp", "street003.bmp",
+                            "street004.bmp", "street005.bmp"));
     EXPECT_GT(
         meanDifference(street.picture("out/street000.bmp"), street.picture("out/street003.bmp")),
         0.01);
@@ -130,7 +131,7 @@ TEST(CameraPath, RoundARingLooksAtOnePoint) {
     const Street street;
     const Ended ended = street.record("path", 4, {"--camera", "Ring", "--target-point", "2,1,1"});
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
-    EXPECT_THAT(filesIn(street / "out"), SizeIs(6));
+    EXPECT_THAT(filesIn(street / "out"), SizeIs(7));
     EXPECT_GT(
         meanDifference(street.picture("out/street000.bmp"), street.picture("out/street002.bmp")),
         0.01);
@@ -142,7 +143,7 @@ TEST(CameraPath, FromOnePlaceLooksAlongACurve) {
     const Ended ended = street.record(
         "path", 3, {"--camera-point", "2,-8,2", "--target-curve", "eaves.json", "--save", "look"});
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
-    EXPECT_THAT(filesIn(street / "out"), SizeIs(5));
+    EXPECT_THAT(filesIn(street / "out"), SizeIs(6));
     EXPECT_EQ(street.run({"curves", "look.quarn"}).out,
               "Front_walk  polyline, length 13.5797, open, 4 points\n"
               "Ring  polyline, length 52, closed, 4 points\n"
@@ -181,15 +182,15 @@ TEST(CameraPath, FollowsNamesWithBlanks) {
         street.run({"path", "named.quarn", "--camera", "The long ring", "--target",
                     "Walk at the front", "--frames", "2", "--out", "out", "--size", "64x48"});
     EXPECT_EQ(ended.exit_code, 0) << ended.err;
-    EXPECT_THAT(filesIn(street / "out"), SizeIs(4));
+    EXPECT_THAT(filesIn(street / "out"), SizeIs(5));
 }
 
 TEST(CameraPath, OfOneFrameIsAPicture) {
     const Street street;
     const Ended ended = street.record("flythrough", 1, {"--path", "Front_walk"});
     EXPECT_EQ(ended.exit_code, 0) << ended.err;
-    EXPECT_THAT(filesIn(street / "out"),
-                ElementsAre("street.html", "street.recording", "street000.bmp"));
+    EXPECT_THAT(filesIn(street / "out"), ElementsAre("street.frames.json", "street.html",
+                                                     "street.recording", "street000.bmp"));
 }
 
 TEST(CameraPath, IsStoppedAfterAWholePicture) {

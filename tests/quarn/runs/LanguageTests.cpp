@@ -24,8 +24,9 @@ TEST(Languages, AChineseScriptRecordsAChineseTurntable) {
     start.arguments = {"run", "步骤.txt", "house.obj", "--language", "zh_CN.UTF-8"};
     const Ended ended = run(start);
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
-    EXPECT_THAT(filesIn(studio / "录制"), ElementsAre("旋转的房子.html", "旋转的房子.recording",
-                                                      "旋转的房子000.png", "旋转的房子001.png"));
+    EXPECT_THAT(filesIn(studio / "录制"),
+                ElementsAre("旋转的房子.frames.json", "旋转的房子.html", "旋转的房子.recording",
+                            "旋转的房子000.png", "旋转的房子001.png"));
     const std::string page = readFile(studio / "录制/旋转的房子.html");
     for (const char* text : {"<TITLE>旋转的房子</TITLE>", "停止", "开始", "循环播放", "显示帧计数"})
         EXPECT_THAT(page, HasSubstr(text));

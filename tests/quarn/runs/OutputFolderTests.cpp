@@ -53,7 +53,8 @@ TEST(OutputFolder, ThatTakesNoFilesIsTold) {
 
 /// The page, and the file that tells of the recording.
 bool isBesidePictures(const std::string& name) {
-    return name.ends_with(".html") || name.ends_with(".recording");
+    return name.ends_with(".html") || name.ends_with(".recording") ||
+           name.ends_with(".frames.json");
 }
 
 /// Every picture that is there is whole, and no half of a file stands beside them.

@@ -13,7 +13,7 @@ using testing::SizeIs;
 
 constexpr int frames = 4;
 
-/// The bytes of the frames and of the page of a turntable, one file after the other.
+/// The bytes of the frames, of their list and of the page of a turntable, one file after the other.
 std::vector<std::string> recorded(const Start& start, const std::filesystem::path& folder) {
     const Ended ended = run(start);
     EXPECT_EQ(ended.exit_code, 0) << ended.err;
@@ -21,7 +21,7 @@ std::vector<std::string> recorded(const Start& start, const std::filesystem::pat
     for (const std::string& name : filesIn(folder))
         if (!name.ends_with(".recording"))
             contents.push_back(readFile(folder / name));
-    EXPECT_THAT(contents, SizeIs(frames + 1));
+    EXPECT_THAT(contents, SizeIs(frames + 2));
     return contents;
 }
 

@@ -81,7 +81,7 @@ TEST(Day, HasAFrameAtBothEndsAndEveryStepBetween) {
                        "saving");
     EXPECT_EQ(told[2], "First frame: 2026-06-21 06:00 = 05:00 UTC");
     EXPECT_THAT(told[3], MatchesRegex("13 frames and out/house\\.html in [0-9.]+ s"));
-    EXPECT_THAT(filesIn(garden / "out"), SizeIs(15));
+    EXPECT_THAT(filesIn(garden / "out"), SizeIs(16));
     const Words dates = garden.datesOnPage();
     ASSERT_THAT(dates, SizeIs(13));
     EXPECT_EQ(dates.front(), "2026-06-21 06:00:00");
@@ -187,7 +187,7 @@ TEST(Season, HasAFrameOnEveryDateToTheLastOne) {
     EXPECT_THAT(garden.datesOnPage(),
                 ElementsAre("2026-03-21 15:30:00", "2026-05-15 15:30:00", "2026-07-09 15:30:00",
                             "2026-09-02 15:30:00", "2026-10-27 15:30:00", "2026-12-21 15:30:00"));
-    EXPECT_THAT(filesIn(garden / "out"), SizeIs(8));
+    EXPECT_THAT(filesIn(garden / "out"), SizeIs(9));
     EXPECT_THAT(linesOf(ended.out), Contains("First frame: 2026-03-21 15:30 = 14:30 UTC"));
     EXPECT_GT(
         meanDifference(garden.picture("out/house002.bmp"), garden.picture("out/house005.bmp")),
@@ -236,8 +236,8 @@ TEST(SunStudy, ShownScriptRunsAsItIs) {
     const Ended ended = run(start);
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     EXPECT_THAT(filesIn(garden / "out"),
-                ElementsAre("house.html", "house.recording", "house000.bmp", "house001.bmp",
-                            "house002.bmp"));
+                ElementsAre("house.frames.json", "house.html", "house.recording", "house000.bmp",
+                            "house001.bmp", "house002.bmp"));
 }
 
 } // namespace

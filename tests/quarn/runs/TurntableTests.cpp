@@ -26,8 +26,8 @@ TEST_P(FormatOfPictures, IsTheOneThatWasAskedFor) {
     EXPECT_THAT(ended.err, IsEmpty());
     EXPECT_THAT(ended.out, MatchesRegex("3 frames and out/house\\.html in [0-9.]+ s\n"));
     EXPECT_THAT(filesIn(studio / "out"),
-                ElementsAre("house.html", "house.recording", "house000." + format,
-                            "house001." + format, "house002." + format));
+                ElementsAre("house.frames.json", "house.html", "house.recording",
+                            "house000." + format, "house001." + format, "house002." + format));
     for (int frame = 0; frame < 3; ++frame) {
         const auto header =
             readPictureHeader(studio / ("out/house00" + std::to_string(frame) + "." + format));
@@ -61,7 +61,7 @@ TEST(Turntable, OfATargetOutOfRangeShowsTheBackgroundAndIsToldOnce) {
         EXPECT_THAT(ended.out, HasSubstr("3 frames and out/house.html"));
         EXPECT_THAT(ended.err, StartsWith("quarn: The camera is out of range: the picture shows"));
         EXPECT_EQ(std::ranges::count(ended.err, '\n'), 1) << ended.err;
-        EXPECT_EQ(filesIn(studio / "out").size(), 5U);
+        EXPECT_EQ(filesIn(studio / "out").size(), 6U);
     }
 }
 
@@ -102,7 +102,7 @@ TEST(Turntable, OfOneFrameIsOnePicture) {
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     EXPECT_THAT(ended.out, HasSubstr("1 frame and out/house.html"));
     EXPECT_THAT(filesIn(studio / "out"),
-                ElementsAre("house.html", "house.recording", "house000.jpg"));
+                ElementsAre("house.frames.json", "house.html", "house.recording", "house000.jpg"));
 }
 
 /// The middle of all that is red, from 0 at the left to 1 at the right.
@@ -230,8 +230,8 @@ TEST(Turntable, RunAgainReplacesItsFilesAndLeavesOthers) {
     EXPECT_THAT(readFile(studio / "out/house001.jpg"), Not(shaded));
     EXPECT_EQ(readFile(studio / "out/notes.txt"), "mine");
     EXPECT_THAT(filesIn(studio / "out"),
-                ElementsAre("house.html", "house.recording", "house000.jpg", "house001.jpg",
-                            "house002.jpg", "notes.txt"));
+                ElementsAre("house.frames.json", "house.html", "house.recording", "house000.jpg",
+                            "house001.jpg", "house002.jpg", "notes.txt"));
 }
 
 TEST(Turntable, SameModelGivesTheSamePictures) {
@@ -249,7 +249,8 @@ TEST(Turntable, PathsMayHoldBlanksAndLettersOfAnyLanguage) {
                                                {"--out", "neue Bilder/hier drin"}));
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     EXPECT_THAT(filesIn(studio / "neue Bilder/hier drin"),
-                ElementsAre("mein Häuschen.html", "mein Häuschen.recording", "mein Häuschen000.jpg",
+                ElementsAre("mein Häuschen.frames.json", "mein Häuschen.html",
+                            "mein Häuschen.recording", "mein Häuschen000.jpg",
                             "mein Häuschen001.jpg"));
     EXPECT_THAT(readFile(studio / "neue Bilder/hier drin/mein Häuschen.html"),
                 HasSubstr("<TITLE>mein Häuschen</TITLE>"));
@@ -261,8 +262,8 @@ TEST(Turntable, NamesThatAnswerPromptsStayNames) {
     std::filesystem::create_directory(studio / "_Cancel");
     const Ended ended = run(studio.turntableOf("_Enter.obj", 1, {"--out", "_Cancel"}));
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
-    EXPECT_THAT(filesIn(studio / "_Cancel"),
-                ElementsAre("_Enter.html", "_Enter.recording", "_Enter000.jpg"));
+    EXPECT_THAT(filesIn(studio / "_Cancel"), ElementsAre("_Enter.frames.json", "_Enter.html",
+                                                         "_Enter.recording", "_Enter000.jpg"));
 }
 
 TEST(Turntable, RecordsTheSameInALocaleWithADecimalComma) {
@@ -305,7 +306,8 @@ TEST(Turntable, ShownScriptRunsAsItIs) {
     const Ended ended = run(start);
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     EXPECT_THAT(filesIn(studio / "out"),
-                ElementsAre("house.html", "house.recording", "house000.png", "house001.png"));
+                ElementsAre("house.frames.json", "house.html", "house.recording", "house000.png",
+                            "house001.png"));
 }
 
 } // namespace

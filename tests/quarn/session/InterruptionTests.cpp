@@ -29,7 +29,8 @@ int picturesIn(const std::filesystem::path& folder, const std::string& format = 
 /// a hidden name.
 void expectWholePicturesIn(const std::filesystem::path& folder) {
     for (const std::string& name : filesIn(folder))
-        EXPECT_TRUE(name == "house.html" || name == "house.recording" || name.starts_with('.') ||
+        EXPECT_TRUE(name == "house.html" || name == "house.recording" ||
+                    name == "house.frames.json" || name.starts_with('.') ||
                     readPictureHeader(folder / name).has_value())
             << name;
 }

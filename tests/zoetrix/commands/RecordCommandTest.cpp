@@ -81,8 +81,8 @@ TEST_F(RecordCommand, WithoutAnimationThereIsNothingToRecord) {
 
 TEST_F(RecordCommand, EnterRecordsIntoTheStoredFolder) {
     ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
-    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk.recording", "Walk000.jpg", "Walk001.jpg",
-                                     "Walk002.jpg"));
+    EXPECT_THAT(files(), ElementsAre("Walk.frames.json", "Walk.html", "Walk.recording",
+                                     "Walk000.jpg", "Walk001.jpg", "Walk002.jpg"));
     expectThreeFramesAndThePageIn(frames);
     EXPECT_THAT(images(), ElementsAre(L"Walk000.jpg", L"Walk001.jpg", L"Walk002.jpg"));
     EXPECT_EQ(2, record().CurrentFrame());
@@ -216,8 +216,8 @@ TEST_F(RecordCommand, PageThatCannotBeWrittenFailsWithoutAWordAndStoresNothing) 
     EXPECT_EQ(L"", printed());
     EXPECT_TRUE(before == bytesOf(record()));
     // The frames were written before.
-    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk.recording", "Walk000.jpg", "Walk001.jpg",
-                                     "Walk002.jpg"));
+    EXPECT_THAT(files(), ElementsAre("Walk.frames.json", "Walk.html", "Walk.recording",
+                                     "Walk000.jpg", "Walk001.jpg", "Walk002.jpg"));
     EXPECT_EQ(CQuarnCommand::failure, recordWith({L"RunAnimation=No", L"_Cancel"}));
 }
 
@@ -314,7 +314,8 @@ TEST_F(RecordCommand, RenderedPictureThatCannotBeSavedEndsTheRecording) {
     record().SetRenderPreview(true);
     std::filesystem::create_directories(frames / "Walk001.jpg");
     ASSERT_EQ(CQuarnCommand::success, recordWith({L"_Enter"}));
-    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk.recording", "Walk000.jpg", "Walk001.jpg"));
+    EXPECT_THAT(files(), ElementsAre("Walk.frames.json", "Walk.html", "Walk.recording",
+                                     "Walk000.jpg", "Walk001.jpg"));
     EXPECT_TRUE(std::filesystem::is_directory(frames / "Walk001.jpg"));
     // A picture that was rendered counts; the next one is not begun.
     EXPECT_THAT(images(), ElementsAre(L"Walk000.jpg", L"Walk001.jpg"));
@@ -432,8 +433,8 @@ TEST_F(RecordCommand, PageWhosePathHasAQuoteIsNotOpened) {
     ASSERT_EQ(CQuarnCommand::success, recordWith({L"RunAnimation=Yes", L"_Enter"}));
     EXPECT_THAT(printed(), Not(HasSubstr(L"_Run \"")));
     EXPECT_EQ("", opener.opened());
-    EXPECT_THAT(files(), ElementsAre("a\"b.html", "a\"b.recording", "a\"b000.jpg", "a\"b001.jpg",
-                                     "a\"b002.jpg"));
+    EXPECT_THAT(files(), ElementsAre("a\"b.frames.json", "a\"b.html", "a\"b.recording",
+                                     "a\"b000.jpg", "a\"b001.jpg", "a\"b002.jpg"));
     ASSERT_EQ(CQuarnCommand::success, recordWith({L"RunAnimation=No", L"_Enter"}));
 }
 
@@ -449,7 +450,8 @@ TEST_F(RecordCommand, InterruptedRecordingKeepsItsFramesAndWritesThePage) {
     setUpCameraFrames(10);
     record().SetFolderName(wide(frames));
     EXPECT_EQ(CQuarnCommand::success, session->runCommand(L"RecordAnimation _Enter"));
-    EXPECT_THAT(files(), ElementsAre("Walk.html", "Walk.recording", "Walk000.jpg", "Walk001.jpg"));
+    EXPECT_THAT(files(), ElementsAre("Walk.frames.json", "Walk.html", "Walk.recording",
+                                     "Walk000.jpg", "Walk001.jpg"));
     EXPECT_THAT(readFile(frames / "Walk.html"), HasSubstr("var ImageCount = 2;"));
     EXPECT_EQ(2, record().Images().Count());
     session.reset();

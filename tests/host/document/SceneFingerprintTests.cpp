@@ -1,0 +1,81 @@
+#include "host/document/SceneFingerprint.h"
+
+#include "ground/Checksum.h"
+#include "tests/engine/display/DisplayFixture.h"
+
+#include <functional>
+#include <gtest/gtest.h>
+
+namespace quarn::test {
+namespace {
+
+std::uint64_t fingerprintOf(const SceneContent& content) {
+    Checksum sum;
+    addScene(content, sum);
+    return sum.value();
+}
+
+SceneContent sampleScene() {
+    SceneContent content;
+    addMesh(content, boxMesh({0.0, 0.0, 0.0}, {1.0, 2.0, 3.0}));
+    auto texture = std::make_shared<Texture>();
+    texture->width = texture->height = 1;
+    texture->rgba = {1, 2, 3, 255};
+    auto material = std::make_shared<Material>();
+    material->base_color_texture = texture;
+    content.meshes[0].placed.material = material;
+    content.curves.push_back({});
+    content.curves[0].polyline.Append({1.0, 2.0, 3.0});
+    content.points.push_back({});
+    content.lights.push_back(sunLight({0.0, 0.0, -1.0}));
+    return content;
+}
+
+/// Whether this change of the scene changes its fingerprint.
+bool isNoticed(const std::function<void(SceneContent&)>& change) {
+    SceneContent content = sampleScene();
+    change(content);
+    return fingerprintOf(content) != fingerprintOf(sampleScene());
+}
+
+TEST(SceneFingerprintTest, OfAModelReadAgainIsTheSame) {
+    EXPECT_FALSE(isNoticed([](SceneContent& content) {
+        content.revision = 17;
+        content.meshes[0].id = KM_UUID{1, 2, 3, {4, 5, 6, 7, 8, 9, 10, 11}};
+    }));
+}
+
+TEST(SceneFingerprintTest, ChangesWithEverythingThatIsSeen) {
+    EXPECT_TRUE(isNoticed([](SceneContent& content) {
+        KM_Mesh mesh = *content.meshes[0].placed.mesh;
+        mesh.m_V[5].z += 1e-6F;
+        content.meshes[0].placed.mesh = shared(std::move(mesh));
+    }));
+    EXPECT_TRUE(isNoticed([](SceneContent& content) { content.meshes[0].visible = false; }));
+    EXPECT_TRUE(isNoticed([](SceneContent& content) {
+        content.meshes[0].placed.world_from_mesh = KM_Xform::Translation(0.0, 0.0, 1e-9);
+    }));
+    EXPECT_TRUE(isNoticed([](SceneContent& content) {
+        Material material = *content.meshes[0].placed.material;
+        material.base_color = {1, 2, 3, 4};
+        content.meshes[0].placed.material = std::make_shared<Material>(material);
+    }));
+    EXPECT_TRUE(isNoticed([](SceneContent& content) {
+        Material material = *content.meshes[0].placed.material;
+        Texture texture = *material.base_color_texture;
+        texture.rgba[2] = 4;
+        material.base_color_texture = std::make_shared<Texture>(texture);
+        content.meshes[0].placed.material = std::make_shared<Material>(material);
+    }));
+    EXPECT_TRUE(isNoticed([](SceneContent& content) {
+        content.curves[0].polyline.Append({1.0, 2.0, 4.0});
+    }));
+    EXPECT_TRUE(isNoticed([](SceneContent& content) { content.points[0].location.x = 1.0; }));
+    EXPECT_TRUE(isNoticed([](SceneContent& content) {
+        content.lights[0] = sunLight({0.0, 1.0, -1.0});
+    }));
+    EXPECT_TRUE(isNoticed([](SceneContent& content) { content.lights.clear(); }));
+}
+
+} // namespace
+} // namespace quarn::test
