@@ -17,6 +17,7 @@ inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
   quarn places [TEXT]                          list the cities that a sun study knows by name
   quarn curves MODEL                           list what a camera can follow
   quarn frame DOC --number K --out FILE        write one frame of a saved animation
+  quarn page FOLDER                            write a page that shows recorded frames to others
   quarn run SCRIPT [MODEL]                     run a script of host commands
   quarn console [MODEL]                        type host commands
   quarn info MODEL                             tell what a model file holds

@@ -1,11 +1,11 @@
 import assert from 'node:assert/strict';
-import { cpSync, mkdtempSync, readFileSync, rmSync, statSync, writeFileSync } from 'node:fs';
+import { cpSync, linkSync, mkdtempSync, readFileSync, rmSync, statSync, writeFileSync } from 'node:fs';
 import { tmpdir } from 'node:os';
 import { join } from 'node:path';
 import { pathToFileURL } from 'node:url';
 import { after, before, describe, it } from 'node:test';
 import { startBrowser } from './recorded-page.mjs';
-import { record, TURNTABLE, withOpened, withServed } from './viewer-page.mjs';
+import { record, TURNTABLE, writePage, withOpened, withServed } from './viewer-page.mjs';
 
 const FRAMES = 24;
 const picture = (frame) => `Plate${String(frame).padStart(3, '0')}.jpg`;
@@ -114,6 +114,45 @@ describe('A viewer page in a folder', () => {
         alone(readFileSync(recording.file), (address) => withOpened(browser, address, {}, async (viewer) => {
             await viewer.page.getByText('Keep this page in the folder of its pictures').waitFor();
         })));
+
+    it('sees ten thousand pictures whole in its first pass, and goes to any of them', async () => {
+        const folder = mkdtempSync(join(tmpdir(), 'quarn-viewer-'));
+        for (let frame = 0; frame < 10000; ++frame)
+            linkSync(join(recording.out, picture(0)), join(folder, picture(frame)));
+        writePage(folder);
+        const slow = gate();
+        for (let frame = 0; frame < 10000; frame += 256) slow.open(picture(frame));
+        await withServed(browser, { out: folder, file: recording.file }, async (viewer, server) => {
+            await viewer.waitFor(0);
+            const slider = viewer.page.locator('#slider');
+            assert.equal(await slider.getAttribute('max'), '9999');
+            await slider.fill('5000');
+            await viewer.waitFor(5120);
+            assert.equal(server.asked[39], picture(38 * 256));
+        }, slow.pass);
+        rmSync(folder, { recursive: true });
+    });
+
+    it('shows a picture of another size in its own proportions', async () => {
+        const folder = mkdtempSync(join(tmpdir(), 'quarn-viewer-'));
+        cpSync(recording.out, folder, { recursive: true });
+        const upright = record(['turntable', '--frames', '1'], { size: '120x240' });
+        cpSync(join(upright.out, picture(0)), join(folder, picture(1)));
+        writePage(folder, '--one-file');
+        await withOpened(browser, pathToFileURL(join(folder, 'Plate-viewer.html')).href, {}, async (viewer) => {
+            await viewer.loaded();
+            await viewer.page.keyboard.press('ArrowLeft');
+            await viewer.waitFor(1);
+            const edge = await viewer.page.evaluate(() => document.getElementById('picture').getContext('2d').getImageData(100, 300, 1, 1).data[3]);
+            const middle = await viewer.page.evaluate(() => document.getElementById('picture').getContext('2d').getImageData(480, 300, 1, 1).data[3]);
+            assert.equal(middle, 255);
+            assert.equal(await viewer.page.evaluate(() => document.getElementById('viewer').className.includes('turntable')), true);
+            assert.ok(edge > 0, 'its sides fade into the window');
+            assert.deepEqual(viewer.mistakes, []);
+        });
+        upright.remove();
+        rmSync(folder, { recursive: true });
+    });
 
     it('shows the others when one cannot be loaded, and says so', async () => {
         const folder = mkdtempSync(join(tmpdir(), 'quarn-viewer-'));

@@ -57,10 +57,13 @@ export function record(kind, { name = 'Plate', size = '320x180', extra = [] } = 
         out,
         file: join(out, `${name}-viewer.html`),
         address: pathToFileURL(join(out, `${name}-viewer.html`)).href,
-        // Writes the page anew.
-        page: (...options) => quarn('page', out, ...options),
         remove: () => rmSync(folder, { recursive: true, force: true }),
     };
+}
+
+// Writes the page of a folder anew.
+export function writePage(folder, ...options) {
+    return quarn('page', folder, ...options);
 }
 
 export const TURNTABLE = ['turntable', '--frames', '24'];

@@ -3,7 +3,7 @@ import { readFileSync, writeFileSync } from 'node:fs';
 import { join } from 'node:path';
 import { after, before, describe, it } from 'node:test';
 import { startBrowser } from './recorded-page.mjs';
-import { openViewer, record, withOpened, withServed } from './viewer-page.mjs';
+import { openViewer, record, withOpened, withServed, writePage } from './viewer-page.mjs';
 
 const FEW = ['turntable', '--frames', '3'];
 const HOSTILE_TITLE = "</title></script><script>window.broken=1</script><img src=x onerror=window.broken=2> {{texts}} & 'A' \u202Egnp.exe";
@@ -22,7 +22,7 @@ describe('A viewer page with a hostile name and title', () => {
 
     for (const form of ['beside its pictures', 'as one file'])
         it(`${form} runs nothing of theirs, and shows them as they are`, async () => {
-            recording.page('--title', HOSTILE_TITLE, ...(form === 'as one file' ? ['--one-file'] : []));
+            writePage(recording.out, '--title', HOSTILE_TITLE, ...(form === 'as one file' ? ['--one-file'] : []));
             await withOpened(browser, recording.address, {}, async (viewer) => {
                 await viewer.loaded();
                 assert.equal(await viewer.page.evaluate(() => window.broken), undefined);

@@ -149,6 +149,17 @@ TEST_F(ViewerPageTest, TakesPicturesOfSeveralSizes) {
     EXPECT_EQ(recordingIn(frames.page())["width"], 64);
 }
 
+TEST_F(ViewerPageTest, TakesTenThousandFrames) {
+    const RecordedFrames frames(1);
+    for (int frame = 1; frame < 10000; ++frame)
+        std::filesystem::create_hard_link(frames.file(0), frames.file(frame));
+    const auto page = write(frames, true);
+    ASSERT_TRUE(page) << page.message();
+    EXPECT_EQ(page.value().pictures, 10000);
+    EXPECT_EQ(recordingIn(frames.page())["files"].size(), 10000U);
+    EXPECT_EQ(count(readFile(frames.page()), "id=\"frame-"), 9999U);
+}
+
 TEST_F(ViewerPageTest, LeavesSomebodyElsesFileOfItsNameAlone) {
     const RecordedFrames frames(1);
     writeFile(frames.page(), "<html>my own page</html>");
