@@ -15,6 +15,7 @@ const OPTIONS = ['--no-sandbox', '--disable-dev-shm-usage', '--disable-backgroun
 const WINDOW = { width: 1440, height: 900 };
 const DRAG_MS = 2000;
 const MOUSE_MS = 8;
+const STEP_PX = 19; // about a picture of 72
 
 const [page, runs = '5'] = process.argv.slice(2);
 if (!page) {
@@ -40,41 +41,36 @@ function watch() {
     requestAnimationFrame(look);
 }
 
+// Turns it a little as soon as there is something to see.
 async function turnOnce(tab) {
     await tab.waitForFunction(() => window.noted?.first, null, { polling: 'raf' });
-    const shown = await tab.evaluate(() => window.noted.shown);
-    await tab.mouse.move(700, 450);
-    await tab.mouse.down();
-    await tab.mouse.move(900, 450, { steps: 4 });
-    const turned = await tab.waitForFunction(
-        (before) => window.noted.shown !== before && performance.now(), shown, { polling: 'raf' });
-    const time = await turned.jsonValue();
-    await tab.mouse.up();
-    return time;
+    await dragFor(tab, () => tab.evaluate(() => window.noted.changes.length < 2));
+    return tab.evaluate(() => window.noted.changes[1]);
 }
 
 // Moves the mouse to and fro as often as a good mouse tells, whether or not the page keeps up.
-async function drag(tab) {
+// Returns how many seconds it took.
+async function dragFor(tab, goesOn) {
     const input = await tab.context().newCDPSession(tab);
     const send = (type, x) => input.send('Input.dispatchMouseEvent',
         { type, x, y: 450, button: 'left', buttons: 1, clickCount: 1 });
-    await send('mousePressed', 300);
+    const sent = [send('mousePressed', 300)];
     const start = performance.now();
-    const sent = [];
-    for (let x = 300, step = 11; performance.now() - start < DRAG_MS; x += step) {
+    for (let x = 300, step = STEP_PX; await goesOn(performance.now() - start); x += step) {
         if (x + step > 1200 || x + step < 250) step = -step;
         sent.push(send('mouseMoved', x));
         await new Promise((resolve) => setTimeout(resolve, MOUSE_MS));
     }
+    const seconds = (performance.now() - start) / 1000;
     await Promise.all(sent);
     await send('mouseReleased', 300);
-    return (performance.now() - start) / 1000;
+    return seconds;
 }
 
 async function tracedDrag(browser, tab) {
     await browser.startTracing(tab, { categories: ['devtools.timeline', 'disabled-by-default-devtools.timeline.frame'] });
     const before = await tab.evaluate(() => window.noted.changes.length);
-    const seconds = await drag(tab);
+    const seconds = await dragFor(tab, (passed_ms) => passed_ms < DRAG_MS);
     const after = await tab.evaluate(() => window.noted.changes.length);
     const trace = JSON.parse(await browser.stopTracing());
     const drawn = trace.traceEvents.filter((event) => event.name === 'DrawFrame').length;

@@ -61,7 +61,8 @@ class Frames {
         const [before, now] = [this.scaleFor(this.width), this.scaleFor(width)];
         this.width = width;
         if (before === now) return;
-        for (const frame of [...this.decoded.keys()]) this.drop(frame);
+        const kept = this.nearest(this.cursor); // so that there is always something to see
+        for (const frame of [...this.decoded.keys()]) if (frame !== kept) this.drop(frame);
         this.work();
     }
 
@@ -106,7 +107,7 @@ class Frames {
     }
 
     frameToLoad() {
-        if (this.next > FIRST_PASS && this.isNeeded(this.cursor)) return this.cursor;
+        if (this.next > this.order.length / 8 && this.isNeeded(this.cursor)) return this.cursor;
         if (this.isFull) return this.ahead().find((frame) => this.isNeeded(frame));
         while (this.next < this.order.length) {
             const frame = this.order[this.next++];

@@ -30,6 +30,9 @@ class Viewer {
         }).observe(element('stage'));
         for (const type of ['pointermove', 'pointerdown', 'keydown', 'focusin'])
             document.addEventListener(type, () => this.wake());
+        // The picture that is printed is the page's own, the first.
+        addEventListener('beforeprint', () => this.sun?.show(this.recording.first));
+        addEventListener('afterprint', () => this.paint());
     }
 
     // What a person does: the page is theirs from now on.

@@ -97,10 +97,16 @@ describe('The page of a sun study', () => {
     });
 
     it('prints its first picture, title and caption, and no controls', async () => {
+        await viewer.page.locator('#slider').fill('4');
+        await viewer.waitFor(4);
+        await viewer.page.evaluate(() => dispatchEvent(new Event('beforeprint')));
+        assert.equal(await text('#sun-time'), '04:00');
         await viewer.page.emulateMedia({ media: 'print' });
         for (const id of ['#first', 'h1', '#sun-time']) assert.equal(await viewer.page.locator(id).isVisible(), true, id);
         for (const id of ['#controls', '#picture']) assert.equal(await viewer.page.locator(id).isVisible(), false, id);
         await viewer.page.emulateMedia({ media: 'screen' });
+        await viewer.page.evaluate(() => dispatchEvent(new Event('afterprint')));
+        assert.equal(await text('#sun-time'), '12:00');
     });
 
     it('has all of it on a phone, upright and lying', async () => {

@@ -54,7 +54,7 @@ describe('A viewer page', () => {
     before(() => { recording = record(FEW, { extra: ['--one-file'] }); });
     after(() => { recording?.remove(); });
 
-    const words = { 'de-AT': 'Abspielen', 'es': 'Reproducir', 'fr-CA': 'Lire', 'ja-JP': '再生', 'zh-Hans-CN': '播放', 'pt': 'Play' };
+    const words = { 'de-AT': 'Abspielen', 'zh-Hans-CN': '播放', 'pt': 'Play' };
     for (const [locale, play] of Object.entries(words))
         it(`speaks to a reader of ${locale}`, async () => {
             await withOpened(browser, recording.address, { locale }, async (viewer) => {
