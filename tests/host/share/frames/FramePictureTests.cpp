@@ -24,14 +24,14 @@ TEST(FramePicture, IsReadBackInEveryFormatThatIsRecorded) {
 
 TEST(FramePicture, ThatCannotBeReadIsNamedWithTheReason) {
     const RecordedFrames frames(1);
-    const auto whyNot = [&](int frame) { return readFramePicture(frames.file(frame)).message(); };
-    EXPECT_THAT(whyNot(7), HasSubstr("House007.jpg"));
+    const auto whyNotRead = [&](int frame) { return whyNot(readFramePicture(frames.file(frame))); };
+    EXPECT_THAT(whyNotRead(7), HasSubstr("House007.jpg"));
     frames.cut(0);
-    EXPECT_THAT(whyNot(0), AllOf(HasSubstr("House000.jpg"), HasSubstr("cut off")));
+    EXPECT_THAT(whyNotRead(0), AllOf(HasSubstr("House000.jpg"), HasSubstr("cut off")));
     writeFile(frames.file(0), "");
-    EXPECT_THAT(whyNot(0), HasSubstr("empty"));
+    EXPECT_THAT(whyNotRead(0), HasSubstr("empty"));
     writeFile(frames.file(0), "This is a text and no picture.");
-    EXPECT_THAT(whyNot(0), HasSubstr("not a picture of a known kind"));
+    EXPECT_THAT(whyNotRead(0), HasSubstr("not a picture of a known kind"));
 }
 
 } // namespace

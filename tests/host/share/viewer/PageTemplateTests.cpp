@@ -1,5 +1,5 @@
 #include "host/share/viewer/PageTemplate.h"
-#include "tests/support/TempFolder.h"
+#include "tests/host/share/viewer/RecordedFrames.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -47,9 +47,9 @@ TEST_F(PageTemplateTest, DoesNotLookThroughWhatCameIntoAPlace) {
 
 TEST_F(PageTemplateTest, NamesTheFileOrThePlaceThatIsMissing) {
     writeFile(m_folder / "page.html", "{{file:gone.js}}");
-    EXPECT_THAT(fill({}).message(), HasSubstr("gone.js"));
+    EXPECT_THAT(whyNot(fill({})), HasSubstr("gone.js"));
     writeFile(m_folder / "page.html", "{{unknown}}");
-    EXPECT_THAT(fill({}).message(), HasSubstr("{{unknown}}"));
+    EXPECT_THAT(whyNot(fill({})), HasSubstr("{{unknown}}"));
 }
 
 // RFC 4648, section 10.

@@ -8,6 +8,11 @@
 
 namespace quarn::test {
 
+/// Why something could not be made; empty where it could.
+template <class T> std::string whyNot(const Result<T>& result) {
+    return result ? "" : result.message();
+}
+
 /// A picture of one colour.
 inline Image plainPicture(int width, int height, std::uint8_t red) {
     Image image;

@@ -138,7 +138,7 @@ TEST_F(ViewerPageTest, IsNotWrittenWithoutAWholePicture) {
     const RecordedFrames frames(1);
     frames.cut(0);
     const auto page = write(frames);
-    EXPECT_THAT(page.message(), HasSubstr("No frame in "));
+    EXPECT_THAT(whyNot(page), HasSubstr("No frame in "));
     EXPECT_FALSE(std::filesystem::exists(frames.page()));
 }
 
@@ -163,7 +163,7 @@ TEST_F(ViewerPageTest, TakesTenThousandFrames) {
 TEST_F(ViewerPageTest, LeavesSomebodyElsesFileOfItsNameAlone) {
     const RecordedFrames frames(1);
     writeFile(frames.page(), "<html>my own page</html>");
-    EXPECT_THAT(write(frames).message(), HasSubstr("is left alone"));
+    EXPECT_THAT(whyNot(write(frames)), HasSubstr("is left alone"));
     EXPECT_EQ(readFile(frames.page()), "<html>my own page</html>");
     m_sources.overwrites = true;
     EXPECT_TRUE(write(frames));
@@ -218,7 +218,7 @@ TEST_F(ViewerPageTest, OnAFullDiskIsNotThereOrStaysAsItWas) {
     const std::string before = readFile(frames.page());
     {
         const SmallDisk disk(before.size() / 2);
-        EXPECT_THAT(write(frames, true).message(), HasSubstr("Cannot write"));
+        EXPECT_THAT(whyNot(write(frames, true)), HasSubstr("Cannot write"));
     }
     EXPECT_EQ(readFile(frames.page()), before);
     EXPECT_EQ(std::distance(std::filesystem::directory_iterator(frames.folder()), {}), 4);
@@ -227,7 +227,7 @@ TEST_F(ViewerPageTest, OnAFullDiskIsNotThereOrStaysAsItWas) {
 TEST_F(ViewerPageTest, SaysThatTheProgramsFilesAreMissing) {
     const RecordedFrames frames(1);
     m_sources.viewer_folder = frames.folder();
-    EXPECT_THAT(write(frames).message(), AllOf(HasSubstr("viewer.html"), HasSubstr("Install")));
+    EXPECT_THAT(whyNot(write(frames)), AllOf(HasSubstr("viewer.html"), HasSubstr("Install")));
     EXPECT_FALSE(std::filesystem::exists(frames.page()));
 }
 
