@@ -81,22 +81,25 @@ private:
     }
 
     void leaveOutDamaged() {
-        std::string first;
-        const auto damaged = std::erase_if(m_manifest.images, [&](const ManifestFrame& frame) {
+        std::vector<std::string> damaged;
+        const std::size_t all = m_manifest.images.size();
+        std::erase_if(m_manifest.images, [&](const ManifestFrame& frame) {
             if (isWholePicture(pathOf(frame)))
                 return false;
-            first = first.empty() ? frame.file : first;
+            damaged.push_back(frame.file);
             return true;
         });
-        tellDamaged(static_cast<int>(damaged), first);
+        tellDamaged(damaged, all);
     }
 
-    void tellDamaged(int count, const std::string& first) {
-        if (count > 0)
+    void tellDamaged(const std::vector<std::string>& files, std::size_t all) {
+        if (!files.empty())
             m_page.warnings.push_back(sentence(
                 QnLocalizeString(
-                    L"%d frames are cut off or damaged and are not shown; the first is %s.", 42745),
-                count, KM_wString::FromUtf8(first).Array()));
+                    L"%d of %d frames are cut off or damaged and are not shown; the first is %s.",
+                    42745),
+                static_cast<int>(files.size()), static_cast<int>(all),
+                KM_wString::FromUtf8(files.front()).Array()));
     }
 
     Error noFrames() const {
@@ -207,8 +210,7 @@ private:
     }
 
     void finishReport() {
-        tellDamaged(static_cast<int>(m_unreadable.size()),
-                    m_unreadable.empty() ? "" : m_unreadable.front());
+        tellDamaged(m_unreadable, m_manifest.images.size());
         m_page.pictures = static_cast<int>(m_manifest.images.size() - m_unreadable.size());
     }
 

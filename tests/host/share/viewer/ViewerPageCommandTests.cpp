@@ -61,7 +61,7 @@ TEST_F(ViewerPageCommandTest, ShowsWhatThereIsOfADamagedRecordingAndSaysWhatIsMi
     EXPECT_EQ(run(folderOf(frames) + " _Enter"), CQuarnCommand::success);
     EXPECT_THAT(printed(),
                 AllOf(HasSubstr("House.frames.json"), HasSubstr("1 of 4 frames are missing"),
-                      HasSubstr("1 frames are cut off"), HasSubstr(": 2 pictures")));
+                      HasSubstr("1 of 3 frames are cut off"), HasSubstr(": 2 pictures")));
 }
 
 } // namespace

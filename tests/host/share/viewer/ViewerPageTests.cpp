@@ -109,8 +109,9 @@ TEST_F(ViewerPageTest, LeavesOutWhatIsCutOffAndSaysSo) {
         const auto page = write(frames);
         ASSERT_TRUE(page) << page.message();
         EXPECT_EQ(page.value().pictures, 3);
-        EXPECT_THAT(page.value().warnings,
-                    ElementsAre(AllOf(StartsWith("1 frames are cut off"), HasSubstr("House002"))));
+        EXPECT_THAT(
+            page.value().warnings,
+            ElementsAre(AllOf(StartsWith("1 of 4 frames are cut off"), HasSubstr("House002"))));
         EXPECT_TRUE(recordingIn(frames.page())["files"][2].is_null());
     }
 }
