@@ -17,6 +17,7 @@ inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
   quarn curves MODEL                           list what a camera can follow
   quarn frame DOC --number K --out FILE        write one frame of a saved animation
   quarn camera DOC --out FILE.glb              write its camera for other programs
+  quarn page FOLDER                            write a page that shows recorded frames to others
   quarn run SCRIPT [MODEL]                     run a script of host commands
   quarn console [MODEL]                        type host commands
   quarn info MODEL                             tell what a model file holds
@@ -148,6 +149,16 @@ and CSV are in the model's units with Z up, and hold every digit.
 Examples:
   quarn camera house.quarn --out camera.glb
   quarn camera house.quarn --out camera.csv --fps 25)";
+
+inline constexpr const char* PAGE_FOOTER = R"(
+NAME-viewer.html is written beside the frames: a turntable turns under mouse and finger, a walk has a
+slider, a sun study shows date, time and the sun. It plays in every browser, from disk or from a web
+server, and calls nobody. With --one-file the pictures are in it, and it needs no folder. A file of
+this name that is no such page is replaced only with --overwrite.
+
+Examples:
+  quarn page frames
+  quarn page frames --one-file --title "The house by the lake")";
 
 inline constexpr const char* RUN_FOOTER = R"(
 A script holds one host command a line; the words after a command's name answer its questions.

@@ -17,7 +17,8 @@ set(tree "${WORK}/moved to/quarn")
 
 foreach(file IN ITEMS bin/quarn bin/quarn-reader lib/libQnCore.so lib/libKelmar.so lib/quarn/plug-ins/Zoetrix.qnp
         include/quarn/kelmar/kelmar.h include/quarn/sdk/qncore/qncore.h
-        share/quarn/dialogs/4203.dialog.json share/quarn/dialogs/Zoetrix/6004.dialog.json)
+        share/quarn/dialogs/4203.dialog.json share/quarn/dialogs/Zoetrix/6004.dialog.json
+        share/quarn/viewer/viewer.html)
     if(NOT EXISTS "${tree}/${file}")
         message(FATAL_ERROR "the installed tree lacks ${file}")
     endif()

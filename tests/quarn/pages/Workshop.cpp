@@ -57,6 +57,7 @@ Workshop::Workshop() {
     writeCurves();
     writeDocuments();
     std::filesystem::create_directory(m_folder / "out"); // as a script needs it
+    writeFrames();
 }
 
 Ended Workshop::run(const std::vector<std::string>& arguments, const std::string& input) const {
@@ -101,6 +102,16 @@ void Workshop::writeDocuments() const {
               "_-ImportCurve [Name] \"Roof line\" arc.txt\n"
               "_-Point _Name Fountain 1,1,1\n_-SaveAs town.quarn\n");
     const Ended ended = run({"run", "documents.txt", "house.obj"});
+    EXPECT_EQ(ended.exit_code, 0) << ended.err;
+}
+
+void Workshop::writeFrames() const {
+    std::filesystem::create_directory(m_folder / "frames");
+    writeFile(m_folder / "frames.txt",
+              "_-ViewportSize 64 48\n_-FitView _Turn=Yes _Enter\n_-AnimationName house\n"
+              "_-SetTurntableAnimation 2 _Clockwise _jpg _Shaded _Enter _Enter\n"
+              "_-RecordAnimation _TargetFolder frames _Enter\n");
+    const Ended ended = run({"run", "frames.txt", "house.obj"});
     EXPECT_EQ(ended.exit_code, 0) << ended.err;
 }
 

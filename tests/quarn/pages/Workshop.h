@@ -21,6 +21,7 @@ private:
     void writeModels() const;
     void writeCurves() const;
     void writeDocuments() const;
+    void writeFrames() const; ///< two of a recording, in the folder frames
 
     TempFolder m_folder;
 };
