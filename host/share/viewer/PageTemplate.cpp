@@ -103,19 +103,4 @@ std::string addressOf(std::string_view file_name) {
     return address;
 }
 
-std::string base64(std::span<const std::byte> bytes) {
-    constexpr std::string_view DIGITS =
-        "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
-    std::string text;
-    text.reserve((bytes.size() + 2) / 3 * 4);
-    for (; !bytes.empty(); bytes = bytes.subspan(std::min<std::size_t>(3, bytes.size()))) {
-        std::uint32_t three = 0;
-        for (std::size_t i = 0; i < 3; ++i)
-            three = three << 8 | (i < bytes.size() ? std::to_integer<std::uint32_t>(bytes[i]) : 0);
-        for (std::size_t i = 0; i < 4; ++i)
-            text += i <= bytes.size() ? DIGITS[three >> (18 - 6 * i) & 63] : '=';
-    }
-    return text;
-}
-
 } // namespace quarn

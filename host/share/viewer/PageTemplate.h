@@ -28,7 +28,5 @@ std::string htmlText(std::string_view text);
 std::string jsonInHtml(std::string json);
 /// A file name as part of an address: only letters, digits and -_.~ stand for themselves.
 std::string addressOf(std::string_view file_name);
-/// Base64 (S. Josefsson, "The Base16, Base32, and Base64 Data Encodings", RFC 4648, section 4).
-std::string base64(std::span<const std::byte> bytes);
 
 } // namespace quarn

@@ -1,6 +1,7 @@
 #include "host/share/viewer/ViewerPage.h"
 
 #include "ground/PathText.h"
+#include "host/share/Base64Text.h"
 #include "host/share/frames/FramePicture.h"
 #include "host/share/viewer/PagePictures.h"
 #include "host/share/viewer/PageRecording.h"
@@ -204,7 +205,7 @@ private:
     void putPicture(const ManifestFrame& frame, const ByteSink& sink) {
         const auto picture = framesJpeg(pathOf(frame));
         if (picture)
-            put(sink, base64(picture.value()));
+            put(sink, base64Text(picture.value()));
         else
             m_unreadable.push_back(frame.file);
     }

@@ -1,4 +1,6 @@
 #include "host/share/viewer/PageTemplate.h"
+
+#include "host/share/Base64Text.h"
 #include "tests/host/share/viewer/RecordedFrames.h"
 
 #include <gmock/gmock.h>
@@ -54,14 +56,14 @@ TEST_F(PageTemplateTest, NamesTheFileOrThePlaceThatIsMissing) {
 
 // RFC 4648, section 10.
 TEST(Base64, IsThatOfItsTestVectors) {
-    EXPECT_EQ(base64(bytesOf("")), "");
-    EXPECT_EQ(base64(bytesOf("f")), "Zg==");
-    EXPECT_EQ(base64(bytesOf("fo")), "Zm8=");
-    EXPECT_EQ(base64(bytesOf("foo")), "Zm9v");
-    EXPECT_EQ(base64(bytesOf("foob")), "Zm9vYg==");
-    EXPECT_EQ(base64(bytesOf("fooba")), "Zm9vYmE=");
-    EXPECT_EQ(base64(bytesOf("foobar")), "Zm9vYmFy");
-    EXPECT_EQ(base64(bytesOf("\xFB\xFF\xFE")), "+//+");
+    EXPECT_EQ(base64Text(bytesOf("")), "");
+    EXPECT_EQ(base64Text(bytesOf("f")), "Zg==");
+    EXPECT_EQ(base64Text(bytesOf("fo")), "Zm8=");
+    EXPECT_EQ(base64Text(bytesOf("foo")), "Zm9v");
+    EXPECT_EQ(base64Text(bytesOf("foob")), "Zm9vYg==");
+    EXPECT_EQ(base64Text(bytesOf("fooba")), "Zm9vYmE=");
+    EXPECT_EQ(base64Text(bytesOf("foobar")), "Zm9vYmFy");
+    EXPECT_EQ(base64Text(bytesOf("\xFB\xFF\xFE")), "+//+");
 }
 
 TEST(TextsInPages, CannotEndWhatTheyStandIn) {
