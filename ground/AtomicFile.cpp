@@ -76,16 +76,34 @@ Result<Target> targetOf(const fs::path& path, Protection protection) {
 
 enum class Flush { no, yes };
 
-Result<void> write(const Target& target, std::span<const std::byte> bytes, Flush flush) {
+using Fill = std::function<Result<void>(const ByteSink&)>;
+
+Fill fillWith(std::span<const std::byte> bytes) {
+    return [bytes](const ByteSink& sink) {
+        sink(bytes);
+        return Result<void>();
+    };
+}
+
+Result<void> write(const Target& target, const Fill& fill, Flush flush) {
     constexpr mode_t of_new_files = 0666; // less what the user's mask takes away
     constexpr mode_t of_nobody_else = 0600;
     PartFile part(target.folder(), target.replaces ? of_nobody_else : of_new_files);
+    int code = part.isOpen() ? 0 : errno;
     if (part.isOpen() && target.replaces)
         takeOverRights(target.file, target.present, part.descriptor());
-    const bool wrote = part.isOpen() && part.write(bytes) &&
-                       (flush == Flush::no || part.flushToDisk()) && part.close();
-    if (!wrote)
-        return cannotWrite(target, adviceFor(errno));
+    const ByteSink sink = [&](std::span<const std::byte> bytes) {
+        if (code == 0 && !part.write(bytes))
+            code = errno;
+        return code == 0;
+    };
+    const Result<void> filled = code == 0 ? fill(sink) : Result<void>();
+    if (code == 0 && !filled)
+        return filled;
+    if (code == 0 && ((flush == Flush::yes && !part.flushToDisk()) || !part.close()))
+        code = errno;
+    if (code != 0)
+        return cannotWrite(target, adviceFor(code));
     if (part.renameTo(target.file))
         return {};
     const bool is_forbidden = errno == EPERM || errno == EACCES;
@@ -111,7 +129,12 @@ std::string flushFolder(const fs::path& folder) {
 Result<void> writeFileAtomically(const fs::path& path, std::span<const std::byte> bytes,
                                  Protection protection) {
     const Result<Target> target = targetOf(path, protection);
-    return target ? write(target.value(), bytes, Flush::no) : target.error();
+    return target ? write(target.value(), fillWith(bytes), Flush::no) : target.error();
+}
+
+Result<void> writeFileInPieces(const fs::path& path, const Fill& fill, Protection protection) {
+    const Result<Target> target = targetOf(path, protection);
+    return target ? write(target.value(), fill, Flush::no) : target.error();
 }
 
 Result<WrittenFile> writeFileToDisk(const fs::path& path, std::span<const std::byte> bytes,
@@ -121,7 +144,7 @@ Result<WrittenFile> writeFileToDisk(const fs::path& path, std::span<const std::b
         return target.error();
     const fs::path folder = target.value().folder();
     removeLeftParts(folder);
-    if (const Result<void> written = write(target.value(), bytes, Flush::yes); !written)
+    if (const Result<void> written = write(target.value(), fillWith(bytes), Flush::yes); !written)
         return written.error();
     const std::string trouble = flushFolder(folder);
     if (trouble.empty())

@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <filesystem>
+#include <functional>
 #include <span>
 #include <string>
 
@@ -31,6 +32,18 @@ enum class Protection { respected, overridden };
 Result<void> writeFileAtomically(const std::filesystem::path& path,
                                  std::span<const std::byte> bytes,
                                  Protection protection = Protection::respected);
+
+/// Takes the next bytes of a file.
+/// @return false where they could not be written: no more are wanted then
+using ByteSink = std::function<bool(std::span<const std::byte>)>;
+
+/// Writes a file as writeFileAtomically does, whose bytes come piece by piece, so that a large one
+/// is never whole in memory.
+/// @param fill  hands the pieces to the sink; an error of its own keeps the file from being written
+/// @return as writeFileAtomically, or the error of `fill`
+Result<void> writeFileInPieces(const std::filesystem::path& path,
+                               const std::function<Result<void>(const ByteSink&)>& fill,
+                               Protection protection = Protection::respected);
 
 /// A file that stands written.
 struct WrittenFile {

@@ -26,6 +26,7 @@ SessionOptions sessionOptions(const std::string& language) {
     options.locale_folders = {texts / "host"};
     options.program_locale_folder = texts / "desktop";
     options.dialog_folders = {shared / "dialogs"};
+    options.viewer_folder = shared / "viewer";
     options.language = language;
     return options;
 }

@@ -32,6 +32,8 @@ struct SessionOptions {
     /// for in `dialogs/Name` beside its file, then in `Name` in these folders; those of the program
     /// itself in these folders.
     std::vector<std::filesystem::path> dialog_folders = {};
+    /// The folder of the files that viewer pages are made from (`viewer.html` and what it names).
+    std::filesystem::path viewer_folder = {};
     /// Whether write-protected files are replaced, and by a recording also files of others that
     /// have the names of its pictures or its page.
     bool overwrites = false;

@@ -136,6 +136,16 @@ Examples:
   quarn frame house.quarn --number 0 --out first.jpg
   quarn frame house.quarn --number 60 --size 3840x2160 --out middle.png)";
 
+inline constexpr const char* PAGE_FOOTER = R"(
+NAME-viewer.html is written beside the frames: a turntable turns under mouse and finger, a walk has a
+slider, a sun study shows date, time and the sun. It plays in every browser, from disk or from a web
+server, and calls nobody. With --one-file the pictures are in it, and it needs no folder. A file of
+this name that is no such page is replaced only with --overwrite.
+
+Examples:
+  quarn page frames
+  quarn page frames --one-file --title "The house by the lake")";
+
 inline constexpr const char* RUN_FOOTER = R"(
 A script holds one host command a line; the words after a command's name answer its questions.
 Blank lines and lines that start with # are skipped. The first command that fails ends the run. A

@@ -33,6 +33,7 @@ constexpr Subcommand SUBCOMMANDS[] = {
     {"places", "List the cities that a sun study knows by name", PLACES_FOOTER, addPlaces},
     {"curves", "List what a camera can follow", CURVES_FOOTER, addCurves},
     {"frame", "Write one frame of a document's animation", FRAME_FOOTER, addFrame},
+    {"page", "Write a page that shows recorded frames to others", PAGE_FOOTER, addPage},
     {"run", "Run a script of host commands", RUN_FOOTER, addRun},
     {"console", "Type host commands", CONSOLE_FOOTER, addConsole},
     {"info", "Tell what a model file holds", INFO_FOOTER, addInfo},

@@ -57,6 +57,15 @@ void addHidden(CLI::App& command, std::vector<std::string>& hidden) {
         });
 }
 
+void addViewer(CLI::App& command, ViewerRequest& viewer) {
+    command.add_flag("--viewer", viewer.is_wanted,
+                     "Also write NAME-viewer.html, a page to show to others: quarn page --help "
+                     "tells more");
+    command.add_flag_callback(
+        "--one-file", [&viewer] { viewer.is_wanted = viewer.is_one_file = true; },
+        "The same with the pictures inside, so that it can be sent alone");
+}
+
 } // namespace
 
 void addCommonOptions(CLI::App& command, CommonOptions& common) {
@@ -108,6 +117,7 @@ void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse
     addHidden(command, request.hidden);
     add("--name", request.name, "NAME", animationName(),
         "Name of the animation (default: the model file's)");
+    addViewer(command, request.viewer);
     add("--save", request.document, "DOC", documentFile(),
         "Keep the document with its animation in this .quarn file, before recording");
     addOverwrite(command, use.common);

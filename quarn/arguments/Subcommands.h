@@ -22,6 +22,7 @@ Action addSeason(CLI::App& command);
 Action addPlaces(CLI::App& command);
 Action addCurves(CLI::App& command);
 Action addFrame(CLI::App& command);
+Action addPage(CLI::App& command);
 Action addRun(CLI::App& command);
 Action addConsole(CLI::App& command);
 Action addInfo(CLI::App& command);

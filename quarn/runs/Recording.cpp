@@ -65,6 +65,18 @@ std::optional<Outcome> refuse(const RecordingRequest& request, bool overwrites) 
     return std::nullopt;
 }
 
+/// Makes of the frames what is asked for; what became of it is told behind the recording.
+Outcome share(const RecordingScript& script, HostSession& host, const Outcome& recorded) {
+    std::string text = recorded.text;
+    for (const std::string& line : script.sharing) {
+        if (const auto trouble = host.run(line))
+            return {trouble->exit_code, text + "\n" + trouble->text};
+        if (host.frontEnd().hidesWords())
+            text += "\n" + host.frontEnd().lastWords();
+    }
+    return Outcome::success(text);
+}
+
 Outcome record(const RecordingRequest& request, const RecordingScript& script, HostSession& host,
                Clock::time_point start) {
     if (const auto refusal = whyFolderCannotBeUsed(request.folder))
@@ -78,7 +90,8 @@ Outcome record(const RecordingRequest& request, const RecordingScript& script, H
     front_end.beginRecording(request.frames);
     (void)host.run(script.recording); // what counts is what there is
     front_end.clearProgress();
-    return RecordingEnd(request, front_end).outcome(Clock::now() - start);
+    const Outcome end = RecordingEnd(request, front_end).outcome(Clock::now() - start);
+    return end.exit_code == Outcome::done ? share(script, host, end) : end;
 }
 
 /// At once, so that they can be read while the recording runs.

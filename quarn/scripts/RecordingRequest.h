@@ -1,6 +1,7 @@
 #pragma once
 
 #include "quarn/scripts/CaptureMode.h"
+#include "quarn/scripts/ViewerScript.h"
 #include "quarn/words/Words.h"
 
 #include <filesystem>
@@ -23,11 +24,17 @@ struct RecordingRequest {
     std::string format; ///< "jpg", "png", "bmp" or "tga"
     std::vector<std::string> hidden; ///< names of objects; UTF-8
     std::filesystem::path document;  ///< to save, a .quarn file; empty: none
+    ViewerRequest viewer;
 };
 
 /// The path of the page that the recording writes.
 inline std::filesystem::path pagePath(const RecordingRequest& request) {
     return request.folder / (request.name + ".html");
+}
+
+/// The path of the list of frames that it writes at its end.
+inline std::filesystem::path framesPath(const RecordingRequest& request) {
+    return request.folder / (request.name + ".frames.json");
 }
 
 } // namespace quarn::program

@@ -32,6 +32,8 @@ RecordingScript composeRecording(const RecordingRequest& request, const Animatio
     if (!request.document.empty())
         script.saving = "_-SaveAs " + quotedPath(request.document);
     script.recording = "_-RecordAnimation _TargetFolder " + quotedPath(request.folder) + " _Enter";
+    if (request.viewer.is_wanted)
+        script.sharing.push_back(viewerLine(framesPath(request), request.viewer));
     return script;
 }
 
@@ -49,7 +51,10 @@ std::string scriptText(const RecordingScript& script) {
     text += "# The folder must be there before the recording starts.\n";
     if (script.saving)
         text += *script.saving + "\n";
-    return text + script.recording;
+    text += script.recording;
+    for (const std::string& line : script.sharing)
+        text += "\n" + line;
+    return text;
 }
 
 } // namespace quarn::program

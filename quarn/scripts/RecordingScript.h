@@ -22,7 +22,8 @@ struct RecordingScript {
     std::vector<std::string> set_up; ///< from the model to the animation
     /// Keeps the document before the recording begins, so that one which is stopped keeps it too.
     std::optional<std::string> saving;
-    std::string recording; ///< this and `saving` need the folder to be there
+    std::string recording;            ///< this and `saving` need the folder to be there
+    std::vector<std::string> sharing; ///< what is made of the frames afterwards
 };
 
 RecordingScript composeRecording(const RecordingRequest& request, const AnimationLines& lines);

@@ -18,6 +18,7 @@ SessionOptions sessionOptions(const CommonOptions& common) {
     options.locale_folders = {hostLocaleFolder()};
     options.language = common.language;
     options.dialog_folders = {dialogFolder()};
+    options.viewer_folder = viewerFolder();
     options.overwrites = common.overwrites;
     options.most_memory = common.most_memory;
     return options;

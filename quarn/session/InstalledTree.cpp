@@ -22,4 +22,8 @@ std::filesystem::path dialogFolder() {
     return installedTree() / "share" / "quarn" / "dialogs";
 }
 
+std::filesystem::path viewerFolder() {
+    return installedTree() / "share" / "quarn" / "viewer";
+}
+
 } // namespace quarn::program

@@ -17,4 +17,7 @@ std::filesystem::path hostLocaleFolder();
 /// Where the dialog templates of plug-ins are, in a folder for each.
 std::filesystem::path dialogFolder();
 
+/// Where the files are that viewer pages are made from.
+std::filesystem::path viewerFolder();
+
 } // namespace quarn::program

@@ -164,6 +164,31 @@ TEST(AtomicFile, FileThatTheSystemLetsNobodyReplaceIsToldAndStays) {
     EXPECT_EQ(std::distance(fs::directory_iterator(folder.path()), fs::directory_iterator()), 1);
 }
 
+// ---- Files that come in pieces
+
+TEST(FileInPieces, HasThemInTheirOrder) {
+    const TempFolder folder;
+    const auto written = writeFileInPieces(folder / "a.txt", [](const ByteSink& sink) {
+        EXPECT_TRUE(sink(bytesOf("one, ")));
+        EXPECT_TRUE(sink(bytesOf("two")));
+        return Result<void>();
+    });
+    ASSERT_TRUE(written.ok()) << written.message();
+    EXPECT_EQ(readFile(folder / "a.txt"), "one, two");
+}
+
+TEST(FileInPieces, IsNotThereWhereTheyEndInAnError) {
+    const TempFolder folder;
+    writeFile(folder / "a.txt", "old");
+    const auto written = writeFileInPieces(folder / "a.txt", [](const ByteSink& sink) {
+        sink(bytesOf("new"));
+        return Result<void>(Error{"The second piece is lost."});
+    });
+    EXPECT_EQ(written.message(), "The second piece is lost.");
+    EXPECT_EQ(readFile(folder / "a.txt"), "old");
+    EXPECT_EQ(std::distance(fs::directory_iterator(folder.path()), fs::directory_iterator()), 1);
+}
+
 // ---- Folders that cannot be flushed
 
 TEST(AtomicFile, WhereTheFolderCannotBeFlushedTheFileIsWrittenWithAWarning) {
