@@ -34,6 +34,7 @@ constexpr Subcommand SUBCOMMANDS[] = {
     {"curves", "List what a camera can follow", CURVES_FOOTER, addCurves},
     {"frame", "Write one frame of a document's animation", FRAME_FOOTER, addFrame},
     {"page", "Write a page that shows recorded frames to others", PAGE_FOOTER, addPage},
+    {"video", "Make a film of recorded pictures", VIDEO_FOOTER, addVideo},
     {"run", "Run a script of host commands", RUN_FOOTER, addRun},
     {"console", "Type host commands", CONSOLE_FOOTER, addConsole},
     {"info", "Tell what a model file holds", INFO_FOOTER, addInfo},

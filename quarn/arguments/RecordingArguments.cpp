@@ -1,5 +1,6 @@
 #include "quarn/arguments/RecordingArguments.h"
 
+#include "quarn/arguments/FilmArguments.h"
 #include "quarn/arguments/Readings.h"
 #include "quarn/words/AnimationName.h"
 
@@ -120,6 +121,8 @@ void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse
     addViewer(command, request.viewer);
     add("--save", request.document, "DOC", documentFile(),
         "Keep the document with its animation in this .quarn file, before recording");
+    addRecordingFilm(command, request.film,
+                     subject == CaptureSubject::moving_sun ? FilmTimes::perhaps : FilmTimes::none);
     addOverwrite(command, use.common);
     addShowScript(command, use.is_only_shown);
     addCommonOptions(command, use.common);
@@ -134,6 +137,8 @@ std::optional<std::string> settle(RecordingRequest& request) {
         return "--samples is for rendered pictures: with it --mode must be RenderFull or "
                "RenderPreview, not \"" +
                request.mode.name + "\".";
+    if (auto mistake = whyFilmIsMisused(request.film))
+        return mistake;
     if (request.name.empty())
         request.name = animationNameFor(request.model);
     return std::nullopt;

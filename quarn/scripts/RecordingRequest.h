@@ -1,6 +1,7 @@
 #pragma once
 
 #include "quarn/scripts/CaptureMode.h"
+#include "quarn/scripts/FilmScript.h"
 #include "quarn/scripts/ViewerScript.h"
 #include "quarn/words/Words.h"
 
@@ -24,6 +25,7 @@ struct RecordingRequest {
     std::string format; ///< "jpg", "png", "bmp" or "tga"
     std::vector<std::string> hidden; ///< names of objects; UTF-8
     std::filesystem::path document;  ///< to save, a .quarn file; empty: none
+    FilmRequest film;
     ViewerRequest viewer;
 };
 
