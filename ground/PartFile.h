@@ -20,6 +20,8 @@ public:
 
     bool isOpen() const { return m_descriptor >= 0; }
     int descriptor() const { return m_descriptor; }
+    /// Where it is until it is renamed.
+    const std::filesystem::path& path() const { return m_path; }
 
     bool write(std::span<const std::byte> bytes) const;
     bool flushToDisk() const;

@@ -33,6 +33,8 @@ const wchar_t* titleFor(FileUse use) {
         return QnLocalizeString(L"Import a curve", 42506);
     case FileUse::load_plug_in:
         return QnLocalizeString(L"Load a plug-in", 42507);
+    case FileUse::save_film:
+        return QnLocalizeString(L"Save the film", 42765);
     case FileUse::run:
         break;
     }
@@ -76,6 +78,13 @@ std::vector<FileKind> cameras() {
             {QnLocalizeString(L"glTF files", 42825), {"gltf"}},
             {QnLocalizeString(L"JSON files", 42826), {"json"}},
             {QnLocalizeString(L"CSV tables", 42827), {"csv"}}};
+
+std::vector<FileKind> films() {
+    return {{QnLocalizeString(L"MP4 films", 42766), {"mp4"}},
+            {QnLocalizeString(L"WebM films", 42767), {"webm"}},
+            {QnLocalizeString(L"GIF films", 42768), {"gif"}},
+            {QnLocalizeString(L"WebP films", 42769), {"webp"}},
+            {QnLocalizeString(L"APNG films", 42786), {"apng"}}};
 }
 
 std::vector<FileKind> kindsFor(FileUse use) {
@@ -95,6 +104,8 @@ std::vector<FileKind> kindsFor(FileUse use) {
         return {{QnLocalizeString(L"Curve files", 42517), {"txt", "csv", "json"}}, allFiles()};
     case FileUse::load_plug_in:
         return {{QnLocalizeString(L"Plug-ins", 42518), {"qnp"}}, allFiles()};
+    case FileUse::save_film:
+        return films();
     case FileUse::run:
         break;
     }
@@ -103,7 +114,8 @@ std::vector<FileKind> kindsFor(FileUse use) {
 
 bool isSaving(FileUse use) {
     return use == FileUse::save || use == FileUse::save_selected || use == FileUse::save_frame ||
-           use == FileUse::save_rendering || use == FileUse::export_camera;
+           use == FileUse::save_rendering || use == FileUse::export_camera ||
+           use == FileUse::save_film;
 }
 
 /// The folder of the document at work, else that of the user's documents.

@@ -23,6 +23,7 @@ enum class FileUse {
     import_curve,
     load_plug_in,
     run,
+    save_film,
 };
 
 /// Lets a person choose a file.

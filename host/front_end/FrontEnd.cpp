@@ -14,6 +14,12 @@ void FrontEnd::warn(std::wstring_view text) {
     print(std::wstring(text) + L"\n");
 }
 
+void FrontEnd::sharedFileProgress(const std::filesystem::path&, double) {}
+
+void FrontEnd::sharedFileEnded(const SharedFileReport& report) {
+    print(std::wstring(report.text.Array()) + L"\n");
+}
+
 void FrontEnd::pictureRendered(double) {}
 
 void FrontEnd::modelRead(const std::filesystem::path&, ModelStep, double) {}

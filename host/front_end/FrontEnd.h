@@ -4,6 +4,7 @@
 #include "host/front_end/DialogWindow.h"
 #include "host/front_end/FrontEndChoices.h"
 #include "host/front_end/RecordingReport.h"
+#include "host/front_end/SharedFileReport.h"
 #include "kelmar/KM_wString.h"
 #include "sdk/qncore/QnExport.h"
 #include "sdk/qncore/QnWnd.h"
@@ -86,6 +87,13 @@ public:
     /// Told once the command that records an animation has ended, also where it recorded nothing in
     /// a folder that it had. Shows nothing unless it is overridden.
     virtual void recordingEnded(const RecordingReport& report);
+    /// Told again and again while a file for others is made of frames, and the program would do
+    /// nothing else. Shows nothing unless it is overridden.
+    /// @param share  how much of it is done, from 0 to 1
+    virtual void sharedFileProgress(const std::filesystem::path& file, double share);
+    /// Told once such a file is there, or could not be made. Prints its text as a line unless it is
+    /// overridden.
+    virtual void sharedFileEnded(const SharedFileReport& report);
     /// Told some times a second while a picture is rendered. Shows nothing unless it is overridden.
     /// @param share  how much of the picture is done, from 0 to 1; 1 comes last, however it ended
     virtual void pictureRendered(double share);

@@ -13,6 +13,8 @@ inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
                                                record the sun and the shadows through one day
   quarn season MODEL --place NAME --from DATE --to DATE
                                                record those of one time of day through the seasons
+  quarn video FOLDER FILE                      make a film of recorded pictures: .mp4, .webm, .gif,
+                                               .webp or .apng
   quarn places [TEXT]                          list the cities that a sun study knows by name
   quarn curves MODEL                           list what a camera can follow
   quarn frame DOC --number K --out FILE        write one frame of a saved animation
@@ -50,6 +52,7 @@ Examples:
   quarn turntable house.glb
   quarn turntable house.glb --frames 120 --out out/house
   quarn turntable part.stl --frames 36 --out out --mode Shaded --format png --size 640x480
+  quarn turntable house.glb --frames 120 --out out/film --video house.mp4
   quarn turntable town.obj --frames 240 --out out --elevation 35 --distance 0.8 --name Town
   quarn turntable town.obj --start-angle -30 --lens 85 --quality 95 --out out/near
   quarn turntable town.obj --frames 240 --out out --show-script > town.txt)";
@@ -115,6 +118,17 @@ saving do not count, so clocks on the wall differ, most of all in summer:
   London,  0.13 W   here UTC,   on the wall UTC+1: for 14:30 give 13:30
 The zone and the universal time of the first picture are told before the recording begins. Seconds
 are always 0.)";
+
+inline constexpr const char* VIDEO_FOOTER = R"(
+The pictures stand in the film in the order of their numbers. An mp4 plays everywhere; a webm is
+smaller, and takes several times as long; a gif has 256 colours, chosen from all pictures; an apng
+loses nothing and is large. With --video FILE a recording makes the film while it draws.
+
+Examples:
+  quarn turntable house.glb --frames 120 --out out/house
+  quarn video out/house house.mp4
+  quarn video out/house house.gif --width 480 --fps 20
+  quarn day house.glb --place Athens --date 2026-06-21 --out out/sun --video sun.mp4 --caption)";
 
 inline constexpr const char* PLACES_FOOTER = R"(
 The last two columns tell the zone of the clock in quarn day and in quarn season; quarn season

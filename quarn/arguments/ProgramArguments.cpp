@@ -36,6 +36,7 @@ constexpr Subcommand SUBCOMMANDS[] = {
     {"camera", "Write the camera of each frame of a document's animation for other programs",
      CAMERA_FOOTER, addCamera},
     {"page", "Write a page that shows recorded frames to others", PAGE_FOOTER, addPage},
+    {"video", "Make a film of recorded pictures", VIDEO_FOOTER, addVideo},
     {"run", "Run a script of host commands", RUN_FOOTER, addRun},
     {"console", "Type host commands", CONSOLE_FOOTER, addConsole},
     {"info", "Tell what a model file holds", INFO_FOOTER, addInfo},

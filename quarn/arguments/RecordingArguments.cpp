@@ -1,5 +1,6 @@
 #include "quarn/arguments/RecordingArguments.h"
 
+#include "quarn/arguments/FilmArguments.h"
 #include "quarn/arguments/Readings.h"
 #include "quarn/words/AnimationName.h"
 
@@ -130,6 +131,8 @@ void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse
     addViewer(command, request.viewer);
     add("--save", request.document, "DOC", documentFile(),
         "Keep the document with its animation in this .quarn file, before recording");
+    addRecordingFilm(command, request.film,
+                     subject == CaptureSubject::moving_sun ? FilmTimes::perhaps : FilmTimes::none);
     addOverwrite(command, use.common);
     addShowScript(command, use.is_only_shown);
     addCommonOptions(command, use.common);
@@ -150,6 +153,8 @@ std::optional<std::string> settle(RecordingRequest& request) {
         request.folder = request.model.parent_path() / request.model.stem();
         request.has_own_folder = true;
     }
+    if (auto mistake = whyFilmIsMisused(request.film))
+        return mistake;
     if (request.name.empty())
         request.name = animationNameFor(request.model);
     return std::nullopt;

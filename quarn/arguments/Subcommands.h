@@ -19,6 +19,7 @@ Action addFlythrough(CLI::App& command);
 Action addPath(CLI::App& command);
 Action addDay(CLI::App& command);
 Action addSeason(CLI::App& command);
+Action addVideo(CLI::App& command);
 Action addPlaces(CLI::App& command);
 Action addCurves(CLI::App& command);
 Action addFrame(CLI::App& command);

@@ -1,9 +1,11 @@
 #include "quarn/runs/Recording.h"
 
+#include "host/session/FilmCheck.h"
 #include "host/session/RecordingCheck.h"
 #include "quarn/runs/OutputFolder.h"
 #include "quarn/session/Interruption.h"
 
+#include <algorithm>
 #include <cstdio>
 
 namespace quarn::program {
@@ -16,21 +18,26 @@ using Clock = std::chrono::steady_clock;
 class RecordingEnd {
 public:
     RecordingEnd(const RecordingRequest& request, const ConsoleFrontEnd& front_end)
-        : m_request(request), m_end(endOf(request, front_end)) {}
+        : m_request(request), m_end(endOf(request, front_end)), m_shared(front_end.sharedFiles()) {}
 
     Outcome outcome(Clock::duration taken) const {
         const bool is_complete = m_end.report.isComplete();
         if (!is_complete && isInterruptionRequested())
-            return stopped(interruptedText(m_end.report));
+            return stopped(interruptedText(m_end.report) + sharedText(m_shared));
         if (!is_complete)
-            return Outcome::failure(incompleteText(m_end));
+            return Outcome::failure(incompleteText(m_end) + sharedText(m_shared));
         if (!m_end.report.has_page)
             return Outcome::failure("all frames were written, but the page " + page() +
                                     " could not be" + reasonText() + ".");
         const double seconds = std::chrono::duration<double>(taken).count();
+        if (std::ranges::any_of(m_shared, [](const auto& file) { return !file.is_made; }))
+            return Outcome::failure("all frames and the page were written, but not all that was to "
+                                    "be made of them." +
+                                    sharedText(m_shared));
         const std::string left_over = leftOverText(m_end.report);
         return Outcome::success(frameCountText(m_end.report.there) + " and " + page() + " in " +
-                                timeText(seconds) + (left_over.empty() ? "" : "\n" + left_over));
+                                timeText(seconds) + (left_over.empty() ? "" : "\n" + left_over) +
+                                sharedText(m_shared));
     }
 
 private:
@@ -52,6 +59,7 @@ private:
 
     const RecordingRequest& m_request;
     EndedRecording m_end;
+    const std::vector<SharedFileReport>& m_shared;
 };
 
 /// What cannot come to its end is not begun: reading the model may take long.
@@ -65,6 +73,12 @@ std::optional<Outcome> refuse(const RecordingRequest& request, bool overwrites) 
     const RecordingTarget target{request.folder, request.name, request.format, request.frames,
                                  overwrites};
     if (const auto refusal = whyRecordingIsRefused(target))
+        return Outcome::failure(*refusal);
+    const FilmRequest& film = request.film;
+    if (film.file.empty())
+        return std::nullopt;
+    if (const auto refusal = whyFilmIsRefused({film.file, film.frame_rate, film.quality,
+                                               film.has_caption, overwrites, request.folder}))
         return Outcome::failure(*refusal);
     return std::nullopt;
 }
@@ -87,6 +101,9 @@ Outcome record(const RecordingRequest& request, const RecordingScript& script, H
         return Outcome::failure(*refusal);
     if (script.saving)
         if (const auto trouble = host.run(*script.saving))
+            return *trouble;
+    for (const std::string& line : script.following)
+        if (const auto trouble = host.run(line))
             return *trouble;
     if (isInterruptionRequested())
         return stopped("Stopped before anything was recorded.");

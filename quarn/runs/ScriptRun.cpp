@@ -20,6 +20,9 @@ Outcome outcomeOf(const std::optional<std::string>& trouble, const ConsoleFrontE
     for (const EndedRecording& recording : front_end.recordings())
         if (!recording.report.isComplete())
             told += (told.empty() ? "" : "\nquarn: ") + incompleteText(recording);
+    for (const SharedFileReport& file : front_end.sharedFiles())
+        if (!file.is_made)
+            told += (told.empty() ? "" : "\nquarn: ") + file.text.ToUtf8();
     return told.empty() ? Outcome::success("") : Outcome::failure(told);
 }
 

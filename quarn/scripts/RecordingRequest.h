@@ -1,6 +1,7 @@
 #pragma once
 
 #include "quarn/scripts/CaptureMode.h"
+#include "quarn/scripts/FilmScript.h"
 #include "quarn/scripts/ViewerScript.h"
 #include "quarn/words/Words.h"
 
@@ -27,6 +28,7 @@ struct RecordingRequest {
     std::optional<int> quality; ///< of jpg; 1 to 100; nothing: the host's
     std::vector<std::string> hidden; ///< names of objects; UTF-8
     std::filesystem::path document;  ///< to save, a .quarn file; empty: none
+    FilmRequest film;
     ViewerRequest viewer;
 };
 

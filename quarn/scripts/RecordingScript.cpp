@@ -33,6 +33,8 @@ RecordingScript composeRecording(const RecordingRequest& request, const Animatio
         set_up.push_back("_-JpegQuality " + std::to_string(*request.quality));
     if (!request.document.empty())
         script.saving = "_-SaveAs " + quotedPath(request.document);
+    if (!request.film.file.empty())
+        script.following.push_back(nextFilmLine(request.film));
     script.recording = "_-RecordAnimation _TargetFolder " + quotedPath(request.folder) + " _Enter";
     if (request.viewer.is_wanted)
         script.sharing.push_back(viewerLine(framesPath(request), request.viewer));
@@ -53,6 +55,8 @@ std::string scriptText(const RecordingScript& script) {
     text += "# The folder must be there before the recording starts.\n";
     if (script.saving)
         text += *script.saving + "\n";
+    for (const std::string& line : script.following)
+        text += line + "\n";
     text += script.recording;
     for (const std::string& line : script.sharing)
         text += "\n" + line;

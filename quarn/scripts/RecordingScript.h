@@ -22,7 +22,9 @@ struct RecordingScript {
     std::vector<std::string> set_up; ///< from the model to the animation
     /// Keeps the document before the recording begins, so that one which is stopped keeps it too.
     std::optional<std::string> saving;
-    std::string recording;            ///< this and `saving` need the folder to be there
+    /// What is to be made of the recording while it runs.
+    std::vector<std::string> following;
+    std::string recording; ///< this, `saving` and `following` need the folder to be there
     std::vector<std::string> sharing; ///< what is made of the frames afterwards
 };
 

@@ -171,6 +171,18 @@ void ConsoleFrontEnd::recordingEnded(const RecordingReport& report) {
     std::fwrite(shown.data(), 1, shown.size(), stdout);
 }
 
+void ConsoleFrontEnd::sharedFileProgress(const std::filesystem::path& file, double share) {
+    if (isProgressDue())
+        m_progress.show("making " + file.filename().native() + ", " + percentText(share));
+}
+
+void ConsoleFrontEnd::sharedFileEnded(const SharedFileReport& report) {
+    m_shared_files.push_back(report);
+    m_progress.clear();
+    if (m_prints == Prints::shown)
+        FrontEnd::sharedFileEnded(report);
+}
+
 bool ConsoleFrontEnd::isProgressDue() {
     const auto now = FramePace::Clock::now();
     if (now < m_next_progress)

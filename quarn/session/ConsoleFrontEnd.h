@@ -32,6 +32,9 @@ public:
     /// The recordings that have ended, in their order.
     const std::vector<EndedRecording>& recordings() const { return m_recordings; }
 
+    /// What was made of recordings for others, or could not be.
+    const std::vector<SharedFileReport>& sharedFiles() const { return m_shared_files; }
+
     /// The last line that the host printed since forgetLastWords; UTF-8, empty when there is none.
     /// During a recording: since the last picture.
     std::string lastWords() const;
@@ -61,6 +64,8 @@ public:
     HWND mainWindow() override;
     void frameWritten(const std::filesystem::path& file, int written, int total) override;
     void recordingEnded(const RecordingReport& report) override;
+    void sharedFileProgress(const std::filesystem::path& file, double share) override;
+    void sharedFileEnded(const SharedFileReport& report) override;
     void pictureRendered(double share) override;
     void modelRead(const std::filesystem::path& file, ModelStep step, double share) override;
 
@@ -81,6 +86,7 @@ private:
     int m_frames_written = 0;
     int m_frames_expected = 0;
     std::vector<EndedRecording> m_recordings;
+    std::vector<SharedFileReport> m_shared_files;
 };
 
 } // namespace quarn::program

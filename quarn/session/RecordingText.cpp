@@ -60,6 +60,13 @@ std::string leftOverText(const RecordingReport& report) {
            " of an earlier recording: " + report.first_left_over.ToUtf8() + (is_one ? "" : ", ...");
 }
 
+std::string sharedText(const std::vector<SharedFileReport>& files) {
+    std::string text;
+    for (const SharedFileReport& file : files)
+        text += "\n" + file.text.ToUtf8();
+    return text;
+}
+
 std::string endText(const EndedRecording& recording) {
     const RecordingReport& report = recording.report;
     if (!report.isComplete())

@@ -1,8 +1,10 @@
 #pragma once
 
 #include "host/front_end/RecordingReport.h"
+#include "host/front_end/SharedFileReport.h"
 
 #include <string>
+#include <vector>
 
 namespace quarn::program {
 
@@ -26,6 +28,9 @@ std::string interruptedText(const RecordingReport& report);
 /// "out still holds 5 pictures of an earlier recording: house005.jpg, ..."; empty where it does
 /// not.
 std::string leftOverText(const RecordingReport& report);
+
+/// What became of each file that was made of a recording, each on a line that is begun here.
+std::string sharedText(const std::vector<SharedFileReport>& files);
 
 /// What a whole recording has written: "3 frames were written to out; out/house.html plays them."
 /// and what is left over there; for every other one incompleteText.

@@ -37,7 +37,7 @@ const std::map<std::string, std::string> CHOSEN = {
     {"--to DATE", "2026-06-28"}, {"--frames N", "2"},           {"--number K", "1"},
     {"--out DIR", "out"},        {"--out FILE", "a.png"},       {"MODEL", "town.obj"},
     {"[MODEL]", "town.obj"},     {"DOC", "house.quarn"},        {"SCRIPT", "steps.txt"},
-    {"[TEXT]", "greece"},        {"FOLDER", "frames"},
+    {"[TEXT]", "greece"},        {"FOLDER", "frames"},          {"FILE", "film.mp4"},
 };
 
 /// The words after the program's name, with words of a person's put in; a synopsis in help goes on

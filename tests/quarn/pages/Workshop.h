@@ -5,7 +5,8 @@
 namespace quarn::test {
 
 /// A folder with every file that the commands of the pages and of the help texts name: small models
-/// with curves, documents with an animation, curve files, a script.
+/// with curves, documents with an animation, curve files, a script, recorded
+/// frames.
 class Workshop {
 public:
     Workshop();

@@ -1,0 +1,70 @@
+#include "host/share/film/FilmFollower.h"
+
+#include "host/app/Application.h"
+#include "host/app/StudyMoments.h"
+#include "host/document/Document.h"
+#include "host/share/film/FilmCaption.h"
+#include "sdk/qncore/QnZoetrixDynamicAccess.h"
+
+#include <algorithm>
+
+namespace quarn {
+
+namespace {
+
+/// The drawing has the processors; what encodes beside it lives on what it leaves.
+constexpr int THREADS_BESIDE_DRAWING = 1;
+
+} // namespace
+
+FilmFollower::FilmFollower(FilmWish wish, Application& application)
+    : m_wish(std::move(wish)), m_application(application) {}
+
+void FilmFollower::frameRecorded(const RecordedFrame& frame) {
+    if (m_has_ended)
+        return;
+    if (const auto taken = take(frame); !taken)
+        end(taken.error());
+}
+
+Result<void> FilmFollower::take(const RecordedFrame& frame) {
+    if (!m_making)
+        begin();
+    std::string caption;
+    if (m_wish.has_caption) {
+        auto text = captionOf(sunOfFrame(m_record, frame.number), m_wish.file);
+        if (!text)
+            return text.error();
+        caption = std::move(text.value());
+    }
+    return m_making->add(frame.picture, caption);
+}
+
+void FilmFollower::begin() {
+    const IQnZoetrixDynamicAccess* const access = Zoetrix_QuarnDynamicAccess();
+    Document* const document = m_application.documents().active();
+    if (access && document)
+        m_record = access->AnimationProperties(document->face());
+    const int frames = std::max(1, m_record.FrameCount());
+    const int rate = m_wish.frame_rate > 0 ? m_wish.frame_rate : standardFrameRate(frames);
+    m_making.emplace(FilmMaking::Plan{m_wish, frames, rate, THREADS_BESIDE_DRAWING},
+                     m_application.frontEnd());
+}
+
+void FilmFollower::recordingEnded(const RecordingReport&) {
+    if (m_has_ended)
+        return;
+    if (!m_making)
+        begin();
+    end(m_making->finish());
+}
+
+void FilmFollower::end(const Result<SharedFileReport>& made) {
+    m_has_ended = true;
+    m_making.reset();
+    m_application.frontEnd().sharedFileEnded(
+        made ? made.value()
+             : SharedFileReport{m_wish.file, false, KM_wString::FromUtf8(made.message())});
+}
+
+} // namespace quarn

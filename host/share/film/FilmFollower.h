@@ -1,0 +1,33 @@
+#pragma once
+
+#include "host/recording/RecordingFollower.h"
+#include "host/share/film/FilmMaking.h"
+#include "kelmar/KM_AnimationProperties.h"
+
+namespace quarn {
+
+class Application;
+
+/// Makes a film of a recording while it is made, of the frames as they are shown.
+class FilmFollower final : public RecordingFollower {
+public:
+    /// @param wish         checked
+    /// @param application  outlives this
+    FilmFollower(FilmWish wish, Application& application);
+
+    void frameRecorded(const RecordedFrame& frame) override;
+    void recordingEnded(const RecordingReport& report) override;
+
+private:
+    void begin();
+    Result<void> take(const RecordedFrame& frame);
+    void end(const Result<SharedFileReport>& made);
+
+    FilmWish m_wish;
+    Application& m_application;
+    KM_3dmAnimationProperties m_record; ///< of the animation, once a frame came
+    std::optional<FilmMaking> m_making;
+    bool m_has_ended = false; ///< told
+};
+
+} // namespace quarn
