@@ -78,6 +78,7 @@ std::vector<FileKind> cameras() {
             {QnLocalizeString(L"glTF files", 42825), {"gltf"}},
             {QnLocalizeString(L"JSON files", 42826), {"json"}},
             {QnLocalizeString(L"CSV tables", 42827), {"csv"}}};
+}
 
 std::vector<FileKind> films() {
     return {{QnLocalizeString(L"MP4 films", 42766), {"mp4"}},
