@@ -124,6 +124,26 @@ TEST(Film, AsMp4BeginsWithItsIndexAndPlaysEverywhere) {
     EXPECT_LT(bytes.find("moov"), bytes.find("mdat"));
 }
 
+/// With another matrix, or read in another range, strong colours are off by 10 and more.
+TEST(Film, AsVideoHasTheColoursOfItsFrames) {
+    constexpr std::uint8_t COLOURS[][3] = {{200, 30, 30}, {30, 160, 60}, {40, 60, 210}, {9, 9, 9}};
+    Image frame;
+    frame.resize(256, 64);
+    for (std::size_t i = 0; i < frame.rgba.size(); ++i)
+        frame.rgba[i] = i % 4 == 3 ? 255 : COLOURS[i / 4 % 256 / 64][i % 4];
+    FilmStudio studio;
+    for (const char* const name : {"a.mp4", "a.webm"}) {
+        FilmMaking making({studio.wish(name), 1, RATE, 1}, studio.frontEnd());
+        ASSERT_TRUE(making.add(frame, ""));
+        ASSERT_TRUE(making.finish());
+        const Image shown = decodeFilm(studio / name).frames.at(0);
+        for (int block = 0; block < 4; ++block)
+            for (std::size_t part = 0; part < 3; ++part)
+                EXPECT_NEAR(shown.pixel(64 * block + 32, 32)[part], COLOURS[block][part], 4)
+                    << name << ", block " << block;
+    }
+}
+
 TEST(Film, AsWebmIsVp9) {
     FilmStudio studio;
     ASSERT_TRUE(studio.film("house.webm", 10));
