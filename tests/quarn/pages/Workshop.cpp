@@ -56,7 +56,6 @@ Workshop::Workshop() {
     writeModels();
     writeCurves();
     writeDocuments();
-    writeFrames();
     std::filesystem::create_directory(m_folder / "out"); // as a script needs it
     writeFrames();
 }
@@ -91,15 +90,6 @@ void Workshop::writeCurves() const {
         writeFile(m_folder / name, high);
     writeFile(m_folder / "frieze.json", R"({"points": [[0, 5, 2], [4, 5, 2]]})");
     writeFile(m_folder / "steps.txt", "_-List\n");
-}
-
-/// Two pictures of 16 by 16 pixels, as TGA.
-void Workshop::writeFrames() const {
-    std::filesystem::create_directory(m_folder / "frames");
-    std::string picture("\0\0\x02\0\0\0\0\0\0\0\0\0\x10\0\x10\0\x18\x20", 18);
-    picture.resize(18 + 16 * 16 * 3, 'q');
-    for (const char* name : {"house000.tga", "house001.tga"})
-        writeFile(m_folder / "frames" / name, picture);
 }
 
 void Workshop::writeDocuments() const {

@@ -96,8 +96,9 @@ void expectSameFrustum(const KM_Viewport& drawn, const KM_Viewport& read, double
     const double setback =
         (read.CameraLocation() - metres * drawn.CameraLocation()) * drawn.CameraZ();
     const double size = metres * distance;
-    if (drawn.IsPerspectiveProjection())
+    if (drawn.IsPerspectiveProjection()) {
         EXPECT_NEAR(setback, 0.0, 1e-5 * size);
+    }
     for (const double depth : {distance, 1.5 * distance})
         for (int number = 0; number < 4; ++number)
             EXPECT_TRUE(near(metres * corner(drawn, depth, number),

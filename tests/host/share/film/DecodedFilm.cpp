@@ -152,7 +152,9 @@ double psnr(const Image& one, const Image& other) {
         return 0.0;
     double sum = 0.0;
     for (std::size_t i = 0; i < one.rgba.size(); ++i) {
-        const double difference = i % 4 == 3 ? 0.0 : double{one.rgba[i]} - double{other.rgba[i]};
+        const double difference =
+            i % 4 == 3 ? 0.0
+                       : static_cast<double>(one.rgba[i]) - static_cast<double>(other.rgba[i]);
         sum += difference * difference;
     }
     const double mean = sum / (0.75 * static_cast<double>(one.rgba.size()));

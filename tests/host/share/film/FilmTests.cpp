@@ -36,8 +36,10 @@ TEST_P(EachKindOfFilm, MayHaveOneFrame) {
     const DecodedFilm film = decodeFilm(m_studio / name());
     ASSERT_EQ(film.frames.size(), 1U) << film.trouble;
     EXPECT_GT(psnr(film.frames[0], pictureOf(320, 180, 0)), 35.0);
-    if (GetParam() != ".webp" && GetParam() != ".apng") // which are pictures that stand still then
+    if (GetParam() != ".webp" &&
+        GetParam() != ".apng") { // which are pictures that stand still then
         EXPECT_NEAR(film.seconds, 1.0 / RATE, 0.001);
+    }
 }
 
 TEST_P(EachKindOfFilm, OfOddSidesKeepsEveryPixel) {
@@ -176,8 +178,9 @@ TEST(Film, AsGifHasOnePaletteForAllFramesAndRunsForEver) {
          at = bytes.find("\x21\xF9\x04", at + 1)) {
         const std::size_t descriptor = at + 8;
         ASSERT_EQ(bytes.at(descriptor), 0x2C);
-        if (frames > 0) // the encoder writes the first one's colours with it too
+        if (frames > 0) { // the encoder writes the first one's colours with it too
             EXPECT_EQ(bytes.at(descriptor + 9) & 0x80, 0) << frames;
+        }
         ++frames;
     }
     EXPECT_EQ(frames, 12);
