@@ -7,10 +7,9 @@ namespace {
 using enum MenuPlace;
 
 constexpr MenuTitle TITLES[] = {
-    {file, L"&File", 45120},         {edit, L"&Edit", 45121},
-    {view, L"&View", 45122},         {draw, L"&Curves", 45123},
-    {display, L"&Render", 45124},    {animation, L"&Animation", 45125},
-    {plug_ins, L"&Plug-ins", 45126}, {help, L"&Help", 45127},
+    {file, L"&File", 45120},   {edit, L"&Edit", 45121},         {view, L"&View", 45122},
+    {draw, L"&Curves", 45123}, {display, L"&Render", 45124},    {animation, L"&Animation", 45125},
+    {share, L"&Share", 45440}, {plug_ins, L"&Plug-ins", 45126}, {help, L"&Help", 45127},
 };
 
 constexpr MenuRow ROWS[] = {
@@ -53,6 +52,7 @@ constexpr MenuRow ROWS[] = {
     {display, L"Render", L"&Render", 45162, "F11", true},
     {display, L"RenderPreview", L"Render a &preview", 45163, "F12"},
     {display, L"RenderSettings", L"Picture si&ze and quality…", 45164},
+    {display, L"JpegQuality", L"Quality of &JPEG pictures…", 45444},
     {display, L"SaveRenderWindowAs", L"&Save the rendered picture…", 45165},
     {display, L"CloseRenderWindow", L"&Close the rendered picture", 45166},
 
@@ -70,6 +70,10 @@ constexpr MenuRow ROWS[] = {
     {animation, L"AnimationName", L"Na&me…", 45181, nullptr, true},
     {animation, L"SaveFrame", L"Save one frame as a pict&ure…", 45182},
     {animation, L"RecordAnimation", L"&Record…", 45183, "F9"},
+
+    {share, L"ViewerPage", L"&Page of recorded frames…", 45441},
+    {share, L"Film", L"&Film of recorded frames…", 45442},
+    {share, L"ExportCamera", L"&Camera for other programs…", 45443},
 
     {plug_ins, L"LoadPlugIn", L"&Load a plug-in…", 45185},
 

@@ -31,8 +31,8 @@ class Viewer {
         for (const type of ['pointermove', 'pointerdown', 'keydown', 'focusin'])
             document.addEventListener(type, () => this.wake());
         // The picture that is printed is the page's own, the first.
-        addEventListener('beforeprint', () => this.sun?.show(this.recording.first));
-        addEventListener('afterprint', () => this.paint());
+        addEventListener('beforeprint', () => this.print(true));
+        addEventListener('afterprint', () => this.print(false));
     }
 
     // What a person does: the page is theirs from now on.
@@ -68,10 +68,15 @@ class Viewer {
         });
     }
 
+    print(isPrinting) {
+        this.isPrinting = isPrinting;
+        this.paint();
+    }
+
     paint() {
         const wanted = this.motion.frame;
         this.controls.show(wanted);
-        this.sun?.show(wanted);
+        this.sun?.show(this.isPrinting ? this.recording.first : wanted);
         const shown = this.frames.nearest(wanted);
         if (shown === null) return;
         const stage = element('stage');
