@@ -21,7 +21,7 @@ using testing::HasSubstr;
 
 constexpr int SQUARES_A_SIDE = 500; // 500 000 triangles
 
-/// Waits a moment at first, so that all that follows is shown, and notes it.
+/// Waits a moment at first in each reading, so that all that follows is shown, and notes it.
 class NotingFrontEnd final : public ScriptedFrontEnd {
 public:
     struct Step {
@@ -30,7 +30,7 @@ public:
     };
 
     void pumpEvents(unsigned) override {
-        if (!std::exchange(m_has_waited, true))
+        if (!std::exchange(has_waited, true))
             std::this_thread::sleep_for(std::chrono::milliseconds(310));
     }
     void modelRead(const std::filesystem::path&, ModelStep step, double share) override {
@@ -47,9 +47,7 @@ public:
 
     std::vector<Step> steps;
     bool cancels_building = false;
-
-private:
-    bool m_has_waited = false;
+    bool has_waited = false;
 };
 
 /// A wavy field.
@@ -83,6 +81,7 @@ protected:
     CQuarnCommand::result load(const wchar_t* command, const std::filesystem::path& file) {
         const KM_wString line =
             KM_wString(command) + L" \"" + KM_wString::FromUtf8(file.string()) + L"\"";
+        front_end.has_waited = false;
         return session.runCommand(line.View());
     }
     /// How often the scene that is drawn had something built.
