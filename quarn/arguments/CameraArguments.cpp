@@ -73,11 +73,8 @@ Outcome recordCameraPath(AskedPath& asked, const std::optional<std::string>& mis
     return recordOrShow(request.recording, cameraPathLines(request), asked.use);
 }
 
-} // namespace
-
-Action addTurntable(CLI::App& command) {
-    const auto asked = std::make_shared<Asked<TurntableRequest>>();
-    TurntableRequest& request = asked->request;
+void addTurntableOptions(CLI::App& command, Asked<TurntableRequest>& asked) {
+    TurntableRequest& request = asked.request;
     const OptionAdder add(command);
     addModelAndFolder(add, request.recording);
     addFrames(add, request.recording, "Pictures of one whole turn, from 1");
@@ -95,12 +92,41 @@ Action addTurntable(CLI::App& command) {
     addLens(add, request.lens_mm, "(default: 50; a document's own); the model fills the picture");
     add("--target", request.target, "X,Y,Z", point(),
         "Point to turn about (default: the model's middle)");
-    addRecordingOptions(command, request.recording, asked->use);
-    return [asked] {
-        if (const auto mistake = settle(asked->request.recording))
-            return Outcome::misuse(*mistake);
-        return recordOrShow(asked->request.recording, turntableLines(asked->request), asked->use);
-    };
+    addRecordingOptions(command, request.recording, asked.use);
+}
+
+/// A page that can be sent alone, and a film beside it.
+std::optional<std::string> settleShared(RecordingRequest& request) {
+    request.viewer.is_wanted = request.viewer.is_one_file = true;
+    const bool has_own_film = request.film.file.empty();
+    if (has_own_film)
+        request.film.file = "film.mp4"; // its place is known when the folder is
+    if (auto mistake = settle(request))
+        return mistake;
+    if (has_own_film)
+        request.film.file = request.folder / (request.name + ".mp4");
+    return std::nullopt;
+}
+
+Outcome recordTurntable(const Asked<TurntableRequest>& asked,
+                        const std::optional<std::string>& mistake) {
+    if (mistake)
+        return Outcome::misuse(*mistake);
+    return recordOrShow(asked.request.recording, turntableLines(asked.request), asked.use);
+}
+
+} // namespace
+
+Action addTurntable(CLI::App& command) {
+    const auto asked = std::make_shared<Asked<TurntableRequest>>();
+    addTurntableOptions(command, *asked);
+    return [asked] { return recordTurntable(*asked, settle(asked->request.recording)); };
+}
+
+Action addShare(CLI::App& command) {
+    const auto asked = std::make_shared<Asked<TurntableRequest>>();
+    addTurntableOptions(command, *asked);
+    return [asked] { return recordTurntable(*asked, settleShared(asked->request.recording)); };
 }
 
 Action addFlythrough(CLI::App& command) {

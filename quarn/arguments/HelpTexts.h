@@ -4,6 +4,7 @@ namespace quarn::program {
 
 inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
 
+  quarn share MODEL                            make a page and a film of a model, to send away
   quarn turntable MODEL                        record a turntable as pictures and a page
   quarn flythrough MODEL --path NAME           record a walk along a curve, looking ahead
   quarn path MODEL --camera NAME --target NAME
@@ -29,6 +30,7 @@ A MODEL may be a .quarn document too. quarn --help and quarn COMMAND --help tell
 
 inline constexpr const char* PROGRAM_FOOTER = R"(
 Examples:
+  quarn share house.glb
   quarn turntable house.glb --frames 120 --out out/house --save house.quarn
   quarn flythrough house.glb --camera-curve walk.txt --even-speed --frames 240 --out out/walk
   quarn day house.glb --place Athens --date 2026-06-21 --every 10 --out out/sun
@@ -41,6 +43,15 @@ Examples:
 Exit codes: 0 done, 1 failed, 2 arguments that make no sense, 130 stopped with Ctrl-C (143 by
 a request to terminate). Ctrl-C lets the picture that is being recorded be finished and writes the
 page; a second Ctrl-C ends the program at once.)";
+
+inline constexpr const char* SHARE_FOOTER = R"(
+A turntable is recorded as quarn turntable does it. NAME-viewer.html beside the pictures has them all
+inside and turns under mouse and finger: send it alone. NAME.mp4 is the same as a film; --video names
+another file, such as one that ends in .gif.
+
+Examples:
+  quarn share house.glb
+  quarn share house.glb --frames 120 --out out/house --size 1920x1080)";
 
 inline constexpr const char* TURNTABLE_FOOTER = R"(
 The model is framed so that it fills the pictures well during the whole turn. The pictures are

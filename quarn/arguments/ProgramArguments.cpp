@@ -23,6 +23,7 @@ struct Subcommand {
 };
 
 constexpr Subcommand SUBCOMMANDS[] = {
+    {"share", "Make a page and a film of a model, to send away", SHARE_FOOTER, addShare},
     {"turntable", "Record a turntable as pictures and a page", TURNTABLE_FOOTER, addTurntable},
     {"flythrough", "Record a walk along a curve, looking ahead", FLYTHROUGH_FOOTER, addFlythrough},
     {"path", "Record a camera that follows one curve and looks along another", PATH_FOOTER,

@@ -15,6 +15,7 @@ using Action = std::function<Outcome()>;
 
 /// These add the options of a command, and give its action. The action holds what is read.
 Action addTurntable(CLI::App& command);
+Action addShare(CLI::App& command);
 Action addFlythrough(CLI::App& command);
 Action addPath(CLI::App& command);
 Action addDay(CLI::App& command);
