@@ -1,5 +1,6 @@
 #include "quarn/runs/CameraExport.h"
 
+#include "quarn/runs/DocumentRun.h"
 #include "quarn/session/Interruption.h"
 #include "quarn/words/Words.h"
 
@@ -30,18 +31,9 @@ Outcome runExport(const std::string& line, HostSession& host) {
 } // namespace
 
 Outcome exportCamera(const CameraExportRequest& request, const ScriptUse& use) {
-    const std::string reading = readingLine(request.document);
-    const std::string exporting = exportLine(request);
-    if (use.is_only_shown)
-        return Outcome::success(reading + "\n" + exporting + "\n");
-    watchForInterruption();
-    ConsoleFrontEnd front_end(printsFor(use.common));
-    HostSession host(front_end, use.common);
-    if (const auto trouble = host.loadAnimationPlugIn())
-        return *trouble;
-    if (const auto trouble = host.runReading(reading, request.document))
-        return *trouble;
-    return runExport(exporting, host);
+    const std::string line = exportLine(request);
+    return runOnDocument(request.document, line, use,
+                         [&](HostSession& host) { return runExport(line, host); });
 }
 
 } // namespace quarn::program

@@ -1,6 +1,6 @@
 #include "quarn/runs/SingleFrame.h"
 
-#include "quarn/session/Interruption.h"
+#include "quarn/runs/DocumentRun.h"
 #include "quarn/words/Words.h"
 
 namespace quarn::program {
@@ -18,21 +18,13 @@ std::string savingLine(const FrameRequest& request) {
 } // namespace
 
 Outcome writeSingleFrame(const FrameRequest& request, const ScriptUse& use) {
-    const std::string reading = readingLine(request.document);
-    const std::string saving = savingLine(request);
-    if (use.is_only_shown)
-        return Outcome::success(reading + "\n" + saving + "\n");
-    watchForInterruption();
-    ConsoleFrontEnd front_end(printsFor(use.common));
-    HostSession host(front_end, use.common);
-    if (const auto trouble = host.loadAnimationPlugIn())
-        return *trouble;
-    if (const auto trouble = host.runReading(reading, request.document))
-        return *trouble;
-    if (const auto trouble = host.run(saving))
-        return *trouble;
-    return Outcome::success("frame " + std::to_string(request.number) + " in " +
-                            request.file.native());
+    const std::string line = savingLine(request);
+    return runOnDocument(request.document, line, use, [&](HostSession& host) {
+        if (const auto trouble = host.run(line))
+            return *trouble;
+        return Outcome::success("frame " + std::to_string(request.number) + " in " +
+                                request.file.native());
+    });
 }
 
 } // namespace quarn::program
