@@ -79,10 +79,19 @@ RunningRecording::Plan planOf(const KM_3dmAnimationProperties& record, Document&
 }
 
 /// The camera of the view that the record names.
-RecordingFollowers::Camera cameraOf(const KM_3dmAnimationProperties& record, Document& document) {
-    return [&document, name = recordedViewName(record)] {
+/// Rendered pictures have another size than the view, and their camera has their aspect.
+RecordingFollowers::Camera cameraOf(const KM_3dmAnimationProperties& record, Document& document,
+                                    const RecordingSettings& settings) {
+    return [&document, name = recordedViewName(record), width_px = settings.width_px,
+            height_px = settings.height_px] {
         const ViewState* const view = document.findView(name.View());
-        return view ? view->viewport() : KM_Viewport();
+        KM_Viewport camera = view ? view->viewport() : KM_Viewport();
+        int view_width_px = 0;
+        int view_height_px = 0;
+        camera.GetScreenPort(&view_width_px, &view_height_px);
+        if (view_width_px != width_px || view_height_px != height_px)
+            camera.SetScreenPort(width_px, height_px);
+        return camera;
     };
 }
 
@@ -93,7 +102,7 @@ void beginRecording(Application& application, Document& document,
         return; // nothing of this name is written
     const auto tell = [&application](const std::string& text) { application.tell(text); };
     RecordingFollowers& followers = application.recordingFollowers();
-    followers.begin(cameraOf(record, document));
+    followers.begin(cameraOf(record, document, plan.settings));
     followers.addFirst(
         std::make_unique<ManifestMaker>(record, plan.animation, plan.settings, document, tell));
     application.setRecording(std::make_unique<RunningRecording>(std::move(plan), tell));

@@ -85,6 +85,25 @@ TEST(RecordedManifestTest, KnowsTheSameModelAndSettingsAgain) {
     EXPECT_NE(field("out", "document"), field("larger", "document"));
 }
 
+TEST(RecordedManifestTest, OfRenderedFramesTellsWhatThePictureSpansAndNotTheView) {
+    const Studio studio;
+    writeFile(studio / "steps.txt",
+              "_-ViewportSize 64 32\n_-StandardView _Front\n_-FitView _Enter\n"
+              "_-RenderSettings _Size 40 40 _PreviewSamples 1 _Enter\n_-AnimationName house\n"
+              "_-SetTurntableAnimation 1 _Clockwise _jpg _RenderPreview _Enter _Enter\n"
+              "_-RecordAnimation _TargetFolder out _Enter\n");
+    std::filesystem::create_directory(studio / "out");
+    Start start;
+    start.folder = studio.path();
+    start.arguments = {"run", "steps.txt", "house.obj"};
+    const Ended ended = run(start);
+    ASSERT_EQ(ended.exit_code, 0) << ended.err;
+    const json manifest = manifestOf(studio / "out/house.frames.json");
+    EXPECT_EQ(manifest["width_px"], 40);
+    const json& extent = manifest["images"][0]["camera"]["extent"];
+    EXPECT_NEAR(extent[0].get<double>(), extent[1].get<double>(), 1e-9);
+}
+
 TEST(RecordedManifestTest, OfOthersIsNotReplaced) {
     const Studio studio;
     std::filesystem::create_directory(studio / "out");
