@@ -141,10 +141,12 @@ void DesktopFrontEnd::recordingEnded(const RecordingReport& report) {
         m_parts.recording_ended(report);
 }
 
-/// Whoever makes the file works on events between its steps.
+/// Whoever makes the file works on events between its steps. Escape can mean nothing else then.
 void DesktopFrontEnd::sharedFileProgress(const std::filesystem::path& file, double share) {
     if (m_parts.shared_file_progress)
         m_parts.shared_file_progress(file, share);
+    if (m_escape.isDown())
+        requestStop();
 }
 
 void DesktopFrontEnd::sharedFileEnded(const SharedFileReport& report) {

@@ -33,6 +33,20 @@ protected:
         QObject::connect(&m_clock, &QTimer::timeout, &window, look);
         m_clock.start(0);
     }
+    void endHalfMadePage(const std::function<void()>& end) {
+        bool is_ended = false;
+        whileItWorks([&] {
+            if (is_ended || !part<QLabel>(window, "progressText").text().contains("50 %"))
+                return;
+            is_ended = true;
+            end();
+        });
+        makePage();
+        EXPECT_TRUE(is_ended);
+        EXPECT_FALSE(std::filesystem::exists(page));
+        EXPECT_FALSE(row().isVisible());
+        EXPECT_FALSE(window.starter().isRunning());
+    }
     /// Puts an opener of files before those of the machine.
     void useOpener() {
         const std::filesystem::path opener = folder / "bin" / "xdg-open";
@@ -70,18 +84,11 @@ TEST_F(SharingTest, APageShowsHowFarItIsAndThenWhatThereIs) {
 }
 
 TEST_F(SharingTest, CancelEndsAPageAndNothingIsWritten) {
-    bool is_cancelled = false;
-    whileItWorks([&] {
-        if (is_cancelled || !part<QLabel>(window, "progressText").text().contains("50 %"))
-            return;
-        is_cancelled = true;
-        part<QPushButton>(window, "progressCancel").click();
-    });
-    makePage();
-    EXPECT_TRUE(is_cancelled);
-    EXPECT_FALSE(std::filesystem::exists(page));
-    EXPECT_FALSE(row().isVisible());
-    EXPECT_FALSE(window.starter().isRunning());
+    endHalfMadePage([this] { click(button("progressCancel")); });
+}
+
+TEST_F(SharingTest, EscapeEndsAPageAndNothingIsWritten) {
+    endHalfMadePage([this] { QTest::keyClick(&window.commandPane().line(), Qt::Key_Escape); });
 }
 
 TEST_F(SharingTest, APageAndItsFolderAreOpenedWithTheDesktopsPrograms) {
