@@ -1,6 +1,7 @@
 #include "desktop/animation/AnimationBar.h"
 
 #include "desktop/animation/ProgressRow.h"
+#include "desktop/animation/SharedFileRow.h"
 #include "desktop/command_line/CommandStarter.h"
 #include "desktop/texts/Texts.h"
 #include "host/session/Session.h"
@@ -23,13 +24,15 @@ const QColor RECORD_RED(0xd9, 0x2d, 0x20);
 
 AnimationBar::AnimationBar(Session& session, CommandStarter& starter, QWidget* parent)
     : QWidget(parent), m_session(session), m_starter(starter), m_row(new QHBoxLayout),
-      m_progress(new ProgressRow(this)) {
+      m_progress(new ProgressRow(this)), m_shared_file(new SharedFileRow(this)) {
     setObjectName("animationBar");
     auto* const column = new QVBoxLayout(this);
     column->setContentsMargins(MARGIN_PX, MARGIN_PX / 2, MARGIN_PX, MARGIN_PX / 2);
     column->addLayout(m_row);
     column->addWidget(m_progress);
+    column->addWidget(m_shared_file);
     m_progress->hide();
+    m_shared_file->hide();
     buildControls();
     connectControls();
     paintIcons();
@@ -98,6 +101,7 @@ void AnimationBar::connectControls() {
     connect(m_number, &QSpinBox::valueChanged, this, &AnimationBar::wantFrame);
     connect(m_open_page, &QAction::triggered, this, [this] { m_starter.start(*m_page_line); });
     connect(m_progress, &ProgressRow::cancelled, &m_starter, &CommandStarter::stop);
+    connect(m_shared_file, &SharedFileRow::lineChosen, &m_starter, &CommandStarter::start);
     connect(&m_starter, &CommandStarter::started, this, &AnimationBar::commandStarted);
     connect(&m_starter, &CommandStarter::ended, this, &AnimationBar::commandEnded);
 }
@@ -146,6 +150,7 @@ void AnimationBar::commandEnded() {
 }
 
 void AnimationBar::frameWritten(const std::filesystem::path&, int written, int total) {
+    m_shared_file->hide();
     m_progress->showFrame(written, total);
     showFrameNumber(written - 1);
 }
@@ -156,6 +161,16 @@ void AnimationBar::pictureRendered(double share) {
 
 void AnimationBar::modelRead(ModelStep step, double share) {
     m_progress->showModel(step, share);
+}
+
+void AnimationBar::sharedFileProgress(const std::filesystem::path& file, double share) {
+    m_shared_file->hide();
+    m_progress->showSharedFile(file, share);
+}
+
+void AnimationBar::sharedFileEnded(const SharedFileReport& report) {
+    m_progress->hide();
+    m_shared_file->showReport(report);
 }
 
 /// The first picture is of the display mode, before any frame.
@@ -224,6 +239,7 @@ void AnimationBar::showState() {
     m_play->setEnabled(m_animation.state.can_play && (is_free || isPlaying()));
     m_play->setToolTip(isPlaying() ? localized(L"Stop", 45214) : localized(L"Play", 45203));
     m_play->setAccessibleName(m_play->toolTip());
+    m_shared_file->setFree(is_free);
     paintIcons();
 }
 

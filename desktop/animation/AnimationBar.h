@@ -21,6 +21,7 @@ namespace quarn::desktop {
 
 class CommandStarter;
 class ProgressRow;
+class SharedFileRow;
 
 /// Plays, steps through and records the animation of the document, all by the plug-in's commands.
 /// Frames count from 0, as in the commands and in the names of recorded files.
@@ -47,6 +48,8 @@ public slots:
     void frameWritten(const std::filesystem::path& file, int written, int total);
     void pictureRendered(double share);
     void modelRead(ModelStep step, double share);
+    void sharedFileProgress(const std::filesystem::path& file, double share);
+    void sharedFileEnded(const SharedFileReport& report);
     /// A view shows another picture: while the animation plays, its next frame.
     void viewShown(const CQuarnView& view);
 
@@ -85,6 +88,7 @@ private:
     QAction* m_open_page = nullptr;
     QToolButton* m_page_button = nullptr;
     ProgressRow* m_progress;
+    SharedFileRow* m_shared_file;
     std::optional<QString> m_page_line; ///< opens the page of the last recording
     std::optional<int> m_wanted_frame;  ///< the newest that was asked for and is not shown yet
     int m_pictures_shown = 0;           ///< while playing

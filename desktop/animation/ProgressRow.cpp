@@ -11,12 +11,14 @@ namespace quarn::desktop {
 namespace {
 
 constexpr int STEPS = 1000;
+constexpr int NAME_LETTERS = 40;
 
 } // namespace
 
 ProgressRow::ProgressRow(QWidget* parent)
     : QWidget(parent), m_text(new QLabel(this)), m_bar(new QProgressBar(this)) {
     m_text->setObjectName("progressText");
+    m_text->setTextFormat(Qt::PlainText); // names of files may look like HTML
     m_bar->setObjectName("progressBar");
     m_bar->setAccessibleName(localized(L"Progress", 45236));
     m_bar->setRange(0, STEPS);
@@ -60,6 +62,14 @@ void ProgressRow::showModel(ModelStep step, double share) {
                          : step == ModelStep::made ? localized(L"Making the meshes: %1 %", 45431)
                                                    : localized(L"Building the scene: %1 %", 45446);
     show(share, text.arg(static_cast<int>(std::floor(share * 100.0))));
+}
+
+/// A long name may not push the button out of the window.
+void ProgressRow::showSharedFile(const std::filesystem::path& file, double share) {
+    const QString name = fontMetrics().elidedText(qtText(file.filename()), Qt::ElideMiddle,
+                                                  fontMetrics().averageCharWidth() * NAME_LETTERS);
+    show(share, localized(L"Making %1: %2 %", 45445)
+                    .arg(name, QString::number(static_cast<int>(std::floor(share * 100.0)))));
 }
 
 void ProgressRow::show(double share, const QString& text) {

@@ -9,7 +9,8 @@
 
 namespace quarn::desktop {
 
-/// How far a recording, a rendered picture or a model being read is, with a button that ends it.
+/// How far a recording, a rendered picture, a model being read or a file for others is, with a
+/// button that ends it.
 class ProgressRow final : public QWidget {
     Q_OBJECT
 public:
@@ -23,6 +24,9 @@ public:
     /// How far a model file is read.
     /// @param share  of the step, from 0 to 1
     void showModel(ModelStep step, double share);
+    /// How much of a file for others is made.
+    /// @param share  from 0 to 1
+    void showSharedFile(const std::filesystem::path& file, double share);
     int framesWritten() const { return m_frames_written; }
 
 signals:

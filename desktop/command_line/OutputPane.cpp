@@ -31,6 +31,15 @@ void OutputPane::printTyped(const QString& line) {
     append((is_within_line ? "\n" : "") + line + "\n", format);
 }
 
+/// Questions and results take room away from it.
+void OutputPane::resizeEvent(QResizeEvent* event) {
+    QScrollBar& bar = *verticalScrollBar();
+    const bool follows = bar.value() >= bar.maximum();
+    QPlainTextEdit::resizeEvent(event);
+    if (follows)
+        bar.setValue(bar.maximum());
+}
+
 void OutputPane::append(const QString& text, const QTextCharFormat& format) {
     QScrollBar& bar = *verticalScrollBar();
     const bool follows = bar.value() >= bar.maximum();

@@ -22,6 +22,9 @@ public:
     /// a line of its own.
     void printTyped(const QString& line);
 
+protected:
+    void resizeEvent(QResizeEvent* event) override;
+
 private:
     void append(const QString& text, const QTextCharFormat& format);
 };

@@ -141,6 +141,21 @@ void DesktopFrontEnd::recordingEnded(const RecordingReport& report) {
         m_parts.recording_ended(report);
 }
 
+/// Whoever makes the file works on events between its steps. Escape can mean nothing else then.
+void DesktopFrontEnd::sharedFileProgress(const std::filesystem::path& file, double share) {
+    if (m_parts.shared_file_progress)
+        m_parts.shared_file_progress(file, share);
+    if (m_escape.isDown())
+        requestStop();
+}
+
+void DesktopFrontEnd::sharedFileEnded(const SharedFileReport& report) {
+    if (m_parts.shared_file_ended)
+        m_parts.shared_file_ended(report);
+    else
+        FrontEnd::sharedFileEnded(report);
+}
+
 void DesktopFrontEnd::pictureRendered(double share) {
     if (m_parts.picture_rendered)
         m_parts.picture_rendered(share);

@@ -34,6 +34,9 @@ struct FrontEndParts {
         make_dialog;
     std::function<void(const std::filesystem::path& file, int written, int total)> frame_written;
     std::function<void(const RecordingReport& report)> recording_ended;
+    std::function<void(const std::filesystem::path& file, double share)> shared_file_progress;
+    /// Without it the front end prints what the report says.
+    std::function<void(const SharedFileReport& report)> shared_file_ended;
     std::function<void(double share)> picture_rendered;
     std::function<void(ModelStep step, double share)> model_read;
     std::function<void(CQuarnView& view, const ShownPicture& picture)> view_shown;
@@ -73,6 +76,8 @@ public:
     HWND mainWindow() override;
     void frameWritten(const std::filesystem::path& file, int written, int total) override;
     void recordingEnded(const RecordingReport& report) override;
+    void sharedFileProgress(const std::filesystem::path& file, double share) override;
+    void sharedFileEnded(const SharedFileReport& report) override;
     void pictureRendered(double share) override;
     void modelRead(const std::filesystem::path& file, ModelStep step, double share) override;
     void viewShown(CQuarnView& view, const ShownPicture& picture) override;

@@ -150,6 +150,10 @@ FrontEndParts MainWindow::parts() {
         m_animation->frameWritten(file, written, total);
     };
     parts.recording_ended = [this](const RecordingReport& report) { noteRecording(report); };
+    parts.shared_file_progress = [this](const std::filesystem::path& file, double share) {
+        m_animation->sharedFileProgress(file, share);
+    };
+    parts.shared_file_ended = [this](const SharedFileReport& report) { noteSharedFile(report); };
     parts.picture_rendered = [this](double share) { showRenderProgress(share); };
     parts.model_read = [this](ModelStep step, double share) {
         m_animation->modelRead(step, share);
@@ -209,7 +213,14 @@ void MainWindow::noteRecording(const RecordingReport& report) {
     const QString text = recordingText(report);
     m_pane->print(wideText(text + '\n').View());
     tell(text);
-    m_lacks_pictures = m_lacks_pictures || !report.isComplete();
+    m_lacks_files = m_lacks_files || !report.isComplete();
+}
+
+void MainWindow::noteSharedFile(const SharedFileReport& report) {
+    m_pane->print(report.text.View());
+    m_pane->print(L"\n");
+    m_animation->sharedFileEnded(report);
+    m_lacks_files = m_lacks_files || !report.is_made;
 }
 
 void MainWindow::tell(const QString& message) {
@@ -222,8 +233,8 @@ void MainWindow::tellAndPrint(const QString& message) {
 }
 
 void MainWindow::runScript(const QString& file, bool wants_exit) {
-    m_lacks_pictures = false;
-    const bool has_succeeded = m_starter->startScript(file) && !m_lacks_pictures;
+    m_lacks_files = false;
+    const bool has_succeeded = m_starter->startScript(file) && !m_lacks_files;
     if (wants_exit) // without the question about changes that closing the window asks
         QTimer::singleShot(0, qApp, [=] { QCoreApplication::exit(has_succeeded ? 0 : 1); });
 }

@@ -78,6 +78,7 @@ private:
     void showTitle();
     void saveLayout();
     void noteRecording(const RecordingReport& report);
+    void noteSharedFile(const SharedFileReport& report);
     void settleUnsavedWork();
     void tell(const QString& message);
 
@@ -99,7 +100,7 @@ private:
     RecoveryOffer* m_recovery_offer = nullptr;
     RenderPictureWindow* m_render_window = nullptr;
     QDockWidget* m_command_dock = nullptr;
-    bool m_lacks_pictures = false; ///< a recording since the script began
+    bool m_lacks_files = false; ///< a recording, or what is made of one, since the script began
 };
 
 } // namespace quarn::desktop

@@ -119,14 +119,6 @@ bool isSaving(FileUse use) {
            use == FileUse::save_film;
 }
 
-/// The folder of the document at work, else that of the user's documents.
-std::filesystem::path startFolder(Application& application) {
-    const Document* document = application.documents().active();
-    if (document && !document->file().empty())
-        return document->file().parent_path();
-    return documentsFolder(application.options().documents_folder).value_or("");
-}
-
 /// A file to save that was chosen without an ending gets that of the first kind.
 void addEnding(FileChoice& choice, const FileQuestion& question) {
     if (choice.kind == FileChoice::Kind::chosen && !choice.file.has_extension())
@@ -134,6 +126,14 @@ void addEnding(FileChoice& choice, const FileQuestion& question) {
 }
 
 } // namespace
+
+std::filesystem::path firstChooserFolder() {
+    Application& application = *Application::current();
+    const Document* document = application.documents().active();
+    if (document && !document->file().empty())
+        return document->file().parent_path();
+    return documentsFolder(application.options().documents_folder).value_or("");
+}
 
 FileChoice chooseFile(const CQuarnCommandContext& context, FileUse use,
                       const std::filesystem::path& offered) {
@@ -144,7 +144,7 @@ FileChoice chooseFile(const CQuarnCommandContext& context, FileUse use,
     question.kind = isSaving(use) ? FileQuestion::Kind::save : FileQuestion::Kind::open;
     question.title = titleFor(use);
     question.file_kinds = kindsFor(use);
-    question.start = offered.empty() ? startFolder(application) : offered;
+    question.start = offered.empty() ? firstChooserFolder() : offered;
     FileChoice choice = application.frontEnd().chooseFile(question);
     if (isSaving(use))
         addEnding(choice, question);

@@ -26,6 +26,10 @@ enum class FileUse {
     save_film,
 };
 
+/// The folder that choosers show first where nothing else is offered: that of the document at work,
+/// else that of the user's documents; empty where neither is known.
+std::filesystem::path firstChooserFolder();
+
 /// Lets a person choose a file.
 /// @param offered  for a file to save: the one that is there already; empty for none
 /// @return nobody where the command has to ask at its prompt: it is a script's, its line has words

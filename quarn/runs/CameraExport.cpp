@@ -24,6 +24,8 @@ Outcome runExport(const std::string& line, HostSession& host) {
         return stopped("Stopped before anything was written.");
     if (trouble)
         return *trouble;
+    if (front_end.hidesWords())
+        words += front_end.lastSharedText();
     words.resize(words.find_last_not_of('\n') + 1);
     return Outcome::success(words);
 }

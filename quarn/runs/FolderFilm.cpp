@@ -15,7 +15,7 @@ Outcome makeFolderFilm(const FolderFilmRequest& request, const ScriptUse& use) {
     front_end.clearProgress();
     if (front_end.sharedFiles().empty())
         return trouble.value_or(Outcome::success(""));
-    const std::string text = front_end.sharedFiles().back().text.ToUtf8();
+    const std::string text = front_end.lastSharedText();
     if (isInterruptionRequested())
         return stopped("Stopped; the film has the frames until then.\n" + text);
     return Outcome::success(front_end.hidesWords() ? text : "");

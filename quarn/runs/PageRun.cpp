@@ -12,9 +12,13 @@ Outcome writePage(const std::filesystem::path& recorded, const ViewerRequest& re
     watchForInterruption();
     ConsoleFrontEnd front_end(printsFor(use.common));
     HostSession host(front_end, use.common);
-    if (const auto trouble = host.run(line))
+    const auto trouble = host.run(line);
+    front_end.clearProgress();
+    if (trouble && isInterruptionRequested())
+        return stopped("Stopped before the page was written.");
+    if (trouble)
         return *trouble;
-    return Outcome::success(use.common.is_verbose ? "" : front_end.lastWords());
+    return Outcome::success(front_end.hidesWords() ? front_end.lastSharedText() : "");
 }
 
 } // namespace quarn::program

@@ -87,10 +87,14 @@ std::optional<Outcome> refuse(const RecordingRequest& request, bool overwrites) 
 Outcome share(const RecordingScript& script, HostSession& host, const Outcome& recorded) {
     std::string text = recorded.text;
     for (const std::string& line : script.sharing) {
-        if (const auto trouble = host.run(line))
+        const auto trouble = host.run(line);
+        host.frontEnd().clearProgress();
+        if (trouble && isInterruptionRequested())
+            return stopped(text + "\nStopped before the viewer page was written.");
+        if (trouble)
             return {trouble->exit_code, text + "\n" + trouble->text};
         if (host.frontEnd().hidesWords())
-            text += "\n" + host.frontEnd().lastWords();
+            text += "\n" + host.frontEnd().lastSharedText();
     }
     return Outcome::success(text);
 }

@@ -183,6 +183,10 @@ void ConsoleFrontEnd::sharedFileEnded(const SharedFileReport& report) {
         FrontEnd::sharedFileEnded(report);
 }
 
+std::string ConsoleFrontEnd::lastSharedText() const {
+    return m_shared_files.empty() ? "" : m_shared_files.back().text.ToUtf8();
+}
+
 bool ConsoleFrontEnd::isProgressDue() {
     const auto now = FramePace::Clock::now();
     if (now < m_next_progress)

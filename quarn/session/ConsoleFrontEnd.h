@@ -34,6 +34,8 @@ public:
 
     /// What was made of recordings for others, or could not be.
     const std::vector<SharedFileReport>& sharedFiles() const { return m_shared_files; }
+    /// What the newest of them holds; empty before the first.
+    std::string lastSharedText() const;
 
     /// The last line that the host printed since forgetLastWords; UTF-8, empty when there is none.
     /// During a recording: since the last picture.

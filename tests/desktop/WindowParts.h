@@ -31,6 +31,7 @@ inline SessionOptions sessionOptions(const std::string& language,
     options.locale_folders = {locale / "host"};
     options.program_locale_folder = locale / "desktop";
     options.dialog_folders = {shared / "dialogs"};
+    options.viewer_folder = shared / "viewer";
     options.language = language;
     options.documents_folder = documents_folder;
     return options;

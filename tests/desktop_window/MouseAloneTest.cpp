@@ -83,7 +83,22 @@ void openPage(Desk& desk, const std::filesystem::path& page) {
     desk.waitUntilIdle();
 }
 
-TEST(MouseAlone, ATurntableIsSetUpPlayedRecordedAndItsPageOpened) {
+/// Makes the page for others of the folder that the chooser begins at, and looks where it is.
+void sharePage(Desk& desk, const std::filesystem::path& folder) {
+    const std::string opened = desk.openedFiles();
+    desk.chooseInMenu("command_ViewerPage");
+    desk.clickButton("Choose");
+    desk.click("promptOk");
+    desk.waitUntilIdle();
+    EXPECT_TRUE(std::filesystem::exists(folder / (folder.filename().string() + "-viewer.html")));
+    desk.click("showInFolder");
+    desk.lookUntil("the opener called",
+                   [&](const Windows&) { return desk.openedFiles() != opened; });
+    EXPECT_EQ(desk.openedFiles(), opened + folder.string() + '\n');
+    desk.waitUntilIdle();
+}
+
+TEST(MouseAlone, ATurntableIsSetUpPlayedRecordedAndItsPagesAreOpenedAndShared) {
     HouseDesk desk;
     desk.start();
     desk.openHouse();
@@ -103,6 +118,7 @@ TEST(MouseAlone, ATurntableIsSetUpPlayedRecordedAndItsPageOpened) {
     record(desk);
     expectRecording(desk.documents() / "Animation", "png", 96, toldFrameSize(desk));
     openPage(desk, desk.documents() / "Animation" / "Animation.html");
+    sharePage(desk, desk.documents() / "Animation");
 }
 
 /// The place is Athens, whose coordinates the table of cities has.

@@ -102,8 +102,10 @@ void tellDone(const CameraTrack& track, const std::filesystem::path& file) {
             ? QnLocalizeString(L"Wrote the camera and the sun of %d frames, %d a second, to %s.",
                                42835)
             : QnLocalizeString(L"Wrote the camera of %d frames, %d a second, to %s.", 42834);
-    tell(KM_wString::FormatToString(text, track.frameCount(), track.frame_rate,
-                                    textFromPath(file).Array()));
+    Application::current()->frontEnd().sharedFileEnded(
+        {file, true,
+         KM_wString::FormatToString(text, track.frameCount(), track.frame_rate,
+                                    textFromPath(file).Array())});
 }
 
 CQuarnCommand::result writeTrack(const CameraTrack& track, const ExportWish& wish,

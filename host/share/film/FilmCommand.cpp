@@ -2,6 +2,7 @@
 #include "host/app/Application.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileAsking.h"
+#include "host/share/RecordedFolderChoice.h"
 #include "host/share/ShareCommands.h"
 #include "host/share/film/FilmFollower.h"
 #include "host/share/film/FolderFilm.h"
@@ -14,12 +15,17 @@ namespace {
 constexpr int MOST_FRAMES_A_SECOND = 60;
 constexpr int WIDEST_PX = 16384;
 
-/// Asks what the film is to be made of, until there is a folder, or the next recording is meant.
+/// Asks what the film is to be made of, until there is a folder, or the next recording is meant. A
+/// person who has chosen a folder in a chooser is asked for the rest alone.
 class SourceQuestion {
 public:
-    CQuarnCommand::result run() {
+    CQuarnCommand::result run(const CQuarnCommandContext& context) {
+        m_folder = chooseRecordedFolder(context, QnLocalizeString(L"Folder of the frames", 42760))
+                       .value_or("");
         for (;;) {
             const CQuarnGet::result answer = ask();
+            if (answer == CQuarnGet::nothing)
+                return CQuarnCommand::success;
             if (answer == CQuarnGet::string) {
                 m_folder = pathFromText(m_get.String());
                 return CQuarnCommand::success;
@@ -44,11 +50,11 @@ public:
 
 private:
     CQuarnGet::result ask() {
-        m_get.SetCommandPrompt(QnLocalizeString(L"Folder of the frames", 42760));
-        m_get.AcceptString();
         m_get.ClearCommandOptions();
-        m_next_recording =
-            m_get.AddCommandOption(QnLocalizeCommandOptionName(L"NextRecording", 42760));
+        if (m_folder.empty())
+            askFolder();
+        else
+            askToGoOn();
         m_frame_rate = m_get.AddCommandOption(QnLocalizeCommandOptionName(L"FrameRate", 42761));
         m_quality = m_get.AddCommandOption(QnLocalizeCommandOptionName(L"Quality", 42762));
         m_width = m_get.AddCommandOption(QnLocalizeCommandOptionName(L"Width", 42763));
@@ -57,6 +63,18 @@ private:
                                      QnLocalizeCommandOptionValue(L"Yes", 42002), m_has_caption,
                                      &m_has_caption);
         return m_get.GetOption();
+    }
+
+    void askFolder() {
+        m_get.SetCommandPrompt(QnLocalizeString(L"Folder of the frames", 42760));
+        m_get.AcceptString();
+        m_next_recording =
+            m_get.AddCommandOption(QnLocalizeCommandOptionName(L"NextRecording", 42760));
+    }
+
+    void askToGoOn() {
+        m_get.SetCommandPrompt(QnLocalizeString(L"Save the film", 42765));
+        m_get.AcceptNothing();
     }
 
     CQuarnCommand::result askPart(int picked) {
@@ -93,10 +111,17 @@ private:
     int m_width = 0;
 };
 
+/// Beside the frames, with the name of their folder, which is usually the animation's.
+std::filesystem::path offeredFile(const std::filesystem::path& folder) {
+    const std::filesystem::path name = folder.filename();
+    return name.empty() ? folder : folder / (name.native() + ".mp4");
+}
+
 /// A person who chose a file that is there has agreed to replace it.
-CQuarnCommand::result askFilmFile(const CQuarnCommandContext& context, FilmWish& wish) {
+CQuarnCommand::result askFilmFile(const CQuarnCommandContext& context,
+                                  const std::filesystem::path& folder, FilmWish& wish) {
     wish.may_replace = Application::current()->options().overwrites;
-    const FileChoice choice = chooseFile(context, FileUse::save_film);
+    const FileChoice choice = chooseFile(context, FileUse::save_film, offeredFile(folder));
     if (choice.kind == FileChoice::Kind::given_up)
         return CQuarnCommand::cancel;
     if (choice.kind == FileChoice::Kind::chosen) {
@@ -131,10 +156,11 @@ CQuarnCommand::result filmFolder(const std::filesystem::path& folder, const Film
 
 CQuarnCommand::result runFilm(const CQuarnCommandContext& context) {
     SourceQuestion question;
-    if (const auto asked = question.run(); asked != CQuarnCommand::success)
+    if (const auto asked = question.run(context); asked != CQuarnCommand::success)
         return asked;
     FilmWish wish = question.wish();
-    if (const auto asked = askFilmFile(context, wish); asked != CQuarnCommand::success)
+    if (const auto asked = askFilmFile(context, question.folder(), wish);
+        asked != CQuarnCommand::success)
         return asked;
     if (const auto checked = checkFilm(wish, filmModule()); !checked)
         return fail(checked.message());

@@ -38,9 +38,10 @@ std::string nonceOf(const std::string& recording) {
 
 class PageMaking {
 public:
-    PageMaking(const RecordedFolder& recorded, const PageWish& wish, const PageSources& sources)
+    PageMaking(const RecordedFolder& recorded, const PageWish& wish, const PageSources& sources,
+               const PageProgress& progress)
         : m_folder(recorded.folder), m_manifest(recorded.manifest), m_sources(sources),
-          m_is_one_file(wish.is_one_file),
+          m_progress(progress), m_is_one_file(wish.is_one_file),
           m_title(wish.title.empty() ? recorded.manifest.name : wish.title) {
         m_page.file =
             m_folder / pathFromText(KM_wString::FromUtf8(viewerPageName(m_manifest.name)).View());
@@ -168,9 +169,13 @@ private:
         };
         const ByteSink counted = [this, &sink](std::span<const std::byte> bytes) {
             m_page.bytes += bytes.size();
-            return sink(bytes);
+            return !m_is_given_up && sink(bytes);
         };
-        return fillTemplate(m_sources.viewer_folder / "viewer.html", fillers, counted);
+        const auto filled = fillTemplate(m_sources.viewer_folder / "viewer.html", fillers, counted);
+        if (filled && m_is_given_up)
+            return Error{"The page " + textFromPath(m_page.file).ToUtf8() +
+                         " is not written: it was given up."};
+        return filled;
     }
 
     void putFirst(const ByteSink& sink) {
@@ -202,7 +207,18 @@ private:
         }
     }
 
+    /// Asked before each picture: one that is no JPEG takes a moment.
+    bool isStillWanted() {
+        if (m_progress && !m_is_given_up) {
+            const auto pictures = static_cast<double>(m_manifest.images.size());
+            m_is_given_up = !m_progress(m_pictures_begun++ / pictures);
+        }
+        return !m_is_given_up;
+    }
+
     void putPicture(const ManifestFrame& frame, const ByteSink& sink) {
+        if (!isStillWanted())
+            return;
         const auto picture = framesJpeg(pathOf(frame));
         if (picture)
             put(sink, base64Text(picture.value()));
@@ -220,6 +236,9 @@ private:
     fs::path m_folder;
     FramesManifest m_manifest; ///< of the frames that are shown
     const PageSources& m_sources;
+    const PageProgress& m_progress;
+    int m_pictures_begun = 0;
+    bool m_is_given_up = false;
     bool m_is_one_file;
     std::string m_title;
     int m_width_px = 0;
@@ -235,8 +254,8 @@ std::string viewerPageName(const std::string& animation) {
 }
 
 Result<WrittenPage> writeViewerPage(const RecordedFolder& recorded, const PageWish& wish,
-                                    const PageSources& sources) {
-    return PageMaking(recorded, wish, sources).run();
+                                    const PageSources& sources, const PageProgress& progress) {
+    return PageMaking(recorded, wish, sources, progress).run();
 }
 
 } // namespace quarn

@@ -1,30 +1,19 @@
 #include "ground/PathText.h"
 #include "host/app/Application.h"
 #include "host/commands/CommandEnd.h"
-#include "host/commands/WordsLeft.h"
+#include "host/share/RecordedFolderChoice.h"
 #include "host/share/ShareCommands.h"
 #include "host/share/viewer/ViewerPage.h"
-#include "sdk/qncore/QnDirDialog.h"
 #include "sdk/qncore/QnGet.h"
 
 namespace quarn {
 
 namespace {
 
-/// A person at the window chooses a folder there.
-std::optional<std::filesystem::path> chosenFolder(const CQuarnCommandContext& context) {
-    if (!context.IsInteractive() || hasWordsLeft())
-        return std::nullopt;
-    CQuarnUiDirDialog dialog(QnLocalizeString(L"Viewer page", 42741),
-                             QnLocalizeString(L"Folder with recorded frames", 42740), L"", nullptr);
-    if (dialog.DoModal() != QnDialogConfirmed)
-        return std::nullopt;
-    return pathFromText(dialog.GetPathName().View());
-}
-
 CQuarnCommand::result askFolder(const CQuarnCommandContext& context,
                                 std::filesystem::path& folder) {
-    if (const auto chosen = chosenFolder(context)) {
+    if (const auto chosen =
+            chooseRecordedFolder(context, QnLocalizeString(L"Viewer page", 42741))) {
         folder = *chosen;
         return CQuarnCommand::success;
     }
@@ -84,11 +73,11 @@ KM_wString sizeText(std::uint64_t bytes) {
 }
 
 void tellWritten(const WrittenPage& page) {
-    Application::current()->tell(
-        KM_wString::FormatToString(QnLocalizeString(L"%s: %d pictures, %s.", 42749),
-                                   textFromPath(page.file).Array(), page.pictures,
-                                   sizeText(page.bytes).Array())
-            .ToUtf8());
+    Application::current()->frontEnd().sharedFileEnded(
+        {page.file, true,
+         KM_wString::FormatToString(QnLocalizeString(L"%s: %d pictures, %s.", 42749),
+                                    textFromPath(page.file).Array(), page.pictures,
+                                    sizeText(page.bytes).Array())});
 }
 
 CQuarnCommand::result writePage(const std::filesystem::path& folder, const PageWish& wish) {
@@ -97,11 +86,17 @@ CQuarnCommand::result writePage(const std::filesystem::path& folder, const PageW
         return fail(recorded.message());
     warnAll(recorded.value().warnings);
     const SessionOptions& options = Application::current()->options();
-    const auto page =
-        writeViewerPage(recorded.value(), wish,
-                        {options.viewer_folder, options.locale_folders, options.overwrites});
+    FrontEnd& front_end = Application::current()->frontEnd();
+    const std::filesystem::path name = viewerPageName(recorded.value().manifest.name);
+    const auto page = writeViewerPage(
+        recorded.value(), wish, {options.viewer_folder, options.locale_folders, options.overwrites},
+        [&](double share) {
+            front_end.sharedFileProgress(name, share);
+            front_end.pumpEvents(0);
+            return !front_end.isInterrupted();
+        });
     if (!page)
-        return fail(page.message());
+        return front_end.isInterrupted() ? CQuarnCommand::cancel : fail(page.message());
     warnAll(page.value().warnings);
     tellWritten(page.value());
     return CQuarnCommand::success;

@@ -321,6 +321,19 @@ TEST_F(CommandPaneTest, OkNeedsAnAnswerWhereEnterIsNone) {
     EXPECT_EQ(qtText(pane.ask(question).text), "x");
 }
 
+TEST_F(CommandPaneTest, OutputShowsItsNewestLineAlsoWhereItLosesRoom) {
+    pane.resize(600, 300);
+    for (int i = 0; i < 100; ++i)
+        pane.print(L"line\n");
+    QScrollBar& bar = *pane.output().verticalScrollBar();
+    ASSERT_EQ(bar.value(), bar.maximum());
+    const int before = bar.maximum();
+    pane.resize(600, 200);
+    QApplication::processEvents();
+    EXPECT_GT(bar.maximum(), before);
+    EXPECT_EQ(bar.value(), bar.maximum());
+}
+
 TEST_F(CommandPaneTest, OutputKeepsItsPlaceForWhoScrolledUp) {
     for (int i = 0; i < 200; ++i)
         pane.print(L"a line\n");

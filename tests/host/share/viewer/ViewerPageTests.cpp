@@ -44,6 +44,21 @@ protected:
     PageSources m_sources{SOURCES / "share/viewer", {SOURCES / "host/locale"}};
 };
 
+TEST_F(ViewerPageTest, ThatIsNotWantedAnyMoreLeavesTheEarlierOneAlone) {
+    const RecordedFrames frames(3);
+    ASSERT_TRUE(write(frames));
+    const std::string earlier = readFile(frames.page());
+    std::vector<double> shares;
+    const auto page = writeViewerPage(frames.read(), {true, ""}, m_sources, [&](double share) {
+        shares.push_back(share);
+        return shares.size() < 2;
+    });
+    ASSERT_FALSE(page);
+    EXPECT_THAT(page.message(), HasSubstr("is not written: it was given up."));
+    EXPECT_THAT(shares, ElementsAre(0.0, testing::DoubleEq(1.0 / 3)));
+    EXPECT_EQ(readFile(frames.page()), earlier);
+}
+
 TEST_F(ViewerPageTest, NamesThePicturesBesideIt) {
     const RecordedFrames frames(3);
     const auto page = write(frames);
