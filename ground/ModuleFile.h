@@ -21,7 +21,8 @@ struct ModuleFile {
 };
 
 /// Opens a module, which stays open: large libraries do not bear being closed.
-/// @return the function that it exports; an error, the part of a sentence behind a colon, that names
+/// @return the function that it exports; an error, the part of a sentence behind a colon, that
+/// names
 ///         the package to install
 Result<void*> openModule(const ModuleFile& module);
 

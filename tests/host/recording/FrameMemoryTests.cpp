@@ -13,8 +13,8 @@ TEST(MemoryOfFrames, IsToldWithWhatIsFreeWhereItDoesNotFit) {
     EXPECT_FALSE(framesBeyondMemory(1000, free_bytes));
     const auto why = framesBeyondMemory(100'000'000, free_bytes);
     ASSERT_TRUE(why);
-    // 100,000,000 frames of 800 bytes.
-    EXPECT_THAT(why->ToUtf8(), HasSubstr("100000000 frames would take about 74.5 GB of memory"));
+    // 100,000,000 frames of 1,700 bytes.
+    EXPECT_THAT(why->ToUtf8(), HasSubstr("100000000 frames would take about 158.3 GB of memory"));
     EXPECT_THAT(why->ToUtf8(), HasSubstr("3.0 GB are free"));
 }
 

@@ -18,12 +18,14 @@ protected:
         front_end.while_waiting = [&] { held.push_back(quarn::test::heldMemory()); };
         EXPECT_EQ(CQuarnCommand::success, run(L"RecordAnimation _Enter"));
         front_end.while_waiting = nullptr;
-        ASSERT_EQ(frame_count + 3U, files().size()); // with the page, the list and what tells of it all
+        ASSERT_EQ(frame_count + 3U,
+                  files().size()); // with the page, the list and what tells of it all
         ASSERT_GE(held.size(), std::size_t{frame_count});
         const auto quarter = static_cast<std::ptrdiff_t>(held.size() / 4);
         const std::size_t at_first = *std::max_element(held.begin(), held.begin() + quarter);
         const std::size_t at_last = *std::max_element(held.end() - quarter, held.end());
-        constexpr std::size_t bytes_a_frame = 600; // its name for the page, and its line of the list
+        constexpr std::size_t bytes_a_frame =
+            600; // its name for the page, and its line of the list
         EXPECT_LE(at_last, at_first + frame_count * bytes_a_frame + 65536);
     }
 };
