@@ -24,7 +24,7 @@ protected:
     /// Looks at the window some times a second while it works.
     void whileItWorks(const std::function<void()>& look) {
         QObject::connect(&m_clock, &QTimer::timeout, &window, look);
-        m_clock.start(50);
+        m_clock.start(5); // what is looked for may last a tenth of a second
     }
 
     QTimer m_clock;

@@ -88,7 +88,7 @@ TEST_F(DialogExchange, FramesBeyondMemoryAreRefusedWhereATurntableAsksForThem) {
     // SetTurntableAnimation: 24E39B43-B4C1-44AC-8479-4CB1AB388ED5
     turn.m_id = {0x24E39B43, 0xB4C1, 0x44AC, {0x84, 0x79, 0x4C, 0xB1, 0xAB, 0x38, 0x8E, 0xD5}};
     session.runCommand(L"Turn");
-    EXPECT_THAT(told, testing::HasSubstr(L"2147483647 frames would take about 1600.0 GB"));
+    EXPECT_THAT(told, testing::HasSubstr(L"2147483647 frames would take about 3400.0 GB"));
 }
 
 TEST_F(DialogExchange, NumbersAreShownAsTheyReadBack) {

@@ -223,7 +223,7 @@ TEST_F(RecordingSafety, FramesBeyondMemoryAreRefusedBeforeTheModelIsRead) {
     writeFile(studio / "house.obj", "no model");
     const Ended ended = run(studio.turntable(2147483647));
     EXPECT_EQ(ended.exit_code, 1);
-    EXPECT_THAT(ended.err, HasSubstr("quarn: 2147483647 frames would take about 1600.0 GB of "
+    EXPECT_THAT(ended.err, HasSubstr("quarn: 2147483647 frames would take about 3400.0 GB of "
                                      "memory, and "));
     EXPECT_FALSE(exists("out"));
 }
@@ -231,14 +231,14 @@ TEST_F(RecordingSafety, FramesBeyondMemoryAreRefusedBeforeTheModelIsRead) {
 TEST_F(RecordingSafety, FramesBeyondMemoryAreNoAnswerToAQuestionForThem) {
     const Ended script_end = run(script(2147483647, "png"));
     EXPECT_EQ(script_end.exit_code, 1);
-    EXPECT_THAT(script_end.out, HasSubstr("2147483647 frames would take about 1600.0 GB"));
+    EXPECT_THAT(script_end.out, HasSubstr("2147483647 frames would take about 3400.0 GB"));
     Start start;
     start.folder = studio.path();
     start.arguments = {"console", "house.obj", "--language", "en"};
     start.input = "SetTurntableAnimation 2147483647\n3\n_Cancel\nList\n";
     const Ended console = run(start);
     EXPECT_EQ(console.exit_code, 0);
-    EXPECT_THAT(console.out, HasSubstr("would take about 1600.0 GB"));
+    EXPECT_THAT(console.out, HasSubstr("would take about 3400.0 GB"));
     EXPECT_THAT(console.out, HasSubstr("Direction")) << "it is asked again, and answered";
 }
 
