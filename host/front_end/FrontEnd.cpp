@@ -8,6 +8,8 @@ DialogWindow::~DialogWindow() = default;
 
 FrontEnd::~FrontEnd() = default;
 
+void FrontEnd::recordingBegun(const RecordingStart&) {}
+
 void FrontEnd::recordingEnded(const RecordingReport&) {}
 
 void FrontEnd::warn(std::wstring_view text) {

@@ -80,9 +80,11 @@ public:
     virtual bool isInterrupted() const = 0;
     /// The main window; null where there is none.
     virtual HWND mainWindow() = 0;
+    /// Told when a recording has begun in its folder. Shows nothing unless it is overridden.
+    virtual void recordingBegun(const RecordingStart& start);
     /// Told after a picture of an animation was written.
     /// @param written  pictures of this recording so far, from 1
-    /// @param total    frames of the animation; 0 when that is not known
+    /// @param total    frames that this recording makes; 0 when that is not known
     virtual void frameWritten(const std::filesystem::path& file, int written, int total) = 0;
     /// Told once the command that records an animation has ended, also where it recorded nothing in
     /// a folder that it had. Shows nothing unless it is overridden.

@@ -43,6 +43,12 @@ struct SessionOptions {
     /// as a part of its loading, while the front end works on its events. Else the first picture
     /// builds it.
     bool builds_scenes = false;
+    /// By how many threads pictures are drawn and models read at most; 0: by as many as the machine
+    /// has processors.
+    int most_threads = 0;
+    /// The instruction set that pictures are drawn with, one of instructionSets(); empty: the
+    /// fastest.
+    std::string instructions = {};
 };
 
 } // namespace quarn
