@@ -94,6 +94,27 @@ Reading<std::string> scriptWord(const std::string& subject) {
     };
 }
 
+Reading<std::filesystem::path> savedDocument() {
+    using Path = std::filesystem::path;
+    return [](const std::string&, const std::string& word) -> std::variant<Path, Refusal> {
+        if (const auto refusal = whyPathIsRefused("the document's path", word))
+            return Refusal{*refusal};
+        if (!isDocument(word))
+            return Refusal{word + " is no document: give the .quarn file that --save wrote."};
+        return Path(word);
+    };
+}
+
+Reading<FrameRanges> frameRanges() {
+    return [](const std::string& option,
+              const std::string& word) -> std::variant<FrameRanges, Refusal> {
+        FrameRangesReading reading = readFrameRanges(option, word);
+        if (!reading.refusal.empty())
+            return Refusal{reading.refusal};
+        return std::move(reading.ranges);
+    };
+}
+
 Reading<COleDateTime> dateUntil(int last_year) {
     return [=](const std::string& option,
                const std::string& word) -> std::variant<COleDateTime, Refusal> {

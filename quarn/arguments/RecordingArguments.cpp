@@ -58,15 +58,6 @@ void addHidden(CLI::App& command, std::vector<std::string>& hidden) {
         });
 }
 
-void addViewer(CLI::App& command, ViewerRequest& viewer) {
-    command.add_flag("--viewer", viewer.is_wanted,
-                     "Also write NAME-viewer.html, a page to show to others: quarn page --help "
-                     "tells more");
-    command.add_flag_callback(
-        "--one-file", [&viewer] { viewer.is_wanted = viewer.is_one_file = true; },
-        "The same with the pictures inside, so that it can be sent alone");
-}
-
 } // namespace
 
 void addCommonOptions(CLI::App& command, CommonOptions& common) {
@@ -81,6 +72,15 @@ void addCommonOptions(CLI::App& command, CommonOptions& common) {
 void addShowScript(CLI::App& command, bool& is_only_shown) {
     command.add_flag("--show-script", is_only_shown,
                      "Print the host commands that would be run, and run nothing");
+}
+
+void addViewer(CLI::App& command, ViewerRequest& viewer) {
+    command.add_flag("--viewer", viewer.is_wanted,
+                     "Also write NAME-viewer.html, a page to show to others: quarn page --help "
+                     "tells more");
+    command.add_flag_callback(
+        "--one-file", [&viewer] { viewer.is_wanted = viewer.is_one_file = true; },
+        "The same with the pictures inside, so that it can be sent alone");
 }
 
 void addOverwrite(CLI::App& command, CommonOptions& common) {
@@ -133,6 +133,9 @@ void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse
         "Keep the document with its animation in this .quarn file, before recording");
     addRecordingFilm(command, request.film,
                      subject == CaptureSubject::moving_sun ? FilmTimes::perhaps : FilmTimes::none);
+    command.add_flag("--resume", request.goes_on,
+                     "Go on with the recording in the folder; where another one is there, say so "
+                     "and write nothing (default: make that anew)");
     addOverwrite(command, use.common);
     addShowScript(command, use.is_only_shown);
     addCommonOptions(command, use.common);
