@@ -63,6 +63,9 @@ public:
     /// Whether a picture or a page may be written to a file now: a recording that runs leaves files
     /// of others alone, and has told so then.
     bool mayWrite(const std::filesystem::path& file) const;
+    /// Whether a picture or a page is not to be written now and counts as written all the same: a
+    /// recording that runs has that frame already, or leaves it to others.
+    bool passesOver(const std::filesystem::path& file);
     /// What becomes of a write-protected file that is to be replaced.
     Protection protection() const {
         return m_options.overwrites ? Protection::overridden : Protection::respected;
@@ -81,9 +84,11 @@ public:
     /// Who follows the recording that runs now, or the next one. RecordingScope lets them go at
     /// its end.
     RecordingFollowers& recordingFollowers() { return m_followers; }
-    void setRecording(std::unique_ptr<RunningRecording> recording) {
-        m_recording = std::move(recording);
-    }
+    void setRecording(std::unique_ptr<RunningRecording> recording);
+    /// What the next recording is to make.
+    void chooseNextRecording(RecordingChoice choice) { m_next_recording = std::move(choice); }
+    /// Takes that; the one after it is the usual one.
+    RecordingChoice takeNextRecording() { return std::exchange(m_next_recording, {}); }
 
     /// The window object for a window; null for a null window.
     CWnd* windowFor(HWND window);
@@ -110,6 +115,7 @@ private:
     std::unique_ptr<DocumentList> m_documents;
     std::unique_ptr<PlugInLoader> m_plug_ins;
     std::unique_ptr<RunningRecording> m_recording;
+    RecordingChoice m_next_recording;
     RecordingFollowers m_followers;
     std::map<HWND, std::unique_ptr<CWnd>> m_windows;
     const CDialog* m_open_dialog = nullptr;

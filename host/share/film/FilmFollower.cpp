@@ -1,9 +1,12 @@
 #include "host/share/film/FilmFollower.h"
 
+#include "ground/PathText.h"
 #include "host/app/Application.h"
 #include "host/app/StudyMoments.h"
 #include "host/document/Document.h"
 #include "host/share/film/FilmCaption.h"
+#include "host/share/frames/FramePicture.h"
+#include "sdk/qncore/QnLocalize.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
 #include <algorithm>
@@ -16,21 +19,30 @@ FilmFollower::FilmFollower(FilmWish wish, Application& application)
 void FilmFollower::frameRecorded(const RecordedFrame& frame) {
     if (m_has_ended)
         return;
-    if (const auto taken = take(frame); !taken)
+    if (const auto taken = take(frame.number, frame.picture); !taken)
         end(taken.error());
 }
 
-Result<void> FilmFollower::take(const RecordedFrame& frame) {
+void FilmFollower::frameKept(int number, const std::filesystem::path& file) {
+    if (m_has_ended)
+        return;
+    const auto picture = readFramePicture(file);
+    const auto taken = picture ? take(number, picture.value()) : Result<void>(picture.error());
+    if (!taken)
+        end(taken.error());
+}
+
+Result<void> FilmFollower::take(int number, const Image& picture) {
     if (!m_making)
         begin();
     std::string caption;
     if (m_wish.has_caption) {
-        auto text = captionOf(sunOfFrame(m_record, frame.number), m_wish.file);
+        auto text = captionOf(sunOfFrame(m_record, number), m_wish.file);
         if (!text)
             return text.error();
         caption = std::move(text.value());
     }
-    return m_making->add(frame.picture, caption);
+    return m_making->add(picture, caption);
 }
 
 void FilmFollower::begin() {
@@ -56,9 +68,17 @@ int FilmFollower::threadsBesideDrawing() {
     return 1;
 }
 
-void FilmFollower::recordingEnded(const RecordingReport&) {
+/// A film of which other programs make some of the frames would jump.
+void FilmFollower::recordingEnded(const RecordingReport& report) {
     if (m_has_ended)
         return;
+    if (report.elsewhere > 0)
+        return end(Error{KM_wString::FormatToString(
+                             QnLocalizeString(L"%s is not made: other programs record some of its "
+                                              L"frames. Make it of the folder once all are there.",
+                                              42863),
+                             textFromPath(m_wish.file).Array())
+                             .ToUtf8()});
     if (!m_making)
         begin();
     end(m_making->finish());

@@ -18,12 +18,13 @@ public:
     FilmFollower(FilmWish wish, Application& application);
 
     void frameRecorded(const RecordedFrame& frame) override;
+    void frameKept(int number, const std::filesystem::path& file) override;
     void recordingEnded(const RecordingReport& report) override;
 
 private:
     void begin();
     int threadsBesideDrawing();
-    Result<void> take(const RecordedFrame& frame);
+    Result<void> take(int number, const Image& picture);
     void end(const Result<SharedFileReport>& made);
 
     FilmWish m_wish;
