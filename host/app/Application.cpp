@@ -36,7 +36,7 @@ Application* Application::forCall(const char* call) {
 }
 
 Application::Application(FrontEnd& front_end, SessionOptions options)
-    : m_front_end(front_end), m_options(std::move(options)),
+    : m_front_end(front_end), m_options(std::move(options)), m_processor_use(m_options),
       m_former_receiver(setBreachReceiver(receiverFor(m_options))), m_texts(m_options.language),
       m_runner(*this) {
     claimMainThread();

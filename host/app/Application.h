@@ -5,6 +5,7 @@
 #include "host/app/CommandRegistry.h"
 #include "host/app/CommandRunner.h"
 #include "host/app/PlugInLoader.h"
+#include "host/app/ProcessorUse.h"
 #include "host/app/RecordingFollowers.h"
 #include "host/app/StringTables.h"
 #include "host/border/Contract.h"
@@ -105,6 +106,7 @@ private:
 
     FrontEnd& m_front_end;
     SessionOptions m_options;
+    ProcessorUse m_processor_use; ///< first: what follows draws
     BreachReceiver m_former_receiver;
     StringTables m_texts;
     CommandRegistry m_commands;

@@ -1,5 +1,6 @@
 #include "quarn/arguments/Readings.h"
 
+#include "host/session/InstructionSets.h"
 #include "host/session/MemorySize.h"
 
 #include <algorithm>
@@ -76,6 +77,21 @@ Reading<PixelSize> sizeOfPicture() {
 
 Reading<std::uint64_t> sizeOfMemory() {
     return reading<std::uint64_t>("a size such as 500M or 2G, from 1M", &memorySize);
+}
+
+Reading<int> threadCount() {
+    constexpr int MOST_THREADS = 1024;
+    return wholeNumberFrom(1, MOST_THREADS, "threads");
+}
+
+Reading<std::string> instructionSet() {
+    return [](const std::string& option,
+              const std::string& word) -> std::variant<std::string, Refusal> {
+        const std::string name = lowerCase(word);
+        if (const auto refusal = whyInstructionsAreRefused(name))
+            return Refusal{option + ": " + *refusal};
+        return name;
+    };
 }
 
 Reading<std::string> oneOf(const std::vector<std::string>& words) {

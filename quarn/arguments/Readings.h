@@ -22,6 +22,11 @@ Reading<PixelSize> sizeOfPicture();
 /// In bytes.
 Reading<std::uint64_t> sizeOfMemory();
 
+/// By how many threads work is done.
+Reading<int> threadCount();
+/// A set of instructions that this processor has, in lower case.
+Reading<std::string> instructionSet();
+
 /// One of these words in any case; the value is in lower case, as they are.
 Reading<std::string> oneOf(const std::vector<std::string>& words);
 

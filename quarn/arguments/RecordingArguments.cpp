@@ -76,6 +76,13 @@ void addCommonOptions(CLI::App& command, CommonOptions& common) {
     const OptionAdder add(command);
     add("--limit-memory", common.most_memory, "SIZE", sizeOfMemory(),
         "Memory that reading a model may take, such as 500M or 2G (default: half of what is free)");
+    add("--threads", common.most_threads, "N", threadCount(),
+        "By how many threads models are read and pictures drawn, 1 to 1024 (default: one for each "
+        "processor core)");
+    add("--instructions", common.instructions, "NAME", instructionSet(),
+        "Instructions of the processor that pictures are drawn with: avx512, avx2 or sse2 "
+        "(default: the fastest of them that it has); pictures of different ones differ in their "
+        "last bits");
 }
 
 void addShowScript(CLI::App& command, bool& is_only_shown) {

@@ -13,13 +13,6 @@
 
 namespace quarn {
 
-namespace {
-
-/// The drawing has the processors; what encodes beside it lives on what it leaves.
-constexpr int THREADS_BESIDE_DRAWING = 1;
-
-} // namespace
-
 FilmFollower::FilmFollower(FilmWish wish, Application& application)
     : m_wish(std::move(wish)), m_application(application) {}
 
@@ -59,8 +52,20 @@ void FilmFollower::begin() {
         m_record = access->AnimationProperties(document->face());
     const int frames = std::max(1, m_record.FrameCount());
     const int rate = m_wish.frame_rate > 0 ? m_wish.frame_rate : standardFrameRate(frames);
-    m_making.emplace(FilmMaking::Plan{m_wish, frames, rate, THREADS_BESIDE_DRAWING},
+    m_making.emplace(FilmMaking::Plan{m_wish, frames, rate, threadsBesideDrawing()},
                      m_application.frontEnd());
+}
+
+/// The drawing has the processors, and what encodes beside it lives on what it leaves; but where
+/// threads are counted it is one of them.
+int FilmFollower::threadsBesideDrawing() {
+    const int most_threads = m_application.options().most_threads;
+    if (most_threads == 1)
+        return 0;
+    if (most_threads > 1)
+        m_drawing_limit.emplace(tbb::global_control::max_allowed_parallelism,
+                                static_cast<std::size_t>(most_threads - 1));
+    return 1;
 }
 
 /// A film of which other programs make some of the frames would jump.
@@ -82,6 +87,7 @@ void FilmFollower::recordingEnded(const RecordingReport& report) {
 void FilmFollower::end(const Result<SharedFileReport>& made) {
     m_has_ended = true;
     m_making.reset();
+    m_drawing_limit.reset();
     m_application.frontEnd().sharedFileEnded(
         made ? made.value()
              : SharedFileReport{m_wish.file, false, KM_wString::FromUtf8(made.message())});
