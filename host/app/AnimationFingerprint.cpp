@@ -9,8 +9,6 @@
 #include "host/document/DocumentScene.h"
 #include "host/document/SceneFingerprint.h"
 
-#include <cmath>
-
 namespace quarn {
 
 namespace {
@@ -22,24 +20,13 @@ void addPoints(const KM_3dPointArray& points, Checksum& sum) {
             sum.add(coordinate);
 }
 
-/// Without the last bits: a recording puts the camera back by way of its target and its lens, and
-/// that may change them.
-void addRounded(double number, double size, Checksum& sum) {
-    constexpr int KEPT_BITS = 30;
-    const double step = size > 0.0 ? std::ldexp(1.0, std::ilogb(size) - KEPT_BITS) : 1.0;
-    sum.add(std::round(number / step) * step + 0.0); // never -0
-}
-
 void addCamera(const FrameCamera& camera, Checksum& sum) {
-    const double distance = camera.place.DistanceTo(camera.target);
-    for (const KM_3dPoint& point : {camera.place, camera.target})
+    for (const KM_3dPoint& point : {camera.place, camera.target, KM_3dPoint(camera.up)})
         for (const double coordinate : {point.x, point.y, point.z})
-            addRounded(coordinate, distance, sum);
-    for (const double coordinate : {camera.up.x, camera.up.y, camera.up.z})
-        addRounded(coordinate, 1.0, sum);
+            sum.add(coordinate);
     sum.add(camera.is_parallel);
     for (const double number : {camera.lens_mm, camera.width, camera.height})
-        addRounded(number, number, sum);
+        sum.add(number);
 }
 
 /// Empty where the scene cannot be built.
