@@ -119,8 +119,8 @@ Outcome cancelFarm(const Path& folder) {
         recorded.trouble.empty()
             ? recorded.progress.frames - static_cast<int>(recorded.progress.missing.size())
             : 0;
-    return Outcome::success("Cancelled. " + frameCountText(there) + " of " +
-                            std::to_string(record.value().frames) + (there == 1 ? " is" : " are") +
+    return Outcome::success("Cancelled. " + std::to_string(there) + " of " +
+                            frameCountText(record.value().frames) + (there == 1 ? " is" : " are") +
                             " there and stay; quarn farm submit goes on with the others.");
 }
 

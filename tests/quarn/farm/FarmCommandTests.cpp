@@ -133,7 +133,7 @@ TEST_F(FarmCommand, MakesTheSameFilesByItsScriptAsOneRecording) {
     const Ended finished = runJob(script, {"finish"});
     EXPECT_EQ(finished.exit_code, 0) << finished.out << finished.err;
     for (const char* const name : {"house000.jpg", "house002.jpg", "house005.jpg", "house.html"})
-        EXPECT_EQ(readFile(m_studio / out / name), readFile(m_studio / "whole" / name)) << name;
+        EXPECT_TRUE(readFile(m_studio / out / name) == readFile(m_studio / "whole" / name)) << name;
     EXPECT_GT(readFile(m_studio / out / "house005.jpg").size(), 500u);
     EXPECT_FALSE(fs::exists(m_studio / "pwned") || fs::exists(m_studio / out / "pwned"));
 }
@@ -236,6 +236,7 @@ TEST_F(FarmCommand, TellsHowFarAFolderIsAndCancelsItsJobs) {
     ASSERT_EQ(submit({"--tasks", "3"}).exit_code, 0);
     ASSERT_EQ(runJob(m_studio / "out/house.farm.sh", {"frames", "0"}, "0").exit_code, 0);
     writeCommand("scontrol",
+                 "[ \"$2\" = config ] && exit\n"
                  "[ \"$4\" = 101 ] && echo 'JobId=101 ArrayJobId=101 ArrayTaskId=1 "
                  "JobState=RUNNING Reason=None Restarts=0 ExitCode=0:0 NodeList=n1 X=1' && exit\n"
                  "echo 'scontrol: error: Invalid job id specified' >&2; exit 1\n");
@@ -248,7 +249,7 @@ TEST_F(FarmCommand, TellsHowFarAFolderIsAndCancelsItsJobs) {
 
     const Ended cancelled = run(farm({"cancel", "out"}));
     EXPECT_EQ(cancelled.exit_code, 0) << cancelled.err;
-    EXPECT_THAT(cancelled.out, HasSubstr("2 of 6 are there"));
+    EXPECT_THAT(cancelled.out, HasSubstr("2 of 6 frames are there"));
     EXPECT_THAT(calls("scancel"),
                 ElementsAre(ElementsAre("scancel", "103"), ElementsAre("scancel", "101"),
                             ElementsAre("scancel", "102")));
@@ -300,8 +301,10 @@ TEST_F(FarmCommand, RefusesAChangedDocumentUnlessItMayOverwrite) {
     const Ended taken = submit({"--overwrite"});
     EXPECT_EQ(taken.exit_code, 0) << taken.err;
     EXPECT_THAT(taken.out, HasSubstr("6 frames of 6 are missing"));
-    EXPECT_EQ(runJob(m_studio / "out/house.farm.sh", {"frames", "0"}, "0").exit_code, 0);
-    EXPECT_EQ(readFile(m_studio / "out/house005.jpg"), readFile(m_studio / "tall/house005.jpg"));
+    const Ended made = runJob(m_studio / "out/house.farm.sh", {"frames", "0"}, "0");
+    EXPECT_EQ(made.exit_code, 0) << made.out << made.err;
+    EXPECT_TRUE(readFile(m_studio / "out/house005.jpg") ==
+                readFile(m_studio / "tall/house005.jpg"));
 }
 
 TEST_F(FarmCommand, RefusesWhatMakesNoSense) {
