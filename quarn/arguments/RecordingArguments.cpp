@@ -72,8 +72,8 @@ void addCommonOptions(CLI::App& command, CommonOptions& common) {
         "processor core)");
     add("--instructions", common.instructions, "NAME", instructionSet(),
         "Instructions of the processor that pictures are drawn with: avx512, avx2 or sse2 "
-        "(default: the fastest of them that it has); pictures of different ones differ in their "
-        "last bits");
+        "(default: the fastest of them that it has); pictures of different ones differ in a few "
+        "pixels");
 }
 
 void addShowScript(CLI::App& command, bool& is_only_shown) {
@@ -142,7 +142,8 @@ void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse
                      subject == CaptureSubject::moving_sun ? FilmTimes::perhaps : FilmTimes::none);
     command.add_flag("--resume", request.goes_on,
                      "Go on with the recording in the folder; where another one is there, say so "
-                     "and write nothing (default: make that anew)");
+                     "and write nothing "
+                     "(default, and with --overwrite: make that anew)");
     addOverwrite(command, use.common);
     addShowScript(command, use.is_only_shown);
     addCommonOptions(command, use.common);

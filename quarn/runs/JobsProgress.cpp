@@ -10,14 +10,15 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr FramePace::Clock::duration SHORTEST_STEP = 500ms;
+constexpr FramePace::Clock::duration SHORTEST_STEP = 100ms;
 /// Of the time that a look takes: 10,000 frames take a while.
 constexpr int LOOKS_OF_A_STEP = 10;
 
 } // namespace
 
 JobsProgress::JobsProgress(const DocumentRecordingRequest& request)
-    : m_request(request), m_line(stderr), m_kept(request.begins_anew ? 0 : count().there) {}
+    : m_request(request), m_line(stderr),
+      m_kept(request.start == RecordingStartKind::anew ? 0 : count().there) {}
 
 JobsProgress::Counts JobsProgress::count() const {
     const RecordingProgressResult found = recordingProgress(m_request.folder);
