@@ -58,6 +58,7 @@ Workshop::Workshop() {
     writeDocuments();
     std::filesystem::create_directory(m_folder / "out"); // as a script needs it
     writeFrames();
+    writeCluster();
 }
 
 Ended Workshop::run(const std::vector<std::string>& arguments, const std::string& input) const {
@@ -65,7 +66,8 @@ Ended Workshop::run(const std::vector<std::string>& arguments, const std::string
     start.folder = m_folder.path();
     start.arguments = arguments;
     start.input = input;
-    start.environment = {{"XDG_STATE_HOME", (m_folder / "state").native()}};
+    start.environment = {{"XDG_STATE_HOME", (m_folder / "state").native()},
+                         {"PATH", (m_folder / "bin").native() + ":/usr/bin:/bin"}};
     return test::run(start);
 }
 
@@ -103,6 +105,26 @@ void Workshop::writeDocuments() const {
               "_-Point _Name Fountain 1,1,1\n_-SaveAs town.quarn\n");
     const Ended ended = run({"run", "documents.txt", "house.obj"});
     EXPECT_EQ(ended.exit_code, 0) << ended.err;
+}
+
+void Workshop::writeCluster() const {
+    std::filesystem::create_directory(m_folder / "bin");
+    const std::string cancelled = (m_folder / "cancelled").native();
+    const auto write = [&](const char* name, const std::string& text) {
+        writeFile(m_folder / "bin" / name, "#!/bin/sh\n" + text);
+        std::filesystem::permissions(m_folder / "bin" / name, std::filesystem::perms::owner_all);
+    };
+    write("sbatch", "rm -f '" + cancelled + "'\necho 12\n");
+    write("squeue", "");
+    std::filesystem::create_directory(m_folder / "farmed");
+    writeFile(m_folder / "farmed/house.farm.json",
+              R"({"name": "house", "document": "house.quarn", "submitted": "", "frames": 2,)"
+              R"("frame_seconds": 1, "loading_seconds": 1, "chunks": ["0-1"], "command": [],)"
+              R"("arrays": [{"id": "12", "first": 0, "tasks": 1}], "finish": "13"})");
+    write("scancel", "touch '" + cancelled + "'\n");
+    write("scontrol", "[ \"$2\" = config ] && exit\n[ ! -f '" + cancelled +
+                          "' ] && echo JobId=$4 JobState=PENDING Reason=Resources && exit\n"
+                          "echo Invalid job id specified >&2\nexit 1\n");
 }
 
 void Workshop::writeFrames() const {
