@@ -84,7 +84,8 @@ bool RunningRecording::isAlive(const std::string& journal) {
     const JournalReader* reader = m_known ? m_known->journal(journal) : nullptr;
     if (!m_known && alone.readOn())
         reader = &alone;
-    return reader && isWriterAlive(*reader, m_journal->renew(), m_pace.lease);
+    const auto now = m_journal ? m_journal->renew() : timeOfDisk(m_place.folder);
+    return reader && isWriterAlive(*reader, now, m_pace.lease);
 }
 
 Result<void> RunningRecording::start() {
@@ -122,7 +123,7 @@ Result<void> RunningRecording::startAnew() {
     std::error_code error;
     fs::remove(m_place.folder / manifestName(m_place.animation), error); // tells of replaced frames
     for (const fs::path& journal : journalsIn(m_place.folder, m_place.animation))
-        if (!m_journal || (journal != m_journal->file() && !isAlive(journal.filename().native())))
+        if (!(m_journal && journal == m_journal->file()) && !isAlive(journal.filename().native()))
             fs::remove(journal, error);
     if (m_wanted.isEmpty())
         m_file.fingerprint.instructions.clear(); // the first to make a frame decides
