@@ -1,9 +1,11 @@
 #include "ground/ProcessIdentity.h"
 
+#include <algorithm>
 #include <array>
 #include <cctype>
 #include <cerrno>
 #include <csignal>
+#include <ctime>
 #include <fstream>
 #include <sstream>
 #include <unistd.h>
@@ -52,6 +54,16 @@ const std::string& hostName() {
 ProcessIdentity currentProcess() {
     const int pid = getpid();
     return {hostName(), pid, startOf(pid)};
+}
+
+double secondsSinceProcessStart() {
+    const double ticks_per_s = static_cast<double>(sysconf(_SC_CLK_TCK));
+    const std::uint64_t started = startOf(getpid());
+    timespec now{};
+    if (started == 0 || ticks_per_s <= 0.0 || clock_gettime(CLOCK_BOOTTIME, &now) != 0)
+        return 0.0;
+    const double now_s = static_cast<double>(now.tv_sec) + static_cast<double>(now.tv_nsec) * 1e-9;
+    return std::max(0.0, now_s - static_cast<double>(started) / ticks_per_s);
 }
 
 bool hasEnded(const ProcessIdentity& process) {

@@ -23,6 +23,9 @@ const std::string& hostName();
 /// This process.
 ProcessIdentity currentProcess();
 
+/// For how long this process has run, in seconds; 0 where that is not known.
+double secondsSinceProcessStart();
+
 /// Whether a process of this machine has ended, or another one has its number now. False for one of
 /// another machine: nobody here can tell.
 bool hasEnded(const ProcessIdentity& process);

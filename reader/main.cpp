@@ -6,6 +6,8 @@
 #include "reader/Fence.h"
 #include "reader/ReaderLimits.h"
 
+#include <tbb/global_control.h>
+
 #include <cerrno>
 #include <chrono>
 #include <cstdio>
@@ -45,6 +47,10 @@ ReaderAnswer refusal(std::string message) {
 }
 
 ReaderAnswer read(const ReaderRequest& request) {
+    std::optional<tbb::global_control> limit;
+    if (request.most_threads > 0)
+        limit.emplace(tbb::global_control::max_allowed_parallelism,
+                      static_cast<std::size_t>(request.most_threads));
     TellingWatch watch;
     Result<ImportedModel> model = readModelFile(request.path, {.up = request.up,
                                                                .tolerance = request.tolerance,

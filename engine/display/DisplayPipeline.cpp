@@ -57,7 +57,7 @@ private:
 
 } // namespace
 
-DisplayPipeline::DisplayPipeline() : m_kernel(&bestRayKernel()) {}
+DisplayPipeline::DisplayPipeline() : m_kernel(&rayKernelInForce()) {}
 
 Result<void> DisplayPipeline::draw(const DisplayScene& scene, const KM_Viewport& viewport,
                                    const DisplayModeAttributes& mode, int width, int height,

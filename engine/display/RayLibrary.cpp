@@ -1,5 +1,7 @@
 #include "engine/display/RayLibrary.h"
 
+#include "engine/display/InstructionSet.h"
+
 #include <utility>
 
 namespace quarn {
@@ -18,11 +20,25 @@ std::string sentenceFor(RTCError error, const char* message) {
            ". Close other programs or hide objects.";
 }
 
+/// How the library is set up for a set of instructions. Left alone it goes by the model of the
+/// processor in how wide its trees are, and what has the same instructions would draw differently.
+const char* settingsFor(InstructionSet set) {
+    switch (set) {
+    case InstructionSet::avx512:
+        return "isa=avx512,frequency_level=simd256";
+    case InstructionSet::avx2:
+        return "isa=avx2,frequency_level=simd256";
+    case InstructionSet::sse2:
+        break;
+    }
+    return "isa=sse2,frequency_level=simd128";
+}
+
 } // namespace
 
 /// A processor that the library runs on lacks nothing but memory, or threads, which take some.
 std::shared_ptr<RayLibrary> RayLibrary::start(std::string& why) {
-    if (const RTCDevice device = rtcNewDevice(nullptr))
+    if (const RTCDevice device = rtcNewDevice(settingsFor(instructionSetInForce())))
         return std::make_shared<RayLibrary>(device);
     const RTCError error = rtcGetDeviceError(nullptr);
     why =

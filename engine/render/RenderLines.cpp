@@ -31,7 +31,7 @@ void findDepth(FrameSetup frame, DepthImage& depth) {
     std::vector<std::uint32_t> colors(depth.nearness.size());
     frame.pixels = colors.data();
     frame.nearness = depth.nearness.data();
-    const RayKernel& kernel = bestRayKernel();
+    const RayKernel& kernel = rayKernelInForce();
     const int count = (frame.height + rows_at_once - 1) / rows_at_once;
     tbb::parallel_for(0, count, [&](int index) {
         const FlushDenormals flush;

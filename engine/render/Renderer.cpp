@@ -48,7 +48,7 @@ Result<void> checkRequest(const RenderRequest& request, const KM_Viewport& viewp
 
 } // namespace
 
-Renderer::Renderer() : m_kernel(&bestRenderKernel()) {}
+Renderer::Renderer() : m_kernel(&renderKernelInForce()) {}
 
 Result<void> Renderer::checkMemory(const RenderRequest& request, std::uint64_t available) {
     const std::uint64_t wanted = std::uint64_t{bytes_per_pixel} *

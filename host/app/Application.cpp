@@ -36,7 +36,7 @@ Application* Application::forCall(const char* call) {
 }
 
 Application::Application(FrontEnd& front_end, SessionOptions options)
-    : m_front_end(front_end), m_options(std::move(options)),
+    : m_front_end(front_end), m_options(std::move(options)), m_processor_use(m_options),
       m_former_receiver(setBreachReceiver(receiverFor(m_options))), m_texts(m_options.language),
       m_runner(*this) {
     claimMainThread();
@@ -111,6 +111,20 @@ bool Application::mayWrite(const std::filesystem::path& file) const {
     return !m_recording || m_recording->mayWrite(file);
 }
 
+bool Application::passesOver(const std::filesystem::path& file) {
+    if (!m_recording || !m_recording->passesOver(file))
+        return false;
+    if (const auto frame = m_recording->frameOf(file); frame && m_recording->hasKept(*frame))
+        m_followers.frameKept(*frame, file);
+    return true;
+}
+
+void Application::setRecording(std::unique_ptr<RunningRecording> recording) {
+    m_recording = std::move(recording);
+    const auto wants = [this] { return m_recording->makesNext(); };
+    m_documents->setWantsPictures(m_recording ? std::function<bool()>(wants) : nullptr);
+}
+
 void Application::pictureWritten(const std::filesystem::path& file, const Image& picture) {
     if (m_recording)
         if (const auto frame = m_recording->fileWritten(file))
@@ -119,7 +133,8 @@ void Application::pictureWritten(const std::filesystem::path& file, const Image&
     if (!command)
         return;
     ++command->pictures_written;
-    m_front_end.frameWritten(file, command->pictures_written, frameCount(m_documents->active()));
+    const int total = m_recording ? m_recording->wantedFrames() : frameCount(m_documents->active());
+    m_front_end.frameWritten(file, command->pictures_written, total);
 }
 
 CWnd* Application::windowFor(HWND window) {

@@ -5,6 +5,7 @@
 #include "host/app/CommandRegistry.h"
 #include "host/app/CommandRunner.h"
 #include "host/app/PlugInLoader.h"
+#include "host/app/ProcessorUse.h"
 #include "host/app/RecordingFollowers.h"
 #include "host/app/StringTables.h"
 #include "host/border/Contract.h"
@@ -62,6 +63,9 @@ public:
     /// Whether a picture or a page may be written to a file now: a recording that runs leaves files
     /// of others alone, and has told so then.
     bool mayWrite(const std::filesystem::path& file) const;
+    /// Whether a picture or a page is not to be written now and counts as written all the same: a
+    /// recording that runs has that frame already, or leaves it to others.
+    bool passesOver(const std::filesystem::path& file);
     /// What becomes of a write-protected file that is to be replaced.
     Protection protection() const {
         return m_options.overwrites ? Protection::overridden : Protection::respected;
@@ -80,9 +84,11 @@ public:
     /// Who follows the recording that runs now, or the next one. RecordingScope lets them go at
     /// its end.
     RecordingFollowers& recordingFollowers() { return m_followers; }
-    void setRecording(std::unique_ptr<RunningRecording> recording) {
-        m_recording = std::move(recording);
-    }
+    void setRecording(std::unique_ptr<RunningRecording> recording);
+    /// What the next recording is to make.
+    void chooseNextRecording(RecordingChoice choice) { m_next_recording = std::move(choice); }
+    /// Takes that; the one after it is the usual one.
+    RecordingChoice takeNextRecording() { return std::exchange(m_next_recording, {}); }
 
     /// The window object for a window; null for a null window.
     CWnd* windowFor(HWND window);
@@ -100,6 +106,7 @@ private:
 
     FrontEnd& m_front_end;
     SessionOptions m_options;
+    ProcessorUse m_processor_use; ///< first: what follows draws
     BreachReceiver m_former_receiver;
     StringTables m_texts;
     CommandRegistry m_commands;
@@ -108,6 +115,7 @@ private:
     std::unique_ptr<DocumentList> m_documents;
     std::unique_ptr<PlugInLoader> m_plug_ins;
     std::unique_ptr<RunningRecording> m_recording;
+    RecordingChoice m_next_recording;
     RecordingFollowers m_followers;
     std::map<HWND, std::unique_ptr<CWnd>> m_windows;
     const CDialog* m_open_dialog = nullptr;

@@ -52,8 +52,10 @@ void CQuarnApp::Wait(unsigned int milliseconds) const {
     quarn::Application* application = quarn::Application::forCall("CQuarnApp::Wait");
     if (!application)
         return;
-    application->frontEnd().pumpEvents(milliseconds);
-    if (quarn::RunningRecording* recording = application->recording())
+    quarn::RunningRecording* const recording = application->recording();
+    const bool has_nothing_to_show = recording && recording->hasPassedOver();
+    application->frontEnd().pumpEvents(has_nothing_to_show ? 0 : milliseconds);
+    if (recording)
         recording->beat();
 }
 

@@ -31,6 +31,8 @@ bool CQuarnDib::WriteToFile(const wchar_t* path, int) const {
     const std::filesystem::path file = quarn::pathFromText(path);
     if (!application->mayWrite(file))
         return false;
+    if (application->passesOver(file))
+        return true;
     const auto written = quarn::writeImageFile(file, *m_image, application->protection(),
                                                application->jpegQuality());
     if (written)

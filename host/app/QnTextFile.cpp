@@ -16,6 +16,7 @@ struct CQnTextFile::State {
     std::optional<std::filesystem::path> path; ///< nothing while no file is open
     filetype type = filetype::utf8;
     std::wstring text;
+    bool is_passed_over = false; ///< counts as written and is not
 };
 
 namespace {
@@ -72,7 +73,8 @@ bool CQnTextFile::Open(const wchar_t* path, open_mode mode, filetype type) {
     const std::filesystem::path file = quarn::pathFromText(path);
     if (!canBeWritten(file) || !mayWrite(file))
         return false;
-    *m_state = {file, type, {}};
+    quarn::Application* const application = applicationHere();
+    *m_state = {file, type, {}, application && application->passesOver(file)};
     return true;
 }
 
@@ -87,6 +89,8 @@ bool CQnTextFile::Close() {
     if (!m_state->path)
         return false;
     const State closing = std::exchange(*m_state, {});
+    if (closing.is_passed_over)
+        return true;
     const auto encoding = static_cast<quarn::TextEncoding>(closing.type);
     const std::string bytes = quarn::encodeTextFile(closing.text, encoding);
     // A page comes once behind its pictures; those are written without a look around.

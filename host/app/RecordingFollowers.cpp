@@ -21,6 +21,11 @@ void RecordingFollowers::frameRecorded(int number, const std::filesystem::path& 
         follower->frameRecorded({number, file, camera, picture});
 }
 
+void RecordingFollowers::frameKept(int number, const std::filesystem::path& file) {
+    for (const auto& follower : m_followers)
+        follower->frameKept(number, file);
+}
+
 void RecordingFollowers::end(const RecordingReport& report) {
     for (const auto& follower : m_followers)
         follower->recordingEnded(report);

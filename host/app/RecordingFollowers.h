@@ -20,6 +20,8 @@ public:
     void addFirst(std::unique_ptr<RecordingFollower> follower);
     /// A recording begins.
     void begin(Camera camera) { m_camera = std::move(camera); }
+    /// A frame was there already, whole.
+    void frameKept(int number, const std::filesystem::path& file);
     void frameRecorded(int number, const std::filesystem::path& file, const Image& picture);
     /// Tells all of them of the end, and lets them go.
     void end(const RecordingReport& report);

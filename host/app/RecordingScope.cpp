@@ -1,7 +1,9 @@
 #include "host/app/RecordingScope.h"
 
+#include "engine/scene/UnitLength.h"
+#include "host/app/AnimationFingerprint.h"
 #include "host/app/Application.h"
-#include "host/app/ManifestMaker.h"
+#include "host/app/FrameNoter.h"
 #include "host/border/Border.h"
 #include "host/document/DisplayModeList.h"
 #include "host/document/Document.h"
@@ -63,18 +65,32 @@ void takePictureSize(const KM_3dmAnimationProperties& record, Document& document
     }
 }
 
-RunningRecording::Plan planOf(const KM_3dmAnimationProperties& record, Document& document,
-                              bool overwrites) {
+RecordingSettings settingsOf(const KM_3dmAnimationProperties& record, Document& document) {
     KM_wString extension = record.FileExtension();
     extension.Remove(L'.');
-    RunningRecording::Plan plan;
+    RecordingSettings settings;
+    settings.kind = kindOf(record.CaptureType());
+    settings.frames = record.FrameCount();
+    settings.mode = modeOf(record);
+    settings.extension = extension.ToUtf8();
+    takePictureSize(record, document, settings);
+    return settings;
+}
+
+RecordingPlan planOf(const KM_3dmAnimationProperties& record, Document& document,
+                     Application& application) {
+    RecordingPlan plan;
     plan.animation = record.HtmlFilename().ToUtf8();
-    plan.settings.kind = kindOf(record.CaptureType());
-    plan.settings.frames = record.FrameCount();
-    plan.settings.mode = modeOf(record);
-    plan.settings.extension = extension.ToUtf8();
-    takePictureSize(record, document, plan.settings);
-    plan.overwrites = overwrites;
+    plan.settings = settingsOf(record, document);
+    std::error_code error;
+    if (!document.file().empty())
+        plan.document = std::filesystem::absolute(document.file(), error);
+    plan.metres_per_unit = metresPerUnit(document.units());
+    plan.fingerprint = [record, settings = plan.settings, &document] {
+        return fingerprintOf(record, settings, document);
+    };
+    plan.choice = application.takeNextRecording();
+    plan.overwrites = application.options().overwrites;
     return plan;
 }
 
@@ -97,15 +113,19 @@ RecordingFollowers::Camera cameraOf(const KM_3dmAnimationProperties& record, Doc
 
 void beginRecording(Application& application, Document& document,
                     const KM_3dmAnimationProperties& record) {
-    RunningRecording::Plan plan = planOf(record, document, application.options().overwrites);
+    RecordingPlan plan = planOf(record, document, application);
     if (plan.animation.find('/') != std::string::npos)
         return; // nothing of this name is written
-    const auto tell = [&application](const std::string& text) { application.tell(text); };
     RecordingFollowers& followers = application.recordingFollowers();
     followers.begin(cameraOf(record, document, plan.settings));
-    followers.addFirst(
-        std::make_unique<ManifestMaker>(record, plan.animation, plan.settings, document, tell));
-    application.setRecording(std::make_unique<RunningRecording>(std::move(plan), tell));
+    auto recording = std::make_unique<RunningRecording>(
+        std::move(plan), RunningRecording::Listener{
+                             [&application](const std::string& text) { application.tell(text); },
+                             [&application](const RecordingStart& start) {
+                                 application.frontEnd().recordingBegun(start);
+                             }});
+    followers.addFirst(std::make_unique<FrameNoter>(record, *recording));
+    application.setRecording(std::move(recording));
 }
 
 } // namespace

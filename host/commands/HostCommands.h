@@ -48,6 +48,7 @@ CQuarnCommand::result runJpegQuality(const CQuarnCommandContext& context);
 CQuarnCommand::result runLine(const CQuarnCommandContext& context);
 CQuarnCommand::result runList(const CQuarnCommandContext& context);
 CQuarnCommand::result runMovePoint(const CQuarnCommandContext& context);
+CQuarnCommand::result runNextRecording(const CQuarnCommandContext& context);
 CQuarnCommand::result runNew(const CQuarnCommandContext& context);
 CQuarnCommand::result runOpen(const CQuarnCommandContext& context);
 CQuarnCommand::result runPoint(const CQuarnCommandContext& context);

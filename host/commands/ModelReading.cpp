@@ -175,6 +175,7 @@ Result<void> readModelOf(AskedFile& asked, const ReadingWish& wish, WatchedReadi
         readModel(asked.file, {.up = wish.up,
                                .tolerance = wish.tolerance,
                                .most_memory = Application::current()->options().most_memory,
+                               .most_threads = Application::current()->options().most_threads,
                                .watch = &watch});
     if (!model)
         return model.error();

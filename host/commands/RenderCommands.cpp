@@ -25,6 +25,8 @@ ShownPicture asShown(const Image& picture) {
 CQuarnCommand::result renderView(Document& document, int samples) {
     if (const std::string& trouble = document.list().unsavedPicture(); !trouble.empty())
         return fail(trouble + " No more pictures are rendered.");
+    if (!document.list().wantsPictures())
+        return CQuarnCommand::success;
     RenderWindow& window = document.renderWindow();
     const RenderRequest request{window.settings.width_px, window.settings.height_px, samples};
     ViewState& view = document.list().viewToRender(document);
@@ -62,7 +64,7 @@ CQuarnCommand::result runRenderPreview(const CQuarnCommandContext& context) {
 CQuarnCommand::result runSaveRenderWindowAs(const CQuarnCommandContext& context) {
     Document& document = Document::of(context.Document());
     const RenderWindow& window = document.renderWindow();
-    if (!window.isOpen())
+    if (!window.isOpen() && document.list().wantsPictures())
         return fail("There is no rendered picture. Make one with Render or RenderPreview first.");
     std::filesystem::path file;
     const CQuarnCommand::result asked =
@@ -74,6 +76,8 @@ CQuarnCommand::result runSaveRenderWindowAs(const CQuarnCommandContext& context)
         document.list().noteUnsavedPicture("The picture was not written.");
         return CQuarnCommand::failure;
     }
+    if (application.passesOver(file))
+        return CQuarnCommand::success;
     const auto written =
         writeImageFile(file, window.picture, application.protection(), application.jpegQuality());
     document.list().noteUnsavedPicture(written ? std::string() : written.message());

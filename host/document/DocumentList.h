@@ -2,6 +2,7 @@
 
 #include "host/document/Document.h"
 
+#include <functional>
 #include <memory>
 #include <string>
 #include <utility>
@@ -48,6 +49,10 @@ public:
     /// could, and when no command runs.
     const std::string& unsavedPicture() const { return m_unsaved_picture; }
     void noteUnsavedPicture(std::string why) { m_unsaved_picture = std::move(why); }
+    /// Asks, while an animation is recorded, whether the pictures that are asked for now are wanted;
+    /// those that are not are left as they are and count as drawn. Null: all are wanted.
+    void setWantsPictures(std::function<bool()> wants) { m_wants_pictures = std::move(wants); }
+    bool wantsPictures() const { return !m_wants_pictures || m_wants_pictures(); }
     /// Called when the outermost command has ended: closes every document but the active one, and
     /// does to its views what was put off until then.
     void commandEnded();
@@ -82,6 +87,7 @@ private:
     std::uint64_t m_command_count = 0;
     ViewState* m_placed_view = nullptr; ///< by the command that runs; null: none
     std::string m_unsaved_picture;
+    std::function<bool()> m_wants_pictures;
     std::unique_ptr<KM_3dmAnimationProperties> m_fresh_record;
     const IQnZoetrixDynamicAccess* m_fresh_record_access = nullptr; ///< whose it is; never called
 };

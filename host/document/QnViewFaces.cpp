@@ -13,6 +13,10 @@ const KM_Viewport& noCamera() {
     return viewport;
 }
 
+bool isWanted(const quarn::ViewState& view) {
+    return view.document().list().wantsPictures();
+}
+
 /// Notes a view that a plug-in placed.
 /// @return whether it did
 bool placed(quarn::ViewState& view, bool is_done) {
@@ -89,7 +93,7 @@ const CDisplayPipelineAttributes* CQuarnView::DisplayAttributes() const {
 }
 
 void CQuarnView::Redraw(unsigned int flags) {
-    if (mayCallView(*m_view, "CQuarnView::Redraw"))
+    if (mayCallView(*m_view, "CQuarnView::Redraw") && isWanted(*m_view))
         m_view->redraw(flags);
 }
 
@@ -111,7 +115,7 @@ CDisplayPipelineAttributes* CQuarnDisplayPipeline::CurrentDisplayAttributes() {
 bool CQuarnDisplayPipeline::DrawToDib(CQuarnDib& dib, int width, int height,
                                       const CDisplayPipelineAttributes& attributes) {
     return mayCallView(*m_view, "CQuarnDisplayPipeline::DrawToDib") &&
-           m_view->draw(dib.Image(), width, height, attributes);
+           (!isWanted(*m_view) || m_view->draw(dib.Image(), width, height, attributes));
 }
 
 bool CQuarnDisplayPipeline::CopyToFrameBuffer(const CQuarnDib& dib) {

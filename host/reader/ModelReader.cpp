@@ -50,7 +50,8 @@ public:
           m_longest(timeOf(options, path)) {}
 
     Result<ImportedModel> model() {
-        const ReaderRequest request{m_path, m_options.up, m_options.tolerance, m_most_memory};
+        const ReaderRequest request{m_path, m_options.up, m_options.tolerance, m_most_memory,
+                                    m_options.most_threads};
         if (!m_reader.ask(request))
             return ended();
         for (;;) {

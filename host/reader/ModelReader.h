@@ -17,6 +17,9 @@ struct ModelReaderOptions {
     /// Bytes of memory that the reader and the model together may take; 0: half of what is
     /// free, and at least 64 MB.
     std::uint64_t most_memory = 0;
+    /// Threads that the reader may use; 0: as many as the machine has processors. A reading inside
+    /// this process takes what the process may.
+    int most_threads = 0;
     /// How long the reading may take; 0: longestReading of the file.
     std::chrono::milliseconds longest{0};
     /// May be null. Asked on the calling thread some fifty times a second while the reader works;

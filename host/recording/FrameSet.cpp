@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <numeric>
 
 namespace quarn {
 
@@ -43,6 +44,12 @@ void FrameSet::add(const FrameSet& frames) {
 bool FrameSet::has(int frame) const {
     const auto at = std::ranges::lower_bound(m_ranges, frame, {}, &Range::last);
     return at != m_ranges.end() && at->first <= frame;
+}
+
+int FrameSet::count() const {
+    return std::accumulate(m_ranges.begin(), m_ranges.end(), 0, [](int sum, const Range& range) {
+        return sum + (range.last - range.first + 1);
+    });
 }
 
 } // namespace quarn

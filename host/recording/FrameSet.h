@@ -25,6 +25,7 @@ public:
 
     bool has(int frame) const;
     bool isEmpty() const { return m_ranges.empty(); }
+    int count() const;
     /// In rising order; none touches the next one.
     std::span<const Range> ranges() const { return m_ranges; }
 

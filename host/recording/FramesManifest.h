@@ -64,6 +64,7 @@ struct FramesManifest {
     double metres_per_unit = 0.0;      ///< 0: the document has no units
     std::string document;              ///< fingerprint, 16 hexadecimal digits; empty: not known
     std::string settings;              ///< the same of all settings that change pictures
+    std::string instructions;          ///< the instruction set that drew them; empty: not known
     std::vector<ManifestFrame> images; ///< those that are there, by rising number
 
     friend bool operator==(const FramesManifest&, const FramesManifest&) = default;

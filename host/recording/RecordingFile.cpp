@@ -12,7 +12,7 @@ namespace {
 using json = nlohmann::json;
 
 constexpr const char* format_name = "quarn-recording";
-constexpr int format_version = 1;
+constexpr int format_version = 2;
 
 // ---- To JSON
 
@@ -36,22 +36,29 @@ json jsonOf(const RecordingSettings& settings) {
             {"mode", settings.mode},         {"extension", settings.extension}};
 }
 
+json jsonOf(const RecordingFingerprint& fingerprint) {
+    return {{"program", fingerprint.program},
+            {"document", fingerprint.document},
+            {"settings", fingerprint.settings},
+            {"instructions", fingerprint.instructions}};
+}
+
 json jsonOf(const RecordingFile& recording) {
-    json object = {{"format", format_name},
-                   {"version", format_version},
-                   {"name", recording.animation},
-                   {"state", recording.is_running ? "recording" : "ended"},
-                   {"writer",
-                    {{"host", recording.writer.host},
-                     {"pid", recording.writer.pid},
-                     {"started", recording.writer.started}}},
-                   {"settings", jsonOf(recording.settings)},
-                   {"written", jsonOf(recording.written)},
-                   {"owns_page", recording.owns_page},
-                   {"earlier", jsonOf(recording.earlier)}};
-    if (recording.is_running)
-        object["lease_until_unix_s"] = recording.lease_until_s;
-    return object;
+    return {{"format", format_name},
+            {"version", format_version},
+            {"name", recording.animation},
+            {"document_file", recording.document.native()},
+            {"state", recording.is_running ? "recording" : "ended"},
+            {"shared", recording.is_shared},
+            {"writer",
+             {{"host", recording.writer.host},
+              {"pid", recording.writer.pid},
+              {"started", recording.writer.started}}},
+            {"settings", jsonOf(recording.settings)},
+            {"fingerprint", jsonOf(recording.fingerprint)},
+            {"written", jsonOf(recording.written)},
+            {"owns_page", recording.owns_page},
+            {"earlier", jsonOf(recording.earlier)}};
 }
 
 // ---- From JSON. What has another type than it should throws, which ends in parseRecording.
@@ -86,6 +93,11 @@ RecordingSettings settingsOf(const json& object) {
             object.at("extension")};
 }
 
+RecordingFingerprint fingerprintOf(const json& object) {
+    return {object.at("program"), object.at("document"), object.at("settings"),
+            object.at("instructions")};
+}
+
 RecordingFile recordingOf(const json& object) {
     RecordingFile recording;
     recording.animation = object.at("name");
@@ -93,9 +105,11 @@ RecordingFile recordingOf(const json& object) {
     const json& writer = object.at("writer");
     recording.writer = {writer.at("host"), intOf(writer.at("pid")),
                         integerOf<std::uint64_t>(writer.at("started"))};
-    if (recording.is_running)
-        recording.lease_until_s = integerOf<std::int64_t>(object.at("lease_until_unix_s"));
     recording.settings = settingsOf(object.at("settings"));
+    recording.document = object.value("document_file", "");
+    recording.is_shared = object.value("shared", false);
+    if (object.contains("fingerprint"))
+        recording.fingerprint = fingerprintOf(object["fingerprint"]);
     recording.written = framesOf(object.at("written"));
     recording.owns_page = object.at("owns_page");
     recording.earlier = picturesOf(object.at("earlier"));
@@ -167,11 +181,6 @@ Result<void> writeRecordingFile(const std::filesystem::path& file, const Recordi
                                 Protection protection) {
     const std::string text = recordingFileText(recording);
     return writeFileAtomically(file, std::as_bytes(std::span(text)), protection);
-}
-
-bool isRecordedElsewhere(const RecordingFile& recording, std::int64_t now_s) {
-    return recording.is_running && recording.writer != currentProcess() &&
-           !hasEnded(recording.writer) && now_s < recording.lease_until_s;
 }
 
 } // namespace quarn

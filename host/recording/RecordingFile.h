@@ -4,8 +4,8 @@
 #include "ground/ProcessIdentity.h"
 #include "ground/Result.h"
 #include "host/recording/FrameSet.h"
+#include "host/recording/RecordingFingerprint.h"
 
-#include <cstdint>
 #include <filesystem>
 #include <map>
 #include <optional>
@@ -29,16 +29,18 @@ struct RecordingSettings {
 /// Pictures by their extension.
 using PicturesByExtension = std::map<std::string, FrameSet>;
 
-/// What the file NAME.recording beside the pictures of an animation holds: who records or recorded
-/// them, and which files are therefore the recording's own. docs/recording-file.md describes it.
+/// What the file NAME.recording beside the pictures of an animation holds: what is or was recorded,
+/// and which files are therefore the recording's own. docs/recording-file.md describes it.
 struct RecordingFile {
-    std::string animation; ///< the name
-    bool is_running = false;
-    ProcessIdentity writer;
-    /// While it runs: seconds since 1970 in UTC until which the writer counts as alive.
-    std::int64_t lease_until_s = 0;
+    std::string animation;          ///< the name
+    std::filesystem::path document; ///< absolute path of the document's file; empty: it has none
+    bool is_running = false;        ///< it has not come to its end
+    bool is_shared = false;         ///< other programs may record frames of it too
+    ProcessIdentity writer;         ///< who began it
     RecordingSettings settings;
-    FrameSet written;            ///< by this recording
+    /// Without an instruction set where no frame was made yet; empty in files of earlier versions.
+    RecordingFingerprint fingerprint;
+    FrameSet written;            ///< by this recording, once it has ended
     bool owns_page = false;      ///< the page is this recording's, or that of an earlier one
     PicturesByExtension earlier; ///< written by earlier recordings of this name
 
@@ -60,10 +62,5 @@ std::string recordingFileText(const RecordingFile& recording);
 /// @param file  for the message
 /// @return errors as of readRecordingFile
 Result<RecordingFile> parseRecordingFile(std::string_view text, const std::filesystem::path& file);
-
-/// Whether another process records now, as far as can be told: its lease lives, and it has not
-/// ended on this machine.
-/// @param now_s  seconds since 1970 in UTC
-bool isRecordedElsewhere(const RecordingFile& recording, std::int64_t now_s);
 
 } // namespace quarn

@@ -26,6 +26,8 @@ public:
     /// After a frame was written. What the frame refers to lives as long as the call; work that
     /// takes long belongs on another thread.
     virtual void frameRecorded(const RecordedFrame& frame) = 0;
+    /// In place of that, for a frame that was there already, whole.
+    virtual void frameKept(int number, const std::filesystem::path& file) = 0;
     /// Once, when the recording has ended, whole or not; followers are called in the order in which
     /// they were added. Not called where the recording never began in its folder.
     virtual void recordingEnded(const RecordingReport& report) = 0;

@@ -1,13 +1,14 @@
 #include "host/recording/RecordingPlace.h"
 
+#include "ground/PartFile.h"
 #include "ground/PathText.h"
 #include "host/recording/FrameNames.h"
 #include "host/recording/FramesManifest.h"
 #include "host/recording/RecordedPage.h"
+#include "host/recording/RecordingJournal.h"
 #include "sdk/qncore/QnLocalize.h"
 
 #include <algorithm>
-#include <chrono>
 #include <vector>
 
 namespace quarn {
@@ -86,18 +87,42 @@ Error inTheWay(const RecordingPlace& place, const std::vector<std::string>& name
                 .ToUtf8()};
 }
 
-Error isRecorded(const RecordingPlace& place, const RecordingFile& recording) {
+} // namespace
+
+Error isRecorded(const RecordingPlace& place, const ProcessIdentity& writer) {
     return {KM_wString::FormatToString(
                 QnLocalizeString(L"%s is being recorded into %s by process %d on %s. Wait until "
                                  L"that recording has ended, or choose another folder or another "
                                  L"name.",
                                  42532),
                 KM_wString::FromUtf8(place.animation).Array(), textFromPath(place.folder).Array(),
-                recording.writer.pid, KM_wString::FromUtf8(recording.writer.host).Array())
+                writer.pid, KM_wString::FromUtf8(writer.host).Array())
                 .ToUtf8()};
 }
 
-} // namespace
+fs::file_time_type timeOfDisk(const fs::path& folder) {
+    const PartFile probe(folder, 0600);
+    std::error_code error;
+    const auto now = fs::last_write_time(probe.path(), error);
+    return error ? fs::file_time_type::clock::now() : now;
+}
+
+std::optional<ProcessIdentity> whoRecords(const RecordingPlace& place, const fs::path& own_journal,
+                                          std::chrono::seconds lease) {
+    std::optional<fs::file_time_type> now;
+    for (const fs::path& file : journalsIn(place.folder, place.animation)) {
+        if (file == own_journal)
+            continue;
+        if (!now)
+            now = timeOfDisk(place.folder);
+        JournalReader journal(file);
+        (void)journal.readOn().ok();
+        if (journal.content().head.animation == place.animation &&
+            isWriterAlive(journal, *now, lease))
+            return journal.content().head.writer;
+    }
+    return std::nullopt;
+}
 
 fs::path RecordingPlace::recordingFile() const {
     return folder / recordingFileName(animation);
@@ -117,19 +142,12 @@ Result<OwnFiles> checkRecordingPlace(const RecordingPlace& place, bool overwrite
     if (!read && !overwrites)
         return read.error();
     const bool is_known = read && read.value();
-    if (is_known && isRecordedElsewhere(*read.value(), unixSeconds()))
-        return isRecorded(place, *read.value());
     OwnFiles own = is_known ? filesOf(*read.value()) : filesOfPage(place);
     if (overwrites)
         return own;
     if (const auto names = filesInTheWay(place, own); !names.empty())
         return inTheWay(place, names);
     return own;
-}
-
-std::int64_t unixSeconds() {
-    using namespace std::chrono;
-    return duration_cast<seconds>(system_clock::now().time_since_epoch()).count();
 }
 
 } // namespace quarn

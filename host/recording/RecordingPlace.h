@@ -3,7 +3,9 @@
 #include "ground/Result.h"
 #include "host/recording/RecordingFile.h"
 
+#include <chrono>
 #include <filesystem>
+#include <optional>
 #include <string>
 
 namespace quarn {
@@ -27,16 +29,28 @@ struct OwnFiles {
     bool owns(const std::string& extension, int frame) const;
 };
 
-/// Looks whether an animation may be recorded there: nobody else records it into the folder now,
-/// and no file is in its way that no recording of this name has written. A folder that is not there
-/// yet is free.
-/// @param overwrites  files of others may be replaced; a recording that runs may not be disturbed
+/// For how long a journal counts after it was renewed: long enough for the slowest drawing of a
+/// scene, and for a disk far away.
+constexpr std::chrono::seconds JOURNAL_LEASE{60};
+
+/// The time of the disk that a folder is on, which the files on it are dated with.
+std::filesystem::file_time_type timeOfDisk(const std::filesystem::path& folder);
+
+/// Another program that records the animation into the folder now, as far as can be told; nothing
+/// where there is none.
+/// @param own_journal  of who asks; empty: none
+std::optional<ProcessIdentity> whoRecords(const RecordingPlace& place,
+                                          const std::filesystem::path& own_journal = {},
+                                          std::chrono::seconds lease = JOURNAL_LEASE);
+/// Says so, in a sentence of the user's language that says what to do.
+Error isRecorded(const RecordingPlace& place, const ProcessIdentity& writer);
+
+/// Looks whether an animation may be recorded there anew: no file is in its way that no recording
+/// of this name has written. A folder that is not there yet is free.
+/// @param overwrites  files of others may be replaced
 /// @return what earlier recordings of this name have written there; or why not, in a sentence of
 /// the
 ///         user's language that says what to do
 Result<OwnFiles> checkRecordingPlace(const RecordingPlace& place, bool overwrites);
-
-/// Seconds since 1970 in UTC.
-std::int64_t unixSeconds();
 
 } // namespace quarn

@@ -2,6 +2,7 @@
 
 #include "host/app/Application.h"
 #include "host/commands/HostCommands.h"
+#include "host/session/InstructionSets.h"
 #include "host/share/ShareCommands.h"
 
 namespace quarn {
@@ -9,9 +10,17 @@ namespace quarn {
 struct Session::State {
     State(FrontEnd& front_end, SessionOptions options)
         : application(front_end, std::move(options)) {
+        tellOfInstructions();
         application.addHostCommands(makeHostCommands());
         application.addHostCommands(makeShareCommands());
     }
+
+    void tellOfInstructions() {
+        const std::string& name = application.options().instructions;
+        if (const auto refusal = name.empty() ? std::nullopt : whyInstructionsAreRefused(name))
+            application.tell(*refusal + " They are drawn with the fastest.");
+    }
+
     Application application;
 };
 

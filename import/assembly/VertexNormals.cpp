@@ -4,6 +4,7 @@
 #include "import/assembly/FaceNormals.h"
 #include "import/assembly/IndexTable.h"
 
+#include <tbb/global_control.h>
 #include <tbb/parallel_for.h>
 #include <tbb/task_arena.h>
 
@@ -108,7 +109,9 @@ private:
     static std::size_t rangesFor(std::size_t triangles) {
         constexpr std::size_t WORTH_A_THREAD = 8192;
         constexpr std::size_t MOST_RANGES = 16;
-        const auto threads = static_cast<std::size_t>(tbb::this_task_arena::max_concurrency());
+        const auto threads = std::min(
+            static_cast<std::size_t>(tbb::this_task_arena::max_concurrency()),
+            tbb::global_control::active_value(tbb::global_control::max_allowed_parallelism));
         return std::clamp<std::size_t>(std::min(threads, triangles / WORTH_A_THREAD), 1,
                                        MOST_RANGES);
     }

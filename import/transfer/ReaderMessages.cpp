@@ -9,7 +9,7 @@ namespace quarn {
 namespace {
 
 /// Told apart by what follows it whenever a message or the block changes.
-constexpr std::int32_t LAYOUT = 1;
+constexpr std::int32_t LAYOUT = 2;
 /// Of a message's text; the rest of the packet is room for its other fields.
 constexpr std::size_t MOST_TEXT_BYTES = MOST_MESSAGE_BYTES - 1024;
 
@@ -23,7 +23,8 @@ template <class Step, class AnyRequest, class AnyBytes>
 bool requestFields(Step step, AnyRequest& request, AnyBytes& path) {
     return step(path) && step(request.up, UpAxis::by_format, UpAxis::z) &&
            step(request.tolerance) &&
-           step.check(std::isfinite(request.tolerance) && request.tolerance >= 0.0);
+           step.check(std::isfinite(request.tolerance) && request.tolerance >= 0.0) &&
+           step(request.most_threads) && step.check(request.most_threads >= 0);
 }
 
 template <class Step, class AnyAnswer, class AnyBytes>

@@ -28,6 +28,7 @@ struct ReaderRequest {
     UpAxis up = UpAxis::by_format;
     double tolerance = 0.0;
     std::uint64_t most_memory = 0; ///< bytes, below 2^63
+    std::int32_t most_threads = 0; ///< that read; 0: as many as the machine has processors
 };
 
 /// What the program answers: any number of times how far it is, then how it ended.

@@ -14,6 +14,9 @@ inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
                                                record the sun and the shadows through one day
   quarn season MODEL --place NAME --from DATE --to DATE
                                                record those of one time of day through the seasons
+  quarn record DOC --out DIR                   record a saved animation, or a part of it with
+                                               --frames RANGES; goes on where it was stopped
+  quarn finish DIR                             make what such a recording lacks, then its page
   quarn video FOLDER FILE                      make a film of recorded pictures: .mp4, .webm, .gif,
                                                .webp or .apng
   quarn places [TEXT]                          list the cities that a sun study knows by name
@@ -34,6 +37,7 @@ Examples:
   quarn turntable house.glb --frames 120 --out out/house --save house.quarn
   quarn flythrough house.glb --camera-curve walk.txt --even-speed --frames 240 --out out/walk
   quarn day house.glb --place Athens --date 2026-06-21 --every 10 --out out/sun
+  quarn record house.quarn --out out/all
   quarn frame house.quarn --number 60 --out middle.png
   quarn camera house.quarn --out camera.glb
   quarn info house.glb
@@ -129,6 +133,32 @@ saving do not count, so clocks on the wall differ, most of all in summer:
   London,  0.13 W   here UTC,   on the wall UTC+1: for 14:30 give 13:30
 The zone and the universal time of the first picture are told before the recording begins. Seconds
 are always 0.)";
+
+inline constexpr const char* RECORD_FOOTER = R"(
+The same command goes on where it was stopped or killed: frames that are whole stay, all others are
+made. Where the document has changed since, or a setting of its pictures, it says so and writes
+nothing. Several programs, on one machine or many that see the same folder, may record the same
+document into it at the same time: no frame is made twice.
+
+Ranges count frames from 0 as file names do, with both ends: 0-9 are ten frames, 20-30:2 is every
+other one, 12-12 is one. Without --frames the page and the list of frames are written at the end.
+
+Examples:
+  quarn record house.quarn --out out/house
+  quarn record house.quarn --out out/parts --frames 0-99
+  quarn record house.quarn --out out/parts --frames 100-199
+  quarn finish out/parts --viewer
+  quarn record house.quarn --out out/jobs --jobs 2)";
+
+inline constexpr const char* FINISH_FOOTER = R"(
+Every frame is looked at: those that are missing, cut or changed are made again, and then the page,
+the list of frames and what is asked for besides. A recording that is whole already is only looked at.
+The folder knows its document; --document is for one that was moved.
+
+Examples:
+  quarn record house.quarn --out out/house --frames 0-49
+  quarn finish out/house --video house.mp4
+  quarn finish out/house --document house.quarn --viewer)";
 
 inline constexpr const char* VIDEO_FOOTER = R"(
 The pictures stand in the film in the order of their numbers. An mp4 plays everywhere; a webm is

@@ -37,17 +37,6 @@ CLI::Option* addModel(CLI::App& command, FileWish& wish, const std::string& desc
                                 description);
 }
 
-Reading<std::filesystem::path> savedDocument() {
-    using Path = std::filesystem::path;
-    return [](const std::string&, const std::string& word) -> std::variant<Path, Refusal> {
-        if (const auto refusal = whyPathIsRefused("the document's path", word))
-            return Refusal{*refusal};
-        if (!isDocument(word))
-            return Refusal{word + " is no document: give the .quarn file that --save wrote."};
-        return Path(word);
-    };
-}
-
 } // namespace
 
 Action addCurves(CLI::App& command) {

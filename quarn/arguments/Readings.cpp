@@ -1,5 +1,6 @@
 #include "quarn/arguments/Readings.h"
 
+#include "host/session/InstructionSets.h"
 #include "host/session/MemorySize.h"
 
 #include <algorithm>
@@ -78,6 +79,21 @@ Reading<std::uint64_t> sizeOfMemory() {
     return reading<std::uint64_t>("a size such as 500M or 2G, from 1M", &memorySize);
 }
 
+Reading<int> threadCount() {
+    constexpr int MOST_THREADS = 1024;
+    return wholeNumberFrom(1, MOST_THREADS, "threads");
+}
+
+Reading<std::string> instructionSet() {
+    return [](const std::string& option,
+              const std::string& word) -> std::variant<std::string, Refusal> {
+        const std::string name = lowerCase(word);
+        if (const auto refusal = whyInstructionsAreRefused(name))
+            return Refusal{option + ": " + *refusal};
+        return name;
+    };
+}
+
 Reading<std::string> oneOf(const std::vector<std::string>& words) {
     return reading<std::string>(
         alternatives(words), [=](const std::string& word) -> std::optional<std::string> {
@@ -91,6 +107,27 @@ Reading<std::string> scriptWord(const std::string& subject) {
         if (const auto refusal = whyPathIsRefused(subject, word))
             return Refusal{*refusal};
         return word;
+    };
+}
+
+Reading<std::filesystem::path> savedDocument() {
+    using Path = std::filesystem::path;
+    return [](const std::string&, const std::string& word) -> std::variant<Path, Refusal> {
+        if (const auto refusal = whyPathIsRefused("the document's path", word))
+            return Refusal{*refusal};
+        if (!isDocument(word))
+            return Refusal{word + " is no document: give the .quarn file that --save wrote."};
+        return Path(word);
+    };
+}
+
+Reading<FrameRanges> frameRanges() {
+    return [](const std::string& option,
+              const std::string& word) -> std::variant<FrameRanges, Refusal> {
+        FrameRangesReading reading = readFrameRanges(option, word);
+        if (!reading.refusal.empty())
+            return Refusal{reading.refusal};
+        return std::move(reading.ranges);
     };
 }
 

@@ -2,6 +2,7 @@
 
 #include "quarn/arguments/OptionAdder.h"
 #include "quarn/words/DateWords.h"
+#include "quarn/words/FrameRanges.h"
 
 #include <cstdint>
 #include <optional>
@@ -22,12 +23,23 @@ Reading<PixelSize> sizeOfPicture();
 /// In bytes.
 Reading<std::uint64_t> sizeOfMemory();
 
+/// By how many threads work is done.
+Reading<int> threadCount();
+/// A set of instructions that this processor has, in lower case.
+Reading<std::string> instructionSet();
+
 /// One of these words in any case; the value is in lower case, as they are.
 Reading<std::string> oneOf(const std::vector<std::string>& words);
 
 /// A name or a path that a script can hold.
 /// @param subject  what it is, for the message: "the name of --hide"
 Reading<std::string> scriptWord(const std::string& subject);
+
+/// A document file to open.
+Reading<std::filesystem::path> savedDocument();
+
+/// Frames of an animation: "0-9,20-30:2".
+Reading<FrameRanges> frameRanges();
 
 /// A day of the calendar from the first year that sun studies know.
 Reading<COleDateTime> dateUntil(int last_year);

@@ -58,15 +58,6 @@ void addHidden(CLI::App& command, std::vector<std::string>& hidden) {
         });
 }
 
-void addViewer(CLI::App& command, ViewerRequest& viewer) {
-    command.add_flag("--viewer", viewer.is_wanted,
-                     "Also write NAME-viewer.html, a page to show to others: quarn page --help "
-                     "tells more");
-    command.add_flag_callback(
-        "--one-file", [&viewer] { viewer.is_wanted = viewer.is_one_file = true; },
-        "The same with the pictures inside, so that it can be sent alone");
-}
-
 } // namespace
 
 void addCommonOptions(CLI::App& command, CommonOptions& common) {
@@ -76,11 +67,27 @@ void addCommonOptions(CLI::App& command, CommonOptions& common) {
     const OptionAdder add(command);
     add("--limit-memory", common.most_memory, "SIZE", sizeOfMemory(),
         "Memory that reading a model may take, such as 500M or 2G (default: half of what is free)");
+    add("--threads", common.most_threads, "N", threadCount(),
+        "By how many threads models are read and pictures drawn, 1 to 1024 (default: one for each "
+        "processor core)");
+    add("--instructions", common.instructions, "NAME", instructionSet(),
+        "Instructions of the processor that pictures are drawn with: avx512, avx2 or sse2 "
+        "(default: the fastest of them that it has); pictures of different ones differ in their "
+        "last bits");
 }
 
 void addShowScript(CLI::App& command, bool& is_only_shown) {
     command.add_flag("--show-script", is_only_shown,
                      "Print the host commands that would be run, and run nothing");
+}
+
+void addViewer(CLI::App& command, ViewerRequest& viewer) {
+    command.add_flag("--viewer", viewer.is_wanted,
+                     "Also write NAME-viewer.html, a page to show to others: quarn page --help "
+                     "tells more");
+    command.add_flag_callback(
+        "--one-file", [&viewer] { viewer.is_wanted = viewer.is_one_file = true; },
+        "The same with the pictures inside, so that it can be sent alone");
 }
 
 void addOverwrite(CLI::App& command, CommonOptions& common) {
@@ -133,6 +140,9 @@ void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse
         "Keep the document with its animation in this .quarn file, before recording");
     addRecordingFilm(command, request.film,
                      subject == CaptureSubject::moving_sun ? FilmTimes::perhaps : FilmTimes::none);
+    command.add_flag("--resume", request.goes_on,
+                     "Go on with the recording in the folder; where another one is there, say so "
+                     "and write nothing (default: make that anew)");
     addOverwrite(command, use.common);
     addShowScript(command, use.is_only_shown);
     addCommonOptions(command, use.common);

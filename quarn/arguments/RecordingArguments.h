@@ -20,6 +20,9 @@ void addShowScript(CLI::App& command, bool& is_only_shown);
 /// What every command takes that may record.
 void addOverwrite(CLI::App& command, CommonOptions& common);
 
+/// Whether a page for others is made of the frames.
+void addViewer(CLI::App& command, ViewerRequest& viewer);
+
 /// What goes in and out, which a person looks for first.
 void addModelAndFolder(const OptionAdder& add, RecordingRequest& request);
 

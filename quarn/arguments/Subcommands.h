@@ -20,6 +20,8 @@ Action addFlythrough(CLI::App& command);
 Action addPath(CLI::App& command);
 Action addDay(CLI::App& command);
 Action addSeason(CLI::App& command);
+Action addRecord(CLI::App& command);
+Action addFinish(CLI::App& command);
 Action addVideo(CLI::App& command);
 Action addPlaces(CLI::App& command);
 Action addCurves(CLI::App& command);

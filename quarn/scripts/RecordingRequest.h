@@ -30,6 +30,8 @@ struct RecordingRequest {
     std::filesystem::path document;  ///< to save, a .quarn file; empty: none
     FilmRequest film;
     ViewerRequest viewer;
+    /// Whether another recording in the folder is told instead of replaced.
+    bool goes_on = false;
 };
 
 /// The path of the page that the recording writes.

@@ -35,7 +35,9 @@ RecordingScript composeRecording(const RecordingRequest& request, const Animatio
         script.saving = "_-SaveAs " + quotedPath(request.document);
     if (!request.film.file.empty())
         script.following.push_back(nextFilmLine(request.film));
-    script.recording = "_-RecordAnimation _TargetFolder " + quotedPath(request.folder) + " _Enter";
+    script.beginning =
+        beginningLine(request.goes_on ? RecordingStartKind::resume : RecordingStartKind::if_same);
+    script.recording = recordingLine(request.folder);
     if (request.viewer.is_wanted)
         script.sharing.push_back(viewerLine(framesPath(request), request.viewer));
     return script;
@@ -43,6 +45,18 @@ RecordingScript composeRecording(const RecordingRequest& request, const Animatio
 
 std::string sharedAnswers(const RecordingRequest& request) {
     return "_" + request.format + " " + request.mode.option + " _Enter _Enter";
+}
+
+std::string beginningLine(RecordingStartKind start, const std::string& frames) {
+    const char* const word = start == RecordingStartKind::anew      ? "_Anew"
+                             : start == RecordingStartKind::if_same ? "_IfSame"
+                                                                    : "_Resume";
+    return "_-NextRecording " + std::string(word) + (frames.empty() ? "" : " " + frames) +
+           " _Enter";
+}
+
+std::string recordingLine(const std::filesystem::path& folder) {
+    return "_-RecordAnimation _TargetFolder " + quotedPath(folder) + " _Enter";
 }
 
 std::string scriptText(const RecordingScript& script) {
@@ -57,7 +71,7 @@ std::string scriptText(const RecordingScript& script) {
         text += *script.saving + "\n";
     for (const std::string& line : script.following)
         text += line + "\n";
-    text += script.recording;
+    text += script.beginning + "\n" + script.recording;
     for (const std::string& line : script.sharing)
         text += "\n" + line;
     return text;

@@ -148,6 +148,12 @@ HWND ConsoleFrontEnd::mainWindow() {
     return nullptr;
 }
 
+/// Frames that are there already are no work.
+void ConsoleFrontEnd::recordingBegun(const RecordingStart& start) {
+    m_frames_expected = start.wanted - start.kept;
+    m_pace = {};
+}
+
 void ConsoleFrontEnd::frameWritten(const std::filesystem::path&, int written, int total) {
     const auto now = FramePace::Clock::now();
     m_frames_written = written;

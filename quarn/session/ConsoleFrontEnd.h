@@ -64,6 +64,7 @@ public:
     bool isKeyDown(int virtual_key) override;
     bool isInterrupted() const override;
     HWND mainWindow() override;
+    void recordingBegun(const RecordingStart& start) override;
     void frameWritten(const std::filesystem::path& file, int written, int total) override;
     void recordingEnded(const RecordingReport& report) override;
     void sharedFileProgress(const std::filesystem::path& file, double share) override;

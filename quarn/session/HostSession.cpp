@@ -21,6 +21,8 @@ SessionOptions sessionOptions(const CommonOptions& common, HostSession::Use use)
     options.viewer_folder = viewerFolder();
     options.overwrites = common.overwrites;
     options.most_memory = common.most_memory;
+    options.most_threads = common.most_threads;
+    options.instructions = common.instructions;
     options.builds_scenes = use == HostSession::Use::pictures;
     return options;
 }

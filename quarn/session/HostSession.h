@@ -15,6 +15,8 @@ struct CommonOptions {
     std::string language;          ///< empty: the environment's
     bool overwrites = false;       ///< as SessionOptions has it
     std::uint64_t most_memory = 0; ///< as SessionOptions has it
+    int most_threads = 0;          ///< as SessionOptions has it
+    std::string instructions;      ///< as SessionOptions has it, and not refused
 };
 
 /// The host as this program runs it: with the files that are installed beside the program.

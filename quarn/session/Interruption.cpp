@@ -24,6 +24,10 @@ bool forgetCtrlC() {
     return true;
 }
 
+int interruptionSignal() {
+    return stopSignal();
+}
+
 int interruptionExitCode() {
     return 128 + stopSignal();
 }

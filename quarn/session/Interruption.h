@@ -18,6 +18,9 @@ bool isInterruptionRequested();
 ///   forgotten
 bool forgetCtrlC();
 
+/// The number of the signal that asked the program to stop; 0 while none did.
+int interruptionSignal();
+
 /// The exit code of a program that was asked to stop: 128 plus the signal's number.
 int interruptionExitCode();
 

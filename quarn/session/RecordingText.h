@@ -18,12 +18,21 @@ struct EndedRecording {
 /// "1 frame", "12 frames"
 std::string frameCountText(int frames);
 
+/// " (150 of them were there already)"; empty where none was.
+std::string keptText(const RecordingReport& report);
+
 /// What a recording lacks, as a sentence: how many of its pictures were written, how many are
 /// there, and what its page shows then.
 std::string incompleteText(const EndedRecording& recording);
 
 /// What a recording that a person stopped has written, and whether its page plays that.
 std::string interruptedText(const RecordingReport& report);
+
+/// The same of a recording that goes on when the same command is given again.
+std::string stoppedText(const RecordingReport& report);
+
+/// "200 frames and out/site.html in 12 s"; of a part what makes the page.
+std::string doneText(const RecordingReport& report, double seconds);
 
 /// "out still holds 5 pictures of an earlier recording: house005.jpg, ..."; empty where it does
 /// not.

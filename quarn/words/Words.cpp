@@ -125,6 +125,17 @@ std::string readingLine(const std::filesystem::path& model, const std::string& u
     return "_-Import " + axis + nearness + quotedPath(model);
 }
 
+std::string shellWord(const std::string& text) {
+    constexpr std::string_view PLAIN = "abcdefghijklmnopqrstuvwxyzABCDEFGHIJKLMNOPQRSTUVWXYZ"
+                                       "0123456789_-+=.,:/@%";
+    if (!text.empty() && text.find_first_not_of(PLAIN) == std::string::npos)
+        return text;
+    std::string quoted = "'";
+    for (const char c : text)
+        quoted += c == '\'' ? "'\\''" : std::string(1, c);
+    return quoted + "'";
+}
+
 std::string quotedPath(const std::filesystem::path& path) {
     return '"' + path.native() + '"';
 }

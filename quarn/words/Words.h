@@ -61,6 +61,10 @@ bool isDocument(const std::filesystem::path& file);
 std::string readingLine(const std::filesystem::path& model, const std::string& up = "",
                         double tolerance = 0.0);
 
+/// The text as one word of a command that a person types: in single quotes where a shell would read
+/// more into it.
+std::string shellWord(const std::string& text);
+
 /// The path as one word of a script, which no prompt takes for an option.
 std::string quotedPath(const std::filesystem::path& path);
 

@@ -170,8 +170,8 @@ struct RayKernel {
     void (*find_free_sky)(const FrameSetup& frame, const PixelBlock& block);
 };
 
-/// The loops for the best processor that this one can stand in for.
-const RayKernel& bestRayKernel();
+/// The loops for the instruction set in force (InstructionSet.h).
+const RayKernel& rayKernelInForce();
 
 extern const RayKernel baseline_ray_kernel; ///< any x86-64
 extern const RayKernel avx2_ray_kernel;     ///< x86-64-v3

@@ -112,8 +112,8 @@ struct RenderKernel {
                        float (&colors)[3][lane_count]);
 };
 
-/// The loops for the best processor that this one can stand in for.
-const RenderKernel& bestRenderKernel();
+/// The loops for the instruction set in force (InstructionSet.h).
+const RenderKernel& renderKernelInForce();
 
 extern const RenderKernel baseline_render_kernel; ///< any x86-64
 extern const RenderKernel avx2_render_kernel;     ///< x86-64-v3

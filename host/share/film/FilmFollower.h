@@ -4,6 +4,8 @@
 #include "host/share/film/FilmMaking.h"
 #include "kelmar/KM_AnimationProperties.h"
 
+#include <tbb/global_control.h>
+
 namespace quarn {
 
 class Application;
@@ -16,16 +18,19 @@ public:
     FilmFollower(FilmWish wish, Application& application);
 
     void frameRecorded(const RecordedFrame& frame) override;
+    void frameKept(int number, const std::filesystem::path& file) override;
     void recordingEnded(const RecordingReport& report) override;
 
 private:
     void begin();
-    Result<void> take(const RecordedFrame& frame);
+    int threadsBesideDrawing();
+    Result<void> take(int number, const Image& picture);
     void end(const Result<SharedFileReport>& made);
 
     FilmWish m_wish;
     Application& m_application;
-    KM_3dmAnimationProperties m_record; ///< of the animation, once a frame came
+    KM_3dmAnimationProperties m_record;                 ///< of the animation, once a frame came
+    std::optional<tbb::global_control> m_drawing_limit; ///< what drawing leaves is the encoder's
     std::optional<FilmMaking> m_making;
     bool m_has_ended = false; ///< told
 };

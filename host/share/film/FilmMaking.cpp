@@ -4,6 +4,7 @@
 #include "ground/PathText.h"
 #include "sdk/qncore/QnLocalize.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <cmath>
 #include <cstring>
@@ -51,6 +52,8 @@ Result<void> FilmMaking::add(const Image& picture, const std::string& caption) {
     if (const auto failure = m_worker->failure())
         return cannotWrite(failure->message);
     m_worker->add(picture, caption);
+    if (m_plan.threads == 0)
+        waitForWorker();
     ++m_taken;
     tellPace();
     return {};
@@ -68,7 +71,7 @@ Result<void> FilmMaking::begin(const Image& first) {
                         m_size.height_px,
                         m_plan.frame_rate,
                         quality,
-                        m_plan.threads,
+                        std::max(1, m_plan.threads),
                         m_plan.wish.has_caption ? captionFont() : fs::path()};
     auto film = filmModule().value()->open(form, m_part->path());
     if (!film)
@@ -90,6 +93,11 @@ Result<void> FilmMaking::beginFile() {
 
 void FilmMaking::waitForRoom() {
     while (!m_worker->hasRoom() && !m_worker->isDone())
+        m_front_end.pumpEvents(SHORT_WAIT_MS);
+}
+
+void FilmMaking::waitForWorker() {
+    while (!m_worker->isIdle())
         m_front_end.pumpEvents(SHORT_WAIT_MS);
 }
 

@@ -15,7 +15,9 @@ public:
         FilmWish wish;  ///< checked
         int frames = 0; ///< that are to come
         int frame_rate = 0;
-        int threads = 1; ///< that may encode
+        /// That may encode beside what makes the frames; 0: each frame is encoded before the next
+        /// is made.
+        int threads = 1;
     };
     /// @param front_end  outlives this
     FilmMaking(Plan plan, FrontEnd& front_end);
@@ -33,6 +35,7 @@ private:
     Result<void> begin(const Image& first);
     Result<void> beginFile();
     void waitForRoom();
+    void waitForWorker();
     void waitForEnd();
     Result<SharedFileReport> giveName();
     SharedFileReport report() const;

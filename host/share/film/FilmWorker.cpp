@@ -58,6 +58,11 @@ void FilmWorker::close() {
     m_changed.notify_all();
 }
 
+bool FilmWorker::isIdle() const {
+    const Lock lock(m_mutex);
+    return m_is_done || (m_waiting.empty() && !m_is_at_work);
+}
+
 bool FilmWorker::isDone() const {
     const Lock lock(m_mutex);
     return m_is_done;
@@ -81,6 +86,7 @@ void FilmWorker::run() {
         const auto added = m_film->add(frame.picture, frame.caption);
         const Lock lock(m_mutex);
         m_time_at_work += Clock::now() - start;
+        m_is_at_work = false;
         m_spare.push_back(std::move(frame.picture));
         if (!added) {
             m_failure = added.error();
@@ -110,6 +116,7 @@ bool FilmWorker::takeFrame(Frame& frame) {
         return false;
     frame = std::move(m_waiting.front());
     m_waiting.pop_front();
+    m_is_at_work = true;
     m_waiting_bytes -= frame.picture.rgba.size();
     return true;
 }

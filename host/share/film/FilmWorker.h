@@ -32,6 +32,8 @@ public:
     /// Ends the film soon, with the frames that are encoded by then.
     void endSoon() { m_film->endSoon(); }
 
+    /// Whether all that was handed over is at the encoder, and the thread waits for more.
+    bool isIdle() const;
     /// Whether nothing more happens: the film is written, or could not be.
     bool isDone() const;
     /// Why it could not be, a part of a sentence; nothing where all went well so far.
@@ -58,6 +60,7 @@ private:
     std::size_t m_waiting_bytes = 0;
     bool m_is_closed = false;
     bool m_is_dropped = false;
+    bool m_is_at_work = false;
     bool m_is_done = false;
     std::optional<Error> m_failure;
     std::chrono::duration<double> m_time_at_work{};

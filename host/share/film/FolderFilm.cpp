@@ -1,11 +1,11 @@
 #include "host/share/film/FolderFilm.h"
 
+#include "host/app/ProcessorUse.h"
 #include "host/recording/RecordedFolder.h"
 #include "host/share/film/FilmCaption.h"
 #include "host/share/frames/FramePicture.h"
 
 #include <algorithm>
-#include <thread>
 
 namespace quarn {
 
@@ -45,8 +45,9 @@ Result<SharedFileReport> makeFilmOfFolder(const std::filesystem::path& folder, c
         front_end.warn(KM_wString::FromUtf8(warning).Array());
     const FramesManifest& manifest = recorded.value().manifest;
     const int frames = static_cast<int>(manifest.images.size());
-    const int processors = std::max(1, static_cast<int>(std::thread::hardware_concurrency()));
-    FilmMaking making({wish, frames, frameRate(wish, manifest), processors}, front_end);
+    const int threads = mostThreads();
+    FilmMaking making({wish, frames, frameRate(wish, manifest), threads > 1 ? threads : 0},
+                      front_end);
     for (const ManifestFrame& frame : manifest.images) {
         front_end.sharedFileProgress(wish.file, 0.5 * making.framesTaken() / frames);
         front_end.pumpEvents(0);

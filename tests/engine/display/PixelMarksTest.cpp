@@ -116,7 +116,7 @@ TEST_P(PixelMarksTest, PicturesOfAnyWidthAreLookedAtWhole) {
 std::vector<const RayKernel*> kernelsOfThisProcessor() {
     std::vector<const RayKernel*> kernels{&baseline_ray_kernel};
     for (const RayKernel* kernel : {&avx2_ray_kernel, &avx512_ray_kernel}) {
-        if (kernels.back() == &bestRayKernel())
+        if (kernels.back() == &rayKernelInForce())
             break;
         kernels.push_back(kernel);
     }

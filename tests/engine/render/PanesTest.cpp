@@ -37,7 +37,7 @@ RenderLayers underTheSun(const SceneContent& content, const KM_Viewport& viewpor
     DisplayScene scene;
     EXPECT_TRUE(scene.update(content).ok());
     const SampleSequence sequence(16);
-    const RenderKernel& kernel = bestRenderKernel();
+    const RenderKernel& kernel = renderKernelInForce();
     const RenderSetup setup = makeRenderSetup(scene, viewport, size_px, size_px, sequence, kernel);
     RenderLayers layers(size_px, size_px);
     kernel.render_block(setup, {0, 0, size_px, size_px}, 0, 16, layers.sums());

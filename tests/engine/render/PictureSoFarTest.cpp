@@ -55,7 +55,7 @@ TEST(PictureSoFar, KnowsHowManySamplesEachPixelHas) {
     DisplayScene scene;
     ASSERT_TRUE(scene.update(hall()).ok());
     const SampleSequence sequence(40);
-    const RenderKernel& kernel = bestRenderKernel();
+    const RenderKernel& kernel = renderKernelInForce();
     const RenderSetup setup = makeRenderSetup(scene, topView(10.0), 700, 130, sequence, kernel);
     RenderLayers layers(700, 130);
     SampleTaking taking(setup, kernel, layers, 40);

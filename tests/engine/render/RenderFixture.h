@@ -41,7 +41,7 @@ inline RenderLayers underUniformSky(const SceneContent& content, const KM_Viewpo
     const Result<void> updated = scene.update(content);
     EXPECT_TRUE(updated.ok()) << updated.message();
     const SampleSequence sequence(samples);
-    const RenderKernel& kernel = bestRenderKernel();
+    const RenderKernel& kernel = renderKernelInForce();
     RenderSetup setup = makeRenderSetup(scene, viewport, size_px, size_px, sequence, kernel);
     for (FrameSetup* frame : {&setup.frame, &setup.bounce}) {
         frame->sun_count = 0;

@@ -23,7 +23,7 @@ std::vector<double> acrossBorder(double sun_share) {
     EXPECT_TRUE(scene.update(content).ok());
     const int samples = 256;
     const SampleSequence sequence(samples);
-    const RenderKernel& kernel = bestRenderKernel();
+    const RenderKernel& kernel = renderKernelInForce();
     const int side = static_cast<int>(size_px);
     const RenderSetup setup = makeRenderSetup(scene, topView(10.0), side, side, sequence, kernel);
     RenderLayers layers(side, side);

@@ -31,6 +31,13 @@ std::string statusLine(pid_t process, const std::string& name) {
     return {};
 }
 
+std::size_t threadsOf(pid_t process) {
+    std::error_code ended;
+    const std::filesystem::directory_iterator threads("/proc/" + std::to_string(process) + "/task",
+                                                      ended);
+    return static_cast<std::size_t>(std::distance(begin(threads), {}));
+}
+
 /// Ended, with nobody there who waited for it.
 bool isZombie(pid_t process) {
     return statusLine(process, "State").find('Z') != std::string::npos;
@@ -105,6 +112,23 @@ TEST_F(ModelReaderTest, TheReaderWorksBehindItsFence) {
     });
     ASSERT_TRUE(readModel(largeModel(), {.watch = &watch}));
     EXPECT_TRUE(was_seen);
+}
+
+TEST_F(ModelReaderTest, TheReaderHasNoMoreThreadsThanItMayUse) {
+    const std::filesystem::path model = largeModel();
+    const auto threadsWith = [&](int most_threads) {
+        std::size_t most = 0;
+        CallingWatch watch([&](ReadingStep, double) {
+            for (const pid_t reader : childProcesses())
+                most = std::max(most, threadsOf(reader));
+            return true;
+        });
+        EXPECT_TRUE(readModel(model, {.most_threads = most_threads, .watch = &watch}));
+        return most;
+    };
+    EXPECT_EQ(threadsWith(1), 1U);
+    if (std::thread::hardware_concurrency() > 1)
+        EXPECT_GT(threadsWith(0), 1U) << "as many as there are processors";
 }
 
 TEST_F(ModelReaderTest, AReaderThatIsKilledFromOutsideIsTold) {

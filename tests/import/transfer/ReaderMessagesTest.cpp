@@ -5,7 +5,7 @@
 namespace quarn::test {
 
 TEST(ReaderMessages, RequestsArriveAsTheyWereAlsoWithPathsThatAreNoText) {
-    const ReaderRequest request{"folder/\xff\xfe.obj", UpAxis::y, 0.25, 123456789};
+    const ReaderRequest request{"folder/\xff\xfe.obj", UpAxis::y, 0.25, 123456789, 3};
     const auto bytes = encodeRequest(request);
     ASSERT_TRUE(bytes);
     const auto arrived = decodeRequest(*bytes);
@@ -14,6 +14,7 @@ TEST(ReaderMessages, RequestsArriveAsTheyWereAlsoWithPathsThatAreNoText) {
     EXPECT_EQ(arrived->up, request.up);
     EXPECT_EQ(arrived->tolerance, request.tolerance);
     EXPECT_EQ(arrived->most_memory, request.most_memory);
+    EXPECT_EQ(arrived->most_threads, request.most_threads);
 }
 
 TEST(ReaderMessages, ARequestWithAPathThatNoPacketHoldsIsNotMade) {

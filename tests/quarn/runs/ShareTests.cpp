@@ -58,8 +58,8 @@ TEST_F(Share, ShowsTheScriptThatItRuns) {
     const Ended ended = share({"--show-script"});
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     const auto lines = linesOf(ended.out);
-    ASSERT_GE(lines.size(), 3U);
-    EXPECT_THAT(lines[lines.size() - 3], HasSubstr("_NextRecording \"house/house.mp4\""));
+    ASSERT_GE(lines.size(), 4U);
+    EXPECT_THAT(lines[lines.size() - 4], HasSubstr("_NextRecording \"house/house.mp4\""));
     EXPECT_THAT(lines.back(), HasSubstr("_OneFile=Yes"));
 }
 

@@ -48,9 +48,9 @@ TEST(SavedDocument, IsPartOfTheScript) {
     const Ended shown = run(studio.turntable(5, {"--save", "my docs/house", "--show-script"}));
     ASSERT_EQ(shown.exit_code, 0) << shown.err;
     const auto lines = linesOf(shown.out);
-    ASSERT_THAT(lines, SizeIs(9));
+    ASSERT_THAT(lines, SizeIs(10));
     EXPECT_EQ(lines[7], "_-SaveAs \"my docs/house.quarn\"");
-    EXPECT_THAT(lines[8], HasSubstr("_-RecordAnimation"));
+    EXPECT_THAT(lines[9], HasSubstr("_-RecordAnimation"));
 }
 
 TEST(SavedDocument, IsRefusedUnderAnotherExtensionBeforeAnythingRuns) {

@@ -52,6 +52,7 @@ TEST(FlythroughScript, SetsUpAFlightAlongANamedCurve) {
                             "_-SetFlythroughAnimation \"Main street\" 8 _jpg _RenderedViewport "
                             "_Enter _Enter",
                             "# The folder must be there before the recording starts.",
+                            "_-NextRecording _IfSame _Enter",
                             "_-RecordAnimation _TargetFolder \"out\" _Enter"));
 }
 
@@ -68,7 +69,8 @@ TEST(FlythroughScript, ReadsACurveFileAndEvensItBeforeTheSetUp) {
                     "_-AnimationName \"Tour\"",
                     "_-SetFlythroughAnimation \"Camera curve\" 8 _png _Clay _Enter _Enter",
                     "# The folder must be there before the recording starts.",
-                    "_-SaveAs \"tour.quarn\"", "_-RecordAnimation _TargetFolder \"out\" _Enter"));
+                    "_-SaveAs \"tour.quarn\"", "_-NextRecording _IfSame _Enter",
+                    "_-RecordAnimation _TargetFolder \"out\" _Enter"));
 }
 
 TEST(FlythroughScript, KeepsTheLensOfADocumentUnlessOneIsGiven) {

@@ -53,7 +53,7 @@ double elevation_deg(const CameraLine& camera) {
 
 TEST(ShowScript, IsTheWholeScriptOfTheDefaults) {
     const auto lines = scriptOf({"models/house.obj", "--frames", "120", "--out", "out/house"});
-    ASSERT_THAT(lines, SizeIs(8));
+    ASSERT_THAT(lines, SizeIs(9));
     EXPECT_EQ(lines[0], "_-Import \"models/house.obj\"");
     EXPECT_EQ(lines[1], "_-ViewportSize 1280 720");
     EXPECT_THAT(lines[2], StartsWith("_-Camera _Location "));
@@ -62,15 +62,16 @@ TEST(ShowScript, IsTheWholeScriptOfTheDefaults) {
     EXPECT_EQ(lines[5],
               "_-SetTurntableAnimation 120 _Clockwise _jpg _RenderedViewport _Enter _Enter");
     EXPECT_EQ(lines[6], "# The folder must be there before the recording starts.");
-    EXPECT_EQ(lines[7], "_-RecordAnimation _TargetFolder \"out/house\" _Enter");
+    EXPECT_EQ(lines[7], "_-NextRecording _IfSame _Enter");
+    EXPECT_EQ(lines[8], "_-RecordAnimation _TargetFolder \"out/house\" _Enter");
 }
 
 TEST(ShowScript, NeedsNoMoreThanAModel) {
     const auto lines = scriptOf({"models/house.obj"});
     EXPECT_THAT(lines[5], StartsWith("_-SetTurntableAnimation 72 "));
-    EXPECT_EQ(lines[7], "_-RecordAnimation _TargetFolder \"models/house\" _Enter");
-    EXPECT_EQ(scriptOf({"house.obj"})[7], "_-RecordAnimation _TargetFolder \"house\" _Enter");
-    EXPECT_EQ(scriptOf({"/a b/old.house.glb"})[7],
+    EXPECT_EQ(lines[8], "_-RecordAnimation _TargetFolder \"models/house\" _Enter");
+    EXPECT_EQ(scriptOf({"house.obj"})[8], "_-RecordAnimation _TargetFolder \"house\" _Enter");
+    EXPECT_EQ(scriptOf({"/a b/old.house.glb"})[8],
               "_-RecordAnimation _TargetFolder \"/a b/old.house\" _Enter");
 }
 
@@ -81,9 +82,13 @@ TEST(ShowScript, LensIsChosenBeforeTheModelIsFitted) {
     EXPECT_THAT(scriptWith({})[2], Not(HasSubstr("_Lens")));
 }
 
+TEST(ShowScript, GoesOnWithTheSameRecordingAloneWhereThatIsAskedFor) {
+    EXPECT_EQ(scriptWith({"--resume"})[7], "_-NextRecording _Resume _Enter");
+}
+
 TEST(ShowScript, QualityIsSetBeforeTheRecording) {
     const auto lines = scriptWith({"--quality", "75"});
-    ASSERT_THAT(lines, SizeIs(9));
+    ASSERT_THAT(lines, SizeIs(10));
     EXPECT_EQ(lines[6], "_-JpegQuality 75");
 }
 
@@ -106,7 +111,7 @@ TEST(ShowScript, ReadsTheModelWithTheAxisThatPointsUp) {
 
 TEST(ShowScript, HidesObjectsBeforeTheModelIsFitted) {
     const auto lines = scriptWith({"--hide", "Walk", "--hide", "North gate"});
-    ASSERT_THAT(lines, SizeIs(10));
+    ASSERT_THAT(lines, SizeIs(11));
     EXPECT_EQ(lines[1], "_-Hide \"Walk\"");
     EXPECT_EQ(lines[2], "_-Hide \"North gate\"");
     EXPECT_EQ(lines[5], "_-FitView _Turn=Yes _Enter");
@@ -117,13 +122,13 @@ TEST(ShowScript, TakesEveryOption) {
         scriptOf({"house.obj", "--frames", "36", "--out", "my out", "--size", "640x480", "--mode",
                   "x-ray", "--format", "PNG", "--direction", "anticlockwise", "--distance", "1.25",
                   "--target", "-1,2.5,1e3", "--name", "Town hall"});
-    ASSERT_THAT(lines, SizeIs(8));
+    ASSERT_THAT(lines, SizeIs(9));
     EXPECT_EQ(lines[1], "_-ViewportSize 640 480");
     EXPECT_THAT(lines[2], HasSubstr(" _Target -1,2.5,1000 _Enter"));
     EXPECT_EQ(lines[3], "_-FitView _Turn=Yes _KeepTarget=Yes _Distance 1.25 _Enter");
     EXPECT_EQ(lines[4], "_-AnimationName \"Town hall\"");
     EXPECT_EQ(lines[5], "_-SetTurntableAnimation 36 _AntiClockwise _png _XRay _Enter _Enter");
-    EXPECT_EQ(lines[7], "_-RecordAnimation _TargetFolder \"my out\" _Enter");
+    EXPECT_EQ(lines[8], "_-RecordAnimation _TargetFolder \"my out\" _Enter");
 }
 
 TEST(ShowScript, CameraStandsAtItsElevationToTheFrontAndTheRight) {

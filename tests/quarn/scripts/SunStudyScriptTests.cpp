@@ -84,7 +84,7 @@ CameraDirection cameraDirection(const Words& script) {
 
 TEST(DayScript, SetsUpTheDefaultsOfAPlace) {
     const Words script = scriptOf(dayInAthens({}));
-    ASSERT_THAT(script, SizeIs(11));
+    ASSERT_THAT(script, SizeIs(12));
     EXPECT_THAT(Words(script.begin(), script.begin() + 3),
                 ElementsAre("# Athens, Greece: 37.98 N, 23.73 E",
                             "# Clock: UTC+1, the whole hours of longitude 23.73 E, without "
@@ -97,7 +97,7 @@ TEST(DayScript, SetsUpTheDefaultsOfAPlace) {
     EXPECT_EQ(script[7], "_-AnimationName \"town\"");
     EXPECT_EQ(script[8], "_-SetOneDaySunAnimation 37.98 23.73 0 21 6 2026 6 0 20 0 15 _jpg "
                          "_RenderedViewport _Enter _Enter");
-    EXPECT_EQ(script[10], "_-RecordAnimation _TargetFolder \"out\" _Enter");
+    EXPECT_EQ(script[11], "_-RecordAnimation _TargetFolder \"out\" _Enter");
 }
 
 TEST(DayScript, HoldsEveryOption) {

@@ -51,5 +51,58 @@ TEST(RecordingText, TellsWhatAStoppedRecordingPlays) {
               "Stopped after 7 of 100 frames; the page out/house.html could not be written.");
 }
 
+RecordingReport keptOf(int expected, int written, int kept) {
+    RecordingReport report = reportOf(expected, written, written + kept);
+    report.kept = kept;
+    return report;
+}
+
+TEST(RecordingText, TellsHowManyFramesWereThereAlready) {
+    EXPECT_EQ(doneText(keptOf(200, 50, 150), 12.0),
+              "200 frames and out/house.html in 12 s (150 of them were there already)");
+    EXPECT_EQ(doneText(keptOf(200, 0, 200), 1.25),
+              "200 frames and out/house.html in 1.3 s (all of them were there already)");
+    EXPECT_EQ(doneText(keptOf(2, 2, 0), 0.5), "2 frames and out/house.html in 0.5 s");
+    EXPECT_EQ(endText({keptOf(3, 1, 2), ""}),
+              "3 frames are in out (2 of them were there already); out/house.html plays them.");
+}
+
+TEST(RecordingText, TellsOfAPartWhatMakesThePage) {
+    RecordingReport part = keptOf(50, 50, 0);
+    part.is_part = true;
+    part.has_page = false;
+    EXPECT_EQ(doneText(part, 3.1),
+              "50 frames of house in out in 3.1 s; quarn finish out makes the page once all are "
+              "there");
+    part.folder = "my out";
+    part.kept = 20;
+    EXPECT_EQ(doneText(part, 3.1),
+              "50 frames of house in my out in 3.1 s (20 of them were there already); quarn finish "
+              "'my out' makes the page once all are there");
+    EXPECT_EQ(endText({part, ""}),
+              "50 frames are in my out (20 of them were there already).");
+}
+
+TEST(RecordingText, TellsThatAStoppedRecordingGoesOn) {
+    EXPECT_EQ(stoppedText(keptOf(100, 7, 0)),
+              "Stopped after 7 of 100 frames; out/house.html plays what is there. The same command "
+              "goes on where it stopped.");
+    RecordingReport part = keptOf(100, 7, 30);
+    part.is_part = true;
+    part.has_page = false;
+    EXPECT_EQ(stoppedText(part), "Stopped after 37 of 100 frames (30 of them were there already). "
+                                 "The same command goes on where it stopped.");
+}
+
+TEST(RecordingText, TellsWhyFramesAreMissingBesideThoseThatWereThere) {
+    EXPECT_EQ(incompleteText({keptOf(8, 1, 4), "Cannot write 'x': the disk is full."}),
+              "only 5 of 8 frames are in out (4 of them were there already): Cannot write 'x': the "
+              "disk is full.");
+    RecordingReport shared = keptOf(8, 1, 4);
+    shared.elsewhere = 3;
+    EXPECT_EQ(incompleteText({shared, ""}),
+              "5 of 8 frames are in out; other programs are recording 3 of them.");
+}
+
 } // namespace
 } // namespace quarn::program

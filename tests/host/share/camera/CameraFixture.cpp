@@ -16,6 +16,7 @@ public:
         EXPECT_EQ(frame.number, static_cast<int>(m_cameras.size()));
         m_cameras.push_back(frame.camera);
     }
+    void frameKept(int, const std::filesystem::path&) override {}
     void recordingEnded(const RecordingReport&) override {}
 
 private:
