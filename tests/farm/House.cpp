@@ -59,11 +59,19 @@ bool tellsHowItCameAbout(const std::string& name) {
            name.find(".farm") != std::string::npos;
 }
 
+Wish rendered(const std::string& kind, int frames) {
+    return {kind, frames, {"--mode", "RenderFull", "--samples", SAMPLES, "--size", "320x180"}};
+}
+
 } // namespace
 
 const House& renderedHouse() {
-    static const House house = made(
-        {"rendered", 18, {"--mode", "RenderFull", "--samples", SAMPLES, "--size", "320x180"}});
+    static const House house = made(rendered("rendered", 18));
+    return house;
+}
+
+const House& longHouse() {
+    static const House house = made(rendered("long", 200));
     return house;
 }
 

@@ -18,8 +18,11 @@ struct House {
 /// all tests as long as the cluster stands.
 const House& renderedHouse();
 
-/// The same number of small frames that are drawn at once, of the same name.
+/// Small frames that are drawn at once, of the same name.
 const House& quickHouse();
+
+/// 200 frames, each as much work as one of renderedHouse().
+const House& longHouse();
 
 /// What stands in a folder of frames once a recording is done, by name, but for what tells how it
 /// came about: journals, NAME.recording and what the farm keeps.

@@ -1,0 +1,161 @@
+#include "tests/farm/FarmFixture.h"
+
+#include <csignal>
+#include <fstream>
+#include <gmock/gmock.h>
+
+namespace quarn::test {
+
+namespace {
+
+namespace fs = std::filesystem;
+
+using testing::Gt;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using testing::Not;
+using testing::SizeIs;
+
+/// What makes programs believe that it is an hour later; of files they are told the truth.
+std::string clockAnHourAhead() {
+    for (const fs::directory_entry& entry : fs::directory_iterator("/usr/lib")) {
+        const fs::path library = entry.path() / "faketime/libfaketimeMT.so.1";
+        if (fs::exists(library))
+            return "export LD_PRELOAD=" + library.string() +
+                   "\nexport FAKETIME=+3600\nexport NO_FAKE_STAT=1\n";
+    }
+    ADD_FAILURE() << "the package faketime is not installed";
+    return {};
+}
+
+/// What ends all writing after the first four kilobytes of a file, as a disk without room does: the
+/// shells of jobs read the file first.
+std::string fullDisk(const fs::path& file) {
+    writeFile(file, "ulimit -f 4\n");
+    return "export BASH_ENV=" + file.string() + "\n";
+}
+
+void loseOneLine(const fs::path& file) {
+    fs::resize_file(file, fs::file_size(file) / 2);
+}
+
+/// How many frames the writer with this process has noted.
+int framesOf(pid_t writer, const fs::path& folder) {
+    const std::string mark = "-" + std::to_string(writer) + "-";
+    int lines = 0;
+    for (const fs::directory_entry& entry : fs::directory_iterator(folder)) {
+        const std::string name = entry.path().filename();
+        if (name.ends_with(".journal") && name.find(mark) != std::string::npos) {
+            const std::string text = readFile(entry.path());
+            lines += static_cast<int>(std::count(text.begin(), text.end(), '\n'));
+        }
+    }
+    return lines;
+}
+
+} // namespace
+
+TEST_F(Farm, MakesWhatOneProcessMakesThoughANodeATaskADiskAndTheControllerFailAndAClockIsWrong) {
+    const House& house = renderedHouse();
+    setEnvironmentOf("n3", fullDisk(m_place / "full-disk"));
+    setEnvironmentOf("n4", clockAnHourAhead());
+    const Ended submitted = submit(house.document, {"--tasks", "6"});
+    ASSERT_EQ(submitted.exit_code, 0) << submitted.err;
+
+    const auto killed = waitUntilDrawingOn("n2", m_folder);
+    ASSERT_TRUE(killed) << logs();
+    EXPECT_EQ(kill(*killed, SIGKILL), 0);
+    ASSERT_TRUE(waitUntilDrawingOn("n1", m_folder)) << logs();
+    cluster("kill-node", "n1");
+    EXPECT_TRUE(waitUntilDrawingOn("n4", m_folder)) << "the clock kept n4 from work\n" << logs();
+    cluster("restart-controller");
+
+    ASSERT_TRUE(waitUntilAllJobsEnded(120)) << slurm({"squeue"}) << logs();
+    expectWhatOneProcessMakes(house);
+    const Ended status = farm("status");
+    EXPECT_EQ(status.exit_code, 0) << status.err;
+    EXPECT_THAT(status.out, HasSubstr("18"));
+}
+
+TEST_F(Farm, LetsATaskThatOutlivedItsNodeAndItsSuccessorWriteSideBySide) {
+    const House& house = renderedHouse();
+    const Ended submitted = submit(house.document, {"--tasks", "1"});
+    ASSERT_EQ(submitted.exit_code, 0) << submitted.err;
+    const auto orphan = waitUntilDrawingOn("n1", m_folder);
+    ASSERT_TRUE(orphan) << slurm({"squeue"}) << logs();
+    cluster("orphan-node", "n1");
+    EXPECT_EQ(kill(*orphan, SIGSTOP), 0); // it is still at it when the other begins
+    slurm({"scontrol", "update", "nodename=n1", "state=down", "reason=lost"});
+
+    const auto successor = waitUntilDrawingOn("n2", m_folder);
+    ASSERT_TRUE(successor) << slurm({"squeue"}) << logs();
+    const int before = framesOf(*orphan, m_folder);
+    EXPECT_EQ(kill(*orphan, SIGCONT), 0);
+    EXPECT_TRUE(waitUntil(20, [&] { return framesOf(*orphan, m_folder) > before; })) << logs();
+    EXPECT_THAT(framesOf(*successor, m_folder), Gt(0));
+
+    ASSERT_TRUE(waitUntilAllJobsEnded(60)) << slurm({"squeue"}) << logs();
+    expectWhatOneProcessMakes(house);
+}
+
+TEST_F(Farm, GoesOnWhereItWasCancelledAndMakesFramesAgainThatWereCutOrEmptied) {
+    const House& house = renderedHouse();
+    ASSERT_EQ(submit(house.document, {"--tasks", "4"}).exit_code, 0);
+    ASSERT_TRUE(waitUntil(60, [&] { return framesIn(m_folder).size() >= 4; })) << logs();
+    const Ended cancelled = farm("cancel");
+    EXPECT_EQ(cancelled.exit_code, 0) << cancelled.err;
+    ASSERT_TRUE(waitUntilAllJobsEnded(20)) << slurm({"squeue"});
+    const std::vector<std::string> first = framesIn(m_folder);
+    ASSERT_LT(static_cast<int>(first.size()), house.frames) << "nothing was left to cancel";
+    loseOneLine(m_folder / first[0]);
+    fs::resize_file(m_folder / first[1], 0);
+    const auto kept = fs::last_write_time(m_folder / first[2]);
+
+    const Ended again = submit(house.document, {"--tasks", "4"});
+    ASSERT_EQ(again.exit_code, 0) << again.err;
+    ASSERT_TRUE(waitUntilAllJobsEnded(60)) << slurm({"squeue"}) << logs();
+    expectWhatOneProcessMakes(house);
+    EXPECT_EQ(fs::last_write_time(m_folder / first[2]), kept) << "a whole frame was made again";
+}
+
+TEST_F(Farm, RefusesADocumentThatWasChangedBetweenTasksAndMixesNothing) {
+    const House& house = renderedHouse();
+    const fs::path document = m_place / "house.quarn";
+    fs::copy_file(house.document, document);
+    fs::copy_file(quickHouse().document, m_place / "changed.quarn");
+    ASSERT_EQ(submit(document, {"--tasks", "8"}).exit_code, 0);
+    ASSERT_TRUE(waitUntilDrawingOn("n1", m_folder)) << logs();
+    fs::rename(m_place / "changed.quarn", document);
+    ASSERT_TRUE(waitUntilAllJobsEnded(60)) << slurm({"squeue"}) << logs();
+
+    EXPECT_THAT(framesIn(m_folder), Not(IsEmpty()));
+    EXPECT_LT(static_cast<int>(framesIn(m_folder).size()), house.frames);
+    EXPECT_THAT(differences(m_folder, house.folder), IsEmpty());
+    EXPECT_THAT(logs() + farm("status").out, HasSubstr("changed"));
+
+    fs::copy_file(house.document, document, fs::copy_options::overwrite_existing);
+    const Ended again = submit(document, {"--tasks", "4"});
+    ASSERT_EQ(again.exit_code, 0) << again.err;
+    ASSERT_TRUE(waitUntilAllJobsEnded(60)) << slurm({"squeue"}) << logs();
+    expectWhatOneProcessMakes(house);
+}
+
+TEST_F(Farm, ATaskThatIsAskedToEndStopsBetweenFramesAndGoesOnLater) {
+    const House& house = renderedHouse();
+    ASSERT_EQ(submit(house.document, {"--tasks", "2"}).exit_code, 0);
+    const auto task = waitUntilDrawingOn("n1", m_folder);
+    ASSERT_TRUE(task) << logs();
+    ASSERT_TRUE(waitUntil(30, [&] { return framesOf(*task, m_folder) > 0; }));
+    const std::string job = slurm({"squeue", "--noheader", "--nodelist=n1", "--format=%A"});
+    slurm({"scancel", "--batch", "--signal=TERM", linesOf(job).front()});
+    ASSERT_TRUE(waitUntil(10, [&] { return kill(*task, 0) != 0; })) << "it does not end";
+    EXPECT_TRUE(waitUntil(5, [] {
+        return slurm({"squeue", "--noheader", "--states=PENDING", "--format=%r"}).find("BeginTime") !=
+               std::string::npos;
+    })) << slurm({"squeue"});
+
+    ASSERT_TRUE(waitUntilAllJobsEnded(60)) << slurm({"squeue"}) << logs();
+    expectWhatOneProcessMakes(house);
+}
+
+} // namespace quarn::test
