@@ -1,5 +1,6 @@
 #include "host/app/AnimationFingerprint.h"
 
+#include "engine/display/InstructionSet.h"
 #include "engine/images/ImageFile.h"
 #include "ground/Checksum.h"
 #include "host/app/Application.h"
@@ -68,7 +69,8 @@ std::string settingsMark(const KM_3dmAnimationProperties& record, const Recordin
 RecordingFingerprint fingerprintOf(const KM_3dmAnimationProperties& record,
                                    const RecordingSettings& settings, Document& document) {
     return {"quarn " QUARN_VERSION, documentMark(document),
-            settingsMark(record, settings, document), "avx2"};
+            settingsMark(record, settings, document),
+            std::string(nameOf(instructionSetInForce()))};
 }
 
 } // namespace quarn
