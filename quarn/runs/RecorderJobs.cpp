@@ -156,8 +156,10 @@ int threadsOfEach(int jobs, int threads, int cores) {
 std::vector<std::string> recorderArguments(const DocumentRecordingRequest& request,
                                            const CommonOptions& common, int threads,
                                            bool begins_anew) {
+    const std::string document = request.document.native();
     std::vector<std::string> arguments = {
-        "record", "--recorder=" + std::string(begins_anew ? "anew" : "same"),
+        "record", document.starts_with('-') ? "./" + document : document,
+        std::string("--recorder=") + (begins_anew ? "anew" : "same"),
         "--out=" + request.folder.native(), "--threads=" + std::to_string(threads)};
     const auto add = [&arguments](const char* option, const std::string& value) {
         if (!value.empty())
@@ -170,7 +172,6 @@ std::vector<std::string> recorderArguments(const DocumentRecordingRequest& reque
     add("--limit-memory=", common.most_memory > 0 ? std::to_string(common.most_memory) : "");
     if (common.overwrites)
         arguments.push_back("--overwrite");
-    arguments.insert(arguments.end(), {"--", request.document.native()});
     return arguments;
 }
 

@@ -20,15 +20,19 @@ void addPass(const EndedRecording& pass, std::optional<int> kept_before,
     report.kept = kept;
 }
 
-/// @return whether the host recorded anything, or tried to
-bool runPass(const RecordingRun& run, const std::string& beginning, HostSession& host) {
+/// @return why the host refused to record; nothing where it did, or tried to
+std::optional<std::string> runPass(const RecordingRun& run, const std::string& beginning, HostSession& host) {
     ConsoleFrontEnd& front_end = host.frontEnd();
     const std::size_t ended = front_end.recordings().size();
     front_end.beginRecording(run.frames);
     if (!host.run(beginning))
         (void)host.run(run.script.recording); // what counts is what there is
     front_end.clearProgress();
-    return front_end.recordings().size() > ended;
+    if (front_end.recordings().size() == ended)
+        return front_end.closingWords();
+    if (!front_end.hasRecordingBegun())
+        return front_end.recordings().back().last_words;
+    return std::nullopt;
 }
 
 } // namespace
@@ -40,8 +44,8 @@ PassesEnd runPasses(const RecordingRun& run, HostSession& host) {
     PassesEnd end;
     for (int retries = run.retries;;) {
         const auto start = std::chrono::steady_clock::now();
-        if (!runPass(run, beginning, host)) {
-            end.reason = front_end.closingWords();
+        if (const auto refusal = runPass(run, beginning, host)) {
+            end.reason = *refusal;
             return end;
         }
         addPass(front_end.recordings().back(), run.kept_before, end.recording);

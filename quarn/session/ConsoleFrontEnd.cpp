@@ -41,6 +41,7 @@ std::string trimmed(const std::string& line) {
 ConsoleFrontEnd::ConsoleFrontEnd(Prints prints) : m_prints(prints), m_progress(stderr) {}
 
 void ConsoleFrontEnd::beginRecording(int frames) {
+    m_has_begun = false;
     m_frames_written = 0;
     m_frames_expected = frames;
     m_pace = {};
@@ -150,6 +151,7 @@ HWND ConsoleFrontEnd::mainWindow() {
 
 /// Frames that are there already are no work.
 void ConsoleFrontEnd::recordingBegun(const RecordingStart& start) {
+    m_has_begun = true;
     m_frames_expected = start.wanted - start.kept;
     m_pace = {};
 }

@@ -28,6 +28,8 @@ public:
 
     /// A recording of this many pictures begins: counts from 0 again, and forgets the last words.
     void beginRecording(int frames);
+    /// Whether it began in its folder since then: else the host refused it.
+    bool hasRecordingBegun() const { return m_has_begun; }
     int framesWritten() const { return m_frames_written; }
     /// The recordings that have ended, in their order.
     const std::vector<EndedRecording>& recordings() const { return m_recordings; }
@@ -86,6 +88,7 @@ private:
     bool m_keeps_words = false;
     std::string m_kept_words;
     bool m_is_inside_line = false; ///< the last text shown did not end its line
+    bool m_has_begun = false;
     int m_frames_written = 0;
     int m_frames_expected = 0;
     std::vector<EndedRecording> m_recordings;

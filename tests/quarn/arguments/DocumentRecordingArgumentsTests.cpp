@@ -57,8 +57,9 @@ TEST(RecordArguments, FolderAndDocumentMustBeNamed) {
 TEST(RecordArguments, WhatIsMadeOfAllFramesIsNotMadeOfSome) {
     for (const char* option : {"--viewer", "--one-file"})
         expectMisuse(record({"--frames", "0-9", option}),
-                     std::string(option) + " is made of all frames, not of those of --frames: once "
-                                           "they are there, quarn finish out " +
+                     std::string(option) +
+                         " is made of all frames, not of those of --frames: once "
+                         "they are there, quarn finish out " +
                          option + " makes it.");
     expectMisuse(record({"--frames", "0-9", "--video", "a.mp4"}), "--video is made of all frames");
     expectMisuse(record({"--fps", "12"}), "--fps is for a film");
@@ -66,9 +67,9 @@ TEST(RecordArguments, WhatIsMadeOfAllFramesIsNotMadeOfSome) {
 }
 
 TEST(RecordArguments, FolderOfAnAdviceIsAWordForTheShell) {
-    expectMisuse(run({"record", "site.quarn", "--out", "it's $(mine)", "--frames", "0-9",
-                      "--viewer"}),
-                 "quarn finish 'it'\\''s $(mine)' --viewer makes it.");
+    expectMisuse(
+        run({"record", "site.quarn", "--out", "it's $(mine)", "--frames", "0-9", "--viewer"}),
+        "quarn finish 'it'\\''s $(mine)' --viewer makes it.");
 }
 
 TEST(RecordArguments, NumbersAreLookedAt) {
@@ -86,11 +87,10 @@ TEST(RecordArguments, WhatRecordersAreToldIsNoOptionForPersons) {
 // ---- Scripts
 
 TEST(RecordScript, GoesOnWithTheWholeRecording) {
-    EXPECT_THAT(scriptOf({}),
-                ElementsAre("_-Open \"site.quarn\"",
-                            "# The folder must be there before the recording starts.",
-                            "_-NextRecording _Resume _Enter",
-                            "_-RecordAnimation _TargetFolder \"out\" _Enter"));
+    EXPECT_THAT(scriptOf({}), ElementsAre("_-Open \"site.quarn\"",
+                                          "# The folder must be there before the recording starts.",
+                                          "_-NextRecording _Resume _Enter",
+                                          "_-RecordAnimation _TargetFolder \"out\" _Enter"));
     EXPECT_EQ(scriptOf({"--resume"}), scriptOf({}));
 }
 

@@ -26,6 +26,7 @@ const std::map<std::string, std::string> NOT_RUN = {
     {"build/release/bin/quarn-desktop house.glb", "a window; its tests are desktop_window_tests"},
     {"build/release/bin/quarn-desktop model.glb", "a window; its tests are desktop_window_tests"},
     {"quarn console --language <language>", "a person chooses the language"},
+    {"quarn record --overwrite", "names a command with an option, in a table"},
     {"quarn flythrough --camera-curve walk.txt", "names an option of a command in a sentence"},
     {"quarn turntable ... --show-script", "names an option of a command in a sentence"},
 };
@@ -37,7 +38,8 @@ const std::map<std::string, std::string> CHOSEN = {
     {"--to DATE", "2026-06-28"}, {"--frames N", "2"},           {"--number K", "1"},
     {"--out DIR", "out"},        {"--out FILE", "a.png"},       {"MODEL", "town.obj"},
     {"[MODEL]", "town.obj"},     {"DOC", "house.quarn"},        {"SCRIPT", "steps.txt"},
-    {"[TEXT]", "greece"},        {"FOLDER", "frames"},          {"FILE", "film.mp4"},
+    {"DIR", "frames"},           {"--frames RANGES", "0-1"},    {"[TEXT]", "greece"},
+    {"FOLDER", "frames"},        {"FILE", "film.mp4"},
 };
 
 /// The words after the program's name, with words of a person's put in; a synopsis in help goes on

@@ -106,13 +106,16 @@ void Workshop::writeDocuments() const {
 }
 
 void Workshop::writeFrames() const {
-    std::filesystem::create_directory(m_folder / "frames");
     writeFile(m_folder / "frames.txt",
               "_-ViewportSize 64 48\n_-FitView _Turn=Yes _Enter\n_-AnimationName house\n"
               "_-SetTurntableAnimation 2 _Clockwise _jpg _Shaded _Enter _Enter\n"
-              "_-RecordAnimation _TargetFolder frames _Enter\n");
-    const Ended ended = run({"run", "frames.txt", "house.obj"});
-    EXPECT_EQ(ended.exit_code, 0) << ended.err;
+              "_-SaveAs two.quarn\n");
+    for (const std::vector<std::string>& arguments :
+         {std::vector<std::string>{"run", "frames.txt", "house.obj"},
+          {"record", "two.quarn", "--out", "frames"}}) {
+        const Ended ended = run(arguments);
+        EXPECT_EQ(ended.exit_code, 0) << ended.err;
+    }
 }
 
 } // namespace quarn::test

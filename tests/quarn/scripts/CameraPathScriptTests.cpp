@@ -61,16 +61,16 @@ TEST(FlythroughScript, ReadsACurveFileAndEvensItBeforeTheSetUp) {
         scriptOf(flythrough({"--camera-curve", "my walk.txt", "--even-speed", "--lens", "35.5",
                              "--hide", "Trees", "--up", "z", "--size", "640x360", "--mode", "clay",
                              "--format", "png", "--name", "Tour", "--save", "tour"}));
-    EXPECT_THAT(
-        lines,
-        ElementsAre("_-Import [Up] _Z \"town.obj\"", "_-Hide \"Trees\"", "_-ViewportSize 640 360",
-                    "_-ImportCurve [Replace] \"Camera curve\" \"my walk.txt\"",
-                    "_-EvenSpeed \"Camera curve\"", "_-Camera _Parallel=No _Lens 35.5 _Enter",
-                    "_-AnimationName \"Tour\"",
-                    "_-SetFlythroughAnimation \"Camera curve\" 8 _png _Clay _Enter _Enter",
-                    "# The folder must be there before the recording starts.",
-                    "_-SaveAs \"tour.quarn\"", "_-NextRecording _IfSame _Enter",
-                    "_-RecordAnimation _TargetFolder \"out\" _Enter"));
+    EXPECT_THAT(lines,
+                ElementsAre("_-Import [Up] _Z \"town.obj\"", "_-Hide \"Trees\"",
+                            "_-ViewportSize 640 360",
+                            "_-ImportCurve [Replace] \"Camera curve\" \"my walk.txt\"",
+                            "_-EvenSpeed \"Camera curve\"",
+                            "_-Camera _Parallel=No _Lens 35.5 _Enter", "_-AnimationName \"Tour\"",
+                            "_-SetFlythroughAnimation \"Camera curve\" 8 _png _Clay _Enter _Enter",
+                            "# The folder must be there before the recording starts.",
+                            "_-SaveAs \"tour.quarn\"", "_-NextRecording _IfSame _Enter",
+                            "_-RecordAnimation _TargetFolder \"out\" _Enter"));
 }
 
 TEST(FlythroughScript, KeepsTheLensOfADocumentUnlessOneIsGiven) {

@@ -79,8 +79,7 @@ TEST(RecordingText, TellsOfAPartWhatMakesThePage) {
     EXPECT_EQ(doneText(part, 3.1),
               "50 frames of house in my out in 3.1 s (20 of them were there already); quarn finish "
               "'my out' makes the page once all are there");
-    EXPECT_EQ(endText({part, ""}),
-              "50 frames are in my out (20 of them were there already).");
+    EXPECT_EQ(endText({part, ""}), "50 frames are in my out (20 of them were there already).");
 }
 
 TEST(RecordingText, TellsThatAStoppedRecordingGoesOn) {

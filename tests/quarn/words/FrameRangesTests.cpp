@@ -60,17 +60,18 @@ TEST(FrameRanges, RefusalNamesWhatIsWrong) {
               "--frames 0-2147483648: 2147483648 is too large a number.");
     EXPECT_EQ(refusalOf("0-9:99999999999999999999"),
               "--frames 0-9:99999999999999999999: 99999999999999999999 is too large a number.");
-    for (const char* text : {"", "x", "-3", "3-", "-1-3", "+1-3", "0-9,", ",", "0 - 9", "0-9, 20-30",
-                             "0-9:", "0-9:2:3", "0--9", "1e1-20", "0-9;11-12", "0x1-2"})
-        EXPECT_THAT(refusalOf(text), HasSubstr("--frames takes ranges such as 0-9,20-30:2")) << text;
+    for (const char* text :
+         {"", "x", "-3", "3-", "-1-3", "+1-3", "0-9,", ",", "0 - 9", "0-9, 20-30",
+          "0-9:", "0-9:2:3", "0--9", "1e1-20", "0-9;11-12", "0x1-2"})
+        EXPECT_THAT(refusalOf(text), HasSubstr("--frames takes ranges such as 0-9,20-30:2"))
+            << text;
 }
 
 TEST(FrameLists, AreRunsAndOfManyOnlyHowTheyBegin) {
     EXPECT_EQ(frameListText({3}), "3");
     EXPECT_EQ(frameListText({3, 7, 8, 9}), "3 and 7-9");
     EXPECT_EQ(frameListText({0, 1, 5, 11, 12}), "0-1, 5 and 11-12");
-    EXPECT_EQ(frameListText({0, 2, 4, 6, 8, 10, 12, 14, 16, 18}),
-              "0, 2, 4, 6, 8, 10, 12, 14, ...");
+    EXPECT_EQ(frameListText({0, 2, 4, 6, 8, 10, 12, 14, 16, 18}), "0, 2, 4, 6, 8, 10, 12, 14, ...");
     EXPECT_THAT(frameListText({}), IsEmpty());
 }
 
