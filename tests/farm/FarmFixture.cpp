@@ -20,7 +20,8 @@ void endAllJobs() {
 }
 
 bool isLost(const std::string& node) {
-    const std::string state = slurm({"sinfo", "--noheader", "--Node", "--nodes=" + node, "--format=%T"});
+    const std::string state =
+        slurm({"sinfo", "--noheader", "--Node", "--nodes=" + node, "--format=%T"});
     return state.find("idle") != 0 || state.find('*') != std::string::npos;
 }
 
@@ -41,8 +42,8 @@ void Farm::TearDown() {
 }
 
 Ended Farm::submit(const fs::path& document, std::vector<std::string> options) const {
-    std::vector<std::string> words = {"farm",  "submit", document.string(), "--out", m_folder.string(),
-                                      "--frame-time", "0.5"};
+    std::vector<std::string> words = {
+        "farm", "submit", document.string(), "--out", m_folder.string(), "--frame-time", "0.5"};
     words.insert(words.end(), options.begin(), options.end());
     return run(onCluster(std::move(words)));
 }

@@ -15,7 +15,8 @@ protected:
     void TearDown() override;
 
     /// `quarn farm submit` of a document into the folder, with more options.
-    Ended submit(const std::filesystem::path& document, std::vector<std::string> options = {}) const;
+    Ended submit(const std::filesystem::path& document,
+                 std::vector<std::string> options = {}) const;
     /// `quarn farm WHAT` for the folder.
     Ended farm(const std::string& what) const;
     /// Fails unless the folder holds what one process makes, byte for byte, and nothing else.

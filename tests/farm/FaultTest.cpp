@@ -150,8 +150,8 @@ TEST_F(Farm, ATaskThatIsAskedToEndStopsBetweenFramesAndGoesOnLater) {
     slurm({"scancel", "--batch", "--signal=TERM", linesOf(job).front()});
     ASSERT_TRUE(waitUntil(10, [&] { return kill(*task, 0) != 0; })) << "it does not end";
     EXPECT_TRUE(waitUntil(5, [] {
-        return slurm({"squeue", "--noheader", "--states=PENDING", "--format=%r"}).find("BeginTime") !=
-               std::string::npos;
+        return slurm({"squeue", "--noheader", "--states=PENDING", "--format=%r"})
+                   .find("BeginTime") != std::string::npos;
     })) << slurm({"squeue"});
 
     ASSERT_TRUE(waitUntilAllJobsEnded(60)) << slurm({"squeue"}) << logs();

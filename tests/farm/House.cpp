@@ -44,9 +44,12 @@ House made(const Wish& wish) {
         return house;
     fs::create_directories(place);
     Start start;
-    start.arguments = {"turntable", model().string(),        "--name",  "house",
-                       "--frames",  std::to_string(wish.frames), "--hide", "Walk",
-                       "--out",     house.folder.string(),   "--save", house.document.string()};
+    start.arguments = {"turntable", model().string(),
+                       "--name",    "house",
+                       "--frames",  std::to_string(wish.frames),
+                       "--hide",    "Walk",
+                       "--out",     house.folder.string(),
+                       "--save",    house.document.string()};
     start.arguments.insert(start.arguments.end(), wish.options.begin(), wish.options.end());
     const Ended ended = run(start);
     EXPECT_EQ(ended.exit_code, 0) << ended.err;

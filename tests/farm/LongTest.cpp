@@ -29,9 +29,13 @@ TEST_F(LongFarm, ATaskNearItsTimeLimitEndsBetweenFramesAndGoesOnLater) {
     const House& house = longHouse();
     const Ended submitted = submit(house.document, {"--tasks", "2", "--time", "1"});
     ASSERT_EQ(submitted.exit_code, 0) << submitted.err;
-    ASSERT_TRUE(waitUntil(120, [] {
-        return slurm({"squeue", "--noheader", "--format=%r"}).find("BeginTime") != std::string::npos;
-    })) << slurm({"squeue"}) << logs();
+    ASSERT_TRUE(
+        waitUntil(120,
+                  [] {
+                      return slurm({"squeue", "--noheader", "--format=%r"}).find("BeginTime") !=
+                             std::string::npos;
+                  }))
+        << slurm({"squeue"}) << logs();
     ASSERT_TRUE(waitUntilAllJobsEnded(1200)) << slurm({"squeue"}) << logs();
     expectWhatOneProcessMakes(house);
 }

@@ -65,8 +65,8 @@ TEST_F(Farm, TakesNoPartOfAScriptForAPartition) {
 }
 
 TEST_F(Farm, TellsThatSlurmIsNotInstalled) {
-    Start start = onCluster(
-        {"farm", "submit", quickHouse().document.string(), "--out", m_folder.string()});
+    Start start =
+        onCluster({"farm", "submit", quickHouse().document.string(), "--out", m_folder.string()});
     start.environment["PATH"] = m_place.path().string();
     const Ended submitted = run(start);
     EXPECT_EQ(submitted.exit_code, 1);
