@@ -17,6 +17,8 @@ inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
   quarn record DOC --out DIR                   record a saved animation, or a part of it with
                                                --frames RANGES; goes on where it was stopped
   quarn finish DIR                             make what such a recording lacks, then its page
+  quarn farm submit DOC --out DIR              have a cluster record it; quarn farm status DIR tells
+                                               how far it is, quarn farm cancel DIR ends it
   quarn video FOLDER FILE                      make a film of recorded pictures: .mp4, .webm, .gif,
                                                .webp or .apng
   quarn places [TEXT]                          list the cities that a sun study knows by name
@@ -159,6 +161,34 @@ Examples:
   quarn record house.quarn --out out/house --frames 0-49
   quarn finish out/house --video house.mp4
   quarn finish out/house --document house.quarn --viewer)";
+
+inline constexpr const char* FARM_FOOTER = R"(
+The cluster runs Slurm, and all its nodes see the document and the folder under the same paths.
+docs/farm.md tells more, and how other schedulers do it. quarn farm submit --help tells the options.
+
+Examples:
+  quarn farm submit house.quarn --out out/farm --frame-time 20 --dry-run)";
+
+inline constexpr const char* SUBMIT_FOOTER = R"(
+One frame is drawn here to see what it takes, and the frames that are missing are shared out to the
+tasks of a job array; a last job makes what is missing then, and the page. NAME.farm.sh beside the
+frames is the script that all of them run. Submitted again after something went wrong, only the
+frames that are missing are recorded.
+
+A task is asked to stop one frame's time before its time is up: it then ends between two frames, and
+goes back into the queue. Other options of sbatch are taken from the environment, as sbatch does it:
+SBATCH_ACCOUNT, SBATCH_QOS, SBATCH_MEM_PER_NODE.
+
+Examples:
+  quarn farm submit house.quarn --out out/farm --frame-time 20 --dry-run
+  quarn farm submit house.quarn --out out/farm --tasks 40 --cpus 4 --video house.mp4 --dry-run)";
+
+inline constexpr const char* STATUS_FOOTER = R"(
+Told by what the folder holds, by Slurm, and by the logs of the tasks in NAME.farm. The exit code is
+0 while something goes on and once all is done, and 1 where frames are missing and nothing goes on.)";
+
+inline constexpr const char* CANCEL_FOOTER = R"(
+The frames that are there stay, and quarn farm submit goes on with the others.)";
 
 inline constexpr const char* VIDEO_FOOTER = R"(
 The pictures stand in the film in the order of their numbers. An mp4 plays everywhere; a webm is

@@ -34,6 +34,7 @@ constexpr Subcommand SUBCOMMANDS[] = {
     {"record", "Record a document's animation, or a part of it; goes on where it was stopped",
      RECORD_FOOTER, addRecord},
     {"finish", "Make what a recording lacks, then its page", FINISH_FOOTER, addFinish},
+    {"farm", "Have a cluster record a document's animation", FARM_FOOTER, addFarm},
     {"places", "List the cities that a sun study knows by name", PLACES_FOOTER, addPlaces},
     {"curves", "List what a camera can follow", CURVES_FOOTER, addCurves},
     {"frame", "Write one frame of a document's animation", FRAME_FOOTER, addFrame},
@@ -70,9 +71,14 @@ Actions addSubcommands(CLI::App& program) {
     return actions;
 }
 
+/// "quarn farm submit"
+std::string fullNameOf(const CLI::App& command) {
+    const CLI::App* const parent = command.get_parent();
+    return parent ? fullNameOf(*parent) + " " + command.get_name() : "quarn";
+}
+
 std::string hintOf(const CLI::App& command) {
-    const bool is_program = command.get_parent() == nullptr;
-    return " (quarn" + (is_program ? "" : " " + command.get_name()) + " --help tells more)";
+    return " (" + fullNameOf(command) + " --help tells more)";
 }
 
 Outcome refuseLeftOver(const CLI::App& command, const std::string& word) {
@@ -90,10 +96,16 @@ const CLI::App& typedCommand(const CLI::App& program) {
     return typed.empty() ? program : *typed.front();
 }
 
+/// The command of commands that was typed, such as "submit" behind "farm".
+const CLI::App& innermostCommand(const CLI::App& program) {
+    const CLI::App& typed = typedCommand(program);
+    return &typed == &program ? program : innermostCommand(typed);
+}
+
 /// A word that the program or the command does not know, as a refusal.
 /// @param start  what the word begins with; empty: any word
 std::optional<Outcome> leftOver(const CLI::App& program, const std::string& start) {
-    for (const CLI::App* reader : {&program, &typedCommand(program)}) {
+    for (const CLI::App* reader : {&program, &typedCommand(program), &innermostCommand(program)}) {
         const std::vector<std::string> words = reader->remaining();
         const auto word = std::ranges::find_if(
             words, [&](const std::string& left) { return left.starts_with(start); });
@@ -105,7 +117,7 @@ std::optional<Outcome> leftOver(const CLI::App& program, const std::string& star
 
 /// An option that is misspelled is why another one is missing.
 Outcome refuseMistake(const CLI::App& program, const CLI::ParseError& mistake) {
-    const CLI::App& command = typedCommand(program);
+    const CLI::App& command = innermostCommand(program);
     if (command.get_help_ptr()->count() > 0)
         return Outcome::success(program.help());
     if (const auto unknown = leftOver(program, "-"))

@@ -22,6 +22,7 @@ Action addDay(CLI::App& command);
 Action addSeason(CLI::App& command);
 Action addRecord(CLI::App& command);
 Action addFinish(CLI::App& command);
+Action addFarm(CLI::App& command);
 Action addVideo(CLI::App& command);
 Action addPlaces(CLI::App& command);
 Action addCurves(CLI::App& command);

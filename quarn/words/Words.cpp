@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <charconv>
+#include <cstdio>
 #include <cmath>
 
 namespace quarn::program {
@@ -125,15 +126,39 @@ std::string readingLine(const std::filesystem::path& model, const std::string& u
     return "_-Import " + axis + nearness + quotedPath(model);
 }
 
+namespace {
+
+/// As bash reads $'...': the only quotes that can hold a line break without breaking the line.
+std::string numberedWord(const std::string& text) {
+    std::string word = "$'";
+    for (const char c : text) {
+        char number[8];
+        std::snprintf(number, sizeof number, "\\x%02x", static_cast<unsigned char>(c));
+        word += number;
+    }
+    return word + "'";
+}
+
+} // namespace
+
 std::string shellWord(const std::string& text) {
     constexpr std::string_view PLAIN = "abcdefghijklmnopqrstuvwxyzABCDEFGHIJKLMNOPQRSTUVWXYZ"
                                        "0123456789_-+=.,:/@%";
     if (!text.empty() && text.find_first_not_of(PLAIN) == std::string::npos)
         return text;
+    if (hasControlCharacter(text))
+        return numberedWord(text);
     std::string quoted = "'";
     for (const char c : text)
         quoted += c == '\'' ? "'\\''" : std::string(1, c);
     return quoted + "'";
+}
+
+std::string shellCommand(const std::vector<std::string>& words) {
+    std::string command;
+    for (const std::string& word : words)
+        command += (command.empty() ? "" : " ") + shellWord(word);
+    return command;
 }
 
 std::string quotedPath(const std::filesystem::path& path) {

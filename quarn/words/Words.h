@@ -5,6 +5,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace quarn::program {
 
@@ -62,8 +63,11 @@ std::string readingLine(const std::filesystem::path& model, const std::string& u
                         double tolerance = 0.0);
 
 /// The text as one word of a command that a person types: in single quotes where a shell would read
-/// more into it.
+/// more into it. It never ends a line: control characters stand as bash reads them in $'...'.
 std::string shellWord(const std::string& text);
+
+/// The words behind each other, as they can be pasted into a shell.
+std::string shellCommand(const std::vector<std::string>& words);
 
 /// The path as one word of a script, which no prompt takes for an option.
 std::string quotedPath(const std::filesystem::path& path);

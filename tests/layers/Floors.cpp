@@ -113,7 +113,10 @@ const Room FLOORS[] = {
     {11, "quarn/reports/", BELOW_RUNS},
     {11, "quarn/console/",
      BELOW_SESSIONS + "quarn/session/" + "ground/AtomicFile.h" + "ground/Result.h"},
-    {11, "quarn/arguments/", BELOW_RUNS + "quarn/runs/" + "quarn/reports/" + "quarn/console/"},
+    {11, "quarn/farm/",
+     BELOW_RUNS + "quarn/terminal/" + "quarn/runs/" + "ground/AtomicFile.h" + "ground/Result.h"},
+    {11, "quarn/arguments/",
+     BELOW_RUNS + "quarn/runs/" + "quarn/reports/" + "quarn/console/" + "quarn/farm/"},
     {11, "quarn/main.cpp", {"quarn/arguments/", "quarn/terminal/"}},
 
     {11, "desktop/texts/", PROGRAM},

@@ -1,0 +1,143 @@
+#include "quarn/farm/FarmPlan.h"
+
+#include "host/session/AnimationState.h"
+#include "host/session/RecordingProgress.h"
+#include "quarn/farm/FrameMeasure.h"
+#include "quarn/session/Interruption.h"
+#include "quarn/session/RecordingText.h"
+#include "quarn/terminal/FramePace.h"
+
+#include <numeric>
+
+namespace quarn::program {
+
+namespace {
+
+/// What submitting needs to know of a document.
+struct StoredAnimation {
+    std::string name;
+    int frames = 0;
+};
+
+std::variant<StoredAnimation, Outcome> readAnimation(const FarmRequest& request,
+                                                     const CommonOptions& common) {
+    ConsoleFrontEnd front_end(printsFor(common));
+    HostSession host(front_end, common, HostSession::Use::numbers);
+    if (const auto trouble = host.loadAnimationPlugIn())
+        return *trouble;
+    if (const auto trouble = host.readModel(request.document))
+        return *trouble;
+    const AnimationState state = animationState(host.session().document());
+    if (!state.can_play)
+        return Outcome::failure(request.document.native() +
+                                " has no animation to record: make it with --save of a recording, "
+                                "such as quarn turntable.");
+    return StoredAnimation{state.name.ToUtf8(), state.frame_count};
+}
+
+/// What the folder holds of the animation.
+RecordingProgressResult recordedSoFar(const FarmRequest& request, const std::string& name) {
+    const auto file = request.folder / (name + ".recording");
+    if (!std::filesystem::exists(file))
+        return {.progress = {}, .trouble = "nothing was recorded"};
+    return recordingProgress(file);
+}
+
+bool isOther(const RecordingProgress& recorded, const RecordingProgress& wanted) {
+    return recorded.document_mark != wanted.document_mark ||
+           recorded.settings_mark != wanted.settings_mark;
+}
+
+std::vector<int> allFrames(int count) {
+    std::vector<int> frames(static_cast<std::size_t>(count));
+    std::iota(frames.begin(), frames.end(), 0);
+    return frames;
+}
+
+Outcome nothingMissing(const RecordingProgress& recorded, const FarmRequest& request) {
+    const std::string folder = request.folder.native();
+    if (recorded.is_finished)
+        return Outcome::success("All " + frameCountText(recorded.frames) + " are in " + folder +
+                                ", and nothing was submitted.");
+    return Outcome::success("All " + frameCountText(recorded.frames) + " are in " + folder +
+                            ", and nothing was submitted; quarn finish with this folder writes "
+                            "the page.");
+}
+
+bool isMeasured(const FarmRequest& request) {
+    return !request.frame_s && request.chunks.tasks == 0 && request.chunks.chunk_frames == 0;
+}
+
+std::variant<FarmPlan, Outcome> shared(FarmPlan plan, const std::vector<int>& missing,
+                                       const FarmRequest& request, const SlurmLimits& limits) {
+    const int most = limits.jobs - 1; // the last job is one more
+    if (most < 1)
+        return Outcome::failure("the cluster takes no more jobs now; submit later.");
+    auto chunks = shareOut(missing, request.chunks, plan.cost, most);
+    if (!chunks)
+        return Outcome::failure(chunks.message());
+    plan.missing = static_cast<int>(missing.size());
+    plan.chunks = std::move(chunks.value());
+    return plan;
+}
+
+std::string costText(const FarmPlan& plan, const FarmRequest& request) {
+    if (plan.cost.frame_s <= 0.0)
+        return "How long a frame takes was not measured.";
+    const std::string frame = "A frame takes " + timeText(plan.cost.frame_s);
+    if (request.frame_s)
+        return frame + ", as --frame-time says.";
+    return frame + " with " + std::to_string(request.cpus) +
+           (request.cpus == 1 ? " thread" : " threads") + ", after " +
+           timeText(plan.cost.loading_s) + " of loading; measured here.";
+}
+
+} // namespace
+
+std::variant<FarmPlan, Outcome> planFarm(const FarmRequest& request, const CommonOptions& common,
+                                         const SlurmLimits& limits) {
+    const auto read = readAnimation(request, common);
+    if (const Outcome* const trouble = std::get_if<Outcome>(&read))
+        return *trouble;
+    const auto& animation = std::get<StoredAnimation>(read);
+    const RecordingProgressResult recorded = recordedSoFar(request, animation.name);
+    const bool is_there = recorded.trouble.empty();
+    FarmPlan plan{.name = animation.name, .frames = animation.frames};
+    plan.cost.frame_s = request.frame_s.value_or(0.0);
+    if (is_there && recorded.progress.missing.empty() && !request.overwrites)
+        return nothingMissing(recorded.progress, request);
+    bool begins_anew = !is_there || request.overwrites;
+    if (isMeasured(request)) {
+        const auto measured = measureFrame(
+            request, begins_anew ? animation.frames / 2 : recorded.progress.missing.front());
+        if (const Outcome* const trouble = std::get_if<Outcome>(&measured))
+            return *trouble;
+        const auto& frame = std::get<MeasuredFrame>(measured);
+        const bool is_other = is_there && isOther(recorded.progress, frame.recording);
+        if (is_other && !request.overwrites)
+            return Outcome::failure(request.folder.native() + " holds " + animation.name +
+                                    " as the document or a setting was before it changed; give "
+                                    "--overwrite to record it anew, or another --out.");
+        begins_anew = !is_there || is_other;
+        plan.cost = frame.cost;
+    }
+    const auto missing = begins_anew ? allFrames(animation.frames) : recorded.progress.missing;
+    return missing.empty() ? nothingMissing(recorded.progress, request)
+                           : shared(plan, missing, request, limits);
+}
+
+std::string planText(const FarmPlan& plan, const FarmRequest& request) {
+    const std::size_t tasks = plan.chunks.size();
+    std::string text = costText(plan, request) + "\n" + frameCountText(plan.missing) + " of " +
+                       std::to_string(plan.frames) + (plan.missing == 1 ? " is" : " are") +
+                       " missing: " + std::to_string(tasks) + (tasks == 1 ? " task" : " tasks") +
+                       " of up to " + frameCountText(static_cast<int>(plan.chunks.front().size()));
+    if (plan.cost.frame_s > 0.0)
+        text += ", " +
+                timeText(plan.cost.loading_s +
+                         plan.cost.frame_s * static_cast<double>(plan.chunks.front().size())) +
+                " each";
+    return text + ".\n";
+}
+
+} // namespace quarn::program
