@@ -13,6 +13,7 @@ namespace fs = std::filesystem;
 
 const fs::path FOLDER = FARM_CLUSTER;
 constexpr std::chrono::milliseconds BETWEEN_LOOKS{20};
+constexpr double LONGEST_START_S = 30;
 
 /// The variables that a process was started with, each ended by a zero.
 std::string environmentOf(const fs::path& process) {
@@ -20,8 +21,6 @@ std::string environmentOf(const fs::path& process) {
 }
 
 bool isTaskOf(const fs::path& process, const std::string& node) {
-    if (readFile(process / "comm") != "quarn\n")
-        return false;
     const std::string environment = environmentOf(process);
     const auto holds = [&](const std::string& setting) {
         return environment.find('\0' + setting + '\0') != std::string::npos;
@@ -39,6 +38,24 @@ bool hasClaim(pid_t process, const fs::path& folder) {
             return true;
     }
     return false;
+}
+
+bool isNumber(const std::string& name) {
+    return std::all_of(name.begin(), name.end(), [](char c) { return c >= '0' && c <= '9'; });
+}
+
+std::optional<Drawing> drawingOn(const std::vector<std::string>& where, const fs::path& folder) {
+    for (const fs::directory_entry& entry : fs::directory_iterator("/proc")) {
+        const std::string name = entry.path().filename();
+        if (!isNumber(name) || readFile(entry.path() / "comm") != "quarn\n" ||
+            !hasClaim(std::stoi(name), folder))
+            continue;
+        for (const std::string& node : where) {
+            if (isTaskOf(entry.path(), node))
+                return Drawing{node, std::stoi(name)};
+        }
+    }
+    return std::nullopt;
 }
 
 } // namespace
@@ -98,21 +115,10 @@ bool waitUntilAllJobsEnded(double seconds) {
     });
 }
 
-std::optional<pid_t> drawingOn(const std::string& node, const fs::path& folder) {
-    for (const fs::directory_entry& entry : fs::directory_iterator("/proc")) {
-        const std::string name = entry.path().filename();
-        if (!std::all_of(name.begin(), name.end(), [](char c) { return c >= '0' && c <= '9'; }))
-            continue;
-        const pid_t process = std::stoi(name);
-        if (isTaskOf(entry.path(), node) && hasClaim(process, folder))
-            return process;
-    }
-    return std::nullopt;
-}
-
-std::optional<pid_t> waitUntilDrawingOn(const std::string& node, const fs::path& folder) {
-    std::optional<pid_t> found;
-    waitUntil(30, [&] { return (found = drawingOn(node, folder)).has_value(); });
+std::optional<Drawing> waitUntilDrawing(const std::vector<std::string>& where,
+                                        const fs::path& folder) {
+    std::optional<Drawing> found;
+    waitUntil(LONGEST_START_S, [&] { return (found = drawingOn(where, folder)).has_value(); });
     return found;
 }
 

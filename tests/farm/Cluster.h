@@ -31,11 +31,15 @@ bool waitUntil(double seconds, const std::function<bool()>& condition);
 /// Waits until no job is left that could still run.
 bool waitUntilAllJobsEnded(double seconds);
 
-/// The process of quarn that a node runs and that draws a frame now, by its claim in the folder.
-std::optional<pid_t> drawingOn(const std::string& node, const std::filesystem::path& folder);
+/// A process of quarn that draws a frame now, by its claim, and the node that it runs on.
+struct Drawing {
+    std::string node;
+    pid_t process = -1;
+};
 
-/// The same, for the first that comes; nothing where none came within half a minute.
-std::optional<pid_t> waitUntilDrawingOn(const std::string& node,
+/// Waits until one of these nodes draws a frame into the folder. @return nothing after half a
+/// minute
+std::optional<Drawing> waitUntilDrawing(const std::vector<std::string>& where,
                                         const std::filesystem::path& folder);
 
 } // namespace quarn::test

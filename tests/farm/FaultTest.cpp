@@ -10,11 +10,9 @@ namespace {
 
 namespace fs = std::filesystem;
 
-using testing::Gt;
 using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::Not;
-using testing::SizeIs;
 
 /// What makes programs believe that it is an hour later; of files they are told the truth.
 std::string clockAnHourAhead() {
@@ -35,8 +33,27 @@ std::string fullDisk(const fs::path& file) {
     return "export BASH_ENV=" + file.string() + "\n";
 }
 
-void loseOneLine(const fs::path& file) {
+void cutInHalf(const fs::path& file) {
     fs::resize_file(file, fs::file_size(file) / 2);
+}
+
+std::vector<std::string> nodesBut(const std::string& lost) {
+    std::vector<std::string> others = nodes();
+    std::erase(others, lost);
+    return others;
+}
+
+/// The same document with a line more.
+void writeChanged(const fs::path& document, const fs::path& changed) {
+    const fs::path script = changed.parent_path() / "change.txt";
+    writeFile(script, "_-Line 0,0,0 30,0,30 _Enter\n_-SaveAs \"" + changed.string() + "\"\n");
+    const Ended ended = run({"run", script.string(), document.string()});
+    ASSERT_EQ(ended.exit_code, 0) << ended.err;
+}
+
+bool usesAnotherClock(pid_t process) {
+    return readFile("/proc/" + std::to_string(process) + "/maps").find("libfaketime") !=
+           std::string::npos;
 }
 
 /// How many frames the writer with this process has noted.
@@ -62,15 +79,22 @@ TEST_F(Farm, MakesWhatOneProcessMakesThoughANodeATaskADiskAndTheControllerFailAn
     const Ended submitted = submit(house.document, {"--tasks", "6"});
     ASSERT_EQ(submitted.exit_code, 0) << submitted.err;
 
-    const auto killed = waitUntilDrawingOn("n2", m_folder);
+    const auto killed = waitUntilDrawing({"n2"}, m_folder);
     ASSERT_TRUE(killed) << logs();
-    EXPECT_EQ(kill(*killed, SIGKILL), 0);
-    ASSERT_TRUE(waitUntilDrawingOn("n1", m_folder)) << logs();
+    EXPECT_EQ(kill(killed->process, SIGKILL), 0);
+    ASSERT_TRUE(waitUntilDrawing({"n1"}, m_folder)) << logs();
     cluster("kill-node", "n1");
-    EXPECT_TRUE(waitUntilDrawingOn("n4", m_folder)) << "the clock kept n4 from work\n" << logs();
+    const auto ahead = waitUntilDrawing({"n4"}, m_folder);
+    ASSERT_TRUE(ahead) << logs();
+    EXPECT_TRUE(usesAnotherClock(ahead->process));
     cluster("restart-controller");
+    EXPECT_TRUE(waitUntil(10, [&] {
+        const std::string said = farm("status").out;
+        return said.find("on n2: FAILED") != said.npos && said.find("on n3: FAILED") != said.npos;
+    })) << farm("status").out;
 
     ASSERT_TRUE(waitUntilAllJobsEnded(120)) << slurm({"squeue"}) << logs();
+    EXPECT_THAT(logs(), HasSubstr("larger than is allowed")) << "the disk of n3 was not full";
     expectWhatOneProcessMakes(house);
     const Ended status = farm("status");
     EXPECT_EQ(status.exit_code, 0) << status.err;
@@ -81,18 +105,20 @@ TEST_F(Farm, LetsATaskThatOutlivedItsNodeAndItsSuccessorWriteSideBySide) {
     const House& house = renderedHouse();
     const Ended submitted = submit(house.document, {"--tasks", "1"});
     ASSERT_EQ(submitted.exit_code, 0) << submitted.err;
-    const auto orphan = waitUntilDrawingOn("n1", m_folder);
+    const auto orphan = waitUntilDrawing(nodes(), m_folder);
     ASSERT_TRUE(orphan) << slurm({"squeue"}) << logs();
-    cluster("orphan-node", "n1");
-    EXPECT_EQ(kill(*orphan, SIGSTOP), 0); // it is still at it when the other begins
-    slurm({"scontrol", "update", "nodename=n1", "state=down", "reason=lost"});
+    cluster("orphan-node", orphan->node);
+    EXPECT_EQ(kill(orphan->process, SIGSTOP), 0); // it is still at it when the other begins
+    slurm({"scontrol", "update", "nodename=" + orphan->node, "state=down", "reason=lost"});
 
-    const auto successor = waitUntilDrawingOn("n2", m_folder);
+    const auto successor = waitUntilDrawing(nodesBut(orphan->node), m_folder);
+    EXPECT_EQ(kill(orphan->process, SIGCONT), 0);
     ASSERT_TRUE(successor) << slurm({"squeue"}) << logs();
-    const int before = framesOf(*orphan, m_folder);
-    EXPECT_EQ(kill(*orphan, SIGCONT), 0);
-    EXPECT_TRUE(waitUntil(20, [&] { return framesOf(*orphan, m_folder) > before; })) << logs();
-    EXPECT_THAT(framesOf(*successor, m_folder), Gt(0));
+    const int before = framesOf(orphan->process, m_folder);
+    EXPECT_TRUE(waitUntil(20, [&] { return framesOf(orphan->process, m_folder) > before; }))
+        << logs();
+    EXPECT_TRUE(waitUntil(20, [&] { return framesOf(successor->process, m_folder) > 0; }))
+        << logs();
 
     ASSERT_TRUE(waitUntilAllJobsEnded(60)) << slurm({"squeue"}) << logs();
     expectWhatOneProcessMakes(house);
@@ -107,7 +133,7 @@ TEST_F(Farm, GoesOnWhereItWasCancelledAndMakesFramesAgainThatWereCutOrEmptied) {
     ASSERT_TRUE(waitUntilAllJobsEnded(20)) << slurm({"squeue"});
     const std::vector<std::string> first = framesIn(m_folder);
     ASSERT_LT(static_cast<int>(first.size()), house.frames) << "nothing was left to cancel";
-    loseOneLine(m_folder / first[0]);
+    cutInHalf(m_folder / first[0]);
     fs::resize_file(m_folder / first[1], 0);
     const auto kept = fs::last_write_time(m_folder / first[2]);
 
@@ -122,9 +148,9 @@ TEST_F(Farm, RefusesADocumentThatWasChangedBetweenTasksAndMixesNothing) {
     const House& house = renderedHouse();
     const fs::path document = m_place / "house.quarn";
     fs::copy_file(house.document, document);
-    fs::copy_file(quickHouse().document, m_place / "changed.quarn");
+    writeChanged(house.document, m_place / "changed.quarn");
     ASSERT_EQ(submit(document, {"--tasks", "8"}).exit_code, 0);
-    ASSERT_TRUE(waitUntilDrawingOn("n1", m_folder)) << logs();
+    ASSERT_TRUE(waitUntilDrawing(nodes(), m_folder)) << logs();
     fs::rename(m_place / "changed.quarn", document);
     ASSERT_TRUE(waitUntilAllJobsEnded(60)) << slurm({"squeue"}) << logs();
 
@@ -143,12 +169,13 @@ TEST_F(Farm, RefusesADocumentThatWasChangedBetweenTasksAndMixesNothing) {
 TEST_F(Farm, ATaskThatIsAskedToEndStopsBetweenFramesAndGoesOnLater) {
     const House& house = renderedHouse();
     ASSERT_EQ(submit(house.document, {"--tasks", "2"}).exit_code, 0);
-    const auto task = waitUntilDrawingOn("n1", m_folder);
+    const auto task = waitUntilDrawing(nodes(), m_folder);
     ASSERT_TRUE(task) << logs();
-    ASSERT_TRUE(waitUntil(30, [&] { return framesOf(*task, m_folder) > 0; }));
-    const std::string job = slurm({"squeue", "--noheader", "--nodelist=n1", "--format=%A"});
+    ASSERT_TRUE(waitUntil(30, [&] { return framesOf(task->process, m_folder) > 0; }));
+    const std::string job =
+        slurm({"squeue", "--noheader", "--nodelist=" + task->node, "--format=%A"});
     slurm({"scancel", "--batch", "--signal=TERM", linesOf(job).front()});
-    ASSERT_TRUE(waitUntil(10, [&] { return kill(*task, 0) != 0; })) << "it does not end";
+    ASSERT_TRUE(waitUntil(10, [&] { return kill(task->process, 0) != 0; })) << "it does not end";
     EXPECT_TRUE(waitUntil(5, [] {
         return slurm({"squeue", "--noheader", "--states=PENDING", "--format=%r"})
                    .find("BeginTime") != std::string::npos;

@@ -15,12 +15,31 @@ TEST_F(LongFarm, MakesTwoHundredFramesThoughTwoOfFourNodesAreLostOnTheWay) {
     const Ended submitted = submit(house.document, {"--tasks", "8"});
     ASSERT_EQ(submitted.exit_code, 0) << submitted.err;
     ASSERT_TRUE(waitUntil(300, [&] { return framesIn(m_folder).size() >= 40; })) << logs();
-    ASSERT_TRUE(waitUntilDrawingOn("n2", m_folder)) << logs();
+    ASSERT_TRUE(waitUntilDrawing({"n2"}, m_folder)) << logs();
     cluster("kill-node", "n2");
     ASSERT_TRUE(waitUntil(300, [&] { return framesIn(m_folder).size() >= 100; })) << logs();
-    ASSERT_TRUE(waitUntilDrawingOn("n3", m_folder)) << logs();
+    ASSERT_TRUE(waitUntilDrawing({"n3"}, m_folder)) << logs();
     cluster("kill-node", "n3");
     ASSERT_TRUE(waitUntilAllJobsEnded(900)) << slurm({"squeue"}) << logs();
+    expectWhatOneProcessMakes(house);
+}
+
+// A controller that is killed forgets the jobs of the last seconds, perhaps the one that finishes.
+TEST_F(LongFarm, IsSubmittedAgainWhereTheControllerForgotIt) {
+    const House& house = renderedHouse();
+    ASSERT_EQ(submit(house.document, {"--tasks", "6"}).exit_code, 0);
+    ASSERT_TRUE(waitUntilDrawing(nodes(), m_folder)) << logs();
+    cluster("crash-controller");
+    EXPECT_TRUE(waitUntil(60, [] {
+        return slurm({"squeue", "--noheader", "--states=RUNNING"}).empty();
+    })) << slurm({"squeue"});
+    slurm({"scancel", "--me"});
+    ASSERT_TRUE(waitUntilAllJobsEnded(30)) << slurm({"squeue"});
+    cluster("resume-nodes");
+
+    const Ended again = submit(house.document, {"--tasks", "6"});
+    ASSERT_EQ(again.exit_code, 0) << again.err;
+    ASSERT_TRUE(waitUntilAllJobsEnded(60)) << slurm({"squeue"}) << logs();
     expectWhatOneProcessMakes(house);
 }
 

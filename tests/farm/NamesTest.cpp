@@ -33,10 +33,10 @@ TEST_P(FarmNames, AreTakenAsTheyAreByAllTasksAlsoWhenTheArrayIsSplit) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Hostile, FarmNames,
-                         testing::Values("it's $(touch pwned) `touch pwned` %a \\ #$HOME; -x"));
+                         testing::Values("it's $(touch pwned) `touch pwned` %a %j #$HOME; -x"));
 
 TEST_F(Farm, RefusesPathsThatNoScriptCanHold) {
-    for (const char* const name : {"two\nlines", "quoted \" name"}) {
+    for (const char* const name : {"two\nlines", "quoted \" name", "back\\slash"}) {
         const fs::path place = m_place / name;
         fs::create_directories(place);
         fs::copy_file(quickHouse().document, place / "house.quarn");
