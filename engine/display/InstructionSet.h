@@ -7,7 +7,7 @@
 namespace quarn {
 
 /// The instructions of the processor that pictures are drawn with, and rays followed. Pictures of
-/// different sets differ in their last bits.
+/// different sets differ in a few pixels.
 enum class InstructionSet { sse2, avx2, avx512 };
 
 /// "sse2", "avx2" or "avx512".

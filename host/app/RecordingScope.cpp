@@ -132,12 +132,24 @@ void beginRecording(Application& application, Document& document,
 
 RecordingScope::RecordingScope(Application& application, CQuarnCommand& command,
                                CQuarnDoc& document)
-    : m_application(application),
+    : m_application(application), m_document(Document::of(document)),
       m_is_recording(!application.recording() && command.CommandUUID() == recording_command_id) {
     if (!m_is_recording)
         return;
-    if (const IQnZoetrixDynamicAccess* const access = Zoetrix_QuarnDynamicAccess())
-        beginRecording(application, Document::of(document), access->AnimationProperties(document));
+    const IQnZoetrixDynamicAccess* const access = Zoetrix_QuarnDynamicAccess();
+    if (!access)
+        return;
+    const KM_3dmAnimationProperties record = access->AnimationProperties(document);
+    m_view_name = recordedViewName(record);
+    if (const ViewState* const view = m_document.findView(m_view_name.View()))
+        m_camera_before = view->viewport();
+    beginRecording(application, m_document, record);
+}
+
+void RecordingScope::putCameraBack() {
+    ViewState* const view = m_document.findView(m_view_name.View());
+    if (view && m_camera_before)
+        view->setViewport(*m_camera_before, true, true);
 }
 
 RecordingScope::~RecordingScope() {
@@ -147,6 +159,7 @@ RecordingScope::~RecordingScope() {
     const auto ended = acrossBorder([&] {
         if (!m_application.recording())
             return;
+        putCameraBack();
         if (const auto report = m_application.recording()->end()) {
             followers.end(*report);
             m_application.frontEnd().recordingEnded(*report);

@@ -206,7 +206,9 @@ void JournalWriter::remove() const {
 bool isWriterAlive(const JournalReader& journal, fs::file_time_type now,
                    std::chrono::seconds lease) {
     const RecordingJournal& content = journal.content();
-    if (content.has_ended || (journal.hasHead() && hasEnded(content.head.writer)))
+    const ProcessIdentity& writer = content.head.writer;
+    if (content.has_ended ||
+        (journal.hasHead() && (hasEnded(writer) || writer == currentProcess())))
         return false;
     std::error_code error;
     const auto renewed = fs::last_write_time(journal.file(), error);

@@ -9,7 +9,7 @@
 namespace quarn {
 
 /// The instruction sets that pictures can be drawn with on this processor, the fastest first:
-/// "avx512", "avx2", "sse2". Pictures of different sets differ in their last bits.
+/// "avx512", "avx2", "sse2". Pictures of different sets differ in a few pixels.
 QNCORE_API std::vector<std::string> instructionSets();
 
 /// Why SessionOptions::instructions cannot be this name, in a sentence that tells which can;

@@ -72,8 +72,8 @@ void addCommonOptions(CLI::App& command, CommonOptions& common) {
         "processor core)");
     add("--instructions", common.instructions, "NAME", instructionSet(),
         "Instructions of the processor that pictures are drawn with: avx512, avx2 or sse2 "
-        "(default: the fastest of them that it has); pictures of different ones differ in their "
-        "last bits");
+        "(default: the fastest of them that it has); pictures of different ones differ in a few "
+        "pixels");
 }
 
 void addShowScript(CLI::App& command, bool& is_only_shown) {

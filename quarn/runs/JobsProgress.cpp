@@ -10,7 +10,7 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr FramePace::Clock::duration SHORTEST_STEP = 500ms;
+constexpr FramePace::Clock::duration SHORTEST_STEP = 100ms;
 /// Of the time that a look takes: 10,000 frames take a while.
 constexpr int LOOKS_OF_A_STEP = 10;
 

@@ -102,7 +102,7 @@ TEST_P(ChosenInstructions, MakeTheSamePicturesEveryTimeAndWithAnyNumberOfThreads
     EXPECT_TRUE(once == picturesBy(7));
 }
 
-TEST_P(ChosenInstructions, DifferFromTheFastestInLastBitsAlone) {
+TEST_P(ChosenInstructions, DifferFromTheFastestInFewPixels) {
     const std::vector<std::uint8_t> own = picturesBy(2);
     chooseInstructionSet(std::nullopt);
     const std::vector<std::uint8_t> fastest = picturesBy(2);

@@ -15,7 +15,9 @@ RecordingFile sample() {
     recording.animation = "Häuschen \"2\"";
     recording.is_running = true;
     recording.writer = {"host-1", 4711, 123456789012345ULL};
-    recording.lease_until_s = 1795320936;
+    recording.document = "/models/Häuschen.quarn";
+    recording.is_shared = true;
+    recording.fingerprint = {"quarn 1.0.0", "00000000000000d0", "00000000000000e0", "avx2"};
     recording.settings = {"turntable", 150, 1280, 720, "Rendered", "jpg"};
     recording.written = FrameSet::firstOf(44);
     recording.written.add(50);
@@ -36,7 +38,7 @@ TEST_F(RecordingFileOnDisk, ReadsBackWhatWasWritten) {
     ASSERT_TRUE(readRecordingFile(file).ok());
     EXPECT_EQ(readRecordingFile(file).value(), recording);
     recording.is_running = false;
-    recording.lease_until_s = 0;
+    recording.is_shared = false;
     ASSERT_TRUE(writeRecordingFile(file, recording).ok());
     EXPECT_EQ(readRecordingFile(file).value(), recording);
 }
@@ -61,8 +63,8 @@ TEST_F(RecordingFileOnDisk, ThatIsSomethingElseIsToldWithItsName) {
           replaced("quarn-recording", "another"), replaced("4711", "-4711"),
           replaced("4711", "\"4711\""), replaced("150", "15000000000"), replaced("\"jpg\"", "7"),
           replaced("4711", "1e300"), replaced("123456789012345", "1.5"),
-          replaced("123456789012345", "18446744073709551616"), replaced("1795320936", "1e300"),
-          replaced("\"version\": 1", "\"version\": 0.5")}) {
+          replaced("123456789012345", "18446744073709551616"), replaced("\"avx2\"", "2"),
+          replaced("\"version\": 2", "\"version\": 0.5")}) {
         writeFile(file, text);
         const auto read = readRecordingFile(file);
         ASSERT_FALSE(read.ok()) << text;
@@ -74,7 +76,7 @@ TEST_F(RecordingFileOnDisk, ThatIsSomethingElseIsToldWithItsName) {
 TEST_F(RecordingFileOnDisk, OfALaterVersionIsToldAsThat) {
     ASSERT_TRUE(writeRecordingFile(file, sample()).ok());
     std::string text = readFile(file);
-    text.replace(text.find("\"version\": 1"), 12, "\"version\": 2");
+    text.replace(text.find("\"version\": 2"), 12, "\"version\": 3");
     writeFile(file, text);
     const auto read = readRecordingFile(file);
     ASSERT_FALSE(read.ok());
@@ -100,22 +102,18 @@ TEST_F(RecordingFileOnDisk, WithRangesOutOfOrderIsNone) {
     }
 }
 
-TEST(RecordedElsewhere, OnlyWhileTheLeaseOfAnotherLivingProcessLasts) {
-    constexpr std::int64_t now_s = 1000;
-    RecordingFile recording = sample();
-    recording.writer = {"another-machine", 1, 0};
-    recording.lease_until_s = now_s + 1;
-    EXPECT_TRUE(isRecordedElsewhere(recording, now_s));
-    EXPECT_FALSE(isRecordedElsewhere(recording, now_s + 1)) << "the lease has run out";
-    recording.writer = {hostName(), 1, 0};
-    EXPECT_TRUE(isRecordedElsewhere(recording, now_s)) << "the first process of a machine lives";
-    recording.writer = {hostName(), 1, 987654321};
-    EXPECT_FALSE(isRecordedElsewhere(recording, now_s)) << "another one has its number";
-    recording.writer = currentProcess();
-    EXPECT_FALSE(isRecordedElsewhere(recording, now_s)) << "this process";
-    recording.writer = {"another-machine", 1, 0};
-    recording.is_running = false;
-    EXPECT_FALSE(isRecordedElsewhere(recording, now_s)) << "it has ended";
+TEST_F(RecordingFileOnDisk, OfTheFirstVersionKnowsNoFingerprint) {
+    writeFile(file, R"({"format": "quarn-recording", "version": 1, "name": "house",
+        "state": "recording", "writer": {"host": "studio-3", "pid": 4711, "started": 1381320},
+        "lease_until_unix_s": 1795320936,
+        "settings": {"kind": "turntable", "frames": 150, "width_px": 1280, "height_px": 720,
+                     "mode": "Rendered", "extension": "jpg"},
+        "written": [[0, 43]], "owns_page": true, "earlier": {"png": [[0, 11]]}})");
+    const auto read = readRecordingFile(file);
+    ASSERT_TRUE(read.ok() && read.value());
+    EXPECT_EQ(read.value()->fingerprint, RecordingFingerprint());
+    EXPECT_FALSE(read.value()->is_shared);
+    EXPECT_EQ(read.value()->written, FrameSet::firstOf(44));
 }
 
 } // namespace
