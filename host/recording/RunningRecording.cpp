@@ -132,7 +132,8 @@ Result<void> RunningRecording::start() {
         is_known ? whyAnotherRecording(*read.value(), m_file, m_place.folder) : std::nullopt;
     const bool may_go_on = m_plan.choice.begin != RecordingBegin::anew;
     const bool goes_on = may_go_on && is_known && !difference;
-    if (!goes_on || !read.value()->is_shared)
+    // Without that file nobody has begun: whoever has a journal waits for this one.
+    if (is_known && (!goes_on || !read.value()->is_shared))
         if (const auto other = otherWriter())
             return isRecorded(m_place, *other);
     if (m_plan.choice.begin == RecordingBegin::resume && difference)
@@ -156,7 +157,7 @@ Result<void> RunningRecording::startAnew() {
     std::error_code error;
     fs::remove(m_place.folder / manifestName(m_place.animation), error); // tells of replaced frames
     for (const fs::path& journal : journalsIn(m_place.folder, m_place.animation))
-        if (!m_journal || journal != m_journal->file())
+        if (!m_journal || (journal != m_journal->file() && !isAlive(journal.filename().native())))
             fs::remove(journal, error);
     if (m_wanted.isEmpty())
         m_file.fingerprint.instructions.clear(); // the first to make a frame decides

@@ -29,7 +29,11 @@ void addQuality(const OptionAdder& add, std::optional<int>& quality) {
 /// @return what does not go together, or nothing
 std::optional<std::string> settleRecording(AskedRecording& asked) {
     DocumentRecordingRequest& request = asked.request;
-    request.begins_anew = asked.use.common.overwrites && !asked.goes_on;
+    if (asked.use.common.overwrites && asked.goes_on)
+        return "--resume keeps the frames that are there, and --overwrite makes all anew: give one "
+               "of them.";
+    if (asked.use.common.overwrites)
+        request.start = RecordingStartKind::anew;
     if (auto mistake = whyFilmIsMisused(request.film))
         return mistake;
     const char* const of_all = !request.film.file.empty()   ? "--video"
@@ -49,7 +53,8 @@ Outcome record(AskedRecording& asked) {
         return Outcome::misuse(*mistake);
     if (asked.recorder.empty())
         return recordDocument(asked.request, asked.jobs, asked.use);
-    asked.request.begins_anew = asked.recorder == "anew";
+    asked.request.start =
+        asked.recorder == "anew" ? RecordingStartKind::anew : RecordingStartKind::resume;
     return runRecorder(asked.request, asked.use.common);
 }
 
@@ -70,10 +75,8 @@ Action addRecord(CLI::App& command) {
         "Recorders that share the frames, each a process with a share of the cores that reads the "
         "document for itself",
         "1");
-    command.add_flag(
-        "--resume", asked->goes_on,
-        "Keep whole frames of the same recording, as is done anyway; with --overwrite: "
-        "make all anew only where another recording is there");
+    command.add_flag("--resume", asked->goes_on,
+                     "Keep whole frames of the same recording; it is done without this too");
     addQuality(add, request.quality);
     addViewer(command, request.viewer);
     addRecordingFilm(command, request.film, FilmTimes::perhaps);

@@ -142,7 +142,8 @@ void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse
                      subject == CaptureSubject::moving_sun ? FilmTimes::perhaps : FilmTimes::none);
     command.add_flag("--resume", request.goes_on,
                      "Go on with the recording in the folder; where another one is there, say so "
-                     "and write nothing (default: make that anew)");
+                     "and write nothing "
+                     "(default, and with --overwrite: make that anew)");
     addOverwrite(command, use.common);
     addShowScript(command, use.is_only_shown);
     addCommonOptions(command, use.common);

@@ -69,7 +69,7 @@ Outcome recordDocument(const DocumentRecordingRequest& request, int jobs, const 
     const auto start = std::chrono::steady_clock::now();
     watchForInterruption();
     CommonOptions common = use.common;
-    if (!request.begins_anew)
+    if (request.start != RecordingStartKind::anew)
         if (const auto refusal = takeInstructionsOf(request.folder, common))
             return *refusal;
     if (jobs > 1)

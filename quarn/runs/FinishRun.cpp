@@ -44,6 +44,8 @@ Outcome finishRecording(const FinishRequest& request, const ScriptUse& use) {
     DocumentRecordingRequest all;
     all.folder = folderOf(request.recorded);
     all.document = request.document;
+    if (use.common.overwrites)
+        all.start = RecordingStartKind::if_same;
     all.quality = request.quality;
     all.film = request.film;
     all.viewer = request.viewer;

@@ -17,7 +17,8 @@ constexpr int LOOKS_OF_A_STEP = 10;
 } // namespace
 
 JobsProgress::JobsProgress(const DocumentRecordingRequest& request)
-    : m_request(request), m_line(stderr), m_kept(request.begins_anew ? 0 : count().there) {}
+    : m_request(request), m_line(stderr),
+      m_kept(request.start == RecordingStartKind::anew ? 0 : count().there) {}
 
 JobsProgress::Counts JobsProgress::count() const {
     const RecordingProgressResult found = recordingProgress(m_request.folder);

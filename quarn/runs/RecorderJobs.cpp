@@ -71,7 +71,7 @@ private:
 
     /// Where all is made anew, the first one alone does away with what was there.
     bool startAll() {
-        if (m_request.begins_anew && (!startOne(true) || !waitForFirst()))
+        if (m_request.start == RecordingStartKind::anew && (!startOne(true) || !waitForFirst()))
             return !m_recorders.empty();
         while (m_recorders.size() < static_cast<std::size_t>(m_jobs))
             if (!startOne(false))
@@ -185,7 +185,7 @@ Outcome recordWithJobs(const DocumentRecordingRequest& request, int jobs,
     if (const auto end = recorders.run())
         return *end;
     DocumentRecordingRequest rest = request;
-    rest.begins_anew = false;
+    rest.start = RecordingStartKind::resume;
     return recordHere(rest, {.names_missing = true, .kept_before = recorders.keptBefore()}, common,
                       start);
 }

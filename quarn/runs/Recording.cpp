@@ -70,10 +70,12 @@ std::optional<Outcome> refuseFilm(const FilmRequest& film, const std::filesystem
 
 Outcome recordOrShow(const RecordingRequest& request, const AnimationLines& lines,
                      const ScriptUse& use) {
-    const RecordingScript script = composeRecording(request, lines);
+    RecordingRequest settled = request;
+    settled.goes_on = request.goes_on && !use.common.overwrites;
+    const RecordingScript script = composeRecording(settled, lines);
     if (use.is_only_shown)
         return Outcome::success(scriptText(script));
-    return setUpAndRecord(request, script, use.common);
+    return setUpAndRecord(settled, script, use.common);
 }
 
 } // namespace quarn::program

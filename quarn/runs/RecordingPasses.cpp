@@ -21,7 +21,8 @@ void addPass(const EndedRecording& pass, std::optional<int> kept_before,
 }
 
 /// @return why the host refused to record; nothing where it did, or tried to
-std::optional<std::string> runPass(const RecordingRun& run, const std::string& beginning, HostSession& host) {
+std::optional<std::string> runPass(const RecordingRun& run, const std::string& beginning,
+                                   HostSession& host) {
     ConsoleFrontEnd& front_end = host.frontEnd();
     const std::size_t ended = front_end.recordings().size();
     front_end.beginRecording(run.frames);

@@ -8,9 +8,7 @@ RecordingScript composeDocumentRecording(const DocumentRecordingRequest& request
     script.reading = readingLine(request.document);
     if (request.quality)
         script.set_up.push_back("_-JpegQuality " + std::to_string(*request.quality));
-    script.beginning =
-        beginningLine(request.begins_anew ? RecordingStartKind::anew : RecordingStartKind::resume,
-                      request.part.text());
+    script.beginning = beginningLine(request.start, request.part.text());
     script.recording = recordingLine(request.folder);
     // Not while it records: frames that are kept, and those of others, are in the film too.
     if (!request.film.file.empty())

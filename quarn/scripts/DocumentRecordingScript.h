@@ -11,8 +11,8 @@ namespace quarn::program {
 struct DocumentRecordingRequest {
     std::filesystem::path document;
     std::filesystem::path folder;
-    FrameRanges part;           ///< that is to be made of it
-    bool begins_anew = false;   ///< whether frames that are there already are made again
+    FrameRanges part; ///< that is to be made of it
+    RecordingStartKind start = RecordingStartKind::resume;
     std::optional<int> quality; ///< of jpg; 1 to 100; nothing: the host's
     FilmRequest film;           ///< of all frames
     ViewerRequest viewer;

@@ -104,7 +104,10 @@ TEST(RecordScript, HasTheFramesThatAreWanted) {
 
 TEST(RecordScript, BeginsAnewWhereThatIsAskedFor) {
     EXPECT_EQ(scriptOf({"--overwrite"})[2], "_-NextRecording _Anew _Enter");
-    EXPECT_EQ(scriptOf({"--overwrite", "--resume"})[2], "_-NextRecording _Resume _Enter");
+    expectMisuse(record({"--overwrite", "--resume"}), "give one of them");
+    const Ended finished =
+        run({"finish", "out", "--document", "site.quarn", "--overwrite", "--show-script"});
+    EXPECT_THAT(finished.out, HasSubstr("_-NextRecording _IfSame _Enter"));
 }
 
 TEST(RecordScript, MakesFilmAndPageOfTheFolderOnceAllFramesAreThere) {

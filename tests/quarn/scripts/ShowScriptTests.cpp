@@ -84,6 +84,7 @@ TEST(ShowScript, LensIsChosenBeforeTheModelIsFitted) {
 
 TEST(ShowScript, GoesOnWithTheSameRecordingAloneWhereThatIsAskedFor) {
     EXPECT_EQ(scriptWith({"--resume"})[7], "_-NextRecording _Resume _Enter");
+    EXPECT_EQ(scriptWith({"--resume", "--overwrite"})[7], "_-NextRecording _IfSame _Enter");
 }
 
 TEST(ShowScript, QualityIsSetBeforeTheRecording) {
