@@ -3,6 +3,7 @@
 #include "tests/quarn/ProgramRun.h"
 
 #include <gtest/gtest.h>
+#include <stdexcept>
 
 namespace quarn::test {
 
@@ -16,6 +17,8 @@ const char* const SAMPLES = "2";
 #else
 const char* const SAMPLES = "16";
 #endif
+
+constexpr int MOST_MINUTES = 15;
 
 struct Wish {
     std::string kind;
@@ -51,8 +54,13 @@ House made(const Wish& wish) {
                        "--out",     house.folder.string(),
                        "--save",    house.document.string()};
     start.arguments.insert(start.arguments.end(), wish.options.begin(), wish.options.end());
-    const Ended ended = run(start);
-    EXPECT_EQ(ended.exit_code, 0) << ended.err;
+    RunningProgram program(start);
+    for (int minute = 0; minute < MOST_MINUTES && !fs::exists(house.folder / "house.html");
+         ++minute)
+        program.waitUntil([&] { return fs::exists(house.folder / "house.html"); });
+    const Ended ended = program.wait();
+    if (ended.exit_code != 0)
+        throw std::runtime_error("no frames to compare with: " + ended.err);
     writeFile(place / "done", "");
     return house;
 }

@@ -16,11 +16,9 @@ constexpr int LARGEST_ARRAY = 9;
 
 } // namespace
 
-class FarmNames : public Farm, public testing::WithParamInterface<const char*> {};
-
-TEST_P(FarmNames, AreTakenAsTheyAreByAllTasksAlsoWhenTheArrayIsSplit) {
+TEST_F(Farm, TakesNamesAsTheyAreAndSplitsAnArrayThatIsLargerThanTheClusterAllows) {
     const House& house = quickHouse();
-    const fs::path place = m_place / GetParam();
+    const fs::path place = m_place / "it's $(touch pwned) `touch pwned` %a %j #$HOME; -x";
     fs::create_directories(place);
     const fs::path document = place / "the house.quarn";
     fs::copy_file(house.document, document);
@@ -31,9 +29,6 @@ TEST_P(FarmNames, AreTakenAsTheyAreByAllTasksAlsoWhenTheArrayIsSplit) {
     expectWhatOneProcessMakes(house);
     EXPECT_FALSE(fs::exists(m_place / "pwned") || fs::exists("pwned"));
 }
-
-INSTANTIATE_TEST_SUITE_P(Hostile, FarmNames,
-                         testing::Values("it's $(touch pwned) `touch pwned` %a %j #$HOME; -x"));
 
 TEST_F(Farm, RefusesPathsThatNoScriptCanHold) {
     for (const char* const name : {"two\nlines", "quoted \" name", "back\\slash"}) {
