@@ -4,7 +4,9 @@
 #include "host/recording/FrameNames.h"
 
 #include <cerrno>
+#include <cstdint>
 #include <fcntl.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 namespace quarn {
@@ -39,22 +41,46 @@ std::optional<std::string> ownerOf(const fs::path& file) {
     return std::string(reinterpret_cast<const char*>(bytes.data()), bytes.size());
 }
 
-/// A claim that names nobody was made by a program that was killed in that moment, or on a disk
-/// that is full.
-bool isHeld(const std::string& owner, const FrameClaim::Claimer& claimer) {
-    return !owner.empty() && owner.find('/') == owner.npos && claimer.is_alive(owner);
+/// The time of the disk of a file's last change of any kind; that of its content is kept by links.
+std::optional<std::int64_t> changeSecondsOf(const fs::path& file) {
+    struct stat status {};
+    return stat(file.c_str(), &status) == 0 ? std::optional<std::int64_t>(status.st_ctim.tv_sec)
+                                            : std::nullopt;
 }
 
-/// Moves a claim aside that nobody holds any more. Another program may have done so in the same
-/// moment, and made its own: what was moved is looked at, and goes back where it is that one.
+/// Whether a file was changed longer ago than anything here takes.
+bool isOld(const fs::path& file, const FrameClaim::Claimer& claimer) {
+    constexpr std::int64_t LONGEST_MOMENT_S = 10;
+    (void)utimensat(AT_FDCWD, claimer.journal.c_str(), nullptr, 0);
+    const auto now_s = changeSecondsOf(claimer.journal);
+    const auto changed_s = changeSecondsOf(file);
+    return now_s && changed_s && *now_s - *changed_s > LONGEST_MOMENT_S;
+}
+
+/// A claim that names nobody is being made this moment, or was made by a program that was killed
+/// then.
+bool isHeld(const fs::path& file, const std::string& owner, const FrameClaim::Claimer& claimer) {
+    if (owner.empty())
+        return !isOld(file, claimer);
+    return owner.find('/') == owner.npos && claimer.is_alive(owner);
+}
+
+/// Removes a claim that nobody holds any more. Many may want to at once, and one of them may have
+/// made its own in that place already: the one whose link is made looks at what it has linked, and
+/// alone may remove it.
 void removeDead(const fs::path& file, const std::string& owner,
                 const FrameClaim::Claimer& claimer) {
-    const fs::path aside = claimer.journal.native() + ".aside";
-    if (rename(file.c_str(), aside.c_str()) != 0)
+    const fs::path mark = file.native() + ".dead";
+    if (link(file.c_str(), mark.c_str()) != 0) {
+        if (errno == EEXIST && isOld(mark, claimer))
+            unlink(mark.c_str()); // who made it was killed then
+        else if (errno != EEXIST && errno != ENOENT)
+            unlink(file.c_str()); // the disk has no links: then two may meet for once
         return;
-    if (ownerOf(aside) != owner)
-        (void)link(aside.c_str(), file.c_str());
-    unlink(aside.c_str());
+    }
+    if (ownerOf(mark) == owner)
+        unlink(file.c_str());
+    unlink(mark.c_str());
 }
 
 } // namespace
@@ -69,7 +95,7 @@ std::optional<FrameClaim> FrameClaim::take(const fs::path& file, const Claimer& 
         const auto owner = ownerOf(file);
         if (!owner)
             continue;
-        if (isHeld(*owner, claimer))
+        if (isHeld(file, *owner, claimer))
             return std::nullopt;
         removeDead(file, *owner, claimer);
     }

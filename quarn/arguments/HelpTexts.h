@@ -64,6 +64,7 @@ The model is framed so that it fills the pictures well during the whole turn. Th
 named NAME000, NAME001, ... and NAME.html plays them in a browser. NAME.recording beside them says
 which files are the recording's: others are not replaced without --overwrite. Without --out they
 stand in a folder beside the model that has its name; one that holds files of yours is left alone.
+The same command given again keeps the pictures that are there and whole, and makes the others.
 
 Examples:
   quarn turntable house.glb

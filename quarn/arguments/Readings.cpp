@@ -2,6 +2,7 @@
 
 #include "host/session/InstructionSets.h"
 #include "host/session/MemorySize.h"
+#include "host/session/RecordingCheck.h"
 
 #include <algorithm>
 
@@ -127,6 +128,8 @@ Reading<FrameRanges> frameRanges() {
         FrameRangesReading reading = readFrameRanges(option, word);
         if (!reading.refusal.empty())
             return Refusal{reading.refusal};
+        if (const auto refusal = whyFramesAreRefused(word))
+            return Refusal{option + ": " + *refusal};
         return std::move(reading.ranges);
     };
 }

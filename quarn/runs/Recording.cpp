@@ -19,8 +19,9 @@ std::optional<Outcome> refuse(const RecordingRequest& request, bool overwrites) 
         return Outcome::failure(request.folder.native() +
                                 " is there already, and nothing was recorded into it; choose the "
                                 "folder for the pictures with --out.");
-    const RecordingTarget target{request.folder, request.name, request.format, request.frames,
-                                 overwrites};
+    constexpr bool MAY_GO_ON = true; // with frames that another one makes of the same recording
+    const RecordingTarget target{request.folder, request.name, request.format,
+                                 request.frames, overwrites,   MAY_GO_ON};
     if (const auto refusal = whyRecordingIsRefused(target))
         return Outcome::failure(*refusal);
     return refuseFilm(request.film, request.folder, overwrites);

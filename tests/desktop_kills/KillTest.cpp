@@ -37,8 +37,10 @@ void expectNothingIsLost(TypedWork& work, TypedWork::Clock::time_point killed_at
     const int kept = work.doneUntil(killed_at - LONGEST_LOSS);
     const int in_file = objectsIn(work.file()).value_or(0);
     const std::string bytes = readFile(work.file());
+    const bool is_recoverable = work.isRecoverable();
     const Ended again = work.recover(OPTIONS);
     EXPECT_EQ(again.exit_code, 0) << again.err;
+    EXPECT_EQ(work.wasOffered(), is_recoverable);
     EXPECT_EQ(readFile(work.file()), bytes);
     const int offered = work.wasOffered() ? objectsIn(work.recovered()).value_or(-1) : in_file;
     EXPECT_GE(offered, kept);
@@ -46,10 +48,12 @@ void expectNothingIsLost(TypedWork& work, TypedWork::Clock::time_point killed_at
     EXPECT_LE(offered, work.begun());
 }
 
-/// A window, and when it is killed.
+/// A window, and when it is killed: at that moment, or at the next when unsaved work is kept. Each
+/// save lets go what was kept, so that at a random moment there often is nothing.
 struct Life {
     std::unique_ptr<TypedWork> work = std::make_unique<TypedWork>();
     TypedWork::Clock::time_point end;
+    bool ends_at_once = true;
 };
 
 std::vector<Life> begin(int count, std::mt19937& random) {
@@ -59,6 +63,8 @@ std::vector<Life> begin(int count, std::mt19937& random) {
         life.work->begin(OPTIONS);
         life.end = TypedWork::Clock::now() + std::chrono::milliseconds(life_ms(random));
     }
+    for (std::size_t i = 0; i < lives.size(); i += 2)
+        lives[i].ends_at_once = false;
     std::ranges::sort(lives, {}, &Life::end);
     return lives;
 }
@@ -66,6 +72,7 @@ std::vector<Life> begin(int count, std::mt19937& random) {
 void kill(std::vector<Life>& lives) {
     for (Life& life : lives) {
         std::this_thread::sleep_until(life.end);
+        EXPECT_TRUE(life.ends_at_once || life.work->holdWhereUnsavedWorkIsKept());
         life.end = TypedWork::Clock::now();
         life.work->kill();
     }
@@ -83,7 +90,7 @@ TEST(KilledWindow, LosesAtMostTheLastBeatsAndNeverTheFile) {
             times_offered += life.work->wasOffered();
         }
     }
-    EXPECT_GE(times_offered, kills() / 5) << "hardly anything was unsaved when it was killed";
+    EXPECT_GE(times_offered, kills() / 2) << "hardly anything was unsaved when it was killed";
 }
 
 } // namespace

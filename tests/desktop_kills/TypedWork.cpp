@@ -2,9 +2,11 @@
 
 #include "host/front_end/ScriptedFrontEnd.h"
 #include "host/session/DocumentState.h"
+#include "host/session/Recovery.h"
 #include "host/session/Session.h"
 
 #include <algorithm>
+#include <functional>
 #include <sstream>
 #include <stdexcept>
 
@@ -48,9 +50,36 @@ Ended TypedWork::stop(int signal) {
     return m_program->wait();
 }
 
+/// What is looked at while it works may have changed when it is killed.
+bool TypedWork::holdWhereUnsavedWorkIsKept() {
+    return m_program->waitUntil([this] {
+        m_program->sendSignal(SIGSTOP);
+        if (keepsUnsavedWork())
+            return true;
+        m_program->sendSignal(SIGCONT);
+        return false;
+    });
+}
+
+bool TypedWork::keepsUnsavedWork() const {
+    namespace fs = std::filesystem;
+    std::error_code gone;
+    const fs::file_time_type saved_at = fs::last_write_time(file(), gone);
+    for (const auto& entry : fs::directory_iterator(folder()))
+        if (entry.path().extension() == ".recovery")
+            return entry.last_write_time(gone) > saved_at;
+    return false;
+}
+
+bool TypedWork::isRecoverable() const {
+    return std::ranges::any_of(recoverableDocuments({.state_folder = stateFolder()}),
+                               std::not_fn(fileIsNewer));
+}
+
 Ended TypedWork::recover(const std::vector<std::string>& options) {
     Start again = start(options);
-    again.environment["QUARN_TYPIST_RECOVERS"] = "1";
+    const bool is_there = !recoverableDocuments({.state_folder = stateFolder()}).empty();
+    again.environment["QUARN_TYPIST_RECOVERS"] = is_there ? "something" : "nothing";
     return run(again);
 }
 

@@ -23,6 +23,9 @@ public:
     /// Starts the program and waits until the first point is made.
     void begin(const std::vector<std::string>& options);
     void kill() { stop(SIGKILL); }
+    /// Lets it stand still at a moment when its recovery file is newer than the document's own.
+    /// @return false where there was no such moment for as long as tests wait
+    bool holdWhereUnsavedWorkIsKept();
     /// Sends it a signal and waits until it has ended.
     Ended stop(int signal);
     /// Starts the program again and takes the recovery that it offers.
@@ -36,6 +39,9 @@ public:
     /// Whether it was killed while it saved.
     bool isSaving() const { return last("saving") > saved() || !has("saved"); }
     bool wasOffered() const { return has("offered"); }
+    /// Whether the next start has unsaved work to offer that is not older than its file. Of a
+    /// program that has ended.
+    bool isRecoverable() const;
 
     std::filesystem::path file() const { return folder() / "work.quarn"; }
     std::filesystem::path savedCopy() const { return folder() / "saved.quarn"; }
@@ -53,6 +59,8 @@ private:
     std::vector<Note> notes() const;
     bool has(const std::string& what) const;
     int last(const std::string& what) const;
+    /// Whether its recovery file is newer than the document's own.
+    bool keepsUnsavedWork() const;
 
     TempFolder m_home;
     std::unique_ptr<RunningProgram> m_program;

@@ -109,7 +109,7 @@ const Room FLOORS[] = {
     {11, "quarn/terminal/", {"quarn/words/"}},
     {11, "quarn/session/", BELOW_SESSIONS},
     {11, "quarn/scripts/", PROGRAM + "quarn/words/"},
-    {11, "quarn/runs/", BELOW_RUNS},
+    {11, "quarn/runs/", BELOW_RUNS + "quarn/terminal/"},
     {11, "quarn/reports/", BELOW_RUNS},
     {11, "quarn/console/",
      BELOW_SESSIONS + "quarn/session/" + "ground/AtomicFile.h" + "ground/Result.h"},

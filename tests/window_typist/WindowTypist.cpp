@@ -14,23 +14,26 @@ namespace {
 
 constexpr int BETWEEN_LINES_MS = 15;
 constexpr int POINTS_BETWEEN_SAVES = 40;
-/// After which no offer comes any more.
+/// How long a window is there before nothing that should not be offered is offered any more.
 constexpr int LONGEST_WAIT_FOR_OFFER_MS = 500;
+
+/// What it does.
+enum class Task { work, recover, find_nothing };
 
 /// Types command lines as a person does, one after the other, and writes down in a journal what it
 /// begins and what is done: whoever kills the program reads there what was there to be lost.
 ///
 /// It makes points and saves now and then, to `work.quarn` in its folder, with a copy of each saved
-/// file beside it; or it takes the recovery that is offered, saves it as `recovered.quarn` and ends
-/// the program.
+/// file beside it. Or it waits until a recovery is offered, takes it, saves it as `recovered.quarn`
+/// and ends the program; where there should be none it ends the program after a while without.
 class WindowTypist final : public QObject {
 public:
-    WindowTypist(const QString& folder, bool recovers)
-        : m_folder(folder), m_journal(folder + "/journal"), m_recovers(recovers) {
+    WindowTypist(const QString& folder, Task task)
+        : m_folder(folder), m_journal(folder + "/journal"), m_task(task) {
         m_journal.open(QIODevice::WriteOnly | QIODevice::Append | QIODevice::Unbuffered);
-        connect(&m_timer, &QTimer::timeout, this, [this] { m_recovers ? recover() : work(); });
+        connect(&m_timer, &QTimer::timeout, this,
+                [this] { m_task == Task::work ? work() : recover(); });
         m_timer.start(BETWEEN_LINES_MS);
-        m_clock.start();
     }
 
 private:
@@ -63,9 +66,16 @@ private:
             take(*dialog);
             type("_-SaveAs \"" + m_folder + "/recovered.quarn\"");
             type("_-Exit");
-        } else if (!m_is_typing && m_clock.elapsed() > LONGEST_WAIT_FOR_OFFER_MS) {
-            type("_-Exit");
+        } else if (!m_is_typing && m_task == Task::find_nothing && commandLine()) {
+            endAfterAWhile();
         }
+    }
+
+    void endAfterAWhile() {
+        if (!m_clock.isValid())
+            m_clock.start();
+        else if (m_clock.elapsed() > LONGEST_WAIT_FOR_OFFER_MS)
+            type("_-Exit");
     }
 
     /// A person takes nothing that says it is older than the file.
@@ -77,12 +87,17 @@ private:
         dialog.findChild<QAbstractButton*>(is_older ? "later" : "recover")->click();
     }
 
-    /// @return whether there was a line to type into
-    bool type(const QString& line) {
-        QLineEdit* edit = nullptr;
+    /// Null while there is no window.
+    static QLineEdit* commandLine() {
         for (QWidget* const window : QApplication::topLevelWidgets())
             if (window->objectName() == "mainWindow")
-                edit = window->findChild<QLineEdit*>("commandLine");
+                return window->findChild<QLineEdit*>("commandLine");
+        return nullptr;
+    }
+
+    /// @return whether there was a line to type into
+    bool type(const QString& line) {
+        QLineEdit* const edit = commandLine();
         if (!edit)
             return false;
         m_is_typing = true;
@@ -103,15 +118,15 @@ private:
 
     QString m_folder;
     QFile m_journal;
-    bool m_recovers;
+    Task m_task;
     QTimer m_timer;
-    QElapsedTimer m_clock;
+    QElapsedTimer m_clock; ///< since there is a window
     int m_points = 0;
     bool m_is_typing = false;
 };
 
-/// Loaded by way of QT_QPA_GENERIC_PLUGINS, with `QUARN_TYPIST_FOLDER` and, where it takes a
-/// recovery, `QUARN_TYPIST_RECOVERS`.
+/// Loaded by way of QT_QPA_GENERIC_PLUGINS, with `QUARN_TYPIST_FOLDER` and, where it does not work,
+/// `QUARN_TYPIST_RECOVERS`: "nothing" or something.
 class WindowTypistPlugin final : public QGenericPlugin {
     Q_OBJECT
     Q_PLUGIN_METADATA(IID QGenericPluginFactoryInterface_iid FILE "typist.json")
@@ -121,7 +136,10 @@ public:
         const QString folder = qEnvironmentVariable("QUARN_TYPIST_FOLDER");
         if (folder.isEmpty())
             return nullptr;
-        return new WindowTypist(folder, qEnvironmentVariableIsSet("QUARN_TYPIST_RECOVERS"));
+        const QString recovers = qEnvironmentVariable("QUARN_TYPIST_RECOVERS");
+        return new WindowTypist(folder, recovers.isEmpty()      ? Task::work
+                                        : recovers == "nothing" ? Task::find_nothing
+                                                                : Task::recover);
     }
 };
 

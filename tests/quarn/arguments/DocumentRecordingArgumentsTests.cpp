@@ -44,6 +44,7 @@ TEST(RecordArguments, RangesThatAreNoneAreRefusedByName) {
     expectMisuse(record({"--frames", "0-9:0"}), "a step is at least 1");
     expectMisuse(record({"--frames", "all"}), "not \"all\"");
     expectMisuse(record({"--frames", "0-99999999999"}), "too large");
+    expectMisuse(record({"--frames", "0-10000000"}), "--frames: \"0-10000000\" is no range");
 }
 
 TEST(RecordArguments, FolderAndDocumentMustBeNamed) {

@@ -51,10 +51,10 @@ TEST(OutputFolder, ThatTakesNoFilesIsTold) {
     EXPECT_THAT(ended.err, HasSubstr("cannot write into the output folder /proc/self"));
 }
 
-/// The page, and the file that tells of the recording.
+/// The page, and the files that tell of the recording.
 bool isBesidePictures(const std::string& name) {
     return name.ends_with(".html") || name.ends_with(".recording") ||
-           name.ends_with(".frames.json");
+           name.ends_with(".frames.json") || name.ends_with(".journal");
 }
 
 /// Every picture that is there is whole, and no half of a file stands beside them.
@@ -160,14 +160,15 @@ TEST(FullDisk, IsToldWithTheNumberOfPicturesThatFitted) {
 
 TEST(FullDisk, FormerPicturesOfTheSameNameStayWhole) {
     const Studio studio;
-    const auto record = [&](unsigned long largest_file) {
-        Start start = studio.turntable(2, {"--format", "bmp", "--size", "160x120"});
+    const auto record = [&](const char* elevation, unsigned long largest_file) {
+        Start start =
+            studio.turntable(2, {"--format", "bmp", "--size", "160x120", "--elevation", elevation});
         start.largest_file = largest_file;
         return run(start);
     };
-    ASSERT_EQ(record(0).exit_code, 0);
+    ASSERT_EQ(record("20", 0).exit_code, 0);
     const std::string before = readFile(studio / "out/house000.bmp");
-    EXPECT_EQ(record(50000).exit_code, 1);
+    EXPECT_EQ(record("50", 50000).exit_code, 1);
     EXPECT_EQ(readFile(studio / "out/house000.bmp"), before);
 }
 

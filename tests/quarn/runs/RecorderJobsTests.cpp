@@ -1,6 +1,7 @@
 #include "quarn/runs/FolderInstructions.h"
 #include "quarn/runs/OtherRecorders.h"
 #include "quarn/runs/RecorderJobs.h"
+#include "tests/quarn/Terminal.h"
 #include "tests/quarn/runs/RecordedDocument.h"
 
 #include <csignal>
@@ -99,6 +100,20 @@ TEST_F(RecorderJobs, EndWithTheProgramThatAPersonStops) {
     EXPECT_THAT(ended.err, HasSubstr("after " + std::to_string(made) + " of"));
     const Ended again = run(house.record("out", {"--jobs", "2"}));
     EXPECT_THAT(again.out, HasSubstr("(" + std::to_string(made) + " of them were there already)"));
+}
+
+/// The terminal sends Ctrl-C to the whole group of processes: recorders are in groups of their own,
+/// and what ends them is the one signal that is passed on.
+TEST_F(RecorderJobs, EndTheirFramesAtACtrlCOnATerminal) {
+    house.save("house.quarn", FRAMES, "3000 2000"); // frames that take longer than the passing on
+    Terminal terminal(house.record("out", {"--jobs", "2"}));
+    ASSERT_TRUE(terminal.shows("of 60"));
+    terminal.type(CTRL_C);
+    const Ended ended = terminal.end();
+    EXPECT_EQ(ended.exit_code, 130);
+    EXPECT_THAT(terminal.screen(), HasSubstr("The same command goes on where it stopped."));
+    for (const std::string& name : filesIn(house / "out"))
+        EXPECT_FALSE(name.ends_with(".claim")) << name;
 }
 
 TEST_F(RecorderJobs, OnATerminalShowOneLineOfAll) {

@@ -148,6 +148,21 @@ TEST_F(RepeatedRecording, OfAnotherIsMadeAnewUnlessTheFirstIsToGoOn) {
     EXPECT_EQ(house.recorded("out"), files);
 }
 
+TEST_F(RepeatedRecording, IsSharedWithAnotherProgramThatGoesOnWithItToo) {
+    std::vector<std::string> arguments = {"turntable", "house.obj", "--size",   "320x240",
+                                          "--out",     "out",       "--frames", "60"};
+    const auto end_of = [&](std::vector<std::string> more) {
+        more.insert(more.begin(), arguments.begin(), arguments.end());
+        return house.start(more);
+    };
+    RunningProgram first(end_of({"--resume"}));
+    ASSERT_TRUE(first.waitUntil([&] { return house.picturesIn("out") >= 2; }));
+    const Ended second = run(end_of({}));
+    EXPECT_EQ(second.exit_code, 0) << second.err;
+    EXPECT_EQ(first.wait().exit_code, 0);
+    EXPECT_EQ(house.recorded("out").size(), 62U);
+}
+
 TEST_F(RepeatedRecording, HasItsKeptFramesInTheFilmToo) {
     ASSERT_EQ(turntable({"--video", "first.gif"}).exit_code, 0);
     std::filesystem::remove(house / "out/house003.jpg");

@@ -1,11 +1,29 @@
 #include "tests/host/share/film/FilmStudio.h"
 
+#include <fstream>
 #include <gmock/gmock.h>
+#include <thread>
+#include <unistd.h>
 
 namespace quarn::test {
 namespace {
 
 using testing::HasSubstr;
+
+/// What a thread may still do that has encoded its frame.
+constexpr std::uint64_t FALLING_ASLEEP_NS = 500'000;
+
+/// For how many nanoseconds all threads of this process but the calling one have run.
+std::uint64_t workOfOtherThreads() {
+    std::uint64_t sum_ns = 0;
+    for (const auto& thread : std::filesystem::directory_iterator("/proc/self/task")) {
+        std::uint64_t work_ns = 0;
+        std::ifstream(thread.path() / "schedstat") >> work_ns;
+        if (thread.path().filename() != std::to_string(gettid()))
+            sum_ns += work_ns;
+    }
+    return sum_ns;
+}
 
 class EachKindOfFilm : public testing::TestWithParam<std::string> {
 protected:
@@ -88,6 +106,18 @@ TEST_P(EachKindOfFilm, LeavesNothingBehindWhereNotAllOfItIsMade) {
         EXPECT_EQ(m_studio.fileCount(), 1); // under another name
     }
     EXPECT_EQ(m_studio.fileCount(), 0);
+}
+
+TEST_P(EachKindOfFilm, IsEncodedBetweenItsFramesWhereNoThreadMayWorkBesideThem) {
+    FilmMaking making({m_studio.wish(name()), 20, RATE, 0}, m_studio.frontEnd());
+    for (int frame = 0; frame < 3; ++frame) {
+        ASSERT_TRUE(making.add(pictureOf(640, 360, frame), ""));
+        const std::uint64_t work_ns = workOfOtherThreads();
+        std::this_thread::sleep_for(std::chrono::milliseconds(20));
+        EXPECT_LT(workOfOtherThreads() - work_ns, FALLING_ASLEEP_NS) << frame;
+    }
+    ASSERT_TRUE(making.finish());
+    EXPECT_EQ(decodeFilm(m_studio / name()).frames.size(), 3U);
 }
 
 TEST_P(EachKindOfFilm, OfFramesOfSeveralSizesIsRefused) {
