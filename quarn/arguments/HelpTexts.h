@@ -17,8 +17,9 @@ inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
   quarn record DOC --out DIR                   record a saved animation, or a part of it with
                                                --frames RANGES; goes on where it was stopped
   quarn finish DIR                             make what such a recording lacks, then its page
-  quarn farm submit DOC --out DIR              have a cluster record it; quarn farm status DIR tells
-                                               how far it is, quarn farm cancel DIR ends it
+  quarn farm submit DOC --out DIR              have a cluster record it
+  quarn farm status DIR                        tell how far it is
+  quarn farm cancel DIR                        end it; its frames stay
   quarn video FOLDER FILE                      make a film of recorded pictures: .mp4, .webm, .gif,
                                                .webp or .apng
   quarn places [TEXT]                          list the cities that a sun study knows by name
@@ -168,7 +169,9 @@ The cluster runs Slurm, and all its nodes see the document and the folder under 
 docs/farm.md tells more, and how other schedulers do it. quarn farm submit --help tells the options.
 
 Examples:
-  quarn farm submit house.quarn --out out/farm --frame-time 20 --dry-run)";
+  quarn farm submit house.quarn --out out/farm
+  quarn farm status out/farm
+  quarn farm cancel out/farm)";
 
 inline constexpr const char* SUBMIT_FOOTER = R"(
 One frame is drawn here to see what it takes, and the frames that are missing are shared out to the

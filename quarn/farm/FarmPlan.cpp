@@ -2,8 +2,9 @@
 
 #include "host/session/AnimationState.h"
 #include "host/session/RecordingProgress.h"
+#include "quarn/farm/FarmRecord.h"
 #include "quarn/farm/FrameMeasure.h"
-#include "quarn/session/Interruption.h"
+#include "quarn/farm/SlurmCommands.h"
 #include "quarn/session/RecordingText.h"
 #include "quarn/terminal/FramePace.h"
 
@@ -36,22 +37,70 @@ std::variant<StoredAnimation, Outcome> readAnimation(const FarmRequest& request,
 }
 
 /// What the folder holds of the animation.
-RecordingProgressResult recordedSoFar(const FarmRequest& request, const std::string& name) {
-    const auto file = request.folder / (name + ".recording");
-    if (!std::filesystem::exists(file))
-        return {.progress = {}, .trouble = "nothing was recorded"};
-    return recordingProgress(file);
-}
+struct FoundFrames {
+    RecordingProgress recorded; ///< where there is one
+    bool are_there = false;     ///< there is a recording, whole or not
+    std::vector<int> missing;
+};
 
 bool isOther(const RecordingProgress& recorded, const RecordingProgress& wanted) {
     return recorded.document_mark != wanted.document_mark ||
            recorded.settings_mark != wanted.settings_mark;
 }
 
+/// Two arrays that record the same frames would only wait for each other.
+std::optional<std::string> whyStillAtWork(const FarmRequest& request, const std::string& name) {
+    const FarmFiles files(request.folder, name);
+    if (!std::filesystem::exists(files.record))
+        return std::nullopt;
+    const auto record = readFarmRecord(files.record);
+    if (!record)
+        return record.message();
+    const auto jobs = slurmJobs(record.value().ids());
+    if (!jobs)
+        return jobs.message();
+    for (const SlurmJob& job : jobs.value())
+        if (job.isLive())
+            return "job " + job.id + " still records " + record.value().name + " into " +
+                   request.folder.native() +
+                   "; quarn farm status with this folder tells how far it is, and quarn farm "
+                   "cancel ends it.";
+    return std::nullopt;
+}
+
 std::vector<int> allFrames(int count) {
     std::vector<int> frames(static_cast<std::size_t>(count));
     std::iota(frames.begin(), frames.end(), 0);
     return frames;
+}
+
+FoundFrames foundFrames(const FarmRequest& request, const StoredAnimation& animation) {
+    const auto file = request.folder / (animation.name + ".recording");
+    const auto none = FoundFrames{{}, false, allFrames(animation.frames)};
+    if (!std::filesystem::exists(file))
+        return none;
+    const RecordingProgressResult recorded = recordingProgress(file);
+    if (!recorded.trouble.empty())
+        return none; // the tasks will see what is wrong with it
+    return {recorded.progress, true, recorded.progress.missing};
+}
+
+/// Draws a frame, which tells its cost and whether the folder's frames are of the same recording.
+/// @param begins_anew  whether none of these can stay
+/// @return how the program ends where nothing can be submitted
+std::optional<Outcome> measure(const FarmRequest& request, const StoredAnimation& animation,
+                               const FoundFrames& found, FrameCost& cost, bool& begins_anew) {
+    const auto measured = measureFrame(request, animation.frames / 2);
+    if (const Outcome* const trouble = std::get_if<Outcome>(&measured))
+        return *trouble;
+    const auto& frame = std::get<MeasuredFrame>(measured);
+    cost = frame.cost;
+    begins_anew = found.are_there && isOther(found.recorded, frame.recording);
+    if (!begins_anew || request.overwrites)
+        return std::nullopt;
+    return Outcome::failure(request.folder.native() + " holds " + animation.name +
+                            " as the document or a setting was before it changed; give "
+                            "--overwrite to record it anew, or another --out.");
 }
 
 Outcome nothingMissing(const RecordingProgress& recorded, const FarmRequest& request) {
@@ -100,29 +149,21 @@ std::variant<FarmPlan, Outcome> planFarm(const FarmRequest& request, const Commo
     if (const Outcome* const trouble = std::get_if<Outcome>(&read))
         return *trouble;
     const auto& animation = std::get<StoredAnimation>(read);
-    const RecordingProgressResult recorded = recordedSoFar(request, animation.name);
-    const bool is_there = recorded.trouble.empty();
+    if (!request.is_only_shown)
+        if (const auto refusal = whyStillAtWork(request, animation.name))
+            return Outcome::failure(*refusal);
+    const FoundFrames found = foundFrames(request, animation);
+    if (found.missing.empty() && !request.overwrites)
+        return nothingMissing(found.recorded, request);
     FarmPlan plan{.name = animation.name, .frames = animation.frames};
     plan.cost.frame_s = request.frame_s.value_or(0.0);
-    if (is_there && recorded.progress.missing.empty() && !request.overwrites)
-        return nothingMissing(recorded.progress, request);
-    bool begins_anew = !is_there || request.overwrites;
-    if (isMeasured(request)) {
-        const auto measured = measureFrame(
-            request, begins_anew ? animation.frames / 2 : recorded.progress.missing.front());
-        if (const Outcome* const trouble = std::get_if<Outcome>(&measured))
+    // Without a frame of now nobody knows whether those in the folder are of another recording.
+    bool begins_anew = request.overwrites;
+    if (isMeasured(request))
+        if (const auto trouble = measure(request, animation, found, plan.cost, begins_anew))
             return *trouble;
-        const auto& frame = std::get<MeasuredFrame>(measured);
-        const bool is_other = is_there && isOther(recorded.progress, frame.recording);
-        if (is_other && !request.overwrites)
-            return Outcome::failure(request.folder.native() + " holds " + animation.name +
-                                    " as the document or a setting was before it changed; give "
-                                    "--overwrite to record it anew, or another --out.");
-        begins_anew = !is_there || is_other;
-        plan.cost = frame.cost;
-    }
-    const auto missing = begins_anew ? allFrames(animation.frames) : recorded.progress.missing;
-    return missing.empty() ? nothingMissing(recorded.progress, request)
+    const auto missing = begins_anew ? allFrames(animation.frames) : found.missing;
+    return missing.empty() ? nothingMissing(found.recorded, request)
                            : shared(plan, missing, request, limits);
 }
 

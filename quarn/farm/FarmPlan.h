@@ -20,7 +20,8 @@ struct FarmPlan {
 /// Reads the document, looks what its folder holds, and shares out the frames that are missing.
 /// Draws one of them where nobody says how long it takes.
 /// @return how the program ends where nothing is to be submitted: there is no animation, all frames
-///         are there, the folder holds another recording, the time is too short
+///         are there or still recorded, the folder holds another recording, the time is too
+///         short
 std::variant<FarmPlan, Outcome> planFarm(const FarmRequest& request, const CommonOptions& common,
                                          const SlurmLimits& limits);
 

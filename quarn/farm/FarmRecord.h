@@ -23,11 +23,11 @@ struct FarmRecord {
     std::string document;
     std::string submitted; ///< when, in UTC
     int frames = 0;        ///< of the animation
-    FrameCost cost;
+    FrameCost cost{};
     std::vector<std::string> chunks{}; ///< their frames, as --frames takes them
     std::vector<SubmittedArray> arrays{};
-    std::string finish_id{};          ///< empty: it was not submitted
-    std::vector<std::string> command; ///< that submitted the first array
+    std::string finish_id{};            ///< empty: it was not submitted
+    std::vector<std::string> command{}; ///< that submitted the first array
 
     /// Of all jobs, the last one first: what waits for others goes before them.
     std::vector<std::string> ids() const;

@@ -65,6 +65,10 @@ bool FarmStatus::goesOn() const {
     return std::ranges::any_of(recorded.progress.writers, &RecordingWriter::is_alive);
 }
 
+bool FarmStatus::isDone() const {
+    return isFinished() && (tasks.empty() || tasks.back().stage != FarmTask::Stage::died);
+}
+
 int FarmStatus::framesLost() const {
     const std::set<int> missing = missingFrames(record, recorded);
     int lost = 0;
@@ -94,7 +98,7 @@ Outcome tellFarmStatus(const Path& folder, StatusForm form) {
         return Outcome::failure(status.message());
     const std::string text =
         form == StatusForm::json ? statusJson(status.value()) : statusText(status.value());
-    const bool is_well = status.value().isFinished() || status.value().goesOn();
+    const bool is_well = status.value().goesOn() || status.value().isDone();
     return {is_well ? Outcome::done : Outcome::failed, text};
 }
 
@@ -115,8 +119,8 @@ Outcome cancelFarm(const Path& folder) {
         recorded.trouble.empty()
             ? recorded.progress.frames - static_cast<int>(recorded.progress.missing.size())
             : 0;
-    return Outcome::success("Cancelled. " + frameCountText(there) + " of " +
-                            std::to_string(record.value().frames) + (there == 1 ? " is" : " are") +
+    return Outcome::success("Cancelled. " + std::to_string(there) + " of " +
+                            frameCountText(record.value().frames) + (there == 1 ? " is" : " are") +
                             " there and stay; quarn farm submit goes on with the others.");
 }
 

@@ -17,6 +17,8 @@ struct FarmStatus {
 
     int count(FarmTask::Stage stage) const;
     bool isFinished() const { return recorded.progress.is_finished; }
+    /// Whether what the last job makes of the frames is there, too, as far as can be told.
+    bool isDone() const;
     /// Whether anything still waits or runs.
     bool goesOn() const;
     /// Frames of tasks that died, that are not there.

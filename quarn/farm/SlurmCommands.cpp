@@ -103,6 +103,8 @@ Words followingWords(const JobOptions& options, const Words& ids, const std::str
 }
 
 std::string logPattern(const std::string& folder, const std::string& file) {
+    if (folder.find('\\') != std::string::npos)
+        return "/dev/null"; // Slurm takes it for an escape, and replaces nothing any more
     std::string pattern;
     for (const char c : folder)
         pattern += c == '%' ? std::string("%%") : std::string(1, c);

@@ -33,6 +33,7 @@ std::vector<std::string> followingWords(const JobOptions& options,
                                         const std::vector<std::string>& rest);
 
 /// A file of a folder as the pattern of a log's name, in which Slurm replaces what is behind "%".
+/// In a folder whose path holds a backslash it can have no such logs: there they go nowhere.
 /// @param file  a pattern
 std::string logPattern(const std::string& folder, const std::string& file);
 

@@ -115,7 +115,7 @@ TimeParts timeParts(const std::string& time) {
     const bool has_days = hyphen != std::string::npos;
     const auto clock = split(has_days ? time.substr(hyphen + 1) : time, ':');
     const auto part = [&](std::size_t i) { return i < clock.size() ? clock[i] : "0"; };
-    if (clock.size() > 3 || clock.empty())
+    if (clock.size() > 3 || clock.empty() || time.ends_with(':'))
         return {};
     if (has_days)
         return {time.substr(0, hyphen), part(0), part(1), part(2)};

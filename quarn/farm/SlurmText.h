@@ -10,12 +10,12 @@ namespace quarn::program {
 
 /// A job, or a task of an array, as the controller tells of it.
 struct SlurmJob {
-    std::string id;         ///< of the array, or of a job that is none
-    std::vector<int> tasks; ///< of the array: one, or all that wait together; empty: it is none
-    std::string state;      ///< "RUNNING", "NODE_FAIL", ...
-    std::string reason;     ///< "None", "NonZeroExitCode", "Resources", ...
-    std::string node;       ///< empty: none yet
-    std::string exit_code;  ///< "1:0": the code, and the signal
+    std::string id;           ///< of the array, or of a job that is none
+    std::vector<int> tasks{}; ///< of the array: one, or all that wait together; empty: it is none
+    std::string state{};      ///< "RUNNING", "NODE_FAIL", ...
+    std::string reason{};     ///< "None", "NonZeroExitCode", "Resources", ...
+    std::string node{};       ///< empty: none yet
+    std::string exit_code{};  ///< "1:0": the code, and the signal
     int restarts = 0;
 
     /// Whether it waits, runs, or is about to wait again.

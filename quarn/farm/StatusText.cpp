@@ -51,7 +51,7 @@ std::string tasksText(const FarmStatus& status) {
     std::string text = counted(status.count(Stage::running), "run, ") +
                        std::to_string(status.count(Stage::waiting)) + " wait, " +
                        std::to_string(status.count(Stage::done)) + " are done, " +
-                       std::to_string(status.count(Stage::died)) + " died";
+                       std::to_string(status.count(Stage::died)) + " ended early";
     if (const double left = status.secondsLeft(); left > 0.0)
         text += "; about " + timeText(left) + " left";
     return text + ".\n";
@@ -92,7 +92,7 @@ std::string deathsText(const FarmStatus& status) {
         for (const std::string& end : task.former)
             former.push_back(taskText(task) + " " + end);
     }
-    return told("Died", died) + told("Died and were started again", former);
+    return told("Ended early", died) + told("Ended early and were started again", former);
 }
 
 std::string waitingText(const FarmStatus& status) {
@@ -107,11 +107,12 @@ std::string waitingText(const FarmStatus& status) {
 }
 
 std::string endText(const FarmStatus& status) {
-    if (status.isFinished() || status.goesOn())
+    if (status.isDone() || status.goesOn())
         return "";
     if (!status.slurm_trouble.empty())
         return "Whether anything goes on is not known.\n";
-    return "Nothing goes on: quarn farm submit records what is missing.\n";
+    return status.isFinished() ? "Not all that was to be made of the frames is there.\n"
+                               : "Nothing goes on: quarn farm submit records what is missing.\n";
 }
 
 const char* stageName(Stage stage) {
@@ -156,7 +157,7 @@ std::string statusText(const FarmStatus& status) {
             "Slurm does not answer: " + status.slurm_trouble + " This is what the folder tells.\n";
     text += tasksText(status) + nodesText(status) + deathsText(status) + waitingText(status);
     if (const int lost = status.framesLost(); lost > 0)
-        text += frameCountText(lost) + " of tasks that died " + (lost == 1 ? "is" : "are") +
+        text += frameCountText(lost) + " of tasks that ended early " + (lost == 1 ? "is" : "are") +
                 " missing.\n";
     return text + endText(status);
 }

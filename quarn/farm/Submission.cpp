@@ -130,33 +130,10 @@ Result<void> submitAll(const Commands& commands, const FarmFiles& files, FarmRec
     return taken;
 }
 
-/// Two arrays that record the same frames would only wait for each other.
-std::optional<std::string> whyStillAtWork(const FarmFiles& files, const FarmRequest& request) {
-    if (!std::filesystem::exists(files.record))
-        return std::nullopt;
-    const auto record = readFarmRecord(files.record);
-    if (!record)
-        return record.message();
-    const auto jobs = slurmJobs(record.value().ids());
-    if (!jobs)
-        return jobs.message();
-    for (const SlurmJob& job : jobs.value())
-        if (job.isLive())
-            return "job " + job.id + " still records " + record.value().name + " into " +
-                   request.folder.native() +
-                   "; quarn farm status with this folder tells how far it is, and quarn farm "
-                   "cancel ends it.";
-    return std::nullopt;
-}
-
 std::optional<std::string> whyRefused(const FarmRequest& request) {
     std::error_code error;
     if (!std::filesystem::is_regular_file(request.document, error))
         return "there is no document " + request.document.native() + ".";
-    // It takes what follows for a pattern's escape, and says nothing.
-    if (request.folder.native().find('\\') != std::string::npos)
-        return "Slurm cannot write logs into a folder whose path holds a backslash: " +
-               request.folder.native() + "; choose another one with --out.";
     const FilmRequest& film = request.film;
     if (!film.file.empty())
         if (const auto refusal =
@@ -172,8 +149,6 @@ std::optional<std::string> whyRefused(const FarmRequest& request) {
 
 Outcome submit(const FarmPlan& plan, const FarmRequest& request, const Commands& commands,
                const FarmFiles& files, const std::string& script) {
-    if (const auto refusal = whyStillAtWork(files, request))
-        return Outcome::failure(*refusal);
     if (isInterruptionRequested())
         return stopped("Stopped before anything was submitted.");
     FarmRecord record{.name = plan.name,

@@ -10,8 +10,8 @@ namespace quarn::program {
 /// One start of a task, as the task's own log tells of it.
 struct TaskAttempt {
     std::string node;
-    std::optional<int> exit_code; ///< nothing: it runs, or it ended without a word
-    std::string words;            ///< why it ended: what quarn or Slurm wrote last, or nothing
+    std::optional<int> exit_code{}; ///< nothing: it runs, or it ended without a word
+    std::string words{};            ///< why it ended: what quarn or Slurm wrote last, or nothing
 };
 
 /// Reads what the job script, quarn and Slurm wrote into the log of a task.

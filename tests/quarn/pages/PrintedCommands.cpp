@@ -42,20 +42,33 @@ std::vector<std::string> inlineCode(const std::string& source) {
 
 } // namespace
 
+namespace {
+
+/// "submit" behind "farm", and not what a person chooses, such as "MODEL".
+bool isWord(const std::string& text) {
+    return std::ranges::all_of(text, [](char c) { return c >= 'a' && c <= 'z'; });
+}
+
+} // namespace
+
 std::vector<std::string> subcommands() {
     std::vector<std::string> names;
     for (const std::string& line : linesOf(run(std::vector<std::string>{}).err)) {
         const std::vector<std::string> words = shellWords(line);
         if (words.size() > 1 && words[0] == "quarn" && !words[1].starts_with('-') &&
             words[1] != "COMMAND")
-            names.push_back(words[1]);
+            names.push_back(words.size() > 2 && isWord(words[2]) ? words[1] + " " + words[2]
+                                                                 : words[1]);
     }
     return names;
 }
 
 std::string helpOf(const std::string& subcommand) {
-    return subcommand.empty() ? run({"--help"}).out + run(std::vector<std::string>{}).err
-                              : run({subcommand, "--help"}).out;
+    if (subcommand.empty())
+        return run({"--help"}).out + run(std::vector<std::string>{}).err;
+    std::vector<std::string> words = shellWords(subcommand);
+    words.push_back("--help");
+    return run(words).out;
 }
 
 std::vector<std::string> pages() {
@@ -70,7 +83,9 @@ std::string printedText(const std::string& source) {
     const std::vector<std::string> words = shellWords(source);
     if (words.front() != "quarn")
         return readFile(ROOT / source);
-    return helpOf(words[1] == "--help" ? "" : words[1]);
+    const std::size_t start = source.find(' ') + 1;
+    const std::size_t end = source.find("--help");
+    return helpOf(end <= start ? "" : source.substr(start, end - start - 1));
 }
 
 std::vector<std::string> commandLines(const std::string& source,

@@ -38,8 +38,9 @@ const std::map<std::string, std::string> CHOSEN = {
     {"--to DATE", "2026-06-28"}, {"--frames N", "2"},           {"--number K", "1"},
     {"--out DIR", "out"},        {"--out FILE", "a.png"},       {"MODEL", "town.obj"},
     {"[MODEL]", "town.obj"},     {"DOC", "house.quarn"},        {"SCRIPT", "steps.txt"},
-    {"DIR", "frames"},           {"--frames RANGES", "0-1"},    {"[TEXT]", "greece"},
-    {"FOLDER", "frames"},        {"FILE", "film.mp4"},
+    {"status DIR", "out"},       {"cancel DIR", "out"},         {"DIR", "frames"},
+    {"--frames RANGES", "0-1"},  {"[TEXT]", "greece"},          {"FOLDER", "frames"},
+    {"FILE", "film.mp4"},
 };
 
 /// The words after the program's name, with words of a person's put in; a synopsis in help goes on
@@ -63,6 +64,8 @@ Words argumentsIn(const std::string& line) {
 /// Whether a line says no more than what a command is called.
 bool isNameAlone(const Words& arguments) {
     static const std::set<std::string> complete = {"places", "console", "--help", "--version"};
+    if (arguments.size() == 2 && arguments[0] == "farm")
+        return true;
     return arguments.empty() || (arguments.size() == 1 && !complete.contains(arguments[0])) ||
            arguments.back() == "...";
 }
@@ -201,6 +204,7 @@ TEST(PrintedOptions, AreThoseOfSomeProgram) {
     std::set<std::string> known = {"--preset", "--build", // of cmake
                                    "--run-script",        // of the window
                                    "--gtest"};            // of the test programs
+    known.insert({"--sshloginfile", "--joblog"});         // of GNU parallel
     for (const std::string& command : subcommands()) {
         const std::string help = helpOf(command);
         // An option is told behind the heading; what the texts below name must be one.

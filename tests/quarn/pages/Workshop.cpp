@@ -58,6 +58,7 @@ Workshop::Workshop() {
     writeDocuments();
     std::filesystem::create_directory(m_folder / "out"); // as a script needs it
     writeFrames();
+    writeCluster();
 }
 
 Ended Workshop::run(const std::vector<std::string>& arguments, const std::string& input) const {
@@ -65,7 +66,8 @@ Ended Workshop::run(const std::vector<std::string>& arguments, const std::string
     start.folder = m_folder.path();
     start.arguments = arguments;
     start.input = input;
-    start.environment = {{"XDG_STATE_HOME", (m_folder / "state").native()}};
+    start.environment = {{"XDG_STATE_HOME", (m_folder / "state").native()},
+                         {"PATH", (m_folder / "bin").native() + ":/usr/bin:/bin"}};
     return test::run(start);
 }
 
@@ -103,6 +105,21 @@ void Workshop::writeDocuments() const {
               "_-Point _Name Fountain 1,1,1\n_-SaveAs town.quarn\n");
     const Ended ended = run({"run", "documents.txt", "house.obj"});
     EXPECT_EQ(ended.exit_code, 0) << ended.err;
+}
+
+void Workshop::writeCluster() const {
+    std::filesystem::create_directory(m_folder / "bin");
+    const std::string cancelled = (m_folder / "cancelled").native();
+    const auto write = [&](const char* name, const std::string& text) {
+        writeFile(m_folder / "bin" / name, "#!/bin/sh\n" + text);
+        std::filesystem::permissions(m_folder / "bin" / name, std::filesystem::perms::owner_all);
+    };
+    write("sbatch", "rm -f '" + cancelled + "'\necho 12\n");
+    write("squeue", "");
+    write("scancel", "touch '" + cancelled + "'\n");
+    write("scontrol", "[ \"$2\" = config ] && exit\n[ ! -f '" + cancelled +
+                          "' ] && echo JobId=$4 JobState=PENDING Reason=Resources && exit\n"
+                          "echo Invalid job id specified >&2\nexit 1\n");
 }
 
 void Workshop::writeFrames() const {

@@ -22,7 +22,8 @@ private:
     void writeModels() const;
     void writeCurves() const;
     void writeDocuments() const;
-    void writeFrames() const; ///< two of a recording, in the folder frames
+    void writeCluster() const; ///< commands of one that takes jobs and runs none
+    void writeFrames() const;  ///< two of a recording, in the folder frames
 
     TempFolder m_folder;
 };
