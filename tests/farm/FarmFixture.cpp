@@ -8,11 +8,6 @@ namespace {
 
 namespace fs = std::filesystem;
 
-void endAllJobs() {
-    slurm({"scancel", "--me"});
-    EXPECT_TRUE(waitUntilAllJobsEnded(30)) << slurm({"squeue"});
-}
-
 bool isLost(const std::string& node) {
     const std::string state =
         slurm({"sinfo", "--noheader", "--Node", "--nodes=" + node, "--format=%T"});
@@ -27,9 +22,15 @@ void Farm::SetUp() {
 }
 
 void Farm::TearDown() {
-    endAllJobs();
-    for (const std::string& node : nodes()) {
+    bringClusterBack();
+    for (const std::string& node : nodes())
         setEnvironmentOf(node, "");
+}
+
+void Farm::bringClusterBack() {
+    slurm({"scancel", "--me"});
+    EXPECT_TRUE(waitUntilAllJobsEnded(30)) << slurm({"squeue"});
+    for (const std::string& node : nodes()) {
         if (isLost(node))
             cluster("start-node", node);
     }

@@ -14,6 +14,8 @@ protected:
     void SetUp() override;
     void TearDown() override;
 
+    /// Ends all jobs, and starts the nodes again that take none.
+    static void bringClusterBack();
     /// `quarn farm submit` of a document into the folder, with more options.
     Ended submit(const std::filesystem::path& document,
                  std::vector<std::string> options = {}) const;

@@ -33,9 +33,7 @@ TEST_F(LongFarm, IsSubmittedAgainWhereTheControllerForgotIt) {
     EXPECT_TRUE(waitUntil(60, [] {
         return slurm({"squeue", "--noheader", "--states=RUNNING"}).empty();
     })) << slurm({"squeue"});
-    slurm({"scancel", "--me"});
-    ASSERT_TRUE(waitUntilAllJobsEnded(30)) << slurm({"squeue"});
-    cluster("resume-nodes");
+    bringClusterBack();
 
     const Ended again = submit(house.document, {"--tasks", "6"});
     ASSERT_EQ(again.exit_code, 0) << again.err;
