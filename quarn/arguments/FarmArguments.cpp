@@ -120,8 +120,7 @@ Action addSubmit(CLI::App& command) {
     addViewer(command, request.viewer);
     addRecordingFilm(command, request.film, FilmTimes::perhaps);
     command.add_flag("--overwrite", asked->common.overwrites,
-                     "Make all frames anew where the folder holds another recording, in place of "
-                     "files of others too");
+                     "Make all frames anew, whatever is there; the first one is made here");
     command.add_flag("--dry-run", request.is_only_shown,
                      "Print the job script and the commands that would submit it, and do nothing");
     return [asked] { return submitAsked(*asked); };

@@ -86,17 +86,15 @@ FoundFrames foundFrames(const FarmRequest& request, const StoredAnimation& anima
 }
 
 /// Draws a frame, which tells its cost and whether the folder's frames are of the same recording.
-/// @param begins_anew  whether none of these can stay
 /// @return how the program ends where nothing can be submitted
 std::optional<Outcome> measure(const FarmRequest& request, const StoredAnimation& animation,
-                               const FoundFrames& found, FrameCost& cost, bool& begins_anew) {
+                               const FoundFrames& found, FrameCost& cost) {
     const auto measured = measureFrame(request, animation.frames / 2);
     if (const Outcome* const trouble = std::get_if<Outcome>(&measured))
         return *trouble;
     const auto& frame = std::get<MeasuredFrame>(measured);
     cost = frame.cost;
-    begins_anew = found.are_there && isOther(found.recorded, frame.recording);
-    if (!begins_anew || request.overwrites)
+    if (request.overwrites || !found.are_there || !isOther(found.recorded, frame.recording))
         return std::nullopt;
     return Outcome::failure(request.folder.native() + " holds " + animation.name +
                             " as the document or a setting was before it changed; give "
@@ -157,14 +155,11 @@ std::variant<FarmPlan, Outcome> planFarm(const FarmRequest& request, const Commo
         return nothingMissing(found.recorded, request);
     FarmPlan plan{.name = animation.name, .frames = animation.frames};
     plan.cost.frame_s = request.frame_s.value_or(0.0);
-    // Without a frame of now nobody knows whether those in the folder are of another recording.
-    bool begins_anew = request.overwrites;
     if (isMeasured(request))
-        if (const auto trouble = measure(request, animation, found, plan.cost, begins_anew))
+        if (const auto trouble = measure(request, animation, found, plan.cost))
             return *trouble;
-    const auto missing = begins_anew ? allFrames(animation.frames) : found.missing;
-    return missing.empty() ? nothingMissing(found.recorded, request)
-                           : shared(plan, missing, request, limits);
+    return shared(plan, request.overwrites ? allFrames(animation.frames) : found.missing, request,
+                  limits);
 }
 
 std::string planText(const FarmPlan& plan, const FarmRequest& request) {

@@ -5,6 +5,7 @@
 #include "quarn/session/Interruption.h"
 
 #include <cstdlib>
+#include <optional>
 
 namespace quarn::program {
 
@@ -60,6 +61,17 @@ std::string lastWords(std::string text) {
     return start == std::string::npos ? text : text.substr(start + OWN_START.size());
 }
 
+/// @return how the program ends where the frame cannot be drawn
+std::optional<Outcome> draw(const std::vector<std::string>& words, int frame) {
+    const ProgramEnd end = runProgram(words);
+    if (isInterruptionRequested())
+        return stopped("Stopped before anything was submitted.");
+    if (end.ok())
+        return std::nullopt;
+    return Outcome::failure("frame " + std::to_string(frame) +
+                            " cannot be recorded, so nothing was submitted: " + lastWords(end.err));
+}
+
 FrameCost costOf(const RecordingProgress& recording) {
     for (const RecordingWriter& writer : recording.writers)
         if (writer.frames > 0)
@@ -79,19 +91,20 @@ std::variant<MeasuredFrame, Outcome> measureFrame(const FarmRequest& request, in
     if (folder.path().empty())
         return Outcome::failure("cannot make a folder for temporary files to measure a frame; give "
                                 "the time of one with --frame-time.");
-    const ProgramEnd end = runProgram(words(request, frame, folder.path()));
-    if (isInterruptionRequested())
-        return stopped("Stopped before anything was submitted.");
-    if (!end.ok())
-        return Outcome::failure(
-            "frame " + std::to_string(frame) +
-            " cannot be recorded, so nothing was submitted: " + lastWords(end.err));
+    if (const auto trouble = draw(words(request, frame, folder.path()), frame))
+        return *trouble;
     const RecordingProgressResult recorded = recordingProgress(folder.path());
     MeasuredFrame measured{costOf(recorded.progress), recorded.progress};
     if (measured.cost.frame_s <= 0.0)
         return Outcome::failure("one frame was recorded, but how long it took is not known; give "
                                 "the time of one with --frame-time.");
     return measured;
+}
+
+std::optional<Outcome> beginAnew(const FarmRequest& request) {
+    std::vector<std::string> all = words(request, 0, request.folder);
+    all.push_back("--overwrite");
+    return draw(all, 0);
 }
 
 } // namespace quarn::program

@@ -39,8 +39,6 @@ std::vector<std::string> recordOptions(const FarmRequest& request) {
     std::vector<std::string> words;
     if (!request.instructions.empty())
         words.insert(words.end(), {"--instructions", request.instructions});
-    if (request.overwrites)
-        words.insert(words.end(), {"--resume", "--overwrite"}); // anew, but each task's work once
     return words;
 }
 

@@ -159,6 +159,9 @@ Outcome submit(const FarmPlan& plan, const FarmRequest& request, const Commands&
                       .command = commands.array(commands.arrays().front())};
     for (const std::vector<int>& frames : plan.chunks)
         record.chunks.push_back(rangesText(frames));
+    if (request.overwrites)
+        if (const auto trouble = beginAnew(request))
+            return *trouble;
     if (const auto written = writeScript(files, script); !written)
         return Outcome::failure(written.message());
     if (const auto submitted = submitAll(commands, files, record); !submitted)

@@ -301,6 +301,8 @@ TEST_F(FarmCommand, RefusesAChangedDocumentUnlessItMayOverwrite) {
     const Ended taken = submit({"--overwrite"});
     EXPECT_EQ(taken.exit_code, 0) << taken.err;
     EXPECT_THAT(taken.out, HasSubstr("6 frames of 6 are missing"));
+    EXPECT_TRUE(readFile(m_studio / "out/house000.jpg") ==
+                readFile(m_studio / "tall/house000.jpg"));
     const Ended made = runJob(m_studio / "out/house.farm.sh", {"frames", "0"}, "0");
     EXPECT_EQ(made.exit_code, 0) << made.out << made.err;
     EXPECT_TRUE(readFile(m_studio / "out/house005.jpg") ==

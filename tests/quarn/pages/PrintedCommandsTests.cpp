@@ -38,7 +38,7 @@ const std::map<std::string, std::string> CHOSEN = {
     {"--to DATE", "2026-06-28"}, {"--frames N", "2"},           {"--number K", "1"},
     {"--out DIR", "out"},        {"--out FILE", "a.png"},       {"MODEL", "town.obj"},
     {"[MODEL]", "town.obj"},     {"DOC", "house.quarn"},        {"SCRIPT", "steps.txt"},
-    {"status DIR", "out"},       {"cancel DIR", "out"},         {"DIR", "frames"},
+    {"status DIR", "farmed"},    {"cancel DIR", "farmed"},      {"DIR", "frames"},
     {"--frames RANGES", "0-1"},  {"[TEXT]", "greece"},          {"FOLDER", "frames"},
     {"FILE", "film.mp4"},
 };

@@ -116,6 +116,11 @@ void Workshop::writeCluster() const {
     };
     write("sbatch", "rm -f '" + cancelled + "'\necho 12\n");
     write("squeue", "");
+    std::filesystem::create_directory(m_folder / "farmed");
+    writeFile(m_folder / "farmed/house.farm.json",
+              R"({"name": "house", "document": "house.quarn", "submitted": "", "frames": 2,)"
+              R"("frame_seconds": 1, "loading_seconds": 1, "chunks": ["0-1"], "command": [],)"
+              R"("arrays": [{"id": "12", "first": 0, "tasks": 1}], "finish": "13"})");
     write("scancel", "touch '" + cancelled + "'\n");
     write("scontrol", "[ \"$2\" = config ] && exit\n[ ! -f '" + cancelled +
                           "' ] && echo JobId=$4 JobState=PENDING Reason=Resources && exit\n"

@@ -22,7 +22,7 @@ private:
     void writeModels() const;
     void writeCurves() const;
     void writeDocuments() const;
-    void writeCluster() const; ///< commands of one that takes jobs and runs none
+    void writeCluster() const; ///< commands of one that takes jobs and runs none, and such jobs
     void writeFrames() const;  ///< two of a recording, in the folder frames
 
     TempFolder m_folder;
