@@ -132,12 +132,13 @@ Result<void> RunningRecording::start() {
         is_known ? whyAnotherRecording(*read.value(), m_file, m_place.folder) : std::nullopt;
     const bool may_go_on = m_plan.choice.begin != RecordingBegin::anew;
     const bool goes_on = may_go_on && is_known && !difference;
+    // First: others that are refused for the same reason stand in the folder for a moment too.
+    if (m_plan.choice.begin == RecordingBegin::resume && difference)
+        return Error{*difference};
     // Without that file nobody has begun: whoever has a journal waits for this one.
     if (is_known && (!goes_on || !read.value()->is_shared))
         if (const auto other = otherWriter())
             return isRecorded(m_place, *other);
-    if (m_plan.choice.begin == RecordingBegin::resume && difference)
-        return Error{*difference};
     if (!goes_on)
         return startAnew();
     join(std::move(*read.value()));
