@@ -1,13 +1,12 @@
 #include "host/app/AnimationFingerprint.h"
 
 #include "engine/display/InstructionSet.h"
-#include "engine/images/ImageFile.h"
 #include "ground/Checksum.h"
-#include "host/app/Application.h"
 #include "host/document/Document.h"
 #include "host/document/DocumentDrawing.h"
 #include "host/document/DocumentScene.h"
 #include "host/document/SceneFingerprint.h"
+#include "host/recording/FramesManifest.h"
 
 namespace quarn {
 
@@ -48,9 +47,7 @@ std::string settingsMark(const KM_3dmAnimationProperties& record, const Recordin
     sum.add(settings.height_px);
     sum.addText(settings.mode);
     sum.addText(settings.extension);
-    sum.add(imageFormatFor(settings.extension) == ImageFormat::jpeg
-                ? Application::current()->jpegQuality()
-                : 0);
+    sum.add(settings.jpeg_quality);
     const RenderSettings& render = document.renderWindow().settings;
     sum.add(record.RenderFull() ? render.samples : 0);
     sum.add(record.RenderPreview() ? render.preview_samples : 0);
@@ -69,8 +66,7 @@ std::string settingsMark(const KM_3dmAnimationProperties& record, const Recordin
 RecordingFingerprint fingerprintOf(const KM_3dmAnimationProperties& record,
                                    const RecordingSettings& settings, Document& document) {
     return {"quarn " QUARN_VERSION, documentMark(document),
-            settingsMark(record, settings, document),
-            std::string(nameOf(instructionSetInForce()))};
+            settingsMark(record, settings, document), std::string(nameOf(instructionSetInForce()))};
 }
 
 } // namespace quarn

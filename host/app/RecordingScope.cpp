@@ -1,5 +1,6 @@
 #include "host/app/RecordingScope.h"
 
+#include "engine/images/ImageFile.h"
 #include "engine/scene/UnitLength.h"
 #include "host/app/AnimationFingerprint.h"
 #include "host/app/Application.h"
@@ -65,7 +66,8 @@ void takePictureSize(const KM_3dmAnimationProperties& record, Document& document
     }
 }
 
-RecordingSettings settingsOf(const KM_3dmAnimationProperties& record, Document& document) {
+RecordingSettings settingsOf(const KM_3dmAnimationProperties& record, Document& document,
+                             int jpeg_quality) {
     KM_wString extension = record.FileExtension();
     extension.Remove(L'.');
     RecordingSettings settings;
@@ -73,6 +75,8 @@ RecordingSettings settingsOf(const KM_3dmAnimationProperties& record, Document& 
     settings.frames = record.FrameCount();
     settings.mode = modeOf(record);
     settings.extension = extension.ToUtf8();
+    if (imageFormatFor(settings.extension) == ImageFormat::jpeg)
+        settings.jpeg_quality = jpeg_quality;
     takePictureSize(record, document, settings);
     return settings;
 }
@@ -81,7 +85,7 @@ RecordingPlan planOf(const KM_3dmAnimationProperties& record, Document& document
                      Application& application) {
     RecordingPlan plan;
     plan.animation = record.HtmlFilename().ToUtf8();
-    plan.settings = settingsOf(record, document);
+    plan.settings = settingsOf(record, document, application.jpegQuality());
     std::error_code error;
     if (!document.file().empty())
         plan.document = std::filesystem::absolute(document.file(), error);

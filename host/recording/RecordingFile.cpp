@@ -33,7 +33,8 @@ json jsonOf(const PicturesByExtension& pictures) {
 json jsonOf(const RecordingSettings& settings) {
     return {{"kind", settings.kind},         {"frames", settings.frames},
             {"width_px", settings.width_px}, {"height_px", settings.height_px},
-            {"mode", settings.mode},         {"extension", settings.extension}};
+            {"mode", settings.mode},         {"extension", settings.extension},
+            {"jpeg_quality", settings.jpeg_quality}};
 }
 
 json jsonOf(const RecordingFingerprint& fingerprint) {
@@ -90,7 +91,8 @@ RecordingSettings settingsOf(const json& object) {
             intOf(object.at("width_px")),
             intOf(object.at("height_px")),
             object.at("mode"),
-            object.at("extension")};
+            object.at("extension"),
+            object.contains("jpeg_quality") ? intOf(object["jpeg_quality"]) : 0};
 }
 
 RecordingFingerprint fingerprintOf(const json& object) {

@@ -22,6 +22,7 @@ struct RecordingSettings {
     int height_px = 0;
     std::string mode;      ///< English name of the display mode or the render method
     std::string extension; ///< of the pictures, without a point
+    int jpeg_quality = 0;  ///< 1 to 100; 0: not known, or no JPEG pictures
 
     friend bool operator==(const RecordingSettings&, const RecordingSettings&) = default;
 };

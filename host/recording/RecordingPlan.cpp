@@ -11,12 +11,14 @@ KM_wString wide(const std::string& text) {
     return KM_wString::FromUtf8(text);
 }
 
-/// "turntable, 72 frames, 1280x720, Rendered, jpg"
+/// "turntable, 72 frames, 1280x720, Rendered, jpg 90"
 KM_wString settingsText(const RecordingSettings& settings) {
     return KM_wString::FormatToString(
         QnLocalizeString(L"%s, %d frames, %dx%d, %s, %s", 42854), wide(settings.kind).Array(),
         settings.frames, settings.width_px, settings.height_px, wide(settings.mode).Array(),
-        wide(settings.extension).Array());
+        wide(settings.extension +
+             (settings.jpeg_quality > 0 ? " " + std::to_string(settings.jpeg_quality) : ""))
+            .Array());
 }
 
 KM_wString whatDiffers(const RecordingFile& there, const RecordingFile& own) {
@@ -29,8 +31,7 @@ KM_wString whatDiffers(const RecordingFile& there, const RecordingFile& own) {
     if (there.fingerprint.document != own.fingerprint.document)
         return QnLocalizeString(L"from another state of the document", 42857);
     if (there.fingerprint.settings != own.fingerprint.settings)
-        return QnLocalizeString(L"with another camera, path, sun, quality or number of samples",
-                                42858);
+        return QnLocalizeString(L"with another camera, path, sun or number of samples", 42858);
     return KM_wString::FormatToString(QnLocalizeString(L"by another program, %s", 42859),
                                       wide(there.fingerprint.program).Array());
 }
@@ -40,7 +41,7 @@ std::string ofOtherInstructions(const std::filesystem::path& folder, const Recor
     return KM_wString::FormatToString(
                QnLocalizeString(
                    L"%s in %s is drawn with the instruction set %s, and this program draws with "
-                   L"%s, whose pictures differ in their last bits. Start it with --instructions "
+                   L"%s, whose pictures differ in a few pixels. Start it with --instructions "
                    L"%s on a processor that has it, or begin anew with --overwrite.",
                    42860),
                wide(own.animation).Array(), textFromPath(folder).Array(),

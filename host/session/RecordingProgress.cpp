@@ -57,22 +57,29 @@ RecordingWriter writerOf(const JournalReader& journal, fs::file_time_type now) {
     return writer;
 }
 
-RecordingProgress progressOf(const fs::path& folder, const RecordingFile& file) {
-    KnownFrames known({folder, file.animation}, file.fingerprint);
-    known.refresh();
-    const std::set<std::string> names = namesIn(folder);
+RecordingProgress settingsOf(const RecordingFile& file) {
     RecordingProgress progress;
     progress.name = file.animation;
     progress.document = file.document;
     progress.frames = file.settings.frames;
+    progress.jpeg_quality = file.settings.jpeg_quality;
+    progress.instructions = file.fingerprint.instructions;
+    progress.document_mark = file.fingerprint.document;
+    progress.settings_mark = file.fingerprint.settings;
+    return progress;
+}
+
+/// Looks at all who record.
+void addFramesAndWriters(const fs::path& folder, const RecordingFile& file,
+                         RecordingProgress& progress) {
+    KnownFrames known({folder, file.animation}, file.fingerprint);
+    known.refresh();
+    const std::set<std::string> names = namesIn(folder);
     for (int number = 0; number < progress.frames; ++number) {
         const ManifestFrame* const frame = known.find(number);
         if (!frame || !names.contains(frame->file))
             progress.missing.push_back(number);
     }
-    progress.instructions = file.fingerprint.instructions;
-    progress.document_mark = file.fingerprint.document;
-    progress.settings_mark = file.fingerprint.settings;
     const auto now = timeOfDisk(folder);
     for (const JournalReader& journal : known.journals())
         if (journal.content().head.animation == file.animation)
@@ -80,28 +87,48 @@ RecordingProgress progressOf(const fs::path& folder, const RecordingFile& file) 
     progress.has_page = names.contains(pageName(file.animation));
     progress.is_finished = progress.missing.empty() && !file.is_running &&
                            names.contains(manifestName(file.animation));
-    return progress;
+}
+
+/// The recording of a folder, or the one that a file names.
+Result<RecordingFile> recordingOf(const fs::path& folder) {
+    const std::vector<fs::path> files = recordingFilesIn(folder);
+    if (files.size() > 1)
+        return Error{sentence(QnLocalizeString(L"%s holds several recordings. Name the file "
+                                               L"NAME.recording of one of them.",
+                                               42870),
+                              folder)};
+    const auto read =
+        files.empty() ? Result(std::optional<RecordingFile>()) : readRecordingFile(files.front());
+    if (!read)
+        return read.error();
+    if (!read.value())
+        return Error{sentence(QnLocalizeString(L"%s holds no recording.", 42869), folder)};
+    return *read.value();
+}
+
+fs::path folderOf(const fs::path& folder_or_file) {
+    std::error_code error;
+    if (!fs::is_regular_file(folder_or_file, error))
+        return folder_or_file;
+    return folder_or_file.has_parent_path() ? folder_or_file.parent_path() : ".";
 }
 
 } // namespace
 
+RecordingProgressResult recordingSettings(const fs::path& folder) {
+    const auto file = recordingOf(folder);
+    if (!file)
+        return {{}, file.message()};
+    return {settingsOf(file.value()), {}};
+}
+
 RecordingProgressResult recordingProgress(const fs::path& folder) {
-    const std::vector<fs::path> files = recordingFilesIn(folder);
-    if (files.empty())
-        return {{}, sentence(QnLocalizeString(L"%s holds no recording.", 42869), folder)};
-    if (files.size() > 1)
-        return {{},
-                sentence(QnLocalizeString(L"%s holds several recordings. Name the file "
-                                          L"NAME.recording of one of them.",
-                                          42870),
-                         folder)};
-    const auto read = readRecordingFile(files.front());
-    if (!read)
-        return {{}, read.message()};
-    if (!read.value())
-        return {{}, sentence(QnLocalizeString(L"%s holds no recording.", 42869), folder)};
-    const fs::path parent = files.front().parent_path();
-    return {progressOf(parent.empty() ? "." : parent, *read.value()), {}};
+    const auto file = recordingOf(folder);
+    if (!file)
+        return {{}, file.message()};
+    RecordingProgress progress = settingsOf(file.value());
+    addFramesAndWriters(folderOf(folder), file.value(), progress);
+    return {std::move(progress), {}};
 }
 
 } // namespace quarn

@@ -25,6 +25,7 @@ struct RecordingProgress {
     std::string name;               ///< of the animation, UTF-8
     std::filesystem::path document; ///< absolute path of the document; empty: not known
     int frames = 0;                 ///< of the whole animation
+    int jpeg_quality = 0;           ///< 1 to 100; 0: not known, or no JPEG pictures
     std::vector<int> missing;       ///< frames that nobody has recorded, in rising order, from 0
     std::string instructions;       ///< the instruction set that its pictures are drawn with
     std::string document_mark;      ///< fingerprint of the document, 16 hexadecimal digits
@@ -43,5 +44,9 @@ struct RecordingProgressResult {
 /// and the list of frames. Looks whether the frames' files are there, not whether they are whole.
 /// @param folder  or the file NAME.recording in it, where the folder holds several recordings
 QNCORE_API RecordingProgressResult recordingProgress(const std::filesystem::path& folder);
+
+/// The same without frames and writers, which takes a moment however many there are: no frame is
+/// missing then.
+QNCORE_API RecordingProgressResult recordingSettings(const std::filesystem::path& folder);
 
 } // namespace quarn

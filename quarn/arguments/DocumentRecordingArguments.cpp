@@ -23,7 +23,8 @@ struct AskedRecording {
 
 void addQuality(const OptionAdder& add, std::optional<int>& quality) {
     add("--quality", quality, "N", wholeNumberFrom(1, 100),
-        "Of jpg, 1 to 100: larger files look better (default: 90)");
+        "Of jpg, 1 to 100: larger files look better (default: that of the frames that are there, "
+        "else 90)");
 }
 
 /// @return what does not go together, or nothing

@@ -69,12 +69,16 @@ Outcome recordDocument(const DocumentRecordingRequest& request, int jobs, const 
     const auto start = std::chrono::steady_clock::now();
     watchForInterruption();
     CommonOptions common = use.common;
-    if (request.start != RecordingStartKind::anew)
+    DocumentRecordingRequest settled = request;
+    if (request.start != RecordingStartKind::anew) {
         if (const auto refusal = takeInstructionsOf(request.folder, common))
             return *refusal;
+        if (!settled.quality)
+            settled.quality = jpegQualityOf(request.folder);
+    }
     if (jobs > 1)
-        return recordWithJobs(request, jobs, common, start);
-    return recordHere(request, {.names_missing = true}, common, start);
+        return recordWithJobs(settled, jobs, common, start);
+    return recordHere(settled, {.names_missing = true}, common, start);
 }
 
 Outcome runRecorder(const DocumentRecordingRequest& request, const CommonOptions& common) {

@@ -46,7 +46,7 @@ Outcome finishRecording(const FinishRequest& request, const ScriptUse& use) {
     all.document = request.document;
     if (use.common.overwrites)
         all.start = RecordingStartKind::if_same;
-    all.quality = request.quality;
+    all.quality = request.quality ? request.quality : jpegQualityOf(request.recorded);
     all.film = request.film;
     all.viewer = request.viewer;
     const RecordingProgressResult found = recordingProgress(request.recorded);

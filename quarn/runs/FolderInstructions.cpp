@@ -17,7 +17,7 @@ std::optional<std::string> whyInstructionsLack(const std::filesystem::path& fold
         names += (names.empty() ? "" : ", ") + name;
     return "the recording in " + folder.native() + " is drawn with the instructions " + wanted +
            ", and this processor has " + names +
-           ": pictures of it would differ in their last bits. Record on a machine that has " +
+           ": pictures of it would differ in a few pixels. Record on a machine that has " +
            wanted + ", or begin anew with quarn record ... --overwrite.";
 }
 
@@ -25,11 +25,16 @@ std::optional<Outcome> takeInstructionsOf(const std::filesystem::path& folder,
                                           CommonOptions& common) {
     if (!common.instructions.empty())
         return std::nullopt;
-    const std::string wanted = recordingProgress(folder).progress.instructions;
+    const std::string wanted = recordingSettings(folder).progress.instructions;
     if (const auto lack = whyInstructionsLack(folder, wanted, instructionSets()))
         return Outcome::failure(*lack);
     common.instructions = wanted;
     return std::nullopt;
+}
+
+std::optional<int> jpegQualityOf(const std::filesystem::path& folder) {
+    const int quality = recordingSettings(folder).progress.jpeg_quality;
+    return quality > 0 ? std::optional(quality) : std::nullopt;
 }
 
 } // namespace quarn::program

@@ -23,4 +23,7 @@ std::optional<std::string> whyInstructionsLack(const std::filesystem::path& fold
 std::optional<Outcome> takeInstructionsOf(const std::filesystem::path& folder,
                                           CommonOptions& common);
 
+/// The quality of the JPEG pictures of the recording in the folder; nothing where it has none.
+std::optional<int> jpegQualityOf(const std::filesystem::path& folder);
+
 } // namespace quarn::program
