@@ -8,6 +8,7 @@
 #include "quarn/session/RecordingText.h"
 #include "quarn/terminal/FramePace.h"
 
+#include <algorithm>
 #include <numeric>
 
 namespace quarn::program {
@@ -164,14 +165,15 @@ std::variant<FarmPlan, Outcome> planFarm(const FarmRequest& request, const Commo
 
 std::string planText(const FarmPlan& plan, const FarmRequest& request) {
     const std::size_t tasks = plan.chunks.size();
+    const std::size_t most =
+        std::ranges::max_element(plan.chunks, {}, &std::vector<int>::size)->size();
     std::string text = costText(plan, request) + "\n" + frameCountText(plan.missing) + " of " +
                        std::to_string(plan.frames) + (plan.missing == 1 ? " is" : " are") +
                        " missing: " + std::to_string(tasks) + (tasks == 1 ? " task" : " tasks") +
-                       " of up to " + frameCountText(static_cast<int>(plan.chunks.front().size()));
+                       " of up to " + frameCountText(static_cast<int>(most));
     if (plan.cost.frame_s > 0.0)
         text += ", " +
-                timeText(plan.cost.loading_s +
-                         plan.cost.frame_s * static_cast<double>(plan.chunks.front().size())) +
+                timeText(plan.cost.loading_s + plan.cost.frame_s * static_cast<double>(most)) +
                 " each";
     return text + ".\n";
 }

@@ -34,6 +34,8 @@ std::string endText(const TaskAttempt& attempt) {
 
 /// "NODE_FAIL", "FAILED, NonZeroExitCode, quarn: ..."
 std::string reasonOf(const SlurmJob& job, const std::vector<TaskAttempt>& attempts) {
+    if (job.state == "CANCELLED")
+        return job.state; // what it waited for before explains nothing
     std::string text = job.state;
     if (!job.reason.empty() && job.reason != "None")
         text += ", " + job.reason;

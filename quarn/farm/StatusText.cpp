@@ -31,10 +31,6 @@ std::map<std::string, NodeWork> workOfNodes(const FarmStatus& status) {
     return nodes;
 }
 
-std::string counted(int count, const std::string& rest) {
-    return std::to_string(count) + (count == 1 ? " task " : " tasks ") + rest;
-}
-
 std::string framesText(const FarmStatus& status) {
     const int missing = static_cast<int>(status.recorded.progress.missing.size());
     if (!status.recorded.trouble.empty())
@@ -48,7 +44,8 @@ std::string framesText(const FarmStatus& status) {
 }
 
 std::string tasksText(const FarmStatus& status) {
-    std::string text = counted(status.count(Stage::running), "run, ") +
+    const int running = status.count(Stage::running);
+    std::string text = std::to_string(running) + (running == 1 ? " task runs, " : " tasks run, ") +
                        std::to_string(status.count(Stage::waiting)) + " wait, " +
                        std::to_string(status.count(Stage::done)) + " are done, " +
                        std::to_string(status.count(Stage::died)) + " ended early";

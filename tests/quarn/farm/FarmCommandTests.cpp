@@ -223,11 +223,13 @@ TEST_F(FarmCommand, PutsAStoppedTaskBackUnlessSlurmDoesSo) {
     EXPECT_THAT(calls("scontrol").back(), ElementsAre("scontrol", "requeue", "7_0"));
 
     // The recorder has been asked by Slurm itself then.
-    writeCommand("recorder", "kill -TERM $PPID\nsleep 0.3\nexit 143\n");
+    writeCommand("recorder",
+                 "trap 'touch \"$CALLS.term\"' TERM\nkill -TERM $PPID\nsleep 0.4\nexit 143\n");
     writeCommand("squeue", "echo COMPLETING\n");
     fs::remove(m_studio / "calls");
     EXPECT_EQ(runJob(script, {"frames", "0"}, "0").exit_code, 143);
     EXPECT_THAT(calls("scontrol"), IsEmpty());
+    EXPECT_FALSE(fs::exists(m_studio / "calls.term")) << "a second SIGTERM ends it in mid-frame";
 }
 
 // ---- Status and cancelling
