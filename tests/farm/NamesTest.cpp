@@ -18,7 +18,7 @@ constexpr int LARGEST_ARRAY = 9;
 
 TEST_F(Farm, TakesNamesAsTheyAreAndSplitsAnArrayThatIsLargerThanTheClusterAllows) {
     const House& house = quickHouse();
-    const fs::path place = m_place / "it's $(touch pwned) `touch pwned` %a %j #$HOME; -x";
+    const fs::path place = m_place / "it's $(touch pwned) `touch pwned` %a %j \\ #$HOME; -x";
     fs::create_directories(place);
     const fs::path document = place / "the house.quarn";
     fs::copy_file(house.document, document);
@@ -31,7 +31,7 @@ TEST_F(Farm, TakesNamesAsTheyAreAndSplitsAnArrayThatIsLargerThanTheClusterAllows
 }
 
 TEST_F(Farm, RefusesPathsThatNoScriptCanHold) {
-    for (const char* const name : {"two\nlines", "quoted \" name", "back\\slash"}) {
+    for (const char* const name : {"two\nlines", "quoted \" name"}) {
         const fs::path place = m_place / name;
         fs::create_directories(place);
         fs::copy_file(quickHouse().document, place / "house.quarn");
