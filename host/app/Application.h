@@ -97,6 +97,11 @@ public:
     const CDialog* openDialog() const { return m_open_dialog; }
     void setOpenDialog(const CDialog* dialog) { m_open_dialog = dialog; }
 
+    /// A wait that was cut short counts as waited: who looks at the clock would go on waiting.
+    void cutWaitShort(unsigned int milliseconds) { m_cut_waits_ms += milliseconds; }
+    /// By how much the clock of the interface runs ahead therefore.
+    unsigned int cutWaits() const { return m_cut_waits_ms; }
+
     void requestExit() { m_exit_requested = true; }
     void takeBackExit() { m_exit_requested = false; }
     bool isExitRequested() const { return m_exit_requested; }
@@ -120,6 +125,7 @@ private:
     std::map<HWND, std::unique_ptr<CWnd>> m_windows;
     const CDialog* m_open_dialog = nullptr;
     bool m_exit_requested = false;
+    unsigned int m_cut_waits_ms = 0; ///< goes round, as the clock does
     int m_jpeg_quality = STANDARD_JPEG_QUALITY;
     WithheldText* m_withheld_text = nullptr; ///< null while text is shown at once
 };

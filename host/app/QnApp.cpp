@@ -55,6 +55,8 @@ void CQuarnApp::Wait(unsigned int milliseconds) const {
     quarn::RunningRecording* const recording = application->recording();
     const bool has_nothing_to_show = recording && recording->hasPassedOver();
     application->frontEnd().pumpEvents(has_nothing_to_show ? 0 : milliseconds);
+    if (has_nothing_to_show)
+        application->cutWaitShort(milliseconds);
     if (recording)
         recording->beat();
 }

@@ -13,6 +13,8 @@ short GetAsyncKeyState(int virtual_key) {
 
 unsigned int GetTickCount() {
     const auto since_start = std::chrono::steady_clock::now().time_since_epoch();
-    return static_cast<unsigned int>(
+    const auto now = static_cast<unsigned int>(
         std::chrono::duration_cast<std::chrono::milliseconds>(since_start).count());
+    const quarn::Application* const application = quarn::Application::current();
+    return application ? now + application->cutWaits() : now;
 }
