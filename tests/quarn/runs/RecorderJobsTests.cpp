@@ -193,11 +193,10 @@ TEST(OtherRecorders, AreWaitedForLongerThanALeaseAndThanSlowFrames) {
 }
 
 TEST(FolderInstructions, ThatThisProcessorLacksAreToldWithThoseThatItHas) {
-    EXPECT_EQ(
-        program::whyInstructionsLack("out", "avx512", {"avx2", "sse2"}),
-        "the recording in out is drawn with the instructions avx512, and this processor has "
-        "avx2, sse2: pictures of it would differ in their last bits. Record on a machine that "
-        "has avx512, or begin anew with quarn record ... --overwrite.");
+    EXPECT_EQ(program::whyInstructionsLack("out", "avx512", {"avx2", "sse2"}),
+              "the recording in out is drawn with the instructions avx512, and this processor has "
+              "avx2, sse2: pictures of it would differ in a few pixels. Record on a machine that "
+              "has avx512, or begin anew with quarn record ... --overwrite.");
     EXPECT_EQ(program::whyInstructionsLack("out", "sse2", {"avx2", "sse2"}), std::nullopt);
     EXPECT_EQ(program::whyInstructionsLack("out", "", {"sse2"}), std::nullopt);
 }

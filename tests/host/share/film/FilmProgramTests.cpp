@@ -151,7 +151,7 @@ TEST_F(FilmProgram, ShowsAScriptThatMakesTheSameFilm) {
                                        "--width", "32", "--show-script"}));
     EXPECT_THAT(shown.out,
                 HasSubstr("_-Film _FrameRate 15 _Quality 90 _Width 32 _NextRecording \"a.mp4\"\n"
-                          "_-RecordAnimation "));
+                          "_-NextRecording _IfSame _Enter\n_-RecordAnimation "));
     writeFile(m_studio / "steps.txt", shown.out);
     fs::create_directory(m_studio / "out");
     Start start;
