@@ -49,8 +49,8 @@ public:
     /// could, and when no command runs.
     const std::string& unsavedPicture() const { return m_unsaved_picture; }
     void noteUnsavedPicture(std::string why) { m_unsaved_picture = std::move(why); }
-    /// Asks, while an animation is recorded, whether the pictures that are asked for now are wanted;
-    /// those that are not are left as they are and count as drawn. Null: all are wanted.
+    /// Asks, while an animation is recorded, whether the pictures that are asked for now are
+    /// wanted; those that are not are left as they are and count as drawn. Null: all are wanted.
     void setWantsPictures(std::function<bool()> wants) { m_wants_pictures = std::move(wants); }
     bool wantsPictures() const { return !m_wants_pictures || m_wants_pictures(); }
     /// Called when the outermost command has ended: closes every document but the active one, and

@@ -31,9 +31,12 @@ json jsonOf(const PicturesByExtension& pictures) {
 }
 
 json jsonOf(const RecordingSettings& settings) {
-    return {{"kind", settings.kind},         {"frames", settings.frames},
-            {"width_px", settings.width_px}, {"height_px", settings.height_px},
-            {"mode", settings.mode},         {"extension", settings.extension},
+    return {{"kind", settings.kind},
+            {"frames", settings.frames},
+            {"width_px", settings.width_px},
+            {"height_px", settings.height_px},
+            {"mode", settings.mode},
+            {"extension", settings.extension},
             {"jpeg_quality", settings.jpeg_quality}};
 }
 

@@ -17,8 +17,8 @@ std::optional<std::string> whyInstructionsLack(const std::filesystem::path& fold
         names += (names.empty() ? "" : ", ") + name;
     return "the recording in " + folder.native() + " is drawn with the instructions " + wanted +
            ", and this processor has " + names +
-           ": pictures of it would differ in a few pixels. Record on a machine that has " +
-           wanted + ", or begin anew with quarn record ... --overwrite.";
+           ": pictures of it would differ in a few pixels. Record on a machine that has " + wanted +
+           ", or begin anew with quarn record ... --overwrite.";
 }
 
 std::optional<Outcome> takeInstructionsOf(const std::filesystem::path& folder,
