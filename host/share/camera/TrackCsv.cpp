@@ -100,7 +100,8 @@ std::string lineOf(const CameraTrack& track, int frame) {
 } // namespace
 
 std::string trackCsv(const CameraTrack& track) {
-    std::string text = std::string(CAMERA_TABLE_START) + MORE_COLUMNS;
+    std::string text = CAMERA_TABLE_START;
+    text += MORE_COLUMNS;
     for (int frame = 0; frame < track.frameCount(); ++frame)
         text += lineOf(track, frame);
     return text;
