@@ -218,8 +218,8 @@ TEST_F(Farm, ATaskThatIsAskedToEndStopsBetweenFramesAndGoesOnLater) {
     const std::string job =
         slurm({"squeue", "--noheader", "--nodelist=" + task->node, "--format=%A"});
     slurm({"scancel", "--batch", "--signal=TERM", linesOf(job).front()});
-    ASSERT_TRUE(waitUntil(10, [&] { return kill(task->process, 0) != 0; })) << "it does not end";
-    EXPECT_TRUE(waitUntil(5, [] {
+    ASSERT_TRUE(waitUntil(60, [&] { return kill(task->process, 0) != 0; })) << "it does not end";
+    EXPECT_TRUE(waitUntil(20, [] {
         return slurm({"squeue", "--noheader", "--states=PENDING", "--format=%r"})
                    .find("BeginTime") != std::string::npos;
     })) << slurm({"squeue"});
