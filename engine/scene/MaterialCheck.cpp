@@ -71,8 +71,8 @@ private:
 
     /// What is too bright keeps its hue.
     void repairEmission() {
-        LinearColor& light = m_material.emission;
-        const LinearColor given = light;
+        LinearRgb& light = m_material.emission;
+        const LinearRgb given = light;
         for (float& channel : light)
             channel = std::isnan(channel)
                           ? 0.0F
@@ -145,8 +145,8 @@ private:
         note(is_other, name);
     }
 
-    void limit(LinearColor& color, const Limits& limits, float usual, const char* name) {
-        const LinearColor given = color;
+    void limit(LinearRgb& color, const Limits& limits, float usual, const char* name) {
+        const LinearRgb given = color;
         for (float& channel : color)
             channel = std::isnan(channel) ? usual : std::clamp(channel, limits.low, limits.high);
         note(color != given, name);
