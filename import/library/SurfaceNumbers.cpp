@@ -21,12 +21,20 @@ bool readMetalAndRoughness(const aiMaterial& source, Material& material) {
     return has_metalness || has_roughness;
 }
 
+/// The library fills in highlights and exponents where the file's way of shading has none.
+bool mayHaveHighlight(const aiMaterial& source) {
+    int shading = aiShadingMode_Phong;
+    source.Get(AI_MATKEY_SHADING_MODEL, shading);
+    return shading == aiShadingMode_Phong || shading == aiShadingMode_Blinn ||
+           shading == aiShadingMode_CookTorrance || shading == aiShadingMode_Fresnel;
+}
+
 void readHighlight(const aiMaterial& source, Material& material) {
     aiColor3D color(0.0F, 0.0F, 0.0F);
     float exponent = 0.0F;
     source.Get(AI_MATKEY_COLOR_SPECULAR, color);
     source.Get(AI_MATKEY_SHININESS, exponent);
-    if (color.IsBlack() || !(exponent > 0.0F))
+    if (!mayHaveHighlight(source) || color.IsBlack() || !(exponent > 0.0F))
         return;
     material.roughness = roughnessOfExponent(exponent);
     setHighlight(material, channelsOf(color));
