@@ -2,6 +2,7 @@
 
 #include "import/ModelTurn.h"
 #include "import/assembly/CameraPlacing.h"
+#include "import/assembly/MaterialPlacing.h"
 #include "import/assembly/MeshPlacing.h"
 
 #include <algorithm>
@@ -36,6 +37,7 @@ public:
           m_file_name(KM_wString::FromUtf8(reading.path.stem().string())) {}
 
     Result<ImportedModel> make() {
+        repairMaterials(m_scene);
         turnUp();
         for (SourcePlace& place : m_scene.places)
             place.world_from_mesh =
@@ -117,7 +119,9 @@ private:
         if (is_shared && !isFlattening(place.world_from_mesh)) {
             if (!std::exchange(use.is_complete, true))
                 completeMesh(*piece.mesh);
-            addObject({piece.mesh, piece.material, place.world_from_mesh}, name);
+            addObject({piece.mesh, m_materials.ofShared(piece.material, place.world_from_mesh),
+                       place.world_from_mesh},
+                      name);
             return;
         }
         const std::shared_ptr<KM_Mesh> mesh =
@@ -127,7 +131,9 @@ private:
         if (mesh->m_F.empty())
             return;
         completeMesh(*mesh);
-        addObject({mesh, piece.material, movedTo(m_origin)}, name);
+        addObject(
+            {mesh, m_materials.ofMoved(piece.material, place.world_from_mesh), movedTo(m_origin)},
+            name);
     }
 
     void addObject(PlacedMesh placed, const KM_wString& name) {
@@ -182,6 +188,7 @@ private:
     const ModelReading& m_reading;
     KM_wString m_file_name; ///< names what has no name of its own
     ImportedModel m_model;
+    PlacedMaterials m_materials;
     std::vector<Use> m_uses; ///< by mesh of the scene
     KM_3dPoint m_origin;     ///< where the coordinates of meshes that stand once begin
     std::uint64_t m_triangles = 0;

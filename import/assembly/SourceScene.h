@@ -24,8 +24,10 @@ struct SourceMesh {
     /// Where the mesh's coordinates begin in those of the file, for files whose numbers have more
     /// digits than single precision keeps.
     KM_3dPoint origin;
-    std::shared_ptr<const Material> material; ///< null: the default material
-    std::vector<KM_3dPointArray> lines;       ///< polylines of two points and more
+    /// Null: the default material. Its thickness is in units of the mesh, but its distance of
+    /// attenuation in those of the file's world. Its numbers may be any.
+    std::shared_ptr<const Material> material;
+    std::vector<KM_3dPointArray> lines; ///< polylines of two points and more
     KM_3dPointArray points;
 };
 

@@ -9,15 +9,24 @@ namespace quarn::gltf {
 
 namespace {
 
-constexpr std::array<std::string_view, 9> READ{"KHR_mesh_quantization",
-                                               "EXT_meshopt_compression",
-                                               "KHR_meshopt_compression",
-                                               "KHR_draco_mesh_compression",
-                                               "EXT_mesh_gpu_instancing",
-                                               "KHR_texture_transform",
-                                               "KHR_lights_punctual",
-                                               "KHR_materials_pbrSpecularGlossiness",
-                                               "CESIUM_RTC"};
+/// A material's sheen tells itself.
+constexpr std::array<std::string_view, 17> READ{"KHR_mesh_quantization",
+                                                "EXT_meshopt_compression",
+                                                "KHR_meshopt_compression",
+                                                "KHR_draco_mesh_compression",
+                                                "EXT_mesh_gpu_instancing",
+                                                "KHR_texture_transform",
+                                                "KHR_lights_punctual",
+                                                "KHR_materials_clearcoat",
+                                                "KHR_materials_emissive_strength",
+                                                "KHR_materials_ior",
+                                                "KHR_materials_pbrSpecularGlossiness",
+                                                "KHR_materials_sheen",
+                                                "KHR_materials_specular",
+                                                "KHR_materials_transmission",
+                                                "KHR_materials_unlit",
+                                                "KHR_materials_volume",
+                                                "CESIUM_RTC"};
 
 /// Textures in other formats tell themselves when they cannot be read.
 constexpr std::array<std::string_view, 3> TEXTURES{"EXT_texture_", "KHR_texture_", "MSFT_texture_"};

@@ -5,36 +5,11 @@
 
 #include <algorithm>
 #include <array>
-#include <cmath>
 #include <utility>
 
 namespace quarn::gltf {
 
 namespace {
-
-/// Khronos Group, glTF 2.0, section 5.26 (samplers).
-TextureWrap wrapOf(const Json& mode) {
-    constexpr std::uint64_t CLAMP = 33071;
-    constexpr std::uint64_t MIRROR = 33648;
-    const std::uint64_t value = wholeNumber(mode).value_or(0);
-    if (value == CLAMP)
-        return TextureWrap::clamp;
-    return value == MIRROR ? TextureWrap::mirror : TextureWrap::repeat;
-}
-
-/// The extension KHR_texture_transform scales coordinates, turns and moves them, with v running
-/// downward: 1 - v comes out.
-TexturePlace placeOf(const Json& transform) {
-    std::array<double, 2> offset{0.0, 0.0};
-    std::array<double, 2> scale{1.0, 1.0};
-    readNumbers(member(transform, "offset"), offset);
-    readNumbers(member(transform, "scale"), scale);
-    const double angle = number(member(transform, "rotation"), 0.0);
-    const double cosine = std::cos(angle);
-    const double sine = std::sin(angle);
-    return {{cosine * scale[0], sine * scale[1], offset[0]},
-            {sine * scale[0], -cosine * scale[1], 1.0 - offset[1]}};
-}
 
 KM_Color colorOf(const Json& factor) {
     std::array<double, 4> c{1.0, 1.0, 1.0, 1.0};
@@ -43,13 +18,15 @@ KM_Color colorOf(const Json& factor) {
                            static_cast<float>(c[2]), static_cast<float>(c[3]));
 }
 
-std::string nameOfImage(const Json& image, std::uint64_t index) {
-    const std::string uri = text(member(image, "uri"));
-    const std::string file = uri.starts_with("data:") ? std::string() : uri;
-    const std::string own = text(member(image, "name"));
-    const std::string number = "image " + std::to_string(index);
-    const std::string& name = file.empty() ? own : file;
-    return name.empty() ? number : name + " (" + number + ")";
+/// The first of some things, and how many more there are.
+std::string listOf(const std::vector<std::string>& things) {
+    constexpr std::size_t MOST_NAMED = 3;
+    std::string list;
+    for (std::size_t i = 0; i < std::min(MOST_NAMED, things.size()); ++i)
+        list += (i > 0 ? ", " : "") + things[i];
+    if (things.size() > MOST_NAMED)
+        list += " and " + std::to_string(things.size() - MOST_NAMED) + " more";
+    return list;
 }
 
 } // namespace
@@ -69,65 +46,34 @@ const ReadMaterial& Materials::at(const Json& which) {
 ReadMaterial Materials::read(const Json& json) {
     ReadMaterial result;
     result.material = std::make_shared<Material>();
-    Material& material = *result.material;
-    material.name = KM_wString::FromUtf8(text(member(json, "name")));
-    const Json& glossiness = extension(json, "KHR_materials_pbrSpecularGlossiness");
-    const Json& roughness = member(json, "pbrMetallicRoughness");
-    const bool is_glossy = !glossiness.is_null();
-    material.base_color = colorOf(is_glossy ? member(glossiness, "diffuseFactor")
-                                            : member(roughness, "baseColorFactor"));
-    readTexture(is_glossy ? member(glossiness, "diffuseTexture")
-                          : member(roughness, "baseColorTexture"),
-                result);
+    result.material->name = KM_wString::FromUtf8(text(member(json, "name")));
+    readSurface(json, *result.material);
+    readBaseColor(json, result);
     readAlpha(json, result);
+    for (const SurfaceTexture& texture : surfaceTextures(json, *result.material))
+        readTexture(texture, result);
+    const Json& glossiness = glossinessOf(json);
+    if (!glossiness.is_null() && !result.material->is_unlit)
+        readGlossyTexture(glossiness, result);
     return result;
 }
 
-void Materials::readTexture(const Json& reference, ReadMaterial& result) {
-    const auto index = wholeNumber(member(reference, "index"));
-    if (!index)
+void Materials::readBaseColor(const Json& json, ReadMaterial& result) {
+    const Json& glossiness = glossinessOf(json);
+    const bool is_glossy = !glossiness.is_null();
+    const Json& source = is_glossy ? glossiness : member(json, "pbrMetallicRoughness");
+    Material& material = *result.material;
+    material.base_color = colorOf(member(source, is_glossy ? "diffuseFactor" : "baseColorFactor"));
+    const auto reference =
+        referenceOf(member(source, is_glossy ? "diffuseTexture" : "baseColorTexture"));
+    if (!reference)
         return;
-    const Json& transform = extension(reference, "KHR_texture_transform");
-    const Json& own_set = member(transform, "texCoord");
-    result.coordinate_set =
-        wholeNumber(own_set.is_null() ? member(reference, "texCoord") : own_set).value_or(0);
-    result.texture_place = placeOf(transform);
-    result.material->base_color_texture =
-        texture(element(member(m_json, "textures"), *index), *index);
-}
-
-std::shared_ptr<const Texture> Materials::texture(const Json& texture, std::uint64_t index) {
-    const Json& sampler = element(member(m_json, "samplers"),
-                                  wholeNumber(member(texture, "sampler")).value_or(UINT64_MAX));
-    const TextureWraps wraps{wrapOf(member(sampler, "wrapS")), wrapOf(member(sampler, "wrapT"))};
-    if (const auto source = wholeNumber(member(texture, "source")))
-        return image(*source, wraps);
-    for (const char* const kind : {"EXT_texture_webp", "EXT_texture_avif", "KHR_texture_basisu"})
-        if (const auto source = wholeNumber(member(extension(texture, kind), "source")))
-            return image(*source, wraps);
-    m_textures.warnLeftOut("texture " + std::to_string(index),
-                           "the file does not say which picture it is");
-    return nullptr;
-}
-
-std::shared_ptr<const Texture> Materials::image(std::uint64_t index, TextureWraps wraps) {
-    const Json& image = element(member(m_json, "images"), index);
-    const std::string name = nameOfImage(image, index);
-    const std::string uri = text(member(image, "uri"));
-    const auto view = wholeNumber(member(image, "bufferView"));
-    if (!view && !uri.empty() && !uri.starts_with("data:"))
-        return m_textures.fromFile(uri, wraps);
-    if (!view && uri.empty()) {
-        m_textures.warnLeftOut(name, "the file does not hold it");
-        return nullptr;
-    }
-    if (const auto known = m_textures.known(name, wraps))
-        return *known;
-    const Result<Bytes> bytes = view ? m_buffers.view(*view) : m_buffers.fromDataUri(name, uri);
-    if (bytes)
-        return m_textures.fromBytes(name, bytes.value(), wraps);
-    m_textures.warnLeftOut(name, "its bytes are not there");
-    return nullptr;
+    material.base_color_texture = m_textures.at(reference->index);
+    if (material.base_color_texture == nullptr)
+        return;
+    result.has_texture = true;
+    result.coordinate_set = reference->coordinate_set;
+    result.texture_place = reference->place;
 }
 
 /// Whether the surface has holes or is see-through.
@@ -147,6 +93,55 @@ void Materials::readAlpha(const Json& json, ReadMaterial& result) const {
                                         : Transparency::none;
     material.see_through = material.base_color.a < 255 || of_texture == Transparency::partial;
     material.alpha_cutout = !material.see_through && of_texture == Transparency::holes;
+}
+
+/// A mesh has texture coordinates once: those of the base colour, else of the first other texture.
+void Materials::readTexture(const SurfaceTexture& texture, ReadMaterial& result) {
+    const auto reference = referenceOf(*texture.reference);
+    if (!reference)
+        return;
+    Material& material = *result.material;
+    TextureUse use;
+    const bool is_elsewhere =
+        result.has_texture && reference->coordinate_set != result.coordinate_set;
+    if (is_elsewhere || !layTexture(result.texture_place, reference->place, use)) {
+        m_laid_elsewhere.push_back("'" + material.name.ToUtf8() + "' (" + texture.name + ")");
+        return;
+    }
+    use.texture = m_textures.at(reference->index);
+    if (use.texture == nullptr)
+        return;
+    result.has_texture = true;
+    result.coordinate_set = reference->coordinate_set;
+    material.*texture.use = std::move(use);
+}
+
+/// Its colours are what the surface mirrors, its alpha is the glossiness.
+void Materials::readGlossyTexture(const Json& glossiness, ReadMaterial& result) {
+    Material& material = *result.material;
+    const Json& reference = member(glossiness, "specularGlossinessTexture");
+    readTexture({&reference, &Material::specular_color_texture, "specular colour and glossiness"},
+                result);
+    if (material.specular_color_texture.texture == nullptr)
+        return;
+    material.metal_rough = material.specular_color_texture;
+    material.metal_rough.texture = m_textures.store().roughness(
+        material.specular_color_texture.texture, 1.0F - material.roughness);
+    material.roughness = 1.0F;
+}
+
+void Materials::tellLosses() {
+    if (!m_laid_elsewhere.empty())
+        m_warnings.push_back("Textures of materials were left out, as they lie by other texture "
+                             "coordinates than the base colour: " +
+                             listOf(m_laid_elsewhere) + ".");
+    const auto sheens = std::ranges::count_if(m_materials, [](const auto& of_number) {
+        return of_number.second.material->sheen_color != LinearRgb{0, 0, 0};
+    });
+    if (sheens > 0)
+        m_warnings.push_back("The sheen of " + std::to_string(sheens) +
+                             (sheens > 1 ? " materials is kept, but not drawn."
+                                         : " material is kept, but not drawn."));
 }
 
 } // namespace quarn::gltf

@@ -42,6 +42,7 @@ public:
                 return done.error();
         }
         m_meshes.tellLosses();
+        m_materials.tellLosses();
         if (const std::string passed_over = passedOverText(m_json); !passed_over.empty())
             m_result.warnings.push_back(passed_over);
         finishLights();

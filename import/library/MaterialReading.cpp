@@ -1,15 +1,15 @@
 #include "import/library/MaterialReading.h"
 
 #include "import/assembly/StoredColor.h"
+#include "import/library/SurfaceNumbers.h"
+#include "import/textures/DataPictures.h"
 #include "import/textures/TextureTransparency.h"
 
-#include <assimp/material.h>
 #include <assimp/mesh.h>
 #include <assimp/scene.h>
 
 #include <algorithm>
 #include <array>
-#include <initializer_list>
 #include <span>
 
 namespace quarn {
@@ -117,6 +117,9 @@ ReadMaterial MaterialReading::read(const aiMaterial& source) {
     readTexture(source, result);
     readOpacityMap(source, result);
     readAlpha(source, *result.material);
+    readSurfaceNumbers(source, *result.material);
+    readSurfaceTextures(source, result);
+    readRelief(source, result);
     return result;
 }
 
@@ -129,6 +132,7 @@ void MaterialReading::readTexture(const aiMaterial& source, ReadMaterial& result
     result.texture_coordinates = reference.coordinates;
     material.base_color_texture =
         texture(reference.name, {wrapOf(reference.modes[0]), wrapOf(reference.modes[1])});
+    result.has_texture = material.base_color_texture != nullptr;
     KM_Color& color = material.base_color;
     if (material.base_color_texture != nullptr && color.r == 0 && color.g == 0 && color.b == 0) {
         // Many programs write black where the texture alone gives the colour.
@@ -152,6 +156,60 @@ void MaterialReading::readOpacityMap(const aiMaterial& source, ReadMaterial& res
         result.texture_coordinates = reference.coordinates;
     }
     colors = m_textures.combined(colors, opacity);
+    result.has_texture = true;
+}
+
+/// As in material files of OBJ, a picture stands in place of a number.
+void MaterialReading::readSurfaceTextures(const aiMaterial& source, ReadMaterial& result) {
+    Material& material = *result.material;
+    const auto roughness = textureBeside(source, {aiTextureType_DIFFUSE_ROUGHNESS}, result);
+    const auto metalness = textureBeside(source, {aiTextureType_METALNESS}, result);
+    material.metal_rough.texture = m_textures.metalRough(roughness, metalness);
+    if (roughness != nullptr)
+        material.roughness = 1.0F;
+    if (metalness != nullptr)
+        material.metalness = 1.0F;
+    material.occlusion.texture = textureBeside(source, {aiTextureType_AMBIENT_OCCLUSION}, result);
+    material.emission_texture.texture =
+        textureBeside(source, {aiTextureType_EMISSION_COLOR, aiTextureType_EMISSIVE}, result);
+    if (material.emission_texture.texture != nullptr && material.emission == LinearRgb{0, 0, 0})
+        material.emission = {1.0F, 1.0F, 1.0F};
+}
+
+void MaterialReading::readRelief(const aiMaterial& source, ReadMaterial& result) {
+    Material& material = *result.material;
+    material.normals.texture =
+        textureBeside(source, {aiTextureType_NORMALS, aiTextureType_NORMAL_CAMERA}, result);
+    if (material.normals.texture != nullptr)
+        return;
+    const auto relief = textureBeside(source, {aiTextureType_HEIGHT}, result);
+    TextureReference reference;
+    if (relief == nullptr || !findTexture(source, {aiTextureType_HEIGHT}, reference))
+        return;
+    if (holdsNormals(*relief))
+        material.normals.texture = relief;
+    else
+        m_textures.warnLeftOut(reference.name, HEIGHTS_NOT_DRAWN);
+}
+
+/// A mesh has texture coordinates once: those of the base colour, else of the first other texture.
+std::shared_ptr<const Texture>
+MaterialReading::textureBeside(const aiMaterial& source, std::initializer_list<aiTextureType> types,
+                               ReadMaterial& result) {
+    TextureReference reference;
+    if (!findTexture(source, types, reference))
+        return nullptr;
+    if (result.has_texture && reference.coordinates != result.texture_coordinates) {
+        m_textures.warnLeftOut(reference.name,
+                               "it lies by other texture coordinates than the base colour");
+        return nullptr;
+    }
+    auto found = texture(reference.name, {wrapOf(reference.modes[0]), wrapOf(reference.modes[1])});
+    if (found != nullptr) {
+        result.has_texture = true;
+        result.texture_coordinates = reference.coordinates;
+    }
+    return found;
 }
 
 std::shared_ptr<const Texture> MaterialReading::texture(const std::string& reference,

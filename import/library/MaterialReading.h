@@ -3,12 +3,14 @@
 #include "engine/scene/Material.h"
 #include "import/textures/TextureStore.h"
 
+#include <assimp/material.h>
+
+#include <initializer_list>
 #include <map>
 #include <memory>
 #include <string>
 #include <vector>
 
-struct aiMaterial;
 struct aiScene;
 struct aiTexture;
 
@@ -17,7 +19,8 @@ namespace quarn {
 /// A material of a model file, and what a mesh must know of it.
 struct ReadMaterial {
     std::shared_ptr<Material> material; ///< null: the file gives none
-    unsigned texture_coordinates = 0;   ///< the set that its texture uses
+    bool has_texture = false;
+    unsigned texture_coordinates = 0; ///< the set that its textures use
 };
 
 /// Makes materials of a model file on demand, each once, with the textures that they name.
@@ -35,6 +38,11 @@ private:
     ReadMaterial read(const aiMaterial& source);
     void readTexture(const aiMaterial& source, ReadMaterial& result);
     void readOpacityMap(const aiMaterial& source, ReadMaterial& result);
+    void readSurfaceTextures(const aiMaterial& source, ReadMaterial& result);
+    void readRelief(const aiMaterial& source, ReadMaterial& result);
+    std::shared_ptr<const Texture> textureBeside(const aiMaterial& source,
+                                                 std::initializer_list<aiTextureType> types,
+                                                 ReadMaterial& result);
     std::shared_ptr<const Texture> texture(const std::string& reference, TextureWraps wraps);
 
     std::shared_ptr<const Texture> textureFromFile(const std::string& reference,

@@ -5,6 +5,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <utility>
 
 namespace quarn {
 
@@ -17,8 +18,27 @@ std::string_view unquoted(std::string_view name) {
 }
 
 /// Options of a picture that have one word behind them which does not matter here.
-constexpr std::string_view OPTIONS_OF_A_WORD[] = {"-bm",     "-blendu",  "-blendv", "-cc",
-                                                  "-texres", "-imfchan", "-boost",  "-type"};
+constexpr std::string_view OPTIONS_OF_A_WORD[] = {"-blendu",  "-blendv", "-cc",  "-texres",
+                                                  "-imfchan", "-boost",  "-type"};
+
+using Color = std::optional<std::array<float, 3>>;
+
+constexpr std::pair<std::string_view, MaterialMap FileMaterial::*> MAPS[] = {
+    {"map_Kd", &FileMaterial::color_map},     {"map_d", &FileMaterial::opacity_map},
+    {"map_Ks", &FileMaterial::specular_map},  {"map_Ke", &FileMaterial::emission_map},
+    {"map_Pr", &FileMaterial::roughness_map}, {"map_Pm", &FileMaterial::metalness_map},
+    {"norm", &FileMaterial::normal_map},      {"map_Bump", &FileMaterial::bump_map},
+    {"map_bump", &FileMaterial::bump_map},    {"bump", &FileMaterial::bump_map}};
+
+constexpr std::pair<std::string_view, Color FileMaterial::*> COLORS[] = {
+    {"Kd", &FileMaterial::color}, {"Ks", &FileMaterial::specular}, {"Ke", &FileMaterial::emission}};
+
+constexpr std::pair<std::string_view, std::optional<float> FileMaterial::*> NUMBERS[] = {
+    {"Ns", &FileMaterial::exponent},
+    {"Pr", &FileMaterial::roughness},
+    {"Pm", &FileMaterial::metalness},
+    {"Pc", &FileMaterial::clearcoat},
+    {"Pcr", &FileMaterial::clearcoat_roughness}};
 
 /// What follows is passed over, so that a file of their names alone cannot fill the memory.
 constexpr std::size_t MOST_MATERIALS = 100'000;
@@ -43,20 +63,23 @@ private:
     }
 
     void readPart(std::string_view keyword, std::string_view rest, FileMaterial& material) {
-        if (keyword == "Kd")
-            readColor(rest, material);
-        else if (keyword == "d")
+        for (const auto& [word, map] : MAPS)
+            if (keyword == word)
+                return readMap(rest, material.*map);
+        for (const auto& [word, color] : COLORS)
+            if (keyword == word)
+                return readColor(rest, material.*color);
+        for (const auto& [word, number] : NUMBERS)
+            if (keyword == word)
+                return readNumber(rest, material.*number);
+        if (keyword == "d")
             readShare(rest, material.opacity);
         else if (keyword == "Tr")
             readShare(rest, material.transparency);
-        else if (keyword == "map_Kd")
-            readMap(rest, material.color_map);
-        else if (keyword == "map_d")
-            readMap(rest, material.opacity_map);
     }
 
     /// One number stands for three.
-    void readColor(std::string_view rest, FileMaterial& material) {
+    void readColor(std::string_view rest, Color& stated) {
         std::array<float, 3> color{};
         std::size_t count = 0;
         while (count < color.size()) {
@@ -71,16 +94,24 @@ private:
         }
         for (; count < color.size(); ++count)
             color[count] = color[0];
-        material.color = color;
+        stated = color;
     }
 
     void readShare(std::string_view rest, std::optional<float>& share) {
         std::string_view after = rest;
         if (takeWord(after) == "-halo") // see-through in the middle, opaque at the border
             rest = after;
-        const std::optional<float> number = takeNumber<float>(rest);
-        if (number && !std::isnan(*number))
+        std::optional<float> number;
+        readNumber(rest, number);
+        if (number)
             share = std::clamp(*number, 0.0F, 1.0F);
+    }
+
+    void readNumber(std::string_view rest, std::optional<float>& stated) {
+        std::string_view after = rest;
+        const std::optional<float> number = takeNumber<float>(after);
+        if (number && !std::isnan(*number))
+            stated = number;
         else
             fault(rest);
     }
@@ -106,6 +137,9 @@ private:
             readTwo(rest, map.place.u[0], map.place.v[1]);
         } else if (option == "-o") {
             readTwo(rest, map.place.u[2], map.place.v[2]);
+        } else if (option == "-bm") {
+            std::string_view factor = takeWord(rest);
+            map.strength = takeNumber<float>(factor).value_or(map.strength);
         } else if (option == "-t") {
             double ignored = 0.0;
             readTwo(rest, ignored, ignored);

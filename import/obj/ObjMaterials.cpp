@@ -1,8 +1,6 @@
 #include "import/obj/ObjMaterials.h"
 
-#include "import/assembly/StoredColor.h"
 #include "import/text/Words.h"
-#include "import/textures/TextureTransparency.h"
 
 #include <algorithm>
 #include <utility>
@@ -35,31 +33,6 @@ std::vector<std::string_view> namesOf(std::string_view statement) {
         begin = rest.data();
     }
     return names;
-}
-
-/// Many programs write an opacity of 0 where they mean that there is none to write.
-void setTransparency(const FileMaterial& source, Material& material) {
-    const bool is_dimmed = material.base_color.a < 255 && material.base_color.a > 0;
-    const bool texture_counts =
-        !source.opacity_map.file.empty() && material.base_color_texture != nullptr;
-    const Transparency of_texture =
-        texture_counts ? transparencyOf(*material.base_color_texture) : Transparency::none;
-    material.see_through = is_dimmed || of_texture == Transparency::partial;
-    material.alpha_cutout = !material.see_through && of_texture == Transparency::holes;
-}
-
-KM_Color colorOf(const FileMaterial& source, const Material& material) {
-    const float opacity = source.opacity.value_or(1.0F - source.transparency.value_or(0.0F));
-    const bool is_textured = material.base_color_texture != nullptr;
-    KM_Color color = material.base_color;
-    if (source.color)
-        color = colorFromSrgb((*source.color)[0], (*source.color)[1], (*source.color)[2], 1.0F);
-    // Many programs write black, or nothing, where the texture alone gives the colour.
-    const bool is_black = color.r == 0 && color.g == 0 && color.b == 0;
-    if (is_textured && (is_black || !source.color))
-        color = {255, 255, 255, 255};
-    color.a = byteFromUnit(opacity);
-    return color;
 }
 
 } // namespace
@@ -148,33 +121,8 @@ const ObjMaterial& ObjMaterials::at(std::string_view name) {
     const auto found = m_found.find(name);
     if (found == m_found.end())
         m_missing.emplace_back(name);
-    return m_made[std::string(name)] =
-               make(found != m_found.end() ? found->second : FileMaterial{.name = name});
-}
-
-ObjMaterial ObjMaterials::make(const FileMaterial& source) {
-    ObjMaterial made;
-    const auto material = std::make_shared<Material>();
-    material->name = KM_wString::FromUtf8(source.name);
-    makeTextures(source, *material, made.texture_place);
-    material->base_color = colorOf(source, *material);
-    setTransparency(source, *material);
-    made.material = material;
-    return made;
-}
-
-/// The opacity may have a picture of its own.
-void ObjMaterials::makeTextures(const FileMaterial& source, Material& material,
-                                TexturePlace& place) {
-    const MaterialMap& colors = source.color_map;
-    const MaterialMap& opacity = source.opacity_map;
-    if (!colors.file.empty())
-        material.base_color_texture = m_textures.fromFile(colors.file, colors.wraps);
-    place = material.base_color_texture ? colors.place : opacity.place;
-    if (opacity.file.empty())
-        return;
-    if (const auto picture = m_textures.fromFile(opacity.file, opacity.wraps))
-        material.base_color_texture = m_textures.combined(material.base_color_texture, picture);
+    return m_made[std::string(name)] = lookOf(
+               found != m_found.end() ? found->second : FileMaterial{.name = name}, m_textures);
 }
 
 void ObjMaterials::tellMissing() {

@@ -3,11 +3,11 @@
 #include "ground/FileBytes.h"
 #include "import/ModelReading.h"
 #include "import/obj/MaterialFile.h"
+#include "import/obj/ObjLook.h"
 #include "import/text/FileText.h"
 
 #include <deque>
 #include <map>
-#include <memory>
 #include <set>
 #include <span>
 #include <string>
@@ -16,12 +16,6 @@
 #include <vector>
 
 namespace quarn {
-
-/// A material of an OBJ file, and what a mesh must know of it.
-struct ObjMaterial {
-    std::shared_ptr<const Material> material; ///< null: none
-    TexturePlace texture_place;
-};
 
 /// The materials of an OBJ file, from the material files that it names; each is made once, when it
 /// is asked for. What is missing is told.
@@ -51,8 +45,6 @@ private:
     void readNamesake();
     bool readFile(const NamedFile& file);
     void keepMaterials(std::string_view text, const std::string& file);
-    ObjMaterial make(const FileMaterial& source);
-    void makeTextures(const FileMaterial& source, Material& material, TexturePlace& place);
 
     const ModelReading& m_reading;
     std::vector<std::string>& m_warnings;

@@ -1,5 +1,6 @@
 #include "import/textures/TextureStore.h"
 
+#include "import/textures/DataPictures.h"
 #include "import/textures/OpacityMap.h"
 #include "import/textures/TextureDecoding.h"
 
@@ -43,6 +44,32 @@ TextureStore::combined(const std::shared_ptr<const Texture>& colors,
     if (!both)
         both = withOpacity(colors.get(), *opacity);
     return both;
+}
+
+std::shared_ptr<const Texture>
+TextureStore::metalRough(const std::shared_ptr<const Texture>& roughness,
+                         const std::shared_ptr<const Texture>& metalness) {
+    if (roughness == metalness)
+        return roughness;
+    const auto [found, is_new] = m_metal_rough.try_emplace({roughness, metalness});
+    if (is_new && hasRoomFor(roughness ? *roughness : *metalness))
+        found->second = metalRoughPicture(roughness.get(), metalness.get());
+    return found->second;
+}
+
+std::shared_ptr<const Texture> TextureStore::roughness(const std::shared_ptr<const Texture>& glossy,
+                                                       float glossiness) {
+    const auto [found, is_new] = m_rough.try_emplace({glossy, glossiness});
+    if (is_new && hasRoomFor(*glossy))
+        found->second = roughnessOfGlossiness(*glossy, glossiness);
+    return found->second;
+}
+
+bool TextureStore::hasRoomFor(const Texture& another) {
+    const Result<void> taken = m_reading.budget.take(another.rgba.size(), "textures");
+    if (!taken)
+        warnLeftOut("roughness and metalness", taken.message());
+    return taken.ok();
 }
 
 std::shared_ptr<Texture> TextureStore::load(const std::string& reference) {

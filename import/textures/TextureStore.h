@@ -50,6 +50,15 @@ public:
     /// @param colors  may be null
     std::shared_ptr<const Texture> combined(const std::shared_ptr<const Texture>& colors,
                                             const std::shared_ptr<const Texture>& opacity);
+    /// See metalRoughPicture; the same pair gives the same texture. One picture for both holds them
+    /// as they are needed already.
+    /// @return null where both are, or it was left out
+    std::shared_ptr<const Texture> metalRough(const std::shared_ptr<const Texture>& roughness,
+                                              const std::shared_ptr<const Texture>& metalness);
+    /// See roughnessOfGlossiness; the same picture and glossiness give the same texture.
+    /// @return null where it was left out
+    std::shared_ptr<const Texture> roughness(const std::shared_ptr<const Texture>& glossy,
+                                             float glossiness);
     /// @param why  a part of a sentence
     void warnLeftOut(const std::string& name, const std::string& why);
 
@@ -58,12 +67,16 @@ private:
     using Pair = std::pair<std::shared_ptr<const Texture>, std::shared_ptr<const Texture>>;
 
     std::shared_ptr<Texture> load(const std::string& reference);
+    bool hasRoomFor(const Texture& another);
     std::shared_ptr<Texture> decoded(const std::string& name, Result<Texture> texture);
 
     const ModelReading& m_reading;
     std::vector<std::string>& m_warnings;
     std::map<Key, std::shared_ptr<const Texture>> m_textures;
     std::map<Pair, std::shared_ptr<const Texture>> m_combined;
+    std::map<Pair, std::shared_ptr<const Texture>> m_metal_rough;
+    std::map<std::pair<std::shared_ptr<const Texture>, float>, std::shared_ptr<const Texture>>
+        m_rough;
     std::set<std::string> m_told; ///< textures that were left out
 };
 

@@ -1,3 +1,4 @@
+#include "engine/scene/MaterialCheck.h"
 #include "ground/LargePages.h"
 #include "ground/LightFields.h"
 #include "ground/ViewportLayout.h"
@@ -8,6 +9,7 @@
 #include <algorithm>
 #include <new>
 #include <stdexcept>
+#include <string>
 
 namespace quarn {
 
@@ -97,9 +99,17 @@ private:
         return takeList([&] {
             auto material = std::make_shared<Material>();
             m_materials.push_back(material);
-            return materialFields(m_step, *material) &&
-                   takeShared(m_textures, true, material->base_color_texture);
+            return materialFields(m_step, *material) && takeTexturesOf(*material);
         });
+    }
+
+    bool takeTexturesOf(Material& material) {
+        bool are_there = takeShared(m_textures, true, material.base_color_texture);
+        for (TextureUse* const use : textureUses(material))
+            are_there = are_there && takeShared(m_textures, true, use->texture);
+        if (are_there && !makeDrawable(material).empty())
+            ++m_materials_changed;
+        return are_there;
     }
 
     bool takeMeshes() {
@@ -181,7 +191,13 @@ private:
     }
 
     bool takeWarnings(std::vector<std::string>& warnings) {
-        return takeList([&] { return takeText(warnings.emplace_back()); });
+        if (!takeList([&] { return takeText(warnings.emplace_back()); }))
+            return false;
+        if (m_materials_changed > 0)
+            warnings.push_back("Its reader handed over materials with numbers that cannot be (" +
+                               std::to_string(m_materials_changed) +
+                               "); what is usual stands for them.");
+        return true;
     }
 
     bool takeText(std::string& text) {
@@ -199,6 +215,7 @@ private:
     FieldReader m_step{m_description};
     std::vector<std::shared_ptr<const Texture>> m_textures;
     std::vector<std::shared_ptr<const Material>> m_materials;
+    std::size_t m_materials_changed = 0; ///< since their numbers could not be drawn
     std::vector<std::shared_ptr<const KM_Mesh>> m_meshes;
 };
 

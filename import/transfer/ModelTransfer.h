@@ -18,7 +18,8 @@ Result<void> writeModel(ImportedModel model, SharedBlock& block);
 
 /// Takes a model out of a block, and trusts nothing in it: every count is compared with what is
 /// there before memory is asked for, meshes are valid, numbers finite, choices among those that
-/// there are. The block's memory is given back as the model is taken.
+/// there are. Materials are made such as can be drawn, and a sentence of the model tells so. The
+/// block's memory is given back as the model is taken.
 /// @return the model as it was written, sharing what it shared; or an error, part of a sentence:
 /// the
 ///   block holds no whole model, or there is too little memory

@@ -7,6 +7,7 @@
 #include <sys/mman.h>
 #include <unistd.h>
 #include <unordered_map>
+#include <utility>
 
 namespace quarn {
 
@@ -96,8 +97,8 @@ private:
         KM_Xform place;
     };
     struct Look {
-        Material material; ///< without its texture
-        std::int32_t texture;
+        Material material;                  ///< without its textures
+        std::vector<std::int32_t> textures; ///< that of the base colour, then the others
     };
 
     /// Takes the meshes over, so that a mesh that was written is not held any more.
@@ -112,10 +113,16 @@ private:
     /// Copies the materials, so that they do not hold their textures any more.
     void noteMaterials() {
         for (auto& material : m_materials.things()) {
-            m_looks.push_back({*material, m_textures.place(material->base_color_texture)});
-            m_looks.back().material.base_color_texture.reset();
+            Look& look = m_looks.emplace_back(Look{*material, {}});
+            look.textures.push_back(placeOf(look.material.base_color_texture));
+            for (TextureUse* const use : textureUses(look.material))
+                look.textures.push_back(placeOf(use->texture));
             material.reset();
         }
+    }
+
+    std::int32_t placeOf(std::shared_ptr<const Texture>& texture) {
+        return m_textures.place(std::exchange(texture, nullptr));
     }
 
     void writeTextures() {
@@ -130,7 +137,7 @@ private:
     void writeMaterials() {
         m_description.WriteCount(m_looks.size());
         for (const Look& look : m_looks)
-            materialFields(m_step, look.material) && m_step(look.texture);
+            materialFields(m_step, look.material) && numberFields(m_step, look.textures);
     }
 
     void writeMeshes() {

@@ -9,7 +9,7 @@ namespace quarn {
 namespace {
 
 /// Told apart by what follows it whenever a message or the block changes.
-constexpr std::int32_t LAYOUT = 2;
+constexpr std::int32_t LAYOUT = 3;
 /// Of a message's text; the rest of the packet is room for its other fields.
 constexpr std::size_t MOST_TEXT_BYTES = MOST_MESSAGE_BYTES - 1024;
 

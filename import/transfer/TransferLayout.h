@@ -1,6 +1,6 @@
 #pragma once
 
-#include "engine/scene/Material.h"
+#include "engine/scene/MaterialTextures.h"
 #include "ground/Fields.h"
 #include "import/ImportedModel.h"
 #include "import/assembly/MeshPlacing.h"
@@ -31,11 +31,42 @@ template <class Step, class AnyTexture> bool textureFields(Step step, AnyTexture
            step.check(texture.width > 0 && texture.height > 0);
 }
 
+template <class Step, class AnyNumbers> bool numberFields(Step step, AnyNumbers& numbers) {
+    for (auto& number : numbers)
+        if (!step(number))
+            return false;
+    return true;
+}
+
+template <class Step, class AnyMaterial> bool surfaceFields(Step step, AnyMaterial& material) {
+    return step(material.metalness) && step(material.roughness) && step(material.normal_scale) &&
+           step(material.occlusion_strength) && numberFields(step, material.emission) &&
+           step(material.is_one_sided) && step(material.is_unlit) && step(material.clearcoat) &&
+           step(material.clearcoat_roughness) && step(material.specular) &&
+           numberFields(step, material.specular_color) &&
+           numberFields(step, material.sheen_color) && step(material.sheen_roughness);
+}
+
+template <class Step, class AnyMaterial> bool insideFields(Step step, AnyMaterial& material) {
+    return step(material.transmission) && step(material.index_of_refraction) &&
+           step(material.thickness) && step(material.attenuation_distance) &&
+           numberFields(step, material.attenuation_color);
+}
+
+template <class Step, class AnyMaterial> bool placesOfTextures(Step step, AnyMaterial& material) {
+    for (auto* const use : textureUses(material))
+        if (!numberFields(step, use->u) || !numberFields(step, use->v))
+            return false;
+    return true;
+}
+
+/// All but the textures. Its numbers are any that the bytes make.
 template <class Step, class AnyMaterial> bool materialFields(Step step, AnyMaterial& material) {
     return step(material.name) && step(material.base_color) && step(material.alpha_cutout) &&
            step(material.alpha_cutoff) && step(material.see_through) &&
-           step.check(material.alpha_cutoff >= 0.0F && material.alpha_cutoff <= 1.0F &&
-                      !(material.alpha_cutout && material.see_through));
+           step.check(!(material.alpha_cutout && material.see_through)) &&
+           surfaceFields(step, material) && insideFields(step, material) &&
+           placesOfTextures(step, material);
 }
 
 template <class Step, class AnyLengths> bool lengthFields(Step step, AnyLengths& lengths) {

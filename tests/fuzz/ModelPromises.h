@@ -1,5 +1,6 @@
 #pragma once
 
+#include "engine/scene/MaterialCheck.h"
 #include "import/ModelReading.h"
 #include "import/assembly/ModelAssembly.h"
 
@@ -33,6 +34,11 @@ inline void check(const KM_Mesh& mesh) {
             std::ranges::all_of(triangle.vi, [&](std::uint32_t v) { return v < mesh.m_V.size(); }));
 }
 
+inline void check(const quarn::Material* material) {
+    quarn::Material drawable = material != nullptr ? *material : quarn::Material();
+    require(quarn::makeDrawable(drawable).empty());
+}
+
 inline void check(const quarn::SourceScene& scene) {
     for (const quarn::SourcePlace& place : scene.places)
         require(place.mesh < scene.meshes.size());
@@ -44,7 +50,8 @@ inline void check(const quarn::SourceScene& scene) {
 }
 
 /// The bytes are refused with a reason that names the file, or make a scene whose indices name
-/// vertices, whose vertices are finite and of which a model can be made.
+/// vertices, whose vertices are finite and of which a model can be made with materials that can be
+/// drawn.
 /// @param path  of a file that is not there, so that only these bytes are read
 inline void keep(quarn::Result<quarn::SourceScene> (*read)(const quarn::ModelReading& reading),
                  const std::filesystem::path& path, const std::uint8_t* bytes, std::size_t size) {
@@ -61,6 +68,9 @@ inline void keep(quarn::Result<quarn::SourceScene> (*read)(const quarn::ModelRea
     check(scene.value());
     const auto model = quarn::assembleModel(std::move(scene.value()), reading);
     require(model.ok() || !model.message().empty());
+    if (model)
+        for (const quarn::ImportedMesh& mesh : model.value().meshes)
+            check(mesh.placed.material.get());
 }
 
 } // namespace promises

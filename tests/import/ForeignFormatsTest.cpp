@@ -120,29 +120,59 @@ TEST(X3d, GroupsThatAreShownAgainAreTold) {
                 testing::Contains(HasSubstr("shows groups again (USE)")));
 }
 
-TEST(Dae, NumbersMayStandBehindBlanks) {
+/// A triangle with a material.
+/// @param look  the technique of its effect, as XML
+ImportedModel readDae(const std::string& look) {
     const TemporaryFolder folder;
-    const ImportedModel model = readOrFail(folder.write(
+    return readOrFail(folder.write(
         "a.dae",
         "<?xml version=\"1.0\"?><COLLADA xmlns=\"http://www.collada.org/2005/11/COLLADASchema\" "
         "version=\"1.4.1\"><library_effects><effect id=\"e\"><profile_COMMON><technique "
-        "sid=\"t\"><lambert><diffuse><color>  \n 1 0 0 1 </color></diffuse></lambert></technique>"
-        "</profile_COMMON></effect></library_effects><library_materials><material id=\"m\" "
-        "name=\"red\"><instance_effect url=\"#e\"/></material></library_materials>"
-        "<library_geometries><geometry id=\"g\"><mesh><source id=\"p\"><float_array id=\"a\" "
-        "count=\"9\">  0 0 0 1 0 0 0 1 0</float_array><technique_common><accessor source=\"#a\" "
-        "count=\"3\" stride=\"3\"><param name=\"X\" type=\"float\"/><param name=\"Y\" "
-        "type=\"float\"/><param name=\"Z\" type=\"float\"/></accessor></technique_common></source>"
-        "<vertices id=\"v\"><input semantic=\"POSITION\" source=\"#p\"/></vertices><triangles "
-        "count=\"1\" material=\"s\"><input semantic=\"VERTEX\" source=\"#v\" offset=\"0\"/><p> 0 "
-        "1 2</p></triangles></mesh></geometry></library_geometries><library_visual_scenes>"
-        "<visual_scene id=\"w\"><node><instance_geometry url=\"#g\"><bind_material>"
-        "<technique_common><instance_material symbol=\"s\" target=\"#m\"/></technique_common>"
-        "</bind_material></instance_geometry></node></visual_scene></library_visual_scenes>"
-        "<scene><instance_visual_scene url=\"#w\"/></scene></COLLADA>"));
+        "sid=\"t\">" +
+            look +
+            "</technique>"
+            "</profile_COMMON></effect></library_effects><library_materials><material id=\"m\" "
+            "name=\"red\"><instance_effect url=\"#e\"/></material></library_materials>"
+            "<library_geometries><geometry id=\"g\"><mesh><source id=\"p\"><float_array id=\"a\" "
+            "count=\"9\">  0 0 0 1 0 0 0 1 0</float_array><technique_common><accessor "
+            "source=\"#a\" "
+            "count=\"3\" stride=\"3\"><param name=\"X\" type=\"float\"/><param name=\"Y\" "
+            "type=\"float\"/><param name=\"Z\" "
+            "type=\"float\"/></accessor></technique_common></source>"
+            "<vertices id=\"v\"><input semantic=\"POSITION\" source=\"#p\"/></vertices><triangles "
+            "count=\"1\" material=\"s\"><input semantic=\"VERTEX\" source=\"#v\" offset=\"0\"/><p> "
+            "0 "
+            "1 2</p></triangles></mesh></geometry></library_geometries><library_visual_scenes>"
+            "<visual_scene id=\"w\"><node><instance_geometry url=\"#g\"><bind_material>"
+            "<technique_common><instance_material symbol=\"s\" target=\"#m\"/></technique_common>"
+            "</bind_material></instance_geometry></node></visual_scene></library_visual_scenes>"
+            "<scene><instance_visual_scene url=\"#w\"/></scene></COLLADA>"));
+}
+
+TEST(Dae, NumbersMayStandBehindBlanks) {
+    const ImportedModel model =
+        readDae("<lambert><diffuse><color>  \n 1 0 0 1 </color></diffuse></lambert>");
     ASSERT_EQ(model.meshes.size(), 1U);
     ASSERT_NE(model.meshes[0].placed.material, nullptr);
     EXPECT_EQ(model.meshes[0].placed.material->base_color, KM_Color(255, 0, 0));
+}
+
+TEST(Dae, HighlightsBecomeRoughnessAndEmissionBecomesLight) {
+    const ImportedModel model =
+        readDae("<phong><emission><color>0 1 0 1</color></emission><diffuse><color>1 0 0 1</color>"
+                "</diffuse><specular><color>0.5 0.5 0.5 1</color></specular><shininess><float>250"
+                "</float></shininess></phong>");
+    ASSERT_EQ(model.meshes.size(), 1U);
+    const Material& material = *model.meshes[0].placed.material;
+    EXPECT_NEAR(material.roughness, 0.2985F, 1e-4F); // the fourth root of 2 / 252
+    EXPECT_EQ(material.specular, 1.0F);
+    EXPECT_THAT(material.specular_color, ElementsAre(1.0F, 1.0F, 1.0F));
+    EXPECT_THAT(material.emission, ElementsAre(0.0F, 1.0F, 0.0F));
+    const ImportedModel dull =
+        readDae("<lambert><diffuse><color>1 0 0 1</color></diffuse></lambert>");
+    ASSERT_EQ(dull.meshes.size(), 1U);
+    EXPECT_EQ(dull.meshes[0].placed.material->roughness, 1.0F);
+    EXPECT_THAT(dull.meshes[0].placed.material->emission, ElementsAre(0.0F, 0.0F, 0.0F));
 }
 
 std::string wide(const std::string& ascii, bool big_endian) {

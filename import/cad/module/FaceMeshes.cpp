@@ -66,10 +66,14 @@ public:
     std::shared_ptr<const Material> material; ///< null: no colour
 };
 
+/// Files state a colour alone; parts are shown with a satin finish.
+constexpr float ROUGHNESS = 0.5F;
+
 std::shared_ptr<const Material> materialOf(const KM_Color& color) {
     auto material = std::make_shared<Material>();
     material->base_color = color;
     material->see_through = color.a < 255;
+    material->roughness = ROUGHNESS;
     return material;
 }
 

@@ -49,6 +49,7 @@ TEST_F(CadFiles, ColorsAreThoseThatTheFileStates) {
     ASSERT_TRUE(model.meshes[0].placed.material);
     EXPECT_EQ(model.meshes[0].placed.material->base_color, KM_Color(204, 51, 26, 255));
     EXPECT_EQ(model.meshes[1].placed.material->base_color, KM_Color(26, 51, 204, 255));
+    EXPECT_EQ(model.meshes[0].placed.material->roughness, 0.5F); // a satin finish
 }
 
 TEST_F(CadFiles, TrianglesLookOutwardWithTheNormalsOfTheSurface) {

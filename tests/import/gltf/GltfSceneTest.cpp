@@ -77,15 +77,16 @@ TEST(GltfScene, CenterThatPositionsAreStatedFromMovesTheWholeScene) {
 
 TEST(GltfScene, ExtensionsThatMoveNothingAreToldAndPassedOver) {
     GltfWriter gltf = threeNodes();
-    gltf.json["extensionsRequired"] = {"KHR_materials_unlit", "EXT_texture_webp",
+    gltf.json["extensionsRequired"] = {"KHR_materials_iridescence", "EXT_texture_webp",
                                        "VRMC_materials_mtoon"};
-    gltf.json["extensionsUsed"] = {"KHR_materials_unlit", "KHR_techniques_webgl",
+    gltf.json["extensionsUsed"] = {"KHR_materials_iridescence", "KHR_techniques_webgl",
                                    "KHR_materials_sheen"};
     const ImportedModel model = gltf.read();
     EXPECT_EQ(namesIn(model), "012");
-    EXPECT_THAT(model.warnings,
-                ElementsAre("What these glTF extensions say was left out: KHR_materials_unlit, "
-                            "VRMC_materials_mtoon, KHR_techniques_webgl."));
+    EXPECT_THAT(
+        model.warnings,
+        ElementsAre("What these glTF extensions say was left out: KHR_materials_iridescence, "
+                    "VRMC_materials_mtoon, KHR_techniques_webgl."));
 }
 
 TEST(GltfScene, MatrixAndPartsOfATransformPlaceAlike) {

@@ -1,4 +1,6 @@
 #include "import/transfer/ModelTransfer.h"
+#include "engine/scene/MaterialCheck.h"
+#include "engine/scene/MaterialTextures.h"
 #include "tests/import/transfer/TransferFixtures.h"
 
 #include <gtest/gtest.h>
@@ -42,19 +44,45 @@ bool areValid(const std::vector<ImportedMesh>& meshes) {
                                [](const auto& mesh) { return mesh.placed.mesh->IsValid(); });
 }
 
+void expectSameTexture(const Texture& texture, const Texture& other) {
+    EXPECT_EQ(texture.width, other.width);
+    EXPECT_EQ(texture.height, other.height);
+    EXPECT_EQ(texture.rgba, other.rgba);
+    EXPECT_EQ(texture.wrap_u, other.wrap_u);
+    EXPECT_EQ(texture.wrap_v, other.wrap_v);
+}
+
+void expectSameSurface(const Material& material, const Material& other) {
+    for (const auto number :
+         {&Material::metalness, &Material::roughness, &Material::normal_scale,
+          &Material::occlusion_strength, &Material::clearcoat, &Material::clearcoat_roughness,
+          &Material::transmission, &Material::index_of_refraction, &Material::thickness,
+          &Material::attenuation_distance, &Material::specular, &Material::sheen_roughness})
+        EXPECT_EQ(material.*number, other.*number);
+    for (const auto color : {&Material::emission, &Material::attenuation_color,
+                             &Material::specular_color, &Material::sheen_color})
+        EXPECT_EQ(material.*color, other.*color);
+    EXPECT_EQ(material.is_one_sided, other.is_one_sided);
+    EXPECT_EQ(material.is_unlit, other.is_unlit);
+    const auto uses = textureUses(material);
+    const auto others = textureUses(other);
+    for (std::size_t i = 0; i < uses.size(); ++i) {
+        EXPECT_EQ(uses[i]->u, others[i]->u) << i;
+        EXPECT_EQ(uses[i]->v, others[i]->v) << i;
+        ASSERT_EQ(uses[i]->texture == nullptr, others[i]->texture == nullptr) << i;
+        if (uses[i]->texture)
+            expectSameTexture(*uses[i]->texture, *others[i]->texture);
+    }
+}
+
 void expectSameMaterial(const Material& material, const Material& other) {
     EXPECT_EQ(material.name, other.name);
     EXPECT_EQ(material.base_color, other.base_color);
     EXPECT_EQ(material.alpha_cutout, other.alpha_cutout);
     EXPECT_EQ(material.alpha_cutoff, other.alpha_cutoff);
     EXPECT_EQ(material.see_through, other.see_through);
-    const Texture& texture = *material.base_color_texture;
-    const Texture& other_texture = *other.base_color_texture;
-    EXPECT_EQ(texture.width, other_texture.width);
-    EXPECT_EQ(texture.height, other_texture.height);
-    EXPECT_EQ(texture.rgba, other_texture.rgba);
-    EXPECT_EQ(texture.wrap_u, other_texture.wrap_u);
-    EXPECT_EQ(texture.wrap_v, other_texture.wrap_v);
+    expectSameTexture(*material.base_color_texture, *other.base_color_texture);
+    expectSameSurface(material, other);
 }
 
 } // namespace
@@ -84,6 +112,9 @@ TEST(ModelTransfer, WhatObjectsShareTheyShareAgain) {
     EXPECT_NE(arrived.meshes[0].placed.material, arrived.meshes[1].placed.material);
     EXPECT_EQ(arrived.meshes[0].placed.material->base_color_texture,
               arrived.meshes[1].placed.material->base_color_texture);
+    const Material& material = *arrived.meshes[0].placed.material;
+    EXPECT_EQ(material.metal_rough.texture, material.occlusion.texture);
+    EXPECT_EQ(material.normals.texture, material.base_color_texture);
 }
 
 TEST(ModelTransfer, CurvesPointsCamerasLightsAndTheRestArriveAsTheyWere) {
@@ -175,6 +206,37 @@ TEST(ModelTransfer, NumbersThatAreNoneAreRefused) {
     ImportedModel lit = modelOfEverything();
     lit.lights[0].SetLocation({infinite, 0.0, 0.0});
     EXPECT_FALSE(taken(written(lit)));
+}
+
+TEST(ModelTransfer, MaterialsWithNumbersThatCannotBeArriveDrawableAndAreTold) {
+    const float none = std::numeric_limits<float>::quiet_NaN();
+    ImportedModel model = modelOfEverything();
+    auto look = std::make_shared<Material>(*model.meshes[0].placed.material);
+    look->metalness = none;
+    look->index_of_refraction = 0.0F;
+    look->emission = {1e30F, 0.0F, none};
+    look->attenuation_distance = -1.0F;
+    look->alpha_cutoff = none;
+    look->normals.u[1] = none;
+    model.meshes[0].placed.material = look;
+    const ImportedModel arrived = crossed(model);
+    ASSERT_EQ(arrived.meshes.size(), 4U);
+    Material material = *arrived.meshes[0].placed.material;
+    EXPECT_EQ(makeDrawable(material), "");
+    EXPECT_EQ(material.metalness, 0.0F);
+    EXPECT_EQ(material.index_of_refraction, 1.5F);
+    ASSERT_EQ(arrived.warnings.size(), model.warnings.size() + 1);
+    EXPECT_EQ(arrived.warnings.back(), "Its reader handed over materials with numbers that cannot "
+                                       "be (1); what is usual stands for them.");
+}
+
+TEST(ModelTransfer, AMaterialWithATextureThatIsNotThereIsRefused) {
+    Bytes bytes = written(modelOfEverything());
+    const Bytes last_use{1, 0, 0, 0, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF, 0xFF};
+    const auto found = std::ranges::search(bytes, last_use);
+    ASSERT_FALSE(found.empty()); // the second texture, then none twice
+    found.front() = 2;
+    EXPECT_FALSE(taken(bytes));
 }
 
 TEST(ModelTransfer, ATextureWhosePixelsAreNotThereIsRefused) {

@@ -1,5 +1,7 @@
 #include "tests/import/transfer/TransferFixtures.h"
 
+#include "engine/scene/MaterialTextures.h"
+
 #include <stdexcept>
 
 namespace quarn::test {
@@ -19,21 +21,49 @@ std::shared_ptr<const KM_Mesh> quad(bool has_everything) {
     return mesh;
 }
 
-std::shared_ptr<const Material> material(const wchar_t* name,
-                                         std::shared_ptr<const Texture> texture) {
+/// Every number another one, and each texture at a place of its own.
+void setSurface(Material& made) {
+    float number = 0.0F;
+    for (float* const share :
+         {&made.metalness, &made.roughness, &made.occlusion_strength, &made.clearcoat,
+          &made.clearcoat_roughness, &made.transmission, &made.specular, &made.sheen_roughness})
+        *share = number += 0.0625F;
+    made.normal_scale = -2.0F;
+    made.emission = {7.0F, 8.0F, 9.0F};
+    made.is_one_sided = true;
+    made.is_unlit = true;
+    made.index_of_refraction = 1.75F;
+    made.thickness = 3.0F;
+    made.attenuation_distance = 4.0F;
+    made.attenuation_color = {0.1F, 0.2F, 0.3F};
+    made.specular_color = {1.5F, 2.5F, 3.5F};
+    made.sheen_color = {0.4F, 0.5F, 0.6F};
+    for (TextureUse* const use : textureUses(made)) {
+        number += 0.0625F;
+        use->u = {number, 1.0F, 2.0F};
+        use->v = {3.0F, number, 4.0F};
+    }
+}
+
+std::shared_ptr<Material> material(const wchar_t* name, std::shared_ptr<const Texture> texture) {
     Material made;
     made.name = name;
     made.base_color = {10, 20, 30, 40};
     made.base_color_texture = std::move(texture);
     made.alpha_cutoff = 0.25F;
     made.see_through = true;
+    setSurface(made);
     return std::make_shared<Material>(made);
 }
 
 void addObjects(ImportedModel& model) {
     const auto texture = std::make_shared<Texture>(
         Texture{2, 1, {1, 2, 3, 4, 5, 6, 7, 8}, TextureWrap::mirror, TextureWrap::clamp});
+    const auto rough = std::make_shared<Texture>(
+        Texture{1, 1, {9, 8, 7, 6}, TextureWrap::repeat, TextureWrap::repeat});
     const auto one = material(L"one", texture);
+    one->metal_rough.texture = one->occlusion.texture = rough;
+    one->normals.texture = texture;
     const auto other = material(L"other", texture);
     const auto shared = quad(true);
     model.meshes = {{L"left", {shared, one, KM_Xform::Translation(1, 2, 3)}},
