@@ -7,6 +7,8 @@
 #include "host/document/Document.h"
 #include "host/document/file/DocumentFile.h"
 #include "host/document/file/FileRemainder.h"
+#include "host/document/file/SurfaceLayout.h"
+#include "sdk/qncore/QnLocalize.h"
 #include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
 #include <map>
@@ -22,6 +24,28 @@ void moveLightIndex(Document& document, const std::map<int, int>& indices) {
     const auto moved = indices.find(record.LightIndex());
     record.SetLightIndex(moved == indices.end() ? LightStore::no_index : moved->second);
     document.properties().SetAnimationProperties(record);
+}
+
+void warnOfLostSurfaces(const DocumentContent& content, std::vector<std::string>& warnings) {
+    if (content.lost_surfaces)
+        warnings.push_back(
+            KM_wString(QnLocalizeString(L"An older program saved the document. What it does not "
+                                        L"know of materials is lost: metal, roughness, light, "
+                                        L"glass, and the textures of these. A copy made earlier "
+                                        L"may hold it.",
+                                        42900))
+                .ToUtf8());
+}
+
+void tellLostSurfaces(int version) {
+    Application::current()->tell(
+        KM_wString::FormatToString(
+            QnLocalizeString(L"A file of version %d holds no more of materials than their base "
+                             L"colour: metal, roughness, light, glass and the textures of these "
+                             L"were left out.",
+                             42901),
+            version)
+            .ToUtf8());
 }
 
 } // namespace
@@ -58,6 +82,8 @@ Result<void> saveDocument(Document& document, const std::filesystem::path& file,
         return written.error();
     if (!written.value().warning.empty())
         Application::current()->tell(written.value().warning);
+    if (losesSurfaces(content.value()))
+        tellLostSurfaces(options.version);
     return {};
 }
 
@@ -67,17 +93,19 @@ std::vector<std::string> openContent(Document& document, const DocumentContent& 
     const PlugInReading reading =
         readPlugInContents(*Application::current(), document, content.plug_ins, options);
     warnings.insert(warnings.end(), reading.warnings.begin(), reading.warnings.end());
+    warnOfLostSurfaces(content, warnings);
     return warnings;
 }
 
 std::vector<std::string> importContent(Document& document, const DocumentContent& content) {
     const std::map<int, int> light_indices = document.addContent(content);
     const auto options = FileOptionsAccess::forReading(CQuarnFileReadOptions::import_mode);
-    const PlugInReading reading =
+    PlugInReading reading =
         readPlugInContents(*Application::current(), document, content.plug_ins, options);
     if (reading.hasRead(ZoetrixPlugInId))
         moveLightIndex(document, light_indices);
-    return reading.warnings;
+    warnOfLostSurfaces(content, reading.warnings);
+    return std::move(reading.warnings);
 }
 
 } // namespace quarn

@@ -1,5 +1,6 @@
 #include "host/document/SceneFingerprint.h"
 
+#include "engine/scene/MaterialFields.h"
 #include "engine/scene/SceneContent.h"
 #include "ground/Checksum.h"
 
@@ -64,12 +65,37 @@ private:
     std::map<const void*, std::uint64_t> m_known;
 };
 
+/// Goes through the qualities of a material.
+class QualitySum {
+public:
+    QualitySum(SharedParts& parts, Checksum& sum) : m_parts(parts), m_sum(sum) {}
+
+    bool operator()(const char*, const auto& quality) {
+        add(quality);
+        return true;
+    }
+
+private:
+    void add(float number) { m_sum.add(number); }
+    void add(bool flag) { m_sum.add(flag); }
+    void add(const LinearRgb& numbers) { m_sum.addBytes(std::as_bytes(std::span(numbers))); }
+    void add(const TextureUse& use) {
+        m_sum.add(m_parts.fingerprintOf(use.texture));
+        add(use.u);
+        add(use.v);
+    }
+
+    SharedParts& m_parts;
+    Checksum& m_sum;
+};
+
 void add(const Material& material, SharedParts& parts, Checksum& sum) {
     add(material.base_color, sum);
     sum.add(parts.fingerprintOf(material.base_color_texture));
     sum.add(material.alpha_cutout);
     sum.add(material.alpha_cutoff);
     sum.add(material.see_through);
+    qualityFields(QualitySum(parts, sum), material);
 }
 
 void add(const SceneMesh& mesh, SharedParts& parts, Checksum& sum) {

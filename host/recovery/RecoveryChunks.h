@@ -12,7 +12,7 @@ namespace quarn {
 /// As DOCUMENT_MAGIC, for recovery files.
 inline constexpr std::array<std::uint8_t, 8> RECOVERY_MAGIC = {0x89, 'Q',  'R',  'R',
                                                                '\r', '\n', 0x1A, '\n'};
-inline constexpr std::int32_t RECOVERY_VERSION = 1;
+inline constexpr std::int32_t RECOVERY_VERSION = 2;
 /// Magic and version.
 inline constexpr std::size_t RECOVERY_BEGINNING_SIZE = RECOVERY_MAGIC.size() + 4;
 

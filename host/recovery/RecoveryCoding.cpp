@@ -2,6 +2,7 @@
 
 #include "host/document/file/ContentLayouts.h"
 #include "host/document/file/DocumentCoding.h"
+#include "host/document/file/SurfaceLayout.h"
 #include "host/recovery/RecoveryChunks.h"
 
 #include <algorithm>
@@ -79,6 +80,9 @@ private:
             return readTexture(m_archive, m_shared);
         case chunk::MATERIAL:
             return readMaterial(m_archive, m_shared);
+        case chunk::SURFACE:
+            return m_last_chunk == chunk::MATERIAL ? readSurface(m_archive, m_shared)
+                                                   : m_archive.Fail();
         case chunk::MESH:
             return readMesh(m_archive, m_shared);
         case chunk::PICTURE:
@@ -125,10 +129,21 @@ Result<Bytes> textureChunk(const Texture& texture) {
                    [&](KM_BinaryArchive& archive) { return writeTexture(archive, texture); });
 }
 
-Result<Bytes> materialChunk(const Material& material, std::int32_t texture) {
-    return chunkOf(chunk::MATERIAL, 0, "a material", [&](KM_BinaryArchive& archive) {
-        return writeMaterial(archive, material, texture);
-    });
+Result<Bytes> materialChunks(const Material& material, const SharedPlaces& places) {
+    const auto itself = [&](KM_BinaryArchive& archive) {
+        return writeMaterial(archive, material, places.of(material.base_color_texture.get()));
+    };
+    const auto surface = [&](KM_BinaryArchive& archive) {
+        return writeSurface(archive, material, places);
+    };
+    auto chunks = chunkOf(chunk::MATERIAL, 0, "a material", itself);
+    if (!chunks || !hasSurface(material))
+        return chunks;
+    const auto second = chunkOf(chunk::SURFACE, 0, "a material", surface);
+    if (!second)
+        return second;
+    chunks.value().insert(chunks.value().end(), second.value().begin(), second.value().end());
+    return chunks;
 }
 
 Result<Bytes> meshChunk(const KM_Mesh& mesh) {

@@ -19,11 +19,13 @@ namespace quarn {
 /// The bytes that every recovery file begins with.
 std::vector<std::uint8_t> recoveryBeginning();
 
-// Each of these makes one chunk. An error is part of a sentence.
+// Each of these makes what stands in the file for one thing. An error is part of a sentence.
 
 Result<std::vector<std::uint8_t>> textureChunk(const Texture& texture);
-/// @param texture  place of its texture, or NO_PLACE
-Result<std::vector<std::uint8_t>> materialChunk(const Material& material, std::int32_t texture);
+/// The chunk of a material and, where it is more than its base colour, the one that says so.
+/// @param places  of its textures
+Result<std::vector<std::uint8_t>> materialChunks(const Material& material,
+                                                 const SharedPlaces& places);
 Result<std::vector<std::uint8_t>> meshChunk(const KM_Mesh& mesh);
 /// @param png  a PNG file
 Result<std::vector<std::uint8_t>> pictureChunk(std::span<const std::byte> png);

@@ -1,6 +1,7 @@
 #include "host/recovery/RecoveryJournal.h"
 
 #include "engine/images/ImageFile.h"
+#include "engine/scene/MaterialFields.h"
 #include "ground/PathText.h"
 #include "host/recovery/RecoveryCoding.h"
 #include "host/recovery/RecoveryMarks.h"
@@ -57,8 +58,8 @@ template <class Visit> void forEachShared(const DocumentContent& content, Visit 
             visit(object.placed.mesh);
         if (material)
             visit(material);
-        if (material && material->base_color_texture)
-            visit(material->base_color_texture);
+        if (material)
+            forEachTexture(*material, visit);
     }
 }
 
@@ -204,10 +205,8 @@ Result<void> RecoveryJournal::appendShared(AppendedFile& file, const DocumentCon
     Result<void> done;
     for (auto at = added.textures.begin(); done && at != added.textures.end(); ++at)
         done = appendThing(file, *at, textureChunk(**at));
-    for (auto at = added.materials.begin(); done && at != added.materials.end(); ++at) {
-        const std::int32_t texture = m_places.of((*at)->base_color_texture.get());
-        done = appendThing(file, *at, materialChunk(**at, texture));
-    }
+    for (auto at = added.materials.begin(); done && at != added.materials.end(); ++at)
+        done = appendThing(file, *at, materialChunks(**at, m_places));
     for (auto at = added.meshes.begin(); done && at != added.meshes.end(); ++at)
         done = appendThing(file, *at, meshChunk(**at));
     forEachShared(content, [this](const auto& thing) { m_shared[thing.get()].thing = thing; });

@@ -1,9 +1,11 @@
 #include "host/session/ModelContents.h"
 
+#include "engine/scene/MaterialFields.h"
 #include "host/commands/AnimationText.h"
 #include "host/document/Document.h"
 #include "import/ImportedModel.h"
 
+#include <charconv>
 #include <map>
 #include <set>
 
@@ -13,6 +15,20 @@ namespace {
 
 std::string utf8(const KM_wString& text) {
     return text.ToUtf8();
+}
+
+/// The double that has the fewest digits among those that are this float: 0.3, where the float is
+/// 0.300000012.
+double asRead(float number) {
+    std::array<char, 32> digits{};
+    const auto end = std::to_chars(digits.data(), digits.data() + digits.size(), number).ptr;
+    double read = number;
+    std::from_chars(digits.data(), end, read);
+    return read;
+}
+
+std::array<double, 3> asRead(const std::array<float, 3>& numbers) {
+    return {asRead(numbers[0]), asRead(numbers[1]), asRead(numbers[2])};
 }
 
 class Telling {
@@ -81,10 +97,46 @@ private:
         const auto [known, is_new] =
             m_materials.try_emplace(material.get(), m_contents.materials.size());
         if (is_new)
-            m_contents.materials.push_back({utf8(material->name), material->base_color,
-                                            material->see_through,
-                                            textureOf(material->base_color_texture)});
+            m_contents.materials.push_back(contentsOf(*material));
         return known->second;
+    }
+
+    MaterialContents contentsOf(const Material& material) {
+        MaterialContents told;
+        told.name = utf8(material.name);
+        told.base_color = material.base_color;
+        told.is_see_through = material.see_through;
+        if (material.alpha_cutout)
+            told.alpha_cutoff = asRead(material.alpha_cutoff);
+        told.texture = textureOf(material.base_color_texture);
+        const auto tell = [&](const char* name, const auto& quality) {
+            told.qualities.emplace_back(name, qualityOf(quality));
+            return true;
+        };
+        qualityFields(tell, material);
+        tellShortly(material, told);
+        return told;
+    }
+
+    static void tellShortly(const Material& material, MaterialContents& told) {
+        constexpr LinearRgb BLACK{};
+        told.is_metal = material.metalness >= 0.5F;
+        told.has_normal_map = material.normals.texture != nullptr;
+        told.has_clearcoat = material.clearcoat > 0.0F;
+        told.shines = material.emission != BLACK;
+        told.lets_light_through = material.transmission > 0.0F || material.see_through;
+        told.is_unlit = material.is_unlit;
+        told.has_sheen = material.sheen_color != BLACK;
+    }
+
+    static MaterialQuality qualityOf(bool flag) { return flag; }
+    static MaterialQuality qualityOf(float number) { return asRead(number); }
+    static MaterialQuality qualityOf(const LinearRgb& color) { return asRead(color); }
+    MaterialQuality qualityOf(const TextureUse& use) {
+        const auto texture = textureOf(use.texture);
+        if (!texture)
+            return std::monostate();
+        return UsedTexture{*texture, asRead(use.u), asRead(use.v)};
     }
 
     std::optional<std::size_t> textureOf(const std::shared_ptr<const Texture>& texture) {

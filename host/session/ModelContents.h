@@ -4,10 +4,12 @@
 #include "kelmar/KM_Point.h"
 #include "sdk/qncore/QnExport.h"
 
+#include <array>
 #include <cstdint>
 #include <optional>
 #include <string>
 #include <utility>
+#include <variant>
 #include <vector>
 
 class CQuarnDoc;
@@ -21,12 +23,36 @@ struct TextureContents {
     std::uint64_t bytes = 0; ///< in memory
 };
 
+/// A texture as one quality of a material uses it. The mesh's coordinates (a, b) lie at
+/// (u[0] a + u[1] b + u[2], v[0] a + v[1] b + v[2]) on it.
+struct UsedTexture {
+    std::size_t texture = 0; ///< index among the document's textures
+    std::array<double, 3> u{};
+    std::array<double, 3> v{};
+};
+
+/// A quality of a material: a number, which may be infinite, a flag, a colour in linear light, a
+/// texture, or none where there could be one.
+using MaterialQuality =
+    std::variant<std::monostate, double, bool, std::array<double, 3>, UsedTexture>;
+
 /// A material of a document.
 struct MaterialContents {
     std::string name; ///< may be empty
     KM_Color base_color;
     bool is_see_through = false;
+    std::optional<double> alpha_cutoff; ///< what is less opaque is left out; none: nothing is
     std::optional<std::size_t> texture; ///< index among the document's textures
+    /// All other qualities, each with its name: "metalness".
+    std::vector<std::pair<std::string, MaterialQuality>> qualities;
+    // What is worth a word about them:
+    bool is_metal = false; ///< for one half at least
+    bool has_normal_map = false;
+    bool has_clearcoat = false;
+    bool shines = false; ///< by itself
+    bool lets_light_through = false;
+    bool is_unlit = false;
+    bool has_sheen = false;
 };
 
 /// An object of a document.

@@ -38,14 +38,33 @@ Json objectsOf(const ModelContents& contents) {
     return objects;
 }
 
+/// A number that is infinite becomes null.
+struct QualityJson {
+    Json operator()(std::monostate) const { return nullptr; }
+    Json operator()(double number) const { return number; }
+    Json operator()(bool flag) const { return flag; }
+    Json operator()(const std::array<double, 3>& color) const { return color; }
+    Json operator()(const UsedTexture& use) const {
+        return {{"texture", use.texture}, {"u", use.u}, {"v", use.v}};
+    }
+};
+
+Json materialOf(const MaterialContents& material) {
+    Json json = {{"name", material.name},
+                 {"base_color", hexOf(material.base_color)},
+                 {"opacity", material.base_color.a / 255.0},
+                 {"see_through", material.is_see_through},
+                 {"alpha_cutoff", material.alpha_cutoff ? Json(*material.alpha_cutoff) : Json()},
+                 {"texture", indexOrNull(material.texture)}};
+    for (const auto& [name, quality] : material.qualities)
+        json[name] = std::visit(QualityJson(), quality);
+    return json;
+}
+
 Json materialsOf(const ModelContents& contents) {
     Json materials = Json::array();
     for (const MaterialContents& material : contents.materials)
-        materials.push_back({{"name", material.name},
-                             {"base_color", hexOf(material.base_color)},
-                             {"opacity", material.base_color.a / 255.0},
-                             {"see_through", material.is_see_through},
-                             {"texture", indexOrNull(material.texture)}});
+        materials.push_back(materialOf(material));
     return materials;
 }
 

@@ -100,8 +100,40 @@ std::string objectsLine(const ModelContents& contents) {
            (hidden > 0 ? "; " + groupedText(hidden) + " hidden" : "") + "\n";
 }
 
+struct QualityWords {
+    bool MaterialContents::*quality;
+    const char* one;
+    const char* several;
+};
+
+constexpr QualityWords QUALITIES[] = {
+    {&MaterialContents::is_metal, "is metal", "are metal"},
+    {&MaterialContents::has_normal_map, "has a normal map", "have normal maps"},
+    {&MaterialContents::has_clearcoat, "has a clear coat", "have clear coats"},
+    {&MaterialContents::shines, "shines by itself", "shine by themselves"},
+    {&MaterialContents::lets_light_through, "lets light through", "let light through"},
+    {&MaterialContents::is_unlit, "is unlit", "are unlit"},
+    {&MaterialContents::has_sheen, "has a sheen that is not drawn",
+     "have sheens that are not drawn"},
+};
+
+/// "materials: 5, of which 3 are metal, 1 shines by itself".
+std::string materialsLine(const ModelContents& contents) {
+    std::string text = "materials: " + groupedText(contents.materials.size());
+    const char* before = ", of which ";
+    for (const QualityWords& words : QUALITIES) {
+        const auto count =
+            static_cast<std::size_t>(std::ranges::count(contents.materials, true, words.quality));
+        if (count == 0)
+            continue;
+        text += before + counted(count, words.one, words.several);
+        before = ", ";
+    }
+    return text + "\n";
+}
+
 std::string looksLines(const ModelContents& contents) {
-    std::string text = "materials: " + groupedText(contents.materials.size()) + "\n";
+    std::string text = materialsLine(contents);
     std::uint64_t bytes = 0;
     std::string sizes;
     for (const TextureContents& texture : contents.textures) {

@@ -2,6 +2,7 @@
 // payload of a chunk of the kind that this byte chooses, in a file that is sound besides, so that
 // the check sequences do not keep the fuzzer from the fields.
 #include "host/document/file/ChunkIds.h"
+#include "host/document/file/ContentLayouts.h"
 #include "host/document/file/DocumentCoding.h"
 #include "host/document/file/DocumentHeader.h"
 #include "kelmar/KM_BinaryArchive.h"
@@ -21,7 +22,7 @@ using Span = std::span<const std::uint8_t>;
 
 constexpr std::array KINDS = {chunk::SETTINGS, chunk::TEXTURE, chunk::MATERIAL, chunk::MESH,
                               chunk::OBJECT,   chunk::VIEW,    chunk::CAMERA,   chunk::LIGHT,
-                              chunk::PLUG_IN,  chunk::END};
+                              chunk::PLUG_IN,  chunk::END,     chunk::SURFACE};
 
 // A broken promise ends the program, which is how a fuzzer learns of it.
 void require(bool promise) {
@@ -71,6 +72,11 @@ Bytes soundMesh() {
     });
 }
 
+// One that objects can name and that a surface belongs to.
+Bytes soundMaterial() {
+    return payloadOf([](KM_BinaryArchive& archive) { writeMaterial(archive, Material(), 0); });
+}
+
 Bytes fileAround(std::uint32_t kind, Span payload) {
     KM_BinaryArchive archive = KM_BinaryArchive::ForWriting();
     archive.WriteBytes(DOCUMENT_MAGIC);
@@ -79,6 +85,7 @@ Bytes fileAround(std::uint32_t kind, Span payload) {
         addChunk(archive, chunk::SETTINGS, soundSettings());
     addChunk(archive, chunk::TEXTURE, soundTexture());
     addChunk(archive, chunk::MESH, soundMesh());
+    addChunk(archive, chunk::MATERIAL, soundMaterial());
     addChunk(archive, kind, payload);
     if (kind != chunk::END)
         addChunk(archive, chunk::END, payloadOf([](KM_BinaryArchive& end) {

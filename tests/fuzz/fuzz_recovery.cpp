@@ -19,8 +19,8 @@ using namespace quarn;
 using Bytes = std::vector<std::uint8_t>;
 using Span = std::span<const std::uint8_t>;
 
-constexpr std::array KINDS = {chunk::TEXTURE, chunk::MATERIAL, chunk::MESH, chunk::PICTURE,
-                              chunk::STATE};
+constexpr std::array KINDS = {chunk::TEXTURE, chunk::MATERIAL, chunk::MESH,
+                              chunk::PICTURE, chunk::STATE,    chunk::SURFACE};
 
 // A broken promise ends the program, which is how a fuzzer learns of it.
 void require(bool promise) {
@@ -40,13 +40,14 @@ Bytes soundState() {
     return chunk.value();
 }
 
-// The chunk stands between two states that need it not.
+// The chunk stands, behind a material, between two states that need it not.
 Bytes fileAround(std::uint32_t kind, Span payload) {
     KM_BinaryArchive archive = KM_BinaryArchive::ForWriting();
     require(archive.BeginWriteChunk(kind) && archive.WriteBytes(payload) &&
             archive.EndWriteChunk());
     Bytes bytes = recoveryBeginning();
     append(bytes, soundState());
+    append(bytes, materialChunks(Material(), SharedPlaces()));
     append(bytes, archive.TakeBytes());
     if (kind != chunk::STATE)
         append(bytes, soundState());

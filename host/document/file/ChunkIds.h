@@ -15,6 +15,8 @@ constexpr std::uint32_t named(const char (&name)[5]) {
 inline constexpr std::uint32_t SETTINGS = named("DOCU");
 inline constexpr std::uint32_t TEXTURE = named("TEXR");
 inline constexpr std::uint32_t MATERIAL = named("MATL");
+/// What the material directly before it is beyond its base colour.
+inline constexpr std::uint32_t SURFACE = named("SURF");
 inline constexpr std::uint32_t MESH = named("MESH");
 inline constexpr std::uint32_t OBJECT = named("OBJT");
 inline constexpr std::uint32_t VIEW = named("VIEW");

@@ -119,22 +119,6 @@ template <class Step, class AnyView> bool viewFields(Step step, AnyView& view) {
            step(view.height_px) && step(view.active) && step.check(makesSense(view));
 }
 
-/// Reads the place of a thing.
-/// @param thing  receives it; untouched by NO_PLACE, where that is allowed
-template <class T>
-bool readShared(KM_BinaryArchive& archive, const std::vector<std::shared_ptr<const T>>& things,
-                bool may_be_none, std::shared_ptr<const T>& thing) {
-    std::int32_t place = NO_PLACE;
-    if (!archive.ReadInt(place))
-        return false;
-    if (place == NO_PLACE && may_be_none)
-        return true;
-    if (place < 0 || static_cast<std::size_t>(place) >= things.size())
-        return archive.Fail();
-    thing = things[static_cast<std::size_t>(place)];
-    return true;
-}
-
 bool readPoint(KM_BinaryArchive& archive, std::optional<KM_3dPoint>& point) {
     KM_3dPoint location;
     if (!archive.ReadPoint(location))

@@ -22,6 +22,9 @@ namespace quarn {
 /// KM_CURRENT_ARCHIVE_VERSION.
 inline constexpr int OLDEST_DOCUMENT_VERSION = 3;
 
+/// Files of older versions hold no more of materials than their base colour.
+inline constexpr int FIRST_VERSION_WITH_SURFACES = 5;
+
 /// An object of a document file: exactly one of mesh, curve and point is there. Meshes, materials
 /// and textures may be shared by several objects, in memory and in the file.
 struct ObjectContent {
@@ -96,6 +99,9 @@ struct DocumentContent {
     std::vector<LightContent> lights; ///< by ascending index, each below settings.light_slots
     std::vector<PlugInContent> plug_ins;
     std::vector<UnknownContent> unknown;
+    /// What materials were beyond their base colour was read and can be given to none: a program
+    /// that does not know it saved the file. Not written.
+    bool lost_surfaces = false;
 };
 
 } // namespace quarn

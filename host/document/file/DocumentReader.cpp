@@ -2,6 +2,7 @@
 #include "host/document/file/ContentLayouts.h"
 #include "host/document/file/DocumentCoding.h"
 #include "host/document/file/DocumentHeader.h"
+#include "host/document/file/SurfaceLayout.h"
 
 #include <algorithm>
 #include <exception>
@@ -53,8 +54,11 @@ private:
     bool readChunk() {
         std::uint32_t id = 0;
         std::uint64_t length = 0;
-        return m_archive.BeginReadChunk(id, length) && readPayload(id) &&
-               m_archive.BytesLeft() == 0 && m_archive.EndReadChunk();
+        if (!m_archive.BeginReadChunk(id, length) || !readPayload(id) ||
+            m_archive.BytesLeft() > 0 || !m_archive.EndReadChunk())
+            return false;
+        m_last_chunk = id;
+        return true;
     }
 
     bool readPayload(std::uint32_t id) {
@@ -65,6 +69,9 @@ private:
             return readTexture(m_archive, m_shared);
         case chunk::MATERIAL:
             return readMaterial(m_archive, m_shared);
+        case chunk::SURFACE:
+            return m_last_chunk == chunk::MATERIAL ? readSurface(m_archive, m_shared)
+                                                   : passOverSurface();
         case chunk::MESH:
             return readMesh(m_archive, m_shared);
         case chunk::OBJECT:
@@ -88,6 +95,14 @@ private:
         default:
             return keep(id);
         }
+    }
+
+    /// A program that does not know such chunks keeps them, but not where they stood, and the
+    /// textures that they name are gone.
+    bool passOverSurface() {
+        std::span<const std::uint8_t> passed_over;
+        m_content.lost_surfaces = true;
+        return m_archive.ViewBytes(m_archive.BytesLeft(), passed_over);
     }
 
     bool readOnlySettings() {
@@ -151,6 +166,7 @@ private:
     SharedContent m_shared;
     bool m_has_settings = false;
     bool m_has_ended = false;
+    std::uint32_t m_last_chunk = 0;
 };
 
 } // namespace

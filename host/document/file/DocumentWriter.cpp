@@ -2,7 +2,9 @@
 #include "host/document/file/ContentLayouts.h"
 #include "host/document/file/DocumentCoding.h"
 #include "host/document/file/DocumentHeader.h"
+#include "host/document/file/SurfaceLayout.h"
 
+#include <algorithm>
 #include <exception>
 
 namespace quarn {
@@ -75,15 +77,27 @@ private:
         const auto texture = [](KM_BinaryArchive& archive, const Texture* thing) {
             return writeTexture(archive, *thing);
         };
-        const auto material = [&](KM_BinaryArchive& archive, const Material* thing) {
-            return writeMaterial(archive, *thing, m_places.of(thing->base_color_texture.get()));
-        };
         const auto mesh = [](KM_BinaryArchive& archive, const KM_Mesh* thing) {
             return writeMesh(archive, *thing);
         };
         return writeEach(chunk::TEXTURE, "a texture", m_shared.textures, texture) &&
-               writeEach(chunk::MATERIAL, "a material", m_shared.materials, material) &&
+               std::ranges::all_of(
+                   m_shared.materials,
+                   [this](const Material* material) { return writeMaterialChunks(*material); }) &&
                writeEach(chunk::MESH, "a mesh", m_shared.meshes, mesh);
+    }
+
+    bool writeMaterialChunks(const Material& material) {
+        const auto itself = [&] {
+            return writeMaterial(m_archive, material,
+                                 m_places.of(material.base_color_texture.get()));
+        };
+        const auto surface = [&] { return writeSurface(m_archive, material, m_places); };
+        const std::string what = "the material \"" + material.name.ToUtf8() + "\"";
+        if (!writeChunk(chunk::MATERIAL, what, itself))
+            return false;
+        return m_content.version < FIRST_VERSION_WITH_SURFACES || !hasSurface(material) ||
+               writeChunk(chunk::SURFACE, what, surface);
     }
 
     bool writeObjects() {

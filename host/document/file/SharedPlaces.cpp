@@ -1,5 +1,7 @@
 #include "host/document/file/SharedPlaces.h"
 
+#include "engine/scene/MaterialFields.h"
+
 namespace quarn {
 
 SharedThings SharedPlaces::add(const DocumentContent& content) {
@@ -8,8 +10,13 @@ SharedThings SharedPlaces::add(const DocumentContent& content) {
         m_meshes.add(object.placed.mesh.get(), added.meshes);
         m_materials.add(object.placed.material.get(), added.materials);
     }
-    for (const Material* material : added.materials)
-        m_textures.add(material->base_color_texture.get(), added.textures);
+    const auto add = [&](const auto& texture) { m_textures.add(texture.get(), added.textures); };
+    for (const Material* material : added.materials) {
+        if (content.version >= FIRST_VERSION_WITH_SURFACES)
+            forEachTexture(*material, add);
+        else
+            add(material->base_color_texture);
+    }
     return added;
 }
 

@@ -27,10 +27,28 @@ struct SharedThings {
 /// The place that stands for no texture and no material.
 inline constexpr std::int32_t NO_PLACE = -1;
 
+/// Reads the place of a thing.
+/// @param thing  receives it; untouched by NO_PLACE, where that is allowed
+/// @return false, with the archive failed, when there is nothing at the place
+template <class T>
+bool readShared(KM_BinaryArchive& archive, const std::vector<std::shared_ptr<const T>>& things,
+                bool may_be_none, std::shared_ptr<const T>& thing) {
+    std::int32_t place = NO_PLACE;
+    if (!archive.ReadInt(place))
+        return false;
+    if (place == NO_PLACE && may_be_none)
+        return true;
+    if (place < 0 || static_cast<std::size_t>(place) >= things.size())
+        return archive.Fail();
+    thing = things[static_cast<std::size_t>(place)];
+    return true;
+}
+
 /// The places of the textures, materials and meshes of a file, each kind counted from 0.
 class SharedPlaces {
 public:
-    /// Gives places to all that the objects of a content share and that has none yet.
+    /// Gives places to all that the objects of a content share, as far as files of its version hold
+    /// it, and that has none yet.
     /// @return what got a place, in the order of the places; lives as long as the content
     SharedThings add(const DocumentContent& content);
     /// Keeps the place of a thing that is gone from one that takes its memory; it is given to

@@ -1,7 +1,9 @@
 #include "ground/PathText.h"
+#include "host/document/file/ChunkIds.h"
 #include "host/document/file/DocumentFile.h"
 #include "tests/host/app/TestCommand.h"
 #include "tests/host/document/DocumentFixtures.h"
+#include "tests/host/document/QualityChanges.h"
 #include "tests/support/OtherUser.h"
 #include "tests/support/TempFolder.h"
 
@@ -54,6 +56,19 @@ protected:
         auto content = readDocumentFile(folder / name);
         EXPECT_TRUE(content) << (content ? "" : content.message());
         return content ? std::move(content.value()) : DocumentContent();
+    }
+
+    /// A mesh "Door" with a material in which no quality is the usual one.
+    void addLacquered() {
+        document().objects().addMesh(L"Door", {boxMesh({0, 0, 0}, {1, 1, 1}),
+                                               std::make_shared<Material>(changedMaterial())});
+    }
+    const Material& lacquer() { return *document().objects().findByName(L"Door")->placed.material; }
+    static std::size_t changesOf(const Material& material) {
+        std::size_t count = 0;
+        for (const QualityChange& change : qualityChanges())
+            count += change.is_made(material) ? 1 : 0;
+        return count;
     }
 
     TempFolder folder;
@@ -264,6 +279,45 @@ TEST_F(SaveCommandsTest, AnOlderVersionIsWrittenAndLeavesTheDocumentItsFile) {
     ASSERT_EQ(runOn(L"_-SaveAs [Version] 4 [Version] 5", "new.quarn"), CQuarnCommand::success);
     EXPECT_EQ(read("new.quarn").version, 5);
     EXPECT_EQ(document().file(), folder / "new.quarn");
+}
+
+TEST_F(SaveCommandsTest, AnOlderVersionSaysWhatItLeavesOutOfMaterials) {
+    ASSERT_EQ(runOn(L"_-SaveAs [Version] 4", "plain.quarn"), CQuarnCommand::success);
+    EXPECT_EQ(printed(), "Saved plain.quarn.\n");
+    addLacquered();
+    ASSERT_EQ(runOn(L"_-SaveAs [Version] 4", "old.quarn"), CQuarnCommand::success);
+    EXPECT_EQ(printed(), "A file of version 4 holds no more of materials than their base colour: "
+                         "metal, roughness, light, glass and the textures of these were left "
+                         "out.\nSaved old.quarn.\n");
+    EXPECT_EQ(changesOf(*read("old.quarn").objects.back().placed.material), 0U);
+    ASSERT_EQ(runOn(L"_-SaveAs", "new.quarn"), CQuarnCommand::success);
+    EXPECT_EQ(printed(), "Saved new.quarn.\n");
+}
+
+TEST_F(SaveCommandsTest, MaterialsAreKeptBySavingOpeningImportingAndSavingTheSelection) {
+    addLacquered();
+    const std::size_t all = qualityChanges().size();
+    ASSERT_EQ(runOn(L"_-SaveAs", "whole.quarn"), CQuarnCommand::success);
+    run(L"New");
+    ASSERT_EQ(runOn(L"_-Open", "whole.quarn"), CQuarnCommand::success);
+    EXPECT_EQ(changesOf(lacquer()), all);
+    run(L"_-Select Door");
+    ASSERT_EQ(runOn(L"_-SaveSelected", "part.quarn"), CQuarnCommand::success);
+    run(L"New");
+    ASSERT_EQ(runOn(L"_-Import", "part.quarn"), CQuarnCommand::success);
+    EXPECT_EQ(changesOf(lacquer()), all);
+}
+
+TEST_F(SaveCommandsTest, WhatAnOlderProgramLostOfMaterialsIsTold) {
+    DocumentContent content = document().content(false);
+    content.unknown = {{chunk::SURFACE, {1, 2, 3}}};
+    ASSERT_TRUE(writeDocumentFile(content, folder / "house.quarn"));
+    for (const wchar_t* line : {L"_-Open", L"_-Import"}) {
+        run(L"New");
+        ASSERT_EQ(runOn(line, "house.quarn"), CQuarnCommand::success);
+        EXPECT_THAT(printed(), HasSubstr("An older program saved the document. What it does not "
+                                         "know of materials is lost"));
+    }
 }
 
 TEST_F(SaveCommandsTest, VersionsThatDoNotExistAreRefused) {

@@ -5,6 +5,7 @@
 #include "kelmar/KM_NurbsCurve.h"
 #include "kelmar/KM_PolylineCurve.h"
 #include "tests/host/document/DocumentFixtures.h"
+#include "tests/host/document/QualityChanges.h"
 
 namespace quarn::test {
 
@@ -85,6 +86,11 @@ void addObjects(std::vector<ObjectContent>& objects) {
     point.name = L"Blick";
     point.point = KM_3dPoint(0.1, 0.2, 0.3);
     objects.push_back(point);
+    ObjectContent lacquered = box;
+    lacquered.id = sampleId(22);
+    lacquered.name = L"Schrank";
+    lacquered.placed.material = std::make_shared<Material>(changedMaterial());
+    objects.push_back(lacquered);
 }
 
 void addViews(DocumentContent& content) {

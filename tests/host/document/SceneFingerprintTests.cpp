@@ -2,9 +2,11 @@
 
 #include "ground/Checksum.h"
 #include "tests/engine/display/DisplayFixture.h"
+#include "tests/host/document/QualityChanges.h"
 
 #include <functional>
 #include <gtest/gtest.h>
+#include <set>
 
 namespace quarn::test {
 namespace {
@@ -75,6 +77,45 @@ TEST(SceneFingerprintTest, ChangesWithEverythingThatIsSeen) {
         content.lights[0] = sunLight({0.0, 1.0, -1.0});
     }));
     EXPECT_TRUE(isNoticed([](SceneContent& content) { content.lights.clear(); }));
+}
+
+/// The sample with this change of its material.
+SceneContent sceneWith(const std::function<void(Material&)>& change) {
+    SceneContent content = sampleScene();
+    auto material = std::make_shared<Material>(*content.meshes[0].placed.material);
+    change(*material);
+    content.meshes[0].placed.material = std::move(material);
+    return content;
+}
+
+TEST(SceneFingerprintTest, ChangesWithEveryQualityOfAMaterialToAnotherEachTime) {
+    std::set<std::uint64_t> fingerprints{fingerprintOf(sampleScene())};
+    for (const QualityChange& change : qualityChanges())
+        EXPECT_TRUE(fingerprints.insert(fingerprintOf(sceneWith(change.make))).second)
+            << change.name;
+}
+
+TEST(SceneFingerprintTest, ChangesWithTheWayThatATextureLies) {
+    const auto fingerprint = [](float shift_u, float shift_v) {
+        return fingerprintOf(sceneWith([&](Material& material) {
+            material.normals.texture = material.base_color_texture;
+            material.normals.u[2] = shift_u;
+            material.normals.v[2] = shift_v;
+        }));
+    };
+    EXPECT_EQ(fingerprint(0.5F, 0.0F), fingerprint(0.5F, 0.0F));
+    EXPECT_NE(fingerprint(0.0F, 0.0F), fingerprint(0.5F, 0.0F));
+    EXPECT_NE(fingerprint(0.0F, 0.5F), fingerprint(0.5F, 0.0F));
+}
+
+TEST(SceneFingerprintTest, TellsATextureOfOneQualityFromThatOfAnother) {
+    const auto use = [](TextureUse Material::*quality) {
+        return fingerprintOf(sceneWith([=](Material& material) {
+            (material.*quality).texture = material.base_color_texture;
+        }));
+    };
+    EXPECT_NE(use(&Material::occlusion), use(&Material::metal_rough));
+    EXPECT_NE(use(&Material::clearcoat_texture), use(&Material::specular_texture));
 }
 
 } // namespace

@@ -26,7 +26,7 @@ public:
         for (const Texture* texture : shared.textures)
             add(textureChunk(*texture));
         for (const Material* material : shared.materials)
-            add(materialChunk(*material, m_places.of(material->base_color_texture.get())));
+            add(materialChunks(*material, m_places));
         for (const KM_Mesh* mesh : shared.meshes)
             add(meshChunk(*mesh));
         RecoveryState state;

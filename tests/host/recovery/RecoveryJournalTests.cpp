@@ -2,6 +2,7 @@
 
 #include "host/recovery/RecoveryGlance.h"
 #include "tests/host/document/DocumentFixtures.h"
+#include "tests/host/document/QualityChanges.h"
 #include "tests/host/document/SampleContent.h"
 #include "tests/host/recovery/RecoveryFixtures.h"
 
@@ -9,6 +10,7 @@
 
 #include <csignal>
 #include <sys/resource.h>
+#include <sys/stat.h>
 
 namespace quarn::test {
 namespace {
@@ -114,6 +116,42 @@ TEST_F(RecoveryJournalTest, AMeshIsWrittenOnceHoweverOftenStatesFollow) {
     EXPECT_GT(fs::file_size(file) - size_before, 900'000U);
     EXPECT_LT(fs::file_size(file) - size_before, 1'100'000U);
     EXPECT_EQ(documentBytes(contentIn(file)), documentBytes(content));
+}
+
+TEST_F(RecoveryJournalTest, MaterialsComeBackWhole) {
+    RecoveryJournal journal(state_folder, self);
+    DocumentContent content;
+    addMesh(content, boxMesh({0, 0, 0}, {1, 1, 1}));
+    content.objects[0].placed.material = std::make_shared<Material>(changedMaterial());
+    write(journal, stateOf(content));
+    const DocumentContent back = contentIn(onlyFile(kept_in));
+    ASSERT_THAT(back.objects, SizeIs(1));
+    for (const QualityChange& change : qualityChanges())
+        EXPECT_TRUE(change.is_made(*back.objects[0].placed.material)) << change.name;
+}
+
+TEST_F(RecoveryJournalTest, TexturesOfAnyQualityArePassedOnAndAreNotTakenForGarbage) {
+    RecoveryJournal journal(state_folder, self);
+    auto texture = std::make_shared<Texture>();
+    texture->width = texture->height = 2200; // 19 MB
+    texture->rgba.resize(4UL * 2200 * 2200);
+    auto material = std::make_shared<Material>();
+    material->normals.texture = texture;
+    DocumentContent content;
+    addMesh(content, boxMesh({0, 0, 0}, {1, 1, 1}));
+    content.objects[0].placed.material = material;
+    write(journal, stateOf(content));
+    const auto file = onlyFile(kept_in);
+    struct stat begun {};
+    ASSERT_EQ(stat(file.c_str(), &begun), 0);
+    for (int i = 0; i < 3; ++i)
+        write(journal, stateOf(content));
+    struct stat appended {};
+    ASSERT_EQ(stat(file.c_str(), &appended), 0);
+    EXPECT_EQ(begun.st_ino, appended.st_ino) << "it was not written anew";
+    EXPECT_LT(appended.st_size - begun.st_size, 10'000) << "the texture stands there once";
+    const DocumentContent back = contentIn(file);
+    EXPECT_EQ(back.objects[0].placed.material->normals.texture->rgba, texture->rgba);
 }
 
 TEST_F(RecoveryJournalTest, AMeshInTheMemoryOfOneThatIsGoneIsAnotherMesh) {
@@ -255,7 +293,7 @@ TEST_F(RecoveryJournalTest, AContentThatCannotBeWrittenLeavesTheStateBefore) {
     RecoveryJournal journal(state_folder, self);
     const RecoveryState good = stateOf(sampleContent());
     RecoveryState bad = good;
-    bad.content.objects.back().point = KM_3dPoint::UnsetPoint;
+    bad.content.objects[5].point = KM_3dPoint::UnsetPoint;
     write(journal, good);
     EXPECT_FALSE(journal.write(bad));
     EXPECT_EQ(documentBytes(contentIn(onlyFile(kept_in))), documentBytes(good.content));
