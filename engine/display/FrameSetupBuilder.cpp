@@ -3,6 +3,7 @@
 #include "engine/display/DisplayMode.h"
 #include "engine/display/DisplayScene.h"
 #include "engine/display/DisplayTable.h"
+#include "engine/display/ShownLight.h"
 #include "engine/display/SkyModel.h"
 #include "engine/images/ColorSpace.h"
 #include "kelmar/KM_Viewport.h"
@@ -120,10 +121,12 @@ void setGround(FrameSetup& frame) {
     set(frame.ground_albedo, {0.49F, 0.48F, 0.455F});
 }
 
-void setStyle(FrameSetup& frame, SurfaceStyle style, bool shows_panes) {
+void setStyle(FrameSetup& frame, SurfaceStyle style, const RayScene& rays) {
     frame.textures = style == SurfaceStyle::lit;
-    if (style == SurfaceStyle::lit || style == SurfaceStyle::studio)
-        frame.has_see_through = shows_panes;
+    if (style == SurfaceStyle::lit || style == SurfaceStyle::studio) {
+        frame.has_see_through = rays.hasSeeThrough();
+        frame.has_looks = rays.hasLooks();
+    }
     if (style == SurfaceStyle::translucent)
         frame.layers = {12, 0.36F, 0.85F, 0.55F};
     if (style == SurfaceStyle::x_ray)
@@ -195,7 +198,7 @@ FrameSetup makeFrameSetup(const DisplayScene& scene, const KM_Viewport& viewport
                          : raysToBackground(viewport, width, height);
     if (is_seen && mode.surface_style != SurfaceStyle::none)
         setScene(frame, scene);
-    setStyle(frame, mode.surface_style, scene.rays().hasSeeThrough());
+    setStyle(frame, mode.surface_style, scene.rays());
     const CameraFrame camera{frame.rays.camera_x, frame.rays.camera_y, frame.rays.camera_z};
     setLighting(frame, lightingOf(scene, mode, camera));
     if (mode.has_ground_plane)
@@ -208,6 +211,7 @@ FrameSetup makeFrameSetup(const DisplayScene& scene, const KM_Viewport& viewport
     set(frame.background_top, sceneLightShownAs(mode.background_top));
     set(frame.background_bottom, sceneLightShownAs(mode.background_bottom));
     frame.display_table = displayTable().entries();
+    frame.shown_light = shownLight().entries();
     return frame;
 }
 

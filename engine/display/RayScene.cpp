@@ -415,9 +415,12 @@ void RayScene::commit(BuildProgress* progress) {
             setEnabled(instance.geometry.get(), wanted);
         instance.enabled = wanted;
     }
-    m_has_see_through = std::any_of(m_members.begin(), m_members.end(), [](const Member& member) {
-        return member.visible && member.surface.see_through;
-    });
+    m_has_see_through = false;
+    m_has_looks = false;
+    for (const Member& member : m_members) {
+        m_has_see_through |= member.visible && member.surface.see_through;
+        m_has_looks |= member.visible && member.surface.look;
+    }
     chooseRoot();
 }
 

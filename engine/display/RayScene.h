@@ -60,6 +60,8 @@ public:
 
     /// Whether some visible surface is see-through.
     bool hasSeeThrough() const { return m_has_see_through; }
+    /// Whether some visible surface looks like more than its base colour.
+    bool hasLooks() const { return m_has_looks; }
 
     /// How often a search structure, of a group or of all, was built.
     std::size_t buildCount() const { return m_build_count; }
@@ -146,6 +148,7 @@ private:
     std::vector<std::uint32_t> m_surface_members;
     std::size_t m_build_count = 0;
     bool m_has_see_through = false;
+    bool m_has_looks = false;
 };
 
 } // namespace quarn

@@ -38,7 +38,7 @@ struct TextureUse {
 };
 
 /// A colour in linear light; its numbers may be above 1 where it is light.
-using LinearColor = std::array<float, 3>;
+using LinearRgb = std::array<float, 3>;
 
 /// What a surface looks like: the metallic-roughness model of glTF 2.0 (Khronos Group, "glTF 2.0
 /// Specification", 2021, 3.9 and appendix B) and of its ratified extensions that are named here.
@@ -63,7 +63,7 @@ struct Material {
     float normal_scale = 1.0F;
     TextureUse occlusion;            ///< numbers: red is how much of the sky's light arrives
     float occlusion_strength = 1.0F; ///< 0 to 1
-    LinearColor emission{0, 0, 0};   ///< from 0, its strength multiplied in
+    LinearRgb emission{0, 0, 0};     ///< from 0, its strength multiplied in
     TextureUse emission_texture;     ///< colours
     bool is_one_sided = false;       ///< its back is not seen
     bool is_unlit = false;           ///< shows its base colour whatever the light (unlit)
@@ -82,15 +82,15 @@ struct Material {
     /// Of what is inside: the distance, in units of the mesh, after which white light has the
     /// colour; infinite: it takes no light.
     float attenuation_distance = std::numeric_limits<float>::infinity();
-    LinearColor attenuation_color{1, 1, 1};
+    LinearRgb attenuation_color{1, 1, 1};
 
-    float specular = 1.0F;               ///< 0 to 1: strength of the mirroring of what is no metal
-    LinearColor specular_color{1, 1, 1}; ///< its colour when seen straight on, from 0
-    TextureUse specular_texture;         ///< numbers: alpha
-    TextureUse specular_color_texture;   ///< colours
+    float specular = 1.0F;             ///< 0 to 1: strength of the mirroring of what is no metal
+    LinearRgb specular_color{1, 1, 1}; ///< its colour when seen straight on, from 0
+    TextureUse specular_texture;       ///< numbers: alpha
+    TextureUse specular_color_texture; ///< colours
 
-    LinearColor sheen_color{0, 0, 0}; ///< kept, not drawn
-    float sheen_roughness = 0.0F;     ///< kept, not drawn
+    LinearRgb sheen_color{0, 0, 0}; ///< kept, not drawn
+    float sheen_roughness = 0.0F;   ///< kept, not drawn
 };
 
 } // namespace quarn

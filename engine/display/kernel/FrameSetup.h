@@ -92,6 +92,7 @@ struct FrameSetup {
     float plain_albedo[3] = {1, 1, 1};
     FrameLayers layers;
     bool has_see_through = false; ///< surfaces of see-through materials are drawn so
+    bool has_looks = false;       ///< some surfaces look like more than their base colours
 
     float ambient_base[3] = {0, 0, 0};
     float ambient_slope[3][3] = {};
@@ -126,6 +127,7 @@ struct FrameSetup {
     float* free_sky = nullptr;      ///< by place, 0 to 1
 
     const std::uint32_t* display_table = nullptr; ///< DisplayTable::entries()
+    const std::uint32_t* shown_light = nullptr;   ///< ShownLight::entries()
 
     std::uint32_t* pixels = nullptr; ///< width * height, bytes r, g, b, a in memory
     float* nearness = nullptr;       ///< see DepthImage; null when nobody asks

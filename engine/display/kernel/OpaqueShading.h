@@ -2,7 +2,7 @@
 
 #include "engine/display/kernel/Background.h"
 #include "engine/display/kernel/GroundPlane.h"
-#include "engine/display/kernel/SurfaceShading.h"
+#include "engine/display/kernel/LookShading.h"
 
 namespace quarn {
 namespace {
@@ -16,18 +16,18 @@ inline LaneColors blended(const LaneColors& under, const LaneColors& over, const
 inline LaneColors shadeOpaque(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfaces) {
     const LaneMask missed = packet.active & ~packet.hit;
     if (!any(missed))
-        return shadeSurfaces(frame, packet, surfaces, packet.hit);
+        return sentLight(frame, packet, surfaces, packet.hit);
     LaneColors color = backgroundColors(frame, packet);
     if (!frame.has_ground) {
         if (!any(packet.hit))
             return color;
-        return select(packet.hit, shadeSurfaces(frame, packet, surfaces, packet.hit), color);
+        return select(packet.hit, sentLight(frame, packet, surfaces, packet.hit), color);
     }
     const GroundLanes ground = meetGround(frame, packet, surfaces);
     const LaneMask lit = packet.hit | ground.seen;
     if (!any(lit))
         return color;
-    const LaneColors shaded = shadeSurfaces(frame, packet, surfaces, lit);
+    const LaneColors shaded = sentLight(frame, packet, surfaces, lit);
     color = blended(color, shaded, ground.weight);
     return select(packet.hit, shaded, color);
 }

@@ -1,0 +1,86 @@
+#include "engine/display/MaterialCache.h"
+
+#include <algorithm>
+
+namespace quarn {
+
+namespace {
+
+/// Far beyond what a picture can show, and far from the end of floats.
+constexpr float MOST_EMISSION = 1e6F;
+
+bool isWhole(const Texture& texture) {
+    return texture.width > 0 && texture.height > 0 &&
+           texture.rgba.size() >= 4 * static_cast<std::size_t>(texture.width) *
+                                      static_cast<std::size_t>(texture.height);
+}
+
+/// What was kept under a key, now or at the revision before.
+template <class Map>
+typename Map::mapped_type& kept(Map& now, Map& earlier, const typename Map::key_type& key) {
+    const auto [place, is_new] = now.try_emplace(key);
+    if (const auto found = is_new ? earlier.find(key) : earlier.end(); found != earlier.end())
+        place->second = found->second;
+    return place->second;
+}
+
+} // namespace
+
+void MaterialCache::beginRevision() {
+    m_earlier = std::exchange(m_contents, {});
+}
+
+void MaterialCache::endRevision() {
+    m_earlier = {};
+}
+
+const MipTexture* MaterialCache::texture(const std::shared_ptr<const Texture>& texture,
+                                         TexelMeaning meaning) {
+    CachedTexture& cached = kept(m_contents.textures, m_earlier.textures, {texture.get(), meaning});
+    if (!cached.mips)
+        cached = {texture, std::make_shared<const MipTexture>(*texture, meaning)};
+    return cached.mips.get();
+}
+
+const SurfaceLook* MaterialCache::look(const std::shared_ptr<const Material>& material,
+                                       bool has_coordinates) {
+    if (!material)
+        return nullptr;
+    CachedLook& cached = kept(m_contents.looks, m_earlier.looks, {material.get(), has_coordinates});
+    if (!cached.source) {
+        const SurfaceLook look = makeLook(*material, has_coordinates);
+        cached.source = material;
+        if (look != SurfaceLook())
+            cached.look = std::make_shared<const SurfaceLook>(look);
+    }
+    return cached.look.get();
+}
+
+/// A texture without all its bytes counts as none.
+LookTexture MaterialCache::use(const TextureUse& use, TexelMeaning meaning) {
+    LookTexture result;
+    if (!use.texture || !isWhole(*use.texture))
+        return result;
+    result.mips = texture(use.texture, meaning);
+    std::ranges::copy(use.u, result.u);
+    std::ranges::copy(use.v, result.v);
+    return result;
+}
+
+SurfaceLook MaterialCache::makeLook(const Material& material, bool has_coordinates) {
+    SurfaceLook look;
+    look.is_unlit = material.is_unlit;
+    if (look.is_unlit)
+        return look;
+    bool shines = false;
+    for (std::size_t c = 0; c < 3; ++c) {
+        look.emission[c] = std::min(material.emission[c], MOST_EMISSION);
+        shines |= look.emission[c] > 0.0F;
+    }
+    if (has_coordinates && shines)
+        look.emission_texture = use(material.emission_texture, TexelMeaning::colors);
+    look.has_textures = look.emission_texture.mips;
+    return look;
+}
+
+} // namespace quarn
