@@ -79,8 +79,27 @@ SurfaceLook MaterialCache::makeLook(const Material& material, bool has_coordinat
     }
     if (has_coordinates && shines)
         look.emission_texture = use(material.emission_texture, TexelMeaning::colors);
-    look.has_textures = look.emission_texture.mips;
+    addMirrors(material, has_coordinates, look);
+    look.has_textures = look.emission_texture.mips || look.metal_rough.mips;
     return look;
+}
+
+/// What has neither metalness nor gloss stays matt.
+void MaterialCache::addMirrors(const Material& material, bool has_coordinates, SurfaceLook& look) {
+    const bool has_texture = has_coordinates && material.metal_rough.texture;
+    look.mirrors = material.metalness > 0.0F || material.roughness < 1.0F || has_texture;
+    if (!look.mirrors)
+        return;
+    look.metalness = material.metalness;
+    look.roughness = material.roughness;
+    // Seen straight on, by A. Fresnel's equations.
+    const float index = material.index_of_refraction;
+    const float root = (index - 1.0F) / (index + 1.0F);
+    look.f90 = material.specular;
+    for (std::size_t c = 0; c < 3; ++c)
+        look.f0[c] = material.specular * std::min(1.0F, root * root * material.specular_color[c]);
+    if (has_texture)
+        look.metal_rough = use(material.metal_rough, TexelMeaning::numbers);
 }
 
 } // namespace quarn

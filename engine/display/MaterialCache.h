@@ -40,6 +40,7 @@ private:
     };
 
     LookTexture use(const TextureUse& texture, TexelMeaning meaning);
+    void addMirrors(const Material& material, bool has_coordinates, SurfaceLook& look);
     SurfaceLook makeLook(const Material& material, bool has_coordinates);
 
     Contents m_contents;

@@ -2,6 +2,7 @@
 
 #include "engine/display/BuildProgress.h"
 #include "engine/display/OpacityFilter.h"
+#include "engine/display/SurfaceLook.h"
 
 #include <algorithm>
 #include <array>
@@ -417,9 +418,14 @@ void RayScene::commit(BuildProgress* progress) {
     }
     m_has_see_through = false;
     m_has_looks = false;
+    m_has_mirrors = false;
     for (const Member& member : m_members) {
-        m_has_see_through |= member.visible && member.surface.see_through;
-        m_has_looks |= member.visible && member.surface.look;
+        if (!member.visible)
+            continue;
+        const RaySurface& surface = member.surface;
+        m_has_see_through |= surface.see_through;
+        m_has_looks |= surface.look != nullptr;
+        m_has_mirrors |= surface.look && surface.look->mirrors;
     }
     chooseRoot();
 }

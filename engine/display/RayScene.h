@@ -62,6 +62,8 @@ public:
     bool hasSeeThrough() const { return m_has_see_through; }
     /// Whether some visible surface looks like more than its base colour.
     bool hasLooks() const { return m_has_looks; }
+    /// Whether some visible surface mirrors.
+    bool hasMirrors() const { return m_has_mirrors; }
 
     /// How often a search structure, of a group or of all, was built.
     std::size_t buildCount() const { return m_build_count; }
@@ -149,6 +151,7 @@ private:
     std::size_t m_build_count = 0;
     bool m_has_see_through = false;
     bool m_has_looks = false;
+    bool m_has_mirrors = false;
 };
 
 } // namespace quarn

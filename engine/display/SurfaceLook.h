@@ -19,6 +19,12 @@ struct SurfaceLook {
     bool has_textures = false;
     float emission[3] = {0, 0, 0};
     LookTexture emission_texture;
+    bool mirrors = false;    ///< else it scatters all light evenly
+    float f0[3] = {0, 0, 0}; ///< what is mirrored where it is no metal, seen straight on
+    float f90 = 1.0F;        ///< and along its face
+    float metalness = 0.0F;
+    float roughness = 1.0F;
+    LookTexture metal_rough;
 
     friend bool operator==(const SurfaceLook&, const SurfaceLook&) = default;
 };

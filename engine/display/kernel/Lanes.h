@@ -228,6 +228,10 @@ inline LaneVectors select(const LaneMask& mask, const LaneVectors& a, const Lane
 inline LaneColors select(const LaneMask& mask, const LaneColors& a, const LaneColors& b) {
     return {select(mask, a.r, b.r), select(mask, a.g, b.g), select(mask, a.b, b.b)};
 }
+inline LaneColors blended(const LaneColors& under, const LaneColors& over, const Lanes& weight) {
+    return {under.r + weight * (over.r - under.r), under.g + weight * (over.g - under.g),
+            under.b + weight * (over.b - under.b)};
+}
 inline LaneColors uniformColor(const float (&c)[3]) {
     return {c[0], c[1], c[2]};
 }

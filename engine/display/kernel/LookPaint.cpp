@@ -14,6 +14,11 @@ void paintLookAt(const FrameSetup& frame, const RaySurface& surface, const RTCRa
         painted.emission[1] *= sample.color.g;
         painted.emission[2] *= sample.color.b;
     }
+    if (frame.has_mirrors && look.metal_rough.mips) {
+        const TextureSample sample = on_texture.sample(look.metal_rough);
+        painted.roughness *= sample.color.g;
+        painted.metalness *= sample.color.b;
+    }
 }
 
 } // namespace quarn

@@ -9,6 +9,8 @@ struct SurfaceLook;
 /// What a look's textures make of its numbers at one place.
 struct PaintedLook {
     float emission[3];
+    float metalness;
+    float roughness;
 };
 
 /// Reads the textures of a surface's look where ray `lane` met it.

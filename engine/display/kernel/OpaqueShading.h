@@ -7,11 +7,6 @@
 namespace quarn {
 namespace {
 
-inline LaneColors blended(const LaneColors& under, const LaneColors& over, const Lanes& weight) {
-    return {under.r + weight * (over.r - under.r), under.g + weight * (over.g - under.g),
-            under.b + weight * (over.b - under.b)};
-}
-
 /// Opaque surfaces and the ground, shaded together so that they share one packet of shadow rays.
 inline LaneColors shadeOpaque(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfaces) {
     const LaneMask missed = packet.active & ~packet.hit;

@@ -18,18 +18,28 @@ inline void addLight(const float (&color)[3], const Lanes& amount, LaneColors& l
     light.b = light.b + amount * color[2];
 }
 
+/// The light of the sky that arrives in the lanes of `lit`.
+inline LaneColors skyLight(const FrameSetup& frame, const RayPacket& packet,
+                           const SurfaceLanes& surfaces, const LaneMask& lit) {
+    const LaneColors light = ambientLight(frame, surfaces.normal);
+    if (!frame.free_sky)
+        return light;
+    const Lanes arriving = skyArriving(frame, packet, surfaces, lit);
+    return {light.r * arriving, light.g * arriving, light.b * arriving};
+}
+
+inline void addFixedLights(const FrameSetup& frame, const LaneVectors& normal, LaneColors& light) {
+    for (int k = 0; k < frame.fixed_count; ++k) {
+        const FrameLight& fixed = frame.fixed[k];
+        addLight(fixed.color, greatest(dot(normal, fixed.toward), 0.0F), light);
+    }
+}
+
 /// The light that diffuse surfaces send to the observer, in the lanes of `lit`.
 inline LaneColors shadeSurfaces(const FrameSetup& frame, const RayPacket& packet,
                                 const SurfaceLanes& surfaces, const LaneMask& lit) {
-    LaneColors light = ambientLight(frame, surfaces.normal);
-    if (frame.free_sky) {
-        const Lanes arriving = skyArriving(frame, packet, surfaces, lit);
-        light = {light.r * arriving, light.g * arriving, light.b * arriving};
-    }
-    for (int k = 0; k < frame.fixed_count; ++k) {
-        const FrameLight& fixed = frame.fixed[k];
-        addLight(fixed.color, greatest(dot(surfaces.normal, fixed.toward), 0.0F), light);
-    }
+    LaneColors light = skyLight(frame, packet, surfaces, lit);
+    addFixedLights(frame, surfaces.normal, light);
     for (int k = 0; k < frame.sun_count; ++k) {
         const FrameLight& sun = frame.suns[k];
         const Lanes facing = greatest(dot(surfaces.normal, sun.toward), 0.0F);
