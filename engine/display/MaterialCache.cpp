@@ -67,39 +67,51 @@ LookTexture MaterialCache::use(const TextureUse& use, TexelMeaning meaning) {
     return result;
 }
 
+/// Called for what is metal or glossy: anything else stays matt.
+void MaterialCache::addMirrors(const Material& material, SurfaceLook& look) {
+    LookNumbers<float>& numbers = look.numbers;
+    look.mirrors = true;
+    numbers.metalness = material.metalness;
+    numbers.roughness = material.roughness;
+    const float index = material.index_of_refraction;
+    const float root = (index - 1.0F) / (index + 1.0F); // A. Fresnel's equations, straight on
+    numbers.f90 = material.specular;
+    for (std::size_t c = 0; c < 3; ++c)
+        numbers.f0[c] =
+            material.specular * std::min(1.0F, root * root * material.specular_color[c]);
+}
+
 SurfaceLook MaterialCache::makeLook(const Material& material, bool has_coordinates) {
     SurfaceLook look;
     look.is_unlit = material.is_unlit;
     if (look.is_unlit)
         return look;
-    bool shines = false;
-    for (std::size_t c = 0; c < 3; ++c) {
-        look.emission[c] = std::min(material.emission[c], MOST_EMISSION);
-        shines |= look.emission[c] > 0.0F;
-    }
-    if (has_coordinates && shines)
-        look.emission_texture = use(material.emission_texture, TexelMeaning::colors);
-    addMirrors(material, has_coordinates, look);
-    look.has_textures = look.emission_texture.mips || look.metal_rough.mips;
+    for (std::size_t c = 0; c < 3; ++c)
+        look.numbers.emission[c] = std::min(material.emission[c], MOST_EMISSION);
+    const bool has_metal_rough = has_coordinates && material.metal_rough.texture;
+    if (material.metalness > 0.0F || material.roughness < 1.0F || has_metal_rough)
+        addMirrors(material, look);
+    if (has_coordinates)
+        addTextures(material, look);
     return look;
 }
 
-/// What has neither metalness nor gloss stays matt.
-void MaterialCache::addMirrors(const Material& material, bool has_coordinates, SurfaceLook& look) {
-    const bool has_texture = has_coordinates && material.metal_rough.texture;
-    look.mirrors = material.metalness > 0.0F || material.roughness < 1.0F || has_texture;
-    if (!look.mirrors)
-        return;
-    look.metalness = material.metalness;
-    look.roughness = material.roughness;
-    // Seen straight on, by A. Fresnel's equations.
-    const float index = material.index_of_refraction;
-    const float root = (index - 1.0F) / (index + 1.0F);
-    look.f90 = material.specular;
-    for (std::size_t c = 0; c < 3; ++c)
-        look.f0[c] = material.specular * std::min(1.0F, root * root * material.specular_color[c]);
-    if (has_texture)
+void MaterialCache::addTextures(const Material& material, SurfaceLook& look) {
+    if (std::ranges::any_of(look.numbers.emission, [](float number) { return number > 0.0F; }))
+        look.emission = use(material.emission_texture, TexelMeaning::colors);
+    if (material.normal_scale != 0.0F)
+        look.normals = use(material.normals, TexelMeaning::numbers);
+    if (look.normals.mips)
+        look.normal_scale = material.normal_scale;
+    if (material.occlusion_strength > 0.0F)
+        look.occlusion = use(material.occlusion, TexelMeaning::numbers);
+    if (look.occlusion.mips)
+        look.occlusion_strength = material.occlusion_strength;
+    if (look.mirrors)
         look.metal_rough = use(material.metal_rough, TexelMeaning::numbers);
+    for (const LookTexture* texture :
+         {&look.emission, &look.normals, &look.occlusion, &look.metal_rough})
+        look.has_textures |= texture->mips != nullptr;
 }
 
 } // namespace quarn

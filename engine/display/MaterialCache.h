@@ -40,7 +40,8 @@ private:
     };
 
     LookTexture use(const TextureUse& texture, TexelMeaning meaning);
-    void addMirrors(const Material& material, bool has_coordinates, SurfaceLook& look);
+    static void addMirrors(const Material& material, SurfaceLook& look);
+    void addTextures(const Material& material, SurfaceLook& look);
     SurfaceLook makeLook(const Material& material, bool has_coordinates);
 
     Contents m_contents;

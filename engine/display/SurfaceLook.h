@@ -13,17 +13,33 @@ struct LookTexture {
     friend bool operator==(const LookTexture&, const LookTexture&) = default;
 };
 
+/// What textures may change from place to place: of one place, or of many together. All members are
+/// of one type, so that they can be gone through like an array.
+template <class Number> struct LookNumbers {
+    Number occlusion; ///< the part of the sky's light that arrives
+    Number emission[3];
+    Number metalness;
+    Number roughness;
+    Number f0[3]; ///< what is mirrored where it is no metal, seen straight on
+    Number f90;   ///< and along its face
+
+    friend bool operator==(const LookNumbers&, const LookNumbers&) = default;
+};
+
+/// Matt: it mirrors nothing.
+inline constexpr LookNumbers<float> matt_look{1, {0, 0, 0}, 0, 1, {0, 0, 0}, 0};
+
 /// What a surface looks like beyond its base colour, as the ray loops use it; see Material.
 struct SurfaceLook {
     bool is_unlit = false;
+    bool mirrors = false; ///< else it scatters all light evenly
     bool has_textures = false;
-    float emission[3] = {0, 0, 0};
-    LookTexture emission_texture;
-    bool mirrors = false;    ///< else it scatters all light evenly
-    float f0[3] = {0, 0, 0}; ///< what is mirrored where it is no metal, seen straight on
-    float f90 = 1.0F;        ///< and along its face
-    float metalness = 0.0F;
-    float roughness = 1.0F;
+    LookNumbers<float> numbers = matt_look; ///< without the textures
+    float normal_scale = 1.0F;
+    float occlusion_strength = 1.0F;
+    LookTexture normals;
+    LookTexture occlusion;
+    LookTexture emission;
     LookTexture metal_rough;
 
     friend bool operator==(const SurfaceLook&, const SurfaceLook&) = default;

@@ -228,6 +228,15 @@ inline LaneVectors select(const LaneMask& mask, const LaneVectors& a, const Lane
 inline LaneColors select(const LaneMask& mask, const LaneColors& a, const LaneColors& b) {
     return {select(mask, a.r, b.r), select(mask, a.g, b.g), select(mask, a.b, b.b)};
 }
+inline LaneColors operator*(const LaneColors& a, const LaneColors& b) {
+    return {a.r * b.r, a.g * b.g, a.b * b.b};
+}
+inline LaneColors operator*(const LaneColors& a, const Lanes& s) {
+    return {a.r * s, a.g * s, a.b * s};
+}
+inline LaneColors operator+(const LaneColors& a, const LaneColors& b) {
+    return {a.r + b.r, a.g + b.g, a.b + b.b};
+}
 inline LaneColors blended(const LaneColors& under, const LaneColors& over, const Lanes& weight) {
     return {under.r + weight * (over.r - under.r), under.g + weight * (over.g - under.g),
             under.b + weight * (over.b - under.b)};

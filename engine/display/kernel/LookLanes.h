@@ -12,65 +12,61 @@ namespace {
 struct LookLanes {
     LaneMask unlit;
     LaneMask mirrors;
-    LaneColors emission;
-    LaneColors f0; ///< what no metal mirrors, seen straight on and along its face
-    Lanes f90;
-    Lanes metalness;
-    Lanes roughness;
+    LookNumbers<Lanes> numbers;
 };
 
-inline LookLanes mattLooks() {
-    const LaneMask none = Lanes(0.0F) < 0.0F;
-    const LaneColors black{0.0F, 0.0F, 0.0F};
-    return {none, none, black, black, 0.0F, 0.0F, 1.0F};
+constexpr int look_number_count = sizeof(LookNumbers<float>) / sizeof(float);
+static_assert(sizeof(LookNumbers<Lanes>) == look_number_count * sizeof(Lanes));
+
+inline void setNumbers(const LaneMask& mask, const LookNumbers<float>& from,
+                       LookNumbers<Lanes>& numbers) {
+    auto* const to = reinterpret_cast<Lanes*>(&numbers);
+    const auto* const number = reinterpret_cast<const float*>(&from);
+    for (int i = 0; i < look_number_count; ++i)
+        to[i] = select(mask, Lanes(number[i]), to[i]);
 }
 
-/// Numbers of one quality, lane by lane.
-inline float* numbersOf(Lanes& lanes) {
-    return reinterpret_cast<float*>(lanes.part);
+inline LookLanes mattLooks() {
+    LookLanes looks;
+    looks.unlit = looks.mirrors = Lanes(0.0F) < 0.0F;
+    auto* const to = reinterpret_cast<Lanes*>(&looks.numbers);
+    for (int i = 0; i < look_number_count; ++i)
+        to[i] = reinterpret_cast<const float*>(&matt_look)[i];
+    return looks;
 }
+
+/// One lane's part of numbers that lie behind each other.
+class LaneColumn {
+public:
+    LaneColumn(Lanes* lanes, int lane) : m_first(reinterpret_cast<float*>(lanes) + lane) {}
+    float& operator[](int i) const { return m_first[i * lane_count]; }
+
+private:
+    float* m_first;
+};
 
 inline void readLookTextures(const FrameSetup& frame, const RaySurface& surface,
-                             const RayPacket& packet, unsigned lanes_meant, LookLanes& looks) {
-    float* const emission[3] = {numbersOf(looks.emission.r), numbersOf(looks.emission.g),
-                                numbersOf(looks.emission.b)};
-    float* const metalness = numbersOf(looks.metalness);
-    float* const roughness = numbersOf(looks.roughness);
+                             const RayPacket& packet, unsigned lanes_meant, SurfaceLanes& surfaces,
+                             LookLanes& looks) {
     for (; lanes_meant != 0; lanes_meant &= lanes_meant - 1) {
-        const int i = __builtin_ctz(lanes_meant);
-        const float place[3] = {packet.rays.hit.u[i], packet.rays.hit.v[i],
-                                packet.rays.ray.tfar[i]};
-        PaintedLook painted{
-            {emission[0][i], emission[1][i], emission[2][i]}, metalness[i], roughness[i]};
-        paintLookAt(frame, surface, packet.rays, i, place, painted);
-        for (int c = 0; c < 3; ++c)
-            emission[c][i] = painted.emission[c];
-        metalness[i] = painted.metalness;
-        roughness[i] = painted.roughness;
+        const int lane = __builtin_ctz(lanes_meant);
+        const float place[3] = {packet.rays.hit.u[lane], packet.rays.hit.v[lane],
+                                packet.rays.ray.tfar[lane]};
+        const LaneColumn normal(&surfaces.normal.x, lane);
+        const LaneColumn numbers(reinterpret_cast<Lanes*>(&looks.numbers), lane);
+        PaintedLook painted{surface.look->numbers, {normal[0], normal[1], normal[2]}};
+        paintLookAt(frame, surface, packet.rays, lane, place, painted);
+        for (int i = 0; i < 3; ++i)
+            normal[i] = painted.normal[i];
+        for (int i = 0; i < look_number_count; ++i)
+            numbers[i] = reinterpret_cast<const float*>(&painted.numbers)[i];
     }
 }
 
-inline void readLook(const FrameSetup& frame, const RaySurface& surface, const RayPacket& packet,
-                     const LaneMask& mask, LookLanes& looks) {
-    const SurfaceLook& look = *surface.look;
-    if (look.is_unlit)
-        looks.unlit = looks.unlit | mask;
-    looks.emission = select(mask, uniformColor(look.emission), looks.emission);
-    if (frame.has_mirrors && look.mirrors) {
-        looks.mirrors = looks.mirrors | mask;
-        looks.f0 = select(mask, uniformColor(look.f0), looks.f0);
-        looks.f90 = select(mask, Lanes(look.f90), looks.f90);
-        looks.metalness = select(mask, Lanes(look.metalness), looks.metalness);
-        looks.roughness = select(mask, Lanes(look.roughness), looks.roughness);
-    }
-    if (look.has_textures)
-        readLookTextures(frame, surface, packet, bits(mask), looks);
-}
-
-/// Fills `looks` for the rays that hit something.
+/// Fills `looks` for the rays that hit something, and turns normals as their maps say.
 /// @return false where no surface has a look; then `looks` is not filled
-inline bool readLooks(const FrameSetup& frame, const RayPacket& packet,
-                      const SurfaceLanes& surfaces, LookLanes& looks) {
+inline bool readLooks(const FrameSetup& frame, const RayPacket& packet, SurfaceLanes& surfaces,
+                      LookLanes& looks) {
     alignas(64) std::uint32_t met[lane_count];
     store(met, surfaces.surface);
     bool found = false;
@@ -80,12 +76,19 @@ inline bool readLooks(const FrameSetup& frame, const RayPacket& packet,
         const LaneMask mask =
             packet.hit & (surfaces.surface == LaneInts(static_cast<std::int32_t>(index)));
         rest &= ~bits(mask);
-        if (!frame.surfaces[index].look)
+        const SurfaceLook* const look = frame.surfaces[index].look;
+        if (!look)
             continue;
         if (!found)
             looks = mattLooks();
         found = true;
-        readLook(frame, frame.surfaces[index], packet, mask, looks);
+        if (look->is_unlit)
+            looks.unlit = looks.unlit | mask;
+        if (look->mirrors)
+            looks.mirrors = looks.mirrors | mask;
+        setNumbers(mask, look->numbers, looks.numbers);
+        if (look->has_textures)
+            readLookTextures(frame, frame.surfaces[index], packet, bits(mask), surfaces, looks);
     }
     return found;
 }

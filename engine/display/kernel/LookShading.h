@@ -19,59 +19,62 @@ inline LaneColors lightShownAs(const FrameSetup& frame, const LaneColors& colors
 
 /// What metals mirror has their colour; what others do, mostly none.
 inline MirrorLanes mirrorsOf(const FrameSetup& frame, const RayPacket& packet,
-                             const SurfaceLanes& surfaces, const LookLanes& looks) {
+                             const SurfaceLanes& surfaces, const LookNumbers<Lanes>& look) {
     MirrorLanes mirrors;
-    mirrors.f0 = blended(looks.f0, surfaces.albedo, looks.metalness);
-    mirrors.f90 = looks.f90 + looks.metalness * (Lanes(1.0F) - looks.f90);
-    mirrors.roughness = looks.roughness;
+    mirrors.f0 = blended({look.f0[0], look.f0[1], look.f0[2]}, surfaces.albedo, look.metalness);
+    mirrors.f90 = look.f90 + look.metalness * (Lanes(1.0F) - look.f90);
+    mirrors.roughness = look.roughness;
     findMirrors(frame, packet, surfaces.normal, mirrors);
     return mirrors;
 }
 
+/// Surfaces none of which mirrors.
+inline LaneColors shadeMatt(const FrameSetup& frame, const RayPacket& packet,
+                            const SurfaceLanes& surfaces, const LookNumbers<Lanes>& look,
+                            const LaneMask& lit) {
+    LaneColors light = skyLight(frame, packet, surfaces, lit) * look.occlusion;
+    addFixedLights(frame, surfaces.normal, light);
+    addSuns(frame, packet, surfaces, lit, light, [](const auto&...) {});
+    return surfaces.albedo * light;
+}
+
 /// Surfaces some of which mirror. What they mirror is no longer there to be scattered.
 inline LaneColors shadeMirrors(const FrameSetup& frame, const RayPacket& packet,
-                               const SurfaceLanes& surfaces, const LookLanes& looks,
+                               const SurfaceLanes& surfaces, const LookNumbers<Lanes>& look,
                                const LaneMask& lit) {
-    const MirrorLanes mirrors = mirrorsOf(frame, packet, surfaces, looks);
-    const LaneColors sky = skyLight(frame, packet, surfaces, lit);
+    const MirrorLanes mirrors = mirrorsOf(frame, packet, surfaces, look);
+    const LaneColors sky = skyLight(frame, packet, surfaces, lit) * look.occlusion;
     LaneColors light = sky;
     addFixedLights(frame, surfaces.normal, light);
-    LaneColors shine{0.0F, 0.0F, 0.0F};
-    for (int k = 0; k < frame.sun_count; ++k) {
-        const FrameLight& sun = frame.suns[k];
-        const Lanes facing = greatest(dot(surfaces.normal, sun.toward), 0.0F);
-        const Lanes arriving = sunlightArriving(frame, sun, packet, surfaces, lit, facing);
-        addLight(sun.color, facing * arriving, light);
-        const LaneColors spot = highlight(mirrors, surfaces.normal, sun.toward, facing);
-        shine = {shine.r + spot.r * arriving * sun.color[0],
-                 shine.g + spot.g * arriving * sun.color[1],
-                 shine.b + spot.b * arriving * sun.color[2]};
-    }
-    const LaneColors around = mirroredSurroundings(frame, mirrors.direction, mirrors.roughness);
-    const Lanes matt = Lanes(1.0F) - looks.metalness;
-    const auto channel = [&](const Lanes& albedo, const Lanes& arrived, const Lanes& first,
-                             const Lanes& further, const Lanes& mirrored, const Lanes& even,
-                             const Lanes& spots) {
-        return albedo * matt * (Lanes(1.0F) - first - further) * arrived + first * mirrored +
-               further * even + spots;
+    LaneColors spots{0.0F, 0.0F, 0.0F};
+    addSuns(frame, packet, surfaces, lit, light,
+            [&](const FrameLight& sun, const Lanes& facing, const Lanes& arriving) {
+                spots = spots + highlight(mirrors, surfaces.normal, sun.toward, facing) *
+                                    uniformColor(sun.color) * arriving;
+            });
+    const LaneColors around =
+        mirroredSurroundings(frame, mirrors.direction, mirrors.roughness) * look.occlusion;
+    const auto left = [&](const Lanes& first, const Lanes& further) {
+        return (Lanes(1.0F) - look.metalness) * (Lanes(1.0F) - first - further);
     };
-    const LaneColors& first = mirrors.first;
-    const LaneColors& further = mirrors.further;
-    return {channel(surfaces.albedo.r, light.r, first.r, further.r, around.r, sky.r, shine.r),
-            channel(surfaces.albedo.g, light.g, first.g, further.g, around.g, sky.g, shine.g),
-            channel(surfaces.albedo.b, light.b, first.b, further.b, around.b, sky.b, shine.b)};
+    const LaneColors scattered{left(mirrors.first.r, mirrors.further.r),
+                               left(mirrors.first.g, mirrors.further.g),
+                               left(mirrors.first.b, mirrors.further.b)};
+    return surfaces.albedo * scattered * light + mirrors.first * around + mirrors.further * sky +
+           spots;
 }
 
 /// The light that surfaces send to the observer by what they look like.
 [[gnu::noinline]] inline LaneColors shadeLooks(const FrameSetup& frame, const RayPacket& packet,
-                                               const SurfaceLanes& surfaces, const LaneMask& lit) {
+                                               SurfaceLanes surfaces, const LaneMask& lit) {
     LookLanes looks;
     if (!readLooks(frame, packet, surfaces, looks))
         return shadeSurfaces(frame, packet, surfaces, lit);
+    const LookNumbers<Lanes>& look = looks.numbers;
     LaneColors sent = frame.has_mirrors && any(looks.mirrors)
-                          ? shadeMirrors(frame, packet, surfaces, looks, lit)
-                          : shadeSurfaces(frame, packet, surfaces, lit);
-    sent = {sent.r + looks.emission.r, sent.g + looks.emission.g, sent.b + looks.emission.b};
+                          ? shadeMirrors(frame, packet, surfaces, look, lit)
+                          : shadeMatt(frame, packet, surfaces, look, lit);
+    sent = sent + LaneColors{look.emission[0], look.emission[1], look.emission[2]};
     if (!any(looks.unlit))
         return sent;
     return select(looks.unlit, lightShownAs(frame, surfaces.albedo), sent);

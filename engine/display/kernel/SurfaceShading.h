@@ -35,17 +35,26 @@ inline void addFixedLights(const FrameSetup& frame, const LaneVectors& normal, L
     }
 }
 
-/// The light that diffuse surfaces send to the observer, in the lanes of `lit`.
-inline LaneColors shadeSurfaces(const FrameSetup& frame, const RayPacket& packet,
-                                const SurfaceLanes& surfaces, const LaneMask& lit) {
-    LaneColors light = skyLight(frame, packet, surfaces, lit);
-    addFixedLights(frame, surfaces.normal, light);
+/// Adds the light of the suns.
+/// @param also  is called with each sun, the cosine to it and the part of its light that arrives
+template <class Also>
+inline void addSuns(const FrameSetup& frame, const RayPacket& packet, const SurfaceLanes& surfaces,
+                    const LaneMask& lit, LaneColors& light, const Also& also) {
     for (int k = 0; k < frame.sun_count; ++k) {
         const FrameLight& sun = frame.suns[k];
         const Lanes facing = greatest(dot(surfaces.normal, sun.toward), 0.0F);
         const Lanes arriving = sunlightArriving(frame, sun, packet, surfaces, lit, facing);
         addLight(sun.color, facing * arriving, light);
+        also(sun, facing, arriving);
     }
+}
+
+/// The light that diffuse surfaces send to the observer, in the lanes of `lit`.
+inline LaneColors shadeSurfaces(const FrameSetup& frame, const RayPacket& packet,
+                                const SurfaceLanes& surfaces, const LaneMask& lit) {
+    LaneColors light = skyLight(frame, packet, surfaces, lit);
+    addFixedLights(frame, surfaces.normal, light);
+    addSuns(frame, packet, surfaces, lit, light, [](const auto&...) {});
     return {surfaces.albedo.r * light.r, surfaces.albedo.g * light.g, surfaces.albedo.b * light.b};
 }
 
