@@ -173,6 +173,10 @@ inline bool any(const LaneMask& mask) {
     return bits(mask) != 0;
 }
 
+inline LaneMask noLanes() {
+    return Lanes(0.0F) < 0.0F;
+}
+
 // Arrays of the ray tracer's packets: sixteen numbers, aligned.
 
 inline Lanes load(const float* from) {

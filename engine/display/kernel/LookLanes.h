@@ -28,7 +28,7 @@ inline void setNumbers(const LaneMask& mask, const LookNumbers<float>& from,
 
 inline LookLanes mattLooks() {
     LookLanes looks;
-    looks.unlit = looks.mirrors = Lanes(0.0F) < 0.0F;
+    looks.unlit = looks.mirrors = noLanes();
     auto* const to = reinterpret_cast<Lanes*>(&looks.numbers);
     for (int i = 0; i < look_number_count; ++i)
         to[i] = reinterpret_cast<const float*>(&matt_look)[i];

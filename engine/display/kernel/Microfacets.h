@@ -48,15 +48,19 @@ inline void readSplitSum(const FrameSetup& frame, const Lanes& facing, const Lan
 /// Completes `mirrors`, of which f0, f90 and roughness are known. Light that goes from mirror to
 /// mirror: C. Fdez-Aguera, "A Multiple-Scattering Microfacet Model for Real-Time Image-Based
 /// Lighting", JCGT 2019.
-inline void findMirrors(const FrameSetup& frame, const RayPacket& packet, const LaneVectors& normal,
+inline void findMirrors(const FrameSetup& frame, const RayPacket& packet,
+                        const SurfaceLanes& surfaces, const LaneVectors& normal,
                         MirrorLanes& mirrors) {
     mirrors.observer = ofUnitLength(packet.direction() * Lanes(-1.0F));
     const Lanes cosine = dot(normal, mirrors.observer);
     mirrors.facing = least(greatest(cosine, 0.001F), 1.0F);
     const Lanes twice = cosine + cosine;
-    mirrors.direction = {twice * normal.x - mirrors.observer.x,
-                         twice * normal.y - mirrors.observer.y,
-                         twice * normal.z - mirrors.observer.z};
+    const LaneVectors mirrored{twice * normal.x - mirrors.observer.x,
+                               twice * normal.y - mirrors.observer.y,
+                               twice * normal.z - mirrors.observer.z};
+    // Smooth and mapped normals would let some mirrors look into the surface itself.
+    const Lanes lift = greatest(Lanes(0.01F) - dot(mirrored, surfaces.face), 0.0F);
+    mirrors.direction = ofUnitLength(along(mirrored, surfaces.face, lift));
     Lanes a;
     Lanes b;
     readSplitSum(frame, mirrors.facing, mirrors.roughness, a, b);
