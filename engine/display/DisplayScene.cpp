@@ -44,6 +44,13 @@ bool takeVisibility(const std::vector<Object>& from, std::vector<Object>& to) {
     return changed;
 }
 
+/// How much of a sun's light comes through glass, whatever its colour.
+float passingOf(const SurfaceLook& look, const LinearColor& albedo) {
+    const float(&part)[3] = look.numbers.passing;
+    const float mean = (part[0] * albedo.r + part[1] * albedo.g + part[2] * albedo.b) / 3.0F;
+    return mean * (1.0F - look.numbers.metalness);
+}
+
 /// The greatest distance of a corner from the origin, along an axis.
 double greatestCoordinate(const KM_BoundingBox& box) {
     return std::max({std::abs(box.m_min.x), std::abs(box.m_min.y), std::abs(box.m_min.z),
@@ -237,6 +244,8 @@ RaySurface DisplayScene::surfaceOf(const SceneMesh& object, const RayMesh& mesh)
     surface.see_through = material.see_through && !material.alpha_cutout;
     const bool has_coordinates = !mesh.mesh().m_T.empty();
     surface.look = m_materials.look(object.placed.material, has_coordinates);
+    if (surface.look)
+        surface.passing = passingOf(*surface.look, albedo);
     if (has_coordinates && material.base_color_texture)
         surface.texture = m_materials.texture(material.base_color_texture, TexelMeaning::colors);
     if (surface.texture || (surface.look && surface.look->has_textures))

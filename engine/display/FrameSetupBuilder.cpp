@@ -169,6 +169,7 @@ void setStyle(FrameSetup& frame, SurfaceStyle style, const RayScene& rays) {
         frame.has_looks = rays.hasLooks();
     }
     frame.has_mirrors = style == SurfaceStyle::lit && rays.hasMirrors();
+    frame.mirrors_scene = frame.has_mirrors;
     if (style == SurfaceStyle::translucent)
         frame.layers = {12, 0.36F, 0.85F, 0.55F};
     if (style == SurfaceStyle::x_ray)

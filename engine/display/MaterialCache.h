@@ -40,7 +40,6 @@ private:
     };
 
     LookTexture use(const TextureUse& texture, TexelMeaning meaning);
-    static void addMirrors(const Material& material, SurfaceLook& look);
     void addTextures(const Material& material, SurfaceLook& look);
     SurfaceLook makeLook(const Material& material, bool has_coordinates);
 

@@ -58,7 +58,7 @@ public:
     /// Of each surface the index of its member in `build`.
     std::span<const std::uint32_t> surfaceMembers() const { return m_surface_members; }
 
-    /// Whether some visible surface is see-through.
+    /// Whether some visible surface lets some of what is behind it through.
     bool hasSeeThrough() const { return m_has_see_through; }
     /// Whether some visible surface looks like more than its base colour.
     bool hasLooks() const { return m_has_looks; }
@@ -105,6 +105,7 @@ private:
         float cutoff;
         float opacity;
         bool see_through;
+        float passing;
         auto operator<=>(const GroupKey&) const = default;
     };
     using SoleGroups = std::map<GroupKey, std::shared_ptr<Group>>;

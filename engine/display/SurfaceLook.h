@@ -22,12 +22,17 @@ template <class Number> struct LookNumbers {
     Number roughness;
     Number f0[3]; ///< what is mirrored where it is no metal, seen straight on
     Number f90;   ///< and along its face
+    Number
+        transmission;  ///< the part of what is not mirrored that goes through, where it is no metal
+    Number passing[3]; ///< and what is left of it behind the surface
+    Number clearcoat;
+    Number clearcoat_roughness;
 
     friend bool operator==(const LookNumbers&, const LookNumbers&) = default;
 };
 
 /// Matt: it mirrors nothing.
-inline constexpr LookNumbers<float> matt_look{1, {0, 0, 0}, 0, 1, {0, 0, 0}, 0};
+inline constexpr LookNumbers<float> matt_look{1, {0, 0, 0}, 0, 1, {0, 0, 0}, 0, 0, {0, 0, 0}, 0, 0};
 
 /// What a surface looks like beyond its base colour, as the ray loops use it; see Material.
 struct SurfaceLook {
@@ -41,6 +46,16 @@ struct SurfaceLook {
     LookTexture occlusion;
     LookTexture emission;
     LookTexture metal_rough;
+    LookTexture specular;
+    LookTexture specular_color;
+    LookTexture transmission;
+    /// What the inside takes of light by the time it is behind the surface, as powers of e, where a
+    /// texture of the thickness says how much of them counts.
+    float density[3] = {0, 0, 0};
+    LookTexture thickness;
+    LookTexture clearcoat;
+    LookTexture clearcoat_roughness;
+    LookTexture coat_normals;
 
     friend bool operator==(const SurfaceLook&, const SurfaceLook&) = default;
 };

@@ -108,6 +108,7 @@ struct FrameSetup {
     bool has_see_through = false; ///< surfaces of see-through materials are drawn so
     bool has_looks = false;       ///< some surfaces look like more than their base colours
     bool has_mirrors = false;     ///< some of these mirror
+    bool mirrors_scene = false;   ///< smooth ones show the scene itself, not only what lies around
 
     float ambient_base[3] = {0, 0, 0};
     float ambient_slope[3][3] = {};

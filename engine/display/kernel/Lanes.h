@@ -238,6 +238,9 @@ inline LaneColors operator*(const LaneColors& a, const LaneColors& b) {
 inline LaneColors operator*(const LaneColors& a, const Lanes& s) {
     return {a.r * s, a.g * s, a.b * s};
 }
+inline LaneColors operator-(const LaneColors& a, const LaneColors& b) {
+    return {a.r - b.r, a.g - b.g, a.b - b.b};
+}
 inline LaneColors operator+(const LaneColors& a, const LaneColors& b) {
     return {a.r + b.r, a.g + b.g, a.b + b.b};
 }

@@ -13,7 +13,12 @@ struct LookLanes {
     LaneMask unlit;
     LaneMask mirrors;
     LookNumbers<Lanes> numbers;
+    LaneVectors coat_normal; ///< as that of the surface without its map, or by one of its own
 };
+
+inline LaneColors emissionOf(const LookNumbers<Lanes>& look) {
+    return {look.emission[0], look.emission[1], look.emission[2]};
+}
 
 constexpr int look_number_count = sizeof(LookNumbers<float>) / sizeof(float);
 static_assert(sizeof(LookNumbers<Lanes>) == look_number_count * sizeof(Lanes));
@@ -26,9 +31,10 @@ inline void setNumbers(const LaneMask& mask, const LookNumbers<float>& from,
         to[i] = select(mask, Lanes(number[i]), to[i]);
 }
 
-inline LookLanes mattLooks() {
+inline LookLanes mattLooks(const LaneVectors& normal) {
     LookLanes looks;
     looks.unlit = looks.mirrors = noLanes();
+    looks.coat_normal = normal;
     auto* const to = reinterpret_cast<Lanes*>(&looks.numbers);
     for (int i = 0; i < look_number_count; ++i)
         to[i] = reinterpret_cast<const float*>(&matt_look)[i];
@@ -53,11 +59,16 @@ inline void readLookTextures(const FrameSetup& frame, const RaySurface& surface,
         const float place[3] = {packet.rays.hit.u[lane], packet.rays.hit.v[lane],
                                 packet.rays.ray.tfar[lane]};
         const LaneColumn normal(&surfaces.normal.x, lane);
+        const LaneColumn coat_normal(&looks.coat_normal.x, lane);
         const LaneColumn numbers(reinterpret_cast<Lanes*>(&looks.numbers), lane);
-        PaintedLook painted{surface.look->numbers, {normal[0], normal[1], normal[2]}};
+        PaintedLook painted{surface.look->numbers,
+                            {normal[0], normal[1], normal[2]},
+                            {coat_normal[0], coat_normal[1], coat_normal[2]}};
         paintLookAt(frame, surface, packet.rays, lane, place, painted);
-        for (int i = 0; i < 3; ++i)
+        for (int i = 0; i < 3; ++i) {
             normal[i] = painted.normal[i];
+            coat_normal[i] = painted.coat_normal[i];
+        }
         for (int i = 0; i < look_number_count; ++i)
             numbers[i] = reinterpret_cast<const float*>(&painted.numbers)[i];
     }
@@ -80,7 +91,7 @@ inline bool readLooks(const FrameSetup& frame, const RayPacket& packet, SurfaceL
         if (!look)
             continue;
         if (!found)
-            looks = mattLooks();
+            looks = mattLooks(surfaces.normal);
         found = true;
         if (look->is_unlit)
             looks.unlit = looks.unlit | mask;

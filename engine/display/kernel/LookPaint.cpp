@@ -84,14 +84,13 @@ bool findTangents(const RaySurface& surface, const LookTexture& texture, std::si
 /// Turns the normal as the map says, in the frame of normal and tangents. A bump seen from behind
 /// is a dent.
 void bendNormal(const RaySurface& surface, const RTCRayHit16& rays, int lane,
-                const TextureSample& sample, float (&normal)[3]) {
-    const SurfaceLook& look = *surface.look;
-    const float scale = look.normal_scale;
+                const LookTexture& map, const TextureSample& sample, float scale,
+                float (&normal)[3]) {
     const Vector bend{scale * (2.0F * sample.color.r - 1.0F),
                       scale * (2.0F * sample.color.g - 1.0F), 2.0F * sample.color.b - 1.0F};
     Tangents tangents;
     if (dot(bend, bend) < LEAST_LENGTH ||
-        !findTangents(surface, look.normals, rays.hit.primID[lane], tangents))
+        !findTangents(surface, map, rays.hit.primID[lane], tangents))
         return;
     const Vector n{normal[0], normal[1], normal[2]};
     Vector across = sum(tangents.u, 1.0F, n, -dot(tangents.u, n));
@@ -123,26 +122,60 @@ void multiply(const LinearColor& by, float (&color)[3]) {
     color[2] *= by.b;
 }
 
+void paintMirrors(const TexturePlace& place, const SurfaceLook& look, LookNumbers<float>& numbers) {
+    if (look.metal_rough.mips) {
+        const TextureSample sample = place.sample(look.metal_rough);
+        numbers.roughness *= sample.color.g;
+        numbers.metalness *= sample.color.b;
+    }
+    if (look.specular.mips) {
+        const float strength = place.sample(look.specular).alpha;
+        numbers.f90 *= strength;
+        for (float& number : numbers.f0)
+            number *= strength;
+    }
+    if (look.specular_color.mips)
+        multiply(place.sample(look.specular_color).color, numbers.f0);
+    if (look.clearcoat.mips)
+        numbers.clearcoat *= place.sample(look.clearcoat).color.r;
+    if (look.clearcoat_roughness.mips)
+        numbers.clearcoat_roughness *= place.sample(look.clearcoat_roughness).color.g;
+}
+
+void paintGlass(const TexturePlace& place, const SurfaceLook& look, LookNumbers<float>& numbers) {
+    if (look.transmission.mips) {
+        const float part = place.sample(look.transmission).color.r;
+        numbers.transmission *= part;
+        for (float& number : numbers.passing)
+            number *= part;
+    }
+    if (look.thickness.mips) {
+        const float part = place.sample(look.thickness).color.g;
+        for (int c = 0; c < 3; ++c)
+            numbers.passing[c] *= std::exp(-part * look.density[c]);
+    }
+}
+
 } // namespace
 
 void paintLookAt(const FrameSetup& frame, const RaySurface& surface, const RTCRayHit16& rays,
                  int lane, const float (&place)[3], PaintedLook& painted) {
     const TexturePlace on_texture(frame, surface, rays, lane, place);
     const SurfaceLook& look = *surface.look;
-    LookNumbers<float>& numbers = painted.numbers;
-    if (look.normals.mips)
-        bendNormal(surface, rays, lane, on_texture.sample(look.normals), painted.normal);
+    const auto bend = [&](const LookTexture& map, float scale, float(&normal)[3]) {
+        if (map.mips)
+            bendNormal(surface, rays, lane, map, on_texture.sample(map), scale, normal);
+    };
+    bend(look.normals, look.normal_scale, painted.normal);
+    bend(look.coat_normals, 1.0F, painted.coat_normal);
     if (look.occlusion.mips) {
         const float open = on_texture.sample(look.occlusion).color.r;
-        numbers.occlusion = 1.0F + look.occlusion_strength * (open - 1.0F);
+        painted.numbers.occlusion = 1.0F + look.occlusion_strength * (open - 1.0F);
     }
     if (look.emission.mips)
-        multiply(on_texture.sample(look.emission).color, numbers.emission);
-    if (frame.has_mirrors && look.metal_rough.mips) {
-        const TextureSample sample = on_texture.sample(look.metal_rough);
-        numbers.roughness *= sample.color.g;
-        numbers.metalness *= sample.color.b;
-    }
+        multiply(on_texture.sample(look.emission).color, painted.numbers.emission);
+    paintMirrors(on_texture, look, painted.numbers);
+    paintGlass(on_texture, look, painted.numbers);
 }
 
 } // namespace quarn

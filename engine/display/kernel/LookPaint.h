@@ -9,11 +9,12 @@ namespace quarn {
 struct PaintedLook {
     LookNumbers<float> numbers;
     float normal[3]; ///< unit vector, toward the observer
+    float coat_normal[3];
 };
 
 /// Reads the textures of a surface's look where ray `lane` met it.
 /// @param place    the hit's u and v and the distance along the ray
-/// @param painted  holds the look's own numbers and the normal without its map
+/// @param painted  holds the look's own numbers and normals without their maps
 void paintLookAt(const FrameSetup& frame, const RaySurface& surface, const RTCRayHit16& rays,
                  int lane, const float (&place)[3], PaintedLook& painted);
 

@@ -11,6 +11,7 @@ struct MirrorLanes {
     LaneColors f0; ///< what is mirrored seen straight on; 0: the lane mirrors nothing
     Lanes f90;     ///< seen along the face
     Lanes roughness;
+    LaneVectors normal;
     Lanes facing;          ///< cosine between normal and observer
     LaneVectors observer;  ///< unit vector
     LaneVectors direction; ///< where a perfect mirror would look; of unit length
@@ -48,9 +49,9 @@ inline void readSplitSum(const FrameSetup& frame, const Lanes& facing, const Lan
 /// Completes `mirrors`, of which f0, f90 and roughness are known. Light that goes from mirror to
 /// mirror: C. Fdez-Aguera, "A Multiple-Scattering Microfacet Model for Real-Time Image-Based
 /// Lighting", JCGT 2019.
-inline void findMirrors(const FrameSetup& frame, const RayPacket& packet,
-                        const SurfaceLanes& surfaces, const LaneVectors& normal,
-                        MirrorLanes& mirrors) {
+inline void findMirrors(const FrameSetup& frame, const RayPacket& packet, const LaneVectors& face,
+                        const LaneVectors& normal, MirrorLanes& mirrors) {
+    mirrors.normal = normal;
     mirrors.observer = ofUnitLength(packet.direction() * Lanes(-1.0F));
     const Lanes cosine = dot(normal, mirrors.observer);
     mirrors.facing = least(greatest(cosine, 0.001F), 1.0F);
@@ -59,8 +60,8 @@ inline void findMirrors(const FrameSetup& frame, const RayPacket& packet,
                                twice * normal.y - mirrors.observer.y,
                                twice * normal.z - mirrors.observer.z};
     // Smooth and mapped normals would let some mirrors look into the surface itself.
-    const Lanes lift = greatest(Lanes(0.01F) - dot(mirrored, surfaces.face), 0.0F);
-    mirrors.direction = ofUnitLength(along(mirrored, surfaces.face, lift));
+    const Lanes lift = greatest(Lanes(0.01F) - dot(mirrored, face), 0.0F);
+    mirrors.direction = ofUnitLength(along(mirrored, face, lift));
     Lanes a;
     Lanes b;
     readSplitSum(frame, mirrors.facing, mirrors.roughness, a, b);
@@ -81,15 +82,15 @@ inline void findMirrors(const FrameSetup& frame, const RayPacket& packet,
 constexpr float least_spread = 0.015F;
 
 /// The highlight of a light of color 1, beside what a white surface that faces it sends.
-/// @param facing  cosine between normal and light
-inline LaneColors highlight(const MirrorLanes& mirrors, const LaneVectors& normal,
-                            const float (&toward)[3], const Lanes& facing) {
+
+inline LaneColors highlight(const MirrorLanes& mirrors, const float (&toward)[3]) {
+    const Lanes facing = greatest(dot(mirrors.normal, toward), 0.0F);
     const LaneVectors half =
         ofUnitLength({mirrors.observer.x + toward[0], mirrors.observer.y + toward[1],
                       mirrors.observer.z + toward[2]});
     const Lanes spread = greatest(mirrors.roughness * mirrors.roughness, least_spread);
     const Lanes square = spread * spread;
-    const Lanes cosine = clamped(dot(normal, half));
+    const Lanes cosine = clamped(dot(mirrors.normal, half));
     const Lanes width = cosine * cosine * (square - 1.0F) + 1.0F;
     const auto hidden = [&](const Lanes& c) {
         return squareRoot(square + (Lanes(1.0F) - square) * c * c);

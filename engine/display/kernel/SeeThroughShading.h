@@ -28,17 +28,22 @@ inline void goOn(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfa
 [[gnu::noinline]] inline LaneColors shadeThroughPanes(const FrameSetup& frame, RayPacket& packet,
                                                       SurfaceLanes& surfaces, Lanes& nearness) {
     const LaneMask active = packet.active;
-    Lanes left = 1.0F; // what still comes through
+    LaneColors left{1.0F, 1.0F, 1.0F}; // what still comes through
     LaneColors sum{0.0F, 0.0F, 0.0F};
     for (int pane = 0;; ++pane) {
         const Lanes opacity = pane < most_panes ? paneOpacities(frame, packet, surfaces) : 1.0F;
         const Lanes near = nearnessOf(frame, packet);
         const LaneMask hit = packet.hit;
-        const LaneColors shaded = shadeOpaque(frame, packet, surfaces);
-        const Lanes part = select(packet.active, left * opacity, 0.0F);
-        sum = {sum.r + part * shaded.r, sum.g + part * shaded.g, sum.b + part * shaded.b};
+        LaneColors through{0.0F, 0.0F, 0.0F};
+        const LaneColors shaded = shadeOpaque(frame, packet, surfaces, &through);
+        const LaneColors part = left * select(packet.active, opacity, 0.0F);
+        sum = sum + part * shaded;
         left = left - part;
-        const LaneMask goes_on = packet.active & hit & (opacity < 1.0F) & (left > least_light);
+        if (pane + 1 < most_panes)
+            left = left + part * through;
+        const LaneMask seen =
+            (left.r > least_light) | (left.g > least_light) | (left.b > least_light);
+        const LaneMask goes_on = packet.active & hit & seen;
         nearness = select(packet.active & ~goes_on, near, nearness);
         packet.active = goes_on;
         if (!any(goes_on))
