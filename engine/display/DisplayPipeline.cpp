@@ -124,9 +124,11 @@ void DisplayPipeline::drawSurfaces(FrameSetup& frame, const DisplayModeAttribute
                          static_cast<std::size_t>(frame.height));
         frame.objects = m_objects.data();
     }
-    frame.needs_unit_faces = frame.sun_count > 0 || frame.sky_reach > 0.0F;
+    frame.needs_unit_faces = frame.sun_count > 0 || frame.sky_reach > 0.0F || frame.has_mirrors;
     if (frame.scene && frame.sky_reach > 0.0F)
         m_free_sky.find(frame, *m_kernel);
+    if (frame.has_mirrors)
+        m_environment.find(frame, *m_kernel);
     const BlockGrid blocks(frame);
     m_smoothed = 0;
     if (!smooths) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/display/DisplayMode.h"
+#include "engine/display/Environment.h"
 #include "engine/display/FreeSky.h"
 #include "engine/display/LineDrawing.h"
 #include "engine/display/MarkedPixels.h"
@@ -58,6 +59,7 @@ private:
     std::vector<float> m_layers;
     MarkedPixels m_marked;
     FreeSky m_free_sky;
+    Environment m_environment;
     LineDrawing m_lines;
     std::size_t m_smoothed = 0;
     std::int64_t m_held_px = 0;

@@ -1,7 +1,6 @@
 #include "engine/display/DisplayScene.h"
 
 #include "engine/display/BuildProgress.h"
-#include "engine/display/MipTexture.h"
 #include "engine/images/ColorSpace.h"
 #include "engine/scene/DrawableRange.h"
 #include "engine/scene/PlacedMesh.h"
@@ -45,6 +44,13 @@ bool takeVisibility(const std::vector<Object>& from, std::vector<Object>& to) {
     return changed;
 }
 
+/// How much of a sun's light comes through glass, whatever its colour.
+float passingOf(const SurfaceLook& look, const LinearColor& albedo) {
+    const float(&part)[3] = look.numbers.passing;
+    const float mean = (part[0] * albedo.r + part[1] * albedo.g + part[2] * albedo.b) / 3.0F;
+    return mean * (1.0F - look.numbers.metalness);
+}
+
 /// The greatest distance of a corner from the origin, along an axis.
 double greatestCoordinate(const KM_BoundingBox& box) {
     return std::max({std::abs(box.m_min.x), std::abs(box.m_min.y), std::abs(box.m_min.z),
@@ -58,7 +64,7 @@ DisplayScene::~DisplayScene() = default;
 
 void DisplayScene::shareWith(const DisplayScene& earlier) {
     m_mesh_cache = earlier.m_mesh_cache;
-    m_texture_cache = earlier.m_texture_cache;
+    m_materials = earlier.m_materials;
     m_rays.shareWith(earlier.m_rays);
 }
 
@@ -95,7 +101,7 @@ void DisplayScene::clear() {
 void DisplayScene::rebuild(const SceneContent& content, BuildProgress* progress) {
     // What rays search is taken over by the address of its mesh, which therefore stays till then.
     const MeshCache earlier_meshes = std::exchange(m_mesh_cache, {});
-    TextureCache earlier_textures = std::exchange(m_texture_cache, {});
+    m_materials.beginRevision();
     addMeshes(content, earlier_meshes, progress);
     choosePlaces(content);
     dropMeshesBeyondReach(content);
@@ -105,12 +111,12 @@ void DisplayScene::rebuild(const SceneContent& content, BuildProgress* progress)
         const MeshObject& object = m_meshes[i];
         m_member_of_mesh.push_back(object.mesh ? members.size() : no_member);
         if (object.mesh)
-            members.push_back({object.mesh,
-                               surfaceOf(content.meshes[i], *object.mesh, earlier_textures),
+            members.push_back({object.mesh, surfaceOf(content.meshes[i], *object.mesh),
                                object.visible, object.frame_from_mesh});
     }
     if (!progress || !progress->is_given_up)
         m_rays.build(std::move(members), progress);
+    m_materials.endRevision();
     takeLines(content);
     m_revision = content.revision;
     m_built = true;
@@ -220,8 +226,7 @@ std::size_t DisplayScene::meshOfSurface(std::size_t surface) const {
     return static_cast<std::size_t>(found - m_member_of_mesh.begin());
 }
 
-RaySurface DisplayScene::surfaceOf(const SceneMesh& object, const RayMesh& mesh,
-                                   TextureCache& earlier) {
+RaySurface DisplayScene::surfaceOf(const SceneMesh& object, const RayMesh& mesh) {
     static const Material default_material;
     const Material& material = object.placed.material ? *object.placed.material : default_material;
     const LinearColor albedo = linearFromColor(material.base_color);
@@ -237,23 +242,15 @@ RaySurface DisplayScene::surfaceOf(const SceneMesh& object, const RayMesh& mesh,
     surface.has_cutout = material.alpha_cutout;
     surface.alpha_cutoff = material.alpha_cutoff;
     surface.see_through = material.see_through && !material.alpha_cutout;
-    if (!mesh.mesh().m_T.empty() && material.base_color_texture) {
+    const bool has_coordinates = !mesh.mesh().m_T.empty();
+    surface.look = m_materials.look(object.placed.material, has_coordinates);
+    if (surface.look)
+        surface.passing = passingOf(*surface.look, albedo);
+    if (has_coordinates && material.base_color_texture)
+        surface.texture = m_materials.texture(material.base_color_texture, TexelMeaning::colors);
+    if (surface.texture || (surface.look && surface.look->has_textures))
         surface.texture_coordinates = mesh.mesh().m_T.data();
-        surface.texture = textureOf(material, earlier);
-    }
     return surface;
-}
-
-const MipTexture* DisplayScene::textureOf(const Material& material, TextureCache& earlier) {
-    const Texture* const key = material.base_color_texture.get();
-    CachedTexture& cached = m_texture_cache[key];
-    if (const auto found = earlier.find(key); !cached.mips && found != earlier.end())
-        cached = std::move(found->second);
-    if (!cached.mips) {
-        cached.source = material.base_color_texture;
-        cached.mips = std::make_shared<const MipTexture>(*cached.source);
-    }
-    return cached.mips.get();
 }
 
 void DisplayScene::updateVisibility(const SceneContent& content) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "engine/display/MaterialCache.h"
 #include "engine/display/RayScene.h"
 #include "engine/scene/SceneContent.h"
 #include "ground/Result.h"
@@ -14,8 +15,6 @@
 class KM_Viewport;
 
 namespace quarn {
-
-class MipTexture;
 
 /// A document's content made ready for drawing. It is kept between frames: a camera animation
 /// rebuilds nothing, and a sun study only changes a direction.
@@ -74,11 +73,6 @@ public:
 
 private:
     using MeshCache = std::map<const KM_Mesh*, std::shared_ptr<const RayMesh>>;
-    struct CachedTexture {
-        std::shared_ptr<const Texture> source; ///< keeps its address from being used again
-        std::shared_ptr<const MipTexture> mips;
-    };
-    using TextureCache = std::map<const Texture*, CachedTexture>;
 
     bool canKeep(const SceneContent& content) const;
     void rebuild(const SceneContent& content, BuildProgress* progress);
@@ -90,14 +84,13 @@ private:
     void dropMeshesBeyondReach(const SceneContent& content);
     void takeLines(const SceneContent& content);
     void clear();
-    RaySurface surfaceOf(const SceneMesh& object, const RayMesh& mesh, TextureCache& earlier);
-    const MipTexture* textureOf(const Material& material, TextureCache& earlier);
+    RaySurface surfaceOf(const SceneMesh& object, const RayMesh& mesh);
 
     bool m_built = false;
     std::uint64_t m_revision = 0;
     RayScene m_rays;
     MeshCache m_mesh_cache;
-    TextureCache m_texture_cache;
+    MaterialCache m_materials;
     std::vector<MeshObject> m_meshes;
     std::vector<std::size_t> m_member_of_mesh; ///< index in the ray scene; none: no_member
     std::vector<SceneCurve> m_curves;

@@ -3,11 +3,15 @@
 #include "engine/display/DisplayMode.h"
 #include "engine/display/DisplayScene.h"
 #include "engine/display/DisplayTable.h"
+#include "engine/display/ShownLight.h"
 #include "engine/display/SkyModel.h"
+#include "engine/display/SplitSum.h"
 #include "engine/images/ColorSpace.h"
 #include "kelmar/KM_Viewport.h"
 
 #include <algorithm>
+#include <cmath>
+#include <numbers>
 
 namespace quarn {
 
@@ -15,6 +19,8 @@ namespace {
 
 /// How far surfaces of clay hide the sky from each other.
 constexpr float sky_reach_of_scene = 0.09F;
+/// How high the middle of what mirrors the ground lies over it, beside the ground's reach.
+constexpr float ground_eye_of_reach = 0.1F;
 
 void set(float (&to)[3], const LinearColor& color) {
     to[0] = color.r;
@@ -100,6 +106,42 @@ void setLighting(FrameSetup& frame, const Lighting& lighting) {
     std::copy_n(lighting.sky.toward_sun, 3, frame.toward_sun);
 }
 
+FrameSoftBox frameSoftBox(const SoftBox& box) {
+    FrameSoftBox result{};
+    std::copy_n(box.toward, 3, result.toward);
+    const KM_3dVector toward(box.toward[0], box.toward[1], box.toward[2]);
+    KM_3dVector across = KM_CrossProduct(KM_3dVector::ZAxis, toward);
+    if (!across.Unitize())
+        across = KM_3dVector::XAxis;
+    const KM_3dVector along = KM_CrossProduct(toward, across);
+    setPoint(result.across, KM_3dPoint::Origin + across);
+    setPoint(result.along, KM_3dPoint::Origin + along);
+    const auto tangent = [](float degrees) {
+        return std::tan(degrees * std::numbers::pi_v<float> / 180.0F);
+    };
+    result.half_width = tangent(box.half_width_deg);
+    result.half_height = tangent(box.half_height_deg);
+    result.border = box.border;
+    set(result.color, box.color);
+    return result;
+}
+
+/// What surfaces mirror beside the sky.
+void setMirrored(FrameSetup& frame, const Lighting& lighting) {
+    frame.split_sum = splitSum().entries();
+    frame.soft_box_count =
+        static_cast<int>(std::min(lighting.boxes.size(), std::size(frame.soft_boxes)));
+    for (int i = 0; i < frame.soft_box_count; ++i)
+        frame.soft_boxes[i] = frameSoftBox(lighting.boxes[static_cast<std::size_t>(i)]);
+    frame.ground_eye = ground_eye_of_reach * frame.ground_fade_start;
+    for (int c = 0; c < 3; ++c) {
+        float light = frame.ambient_base[c] + frame.ambient_slope[c][2];
+        for (int k = 0; k < frame.sun_count; ++k)
+            light += frame.suns[k].color[c] * std::max(frame.suns[k].toward[2], 0.0F);
+        frame.ground_light[c] = frame.ground_albedo[c] * light;
+    }
+}
+
 /// The ground lies under the lowest point. Rays look for it only where they met no surface, so it
 /// never flickers through a floor of the model's own.
 void setGround(FrameSetup& frame) {
@@ -120,10 +162,14 @@ void setGround(FrameSetup& frame) {
     set(frame.ground_albedo, {0.49F, 0.48F, 0.455F});
 }
 
-void setStyle(FrameSetup& frame, SurfaceStyle style, bool shows_panes) {
+void setStyle(FrameSetup& frame, SurfaceStyle style, const RayScene& rays) {
     frame.textures = style == SurfaceStyle::lit;
-    if (style == SurfaceStyle::lit || style == SurfaceStyle::studio)
-        frame.has_see_through = shows_panes;
+    if (style == SurfaceStyle::lit || style == SurfaceStyle::studio) {
+        frame.has_see_through = rays.hasSeeThrough();
+        frame.has_looks = rays.hasLooks();
+    }
+    frame.has_mirrors = style == SurfaceStyle::lit && rays.hasMirrors();
+    frame.mirrors_scene = frame.has_mirrors;
     if (style == SurfaceStyle::translucent)
         frame.layers = {12, 0.36F, 0.85F, 0.55F};
     if (style == SurfaceStyle::x_ray)
@@ -195,19 +241,23 @@ FrameSetup makeFrameSetup(const DisplayScene& scene, const KM_Viewport& viewport
                          : raysToBackground(viewport, width, height);
     if (is_seen && mode.surface_style != SurfaceStyle::none)
         setScene(frame, scene);
-    setStyle(frame, mode.surface_style, scene.rays().hasSeeThrough());
+    setStyle(frame, mode.surface_style, scene.rays());
     const CameraFrame camera{frame.rays.camera_x, frame.rays.camera_y, frame.rays.camera_z};
-    setLighting(frame, lightingOf(scene, mode, camera));
+    const Lighting lighting = lightingOf(scene, mode, camera);
+    setLighting(frame, lighting);
     if (mode.has_ground_plane)
         setGround(frame);
     if (mode.surface_style == SurfaceStyle::clay) {
         frame.sky_reach = sky_reach_of_scene * frame.scene_size;
         set(frame.ground_albedo, {0.72F, 0.72F, 0.72F});
     }
+    if (frame.has_mirrors)
+        setMirrored(frame, lighting);
     frame.has_sky = mode.has_sky;
     set(frame.background_top, sceneLightShownAs(mode.background_top));
     set(frame.background_bottom, sceneLightShownAs(mode.background_bottom));
     frame.display_table = displayTable().entries();
+    frame.shown_light = shownLight().entries();
     return frame;
 }
 

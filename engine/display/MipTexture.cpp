@@ -36,9 +36,8 @@ TextureSample mixed(const TextureSample& a, const TextureSample& b, float t) {
             mix(a.alpha, b.alpha)};
 }
 
-TextureSample texel(const std::uint8_t* rgba) {
-    return {{linearFromSrgbByte(rgba[0]), linearFromSrgbByte(rgba[1]), linearFromSrgbByte(rgba[2])},
-            static_cast<float>(rgba[3]) / 255.0F};
+std::uint8_t byteOf(float number) {
+    return static_cast<std::uint8_t>(std::lround(255.0F * number));
 }
 
 std::size_t texelOffset(int x, int y, int width) {
@@ -48,8 +47,8 @@ std::size_t texelOffset(int x, int y, int width) {
 
 } // namespace
 
-MipTexture::MipTexture(const Texture& texture)
-    : m_wrap_u(texture.wrap_u), m_wrap_v(texture.wrap_v) {
+MipTexture::MipTexture(const Texture& texture, TexelMeaning meaning)
+    : m_wrap_u(texture.wrap_u), m_wrap_v(texture.wrap_v), m_meaning(meaning) {
     const bool whole = texture.width > 0 && texture.height > 0 &&
                        texture.rgba.size() >= texelOffset(0, texture.height, texture.width);
     if (whole)
@@ -60,7 +59,16 @@ MipTexture::MipTexture(const Texture& texture)
         m_levels.push_back(halved(m_levels.back()));
 }
 
-MipTexture::Level MipTexture::halved(const Level& larger) {
+TextureSample MipTexture::texel(const std::uint8_t* rgba) const {
+    const auto number = [&](int channel) { return static_cast<float>(rgba[channel]) / 255.0F; };
+    if (m_meaning == TexelMeaning::numbers)
+        return {{number(0), number(1), number(2)}, number(3)};
+    return {{linearFromSrgbByte(rgba[0]), linearFromSrgbByte(rgba[1]), linearFromSrgbByte(rgba[2])},
+            number(3)};
+}
+
+MipTexture::Level MipTexture::halved(const Level& larger) const {
+    const auto stored = m_meaning == TexelMeaning::numbers ? byteOf : srgbByteFromLinear;
     Level level{std::max(larger.width / 2, 1), std::max(larger.height / 2, 1), {}};
     level.rgba.resize(texelOffset(0, level.height, level.width));
     for (int y = 0; y < level.height; ++y) {
@@ -75,10 +83,10 @@ MipTexture::Level MipTexture::halved(const Level& larger) {
             const TextureSample mean = mixed(mixed(at(x0, y0), at(x1, y0), 0.5F),
                                              mixed(at(x0, y1), at(x1, y1), 0.5F), 0.5F);
             std::uint8_t* to = &level.rgba[texelOffset(x, y, level.width)];
-            to[0] = srgbByteFromLinear(mean.color.r);
-            to[1] = srgbByteFromLinear(mean.color.g);
-            to[2] = srgbByteFromLinear(mean.color.b);
-            to[3] = static_cast<std::uint8_t>(std::lround(255.0F * mean.alpha));
+            to[0] = stored(mean.color.r);
+            to[1] = stored(mean.color.g);
+            to[2] = stored(mean.color.b);
+            to[3] = byteOf(mean.alpha);
         }
     }
     return level;

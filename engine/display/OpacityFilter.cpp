@@ -41,6 +41,12 @@ void rejectCutouts(const RTCFilterFunctionNArguments* arguments) {
     }
 }
 
+/// What comes through a surface of what arrives at it.
+float passedBy(const RaySurface& surface, unsigned triangle, float u, float v) {
+    const float opacity = surface.see_through ? opacityAt(surface, triangle, u, v) : 1.0F;
+    return 1.0F - opacity * (1.0F - surface.passing);
+}
+
 /// Rays that ask for it go on behind a see-through surface with less light.
 void dimPassingLight(const RTCFilterFunctionNArguments* arguments) {
     const auto& surface = *static_cast<const RaySurface*>(arguments->geometryUserPtr);
@@ -48,10 +54,10 @@ void dimPassingLight(const RTCFilterFunctionNArguments* arguments) {
         const unsigned id = RTCRayN_id(arguments->ray, arguments->N, i);
         if (arguments->valid[i] == 0 || id == 0 || id > PassingLight::count)
             continue;
-        const float opacity = opacityAt(surface, RTCHitN_primID(arguments->hit, arguments->N, i),
-                                        RTCHitN_u(arguments->hit, arguments->N, i),
-                                        RTCHitN_v(arguments->hit, arguments->N, i));
-        reinterpret_cast<PassingLight*>(arguments->context)->passed[id - 1] *= 1.0F - opacity;
+        const float passed = passedBy(surface, RTCHitN_primID(arguments->hit, arguments->N, i),
+                                      RTCHitN_u(arguments->hit, arguments->N, i),
+                                      RTCHitN_v(arguments->hit, arguments->N, i));
+        reinterpret_cast<PassingLight*>(arguments->context)->passed[id - 1] *= passed;
         arguments->valid[i] = 0;
     }
 }
@@ -59,7 +65,7 @@ void dimPassingLight(const RTCFilterFunctionNArguments* arguments) {
 } // namespace
 
 bool setOpacityFilter(RTCGeometry geometry, const RaySurface& surface) {
-    if (!surface.has_cutout && !surface.see_through)
+    if (!surface.has_cutout && !surface.see_through && surface.passing == 0.0F)
         return false;
     // Embree hands the data back to the filters, which only read it.
     rtcSetGeometryUserData(geometry, const_cast<RaySurface*>(&surface));

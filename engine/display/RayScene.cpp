@@ -2,6 +2,7 @@
 
 #include "engine/display/BuildProgress.h"
 #include "engine/display/OpacityFilter.h"
+#include "engine/display/SurfaceLook.h"
 
 #include <algorithm>
 #include <array>
@@ -141,17 +142,17 @@ bool RayScene::standsAlone(const Member& member) const {
 
 RayScene::GroupKey RayScene::keyOf(const Member& member) const {
     const RaySurface& surface = member.surface;
-    if (!surface.has_cutout && !surface.see_through)
-        return {member.mesh.get(), nullptr, 0.0F, 0.0F, false};
-    return {member.mesh.get(), surface.texture, surface.alpha_cutoff, surface.opacity,
-            surface.see_through};
+    if (!surface.has_cutout && !surface.see_through && surface.passing == 0.0F)
+        return {member.mesh.get(), nullptr, 0.0F, 0.0F, false, 0.0F};
+    return {member.mesh.get(), surface.texture,     surface.alpha_cutoff,
+            surface.opacity,   surface.see_through, surface.passing};
 }
 
 RayScene::SoleGroups RayScene::soleGroups() const {
     SoleGroups groups;
     for (const Instance& instance : m_instances)
         if (const RayMesh* const mesh = instance.group->sole_mesh)
-            groups.emplace(GroupKey{mesh, nullptr, 0.0F, 0.0F, false}, instance.group);
+            groups.emplace(GroupKey{mesh, nullptr, 0.0F, 0.0F, false, 0.0F}, instance.group);
     return groups;
 }
 
@@ -415,9 +416,17 @@ void RayScene::commit(BuildProgress* progress) {
             setEnabled(instance.geometry.get(), wanted);
         instance.enabled = wanted;
     }
-    m_has_see_through = std::any_of(m_members.begin(), m_members.end(), [](const Member& member) {
-        return member.visible && member.surface.see_through;
-    });
+    m_has_see_through = false;
+    m_has_looks = false;
+    m_has_mirrors = false;
+    for (const Member& member : m_members) {
+        if (!member.visible)
+            continue;
+        const RaySurface& surface = member.surface;
+        m_has_see_through |= surface.see_through || surface.passing > 0.0F;
+        m_has_looks |= surface.look != nullptr;
+        m_has_mirrors |= surface.look && surface.look->mirrors;
+    }
     chooseRoot();
 }
 

@@ -58,8 +58,12 @@ public:
     /// Of each surface the index of its member in `build`.
     std::span<const std::uint32_t> surfaceMembers() const { return m_surface_members; }
 
-    /// Whether some visible surface is see-through.
+    /// Whether some visible surface lets some of what is behind it through.
     bool hasSeeThrough() const { return m_has_see_through; }
+    /// Whether some visible surface looks like more than its base colour.
+    bool hasLooks() const { return m_has_looks; }
+    /// Whether some visible surface mirrors.
+    bool hasMirrors() const { return m_has_mirrors; }
 
     /// How often a search structure, of a group or of all, was built.
     std::size_t buildCount() const { return m_build_count; }
@@ -101,6 +105,7 @@ private:
         float cutoff;
         float opacity;
         bool see_through;
+        float passing;
         auto operator<=>(const GroupKey&) const = default;
     };
     using SoleGroups = std::map<GroupKey, std::shared_ptr<Group>>;
@@ -146,6 +151,8 @@ private:
     std::vector<std::uint32_t> m_surface_members;
     std::size_t m_build_count = 0;
     bool m_has_see_through = false;
+    bool m_has_looks = false;
+    bool m_has_mirrors = false;
 };
 
 } // namespace quarn

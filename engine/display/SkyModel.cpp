@@ -188,9 +188,23 @@ bool isLit(const DirectionalLight& light) {
     return light.color.r > 0.0F || light.color.g > 0.0F || light.color.b > 0.0F;
 }
 
+/// A wide soft light straight above, as studios have it, in step with the sky: without it metal
+/// would mirror little but the blue of the zenith.
+SoftBox overheadBox(const Sky& sky) {
+    SoftBox box;
+    box.half_width_deg = 34.0F;
+    box.half_height_deg = 34.0F;
+    box.border = 0.5F;
+    const float bright =
+        0.2126F * sky.horizon.r + 0.7152F * sky.horizon.g + 0.0722F * sky.horizon.b;
+    box.color = scaled({1.0F, 0.985F, 0.96F}, 2.0F * bright);
+    return box;
+}
+
 Lighting lightingWithoutSun(const CameraFrame& camera) {
     Lighting lighting;
     lighting.sky = daySky();
+    lighting.boxes.push_back(overheadBox(lighting.sky));
     lighting.sky.glow = {};
     lighting.sky.disc = {};
     lighting.ambient = hemisphere({0.62F, 0.65F, 0.70F}, {0.23F, 0.22F, 0.21F}, world_up);
@@ -224,6 +238,7 @@ Lighting skyLighting(std::span<const KM_Light> lights, bool casts_shadows,
     const TimeOfDay time(toward[2]);
     lighting.sky = time.sky();
     std::copy_n(toward, 3, lighting.sky.toward_sun);
+    lighting.boxes.push_back(overheadBox(lighting.sky));
     lighting.ambient = skyLight(time, toward);
     lighting.fixed.push_back(headLight(camera, time.among({{0.04F, 0.04F, 0.04F},
                                                            {0.06F, 0.06F, 0.06F},

@@ -34,12 +34,22 @@ struct Sky {
     float toward_sun[3] = {0.0F, 0.0F, 1.0F};
 };
 
+/// A soft rectangle of light, far away: it is seen in mirrors.
+struct SoftBox {
+    float toward[3] = {0.0F, 0.0F, 1.0F}; ///< unit vector to its middle, world coordinates
+    float half_width_deg = 30.0F;         ///< level
+    float half_height_deg = 30.0F;
+    float border = 0.2F; ///< over which it fades, as a part of what is one unit away
+    LinearColor color;   ///< scene light
+};
+
 /// All the light of one picture.
 struct Lighting {
     AmbientLight ambient;
     std::vector<DirectionalLight> fixed; ///< cast no shadows
     std::vector<DirectionalLight> suns;  ///< cast shadows as far as their `shadow` says
     Sky sky;
+    std::vector<SoftBox> boxes;
 };
 
 /// The camera frame's unit vectors in world coordinates.

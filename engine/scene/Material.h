@@ -63,7 +63,7 @@ struct Material {
     float normal_scale = 1.0F;
     TextureUse occlusion;            ///< numbers: red is how much of the sky's light arrives
     float occlusion_strength = 1.0F; ///< 0 to 1
-    LinearRgb emission{0, 0, 0};   ///< from 0, its strength multiplied in
+    LinearRgb emission{0, 0, 0};     ///< from 0, its strength multiplied in
     TextureUse emission_texture;     ///< colours
     bool is_one_sided = false;       ///< its back is not seen
     bool is_unlit = false;           ///< shows its base colour whatever the light (unlit)
@@ -84,13 +84,13 @@ struct Material {
     float attenuation_distance = std::numeric_limits<float>::infinity();
     LinearRgb attenuation_color{1, 1, 1};
 
-    float specular = 1.0F;               ///< 0 to 1: strength of the mirroring of what is no metal
+    float specular = 1.0F;             ///< 0 to 1: strength of the mirroring of what is no metal
     LinearRgb specular_color{1, 1, 1}; ///< its colour when seen straight on, from 0
-    TextureUse specular_texture;         ///< numbers: alpha
-    TextureUse specular_color_texture;   ///< colours
+    TextureUse specular_texture;       ///< numbers: alpha
+    TextureUse specular_color_texture; ///< colours
 
     LinearRgb sheen_color{0, 0, 0}; ///< kept, not drawn
-    float sheen_roughness = 0.0F;     ///< kept, not drawn
+    float sheen_roughness = 0.0F;   ///< kept, not drawn
 };
 
 } // namespace quarn

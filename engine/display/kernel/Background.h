@@ -26,35 +26,43 @@ inline LaneColors gradientColors(const FrameSetup& frame, const Lanes& y) {
     return {mixed(top[0], bottom[0], t), mixed(top[1], bottom[1], t), mixed(top[2], bottom[2], t)};
 }
 
-/// Zenith and horizon blend with the fourth power of what is missing to straight up, so that the
-/// sky is pale over a narrow band, which is of another colour below the sun than across from it.
-/// Around the sun there is a glow, and its disc, which sets behind the horizon. In a parallel view
-/// all rays look the same way; there the place in the picture adds to their elevation.
-inline LaneColors skyColors(const FrameSetup& frame, const RayPacket& packet) {
-    const Lanes scale = Lanes(1.0F) / squareRoot(dot(packet.direction(), packet.direction()));
-    const float tilt = frame.rays.parallel ? 0.5F / static_cast<float>(frame.height) : 0.0F;
-    const float middle = 0.5F * static_cast<float>(frame.height);
-    const Lanes elevation = packet.direction().z * scale + (Lanes(middle) - packet.y) * tilt;
+/// The sky without the sun's disc, in a direction of length 1 / scale. Zenith and horizon blend
+/// with the fourth power of what is missing to straight up, so that the sky is pale over a narrow
+/// band, which is of another colour below the sun than across from it. Around the sun there is a
+/// glow.
+/// @param toward  cosine of the angle to the sun
+inline LaneColors skyWithoutDisc(const FrameSetup& frame, const LaneVectors& d, const Lanes& scale,
+                                 const Lanes& elevation, const Lanes& toward) {
     const Lanes up = Lanes(1.0F) - power4(Lanes(1.0F) - clamped(elevation));
     const Lanes down = Lanes(1.0F) - power4(power4(Lanes(1.0F) - clamped(-elevation)));
-    const Lanes toward = dot(packet.direction(), frame.toward_sun) * scale;
     const Lanes near_sun = power8(clamped(toward));
     const Lanes above = Lanes(1.0F) - down;
     const Lanes glow = (near_sun * 0.35F + power8(near_sun) * 0.65F) * above;
-    // The disc is drawn with a soft border from 0.6 to 0.4 degrees from the sun's middle, a little
-    // larger than it is: cameras see it so.
-    const Lanes risen = clamped(elevation * 1000.0F);
-    const Lanes disc = clamped((toward - 0.999945F) * (1.0F / 0.000031F)) * risen;
-    const LaneVectors d = packet.direction();
     const Lanes sunward = d.x * frame.toward_sun[0] + d.y * frame.toward_sun[1];
     const Lanes side = sunward * scale * (Lanes(1.0F) - up);
     const auto blend = [&](int c) {
         const float horizon = frame.sky_horizon[c];
         return Lanes(horizon) + up * (frame.sky_zenith[c] - horizon) + side * frame.sky_side[c] +
-               down * (frame.sky_nadir[c] - horizon) + glow * frame.sky_glow[c] +
-               disc * frame.sky_disc[c];
+               down * (frame.sky_nadir[c] - horizon) + glow * frame.sky_glow[c];
     };
     return {blend(0), blend(1), blend(2)};
+}
+
+/// The sky with the sun's disc, which sets behind the horizon. In a parallel view all rays look the
+/// same way; there the place in the picture adds to their elevation.
+inline LaneColors skyColors(const FrameSetup& frame, const RayPacket& packet) {
+    const Lanes scale = Lanes(1.0F) / squareRoot(dot(packet.direction(), packet.direction()));
+    const float tilt = frame.rays.parallel ? 0.5F / static_cast<float>(frame.height) : 0.0F;
+    const float middle = 0.5F * static_cast<float>(frame.height);
+    const Lanes elevation = packet.direction().z * scale + (Lanes(middle) - packet.y) * tilt;
+    const Lanes toward = dot(packet.direction(), frame.toward_sun) * scale;
+    const LaneColors sky = skyWithoutDisc(frame, packet.direction(), scale, elevation, toward);
+    // The disc is drawn with a soft border from 0.6 to 0.4 degrees from the sun's middle, a little
+    // larger than it is: cameras see it so.
+    const Lanes risen = clamped(elevation * 1000.0F);
+    const Lanes disc = clamped((toward - 0.999945F) * (1.0F / 0.000031F)) * risen;
+    return {sky.r + disc * frame.sky_disc[0], sky.g + disc * frame.sky_disc[1],
+            sky.b + disc * frame.sky_disc[2]};
 }
 
 inline LaneColors backgroundColors(const FrameSetup& frame, const RayPacket& packet) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/display/CameraRays.h"
+#include "engine/display/EnvironmentMap.h"
 #include "engine/display/RaySurface.h"
 
 #include <embree3/rtcore.h>
@@ -23,6 +24,19 @@ struct FrameLight {
 
 inline constexpr int max_fixed_lights = 4;
 inline constexpr int max_suns = 8;
+
+/// A soft rectangle of light, far away.
+struct FrameSoftBox {
+    float toward[3]; ///< its middle
+    float across[3];
+    float along[3];
+    float half_width; ///< tangents of angles
+    float half_height;
+    float border; ///< over which it fades
+    float color[3];
+};
+
+inline constexpr int max_soft_boxes = 4;
 
 /// How layers of see-through surfaces cover what lies behind them.
 struct FrameLayers {
@@ -92,6 +106,9 @@ struct FrameSetup {
     float plain_albedo[3] = {1, 1, 1};
     FrameLayers layers;
     bool has_see_through = false; ///< surfaces of see-through materials are drawn so
+    bool has_looks = false;       ///< some surfaces look like more than their base colours
+    bool has_mirrors = false;     ///< some of these mirror
+    bool mirrors_scene = false;   ///< smooth ones show the scene itself, not only what lies around
 
     float ambient_base[3] = {0, 0, 0};
     float ambient_slope[3][3] = {};
@@ -106,6 +123,8 @@ struct FrameSetup {
     float ground_fade_start = 0.0F; ///< distance from the centre
     float ground_fade_end = 1.0F;
     float ground_albedo[3] = {0.5F, 0.5F, 0.5F};
+    float ground_light[3] = {0, 0, 0}; ///< that it sends where nothing shadows it
+    float ground_eye = 0.0F;           ///< how high the middle of the scene is taken to lie over it
 
     bool has_sky = false;
     float background_top[3] = {1, 1, 1}; ///< without a sky
@@ -117,6 +136,11 @@ struct FrameSetup {
     float sky_glow[3] = {0, 0, 0};
     float sky_disc[3] = {0, 0, 0};
     float toward_sun[3] = {0, 0, 1};
+    int soft_box_count = 0;
+    FrameSoftBox soft_boxes[max_soft_boxes] = {}; ///< seen in mirrors alone
+    /// What surfaces mirror of what lies around, see EnvironmentMap.h; null when none does.
+    float* environment = nullptr;
+    const float* split_sum = nullptr; ///< SplitSum::entries()
 
     float sky_reach = 0.0F; ///< how far surfaces hide the sky from others; 0: not at all
     const SkyTable* sky_table = nullptr;
@@ -126,6 +150,7 @@ struct FrameSetup {
     float* free_sky = nullptr;      ///< by place, 0 to 1
 
     const std::uint32_t* display_table = nullptr; ///< DisplayTable::entries()
+    const std::uint32_t* shown_light = nullptr;   ///< ShownLight::entries()
 
     std::uint32_t* pixels = nullptr; ///< width * height, bytes r, g, b, a in memory
     float* nearness = nullptr;       ///< see DepthImage; null when nobody asks
@@ -168,6 +193,9 @@ struct RayKernel {
     /// Fills `sky_places` and `free_sky` of a block, which is given in places of the grid. What a
     /// place finds is rough; the places of a tile together are right.
     void (*find_free_sky)(const FrameSetup& frame, const PixelBlock& block);
+    /// Fills a row of picture `level` of `environment`, from 1 on; the one before must be whole.
+    void (*find_environment)(const FrameSetup& frame, const EnvironmentSamples& samples, int level,
+                             int row);
 };
 
 /// The loops for the instruction set in force (InstructionSet.h).

@@ -173,6 +173,10 @@ inline bool any(const LaneMask& mask) {
     return bits(mask) != 0;
 }
 
+inline LaneMask noLanes() {
+    return Lanes(0.0F) < 0.0F;
+}
+
 // Arrays of the ray tracer's packets: sixteen numbers, aligned.
 
 inline Lanes load(const float* from) {
@@ -227,6 +231,22 @@ inline LaneVectors select(const LaneMask& mask, const LaneVectors& a, const Lane
 }
 inline LaneColors select(const LaneMask& mask, const LaneColors& a, const LaneColors& b) {
     return {select(mask, a.r, b.r), select(mask, a.g, b.g), select(mask, a.b, b.b)};
+}
+inline LaneColors operator*(const LaneColors& a, const LaneColors& b) {
+    return {a.r * b.r, a.g * b.g, a.b * b.b};
+}
+inline LaneColors operator*(const LaneColors& a, const Lanes& s) {
+    return {a.r * s, a.g * s, a.b * s};
+}
+inline LaneColors operator-(const LaneColors& a, const LaneColors& b) {
+    return {a.r - b.r, a.g - b.g, a.b - b.b};
+}
+inline LaneColors operator+(const LaneColors& a, const LaneColors& b) {
+    return {a.r + b.r, a.g + b.g, a.b + b.b};
+}
+inline LaneColors blended(const LaneColors& under, const LaneColors& over, const Lanes& weight) {
+    return {under.r + weight * (over.r - under.r), under.g + weight * (over.g - under.g),
+            under.b + weight * (over.b - under.b)};
 }
 inline LaneColors uniformColor(const float (&c)[3]) {
     return {c[0], c[1], c[2]};

@@ -2,32 +2,29 @@
 
 #include "engine/display/kernel/Background.h"
 #include "engine/display/kernel/GroundPlane.h"
-#include "engine/display/kernel/SurfaceShading.h"
+#include "engine/display/kernel/LookShading.h"
 
 namespace quarn {
 namespace {
 
-inline LaneColors blended(const LaneColors& under, const LaneColors& over, const Lanes& weight) {
-    return {under.r + weight * (over.r - under.r), under.g + weight * (over.g - under.g),
-            under.b + weight * (over.b - under.b)};
-}
-
 /// Opaque surfaces and the ground, shaded together so that they share one packet of shadow rays.
-inline LaneColors shadeOpaque(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfaces) {
+/// @param through  see sentLight
+inline LaneColors shadeOpaque(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfaces,
+                              LaneColors* through = nullptr) {
     const LaneMask missed = packet.active & ~packet.hit;
     if (!any(missed))
-        return shadeSurfaces(frame, packet, surfaces, packet.hit);
+        return sentLight(frame, packet, surfaces, packet.hit, through);
     LaneColors color = backgroundColors(frame, packet);
     if (!frame.has_ground) {
         if (!any(packet.hit))
             return color;
-        return select(packet.hit, shadeSurfaces(frame, packet, surfaces, packet.hit), color);
+        return select(packet.hit, sentLight(frame, packet, surfaces, packet.hit, through), color);
     }
     const GroundLanes ground = meetGround(frame, packet, surfaces);
     const LaneMask lit = packet.hit | ground.seen;
     if (!any(lit))
         return color;
-    const LaneColors shaded = shadeSurfaces(frame, packet, surfaces, lit);
+    const LaneColors shaded = sentLight(frame, packet, surfaces, lit, through);
     color = blended(color, shaded, ground.weight);
     return select(packet.hit, shaded, color);
 }

@@ -1,6 +1,7 @@
 // The ray loops. Each RayKernel_*.cpp includes this once, with its own processor's flags.
 
 #include "engine/display/DisplayTable.h"
+#include "engine/display/kernel/EnvironmentLoops.h"
 #include "engine/display/kernel/LayeredShading.h"
 #include "engine/display/kernel/PixelSteps.h"
 #include "engine/display/kernel/SeeThroughShading.h"
@@ -151,7 +152,7 @@ void traceSamples(const FrameSetup& frame, SamplePacket& samples) {
 } // namespace
 
 extern const RayKernel QUARN_RAY_KERNEL;
-const RayKernel QUARN_RAY_KERNEL{QUARN_RAY_KERNEL_NAME, traceBlock, traceSamples, findSteps,
-                                 findFreeSky};
+const RayKernel QUARN_RAY_KERNEL{QUARN_RAY_KERNEL_NAME, traceBlock,     traceSamples, findSteps,
+                                 findFreeSky,           findEnvironment};
 
 } // namespace quarn

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/display/kernel/OpaqueShading.h"
+#include "engine/display/kernel/PaneOpacity.h"
 
 namespace quarn {
 namespace {
@@ -10,41 +11,6 @@ constexpr int most_panes = 16;
 
 /// Light that would change no pixel by a step is not looked for.
 constexpr float least_light = 1.0F / 512.0F;
-
-/// Reads the opacity of one surface where it varies.
-inline void readVariedOpacity(const FrameSetup& frame, const RaySurface& surface,
-                              const RayPacket& packet, unsigned lanes_meant, Lanes& opacity) {
-    float* const lanes = reinterpret_cast<float*>(opacity.part);
-    for (; lanes_meant != 0; lanes_meant &= lanes_meant - 1) {
-        const int i = __builtin_ctz(lanes_meant);
-        const float place[3] = {packet.rays.hit.u[i], packet.rays.hit.v[i],
-                                packet.rays.ray.tfar[i]};
-        lanes[i] = paneOpacityAt(frame, surface, packet.rays, i, place);
-    }
-}
-
-/// How opaque the surfaces are that the rays met: 1 but for see-through materials.
-inline Lanes paneOpacities(const FrameSetup& frame, const RayPacket& packet,
-                           const SurfaceLanes& surfaces) {
-    Lanes opacity = 1.0F;
-    alignas(64) std::uint32_t met[lane_count];
-    store(met, surfaces.surface);
-    unsigned rest = bits(packet.hit);
-    while (rest != 0) {
-        const std::uint32_t index = met[__builtin_ctz(rest)];
-        const LaneMask mask =
-            packet.hit & (surfaces.surface == LaneInts(static_cast<std::int32_t>(index)));
-        rest &= ~bits(mask);
-        const RaySurface& surface = frame.surfaces[index];
-        if (!surface.see_through)
-            continue;
-        if (surface.colors || surface.texture)
-            readVariedOpacity(frame, surface, packet, bits(mask), opacity);
-        else
-            opacity = select(mask, Lanes(surface.opacity), opacity);
-    }
-    return opacity;
-}
 
 /// Sends the rays of `packet.active` on, behind what they met.
 inline void goOn(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfaces) {
@@ -62,17 +28,22 @@ inline void goOn(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfa
 [[gnu::noinline]] inline LaneColors shadeThroughPanes(const FrameSetup& frame, RayPacket& packet,
                                                       SurfaceLanes& surfaces, Lanes& nearness) {
     const LaneMask active = packet.active;
-    Lanes left = 1.0F; // what still comes through
+    LaneColors left{1.0F, 1.0F, 1.0F}; // what still comes through
     LaneColors sum{0.0F, 0.0F, 0.0F};
     for (int pane = 0;; ++pane) {
         const Lanes opacity = pane < most_panes ? paneOpacities(frame, packet, surfaces) : 1.0F;
         const Lanes near = nearnessOf(frame, packet);
         const LaneMask hit = packet.hit;
-        const LaneColors shaded = shadeOpaque(frame, packet, surfaces);
-        const Lanes part = select(packet.active, left * opacity, 0.0F);
-        sum = {sum.r + part * shaded.r, sum.g + part * shaded.g, sum.b + part * shaded.b};
+        LaneColors through{0.0F, 0.0F, 0.0F};
+        const LaneColors shaded = shadeOpaque(frame, packet, surfaces, &through);
+        const LaneColors part = left * select(packet.active, opacity, 0.0F);
+        sum = sum + part * shaded;
         left = left - part;
-        const LaneMask goes_on = packet.active & hit & (opacity < 1.0F) & (left > least_light);
+        if (pane + 1 < most_panes)
+            left = left + part * through;
+        const LaneMask seen =
+            (left.r > least_light) | (left.g > least_light) | (left.b > least_light);
+        const LaneMask goes_on = packet.active & hit & seen;
         nearness = select(packet.active & ~goes_on, near, nearness);
         packet.active = goes_on;
         if (!any(goes_on))

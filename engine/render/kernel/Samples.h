@@ -19,16 +19,6 @@ struct TileSums {
     }
 };
 
-inline LaneColors operator*(const LaneColors& a, const LaneColors& b) {
-    return {a.r * b.r, a.g * b.g, a.b * b.b};
-}
-inline LaneColors operator*(const LaneColors& a, const Lanes& s) {
-    return {a.r * s, a.g * s, a.b * s};
-}
-inline LaneColors operator+(const LaneColors& a, const LaneColors& b) {
-    return {a.r + b.r, a.g + b.g, a.b + b.b};
-}
-
 /// Rec. 709 luminance.
 inline Lanes luminance(const LaneColors& c) {
     return c.r * 0.2126F + c.g * 0.7152F + c.b * 0.0722F;

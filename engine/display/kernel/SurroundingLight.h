@@ -1,0 +1,113 @@
+#pragma once
+
+#include "engine/display/EnvironmentMap.h"
+#include "engine/display/kernel/Background.h"
+#include "engine/display/kernel/SurfaceShading.h"
+
+namespace quarn {
+namespace {
+
+/// How much of the ground lies in a direction, as it is seen from the middle of the scene.
+inline Lanes groundAround(const FrameSetup& frame, const LaneVectors& direction) {
+    const LaneMask downward = direction.z < -1e-5F;
+    const Lanes across = squareRoot(direction.x * direction.x + direction.y * direction.y);
+    const Lanes away = across * frame.ground_eye / select(downward, -direction.z, 1.0F);
+    const float fade = 1.0F / (frame.ground_fade_end - frame.ground_fade_start);
+    const Lanes s = clamped((Lanes(frame.ground_fade_end) - away) * fade);
+    return select(downward, s * s * (Lanes(3.0F) - Lanes(2.0F) * s), 0.0F);
+}
+
+/// How much of a soft box is seen in a direction.
+inline Lanes softBoxAround(const FrameSoftBox& box, const LaneVectors& direction) {
+    const Lanes ahead = dot(direction, box.toward);
+    const LaneMask before = ahead > 0.01F;
+    const Lanes scale = Lanes(1.0F) / select(before, ahead, 1.0F);
+    const auto within = [&](const float(&axis)[3], float half) {
+        const Lanes beyond = absolute(dot(direction, axis)) * scale - half;
+        const Lanes s = clamped(Lanes(0.5F) - beyond * (0.5F / box.border));
+        return s * s * (Lanes(3.0F) - Lanes(2.0F) * s);
+    };
+    return select(before, within(box.across, box.half_width) * within(box.along, box.half_height),
+                  0.0F);
+}
+
+/// The light that comes from far away in a direction of unit length. The suns are not in it: they
+/// are lights of their own.
+inline LaneColors surroundingLight(const FrameSetup& frame, const LaneVectors& direction) {
+    const Lanes toward_sun = dot(direction, frame.toward_sun);
+    LaneColors light = skyWithoutDisc(frame, direction, 1.0F, direction.z, toward_sun);
+    for (int i = 0; i < frame.soft_box_count; ++i) {
+        const FrameSoftBox& box = frame.soft_boxes[i];
+        addLight(box.color, softBoxAround(box, direction), light);
+    }
+    if (!frame.has_ground)
+        return light;
+    return blended(light, uniformColor(frame.ground_light), groundAround(frame, direction));
+}
+
+/// A place on the pictures of an environment map: between four texels.
+struct MapPlace {
+    LaneInts texel; ///< the one at the upper left
+    Lanes right;
+    Lanes below;
+};
+
+inline MapPlace placeOnMap(const LaneVectors& d) {
+    constexpr float half = 0.5F * environment_map::side;
+    const Lanes scale = Lanes(1.0F) / (magnitude(d.x) + magnitude(d.y) + magnitude(d.z));
+    const Lanes u = d.x * scale;
+    const Lanes v = d.y * scale;
+    const LaneMask folded = d.z < 0.0F;
+    const Lanes x =
+        select(folded, withSignOf(greatest(Lanes(1.0F) - magnitude(v), 0.0F), u), u) * half +
+        (half + 0.5F);
+    const Lanes y =
+        select(folded, withSignOf(greatest(Lanes(1.0F) - magnitude(u), 0.0F), v), v) * half +
+        (half + 0.5F);
+    // Whatever the direction is, nothing but the map is read.
+    const LaneInts column = limited(wholePart(x), environment_map::side);
+    const LaneInts row = limited(wholePart(y), environment_map::side);
+    return {row * LaneInts(environment_map::stride) + column, x - floatsOf(column),
+            y - floatsOf(row)};
+}
+
+/// @param first  of each lane the first texel of the channel
+inline Lanes channelAt(const float* map, const LaneInts& first, const MapPlace& place) {
+    const auto* const from = reinterpret_cast<const std::uint32_t*>(map);
+    const LaneInts at = first + place.texel;
+    const auto texel = [&](int offset) { return floatsWith(gathered(from + offset, at)); };
+    constexpr int below = environment_map::stride;
+    const Lanes upper_left = texel(0);
+    const Lanes lower_left = texel(below);
+    const Lanes upper = upper_left + place.right * (texel(1) - upper_left);
+    const Lanes lower = lower_left + place.right * (texel(below + 1) - lower_left);
+    return upper + place.below * (lower - upper);
+}
+
+/// The light of picture `level`, from 1 on.
+inline LaneColors pictureAt(const FrameSetup& frame, const LaneInts& level, const MapPlace& place) {
+    constexpr int texels = environment_map::texels;
+    const LaneInts first = (level - LaneInts(1)) * LaneInts(environment_map::channels * texels);
+    return {channelAt(frame.environment, first, place),
+            channelAt(frame.environment + texels, first, place),
+            channelAt(frame.environment + 2 * texels, first, place)};
+}
+
+/// The light from around as a surface of some roughness mirrors it.
+/// @param direction  where a perfect mirror would look; of unit length
+inline LaneColors mirroredSurroundings(const FrameSetup& frame, const LaneVectors& direction,
+                                       const Lanes& roughness) {
+    const Lanes level = roughness * static_cast<float>(environment_map::levels);
+    const LaneInts whole = limited(wholePart(level), environment_map::levels - 1);
+    const Lanes part = level - floatsOf(whole);
+    const MapPlace place = placeOnMap(direction);
+    const LaneColors rougher = pictureAt(frame, whole + LaneInts(1), place);
+    const LaneMask is_sharp = whole == LaneInts(0);
+    LaneColors sharper = pictureAt(frame, select(is_sharp, LaneInts(1), whole), place);
+    if (any(is_sharp))
+        sharper = select(is_sharp, surroundingLight(frame, direction), sharper);
+    return blended(sharper, rougher, part);
+}
+
+} // namespace
+} // namespace quarn
