@@ -74,6 +74,7 @@ Result<void> DisplayScene::update(const SceneContent& content, BuildProgress* pr
     else
         rebuild(content, progress);
     m_lights = content.lights;
+    m_light = content.light;
     std::string error = m_rays.takeError();
     if (progress && progress->is_given_up)
         error = "The scene was not built: it was given up.";

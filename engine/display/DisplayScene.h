@@ -70,6 +70,7 @@ public:
     std::span<const SceneCurve> curves() const { return m_curves; }
     std::span<const ScenePoint> points() const { return m_points; }
     std::span<const KM_Light> lights() const { return m_lights; }
+    const LightSettings& light() const { return m_light; }
 
 private:
     using MeshCache = std::map<const KM_Mesh*, std::shared_ptr<const RayMesh>>;
@@ -97,6 +98,7 @@ private:
     std::vector<ScenePoint> m_points;
     std::vector<KM_UUID> m_out_of_range;
     std::vector<KM_Light> m_lights;
+    LightSettings m_light;
     KM_3dPoint m_origin;
     double m_reach = HUGE_VAL; ///< how far from the origin rays may start
     KM_BoundingBox m_box;

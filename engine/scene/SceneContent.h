@@ -1,5 +1,6 @@
 #pragma once
 
+#include "engine/scene/LightSettings.h"
 #include "engine/scene/PlacedMesh.h"
 #include "kelmar/KM_3dPointArray.h"
 #include "kelmar/KM_Color.h"
@@ -34,7 +35,7 @@ struct ScenePoint {
     bool visible = true;
 };
 
-/// All that a document shows. `revision` changes whenever anything but visibility or lights does:
+/// All that a document shows. `revision` changes whenever anything but visibility and light does:
 /// a scene is rebuilt only then.
 struct SceneContent {
     std::uint64_t revision = 0;
@@ -42,6 +43,7 @@ struct SceneContent {
     std::vector<SceneCurve> curves;
     std::vector<ScenePoint> points;
     std::vector<KM_Light> lights; ///< the lights that are on; directional ones cast sun shadows
+    LightSettings light;          ///< the light beside them
 };
 
 } // namespace quarn
