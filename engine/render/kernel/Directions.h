@@ -1,5 +1,6 @@
 #pragma once
 
+#include "engine/display/kernel/OpenSky.h"
 #include "engine/render/kernel/SampleLanes.h"
 
 namespace quarn {
@@ -32,20 +33,11 @@ inline DiscLanes onDisc(const LanePlaces& place) {
             radius * radius};
 }
 
-/// Directions around unit normals, the more the nearer to the normal: by its cosine. The frame of
-/// a normal is that of T. Duff, J. Burgess, P. Christensen, C. Hery, A. Kensler, M. Liani and
-/// R. Villemin, "Building an Orthonormal Basis, Revisited", JCGT 6(1), 2017.
-inline LaneVectors aroundNormals(const LaneVectors& n, const LanePlaces& place) {
-    const DiscLanes disc = onDisc(place);
+/// Directions around unit normals, the more the nearer to the normal: by its cosine.
+inline LaneVectors aroundNormals(const LaneVectors& normal, const DiscLanes& disc) {
+    const LaneFrame frame = frameAround(normal);
     const Lanes height = squareRoot(greatest(Lanes(1.0F) - disc.square, 0.0F));
-    const Lanes sign = select(n.z < Lanes(0.0F), -1.0F, 1.0F);
-    const Lanes a = Lanes(-1.0F) / (sign + n.z);
-    const Lanes b = n.x * n.y * a;
-    const Lanes p = disc.x;
-    const Lanes q = disc.y;
-    return {p * (Lanes(1.0F) + sign * n.x * n.x * a) + q * b + height * n.x,
-            p * sign * b + q * (sign + n.y * n.y * a) + height * n.y,
-            height * n.z - p * sign * n.x - q * n.y};
+    return along(along(normal * height, frame.a, disc.x), frame.b, disc.y);
 }
 
 } // namespace
