@@ -17,10 +17,14 @@ struct DirectionalLight {
 };
 
 /// Light from all sides that changes linearly with the direction in which a surface faces:
-/// channel c on a surface with unit normal n gets base[c] + slope[c] . n.
+/// channel c on a surface with unit normal n gets base[c] + slope[c] . n. Where that is too plain,
+/// square[c] times (x y, y z, 3 z^2 - 1, x z, x^2 - y^2) of the normal is added: R. Ramamoorthi and
+/// P. Hanrahan, "An Efficient Representation for Irradiance Environment Maps", SIGGRAPH 2001.
 struct AmbientLight {
     float base[3] = {0.0F, 0.0F, 0.0F};
     float slope[3][3] = {};
+    bool has_square = false;
+    float square[3][5] = {};
 };
 
 /// The sky's colours in scene light.

@@ -39,8 +39,9 @@ inline LaneColors blurredLight(const FrameSetup& frame, const EnvironmentSamples
                                     axis(around.a.y, around.b.y, normal.y),
                                     axis(around.a.z, around.b.z, normal.z)};
         const LaneColors light = level == 1
-                                     ? surroundingLight(frame, direction)
-                                     : pictureAt(frame, LaneInts(level - 1), placeOnMap(direction));
+                                     ? broadLight(frame, direction)
+                                     : pictureAt(frame, LaneInts(level - 1),
+                                                 placeOnMap<environment_map::side>(direction));
         sum = {sum.r + light.r * weight, sum.g + light.g * weight, sum.b + light.b * weight};
     }
     return sum;

@@ -23,7 +23,7 @@ inline LaneColors shadeMatt(const FrameSetup& frame, const RayPacket& packet,
     LaneColors light = skyLight(frame, packet, surfaces, lit) * look.occlusion;
     addFixedLights(frame, surfaces.normal, light);
     addSuns(frame, packet, surfaces, lit, light, [](const auto&...) {});
-    return surfaces.albedo * light + emissionOf(look);
+    return surfaces.albedo * light + emissionOf(frame, look);
 }
 
 LaneColors shadeLooks(const FrameSetup& frame, const RayPacket& packet, SurfaceLanes surfaces,

@@ -98,7 +98,7 @@ inline LaneColors shadeMirrors(const FrameSetup& frame, const RayPacket& packet,
     LaneColors sent = entering * (Lanes(1.0F) - look.transmission) * light +
                       base.first * mirroredLight(frame, packet, surfaces, base,
                                                  sending & ~layers.coated, look.occlusion) +
-                      base.further * sky + sunny.spots + emissionOf(look);
+                      base.further * sky + sunny.spots + emissionOf(frame, look);
     LaneColors passing{0.0F, 0.0F, 0.0F};
     if (any(look.transmission > 0.0F)) {
         passing = entering * LaneColors{look.passing[0], look.passing[1], look.passing[2]};

@@ -5,11 +5,28 @@
 namespace quarn {
 namespace {
 
+/// What changes with the square of the normal.
+inline LaneColors ambientSquares(const FrameSetup& frame, const LaneVectors& n) {
+    const Lanes terms[5] = {n.x * n.y, n.y * n.z, n.z * n.z * 3.0F - 1.0F, n.x * n.z,
+                            n.x * n.x - n.y * n.y};
+    const auto channel = [&](int c) {
+        Lanes sum = 0.0F;
+        for (int i = 0; i < 5; ++i)
+            sum = sum + terms[i] * frame.ambient_square[c][i];
+        return sum;
+    };
+    return {channel(0), channel(1), channel(2)};
+}
+
+/// The light from all around on surfaces that nothing hides it from.
 inline LaneColors ambientLight(const FrameSetup& frame, const LaneVectors& normal) {
     const auto channel = [&](int c) {
         return dot(normal, frame.ambient_slope[c]) + frame.ambient_base[c];
     };
-    return {channel(0), channel(1), channel(2)};
+    const LaneColors light{channel(0), channel(1), channel(2)};
+    if (!frame.has_ambient_square)
+        return light;
+    return light + ambientSquares(frame, normal);
 }
 
 inline void addLight(const float (&color)[3], const Lanes& amount, LaneColors& light) {
