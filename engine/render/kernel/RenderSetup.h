@@ -1,5 +1,6 @@
 #pragma once
 
+#include "engine/display/SplitSum.h"
 #include "engine/display/kernel/FrameSetup.h"
 
 #include <cstdint>
@@ -13,9 +14,12 @@ struct SampleTable {
     int log2_length = 1;
 };
 
-/// What a sample of a pixel needs places in a square for.
-enum class SampleUse : int { pixel_area, sky_dome, sun_disc };
-inline constexpr int sample_use_count = 3;
+/// What a sample of a pixel needs places in a square for: the first for its own place, and then
+/// three for each surface that it comes to. What surfaces farther on need is less well spread.
+enum class SampleUse : int { pixel_area, direction, light, choice };
+inline constexpr int uses_of_surface = 3;
+inline constexpr int surfaces_well_spread = 2;
+inline constexpr int sample_use_count = 1 + uses_of_surface * surfaces_well_spread;
 
 /// Where the sixteen pixels of a tile stand in the sequence: each has a stretch of its own.
 struct TileSamples {
@@ -36,12 +40,46 @@ struct SunDisc {
     float along[3];
 };
 
+/// How the light from infinitely far away is spread, see EnvironmentLight.h.
+struct EnvironmentTable {
+    static constexpr int side = 128;
+    const float* rows = nullptr; ///< side + 1 numbers from 0 to 1; null: it is even enough
+    const float* cells = nullptr;   ///< of each row the same
+    const float* density = nullptr; ///< of each cell, by area of the square from -1 to 1
+};
+
+/// A triangle that shines, in the frame's coordinates.
+struct Emitter {
+    float corner[3];
+    float edges[2][3]; ///< to the other corners
+    float normal[3];   ///< of unit length
+    float density;     ///< of the places that are chosen, by area
+};
+
+struct EmitterTable {
+    int count = 0;
+    const Emitter* emitters = nullptr;
+    const float* ends = nullptr; ///< of each the chance of all up to it; the last is 1
+    /// From a surface's brightness to the density of places on it.
+    float density_of_brightness = 0.0F;
+};
+
+/// Rec. 709 luminance.
+inline float emitterBrightness(const float (&emission)[3]) {
+    return 0.2126F * emission[0] + 0.7152F * emission[1] + 0.0722F * emission[2];
+}
+
 /// Everything that the render loops need for one picture.
 struct RenderSetup {
     FrameSetup frame; ///< what is seen directly
     /// How surfaces look that light comes from: without the light that follows the camera.
     FrameSetup bounce;
     float sky_scale[3] = {1, 1, 1}; ///< from the colour of the sky to the light it sheds
+    EnvironmentTable environment;
+    EmitterTable emitters;
+    /// The means of SplitSum's rows over all directions, by their cosine.
+    float mean_a[SplitSum::side] = {};
+    float mean_b[SplitSum::side] = {};
     SunDisc discs[max_suns] = {};   ///< of frame.suns
     SampleTable samples;
 };
