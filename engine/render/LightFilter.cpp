@@ -59,9 +59,9 @@ void withoutAlbedo(const float (&sum)[3], const float (&albedo)[3], float (&ligh
 
 } // namespace
 
-LightFilter::LightFilter(const RenderLayers& layers, int samples, float parallel_scene_size,
+LightFilter::LightFilter(const RenderLayers& layers, float parallel_scene_size,
                          const RenderKernel& kernel)
-    : m_layers(layers), m_samples(samples), m_kernel(kernel),
+    : m_layers(layers), m_kernel(kernel),
       m_nearness_share(parallel_scene_size > 0.0F ? 0.0F : plane_tolerance),
       m_nearness_tolerance(plane_tolerance * parallel_scene_size + 1e-20F) {
     const std::size_t count = pixelCount(layers);
@@ -93,7 +93,7 @@ void LightFilter::readGuides() {
         for (int axis = 0; axis < 3; ++axis)
             m_normal[axis][pixel] = normal[axis] * scale;
         m_nearness[pixel] = cover > 0.0F ? m_layers.at(RenderPlane::nearness, x, y) / cover : 0.0F;
-        m_cover[pixel] = cover / static_cast<float>(m_samples);
+        m_cover[pixel] = cover / m_layers.at(RenderPlane::samples, x, y);
     });
 }
 
@@ -106,8 +106,8 @@ void LightFilter::readSlopes() {
 }
 
 void LightFilter::readLight(int first, int square) {
-    const auto samples = static_cast<float>(m_samples);
     forPixels(m_layers, [&](std::size_t pixel, int x, int y) {
+        const int samples = m_layers.samplesAt(x, y);
         float sum[3];
         float albedo[3];
         float light[3];
@@ -121,10 +121,10 @@ void LightFilter::readLight(int first, int square) {
         const float cover = m_layers.at(RenderPlane::cover, x, y);
         const float brightness = 0.2126F * light[0] + 0.7152F * light[1] + 0.0722F * light[2];
         const float mean_square = cover > 0.0F ? m_layers.at(square, x, y) / cover : 0.0F;
-        const float spread = m_samples < few_samples
+        const float spread = samples < few_samples
                                  ? mean_square
                                  : std::max(0.0F, mean_square - brightness * brightness);
-        m_other.variance[pixel] = spread / samples;
+        m_other.variance[pixel] = spread / static_cast<float>(samples);
     });
 }
 
@@ -132,8 +132,8 @@ void LightFilter::readLight(int first, int square) {
 /// these are.
 void LightFilter::smoothVariance() {
     const auto stride = static_cast<std::ptrdiff_t>(m_layers.width());
-    const int reach = m_samples < many_samples ? 3 : 1;
     forPixels(m_layers, [&](std::size_t pixel, int x, int y) {
+        const int reach = m_layers.samplesAt(x, y) < many_samples ? 3 : 1;
         float sum = 0.0F;
         float weights = 0.0F;
         for (int dy = -std::min(reach, y); dy <= std::min(reach, m_layers.height() - 1 - y); ++dy)

@@ -16,10 +16,8 @@ struct LightImage {
 /// samples are, the less it changes; shadows keep their borders.
 class LightFilter {
 public:
-    /// @param samples  of each pixel
     /// @param scene_size  in a parallel view, the size of what is seen, model units; else 0
-    LightFilter(const RenderLayers& layers, int samples, float parallel_scene_size,
-                const RenderKernel& kernel);
+    LightFilter(const RenderLayers& layers, float parallel_scene_size, const RenderKernel& kernel);
 
     /// The light of one kind.
     /// @param first   RenderPlane::sky_r or sun_r
@@ -38,7 +36,6 @@ private:
     void pass(int step);
 
     const RenderLayers& m_layers;
-    int m_samples;
     const RenderKernel& m_kernel;
     std::vector<float> m_normal[3];
     std::vector<float> m_nearness;

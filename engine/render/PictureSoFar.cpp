@@ -3,7 +3,6 @@
 #include "engine/render/RenderEncoding.h"
 #include "engine/render/RenderLayers.h"
 #include "engine/render/RenderLines.h"
-#include "engine/render/SampleTaking.h"
 
 #include <tbb/parallel_for.h>
 
@@ -20,10 +19,9 @@ constexpr int pauses_of_its_own_time = 50;
 
 } // namespace
 
-PictureSoFar::PictureSoFar(const RenderLayers& layers, const SampleTaking& taking,
-                           RenderLines& lines, const Renderer::Shown& shown)
-    : m_layers(layers), m_taking(taking), m_lines(lines), m_shown(shown),
-      m_due(Clock::now() + least_pause) {}
+PictureSoFar::PictureSoFar(const RenderLayers& layers, RenderLines& lines,
+                           const Renderer::Shown& shown)
+    : m_layers(layers), m_lines(lines), m_shown(shown), m_due(Clock::now() + least_pause) {}
 
 void PictureSoFar::showWhenDue() {
     const Clock::time_point start = Clock::now();
@@ -38,13 +36,7 @@ void PictureSoFar::showWhenDue() {
 
 void PictureSoFar::encode() {
     m_image.resize(m_layers.width(), m_layers.height());
-    tbb::parallel_for(0, m_layers.height(), [&](int y) {
-        for (int x = 0; x < m_layers.width();) {
-            const SampleTaking::Taken taken = m_taking.takenAt(x, y);
-            encodeRow(m_layers, taken.samples, {x, taken.end_x, y}, m_image);
-            x = taken.end_x;
-        }
-    });
+    tbb::parallel_for(0, m_layers.height(), [&](int y) { encodeRow(m_layers, y, m_image); });
 }
 
 } // namespace quarn

@@ -9,15 +9,13 @@ namespace quarn {
 
 class RenderLayers;
 class RenderLines;
-class SampleTaking;
 
 /// Shows a picture now and then while its samples are taken: as it is, with its noise, because to
 /// smooth it would take longer than to go on. What is not begun is grey.
 class PictureSoFar {
 public:
     /// @param shown  takes the picture; may be empty
-    PictureSoFar(const RenderLayers& layers, const SampleTaking& taking, RenderLines& lines,
-                 const Renderer::Shown& shown);
+    PictureSoFar(const RenderLayers& layers, RenderLines& lines, const Renderer::Shown& shown);
 
     /// Shows the picture when it is due: twice a second at most, and so seldom that this takes no
     /// more than a fiftieth of the time.
@@ -29,7 +27,6 @@ private:
     void encode();
 
     const RenderLayers& m_layers;
-    const SampleTaking& m_taking;
     RenderLines& m_lines;
     const Renderer::Shown& m_shown;
     Clock::time_point m_due;

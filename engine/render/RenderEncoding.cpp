@@ -25,16 +25,25 @@ template <class Work> void forRows(const RenderLayers& layers, const Work& work)
     });
 }
 
-void addDirect(const RenderLayers& layers, float scale, Colors& colors) {
+/// From the sums of a pixel to their means; 0 where there are none.
+float meanScale(const RenderLayers& layers, int x, int y) {
+    const int samples = layers.samplesAt(x, y);
+    return samples > 0 ? 1.0F / static_cast<float>(samples) : 0.0F;
+}
+
+void addDirect(const RenderLayers& layers, Colors& colors) {
     forRows(layers, [&](std::size_t pixel, int x, int y) {
+        const float scale = meanScale(layers, x, y);
         for (int c = 0; c < 3; ++c)
             colors[3 * pixel + static_cast<std::size_t>(c)] =
-                scale * layers.at(RenderPlane::direct_r + c, x, y);
+                scale * (layers.at(RenderPlane::direct_r + c, x, y) +
+                         layers.at(RenderPlane::gloss_r + c, x, y));
     });
 }
 
-void addLight(const RenderLayers& layers, float scale, const LightImage& light, Colors& colors) {
+void addLight(const RenderLayers& layers, const LightImage& light, Colors& colors) {
     forRows(layers, [&](std::size_t pixel, int x, int y) {
+        const float scale = meanScale(layers, x, y);
         for (int c = 0; c < 3; ++c)
             colors[3 * pixel + static_cast<std::size_t>(c)] +=
                 scale * layers.at(RenderPlane::albedo_r + c, x, y) * light.color[c][pixel];
@@ -53,30 +62,29 @@ constexpr std::uint8_t not_begun = 60;
 
 } // namespace
 
-void encodeRow(const RenderLayers& layers, int samples, const RowPart& part, Image& image) {
+void encodeRow(const RenderLayers& layers, int y, Image& image) {
     const std::uint32_t* const table = displayTable().entries();
-    const float scale = samples > 0 ? 1.0F / static_cast<float>(samples) : 0.0F;
-    std::uint8_t* pixel = image.rgba.data() + 4 * (static_cast<std::size_t>(part.y) *
-                                                       static_cast<std::size_t>(image.width) +
-                                                   static_cast<std::size_t>(part.begin_x));
-    for (int x = part.begin_x; x < part.end_x; ++x, pixel += 4) {
+    std::uint8_t* pixel = image.rgba.data() + std::size_t{4} * static_cast<std::size_t>(y) *
+                                                  static_cast<std::size_t>(image.width);
+    for (int x = 0; x < image.width; ++x, pixel += 4) {
+        const float scale = meanScale(layers, x, y);
         for (int c = 0; c < 3; ++c) {
-            const float light = layers.at(RenderPlane::direct_r + c, x, part.y) +
-                                layers.at(RenderPlane::sky_r + c, x, part.y) +
-                                layers.at(RenderPlane::sun_r + c, x, part.y);
-            pixel[c] = samples > 0 ? shown(scale * light, table) : not_begun;
+            float light = 0.0F;
+            for (const int plane : {RenderPlane::direct_r, RenderPlane::sky_r, RenderPlane::sun_r,
+                                    RenderPlane::gloss_r})
+                light += layers.at(plane + c, x, y);
+            pixel[c] = scale > 0.0F ? shown(scale * light, table) : not_begun;
         }
         pixel[3] = 255;
     }
 }
 
-void encodeRender(const RenderLayers& layers, int samples, LightFilter& filter, Image& image) {
-    const float scale = 1.0F / static_cast<float>(samples);
+void encodeRender(const RenderLayers& layers, LightFilter& filter, Image& image) {
     Colors colors(std::size_t{3} * static_cast<std::size_t>(layers.width()) *
                   static_cast<std::size_t>(layers.height()));
-    addDirect(layers, scale, colors);
-    addLight(layers, scale, filter.filtered(RenderPlane::sky_r, RenderPlane::sky_square), colors);
-    addLight(layers, scale, filter.filtered(RenderPlane::sun_r, RenderPlane::sun_square), colors);
+    addDirect(layers, colors);
+    addLight(layers, filter.filtered(RenderPlane::sky_r, RenderPlane::sky_square), colors);
+    addLight(layers, filter.filtered(RenderPlane::sun_r, RenderPlane::sun_square), colors);
     image.resize(layers.width(), layers.height());
     const std::uint32_t* const table = displayTable().entries();
     forRows(layers, [&](std::size_t pixel, int, int) {

@@ -12,18 +12,12 @@ class RenderLayers;
 /// Bytes that encodeRender takes for a pixel beside the picture.
 inline constexpr std::size_t render_encoding_bytes = 3 * sizeof(float);
 
-/// Pixels of one row.
-struct RowPart {
-    int begin_x;
-    int end_x;
-    int y;
-};
-
-/// Shows the sums of some samples as they are, with their noise; grey where there is none.
+/// Shows one row of the sums of some samples as they are, with their noise; grey where there is
+/// none.
 /// @param image  has the size of the layers
-void encodeRow(const RenderLayers& layers, int samples, const RowPart& part, Image& image);
+void encodeRow(const RenderLayers& layers, int y, Image& image);
 
 /// Puts the sums together and shows them as Rendered mode does.
-void encodeRender(const RenderLayers& layers, int samples, LightFilter& filter, Image& image);
+void encodeRender(const RenderLayers& layers, LightFilter& filter, Image& image);
 
 } // namespace quarn

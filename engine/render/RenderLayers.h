@@ -21,6 +21,9 @@ public:
     /// A sum of one pixel.
     float at(int plane, int x, int y) const { return m_sums.planes[plane][offset(x, y)]; }
 
+    /// How many samples a pixel has so far.
+    int samplesAt(int x, int y) const { return static_cast<int>(at(RenderPlane::samples, x, y)); }
+
     /// Bytes that a pixel takes.
     static constexpr std::size_t bytes_per_pixel = RenderPlane::count * sizeof(float);
 

@@ -77,16 +77,16 @@ Result<RenderEnd> Renderer::render(const DisplayScene& scene, const KM_Viewport&
                       scene.canBeSeenBy(viewport, request.width_px, request.height_px));
     RenderLayers layers(request.width_px, request.height_px);
     SampleTaking taking(setup, *m_kernel, layers, request.samples);
-    PictureSoFar so_far(layers, taking, lines, shown);
+    PictureSoFar so_far(layers, lines, shown);
     const auto pause = [&](double share) {
         so_far.showWhenDue();
         return watch(share);
     };
     if (taking.run(static_cast<bool>(shown), pause) == RenderEnd::cancelled)
         return RenderEnd::cancelled;
-    LightFilter filter(layers, request.samples,
-                       setup.frame.rays.parallel ? setup.frame.scene_size : 0.0F, *m_kernel);
-    encodeRender(layers, request.samples, filter, image);
+    LightFilter filter(layers, setup.frame.rays.parallel ? setup.frame.scene_size : 0.0F,
+                       *m_kernel);
+    encodeRender(layers, filter, image);
     lines.draw(image);
     return RenderEnd::done;
 }

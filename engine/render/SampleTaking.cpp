@@ -41,27 +41,19 @@ int SampleTaking::passEnd(int first, bool grows_evenly) const {
 }
 
 RenderEnd SampleTaking::run(bool grows_evenly, const Pause& pause) {
-    while (m_pass_first < m_samples) {
-        m_pass_end = passEnd(m_pass_first, grows_evenly);
-        for (m_finished = 0; m_finished < m_blocks;) {
-            const double taken =
-                m_pass_first + double(m_pass_end - m_pass_first) * m_finished / m_blocks;
+    for (int first = 0; first < m_samples;) {
+        const int end = passEnd(first, grows_evenly);
+        for (int finished = 0; finished < m_blocks;) {
+            const double taken = first + double(end - first) * finished / m_blocks;
             if (!pause(taken / m_samples))
                 return RenderEnd::cancelled;
-            const int next = std::min(m_blocks, m_finished + m_batch);
-            timed([&] { renderBlocks(m_finished, next, m_pass_first, m_pass_end); });
-            m_finished = next;
+            const int next = std::min(m_blocks, finished + m_batch);
+            timed([&] { renderBlocks(finished, next, first, end); });
+            finished = next;
         }
-        m_pass_first = m_pass_end;
+        first = end;
     }
     return RenderEnd::done;
-}
-
-SampleTaking::Taken SampleTaking::takenAt(int x, int y) const {
-    const int column = x / block_width;
-    const int block = y / block_height * m_columns + column;
-    return {block < m_finished ? m_pass_end : m_pass_first,
-            std::min(m_layers.width(), (column + 1) * block_width)};
 }
 
 template <class Work> void SampleTaking::timed(const Work& work) {

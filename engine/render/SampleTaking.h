@@ -14,12 +14,6 @@ public:
     SampleTaking(const RenderSetup& setup, const RenderKernel& kernel, RenderLayers& layers,
                  int samples);
 
-    /// How many samples the pixels of a row have so far, from one column on.
-    struct Taken {
-        int samples;
-        int end_x; ///< up to here
-    };
-
     /// Called between batches.
     /// @return false to end the work
     using Pause = std::function<bool(double share)>;
@@ -27,8 +21,6 @@ public:
     /// @param grows_evenly  begins with few samples of each pixel, so that there is something to
     ///     see soon; the sums in the end are the same
     RenderEnd run(bool grows_evenly, const Pause& pause);
-
-    Taken takenAt(int x, int y) const;
 
 private:
     int passEnd(int first, bool grows_evenly) const;
@@ -42,9 +34,6 @@ private:
     const int m_columns;
     const int m_blocks;
     int m_batch = 4;
-    int m_pass_first = 0; ///< samples that every block has
-    int m_pass_end = 0;   ///< and those that have been finished in this pass
-    int m_finished = 0;   ///< blocks, in this pass
 };
 
 } // namespace quarn

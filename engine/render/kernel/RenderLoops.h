@@ -19,6 +19,35 @@ inline TileCorners tileCorners() {
     return {load(columns), load(rows)};
 }
 
+/// The sums whose brightness is also known of every second sample alone.
+constexpr int halved_count = 5;
+constexpr struct {
+    int sum;
+    int even;
+} halved_planes[halved_count] = {{RenderPlane::direct_r, RenderPlane::even_direct},
+                                 {RenderPlane::albedo_r, RenderPlane::even_albedo},
+                                 {RenderPlane::sky_r, RenderPlane::even_sky},
+                                 {RenderPlane::sun_r, RenderPlane::even_sun},
+                                 {RenderPlane::gloss_r, RenderPlane::even_gloss}};
+
+inline void readBrightness(const TileSums& sums, Lanes (&brightness)[halved_count]) {
+    for (int i = 0; i < halved_count; ++i) {
+        const Lanes* const plane = sums.plane + halved_planes[i].sum;
+        brightness[i] = luminance({plane[0], plane[1], plane[2]});
+    }
+}
+
+/// Adds a sample with an even number, and what it adds to the halves.
+inline void addEvenSample(SampleRays& rays, TileSums& sums) {
+    Lanes before[halved_count];
+    Lanes behind[halved_count];
+    readBrightness(sums, before);
+    addSample(rays, sums);
+    readBrightness(sums, behind);
+    for (int i = 0; i < halved_count; ++i)
+        sums.add(halved_planes[i].even, behind[i] - before[i]);
+}
+
 inline void renderTile(const RenderSetup& setup, const TileCorners& corners, int first, int end,
                        const TileSamples& samples, RayPacket& packet, RayPacket& bounce,
                        TileSums& sums) {
@@ -32,8 +61,12 @@ inline void renderTile(const RenderSetup& setup, const TileCorners& corners, int
         packet.y = corners.y + place.v;
         SampleRays rays{setup, places(SampleUse::sky_dome), places(SampleUse::sun_disc), packet,
                         bounce};
-        addSample(rays, sums);
+        if (index % 2 == 0)
+            addEvenSample(rays, sums);
+        else
+            addSample(rays, sums);
     }
+    sums.add(RenderPlane::samples, static_cast<float>(end - first));
 }
 
 void renderBlock(const RenderSetup& setup, const PixelBlock& block, int first, int end,
@@ -49,10 +82,12 @@ void renderBlock(const RenderSetup& setup, const PixelBlock& block, int first, i
     TileSums tile;
     for (int y = block.y_begin; y < block.y_end; y += tile_size)
         for (int x = block.x_begin; x < block.x_end; x += tile_size) {
-            const std::size_t at =
-                std::size_t{lane_count} * (static_cast<std::size_t>(y / tile_size) *
-                                               static_cast<std::size_t>(sums.tile_columns) +
-                                           static_cast<std::size_t>(x / tile_size));
+            const std::size_t index = static_cast<std::size_t>(y / tile_size) *
+                                          static_cast<std::size_t>(sums.tile_columns) +
+                                      static_cast<std::size_t>(x / tile_size);
+            if (sums.done && sums.done[index])
+                continue;
+            const std::size_t at = lane_count * index;
             for (int p = 0; p < RenderPlane::count; ++p)
                 tile.plane[p] = load(sums.planes[p] + at);
             startTile(x, y, setup.samples.log2_length, samples);

@@ -106,6 +106,18 @@ struct RenderPlane {
         normal_z,
         nearness, ///< see DepthImage
         cover,    ///< how much of the pixel surfaces and the ground fill
+        gloss_r,
+        gloss_g,
+        gloss_b,      ///< light that surfaces mirror or let through; no albedo is taken out of it
+        gloss_square, ///< square of its brightness
+        // Brightness of what the samples with even numbers add alone: by how much it differs from
+        // that of the others tells how far the mean of all may be from the truth.
+        even_direct,
+        even_albedo,
+        even_sky,
+        even_sun,
+        even_gloss,
+        samples, ///< how many there are, the same for all pixels of a tile
         count
     };
 };
@@ -113,6 +125,7 @@ struct RenderPlane {
 /// The sums, tile by tile in rows of tiles, and in each tile the sixteen pixels row by row.
 struct RenderSums {
     int tile_columns = 0;
+    const std::uint8_t* done = nullptr; ///< not 0 for tiles that need no more; null: none is done
     float* planes[RenderPlane::count] = {}; ///< aligned to 64 bytes
 };
 
@@ -140,7 +153,8 @@ struct FilterRow {
 /// The render loops, compiled for one kind of processor. All give the same pixels.
 struct RenderKernel {
     const char* name;
-    /// Adds the samples [first, end) of the pixels of a block to the sums.
+    /// Adds the samples [first, end) of the pixels of a block to the sums, but of tiles that are
+    /// done.
     void (*render_block)(const RenderSetup& setup, const PixelBlock& block, int first, int end,
                          const RenderSums& sums);
     /// Averages one row of pixels with those around that show the same surface.
