@@ -9,6 +9,8 @@ namespace {
 
 /// A colour that lets less through looks black as well.
 constexpr float LEAST_ATTENUATION = 1e-6F;
+/// Nothing is seen behind any way that a float can tell.
+constexpr float MOST_ABSORPTION = 1e30F;
 /// Far beyond what a picture can show, and far from the end of floats.
 constexpr float MOST_EMISSION = 1e6F;
 
@@ -58,8 +60,12 @@ void setMirrors(const Material& material, SurfaceLook& look) {
 void setGlass(const Material& material, SurfaceLook& look) {
     look.numbers.transmission = material.transmission;
     const float path = 0.5F * material.thickness / material.attenuation_distance;
+    look.index = material.index_of_refraction;
+    look.is_thin = material.thickness <= 0.0F;
     for (std::size_t c = 0; c < 3; ++c) {
         const float color = std::clamp(material.attenuation_color[c], LEAST_ATTENUATION, 1.0F);
+        look.absorption[c] =
+            look.is_thin ? 0.0F : std::min(-std::log(color) / material.attenuation_distance, MOST_ABSORPTION);
         look.density[c] = path > 0.0F ? -path * std::log(color) : 0.0F;
         look.numbers.passing[c] = material.transmission;
     }

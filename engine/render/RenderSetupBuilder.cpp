@@ -1,6 +1,7 @@
 #include "engine/render/RenderSetupBuilder.h"
 
 #include "engine/display/DisplayMode.h"
+#include "engine/display/DisplayScene.h"
 #include "engine/display/FrameSetupBuilder.h"
 #include "engine/render/SampleSequence.h"
 #include "kelmar/KM_Point.h"
@@ -12,10 +13,6 @@
 namespace quarn {
 
 namespace {
-
-/// Surfaces that light comes from lie in corners more often than under the free sky: this much of
-/// the ambient light is taken to reach them.
-constexpr float bounce_ambient = 0.6F;
 
 /// How many directions the light of the sky is summed up from: rings of equal light, each of
 /// sixteen directions.
@@ -50,6 +47,21 @@ void ringDirections(int ring, float (&directions)[3][lane_count]) {
     }
 }
 
+/// Means over all directions, by their cosine, of numbers by the cosine.
+void setMeans(const float* entries, float (&means)[SplitSum::side]) {
+    constexpr int side = SplitSum::side;
+    for (int row = 0; row < side; ++row) {
+        double sum = 0.0;
+        for (int i = 0; i + 1 < side; ++i) {
+            const double lower = entries[row * side + i];
+            const double upper = entries[row * side + i + 1];
+            // The integral of a number that grows evenly, times its cosine, from one to the next.
+            sum += i * 0.5 * (lower + upper) + lower / 6.0 + upper / 3.0;
+        }
+        means[row] = static_cast<float>(2.0 * sum / ((side - 1.0) * (side - 1.0)));
+    }
+}
+
 /// The light that a white surface which faces up gets from the sky as it is seen.
 void lightOfSky(const FrameSetup& frame, const RenderKernel& kernel, double (&light)[3]) {
     alignas(64) float directions[3][lane_count];
@@ -57,7 +69,7 @@ void lightOfSky(const FrameSetup& frame, const RenderKernel& kernel, double (&li
     std::fill_n(light, 3, 0.0);
     for (int ring = 0; ring < sky_rings; ++ring) {
         ringDirections(ring, directions);
-        kernel.sky_colors(frame, directions, colors);
+        kernel.light_around(frame, directions, colors);
         for (int c = 0; c < 3; ++c)
             for (const float color : colors[c])
                 light[c] += color / (double{sky_rings} * lane_count);
@@ -66,7 +78,7 @@ void lightOfSky(const FrameSetup& frame, const RenderKernel& kernel, double (&li
 
 } // namespace
 
-void completeRenderSetup(RenderSetup& setup, const RenderKernel& kernel) {
+void completeRenderSetup(RenderSetup& setup, const RenderKernel& kernel, RenderTables& tables) {
     const FrameSetup& frame = setup.frame;
     setup.bounce = frame;
     FrameSetup& bounce = setup.bounce;
@@ -76,24 +88,30 @@ void completeRenderSetup(RenderSetup& setup, const RenderKernel& kernel) {
     double light[3];
     lightOfSky(bounce, kernel, light);
     for (int c = 0; c < 3; ++c) {
-        const double wanted = frame.ambient_base[c] + frame.ambient_slope[c][2];
+        const double wanted = frame.ambient_base[c] + frame.ambient_slope[c][2] +
+                              2.0 * frame.ambient_square[c][2];
         setup.sky_scale[c] = light[c] > 0.0 ? static_cast<float>(wanted / light[c]) : 0.0F;
-        bounce.ambient_base[c] *= bounce_ambient;
-        for (float& slope : bounce.ambient_slope[c])
-            slope *= bounce_ambient;
     }
+    tables.environment.find(bounce, kernel);
+    setup.environment = tables.environment.table();
     for (int k = 0; k < frame.sun_count; ++k)
         setup.discs[k] = discAround(frame.suns[k].toward);
+    if (!frame.has_mirrors)
+        return;
+    setMeans(frame.split_sum, setup.mean_a);
+    setMeans(frame.split_sum + std::size_t{SplitSum::side} * SplitSum::side, setup.mean_b);
 }
 
 RenderSetup makeRenderSetup(const DisplayScene& scene, const KM_Viewport& viewport, int width,
-                            int height, const SampleSequence& sequence,
-                            const RenderKernel& kernel) {
+                            int height, const SampleSequence& sequence, const RenderKernel& kernel,
+                            RenderTables& tables) {
     RenderSetup setup;
     setup.frame =
         makeFrameSetup(scene, viewport, *findDisplayMode(rendered_mode_id), width, height);
     setup.samples = sequence.table();
-    completeRenderSetup(setup, kernel);
+    completeRenderSetup(setup, kernel, tables);
+    tables.emitters.find(scene);
+    setup.emitters = tables.emitters.table();
     return setup;
 }
 

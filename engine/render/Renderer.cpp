@@ -71,8 +71,9 @@ Result<RenderEnd> Renderer::render(const DisplayScene& scene, const KM_Viewport&
     if (const auto checked = checkMemory(request, freeMemory()); !checked)
         return checked.error();
     const SampleSequence sequence(request.samples);
-    const RenderSetup setup =
-        makeRenderSetup(scene, viewport, request.width_px, request.height_px, sequence, *m_kernel);
+    RenderTables tables;
+    const RenderSetup setup = makeRenderSetup(scene, viewport, request.width_px, request.height_px,
+                                              sequence, *m_kernel, tables);
     RenderLines lines(scene, setup.frame,
                       scene.canBeSeenBy(viewport, request.width_px, request.height_px));
     RenderLayers layers(request.width_px, request.height_px);

@@ -80,7 +80,8 @@ inline LampLanes lampSeen(const MetLanes& met, const FrameLamp& lamp) {
     seen.way = along(place, met.start.place, -1.0F);
     const Lanes square = dot(seen.way, seen.way);
     seen.toward = ofUnitLength(seen.way);
-    const Lanes cone = clamped(Lanes(lamp.cone_base) - dot(seen.toward, lamp.axis) * lamp.cone_slope);
+    const Lanes cone =
+        clamped(Lanes(lamp.cone_base) - dot(seen.toward, lamp.axis) * lamp.cone_slope);
     seen.amount = cone * cone / greatest(square, lamp.least_square);
     return seen;
 }
@@ -130,9 +131,8 @@ inline void addEmitters(const MetLanes& met, const Lanes& choice, const LanePlac
     const LaneMask seen = facing & (luminance(shining) > 0.0F);
     if (!any(seen))
         return;
-    const LaneColors arriving =
-        lightArriving(met.setup.frame, met.packet, met.surfaces, met.start, way,
-                      1.0F - 2.0F * same_place, 1.0F, seen);
+    const LaneColors arriving = lightArriving(met.setup.frame, met.packet, met.surfaces, met.start,
+                                              way, 1.0F - 2.0F * same_place, 1.0F, seen);
     const Lanes density = at.density * square / greatest(cosine, 1e-4F);
     const SentLanes sent = sentFrom(met.setup, met.lobes, met.looks, toward);
     const Lanes weight = weightBeside(density, sent.density) / greatest(density, 1e-20F);

@@ -16,6 +16,11 @@ inline Lanes weightBeside(const Lanes& density, const Lanes& other) {
     return square / greatest(square + other * other, 1e-30F);
 }
 
+/// Rec. 709 luminance.
+inline float emitterBrightness(const float (&emission)[3]) {
+    return 0.2126F * emission[0] + 0.7152F * emission[1] + 0.0722F * emission[2];
+}
+
 /// How bright the surfaces shine that a packet met, by their materials' numbers alone: so much are
 /// places on them preferred.
 inline Lanes preferenceOf(const FrameSetup& frame, const SurfaceLanes& surfaces,

@@ -41,9 +41,9 @@ struct LobeLanes {
     bool has_mirrors;
     FacetLanes base;
     Lanes roughness;
-    LaneColors let_in;   ///< to what is matt, from the observer's side, beside the mean
-    LaneColors further;  ///< what comes off in the end of light that went from mirror to mirror
-    Lanes lost;          ///< of the observer's side by single mirrors, beside the mean
+    LaneColors let_in;  ///< to what is matt, from the observer's side, beside the mean
+    LaneColors further; ///< what comes off in the end of light that went from mirror to mirror
+    Lanes lost;         ///< of the observer's side by single mirrors, beside the mean
     bool has_coat;
     Lanes coat; ///< how much of the surface is under one
     FacetLanes over;
@@ -260,11 +260,13 @@ inline void addMirrored(const RenderSetup& setup, const LobeLanes& lobes, const 
     Lanes density;
     const LaneColors mirrored = facetsSend(lobes.base, lobes.observer, toward, facing,
                                            greatest(lobes.base.alpha, least_alpha), density);
-    const LaneMask shown = lobes.mirrors & (least_alpha > 0.0F ? facing > 0.0F
-                                                               : ~lobes.base.perfect);
+    const LaneMask shown =
+        lobes.mirrors & (least_alpha > 0.0F ? facing > 0.0F : ~lobes.base.perfect);
     const LaneColors none{0.0F, 0.0F, 0.0F};
-    sent.gloss = select(shown, mirrored, none) + select(lobes.mirrors, part * (even * lobes.lost), none);
-    const Lanes matt_chance = Lanes(1.0F) - lobes.mirror_chance - (lobes.has_coat ? lobes.coat_chance : Lanes(0.0F));
+    sent.gloss =
+        select(shown, mirrored, none) + select(lobes.mirrors, part * (even * lobes.lost), none);
+    const Lanes matt_chance =
+        Lanes(1.0F) - lobes.mirror_chance - (lobes.has_coat ? lobes.coat_chance : Lanes(0.0F));
     sent.density = even * matt_chance + select(shown, density * lobes.mirror_chance, 0.0F);
     if (!lobes.has_coat)
         return;
@@ -293,7 +295,7 @@ inline SentLanes sentFrom(const RenderSetup& setup, const LobeLanes& lobes, cons
     return sent;
 }
 
-/// A ray that a surface sends on.
+/// A direction that a surface asks for light.
 struct NextRay {
     LaneVectors direction; ///< unit vector
     LaneColors matt;       ///< of the light from there what is sent to the observer, scattered
@@ -311,17 +313,19 @@ inline void takeMirrored(const RenderSetup& setup, const LobeLanes& lobes, const
                          const Lanes& choice, const DiscLanes& disc, NextRay& next) {
     LaneMask by_coat = noLanes();
     const Lanes coat_chance = lobes.has_coat ? lobes.coat_chance : Lanes(0.0F);
-    const LaneMask by_mirrors = ~(choice < coat_chance) & (choice < coat_chance + lobes.mirror_chance);
+    const LaneMask by_mirrors =
+        ~(choice < coat_chance) & (choice < coat_chance + lobes.mirror_chance);
     LaneVectors half;
-    next.direction = select(by_mirrors, mirroredBy(lobes.base, lobes.observer, disc, half),
-                            next.direction);
+    next.direction =
+        select(by_mirrors, mirroredBy(lobes.base, lobes.observer, disc, half), next.direction);
     if (lobes.has_coat) {
         by_coat = choice < coat_chance;
         next.direction =
             select(by_coat, mirroredBy(lobes.over, lobes.observer, disc, half), next.direction);
     }
     const SentLanes sent = sentFrom(setup, lobes, &looks, next.direction);
-    const Lanes scale = select(sent.density > 1e-9F, Lanes(1.0F) / greatest(sent.density, 1e-9F), 0.0F);
+    const Lanes scale =
+        select(sent.density > 1e-9F, Lanes(1.0F) / greatest(sent.density, 1e-9F), 0.0F);
     next.matt = sent.matt * scale;
     next.gloss = sent.gloss * scale;
     next.density = sent.density;
@@ -331,7 +335,7 @@ inline void takeMirrored(const RenderSetup& setup, const LobeLanes& lobes, const
             mirroredPart(facets, facets.facing) * (part / greatest(chance, 1e-6F));
         next.gloss = select(lanes, only, next.gloss);
         next.matt = select(lanes, {0.0F, 0.0F, 0.0F}, next.matt);
-        next.density = select(lanes, 0.0F, next.density);
+        next.density = select(lanes, Lanes(0.0F), next.density);
     };
     const LaneMask perfect = by_mirrors & lobes.base.perfect;
     if (any(perfect))

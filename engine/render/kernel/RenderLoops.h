@@ -38,33 +38,29 @@ inline void readBrightness(const TileSums& sums, Lanes (&brightness)[halved_coun
 }
 
 /// Adds a sample with an even number, and what it adds to the halves.
-inline void addEvenSample(SampleRays& rays, TileSums& sums) {
+inline void addEvenSample(const RenderSetup& setup, const SampleNumber& sample, RayPacket& packet,
+                          TileSums& sums) {
     Lanes before[halved_count];
     Lanes behind[halved_count];
     readBrightness(sums, before);
-    addSample(rays, sums);
+    addSample(setup, sample, packet, sums);
     readBrightness(sums, behind);
     for (int i = 0; i < halved_count; ++i)
         sums.add(halved_planes[i].even, behind[i] - before[i]);
 }
 
 inline void renderTile(const RenderSetup& setup, const TileCorners& corners, int first, int end,
-                       const TileSamples& samples, RayPacket& packet, RayPacket& bounce,
-                       TileSums& sums) {
+                       const TileSamples& samples, RayPacket& packet, TileSums& sums) {
     for (int index = first; index < end; ++index) {
-        const std::uint32_t reversed = reversedBits(static_cast<std::uint32_t>(index));
-        const auto places = [&](SampleUse use) {
-            return placesAt(setup.samples, samples, use, reversed);
-        };
-        const LanePlaces place = places(SampleUse::pixel_area);
+        const SampleNumber sample{setup.samples, samples,
+                                  reversedBits(static_cast<std::uint32_t>(index))};
+        const LanePlaces place = placesAt(sample, SampleUse::pixel_area, 0);
         packet.x = corners.x + place.u;
         packet.y = corners.y + place.v;
-        SampleRays rays{setup, places(SampleUse::sky_dome), places(SampleUse::sun_disc), packet,
-                        bounce};
         if (index % 2 == 0)
-            addEvenSample(rays, sums);
+            addEvenSample(setup, sample, packet, sums);
         else
-            addSample(rays, sums);
+            addSample(setup, sample, packet, sums);
     }
     sums.add(RenderPlane::samples, static_cast<float>(end - first));
 }
@@ -73,11 +69,7 @@ void renderBlock(const RenderSetup& setup, const PixelBlock& block, int first, i
                  const RenderSums& sums) {
     const TileCorners corners = tileCorners();
     RayPacket packet;
-    RayPacket bounce;
     prepare(packet.rays.ray);
-    prepare(bounce.rays.ray);
-    bounce.x = 0.0F;
-    bounce.y = 0.0F;
     TileSamples samples;
     TileSums tile;
     for (int y = block.y_begin; y < block.y_end; y += tile_size)
@@ -95,28 +87,25 @@ void renderBlock(const RenderSetup& setup, const PixelBlock& block, int first, i
                             (corners.y < static_cast<float>(block.y_end - y));
             renderTile(setup,
                        {corners.x + static_cast<float>(x), corners.y + static_cast<float>(y)},
-                       first, end, samples, packet, bounce, tile);
+                       first, end, samples, packet, tile);
             for (int p = 0; p < RenderPlane::count; ++p)
                 store(sums.planes[p] + at, tile.plane[p]);
         }
 }
 
-void skyColorsToward(const FrameSetup& frame, const float (&directions)[3][lane_count],
+void lightFromAround(const FrameSetup& frame, const float (&directions)[3][lane_count],
                      float (&colors)[3][lane_count]) {
-    RayPacket packet;
-    packet.x = 0.0F;
-    packet.y = 0.0F;
-    setDirection(packet.rays.ray, {load(directions[0]), load(directions[1]), load(directions[2])});
-    const LaneColors sky = skyColors(frame, packet);
-    store(colors[0], sky.r);
-    store(colors[1], sky.g);
-    store(colors[2], sky.b);
+    const LaneColors light =
+        lightAround(frame, {load(directions[0]), load(directions[1]), load(directions[2])});
+    store(colors[0], light.r);
+    store(colors[1], light.g);
+    store(colors[2], light.b);
 }
 
 } // namespace
 
 extern const RenderKernel QUARN_RENDER_KERNEL;
 const RenderKernel QUARN_RENDER_KERNEL{QUARN_RENDER_KERNEL_NAME, renderBlock, filterRow,
-                                       skyColorsToward};
+                                       lightFromAround};
 
 } // namespace quarn

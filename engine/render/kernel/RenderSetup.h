@@ -43,7 +43,7 @@ struct SunDisc {
 /// How the light from infinitely far away is spread, see EnvironmentLight.h.
 struct EnvironmentTable {
     static constexpr int side = 128;
-    const float* rows = nullptr; ///< side + 1 numbers from 0 to 1; null: it is even enough
+    const float* rows = nullptr;    ///< side + 1 numbers from 0 to 1; null: it is even enough
     const float* cells = nullptr;   ///< of each row the same
     const float* density = nullptr; ///< of each cell, by area of the square from -1 to 1
 };
@@ -64,11 +64,6 @@ struct EmitterTable {
     float density_of_brightness = 0.0F;
 };
 
-/// Rec. 709 luminance.
-inline float emitterBrightness(const float (&emission)[3]) {
-    return 0.2126F * emission[0] + 0.7152F * emission[1] + 0.0722F * emission[2];
-}
-
 /// Everything that the render loops need for one picture.
 struct RenderSetup {
     FrameSetup frame; ///< what is seen directly
@@ -80,7 +75,7 @@ struct RenderSetup {
     /// The means of SplitSum's rows over all directions, by their cosine.
     float mean_a[SplitSum::side] = {};
     float mean_b[SplitSum::side] = {};
-    SunDisc discs[max_suns] = {};   ///< of frame.suns
+    SunDisc discs[max_suns] = {}; ///< of frame.suns
     SampleTable samples;
 };
 
@@ -159,9 +154,10 @@ struct RenderKernel {
                          const RenderSums& sums);
     /// Averages one row of pixels with those around that show the same surface.
     void (*filter_row)(const FilterRow& row);
-    /// The colours of the sky in sixteen directions of unit length; rows are x, y, z and r, g, b.
-    void (*sky_colors)(const FrameSetup& frame, const float (&directions)[3][lane_count],
-                       float (&colors)[3][lane_count]);
+    /// The light from far away in sixteen directions of unit length, see lightAround; rows are x,
+    /// y, z and r, g, b.
+    void (*light_around)(const FrameSetup& frame, const float (&directions)[3][lane_count],
+                         float (&colors)[3][lane_count]);
 };
 
 /// The loops for the instruction set in force (InstructionSet.h).
