@@ -47,6 +47,15 @@ inline LaneColors blurredLight(const FrameSetup& frame, const EnvironmentSamples
     return sum;
 }
 
+void findLightAround(const FrameSetup& frame, const float (&directions)[3][lane_count],
+                     float (&colors)[3][lane_count]) {
+    const LaneColors light =
+        broadLight(frame, {load(directions[0]), load(directions[1]), load(directions[2])});
+    store(colors[0], light.r);
+    store(colors[1], light.g);
+    store(colors[2], light.b);
+}
+
 void findEnvironment(const FrameSetup& frame, const EnvironmentSamples& samples, int level,
                      int row) {
     constexpr int stride = environment_map::stride;

@@ -159,6 +159,8 @@ struct FrameSetup {
     bool has_clear_background = false; ///< pixels have an opacity; the background is black
     float background_top[3] = {1, 1, 1};
     float background_bottom[3] = {1, 1, 1};
+    float shown_top[3] = {1, 1, 1}; ///< the background as it is shown, in linear light
+    float shown_bottom[3] = {1, 1, 1};
     float sky_horizon[3] = {1, 1, 1};
     float sky_side[3] = {0, 0, 0}; ///< see Sky
     float sky_zenith[3] = {1, 1, 1};
@@ -227,6 +229,10 @@ struct RayKernel {
     /// Fills a row of picture `level` of `environment`, from 1 on; the one before must be whole.
     void (*find_environment)(const FrameSetup& frame, const EnvironmentSamples& samples, int level,
                              int row);
+    /// What rough surfaces see of all that lies around and of the ground in sixteen directions of
+    /// unit length; rows are x, y, z and r, g, b.
+    void (*find_light_around)(const FrameSetup& frame, const float (&directions)[3][lane_count],
+                              float (&colors)[3][lane_count]);
 };
 
 /// The loops for the instruction set in force (InstructionSet.h).

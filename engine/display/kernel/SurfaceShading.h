@@ -1,5 +1,6 @@
 #pragma once
 
+#include "engine/display/kernel/LampLight.h"
 #include "engine/display/kernel/SkyGrid.h"
 
 namespace quarn {
@@ -52,18 +53,23 @@ inline void addFixedLights(const FrameSetup& frame, const LaneVectors& normal, L
     }
 }
 
-/// Adds the light of the suns.
-/// @param also  is called with each sun, the cosine to it and the part of its light that arrives
+/// Adds the light that shadows keep off: of suns and lamps.
+/// @param also  is called for each with its light that arrives, unit vectors to it and the cosine
+///   to these
 template <class Also>
-inline void addSuns(const FrameSetup& frame, const RayPacket& packet, const SurfaceLanes& surfaces,
-                    const LaneMask& lit, LaneColors& light, const Also& also) {
+inline void addLights(const FrameSetup& frame, const RayPacket& packet,
+                      const SurfaceLanes& surfaces, const LaneMask& lit, LaneColors& light,
+                      const Also& also) {
     for (int k = 0; k < frame.sun_count; ++k) {
         const FrameLight& sun = frame.suns[k];
         const Lanes facing = greatest(dot(surfaces.normal, sun.toward), 0.0F);
         const Lanes arriving = sunlightArriving(frame, sun, packet, surfaces, lit, facing);
         addLight(sun.color, facing * arriving, light);
-        also(sun, facing, arriving);
+        also(uniformColor(sun.color) * arriving,
+             LaneVectors{sun.toward[0], sun.toward[1], sun.toward[2]}, facing);
     }
+    if (frame.lamp_count > 0)
+        addLamps(frame, packet, surfaces, lit, light, also);
 }
 
 /// The light that diffuse surfaces send to the observer, in the lanes of `lit`.
@@ -71,7 +77,7 @@ inline LaneColors shadeSurfaces(const FrameSetup& frame, const RayPacket& packet
                                 const SurfaceLanes& surfaces, const LaneMask& lit) {
     LaneColors light = skyLight(frame, packet, surfaces, lit);
     addFixedLights(frame, surfaces.normal, light);
-    addSuns(frame, packet, surfaces, lit, light, [](const auto&...) {});
+    addLights(frame, packet, surfaces, lit, light, [](const auto&...) {});
     return {surfaces.albedo.r * light.r, surfaces.albedo.g * light.g, surfaces.albedo.b * light.b};
 }
 

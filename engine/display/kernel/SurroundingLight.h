@@ -1,6 +1,5 @@
 #pragma once
 
-#include "engine/display/EnvironmentMap.h"
 #include "engine/display/kernel/Background.h"
 #include "engine/display/kernel/SurfaceShading.h"
 
@@ -31,56 +30,6 @@ inline Lanes softBoxAround(const FrameSoftBox& box, const LaneVectors& direction
                   0.0F);
 }
 
-/// A place on a square map: between four texels.
-struct MapPlace {
-    LaneInts texel; ///< the one at the upper left
-    Lanes right;
-    Lanes below;
-};
-
-/// @param side  texels of the map without its border
-template <int side> inline MapPlace placeOnMap(const LaneVectors& d) {
-    constexpr float half = 0.5F * side;
-    const Lanes scale = Lanes(1.0F) / (magnitude(d.x) + magnitude(d.y) + magnitude(d.z));
-    const Lanes u = d.x * scale;
-    const Lanes v = d.y * scale;
-    const LaneMask folded = d.z < 0.0F;
-    const Lanes x =
-        select(folded, withSignOf(greatest(Lanes(1.0F) - magnitude(v), 0.0F), u), u) * half +
-        (half + 0.5F);
-    const Lanes y =
-        select(folded, withSignOf(greatest(Lanes(1.0F) - magnitude(u), 0.0F), v), v) * half +
-        (half + 0.5F);
-    // Whatever the direction is, nothing but the map is read.
-    const LaneInts column = limited(wholePart(x), side);
-    const LaneInts row = limited(wholePart(y), side);
-    return {row * LaneInts(side + 2) + column, x - floatsOf(column), y - floatsOf(row)};
-}
-
-/// @param stride  texels of the map with its border
-/// @param first   of each lane the first texel of the channel
-inline Lanes channelAt(const float* map, int stride, const LaneInts& first, const MapPlace& place) {
-    const auto* const from = reinterpret_cast<const std::uint32_t*>(map);
-    const LaneInts at = first + place.texel;
-    const auto texel = [&](int offset) { return floatsWith(gathered(from + offset, at)); };
-    const Lanes upper_left = texel(0);
-    const Lanes lower_left = texel(stride);
-    const Lanes upper = upper_left + place.right * (texel(1) - upper_left);
-    const Lanes lower = lower_left + place.right * (texel(stride + 1) - lower_left);
-    return upper + place.below * (lower - upper);
-}
-
-/// What a map of a picture of the surroundings shows in a direction.
-template <class Map>
-[[gnu::noinline]] inline LaneColors seenOnMap(const float* map, float scale,
-                                              const LaneVectors& direction) {
-    const MapPlace place = placeOnMap<Map::side>(direction);
-    const auto channel = [&](int c) {
-        return channelAt(map + c * Map::texels, Map::stride, LaneInts(0), place) * scale;
-    };
-    return {channel(0), channel(1), channel(2)};
-}
-
 /// The light that comes from far away in a direction of unit length, as if there were no ground.
 /// The suns are not in it: they are lights of their own.
 inline LaneColors lightAround(const FrameSetup& frame, const LaneVectors& direction) {
@@ -95,10 +44,15 @@ inline LaneColors lightAround(const FrameSetup& frame, const LaneVectors& direct
     return light;
 }
 
+/// True where mirrors show the ground. A picture of what lies around has its own.
+inline bool mirrorsGround(const FrameSetup& frame) {
+    return frame.has_ground && !frame.picture.sharp;
+}
+
 /// Lays the ground, as it is seen from the middle of the scene, over what lies around.
 inline LaneColors aboveGround(const FrameSetup& frame, const LaneVectors& direction,
                               const LaneColors& light) {
-    if (!frame.has_ground)
+    if (!mirrorsGround(frame))
         return light;
     return blended(light, uniformColor(frame.ground_light), groundAround(frame, direction));
 }
