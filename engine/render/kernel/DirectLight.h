@@ -1,5 +1,6 @@
 #pragma once
 
+#include "engine/display/kernel/LampLight.h"
 #include "engine/render/kernel/Emitters.h"
 #include "engine/render/kernel/EnvironmentLight.h"
 #include "engine/render/kernel/Lobes.h"
@@ -59,7 +60,7 @@ inline SentLight sentOfSuns(const MetLanes& met, const LanePlaces& place) {
         const LaneMask facing = facingLanes(met, middle);
         if (!any(facing))
             continue;
-        const LaneColors arriving = lightArriving(frame, met.packet, met.surfaces, met.start,
+        const LaneColors arriving = lightReaching(frame, met.packet, met.surfaces, met.start,
                                                   toward, unlimited, sun.shadow, facing);
         light.add(sentFrom(met.setup, met.lobes, met.looks, middle, sun_spread),
                   arriving * ofFacingLight(sun.color));
@@ -67,36 +68,18 @@ inline SentLight sentOfSuns(const MetLanes& met, const LanePlaces& place) {
     return light;
 }
 
-/// How a lamp is seen from the surfaces.
-struct LampLanes {
-    LaneVectors way; ///< to the lamp
-    LaneVectors toward;
-    Lanes amount; ///< of its color
-};
-
-inline LampLanes lampSeen(const MetLanes& met, const FrameLamp& lamp) {
-    LampLanes seen;
-    const LaneVectors place{lamp.place[0], lamp.place[1], lamp.place[2]};
-    seen.way = along(place, met.start.place, -1.0F);
-    const Lanes square = dot(seen.way, seen.way);
-    seen.toward = ofUnitLength(seen.way);
-    const Lanes cone =
-        clamped(Lanes(lamp.cone_base) - dot(seen.toward, lamp.axis) * lamp.cone_slope);
-    seen.amount = cone * cone / greatest(square, lamp.least_square);
-    return seen;
-}
-
 /// The light of lamps, each of which is a point.
-inline void addLamps(const MetLanes& met, SentLight& light) {
+inline void addSentOfLamps(const MetLanes& met, SentLight& light) {
     const FrameSetup& frame = met.setup.frame;
     for (int k = 0; k < frame.lamp_count; ++k) {
         const FrameLamp& lamp = frame.lamps[k];
-        const LampLanes seen = lampSeen(met, lamp);
+        const LampLanes seen = lampAt(lamp, met.start.place);
         const LaneMask facing = facingLanes(met, seen.toward) & (seen.amount > 0.0F);
         if (!any(facing))
             continue;
-        const LaneColors arriving = lightArriving(frame, met.packet, met.surfaces, met.start,
-                                                  seen.way, 1.0F, lamp.shadow, facing);
+        const LaneColors arriving =
+            lightReaching(frame, met.packet, met.surfaces, met.start, seen.toward,
+                          seen.distance * part_to_lamp, lamp.shadow, facing);
         light.add(sentFrom(met.setup, met.lobes, met.looks, seen.toward, sun_spread),
                   arriving * ofFacingLight(lamp.color) * select(facing, seen.amount, 0.0F));
     }
@@ -109,7 +92,7 @@ inline void addEnvironment(const MetLanes& met, const LanePlaces& place, SentLig
     const LaneMask facing = facingLanes(met, toward) & ~met.glass & (density > 0.0F);
     if (!any(facing))
         return;
-    const LaneColors arriving = lightArriving(met.setup.frame, met.packet, met.surfaces, met.start,
+    const LaneColors arriving = lightReaching(met.setup.frame, met.packet, met.surfaces, met.start,
                                               toward, unlimited, 1.0F, facing);
     const SentLanes sent = sentFrom(met.setup, met.lobes, met.looks, toward);
     const Lanes weight = weightBeside(density, sent.density) / greatest(density, 1e-20F);
@@ -131,7 +114,7 @@ inline void addEmitters(const MetLanes& met, const Lanes& choice, const LanePlac
     const LaneMask seen = facing & (luminance(shining) > 0.0F);
     if (!any(seen))
         return;
-    const LaneColors arriving = lightArriving(met.setup.frame, met.packet, met.surfaces, met.start,
+    const LaneColors arriving = lightReaching(met.setup.frame, met.packet, met.surfaces, met.start,
                                               way, 1.0F - 2.0F * same_place, 1.0F, seen);
     const Lanes density = at.density * square / greatest(cosine, 1e-4F);
     const SentLanes sent = sentFrom(met.setup, met.lobes, met.looks, toward);

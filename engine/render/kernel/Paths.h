@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/display/kernel/LookShading.h"
+#include "engine/display/kernel/ShadowCatcher.h"
 #include "engine/render/kernel/Glass.h"
 #include "engine/render/kernel/TileSums.h"
 
@@ -162,7 +163,7 @@ inline void addLights(const MetLanes& met, const PathLanes& path, const LanePlac
                       const Lanes& choice, PathLight& found) {
     SentLight sun = sentOfSuns(met, place);
     if (met.setup.frame.lamp_count > 0)
-        addLamps(met, sun);
+        addSentOfLamps(met, sun);
     SentLight around;
     if (met.setup.environment.rows)
         addEnvironment(met, place, around);
@@ -291,21 +292,33 @@ private:
         addBackground(m_setup, m_packet, m_path, missed, ground, m_found);
         const LaneMask on_ground = missed & (ground > 0.0F);
         if (frame.catches_shadows && any(on_ground & m_path.unturned))
-            takeBackground(frame, on_ground & m_path.unturned, surfaces);
+            takeBackground(frame, on_ground & m_path.unturned, ground, surfaces);
         m_path.weight = select(on_ground, m_path.weight * ground, m_path.weight);
         m_path.going = m_path.going & (m_packet.hit | on_ground);
         return ground;
     }
 
-    /// Where nothing shadows it the ground looks like what lies behind it.
-    void takeBackground(const FrameSetup& frame, const LaneMask& lanes,
-                        SurfaceLanes& surfaces) const {
+    /// Where nothing shadows it the ground looks like what lies behind it. Shadows take from what
+    /// is shown, see shadedBackground: here from light that is shown alike unshadowed and where
+    /// three tenths of the light are missing.
+    void takeBackground(const FrameSetup& frame, const LaneMask& lanes, const Lanes& ground,
+                        SurfaceLanes& surfaces) {
         const LaneColors behind = backgroundColors(m_setup.frame, m_packet);
-        const auto channel = [&](int c, const Lanes& color) {
-            return color * (frame.ground_albedo[c] /
-                            (frame.ground_light[c] > 1e-6F ? frame.ground_light[c] : 1e-6F));
-        };
-        const LaneColors albedo{channel(0, behind.r), channel(1, behind.g), channel(2, behind.b)};
+        constexpr float shade = 0.3F;
+        LaneColors changing = behind;
+        if (!frame.has_sky) {
+            const LaneColors shaded = lightShownAs(
+                frame,
+                gradient(frame, m_packet.y, frame.shown_top, frame.shown_bottom) * (1.0F - shade));
+            changing = (behind - shaded) * (1.0F / shade);
+        }
+        addFound(m_path, lanes, (behind - changing) * ground, m_found);
+        const Lanes t = select(lanes, m_packet.distance, 0.0F);
+        const LaneColors open =
+            lightOnOpenGround(frame, along(m_packet.origin(), m_packet.direction(), t));
+        const LaneColors albedo{changing.r / greatest(open.r, 1e-6F),
+                                changing.g / greatest(open.g, 1e-6F),
+                                changing.b / greatest(open.b, 1e-6F)};
         surfaces.albedo = select(lanes, albedo, surfaces.albedo);
     }
 

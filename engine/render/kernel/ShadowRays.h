@@ -72,7 +72,7 @@ inline void setOff(const FrameSetup& frame, const RayPacket& packet, const Surfa
 /// @param reach    how far the light is away; `unlimited` for what is infinitely far
 /// @param shadow   how much of the light a shadow takes away, 0 to 1
 /// @param look     the lanes that ask; others get 1
-inline LaneColors lightArriving(const FrameSetup& frame, const RayPacket& packet,
+inline LaneColors lightReaching(const FrameSetup& frame, const RayPacket& packet,
                                 const SurfaceLanes& surfaces, const StartLanes& start,
                                 const LaneVectors& toward, const Lanes& reach, float shadow,
                                 const LaneMask& look) {
