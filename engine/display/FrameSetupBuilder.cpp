@@ -19,6 +19,8 @@ namespace {
 
 /// How far surfaces of clay hide the sky from each other.
 constexpr float sky_reach_of_scene = 0.09F;
+/// How far things in the studio darken the ground.
+constexpr float sky_reach_of_studio = 0.2F;
 /// How high the middle of what mirrors the ground lies over it, beside the ground's reach.
 constexpr float ground_eye_of_reach = 0.1F;
 
@@ -163,13 +165,14 @@ void setGround(FrameSetup& frame) {
 }
 
 void setStyle(FrameSetup& frame, SurfaceStyle style, const RayScene& rays) {
-    frame.textures = style == SurfaceStyle::lit;
-    if (style == SurfaceStyle::lit || style == SurfaceStyle::studio) {
+    if (showsMaterials(style)) {
+        frame.textures = true;
         frame.has_see_through = rays.hasSeeThrough();
         frame.has_looks = rays.hasLooks();
+        frame.has_one_sided = rays.hasOneSided();
+        frame.has_mirrors = rays.hasMirrors();
+        frame.mirrors_scene = frame.has_mirrors && style == SurfaceStyle::lit;
     }
-    frame.has_mirrors = style == SurfaceStyle::lit && rays.hasMirrors();
-    frame.mirrors_scene = frame.has_mirrors;
     if (style == SurfaceStyle::translucent)
         frame.layers = {12, 0.36F, 0.85F, 0.55F};
     if (style == SurfaceStyle::x_ray)
@@ -250,6 +253,11 @@ FrameSetup makeFrameSetup(const DisplayScene& scene, const KM_Viewport& viewport
     if (mode.surface_style == SurfaceStyle::clay) {
         frame.sky_reach = sky_reach_of_scene * frame.scene_size;
         set(frame.ground_albedo, {0.72F, 0.72F, 0.72F});
+    }
+    if (mode.surface_style == SurfaceStyle::studio) {
+        frame.sky_reach = sky_reach_of_studio * frame.scene_size;
+        frame.hides_sky_of_ground_alone = true;
+        set(frame.ground_albedo, {0.40F, 0.40F, 0.40F});
     }
     if (frame.has_mirrors)
         setMirrored(frame, lighting);
