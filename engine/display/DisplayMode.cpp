@@ -49,6 +49,15 @@ DisplayModeAttributes wireframe() {
     return attributes;
 }
 
+/// A backdrop and a ground that white and black models stand out from.
+DisplayModeAttributes shaded() {
+    auto attributes = mode(shaded_mode_id, L"Shaded", SurfaceStyle::studio);
+    attributes.has_ground_plane = true;
+    attributes.background_top = {186, 190, 195, 255};
+    attributes.background_bottom = {160, 162, 165, 255};
+    return attributes;
+}
+
 DisplayModeAttributes underDocumentLights(DisplayModeAttributes attributes) {
     attributes.uses_document_lights = true;
     attributes.casts_shadows = true;
@@ -97,6 +106,10 @@ DisplayModeAttributes clay() {
 
 } // namespace
 
+bool showsMaterials(SurfaceStyle style) {
+    return style == SurfaceStyle::lit || style == SurfaceStyle::studio;
+}
+
 DisplayModeAttributes withEdges(DisplayModeAttributes mode, MeshEdgeChoice choice) {
     if (choice == MeshEdgeChoice::standard)
         return mode;
@@ -108,10 +121,7 @@ DisplayModeAttributes withEdges(DisplayModeAttributes mode, MeshEdgeChoice choic
 
 std::span<const DisplayModeAttributes> standardDisplayModes() {
     static const std::vector<DisplayModeAttributes> modes{
-        wireframe(), mode(shaded_mode_id, L"Shaded", SurfaceStyle::studio),
-        rendered(),  translucent(),
-        xRay(),      drawing(),
-        clay()};
+        wireframe(), shaded(), rendered(), translucent(), xRay(), drawing(), clay()};
     return modes;
 }
 

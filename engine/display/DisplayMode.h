@@ -17,7 +17,7 @@ enum class DisplayKind : int {
 /// How surfaces are painted.
 enum class SurfaceStyle : int {
     none,   ///< not at all: one sees through everything
-    studio, ///< base colours under a neutral light that follows the camera
+    studio, ///< colours and textures under a neutral light that follows the camera
     lit,    ///< colours and textures under the document's lights and the sky, on a ground plane
     translucent, ///< one sees through, layer behind layer
     x_ray,       ///< see-through faces, dense where they are seen edge-on
@@ -64,6 +64,9 @@ struct DisplayModeAttributes {
     int antialiasing_level =
         1; ///< see AntialiasingLevel; a value beyond its range is moved into it
 };
+
+/// Whether surfaces look as their materials say, and the backs of one-sided ones are not seen.
+bool showsMaterials(SurfaceStyle style);
 
 /// Which edges of meshes are drawn.
 enum class MeshEdgeChoice : int {

@@ -124,7 +124,8 @@ void DisplayPipeline::drawSurfaces(FrameSetup& frame, const DisplayModeAttribute
                          static_cast<std::size_t>(frame.height));
         frame.objects = m_objects.data();
     }
-    frame.needs_unit_faces = frame.sun_count > 0 || frame.sky_reach > 0.0F || frame.has_mirrors;
+    frame.needs_unit_faces = frame.sun_count > 0 || frame.has_mirrors ||
+                             (frame.sky_reach > 0.0F && !frame.hides_sky_of_ground_alone);
     if (frame.scene && frame.sky_reach > 0.0F)
         m_free_sky.find(frame, *m_kernel);
     if (frame.has_mirrors)

@@ -52,6 +52,11 @@ float passingOf(const SurfaceLook& look, const LinearColor& albedo) {
     return mean * (1.0F - look.numbers.metalness);
 }
 
+/// One looks through both sides of a body.
+bool isBodyOfGlass(const Material& material) {
+    return material.transmission > 0.0F && material.thickness > 0.0F;
+}
+
 /// The greatest distance of a corner from the origin, along an axis.
 double greatestCoordinate(const KM_BoundingBox& box) {
     return std::max({std::abs(box.m_min.x), std::abs(box.m_min.y), std::abs(box.m_min.z),
@@ -254,6 +259,7 @@ RaySurface DisplayScene::surfaceOf(const SceneMesh& object, const RayMesh& mesh)
     surface.has_cutout = material.alpha_cutout;
     surface.alpha_cutoff = material.alpha_cutoff;
     surface.see_through = material.see_through && !material.alpha_cutout;
+    surface.one_sided = material.is_one_sided && !isBodyOfGlass(material);
     const bool has_coordinates = !mesh.mesh().m_T.empty();
     surface.look = m_materials.look(object.placed.material, has_coordinates);
     if (surface.look)

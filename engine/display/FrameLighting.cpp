@@ -21,6 +21,8 @@ namespace {
 /// casts the only shadows.
 constexpr float SKY_REACH_OF_CLAY = 0.09F;
 constexpr double SKY_REACH_OF_SCENE = 0.35;
+/// How far things that are only shaded darken the ground.
+constexpr float SKY_REACH_OF_SHADED = 0.12F;
 /// How high the middle of what mirrors the ground lies over it, beside the ground's reach.
 constexpr float GROUND_EYE_OF_REACH = 0.1F;
 /// Lamps are taken to be of this size, as a part of the scene's: nearer by they shine no brighter.
@@ -182,7 +184,8 @@ void setBackground(FrameSetup& frame, const LightSettings& settings,
     frame.has_sky =
         kind == BackgroundKind::automatic && mode.has_sky && surroundings != Surroundings::studio;
     frame.catches_shadows = frame.has_ground && (kind != BackgroundKind::automatic ||
-                                                 surroundings != Surroundings::sky);
+                                                 surroundings != Surroundings::sky ||
+                                                 mode.surface_style == SurfaceStyle::studio);
     if (kind == BackgroundKind::color)
         setGradient(frame, settings.background_color, settings.background_color, 1.0F);
     else if (surroundings == Surroundings::studio)
@@ -195,6 +198,8 @@ void setSoftShadows(FrameSetup& frame, const DisplayScene& scene, SurfaceStyle s
                     Surroundings surroundings) {
     if (style == SurfaceStyle::clay)
         frame.sky_reach = SKY_REACH_OF_CLAY * frame.scene_size;
+    else if (style == SurfaceStyle::studio)
+        frame.sky_reach = frame.has_ground ? SKY_REACH_OF_SHADED * frame.scene_size : 0.0F;
     else if (surroundings != Surroundings::sky)
         frame.sky_reach =
             static_cast<float>(SKY_REACH_OF_SCENE * scene.wholeBox().Diagonal().Length());
@@ -215,7 +220,10 @@ void setLighting(FrameSetup& frame, const DisplayScene& scene, const KM_Viewport
         set(frame.ground_albedo, {STUDIO_FLOOR_ALBEDO, STUDIO_FLOOR_ALBEDO, STUDIO_FLOOR_ALBEDO});
     setBackground(frame, scene.light(), mode, surroundings);
     setSoftShadows(frame, scene, mode.surface_style, surroundings);
-    if (surroundings == Surroundings::sky)
+    frame.hides_sky_of_ground_alone = mode.surface_style == SurfaceStyle::studio;
+    if (mode.surface_style == SurfaceStyle::studio)
+        std::copy_n(frame.background_bottom, 3, frame.ground_light);
+    else if (surroundings == Surroundings::sky)
         setGroundLight(frame);
     else
         setAmbientFromAround(frame);

@@ -67,13 +67,14 @@ CameraRays raysToBackground(const KM_Viewport& viewport, int width, int height) 
 }
 
 void setStyle(FrameSetup& frame, SurfaceStyle style, const RayScene& rays) {
-    frame.textures = style == SurfaceStyle::lit;
-    if (style == SurfaceStyle::lit || style == SurfaceStyle::studio) {
+    if (showsMaterials(style)) {
+        frame.textures = true;
         frame.has_see_through = rays.hasSeeThrough();
         frame.has_looks = rays.hasLooks();
+        frame.has_one_sided = rays.hasOneSided();
+        frame.has_mirrors = rays.hasMirrors();
+        frame.mirrors_scene = frame.has_mirrors && style == SurfaceStyle::lit;
     }
-    frame.has_mirrors = style == SurfaceStyle::lit && rays.hasMirrors();
-    frame.mirrors_scene = frame.has_mirrors;
     if (style == SurfaceStyle::translucent)
         frame.layers = {12, 0.36F, 0.85F, 0.55F};
     if (style == SurfaceStyle::x_ray)

@@ -1,5 +1,7 @@
 #include "engine/display/MaterialCache.h"
 
+#include "engine/scene/MaterialCheck.h"
+
 #include <algorithm>
 #include <cmath>
 
@@ -11,8 +13,8 @@ namespace {
 constexpr float LEAST_ATTENUATION = 1e-6F;
 /// Nothing is seen behind any way that a float can tell.
 constexpr float MOST_ABSORPTION = 1e30F;
-/// Far beyond what a picture can show, and far from the end of floats.
-constexpr float MOST_EMISSION = 1e6F;
+/// Of the distance after which light has its colour: through more of it next to nothing comes.
+constexpr float LONGEST_PATH = 1e6F;
 
 bool isWhole(const Texture& texture) {
     return texture.width > 0 && texture.height > 0 &&
@@ -56,19 +58,23 @@ void setMirrors(const Material& material, SurfaceLook& look) {
 }
 
 /// A body of glass has two surfaces: each takes half of what the inside does, as A. Beer's law
-/// says. The thickness is that of the material, or of its texture, however the body stands.
+/// says. The thickness is that of the material, or of its texture, however the body stands. The
+/// less it bends light the less its roughness blurs what is behind: by that of air not at all.
 void setGlass(const Material& material, SurfaceLook& look) {
     look.numbers.transmission = material.transmission;
-    const float path = 0.5F * material.thickness / material.attenuation_distance;
+    const float path =
+        std::min(0.5F * material.thickness / material.attenuation_distance, LONGEST_PATH);
     look.index = material.index_of_refraction;
     look.is_thin = material.thickness <= 0.0F;
     for (std::size_t c = 0; c < 3; ++c) {
         const float color = std::clamp(material.attenuation_color[c], LEAST_ATTENUATION, 1.0F);
-        look.absorption[c] =
-            look.is_thin ? 0.0F : std::min(-std::log(color) / material.attenuation_distance, MOST_ABSORPTION);
-        look.density[c] = path > 0.0F ? -path * std::log(color) : 0.0F;
+        if (!look.is_thin)
+            look.absorption[c] =
+                std::min(-std::log(color) / material.attenuation_distance, MOST_ABSORPTION);
+        look.density[c] = -path * std::log(color);
         look.numbers.passing[c] = material.transmission;
     }
+    look.numbers.bend = std::clamp(2.0F * (material.index_of_refraction - 1.0F), 0.0F, 1.0F);
 }
 
 } // namespace

@@ -2,6 +2,7 @@
 
 #include "engine/display/DisplayScene.h"
 #include "engine/display/FlushDenormals.h"
+#include "engine/display/FrontsAlone.h"
 
 #include <algorithm>
 #include <cmath>
@@ -60,6 +61,18 @@ RTCRayHit rayHit(const KM_3dVector& origin, const KM_3dVector& direction, double
     return ray;
 }
 
+void shoot(const RayScene& rays, bool passes_backs, RTCRayHit& ray) {
+    FrontsAlone fronts{{},
+                       rays.surfaces().data(),
+                       rays.hasInstances() ? rays.firstSurfaces().data() : nullptr,
+                       static_cast<std::uint32_t>(rays.soleFirstSurface())};
+    passBacks(fronts);
+    if (!passes_backs || !rays.hasOneSided())
+        fronts.context.filter = nullptr;
+    const FlushDenormals flushing;
+    rtcIntersect1(rays.root(), &fronts.context, &ray);
+}
+
 /// How far along the ray the plane of a triangle is; what the ray tracer found where that is no
 /// plane, or seen edge-on.
 double planeDistance(const DisplayScene& scene, const SurfaceHit& hit, unsigned triangle,
@@ -90,10 +103,7 @@ std::optional<SurfaceHit> firstSurface(const DisplayScene& scene, const PickRay&
         return std::nullopt;
     const KM_3dVector start = (ray.origin + reach.from * ray.direction) - scene.origin();
     RTCRayHit found = rayHit(start, ray.direction, reach.to - reach.from);
-    RTCIntersectContext context;
-    rtcInitIntersectContext(&context);
-    const FlushDenormals flushing;
-    rtcIntersect1(rays.root(), &context, &found);
+    shoot(rays, ray.passes_backs, found);
     if (found.hit.geomID == RTC_INVALID_GEOMETRY_ID)
         return std::nullopt;
     const std::size_t first =

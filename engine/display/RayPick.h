@@ -12,8 +12,9 @@ class DisplayScene;
 /// A ray through a place of a picture.
 struct PickRay {
     KM_3dPoint origin;
-    KM_3dVector direction;    ///< of unit length
-    bool is_parallel = false; ///< sees what lies behind its origin too
+    KM_3dVector direction;     ///< of unit length
+    bool is_parallel = false;  ///< sees what lies behind its origin too
+    bool passes_backs = false; ///< of one-sided surfaces, as in the modes that show materials
 };
 
 /// Where a ray meets a surface first.

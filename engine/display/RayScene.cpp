@@ -55,6 +55,10 @@ SurfacePlace placeOf(const KM_Xform& x) {
         for (int j = 0; j < 3; ++j)
             place.cofactors[i][j] = static_cast<float>(std::ldexp(cofactors[i][j], -exponent));
     place.area_scale = std::ldexp(1.0F, exponent);
+    double volume = 0.0;
+    for (int j = 0; j < 3; ++j)
+        volume += x.m_xform[0][j] * cofactors[0][j];
+    place.hand = volume < 0.0 ? -1.0F : 1.0F;
     return place;
 }
 
@@ -419,6 +423,7 @@ void RayScene::commit(BuildProgress* progress) {
     m_has_see_through = false;
     m_has_looks = false;
     m_has_mirrors = false;
+    m_has_one_sided = false;
     for (const Member& member : m_members) {
         if (!member.visible)
             continue;
@@ -426,6 +431,7 @@ void RayScene::commit(BuildProgress* progress) {
         m_has_see_through |= surface.see_through || surface.passing > 0.0F;
         m_has_looks |= surface.look != nullptr;
         m_has_mirrors |= surface.look && surface.look->mirrors;
+        m_has_one_sided |= surface.one_sided;
     }
     chooseRoot();
 }

@@ -64,6 +64,8 @@ public:
     bool hasLooks() const { return m_has_looks; }
     /// Whether some visible surface mirrors.
     bool hasMirrors() const { return m_has_mirrors; }
+    /// Whether the back of some visible surface is not seen.
+    bool hasOneSided() const { return m_has_one_sided; }
 
     /// How often a search structure, of a group or of all, was built.
     std::size_t buildCount() const { return m_build_count; }
@@ -153,6 +155,7 @@ private:
     bool m_has_see_through = false;
     bool m_has_looks = false;
     bool m_has_mirrors = false;
+    bool m_has_one_sided = false;
 };
 
 } // namespace quarn

@@ -28,7 +28,8 @@ struct RaySurface {
     float opacity = 1.0F;                 ///< of the base colour
     bool see_through = false;             ///< what lies behind shines through
     bool has_cutout = false;
-    float passing = 0.0F; ///< of a sun's light, where it is glass
+    bool one_sided = false; ///< its back is not seen, but casts shadows
+    float passing = 0.0F;   ///< of a sun's light, where it is glass
     float alpha_cutoff = 0.5F;
 
     friend bool operator==(const RaySurface&, const RaySurface&) = default;

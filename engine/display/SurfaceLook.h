@@ -25,6 +25,7 @@ template <class Number> struct LookNumbers {
     Number
         transmission;  ///< the part of what is not mirrored that goes through, where it is no metal
     Number passing[3]; ///< and what is left of it behind the surface
+    Number bend;       ///< 0 to 1: how much of the roughness blurs what is seen through it
     Number clearcoat;
     Number clearcoat_roughness;
 
@@ -32,7 +33,8 @@ template <class Number> struct LookNumbers {
 };
 
 /// Matt: it mirrors nothing.
-inline constexpr LookNumbers<float> matt_look{1, {0, 0, 0}, 0, 1, {0, 0, 0}, 0, 0, {0, 0, 0}, 0, 0};
+inline constexpr LookNumbers<float> matt_look{1, {0, 0, 0}, 0, 1, {0, 0, 0}, 0,
+                                              0, {0, 0, 0}, 0, 0, 0};
 
 /// What a surface looks like beyond its base colour, as the ray loops use it; see Material.
 struct SurfaceLook {

@@ -7,6 +7,7 @@ struct SurfacePlace {
     float linear[3][3];    ///< turns and stretches vectors of the mesh
     float cofactors[3][3]; ///< turns normals; the largest is about 1, so that squares are floats
     float area_scale;      ///< times this they stretch areas too
+    float hand; ///< 1; -1 where it mirrors: then fronts of triangles are what else were their backs
 };
 
 /// The matrix times the vector.

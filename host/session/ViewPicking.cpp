@@ -37,8 +37,11 @@ struct Candidate {
     auto rank() const { return std::tuple(is_curve, hit.distance_px, hit.depth); }
 };
 
-std::optional<PickRay> rayAt(const KM_Viewport& camera, double x_px, double y_px) {
+std::optional<PickRay> rayAt(const ViewState& view, double x_px, double y_px) {
     PickRay ray;
+    const KM_Viewport camera = view.frameCamera();
+    const CDisplayPipelineAttributes* const mode = view.displayMode();
+    ray.passes_backs = mode && showsMaterials(drawingAttributes(*mode).surface_style);
     ray.is_parallel = camera.IsParallelProjection();
     if (!camera.GetRay(x_px, y_px, ray.origin, ray.direction))
         return std::nullopt;
@@ -166,7 +169,7 @@ std::optional<PickedObject> objectAt(CQuarnView& view, double x_px, double y_px)
     const ViewState& state = ViewState::of(view);
     if (!state.isOpen())
         return std::nullopt;
-    const auto ray = rayAt(state.frameCamera(), x_px, y_px);
+    const auto ray = rayAt(state, x_px, y_px);
     if (!ray)
         return std::nullopt;
     const auto scene = state.document().drawing().scene();
@@ -182,14 +185,14 @@ std::optional<KM_3dPoint> pointAt(CQuarnView& view, double x_px, double y_px) {
     const ViewState& state = ViewState::of(view);
     if (!state.isOpen())
         return std::nullopt;
-    const KM_Viewport camera = state.frameCamera();
-    const auto ray = rayAt(camera, x_px, y_px);
+    const auto ray = rayAt(state, x_px, y_px);
     if (!ray)
         return std::nullopt;
     if (const auto scene = state.document().drawing().scene();
         scene && seesScene(state, *scene.value()))
         if (const auto surface = firstSurface(scene.value()->display(), *ray))
             return surface->point;
+    const KM_Viewport camera = state.frameCamera();
     if (!ray->is_parallel || !looksAlongAxis(camera))
         return onPlane(*ray, KM_3dPoint::Origin, KM_3dVector::ZAxis);
     const bool has_target = camera.TargetPoint().IsValid();

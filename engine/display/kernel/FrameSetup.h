@@ -128,6 +128,7 @@ struct FrameSetup {
     float plain_albedo[3] = {1, 1, 1};
     FrameLayers layers;
     bool has_see_through = false; ///< surfaces of see-through materials are drawn so
+    bool has_one_sided = false;   ///< the backs of some surfaces are not seen
     bool has_looks = false;       ///< some surfaces look like more than their base colours
     bool has_mirrors = false;     ///< some of these mirror
     bool mirrors_scene = false;   ///< smooth ones show the scene itself, not only what lies around
@@ -176,6 +177,7 @@ struct FrameSetup {
     const float* split_sum = nullptr; ///< SplitSum::entries()
 
     float sky_reach = 0.0F; ///< how far surfaces hide the sky from others; 0: not at all
+    bool hides_sky_of_ground_alone = false; ///< surfaces do not darken each other
     const SkyTable* sky_table = nullptr;
     int sky_width = 0;              ///< places of the grid in a row
     int sky_height = 0;             ///< rows of the grid

@@ -48,14 +48,6 @@ struct Tangents {
     Vector v;
 };
 
-/// By how much a transform that mirrors turns the front of a triangle about: 1 or -1.
-float handOf(const SurfacePlace& place) {
-    const auto row = [&](int i) {
-        return Vector{place.linear[i][0], place.linear[i][1], place.linear[i][2]};
-    };
-    return dot(cross(row(0), row(1)), row(2)) < 0.0F ? -1.0F : 1.0F;
-}
-
 /// @return false where the texture is a line or a point on the triangle
 bool findTangents(const RaySurface& surface, const LookTexture& texture, std::size_t triangle,
                   Tangents& tangents) {
@@ -103,7 +95,7 @@ void bendNormal(const RaySurface& surface, const RTCRayHit16& rays, int lane,
     float front = 1.0F;
     if (surface.place) {
         turn(surface.place->cofactors, {face[0], face[1], face[2]}, face);
-        front = handOf(*surface.place);
+        front = surface.place->hand;
     }
     const Vector direction{rays.ray.dir_x[lane], rays.ray.dir_y[lane], rays.ray.dir_z[lane]};
     if (dot({face[0], face[1], face[2]}, direction) > 0.0F)

@@ -65,15 +65,16 @@ constexpr float roughness_of_clear_glass = 0.2F;
 constexpr float roughness_of_frosted_glass = 0.5F;
 
 /// What comes through the surfaces from behind.
-/// @param passing  the part of it that passes; takes what is left for the one who looks behind
-inline LaneColors frostedLight(const FrameSetup& frame, const MirrorLanes& mirrors,
-                               bool is_looked_through, LaneColors& passing) {
+/// @param roughness  by which they blur it
+/// @param passing    the part of it that passes; takes what is left for the one who looks behind
+inline LaneColors frostedLight(const FrameSetup& frame, const LaneVectors& observer,
+                               const Lanes& roughness, bool is_looked_through,
+                               LaneColors& passing) {
     constexpr float fade = 1.0F / (roughness_of_frosted_glass - roughness_of_clear_glass);
-    const Lanes clear =
-        is_looked_through ? clamped((Lanes(roughness_of_frosted_glass) - mirrors.roughness) * fade)
-                          : Lanes(0.0F);
-    const LaneColors behind =
-        mirroredSurroundings(frame, mirrors.observer * Lanes(-1.0F), mirrors.roughness);
+    const Lanes clear = is_looked_through
+                            ? clamped((Lanes(roughness_of_frosted_glass) - roughness) * fade)
+                            : Lanes(0.0F);
+    const LaneColors behind = mirroredSurroundings(frame, observer * Lanes(-1.0F), roughness);
     const LaneColors frosted = passing * (Lanes(1.0F) - clear) * behind;
     passing = passing * clear;
     return frosted;
@@ -101,7 +102,8 @@ inline LaneColors shadeMirrors(const FrameSetup& frame, const RayPacket& packet,
     LaneColors passing{0.0F, 0.0F, 0.0F};
     if (any(look.transmission > 0.0F)) {
         passing = entering * LaneColors{look.passing[0], look.passing[1], look.passing[2]};
-        sent = sent + frostedLight(frame, base, through != nullptr, passing);
+        sent = sent + frostedLight(frame, base.observer, base.roughness * look.bend,
+                                   through != nullptr, passing);
     }
     if (layers.has_coat) {
         const LaneColors mirrored = layers.coat.first * look.clearcoat;

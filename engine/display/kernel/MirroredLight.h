@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/display/kernel/Microfacets.h"
+#include "engine/display/kernel/OneSided.h"
 #include "engine/display/kernel/PaneOpacity.h"
 
 namespace quarn {
@@ -31,7 +32,7 @@ inline void aimMirrors(const FrameSetup& frame, const RayPacket& packet,
     setOrigin(rays.rays.ray, along(place, surfaces.face, shadowOffset(frame, t, place)));
     setDirection(rays.rays.ray, direction);
     rays.active = wanted;
-    intersect(frame, rays, RTC_INTERSECT_CONTEXT_FLAG_INCOHERENT);
+    intersectFronts(frame, rays, RTC_INTERSECT_CONTEXT_FLAG_INCOHERENT);
 }
 
 /// What rays from mirrors see, where `around` lies behind the scene. They see the first pane alone.

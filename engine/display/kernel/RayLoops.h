@@ -3,6 +3,7 @@
 #include "engine/display/DisplayTable.h"
 #include "engine/display/kernel/EnvironmentLoops.h"
 #include "engine/display/kernel/LayeredShading.h"
+#include "engine/display/kernel/OneSided.h"
 #include "engine/display/kernel/PixelSteps.h"
 #include "engine/display/kernel/SeeThroughShading.h"
 #include "engine/display/kernel/SkyLoops.h"
@@ -90,7 +91,7 @@ inline TracedPacket trace(const FrameSetup& frame, RayPacket& packet) {
     aim(frame, packet);
     if (frame.layers.count > 1)
         return traceLayers(frame, packet);
-    intersect(frame, packet);
+    intersectFronts(frame, packet);
     SurfaceLanes surfaces;
     TracedPacket traced = firstMet(frame, packet, surfaces);
     if (frame.has_clear_background)

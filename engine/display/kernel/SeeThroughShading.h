@@ -1,5 +1,6 @@
 #pragma once
 
+#include "engine/display/kernel/OneSided.h"
 #include "engine/display/kernel/OpaqueShading.h"
 #include "engine/display/kernel/PaneOpacity.h"
 
@@ -17,7 +18,7 @@ inline void goOn(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfa
     // Faces that lie on each other count as one everywhere, not now one and now two.
     const Lanes beyond = packet.distance * 1.00002F + 1e-5F * frame.scene_size;
     store(packet.rays.ray.tnear, select(packet.active, beyond, 0.0F));
-    intersect(frame, packet);
+    intersectFronts(frame, packet);
     readSurfaces(frame, packet, surfaces);
 }
 

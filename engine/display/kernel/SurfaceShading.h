@@ -40,7 +40,7 @@ inline void addLight(const float (&color)[3], const Lanes& amount, LaneColors& l
 inline LaneColors skyLight(const FrameSetup& frame, const RayPacket& packet,
                            const SurfaceLanes& surfaces, const LaneMask& lit) {
     const LaneColors light = ambientLight(frame, surfaces.normal);
-    if (!frame.free_sky)
+    if (!frame.free_sky || frame.hides_sky_of_ground_alone)
         return light;
     const Lanes arriving = skyArriving(frame, packet, surfaces, lit);
     return {light.r * arriving, light.g * arriving, light.b * arriving};

@@ -108,8 +108,13 @@ TEST(SeeThrough, ClayIsOpaque) {
 TEST(SeeThrough, TheBackgroundShowsThroughAPane) {
     SceneContent nothing = only(0.0F, wall_color);
     nothing.meshes[0].visible = false;
-    const Image background = seen(nothing, L"Shaded");
-    const Image pane = seen(only(0.0F, opaque(red_pane)), L"Shaded");
+    DisplayModeAttributes mode = modeNamed(L"Shaded");
+    mode.has_ground_plane = false;
+    const auto picture = [&](const SceneContent& content) {
+        return drawn(content, topView(5.0), mode, 100, 100);
+    };
+    const Image background = picture(nothing);
+    const Image pane = picture(only(0.0F, opaque(red_pane)));
     SceneContent content;
     addPane(content, floorMesh(-4.0F, -4.0F, 4.0F, 4.0F, 0.0F), red_pane);
     std::array<double, 3> blend{};
@@ -117,7 +122,7 @@ TEST(SeeThrough, TheBackgroundShowsThroughAPane) {
         blend[static_cast<std::size_t>(c)] =
             share(red_pane) * lightAt(pane, 50, 50, c) +
             (1.0 - share(red_pane)) * lightAt(background, 50, 50, c);
-    expectLight(seen(content, L"Shaded"), 50, 50, blend);
+    expectLight(picture(content), 50, 50, blend);
 }
 
 /// Panes to the east of a floor, whose shadows a slanting sun throws on it, in rows of their own.
@@ -197,7 +202,7 @@ TEST(SeeThrough, BordersOfThingsBehindAPaneAreSmooth) {
     for (int y = 20; y < 80; ++y) {
         const double dark = brightness(image, 45, y);
         const double light = brightness(image, 97, y);
-        ASSERT_GT(light, dark + 60.0);
+        ASSERT_GT(light, dark + 40.0);
         for (int x = 46; x < 97; ++x)
             between += brightness(image, x, y) > dark + 8.0 && brightness(image, x, y) < light - 8.0
                            ? 1
