@@ -6,6 +6,9 @@
 namespace quarn {
 namespace {
 
+/// What a clear coat mirrors seen straight on: it is of index 1.5.
+constexpr float coat_f0 = 0.04F;
+
 /// Surfaces that mirror: rough ones are of many small mirrors. See SplitSum for the sources.
 struct MirrorLanes {
     LaneColors f0; ///< what is mirrored seen straight on; 0: the lane mirrors nothing

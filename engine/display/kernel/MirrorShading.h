@@ -6,9 +6,6 @@
 namespace quarn {
 namespace {
 
-/// What a clear coat mirrors seen straight on: it is of index 1.5.
-constexpr float coat_f0 = 0.04F;
-
 /// The mirrors of a surface and of the clear coat over it.
 struct MirrorLayers {
     MirrorLanes base;

@@ -96,7 +96,10 @@ inline void addEnvironment(const MetLanes& met, const LanePlaces& place, SentLig
                                               toward, unlimited, 1.0F, facing);
     const SentLanes sent = sentFrom(met.setup, met.lobes, met.looks, toward);
     const Lanes weight = weightBeside(density, sent.density) / greatest(density, 1e-20F);
-    light.add(sent, arriving * environmentLight(met.setup, toward) * select(facing, weight, 0.0F));
+    const LaneColors around =
+        arriving * lightAround(met.setup.bounce, toward) * select(facing, weight, 0.0F);
+    light.matt = light.matt + sent.matt * around * scatteredPart(met.setup);
+    light.gloss = light.gloss + sent.gloss * around;
 }
 
 /// The light of surfaces that shine, from one place on one of them.

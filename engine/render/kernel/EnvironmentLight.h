@@ -11,11 +11,9 @@ namespace {
 // where it is bright (M. Pharr, W. Jakob and G. Humphreys, "Physically Based Rendering", third
 // edition, 2016, 14.2.4), by cells of an octahedron folded open.
 
-/// What surfaces get of it.
-inline LaneColors environmentLight(const RenderSetup& setup, const LaneVectors& direction) {
-    const LaneColors light = lightAround(setup.bounce, direction);
-    return {light.r * setup.sky_scale[0], light.g * setup.sky_scale[1],
-            light.b * setup.sky_scale[2]};
+/// What matt surfaces get of it beside what mirrors show.
+inline LaneColors scatteredPart(const RenderSetup& setup) {
+    return uniformColor(setup.sky_scale);
 }
 
 /// A place on the octahedron whose coordinates run from -1 to 1, and the inverse of how much a

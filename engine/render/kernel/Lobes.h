@@ -41,12 +41,16 @@ struct LobeLanes {
     bool has_mirrors;
     FacetLanes base;
     Lanes roughness;
+    LaneColors f0_of_matt; ///< what mirrors over what is matt: none of the metal's
+    Lanes f90_of_matt;
+    LaneColors further_of_matt;
     LaneColors let_in;  ///< to what is matt, from the observer's side, beside the mean
     LaneColors further; ///< what comes off in the end of light that went from mirror to mirror
     Lanes lost;         ///< of the observer's side by single mirrors, beside the mean
     bool has_coat;
     Lanes coat; ///< how much of the surface is under one
     FacetLanes over;
+    Lanes even; ///< the brightness of what goes from mirror to mirror, seen by the observer
     Lanes mirror_chance; ///< that a ray goes by the mirrors
     Lanes coat_chance;
 };
@@ -79,10 +83,10 @@ inline LaneColors mirroredPart(const FacetLanes& facets, const Lanes& cosine) {
             facets.f0.b + t * (facets.f90 - facets.f0.b)};
 }
 
-inline LaneColors ofSplitSum(const FacetLanes& facets, const Lanes& a, const Lanes& b) {
-    const Lanes along_face = facets.f90 * b;
-    return {facets.f0.r * a + along_face, facets.f0.g * a + along_face,
-            facets.f0.b * a + along_face};
+inline LaneColors ofSplitSum(const LaneColors& f0, const Lanes& f90, const Lanes& a,
+                             const Lanes& b) {
+    const Lanes along_face = f90 * b;
+    return {f0.r * a + along_face, f0.g * a + along_face, f0.b * a + along_face};
 }
 
 /// The mean of a split sum over all directions, by their cosine.
@@ -101,13 +105,13 @@ inline void readSplitMeans(const RenderSetup& setup, const Lanes& roughness, Lan
 }
 
 /// Of light that went from mirror to mirror, what comes off in the end.
-inline LaneColors furtherPart(const FacetLanes& facets, const Lanes& single_mean) {
+inline LaneColors furtherPart(const LaneColors& f0, const Lanes& f90, const Lanes& single_mean) {
     const Lanes lost = Lanes(1.0F) - single_mean;
-    const auto channel = [&](const Lanes& f0) {
-        const Lanes mean = f0 + (facets.f90 - f0) * (1.0F / 21.0F);
+    const auto channel = [&](const Lanes& straight) {
+        const Lanes mean = straight + (f90 - straight) * (1.0F / 21.0F);
         return mean * mean * single_mean / (Lanes(1.0F) - mean * lost);
     };
-    return {channel(facets.f0.r), channel(facets.f0.g), channel(facets.f0.b)};
+    return {channel(f0.r), channel(f0.g), channel(f0.b)};
 }
 
 inline void startFacets(const LobeLanes& lobes, const LaneVectors& normal, const Lanes& roughness,
@@ -125,7 +129,9 @@ inline void startMirrors(const RenderSetup& setup, const SurfaceLanes& surfaces,
     lobes.matt = lobes.matt * (Lanes(1.0F) - look.metalness);
     FacetLanes& base = lobes.base;
     lobes.roughness = look.roughness;
-    base.f0 = blended({look.f0[0], look.f0[1], look.f0[2]}, surfaces.albedo, look.metalness);
+    lobes.f0_of_matt = {look.f0[0], look.f0[1], look.f0[2]};
+    lobes.f90_of_matt = look.f90;
+    base.f0 = blended(lobes.f0_of_matt, surfaces.albedo, look.metalness);
     base.f90 = look.f90 + look.metalness * (Lanes(1.0F) - look.f90);
     startFacets(lobes, surfaces.normal, look.roughness, base);
     Lanes a;
@@ -136,15 +142,21 @@ inline void startMirrors(const RenderSetup& setup, const SurfaceLanes& surfaces,
     readSplitMeans(setup, look.roughness, mean_a, mean_b);
     const Lanes lost = Lanes(1.0F) - a - b;
     const Lanes lost_mean = Lanes(1.0F) - mean_a - mean_b;
-    lobes.further = furtherPart(base, mean_a + mean_b);
+    lobes.further_of_matt = furtherPart(lobes.f0_of_matt, lobes.f90_of_matt, mean_a + mean_b);
+    lobes.further = blended(lobes.further_of_matt,
+                            furtherPart(surfaces.albedo, 1.0F, mean_a + mean_b), look.metalness);
     lobes.lost = lost / greatest(lost_mean, 1e-6F);
-    base.sent = ofSplitSum(base, a, b) + lobes.further * lost;
-    const LaneColors mean = ofSplitSum(base, mean_a, mean_b) + lobes.further * lost_mean;
-    const auto channel = [&](const Lanes& sent, const Lanes& sent_mean) {
-        return (Lanes(1.0F) - sent) / greatest(Lanes(1.0F) - sent_mean, 1e-4F);
+    const LaneColors further = lobes.further * lost;
+    base.sent = ofSplitSum(base.f0, base.f90, a, b) + further;
+    lobes.even = luminance(further);
+    const LaneColors mean = ofSplitSum(lobes.f0_of_matt, lobes.f90_of_matt, mean_a, mean_b) +
+                            lobes.further_of_matt * lost_mean;
+    const LaneColors sent =
+        ofSplitSum(lobes.f0_of_matt, lobes.f90_of_matt, a, b) + lobes.further_of_matt * lost;
+    const auto channel = [&](const Lanes& part, const Lanes& part_mean) {
+        return (Lanes(1.0F) - part) / greatest(Lanes(1.0F) - part_mean, 1e-4F);
     };
-    lobes.let_in = {channel(base.sent.r, mean.r), channel(base.sent.g, mean.g),
-                    channel(base.sent.b, mean.b)};
+    lobes.let_in = {channel(sent.r, mean.r), channel(sent.g, mean.g), channel(sent.b, mean.b)};
 }
 
 inline void startCoat(const RenderSetup& setup, const LookLanes& looks, LobeLanes& lobes) {
@@ -161,18 +173,18 @@ inline void startCoat(const RenderSetup& setup, const LookLanes& looks, LobeLane
     Lanes a;
     Lanes b;
     readSplitSum(setup.frame, over.facing, look.clearcoat_roughness, a, b);
-    over.sent = ofSplitSum(over, a, b);
+    over.sent = ofSplitSum(over.f0, over.f90, a, b);
     lobes.coat_chance = lobes.coat * greatest(over.sent.r, 0.25F);
 }
 
 /// Rays go by what is sent each way of even light, but to matt surfaces and mirrors at least now
 /// and then: what they show may be far brighter than the rest.
 inline Lanes chanceOfMirrors(const LobeLanes& lobes) {
-    const Lanes mirrored = luminance(lobes.base.sent);
+    const Lanes mirrored = greatest(luminance(lobes.base.sent) - lobes.even, 0.0F);
     const Lanes scattered = luminance(lobes.matt * complement(lobes.base.sent));
-    const Lanes share = mirrored / greatest(mirrored + scattered, 1e-6F);
-    const LaneMask is_matt = scattered > 1e-4F;
-    const Lanes chance = select(is_matt, least(greatest(share, 0.2F), 0.9F), Lanes(1.0F));
+    const Lanes share = mirrored / greatest(mirrored + scattered + lobes.even, 1e-6F);
+    const LaneMask is_matt = scattered > 0.01F;
+    const Lanes chance = select(is_matt, least(greatest(share, 0.2F), 0.9F), share);
     return select(lobes.mirrors & (mirrored > 0.0F), chance, 0.0F);
 }
 
@@ -255,7 +267,8 @@ inline void addMirrored(const RenderSetup& setup, const LobeLanes& lobes, const 
     const Lanes lost = Lanes(1.0F) - a - b;
     const LaneColors part = lobes.further * lost;
     const Lanes even = facing * (1.0F / pi);
-    const LaneColors entering = complement(ofSplitSum(lobes.base, a, b) + part);
+    const LaneColors entering = complement(ofSplitSum(lobes.f0_of_matt, lobes.f90_of_matt, a, b) +
+                                           lobes.further_of_matt * lost);
     sent.matt = sent.matt * select(lobes.mirrors, lobes.let_in * entering, {1.0F, 1.0F, 1.0F});
     Lanes density;
     const LaneColors mirrored = facetsSend(lobes.base, lobes.observer, toward, facing,

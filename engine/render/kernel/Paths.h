@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/display/kernel/LookShading.h"
+#include "engine/display/kernel/SeeThroughShading.h"
 #include "engine/display/kernel/ShadowCatcher.h"
 #include "engine/render/kernel/Glass.h"
 #include "engine/render/kernel/TileSums.h"
@@ -12,7 +13,7 @@ namespace {
 // 1986). A pane that is partly see-through is passed or met by chance.
 
 /// A path comes to so many surfaces at most, panes that it passes among them.
-constexpr int most_surfaces = 24;
+constexpr int most_surfaces = 40;
 /// And is sent on by so many that are not clear glass.
 constexpr int most_bounces = 7;
 /// From here on it may end by chance, the sooner the less light it brings.
@@ -32,6 +33,7 @@ struct PathLanes {
     LaneMask going;
     LaneColors weight{1.0F, 1.0F, 1.0F};     ///< of what is found from here on
     LaneColors matt_share{0.0F, 0.0F, 0.0F}; ///< of it, what the first surface scattered
+    LaneColors around{1.0F, 1.0F, 1.0F};     ///< see scatteredPart; by what the last surface did
     LaneMask first;                          ///< the lane has met nothing but panes that it passed
     LaneMask clear;       ///< nor anything but glass that mirrors or lets through
     LaneMask unturned;    ///< nor did any of it mirror
@@ -59,14 +61,13 @@ inline void addBackground(const RenderSetup& setup, const RayPacket& packet, con
         light = backgroundColors(setup.frame, packet);
     if (any(missed & ~path.unturned)) {
         const LaneVectors direction = ofUnitLength(packet.direction());
-        const LaneColors mirrored = lightAround(setup.bounce, direction);
-        LaneColors around = environmentLight(setup, direction);
+        LaneColors around = lightAround(setup.bounce, direction) * path.around;
         if (setup.environment.rows) {
             const LaneMask weighed = path.density > 0.0F;
             const Lanes weight = weightBeside(path.density, environmentDensity(setup, direction));
             around = around * select(weighed, weight, 1.0F);
         }
-        light = select(path.unturned, light, select(path.clear, mirrored, around));
+        light = select(path.unturned, light, around);
     }
     addFound(path, missed, light * (Lanes(1.0F) - ground), found);
 }
@@ -182,14 +183,12 @@ inline void addLights(const MetLanes& met, const PathLanes& path, const LanePlac
         addFound(path, later, sun.matt + sun.gloss + around.matt + around.gloss, found);
 }
 
-/// The light that follows the camera, on what is seen.
+/// The light that follows the camera, on what is seen, in mirrors and through glass too.
 inline void addFixed(const MetLanes& met, const LaneMask& seen, const PathLanes& path,
                      PathLight& found) {
-    const FrameSetup& frame = met.setup.frame;
     LaneColors light{0.0F, 0.0F, 0.0F};
-    addFixedLights(frame, met.surfaces.normal, light);
-    found.direct = found.direct +
-                   select(seen, path.weight * met.lobes.matt * light, LaneColors{0.0F, 0.0F, 0.0F});
+    addFixedLights(met.setup.frame, met.surfaces.normal, light);
+    addFound(path, seen, met.lobes.matt * light, found);
 }
 
 /// Sends the paths of `met.lit` on.
@@ -204,6 +203,9 @@ inline void scatter(const MetLanes& met, const LanePlaces& place, const Lanes& c
     const LaneColors matt_share{share(next.matt.r, all.r), share(next.matt.g, all.g),
                                 share(next.matt.b, all.b)};
     path.matt_share = select(lanes & path.first, matt_share, path.matt_share);
+    const LaneColors none{0.0F, 0.0F, 0.0F};
+    const LaneColors gloss_share = select(lanes, complement(matt_share), none);
+    path.around = select(lanes, gloss_share + matt_share * scatteredPart(met.setup), path.around);
     path.weight = select(lanes, path.weight * all, path.weight);
     path.density = select(lanes, next.density, path.density);
     const LaneMask turned = lanes & ~(next.density > 0.0F);
@@ -229,6 +231,7 @@ inline void goThroughGlass(const MetLanes& met, const GlassLanes& glass, const L
         met.surfaces.albedo * select(glass.thin, of_sheet, LaneColors{1.0F, 1.0F, 1.0F});
     path.weight = select(through, path.weight * tint, path.weight);
     path.density = select(met.glass, Lanes(0.0F), path.density);
+    path.around = select(met.glass, LaneColors{1.0F, 1.0F, 1.0F}, path.around);
     path.unturned = path.unturned & ~(met.glass & ray.mirrored);
     path.first = path.first & ~met.glass;
     const LaneVectors behind = along(met.start.place, met.start.off, -1.0F);
@@ -278,7 +281,7 @@ public:
     }
 
 private:
-    LanePlaces places(SampleUse use, int step) const { return placesAt(m_sample, use, step); }
+    LanePlaces places(SampleUse use) const { return placesAt(m_sample, use, m_surface); }
 
     /// Ends the paths that met nothing; others may meet the ground.
     /// @return how much of it they see
@@ -344,9 +347,11 @@ private:
         const bool has_looks = frame.has_looks && readLooks(frame, m_packet, surfaces, looks);
         MetLanes met{m_setup, m_packet, surfaces, has_looks ? &looks : nullptr, {}, {}, {}, {}};
         startLobes(m_setup, m_packet, surfaces, met.looks, met.lobes);
-        const LanePlaces chance = places(SampleUse::choice, step);
-        Lanes choice = chance.u;
-        const LaneMask passes = passSome(met, choice);
+        const LanePlaces chance = places(SampleUse::choice);
+        Lanes choice = select(m_passed, m_choice, chance.u);
+        m_passed = step < most_panes ? passSome(met, choice) : noLanes();
+        m_choice = choice;
+        const LaneMask passes = m_passed;
         const LaneMask stays = m_path.going & ~passes;
         if (any(stays & m_path.first))
             takeSeen(met, stays & m_path.first, ground);
@@ -357,8 +362,10 @@ private:
         met.glass = noLanes();
         LaneVectors origin = m_packet.origin();
         LaneVectors direction = m_packet.direction();
-        if (any(met.lit))
-            sendOn(met, step, chance.v, choice, origin, direction);
+        if (any(met.lit)) {
+            sendOn(met, chance.v, choice, origin, direction);
+            ++m_surface;
+        }
         m_path.going = m_path.going | passes;
         endSome(chance.v, m_path);
         const Lanes beyond = m_packet.distance * 1.00002F + 1e-5F * frame.scene_size;
@@ -376,16 +383,16 @@ private:
         return passes;
     }
 
-    void sendOn(MetLanes& met, int step, const Lanes& chance, Lanes& choice, LaneVectors& origin,
+    void sendOn(MetLanes& met, const Lanes& chance, Lanes& choice, LaneVectors& origin,
                 LaneVectors& direction) {
         met.start = startLanes(m_setup.frame, m_packet, met.surfaces, met.lit);
         GlassLanes glass = noGlass();
         if (met.lobes.has_mirrors && any(met.looks->numbers.transmission > 0.0F))
             startGlass(met, glass, choice);
-        if (m_setup.frame.fixed_count > 0 && any(met.lit & m_path.first))
-            addFixed(met, met.lit & m_path.first, m_path, m_found);
-        addLights(met, m_path, places(SampleUse::light, step), chance, m_found);
-        const LanePlaces place = places(SampleUse::direction, step);
+        if (m_setup.frame.fixed_count > 0 && any(met.lit & m_path.clear))
+            addFixed(met, met.lit & m_path.clear, m_path, m_found);
+        addLights(met, m_path, places(SampleUse::light), chance, m_found);
+        const LanePlaces place = places(SampleUse::direction);
         scatter(met, place, choice, m_path, origin, direction);
         if (any(met.glass))
             goThroughGlass(met, glass, place, choice, m_path, origin, direction);
@@ -411,6 +418,9 @@ private:
     TileSums& m_sums;
     PathLanes m_path;
     PathLight m_found;
+    int m_surface = 0;             ///< how many of those that send light on the paths have come to
+    LaneMask m_passed = noLanes(); ///< the lanes that passed the last surface,
+    Lanes m_choice = 0.0F;         ///< and what is left of their choices
 };
 
 } // namespace

@@ -38,7 +38,9 @@ RenderLayers underTheSun(const SceneContent& content, const KM_Viewport& viewpor
     EXPECT_TRUE(scene.update(content).ok());
     const SampleSequence sequence(16);
     const RenderKernel& kernel = renderKernelInForce();
-    const RenderSetup setup = makeRenderSetup(scene, viewport, size_px, size_px, sequence, kernel);
+    RenderTables tables;
+    const RenderSetup setup =
+        makeRenderSetup(scene, viewport, size_px, size_px, sequence, kernel, tables);
     RenderLayers layers(size_px, size_px);
     kernel.render_block(setup, {0, 0, size_px, size_px}, 0, 16, layers.sums());
     return layers;
@@ -56,8 +58,8 @@ SceneContent floorUnderGlass(float height) {
 }
 
 TEST(RenderedPanes, SkyLightComesThroughInTheColorOfTheGlass) {
-    constexpr int samples = 64;
-    const RenderLayers layers = underUniformSky(floorUnderGlass(0.01F), topView(10.0), 8, samples);
+    constexpr int samples = 1024;
+    const RenderLayers layers = inEvenLight(floorUnderGlass(0.01F), topView(10.0), 8, samples);
     const double a = shareOf(red_glass);
     const auto glass = linear(red_glass);
     const auto wall = linear(wall_color);
@@ -66,9 +68,9 @@ TEST(RenderedPanes, SkyLightComesThroughInTheColorOfTheGlass) {
         // The pane has all the sky above it; the floor what comes through, of which the eye sees
         // what is not covered by the pane.
         const double wanted = a * glass[c] + (1.0 - a) * wall[c] * passed[c];
-        EXPECT_NEAR(at(layers, RenderPlane::sky_r, c, 4, 4) / samples, wanted, 2e-3 * wanted);
+        EXPECT_NEAR(at(layers, RenderPlane::sky_r, c, 4, 4) / samples, wanted, 0.03);
         EXPECT_NEAR(at(layers, RenderPlane::albedo_r, c, 4, 4) / samples,
-                    a * glass[c] + (1.0 - a) * wall[c], 1e-4);
+                    a * glass[c] + (1.0 - a) * wall[c], 2e-3);
     }
     EXPECT_NEAR(layers.at(RenderPlane::cover, 4, 4) / samples, 1.0F, 1e-5F);
 }
@@ -112,10 +114,10 @@ TEST(RenderedPanes, ShadowsTakeTheSharedGeometrysOwnColors) {
 TEST(RenderedPanes, BothSidesOfAGlassBoxCover) {
     SceneContent content;
     addPane(content, boxMesh({-4.0, -4.0, 0.0}, {4.0, 4.0, 2.0}), red_glass);
-    constexpr int samples = 8;
-    const RenderLayers layers = underUniformSky(content, topView(8.0), 16, samples);
+    constexpr int samples = 256;
+    const RenderLayers layers = inEvenLight(content, topView(8.0), 16, samples);
     const double clear = 1.0 - shareOf(red_glass);
-    EXPECT_NEAR(layers.at(RenderPlane::cover, 8, 8) / samples, 1.0 - clear * clear, 1e-5);
+    EXPECT_NEAR(layers.at(RenderPlane::cover, 8, 8) / samples, 1.0 - clear * clear, 0.01);
     EXPECT_EQ(layers.at(RenderPlane::cover, 1, 1), 0.0F) << "beside it there is only the sky";
 }
 
@@ -136,7 +138,7 @@ KM_Mesh sheetWithTexture() {
 
 TEST(RenderedPanes, ClearGlassAndCutoutsLeaveNoTrace) {
     const KM_Viewport view = perspectiveView({25.0, -30.0, 30.0}, {0.0, 0.0, 2.0});
-    const Image open = rendered(courtyard(), view, {60, 40, 16});
+    const Image open = rendered(courtyard(), view, {60, 40, 256});
     SceneContent glazed = courtyard();
     addPane(glazed, sheetWithTexture(), {255, 255, 255, 0});
     SceneContent with_holes = courtyard();
@@ -149,11 +151,11 @@ TEST(RenderedPanes, ClearGlassAndCutoutsLeaveNoTrace) {
     holes->alpha_cutout = true;
     with_holes.meshes[sheet].placed.material = holes;
     for (const SceneContent& content : {glazed, with_holes}) {
-        const Image image = rendered(content, view, {60, 40, 16});
+        const Image image = rendered(content, view, {60, 40, 256});
         int most = 0;
         for (std::size_t i = 0; i < image.rgba.size(); ++i)
             most = std::max(most, std::abs(int{image.rgba[i]} - int{open.rgba[i]}));
-        EXPECT_LE(most, 2) << "rays start anew behind the sheet, a little rounded";
+        EXPECT_LE(most, 6) << "the sheet changes nothing but the order of chances";
     }
 }
 

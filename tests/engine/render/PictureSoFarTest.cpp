@@ -56,7 +56,9 @@ TEST(PictureSoFar, KnowsHowManySamplesEachPixelHas) {
     ASSERT_TRUE(scene.update(hall()).ok());
     const SampleSequence sequence(40);
     const RenderKernel& kernel = renderKernelInForce();
-    const RenderSetup setup = makeRenderSetup(scene, topView(10.0), 700, 130, sequence, kernel);
+    RenderTables tables;
+    const RenderSetup setup =
+        makeRenderSetup(scene, topView(10.0), 700, 130, sequence, kernel, tables);
     RenderLayers layers(700, 130);
     SampleTaking taking(setup, kernel, layers, 40);
     bool was_between = false;

@@ -8,7 +8,7 @@ namespace {
 TEST(SkyLight, FreeSurfaceUnderAUniformSkyHasTheSkysBrightness) {
     SceneContent content;
     addMesh(content, floorMesh(-30.0F, -30.0F, 30.0F, 30.0F, 0.0F));
-    const RenderLayers layers = underUniformSky(content, topView(10.0), 16, 32);
+    const RenderLayers layers = inEvenLight(content, topView(10.0), 16, 32);
     for (int y = 0; y < 16; ++y)
         for (int x = 0; x < 16; ++x)
             EXPECT_NEAR(skyVisible(layers, x, y), 1.0, 1e-5) << x << ' ' << y;
@@ -17,7 +17,7 @@ TEST(SkyLight, FreeSurfaceUnderAUniformSkyHasTheSkysBrightness) {
 TEST(SkyLight, FreeSphereIsEvenlyBrightUnderASkyAllAround) {
     SceneContent content;
     addMesh(content, sphereMesh(KM_3dPoint::Origin, 5.0F, 64));
-    const RenderLayers layers = underUniformSky(content, topView(8.0), 16, 64);
+    const RenderLayers layers = inEvenLight(content, topView(8.0), 16, 64);
     for (int y = 4; y < 12; ++y)
         for (int x = 4; x < 12; ++x)
             EXPECT_NEAR(skyVisible(layers, x, y), 1.0, 0.005) << x << ' ' << y;
@@ -34,9 +34,10 @@ double hiddenByWall(double distance, double height) {
 TEST(SkyLight, FloorAtTheFootOfAWallSeesHalfTheSky) {
     SceneContent content;
     addMesh(content, floorMesh(-2000.0F, -2000.0F, 2000.0F, 2000.0F, 0.0F));
-    addMesh(content, boxMesh({-20.0, -2000.0, 0.0}, {0.0, 2000.0, 40.0}));
-    // The camera hangs below the wall's upper edge, so that the wall hides no floor.
-    const RenderLayers layers = underUniformSky(content, topView(20.0), 80, 256);
+    addMesh(content, boxMesh({-20.0, -2000.0, 0.0}, {0.0, 2000.0, 40.0}), {0, 0, 0, 255});
+    // The wall is black and sends no light. The camera hangs below the wall's upper edge, so that
+    // the wall hides no floor.
+    const RenderLayers layers = inEvenLight(content, topView(20.0), 80, 256);
     const auto mean_at = [&](int x) {
         double sum = 0.0;
         for (int y = 20; y < 60; ++y)

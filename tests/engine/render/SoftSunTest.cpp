@@ -25,7 +25,9 @@ std::vector<double> acrossBorder(double sun_share) {
     const SampleSequence sequence(samples);
     const RenderKernel& kernel = renderKernelInForce();
     const int side = static_cast<int>(size_px);
-    const RenderSetup setup = makeRenderSetup(scene, topView(10.0), side, side, sequence, kernel);
+    RenderTables tables;
+    const RenderSetup setup =
+        makeRenderSetup(scene, topView(10.0), side, side, sequence, kernel, tables);
     RenderLayers layers(side, side);
     kernel.render_block(setup, {0, 80, side, 120}, 0, samples, layers.sums());
     std::vector<double> columns;
