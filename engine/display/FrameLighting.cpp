@@ -22,7 +22,7 @@ namespace {
 constexpr float SKY_REACH_OF_CLAY = 0.09F;
 constexpr double SKY_REACH_OF_SCENE = 0.35;
 /// How far things that are only shaded darken the ground.
-constexpr float SKY_REACH_OF_SHADED = 0.12F;
+constexpr float SKY_REACH_OF_SHADED = 0.09F;
 /// How high the middle of what mirrors the ground lies over it, beside the ground's reach.
 constexpr float GROUND_EYE_OF_REACH = 0.1F;
 /// Lamps are taken to be of this size, as a part of the scene's: nearer by they shine no brighter.
