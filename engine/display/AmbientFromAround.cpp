@@ -12,11 +12,7 @@ namespace {
 constexpr int PACKETS = 256;
 constexpr int DIRECTIONS = PACKETS * lane_count;
 
-struct DirectionPacket {
-    alignas(64) float axes[3][lane_count];
-};
-
-/// Directions all over the sphere, equally spaced: a spiral by the golden angle (R. Swinbank and
+/// A spiral by the golden angle (R. Swinbank and
 /// R. J. Purser, "Fibonacci Grids", Quarterly Journal of the Royal Meteorological Society, 2006).
 std::vector<DirectionPacket> makeDirections() {
     const double golden_angle = std::numbers::pi * (3.0 - std::sqrt(5.0));
@@ -30,24 +26,6 @@ std::vector<DirectionPacket> makeDirections() {
         axes[2][i % lane_count] = static_cast<float>(z);
     }
     return packets;
-}
-
-const std::vector<DirectionPacket>& directions() {
-    static const std::vector<DirectionPacket> packets = makeDirections();
-    return packets;
-}
-
-/// Calls take(x, y, z, colour) for each direction.
-template <class Take> void lookAround(const FrameSetup& frame, const Take& take) {
-    const RayKernel& kernel = rayKernelInForce();
-    alignas(64) float colors[3][lane_count];
-    for (const DirectionPacket& packet : directions()) {
-        kernel.find_light_around(frame, packet.axes, colors);
-        for (int i = 0; i < lane_count; ++i) {
-            const float color[3] = {colors[0][i], colors[1][i], colors[2][i]};
-            take(packet.axes[0][i], packet.axes[1][i], packet.axes[2][i], color);
-        }
-    }
 }
 
 /// What open ground gets, and sends.
@@ -68,6 +46,11 @@ void setGroundLight(FrameSetup& frame) {
 }
 
 } // namespace
+
+std::span<const DirectionPacket> directionsAround() {
+    static const std::vector<DirectionPacket> packets = makeDirections();
+    return packets;
+}
 
 void setAmbientFromAround(FrameSetup& frame) {
     setGroundLight(frame);

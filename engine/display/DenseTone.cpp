@@ -1,6 +1,7 @@
 #include "engine/display/DenseTone.h"
 
 #include "engine/display/CameraRays.h"
+#include "engine/display/LineBlend.h"
 #include "engine/display/MeshEdges.h"
 #include "engine/display/RayMesh.h"
 #include "engine/display/ScreenProjection.h"
@@ -47,15 +48,6 @@ void raise(std::uint8_t& mark, std::uint8_t to) {
     std::uint8_t present = shared.load(std::memory_order_relaxed);
     while (present < to && !shared.compare_exchange_weak(present, to, std::memory_order_relaxed)) {
     }
-}
-
-std::uint32_t blended(std::uint32_t under, const KM_Color& over, float amount) {
-    const auto mixed = [&](int shift, std::uint8_t channel) {
-        const auto below = static_cast<float>(under >> shift & 255U);
-        const float sum = (1.0F - amount) * below + amount * static_cast<float>(channel);
-        return static_cast<std::uint32_t>(sum + 0.5F) << shift;
-    };
-    return mixed(0, over.r) | mixed(8, over.g) | mixed(16, over.b) | 0xFF000000U;
 }
 
 } // namespace
@@ -251,7 +243,7 @@ void DenseTone::blendRow(const LineTarget& target, int row, const KM_Color& colo
         if (sum == 0)
             continue;
         const float part = std::min(1.0F, static_cast<float>(sum) / (255.0F * marks_for_full_tone));
-        pixels[x] = blended(pixels[x], color, strength * part);
+        pixels[x] = blendedOver(pixels[x], color, strength * part);
     }
 }
 

@@ -53,8 +53,8 @@ DisplayModeAttributes wireframe() {
 DisplayModeAttributes shaded() {
     auto attributes = mode(shaded_mode_id, L"Shaded", SurfaceStyle::studio);
     attributes.has_ground_plane = true;
-    attributes.background_top = {186, 190, 195, 255};
-    attributes.background_bottom = {160, 162, 165, 255};
+    attributes.background_top = {170, 174, 180, 255};
+    attributes.background_bottom = {148, 150, 153, 255};
     return attributes;
 }
 

@@ -91,6 +91,8 @@ Result<void> DisplayPipeline::draw(const DisplayScene& scene, const KM_Viewport&
         frame.layer_nearness = m_layers.data();
     }
     const float* const layers = frame.layer_nearness;
+    if (frame.scene && frame.catches_shadows)
+        m_open_ground.find(frame, *m_kernel, scene.surfacesNumber());
     drawSurfaces(frame, mode);
     if (has_lines)
         m_lines.draw(scene, frame.rays, mode,
@@ -124,8 +126,7 @@ void DisplayPipeline::drawSurfaces(FrameSetup& frame, const DisplayModeAttribute
                          static_cast<std::size_t>(frame.height));
         frame.objects = m_objects.data();
     }
-    frame.needs_unit_faces = frame.sun_count > 0 || frame.has_mirrors ||
-                             (frame.sky_reach > 0.0F && !frame.hides_sky_of_ground_alone);
+    frame.needs_unit_faces = frame.sun_count > 0 || frame.sky_reach > 0.0F || frame.has_mirrors;
     if (frame.scene && frame.sky_reach > 0.0F)
         m_free_sky.find(frame, *m_kernel);
     if (frame.has_mirrors)

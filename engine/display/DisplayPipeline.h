@@ -5,6 +5,7 @@
 #include "engine/display/FreeSky.h"
 #include "engine/display/LineDrawing.h"
 #include "engine/display/MarkedPixels.h"
+#include "engine/display/OpenGround.h"
 #include "engine/images/Image.h"
 #include "ground/Result.h"
 
@@ -60,6 +61,7 @@ private:
     MarkedPixels m_marked;
     FreeSky m_free_sky;
     Environment m_environment;
+    OpenGround m_open_ground;
     LineDrawing m_lines;
     std::size_t m_smoothed = 0;
     std::int64_t m_held_px = 0;

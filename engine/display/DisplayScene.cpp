@@ -7,6 +7,7 @@
 #include "engine/scene/PlacedMesh.h"
 
 #include <algorithm>
+#include <atomic>
 #include <limits>
 #include <utility>
 
@@ -290,6 +291,8 @@ void DisplayScene::updateVisibility(const SceneContent& content) {
 }
 
 void DisplayScene::updateBoxes() {
+    static std::atomic<std::uint64_t> last_number = 0;
+    m_surfaces_number = ++last_number;
     m_surface_box = KM_BoundingBox();
     m_whole_box = KM_BoundingBox();
     for (const MeshObject& object : m_meshes) {

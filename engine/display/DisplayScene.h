@@ -78,6 +78,9 @@ public:
     const PictureLight* pictureLight() const { return m_picture.get(); }
     /// Of all surfaces that can be drawn, shown or hidden, in the world.
     const KM_BoundingBox& wholeBox() const { return m_whole_box; }
+    /// Another number whenever surfaces are added, changed, shown or hidden; no two scenes have the
+    /// same.
+    std::uint64_t surfacesNumber() const { return m_surfaces_number; }
 
 private:
     using MeshCache = std::map<const KM_Mesh*, std::shared_ptr<const RayMesh>>;
@@ -111,6 +114,7 @@ private:
     std::shared_ptr<const PictureLight> m_picture;
     KM_3dPoint m_origin;
     double m_reach = HUGE_VAL; ///< how far from the origin rays may start
+    std::uint64_t m_surfaces_number = 0;
     KM_BoundingBox m_whole_box;
     KM_BoundingBox m_box;
     KM_BoundingBox m_surface_box;

@@ -15,6 +15,9 @@ inline constexpr int levels = 6;
 /// Channels of pictures follow each other.
 inline constexpr int channels = 3;
 inline constexpr int floats = levels * channels * texels;
+/// Surfaces read a picture and the next rougher one at once: the upper halves of both numbers, in
+/// one word. Pair i is of pictures i and i + 1.
+inline constexpr int pairs = (levels - 1) * channels * texels;
 /// How many directions a texel's light is summed up from.
 inline constexpr int samples = 32;
 } // namespace environment_map

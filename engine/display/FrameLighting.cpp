@@ -17,12 +17,8 @@ namespace quarn {
 
 namespace {
 
-/// How far surfaces hide the sky from each other: of clay, and where soft light from all sides
-/// casts the only shadows.
+/// How far surfaces of clay hide the sky from each other.
 constexpr float SKY_REACH_OF_CLAY = 0.09F;
-constexpr double SKY_REACH_OF_SCENE = 0.35;
-/// How far things that are only shaded darken the ground.
-constexpr float SKY_REACH_OF_SHADED = 0.12F;
 /// How high the middle of what mirrors the ground lies over it, beside the ground's reach.
 constexpr float GROUND_EYE_OF_REACH = 0.1F;
 /// Lamps are taken to be of this size, as a part of the scene's: nearer by they shine no brighter.
@@ -194,17 +190,6 @@ void setBackground(FrameSetup& frame, const LightSettings& settings,
         setGradient(frame, mode.background_top, mode.background_bottom, 1.0F);
 }
 
-void setSoftShadows(FrameSetup& frame, const DisplayScene& scene, SurfaceStyle style,
-                    Surroundings surroundings) {
-    if (style == SurfaceStyle::clay)
-        frame.sky_reach = SKY_REACH_OF_CLAY * frame.scene_size;
-    else if (style == SurfaceStyle::studio)
-        frame.sky_reach = frame.has_ground ? SKY_REACH_OF_SHADED * frame.scene_size : 0.0F;
-    else if (surroundings != Surroundings::sky)
-        frame.sky_reach =
-            static_cast<float>(SKY_REACH_OF_SCENE * scene.wholeBox().Diagonal().Length());
-}
-
 } // namespace
 
 void setLighting(FrameSetup& frame, const DisplayScene& scene, const KM_Viewport& viewport,
@@ -214,13 +199,13 @@ void setLighting(FrameSetup& frame, const DisplayScene& scene, const KM_Viewport
     setLights(frame, lightingOf(scene, mode, camera, viewport.CameraLocation()), scene);
     if (mode.has_ground_plane && scene.light().has_ground && frame.scene)
         placeGround(frame);
-    if (mode.surface_style == SurfaceStyle::clay)
+    if (mode.surface_style == SurfaceStyle::clay) {
+        frame.sky_reach = SKY_REACH_OF_CLAY * frame.scene_size;
         set(frame.ground_albedo, {0.72F, 0.72F, 0.72F});
+    }
     if (surroundings == Surroundings::studio)
         set(frame.ground_albedo, {STUDIO_FLOOR_ALBEDO, STUDIO_FLOOR_ALBEDO, STUDIO_FLOOR_ALBEDO});
     setBackground(frame, scene.light(), mode, surroundings);
-    setSoftShadows(frame, scene, mode.surface_style, surroundings);
-    frame.hides_sky_of_ground_alone = mode.surface_style == SurfaceStyle::studio;
     if (mode.surface_style == SurfaceStyle::studio)
         std::copy_n(frame.background_bottom, 3, frame.ground_light);
     else if (surroundings == Surroundings::sky)

@@ -1,5 +1,6 @@
 #include "engine/display/LineRaster.h"
 
+#include "engine/display/LineBlend.h"
 #include "engine/display/LineCrowding.h"
 #include "engine/display/VisibleParts.h"
 #include "engine/display/kernel/FrameSetup.h"
@@ -92,7 +93,6 @@ private:
     void addFlat(const ScreenSegment& s, float reach);
     void cover(int x, int y, const ScreenSegment& s);
     float leftByLayers(int x, int y, float nearness) const;
-    void blendPixel(std::uint32_t& pixel, float amount) const;
 
     const LineTarget& m_target;
     const LineCrowding& m_crowding;
@@ -214,17 +214,6 @@ float Band::leftByLayers(int x, int y, float nearness) const {
     return left;
 }
 
-void Band::blendPixel(std::uint32_t& pixel, float amount) const {
-    const float keep = 1.0F - amount;
-    const auto mixed = [&](int shift, std::uint8_t line) {
-        const auto under = static_cast<float>(pixel >> shift & 255U);
-        return static_cast<std::uint32_t>(keep * under + amount * static_cast<float>(line) + 0.5F)
-               << shift;
-    };
-    pixel = mixed(0, m_style.color.r) | mixed(8, m_style.color.g) | mixed(16, m_style.color.b) |
-            0xFF000000U;
-}
-
 void Band::blend() {
     const auto freedom = [this](int x, int y) {
         if (m_style.crowded <= 0.0F)
@@ -239,7 +228,8 @@ void Band::blend() {
                                                          static_cast<std::size_t>(m_target.width);
         for (int x = range.begin; x < range.end; ++x) {
             if (cover[x] > 0.0F)
-                blendPixel(row[x], cover[x] * m_style.opacity * freedom(x, y));
+                row[x] =
+                    blendedOver(row[x], m_style.color, cover[x] * m_style.opacity * freedom(x, y));
             cover[x] = 0.0F;
         }
         range = {};

@@ -38,18 +38,32 @@ template <class Map> TexelView viewOf(int column, int row) {
     Direction d{u, v, z};
     if (z < 0.0)
         d = {std::copysign(1.0 - std::abs(v), u), std::copysign(1.0 - std::abs(u), v), z};
-    const double length = std::hypot(d[0], d[1], d[2]);
+    const double length = std::sqrt(d[0] * d[0] + d[1] * d[1] + d[2] * d[2]);
     const double side = 2.0 / Map::side;
     return {{d[0] / length, d[1] / length, d[2] / length},
             side * side / (length * length * length)};
 }
 
-/// Calls function(index, view) for each texel that is none of the border.
+/// Calls function(index, column, row) for each texel that is none of the border.
 template <class Map, class Function> void forEachInnerTexel(const Function& function) {
     for (int row = 1; row <= Map::side; ++row)
         for (int column = 1; column <= Map::side; ++column)
-            function(static_cast<std::size_t>(row * Map::stride + column),
-                     viewOf<Map>(column, row));
+            function(static_cast<std::size_t>(row * Map::stride + column), column, row);
+}
+
+template <class Map> LinearColor texelAt(const std::vector<float>& map, std::size_t i) {
+    return {map[i], map[i + Map::texels], map[i + 2 * Map::texels]};
+}
+
+/// The means over the sphere of a function of each texel's brightness.
+template <class Function>
+double meanAround(const std::vector<float>& broad, const Function& function) {
+    double sum = 0.0;
+    forEachInnerTexel<BroadMap>([&](std::size_t i, int column, int row) {
+        sum += viewOf<BroadMap>(column, row).solid_angle *
+               function(double{brightnessOf(texelAt<BroadMap>(broad, i))});
+    });
+    return sum / (4.0 * std::numbers::pi);
 }
 
 /// Pictures with more pixels than maps can show are halved first, so that each pixel counts.
@@ -87,6 +101,8 @@ class PictureView {
 public:
     explicit PictureView(const EnvironmentPicture& picture) : m_picture(picture) {}
 
+    bool isCoarserThan(int width) const { return m_picture.width <= width; }
+
     LinearColor toward(const Direction& d) const {
         const double turn = std::atan2(d[0], d[1]) / (2.0 * std::numbers::pi) + 0.5;
         const double drop = std::acos(std::clamp(d[2], -1.0, 1.0)) / std::numbers::pi;
@@ -119,12 +135,13 @@ private:
     const EnvironmentPicture& m_picture;
 };
 
-/// The mean of two by two places of a texel.
+/// The mean of two by two places of a texel, or its middle where pixels are larger than texels.
 template <class Map> LinearColor texelOf(const PictureView& view, int column, int row) {
+    if (view.isCoarserThan(2 * Map::side))
+        return view.toward(viewOf<Map>(column, row).direction);
     LinearColor sum;
     using Finer = SquareMap<2 * Map::side>;
     for (int part = 0; part < 4; ++part) {
-        // The border of the finer map is half as wide.
         const TexelView at = viewOf<Finer>(2 * column - 1 + part % 2, 2 * row - 1 + part / 2);
         const LinearColor color = view.toward(at.direction);
         sum = {sum.r + color.r, sum.g + color.g, sum.b + color.b};
@@ -199,32 +216,25 @@ PictureLight::PictureLight(std::shared_ptr<const EnvironmentPicture> picture)
     } else {
         m_sharp = sharpMapOf(*m_picture);
     }
-    findSun();
     m_broad = broadMapOf(m_sharp);
-    findMean();
+    findSun();
+    m_mean = static_cast<float>(meanAround(m_broad, [](double light) { return light; }));
 }
 
 void PictureLight::findSun() {
-    const float* const map = m_sharp.data();
-    const auto color_at = [&](std::size_t i) {
-        return LinearColor{map[i], map[i + PictureMap::texels], map[i + 2 * PictureMap::texels]};
-    };
-    double logarithms = 0.0;
-    double all = 0.0;
-    forEachInnerTexel<PictureMap>([&](std::size_t i, const TexelView& view) {
-        const double light = brightnessOf(color_at(i));
-        logarithms += view.solid_angle * std::log(light + 1e-6);
-        all += view.solid_angle * light;
-    });
-    const double most = SUN_BESIDE_REST * std::exp(logarithms / (4.0 * std::numbers::pi));
+    const double all = meanAround(m_broad, [](double light) { return light; });
+    const double most =
+        SUN_BESIDE_REST *
+        std::exp(meanAround(m_broad, [](double light) { return std::log(light + 1e-6); }));
     Direction toward{};
     double sun[3] = {};
     double brightness = 0.0;
-    forEachInnerTexel<PictureMap>([&](std::size_t i, const TexelView& view) {
-        const LinearColor color = color_at(i);
+    forEachInnerTexel<PictureMap>([&](std::size_t i, int column, int row) {
+        const LinearColor color = texelAt<PictureMap>(m_sharp, i);
         const double light = brightnessOf(color);
         if (light <= most)
             return;
+        const TexelView view = viewOf<PictureMap>(column, row);
         const double part = view.solid_angle * (1.0 - most / light);
         sun[0] += part * color.r;
         sun[1] += part * color.g;
@@ -233,29 +243,27 @@ void PictureLight::findSun() {
         for (std::size_t axis = 0; axis < 3; ++axis)
             toward[axis] += part * light * view.direction[axis];
     });
-    const double length = std::hypot(toward[0], toward[1], toward[2]);
-    if (brightness <= LEAST_PART_OF_SUN * all || length < SUN_CONCENTRATION * brightness)
+    const double length =
+        std::sqrt(toward[0] * toward[0] + toward[1] * toward[1] + toward[2] * toward[2]);
+    if (brightness <= LEAST_PART_OF_SUN * all * 4.0 * std::numbers::pi ||
+        length < SUN_CONCENTRATION * brightness)
         return;
     m_has_sun = true;
     for (std::size_t i = 0; i < 3; ++i) {
         m_toward_sun[i] = static_cast<float>(toward[i] / length);
         m_sun_color[i] = static_cast<float>(sun[i] / std::numbers::pi);
     }
+    takeSunAway(most);
+}
+
+void PictureLight::takeSunAway(double most) {
     for (std::size_t i = 0; i < static_cast<std::size_t>(PictureMap::texels); ++i) {
-        const double light = brightnessOf(color_at(i));
+        const double light = brightnessOf(texelAt<PictureMap>(m_sharp, i));
         if (light > most)
             for (std::size_t c = 0; c < 3; ++c)
                 m_sharp[i + c * PictureMap::texels] *= static_cast<float>(most / light);
     }
-}
-
-void PictureLight::findMean() {
-    double sum = 0.0;
-    forEachInnerTexel<BroadMap>([&](std::size_t i, const TexelView& view) {
-        sum += view.solid_angle * brightnessOf({m_broad[i], m_broad[i + BroadMap::texels],
-                                                m_broad[i + 2 * BroadMap::texels]});
-    });
-    m_mean = static_cast<float>(sum / (4.0 * std::numbers::pi));
+    m_broad = broadMapOf(m_sharp);
 }
 
 } // namespace quarn

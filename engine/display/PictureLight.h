@@ -33,7 +33,7 @@ public:
 
 private:
     void findSun();
-    void findMean();
+    void takeSunAway(double most);
 
     std::shared_ptr<const EnvironmentPicture> m_picture;
     std::vector<float> m_sharp;

@@ -35,7 +35,7 @@ bool centerIsOutlier(std::uint32_t center_object, std::span<const std::uint32_t>
 
 /// Whether something crosses the pixel that more rays would draw better.
 bool isVaried(std::uint32_t center, const SampleBatch::Colors& colors, int threshold) {
-    for (int c = 0; c < 3; ++c)
+    for (int c = 0; c < 4; ++c)
         for (const std::uint32_t color : colors)
             if (std::abs(channel(color, c) - channel(center, c)) > threshold)
                 return true;
@@ -45,15 +45,20 @@ bool isVaried(std::uint32_t center, const SampleBatch::Colors& colors, int thres
 } // namespace
 
 void LinearSum::add(std::uint32_t pixel, const SrgbTables& srgb) {
+    const float part = static_cast<float>(channel(pixel, 3)) / 255.0F;
     for (int c = 0; c < 3; ++c)
-        channels[c] += srgb.linear(channel(pixel, c));
+        channels[c] += part * srgb.linear(channel(pixel, c));
+    opacity += part;
     ++count;
 }
 
 std::uint32_t LinearSum::mean(const SrgbTables& srgb) const {
-    std::uint32_t pixel = 0xFF000000U;
+    if (opacity <= 0.0F)
+        return 0;
+    const float part = opacity / static_cast<float>(count);
+    std::uint32_t pixel = static_cast<std::uint32_t>(255.0F * part + 0.5F) << 24;
     for (int c = 0; c < 3; ++c) {
-        const float linear = channels[c] / static_cast<float>(count);
+        const float linear = std::min(channels[c] / opacity, 1.0F);
         pixel |= static_cast<std::uint32_t>(srgb.byte(linear)) << (8 * c);
     }
     return pixel;

@@ -20,9 +20,10 @@ struct SampleOffset {
 };
 using SamplePattern = std::array<SampleOffset, rays_a_pixel>;
 
-/// The sum of some pixels in linear light.
+/// The sum of some pixels in linear light, each counting as far as it is opaque.
 struct LinearSum {
     float channels[3] = {0.0F, 0.0F, 0.0F};
+    float opacity = 0.0F;
     int count = 0;
 
     void add(std::uint32_t pixel, const SrgbTables& srgb);

@@ -48,7 +48,7 @@ Lighting clayLighting(Lighting lighting) {
     return lighting;
 }
 
-/// Paper gives back its colour from everywhere.
+/// Paper is of the background's colour and gives it back from everywhere.
 Lighting paperLighting(const KM_Color& paper) {
     Lighting lighting;
     const LinearColor light = sceneLightShownAs(paper);
@@ -150,7 +150,9 @@ Lighting documentLighting(const DisplayScene& scene, bool casts_shadows, const C
 Lighting lightingOf(const DisplayScene& scene, const DisplayModeAttributes& mode,
                     const CameraFrame& camera, const KM_3dPoint& eye) {
     if (mode.surface_style == SurfaceStyle::paper)
-        return paperLighting(mode.background_top);
+        return paperLighting(scene.light().background == BackgroundKind::color
+                                 ? scene.light().background_color
+                                 : mode.background_top);
     if (mode.uses_document_lights && mode.surface_style == SurfaceStyle::clay)
         return clayLighting(skyLighting(scene.lights(), mode.casts_shadows, camera));
     if (mode.uses_document_lights)

@@ -217,24 +217,12 @@ Sky roomAround() {
     return room;
 }
 
-/// The key light as it is mirrored.
-SoftBox keyBox(const CameraFrame& camera) {
-    const DirectionalLight key = lightFrom(worldDirection(camera, {-0.50, 0.62, 0.30}), {}, 0.0F);
-    SoftBox box;
-    std::copy_n(key.toward, 3, box.toward);
-    box.half_width_deg = 26.0F;
-    box.half_height_deg = 26.0F;
-    box.border = 0.5F;
-    box.color = {1.5F, 1.48F, 1.45F};
-    return box;
-}
-
 } // namespace
 
 Lighting studioLighting(const CameraFrame& camera) {
     Lighting lighting;
     lighting.sky = roomAround();
-    lighting.boxes.push_back(keyBox(camera));
+    lighting.boxes.push_back(overheadBox(lighting.sky));
     lighting.ambient = hemisphere({0.46F, 0.47F, 0.49F}, {0.24F, 0.24F, 0.25F}, camera.y);
     lighting.fixed.push_back(
         lightFrom(worldDirection(camera, {-0.50, 0.62, 0.80}), {0.58F, 0.57F, 0.55F}, 0.0F));

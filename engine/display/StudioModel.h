@@ -5,7 +5,7 @@
 namespace quarn {
 
 /// How much of its light the floor of a studio sends back.
-inline constexpr float STUDIO_FLOOR_ALBEDO = 0.78F;
+inline constexpr float STUDIO_FLOOR_ALBEDO = 0.6F;
 
 /// What lies around in a studio for taking pictures of products: grey walls and soft boxes, a large
 /// one overhead, the key light at the upper left of a front view, a fill light at the right and a

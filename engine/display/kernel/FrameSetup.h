@@ -104,6 +104,22 @@ struct SkyPlace {
     float point[3];
 };
 
+/// How much of the light from all around arrives at the ground, on a grid of places.
+inline constexpr int ground_map_side = 192;
+struct FrameGroundMap {
+    float corner[2] = {0, 0}; ///< where the first texel begins
+    float texels_a_unit[2] = {1, 1};
+    float near_scale = 1.0F;     ///< 1 / the height up to which surfaces are taken to be near it
+    float step_before = 0.0F;    ///< how far before upright faces they look at the ground
+    const float* open = nullptr; ///< row by row along x, 0 to 1; null: not known
+};
+
+/// Unit vectors toward the light from all around, each for an equal part of it.
+inline constexpr int ground_directions = 256;
+struct GroundDirections {
+    float toward[ground_directions][3];
+};
+
 /// Everything that the ray loops need for one picture; plain numbers and pointers, because the
 /// loops are compiled several times, for several processors.
 struct FrameSetup {
@@ -154,7 +170,8 @@ struct FrameSetup {
     float ground_fade_end = 1.0F;
     float ground_albedo[3] = {0.5F, 0.5F, 0.5F};
     float ground_light[3] = {0, 0, 0}; ///< that it sends where nothing shadows it
-    float ground_eye = 0.0F;           ///< how high the middle of the scene is taken to lie over it
+    FrameGroundMap ground_map;
+    float ground_eye = 0.0F; ///< how high the middle of the scene is taken to lie over it
 
     bool has_sky = false;              ///< what lies around is seen, else a background
     bool has_clear_background = false; ///< pixels have an opacity; the background is black
@@ -174,10 +191,10 @@ struct FrameSetup {
     FramePicture picture;                         ///< instead of sky and soft boxes
     /// What surfaces mirror of what lies around, see EnvironmentMap.h; null when none does.
     float* environment = nullptr;
-    const float* split_sum = nullptr; ///< SplitSum::entries()
+    const std::uint32_t* environment_pairs = nullptr; ///< the same, in pairs
+    const float* split_sum = nullptr;                 ///< SplitSum::entries()
 
     float sky_reach = 0.0F; ///< how far surfaces hide the sky from others; 0: not at all
-    bool hides_sky_of_ground_alone = false; ///< surfaces do not darken each other
     const SkyTable* sky_table = nullptr;
     int sky_width = 0;              ///< places of the grid in a row
     int sky_height = 0;             ///< rows of the grid
@@ -235,6 +252,9 @@ struct RayKernel {
     /// unit length; rows are x, y, z and r, g, b.
     void (*find_light_around)(const FrameSetup& frame, const float (&directions)[3][lane_count],
                               float (&colors)[3][lane_count]);
+    /// Fills a row of a ground map, whose place is in `frame`.
+    void (*find_open_ground)(const FrameSetup& frame, const GroundDirections& directions, int row,
+                             float* open);
 };
 
 /// The loops for the instruction set in force (InstructionSet.h).

@@ -39,9 +39,7 @@ inline LaneColors shadeOpaque(const FrameSetup& frame, RayPacket& packet, Surfac
     const LaneMask lit = packet.hit | ground.seen;
     if (!any(lit))
         return color;
-    LaneColors shaded = sentLight(frame, packet, surfaces, lit, through);
-    if (frame.free_sky && frame.hides_sky_of_ground_alone)
-        shaded = shaded * skyArriving(frame, packet, surfaces, ground.seen);
+    const LaneColors shaded = sentLight(frame, packet, surfaces, lit, through);
     if (!frame.catches_shadows) {
         color = blended(color, shaded, ground.weight);
     } else {

@@ -68,7 +68,7 @@ inline LaneMask reachesScene(const FrameSetup& frame, const LaneVectors& from,
 /// Lets each point look in one direction.
 /// @param toward  about the normal, which is (0, 0, 1)
 /// @param reach   as a part of `sky_reach`
-/// @return 1 where something stands before the sky, less where that is glass, else 0
+/// @return 1 where something stands before the sky, else 0
 inline Lanes coveredToward(const FrameSetup& frame, const SkyPoints& points,
                            const LaneFrame& around, const LaneVectors& toward, const Lanes& reach,
                            RTCRay16& ray) {
@@ -85,8 +85,6 @@ inline Lanes coveredToward(const FrameSetup& frame, const SkyPoints& points,
     setOrigin(ray, points.from);
     setDirection(ray, direction);
     store(ray.tfar, select(cast, length, no_distance));
-    if (frame.has_see_through)
-        return Lanes(1.0F) - throughPanes(frame, 1.0F, cast, ray);
     RTCIntersectContext context;
     rtcInitIntersectContext(&context);
     rtcOccluded16(cast.data(), frame.scene, &context, &ray);
@@ -120,10 +118,7 @@ inline float freeSkyAlone(const FrameSetup& frame, const SkyPoints& points, int 
     const Lanes covered = coveredToward(
         frame, point, frameAround(point.normal),
         {load(directions.x), load(directions.y), load(directions.z)}, load(directions.reach), ray);
-    float sum = 0.0F;
-    for (int i = 0; i < lane_count; ++i)
-        sum += laneOf(covered, i);
-    return 1.0F - sum / lane_count;
+    return 1.0F - static_cast<float>(__builtin_popcount(bits(covered > 0.5F))) / lane_count;
 }
 
 } // namespace

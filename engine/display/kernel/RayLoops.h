@@ -4,6 +4,7 @@
 #include "engine/display/kernel/EnvironmentLoops.h"
 #include "engine/display/kernel/LayeredShading.h"
 #include "engine/display/kernel/OneSided.h"
+#include "engine/display/kernel/OpenGroundLoop.h"
 #include "engine/display/kernel/PixelSteps.h"
 #include "engine/display/kernel/SeeThroughShading.h"
 #include "engine/display/kernel/SkyLoops.h"
@@ -187,7 +188,8 @@ void traceSamples(const FrameSetup& frame, SamplePacket& samples) {
 } // namespace
 
 extern const RayKernel QUARN_RAY_KERNEL;
-const RayKernel QUARN_RAY_KERNEL{QUARN_RAY_KERNEL_NAME, traceBlock,      traceSamples,   findSteps,
-                                 findFreeSky,           findEnvironment, findLightAround};
+const RayKernel QUARN_RAY_KERNEL{
+    QUARN_RAY_KERNEL_NAME, traceBlock,      traceSamples,    findSteps,
+    findFreeSky,           findEnvironment, findLightAround, findOpenGround};
 
 } // namespace quarn

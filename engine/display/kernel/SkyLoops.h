@@ -51,8 +51,7 @@ inline void findFreeSky(const FrameSetup& frame, const GridPlaces& places, RayPa
     LaneMask seen = packet.hit;
     if (frame.has_ground)
         seen = seen | meetGround(frame, packet, surfaces).seen;
-    const LaneMask darkened = frame.hides_sky_of_ground_alone ? seen & ~packet.hit : seen;
-    const SkyPoints points = skyPoints(frame, packet, surfaces, darkened);
+    const SkyPoints points = skyPoints(frame, packet, surfaces, seen);
     const LaneVectors point =
         along(packet.origin(), packet.direction(), select(seen, packet.distance, 0.0F));
     keepFreeSky(frame, places, packet.active,

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/display/kernel/LampLight.h"
+#include "engine/display/kernel/OpenGround.h"
 #include "engine/display/kernel/SkyGrid.h"
 
 namespace quarn {
@@ -40,9 +41,10 @@ inline void addLight(const float (&color)[3], const Lanes& amount, LaneColors& l
 inline LaneColors skyLight(const FrameSetup& frame, const RayPacket& packet,
                            const SurfaceLanes& surfaces, const LaneMask& lit) {
     const LaneColors light = ambientLight(frame, surfaces.normal);
-    if (!frame.free_sky || frame.hides_sky_of_ground_alone)
+    if (!frame.free_sky && !frame.ground_map.open)
         return light;
-    const Lanes arriving = skyArriving(frame, packet, surfaces, lit);
+    const Lanes arriving = frame.free_sky ? skyArriving(frame, packet, surfaces, lit)
+                                          : openAboveGround(frame, packet, surfaces.normal, lit);
     return {light.r * arriving, light.g * arriving, light.b * arriving};
 }
 

@@ -81,20 +81,45 @@ inline LaneColors pictureAt(const FrameSetup& frame, const LaneInts& level, cons
             channelAt(frame.environment + 2 * texels, stride, first, place)};
 }
 
+/// A channel of two pictures of the environment map, blended.
+/// @param first  of each lane the first texel of the pair's channel
+/// @param part   of the second picture
+inline Lanes blendedPictures(const std::uint32_t* pairs, const LaneInts& first,
+                             const MapPlace& place, const Lanes& part) {
+    const LaneInts at = first + place.texel;
+    const auto texel = [&](int offset) {
+        const LaneInts pair = gathered(pairs + offset, at);
+        const Lanes sharper = floatsWith(pair & LaneInts(static_cast<std::int32_t>(0xFFFF0000U)));
+        return sharper + part * (floatsWith(shiftedLeft(pair, 16)) - sharper);
+    };
+    constexpr int stride = environment_map::stride;
+    const Lanes upper_left = texel(0);
+    const Lanes lower_left = texel(stride);
+    const Lanes upper = upper_left + place.right * (texel(1) - upper_left);
+    const Lanes lower = lower_left + place.right * (texel(stride + 1) - lower_left);
+    return upper + place.below * (lower - upper);
+}
+
 /// The light from around as a surface of some roughness mirrors it.
 /// @param direction  where a perfect mirror would look; of unit length
 inline LaneColors mirroredSurroundings(const FrameSetup& frame, const LaneVectors& direction,
                                        const Lanes& roughness) {
+    constexpr int texels = environment_map::texels;
     const Lanes level = roughness * static_cast<float>(environment_map::levels);
     const LaneInts whole = limited(wholePart(level), environment_map::levels - 1);
     const Lanes part = level - floatsOf(whole);
     const MapPlace place = placeOnMap<environment_map::side>(direction);
-    const LaneColors rougher = pictureAt(frame, whole + LaneInts(1), place);
     const LaneMask is_sharp = whole == LaneInts(0);
-    LaneColors sharper = pictureAt(frame, select(is_sharp, LaneInts(1), whole), place);
-    if (any(is_sharp))
-        sharper = select(is_sharp, surroundingLight(frame, direction), sharper);
-    return blended(sharper, rougher, part);
+    const LaneInts pair = select(is_sharp, LaneInts(0), whole - LaneInts(1));
+    const LaneInts first = pair * LaneInts(environment_map::channels * texels);
+    const Lanes of_second = select(is_sharp, Lanes(0.0F), part);
+    const auto channel = [&](int c) {
+        return blendedPictures(frame.environment_pairs + c * texels, first, place, of_second);
+    };
+    const LaneColors light{channel(0), channel(1), channel(2)};
+    if (!any(is_sharp))
+        return light;
+    return select(is_sharp, blended(surroundingLight(frame, direction), light, part), light);
 }
 
 } // namespace

@@ -266,6 +266,35 @@ TEST(Mirroring, BallsOfOtherRoughnessOrMetalnessLookDifferent) {
         }
 }
 
+TEST(Mirroring, WhatIsKeptOfTheSurroundingsIsFoundAgainWhenTheyChange) {
+    DisplayPipeline pipeline;
+    DisplayScene scene;
+    const auto chrome = [](Material& material) {
+        material.base_color = {250, 250, 250, 255};
+        material.metalness = 1.0F;
+        material.roughness = 0.5F;
+    };
+    SceneContent content = ball(chrome);
+    content.lights.push_back(sunLight({0.5, 0.6, -0.6}));
+    DisplayModeAttributes mode = modeNamed(L"Rendered");
+    const auto expectAsFresh = [&] {
+        Image image;
+        ASSERT_TRUE(scene.update(content).ok());
+        ASSERT_TRUE(pipeline.draw(scene, levelView(), mode, size, size, image).ok());
+        EXPECT_EQ(image.rgba, drawn(content, levelView(), mode, size, size).rgba);
+    };
+    expectAsFresh();
+    expectAsFresh();
+    content.lights[0] = sunLight({0.9, 0.1, -0.1});
+    expectAsFresh();
+    mode.has_ground_plane = false;
+    expectAsFresh();
+    mode = modeNamed(L"Shaded");
+    expectAsFresh();
+    mode = modeNamed(L"Rendered");
+    expectAsFresh();
+}
+
 TEST(Mirroring, AllProcessorsDrawTheSame) {
     const SceneContent content = ballGrid({212, 160, 70, 255});
     DisplayScene scene;

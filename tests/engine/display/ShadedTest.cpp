@@ -86,10 +86,10 @@ TEST(Shaded, WhiteAndBlackModelsStandOutFromGroundAndBackdrop) {
         const KM_Color color{value, value, value, 255};
         SceneContent ball;
         addMesh(ball, sphereMesh({0.0, 0.0, 2.0}, 2.0F, 48), color);
-        EXPECT_GT(contrastAlongBorder(ball, shaded(ball)), 18.0) << int{value};
+        EXPECT_GT(contrastAlongBorder(ball, shaded(ball)), 12.0) << int{value};
         SceneContent box;
         addMesh(box, boxMesh({-2.0, -2.0, 0.0}, {2.0, 2.0, 3.0}), color);
-        EXPECT_GT(contrastAlongBorder(box, shaded(box)), 18.0) << int{value};
+        EXPECT_GT(contrastAlongBorder(box, shaded(box)), 12.0) << int{value};
     }
 }
 
