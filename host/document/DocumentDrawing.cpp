@@ -1,6 +1,7 @@
 #include "host/document/DocumentDrawing.h"
 
 #include "engine/render/Renderer.h"
+#include "engine/scene/UnitLength.h"
 #include "host/document/Document.h"
 #include "host/document/DocumentScene.h"
 
@@ -18,27 +19,46 @@ void DocumentDrawing::release() {
     m_scene.reset();
 }
 
-std::vector<KM_Light> DocumentDrawing::shiningLights() const {
-    std::vector<KM_Light> lights = m_document.lights().shiningLights();
-    if (const auto sun = m_document.sun().light())
+bool DocumentDrawing::isSunStudy(const SceneChanges& changes) const {
+    return changes.sun || (!m_document.sun().isEnabled() && m_document.lights().hasStudySun());
+}
+
+std::vector<KM_Light> DocumentDrawing::shiningLights(const SceneChanges& changes) const {
+    const LightStore& table = m_document.lights();
+    const int replaced = changes.sun ? changes.sun->replaced_light : LightStore::no_index;
+    std::vector<KM_Light> lights = table.shiningLights(
+        isSunStudy(changes) ? ShiningLights::of_plug_ins : ShiningLights::all, replaced);
+    if (changes.sun && LightStore::canShine(changes.sun->light))
+        lights.push_back(changes.sun->light);
+    if (const auto sun = m_document.sun().light(); sun && !changes.sun)
         lights.insert(lights.begin(), *sun);
     return lights;
 }
 
-std::vector<KM_Light> DocumentDrawing::shiningLights(const SceneChanges& changes) const {
-    if (!changes.sun)
-        return shiningLights();
-    std::vector<KM_Light> lights = m_document.lights().shiningLights(changes.sun->replaced_light);
-    if (LightStore::canShine(changes.sun->light))
-        lights.push_back(changes.sun->light);
-    return lights;
+LightSettings DocumentDrawing::lightSettings(const SceneChanges& changes) {
+    const LightChoice& choice = m_document.renderWindow().settings.light;
+    LightSettings settings;
+    settings.surroundings = choice.surroundings;
+    if (choice.surroundings == Surroundings::picture)
+        settings.picture = m_surroundings.pictureFor(m_document, choice.picture);
+    if (settings.surroundings == Surroundings::picture && !settings.picture)
+        settings.surroundings = Surroundings::automatic;
+    if (settings.surroundings == Surroundings::automatic && isSunStudy(changes))
+        settings.surroundings = Surroundings::sky;
+    settings.exposure = choice.exposure;
+    settings.background = choice.background;
+    settings.background_color = choice.background_color;
+    settings.has_ground = choice.has_ground;
+    if (const double metres = metresPerUnit(m_document.units()); metres > 0.0)
+        settings.metres_per_unit = metres;
+    return settings;
 }
 
 Result<void> DocumentDrawing::update(const SceneChanges& changes) {
     if (!m_scene)
         m_scene = std::make_unique<DocumentScene>();
-    const auto updated =
-        m_scene->update(m_document.objects(), shiningLights(changes), changes.hidden);
+    const auto updated = m_scene->update(m_document.objects(), shiningLights(changes),
+                                         lightSettings(changes), changes.hidden);
     if (updated)
         m_object_warning.tell(m_document, m_scene->display().outOfRange());
     return updated;

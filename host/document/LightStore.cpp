@@ -42,20 +42,37 @@ int LightStore::add(const KM_Light& light) {
     return m_slot_count++;
 }
 
+int LightStore::addOfPlugIn(const KM_Light& light) {
+    const int index = add(light);
+    if (index != no_index)
+        m_of_plug_ins.insert(index);
+    return index;
+}
+
 void LightStore::addDeletedUpTo(int count) {
     m_slot_count = std::max(m_slot_count, std::min(count, most_slots));
 }
 
 bool LightStore::remove(int index) {
+    m_of_plug_ins.erase(index);
     return m_live.erase(index) > 0;
 }
 
-std::vector<KM_Light> LightStore::shiningLights(int but) const {
+std::vector<KM_Light> LightStore::shiningLights(ShiningLights which, int but) const {
     std::vector<KM_Light> lights;
-    for (const auto& [index, slot] : m_live)
-        if (index != but && slot.Light().IsEnabled())
+    for (const auto& [index, slot] : m_live) {
+        const bool counts = which == ShiningLights::all || m_of_plug_ins.contains(index);
+        if (counts && index != but && slot.Light().IsEnabled())
             lights.push_back(slot.Light());
+    }
     return lights;
+}
+
+bool LightStore::hasStudySun() const {
+    return std::ranges::any_of(m_of_plug_ins, [this](int index) {
+        const KM_Light& light = at(index).Light();
+        return light.IsEnabled() && light.Style() == KM_LightStyle::world_directional;
+    });
 }
 
 } // namespace quarn
@@ -73,7 +90,7 @@ const CQuarnLight& CQuarnLightTable::operator[](int index) const {
 
 int CQuarnLightTable::AddLight(const KM_Light& light, const KM_3dmObjectAttributes*) {
     const bool allowed = mayCallDocument(*m_lights, "CQuarnLightTable::AddLight");
-    return allowed ? m_lights->add(light) : quarn::LightStore::no_index;
+    return allowed ? m_lights->addOfPlugIn(light) : quarn::LightStore::no_index;
 }
 
 bool CQuarnLightTable::DeleteLight(int index, bool quiet) {

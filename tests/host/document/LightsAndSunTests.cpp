@@ -1,4 +1,5 @@
 #include "host/document/DocumentDrawing.h"
+#include "import/ImportedModel.h"
 #include "tests/host/document/DocumentFixtures.h"
 
 #include <limits>
@@ -49,7 +50,7 @@ TEST_F(LightTableTest, LightsShineInTheOrderOfTheirIndices) {
     lights.remove(0);
     const auto shining = [&](int but) {
         std::vector<int> xs;
-        for (const KM_Light& light : lights.shiningLights(but))
+        for (const KM_Light& light : lights.shiningLights(ShiningLights::all, but))
             xs.push_back(static_cast<int>(light.Direction().x));
         return xs;
     };
@@ -84,6 +85,60 @@ TEST_F(LightTableTest, OnlyLiveLightsThatAreOnShineBesideTheSun) {
     ASSERT_EQ(lights.size(), 2U);
     EXPECT_EQ(lights[0].Direction(), -document.sun().directionToSun());
     EXPECT_EQ(lights[1].Direction(), KM_3dVector(0, 0, -1));
+}
+
+KM_Light lampOfModel() {
+    KM_Light lamp;
+    lamp.SetStyle(KM_LightStyle::world_point);
+    lamp.SetLocation({1, 2, 3});
+    return lamp;
+}
+
+TEST_F(LightTableTest, LightsOfAModelShineBesideTheSun) {
+    ImportedModel model;
+    model.lights = {lampOfModel()};
+    document.addModel(model);
+    const std::vector<KM_Light> lights = document.drawing().shiningLights();
+    ASSERT_EQ(lights.size(), 2U);
+    EXPECT_EQ(lights[1].Style(), KM_LightStyle::world_point);
+    EXPECT_EQ(document.face().LightTable().LightCount(), 1);
+}
+
+TEST_F(LightTableTest, LightsOfTheDocumentRestWhileAStudyMovesASun) {
+    document.lights().add(lampOfModel());
+    CQuarnLightTable& table = document.face().LightTable();
+    const int sun = table.AddLight(sunFrom({0, 0, -1}), nullptr);
+    EXPECT_EQ(document.drawing().shiningLights().size(), 3U) << "a light beside the sun";
+
+    document.sun().beginChange();
+    document.sun().setEnabled(false);
+    const std::vector<KM_Light> lights = document.drawing().shiningLights();
+    ASSERT_EQ(lights.size(), 1U);
+    EXPECT_EQ(lights[0].Direction(), KM_3dVector(0, 0, -1));
+    EXPECT_FALSE(table[0].IsDeleted());
+    EXPECT_TRUE(table[0].Light().IsEnabled()) << "plug-ins see it as it is";
+
+    table.DeleteLight(sun, true);
+    ASSERT_EQ(document.drawing().shiningLights().size(), 1U);
+    EXPECT_EQ(document.drawing().shiningLights()[0].Style(), KM_LightStyle::world_point);
+}
+
+TEST_F(LightTableTest, TheSunOfASingleFrameOfAStudyShinesAlone) {
+    document.lights().add(lampOfModel());
+    document.lights().add(sunFrom({1, 0, -1}));
+    SceneChanges changes;
+    changes.sun = SceneChanges::Sun{sunFrom({0, 0, -1}), LightStore::no_index};
+    const std::vector<KM_Light> lights = document.drawing().shiningLights(changes);
+    ASSERT_EQ(lights.size(), 1U);
+    EXPECT_EQ(lights[0].Direction(), KM_3dVector(0, 0, -1));
+}
+
+TEST_F(LightTableTest, ALampOfAPlugInMakesNoStudy) {
+    document.lights().add(sunFrom({1, 0, -1}));
+    document.face().LightTable().AddLight(lampOfModel(), nullptr);
+    document.sun().beginChange();
+    document.sun().setEnabled(false);
+    EXPECT_EQ(document.drawing().shiningLights().size(), 2U);
 }
 
 using DocumentSunTest = DocumentTest;
