@@ -1,6 +1,7 @@
 #include "engine/display/DisplayScene.h"
 
 #include "engine/display/BuildProgress.h"
+#include "engine/display/LightChoice.h"
 #include "engine/images/ColorSpace.h"
 #include "engine/scene/DrawableRange.h"
 #include "engine/scene/PlacedMesh.h"
@@ -66,6 +67,7 @@ void DisplayScene::shareWith(const DisplayScene& earlier) {
     m_mesh_cache = earlier.m_mesh_cache;
     m_materials = earlier.m_materials;
     m_rays.shareWith(earlier.m_rays);
+    m_picture = earlier.m_picture;
 }
 
 Result<void> DisplayScene::update(const SceneContent& content, BuildProgress* progress) {
@@ -73,8 +75,7 @@ Result<void> DisplayScene::update(const SceneContent& content, BuildProgress* pr
         updateVisibility(content);
     else
         rebuild(content, progress);
-    m_lights = content.lights;
-    m_light = content.light;
+    updateLight(content);
     std::string error = m_rays.takeError();
     if (progress && progress->is_given_up)
         error = "The scene was not built: it was given up.";
@@ -82,6 +83,16 @@ Result<void> DisplayScene::update(const SceneContent& content, BuildProgress* pr
         return {};
     clear();
     return Error{error};
+}
+
+void DisplayScene::updateLight(const SceneContent& content) {
+    m_lights = content.lights;
+    m_light = content.light;
+    m_surroundings = surroundingsOf(m_light, m_lights, m_whole_box);
+    if (m_surroundings != Surroundings::picture)
+        m_picture = nullptr;
+    else if (!m_picture || m_picture->picture() != m_light.picture)
+        m_picture = std::make_shared<const PictureLight>(m_light.picture);
 }
 
 bool DisplayScene::canKeep(const SceneContent& content) const {
@@ -274,9 +285,14 @@ void DisplayScene::updateVisibility(const SceneContent& content) {
 
 void DisplayScene::updateBoxes() {
     m_surface_box = KM_BoundingBox();
-    for (const MeshObject& object : m_meshes)
-        if (object.visible && object.mesh)
+    m_whole_box = KM_BoundingBox();
+    for (const MeshObject& object : m_meshes) {
+        if (!object.mesh)
+            continue;
+        m_whole_box.Union(object.box);
+        if (object.visible)
             m_surface_box.Union(object.box);
+    }
     m_box = m_surface_box;
     for (const SceneCurve& curve : m_curves)
         if (curve.visible)

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/display/MaterialCache.h"
+#include "engine/display/PictureLight.h"
 #include "engine/display/RayScene.h"
 #include "engine/scene/SceneContent.h"
 #include "ground/Result.h"
@@ -71,6 +72,12 @@ public:
     std::span<const ScenePoint> points() const { return m_points; }
     std::span<const KM_Light> lights() const { return m_lights; }
     const LightSettings& light() const { return m_light; }
+    /// What lies around, see surroundingsOf: studio, sky or picture.
+    Surroundings surroundings() const { return m_surroundings; }
+    /// Null unless a picture lies around.
+    const PictureLight* pictureLight() const { return m_picture.get(); }
+    /// Of all surfaces that can be drawn, shown or hidden, in the world.
+    const KM_BoundingBox& wholeBox() const { return m_whole_box; }
 
 private:
     using MeshCache = std::map<const KM_Mesh*, std::shared_ptr<const RayMesh>>;
@@ -80,6 +87,7 @@ private:
     void addMeshes(const SceneContent& content, const MeshCache& earlier, BuildProgress* progress);
     void updateVisibility(const SceneContent& content);
     void updateBoxes();
+    void updateLight(const SceneContent& content);
     void addMesh(const SceneMesh& object, const MeshCache& earlier);
     void choosePlaces(const SceneContent& content);
     void dropMeshesBeyondReach(const SceneContent& content);
@@ -99,8 +107,11 @@ private:
     std::vector<KM_UUID> m_out_of_range;
     std::vector<KM_Light> m_lights;
     LightSettings m_light;
+    Surroundings m_surroundings = Surroundings::sky;
+    std::shared_ptr<const PictureLight> m_picture;
     KM_3dPoint m_origin;
     double m_reach = HUGE_VAL; ///< how far from the origin rays may start
+    KM_BoundingBox m_whole_box;
     KM_BoundingBox m_box;
     KM_BoundingBox m_surface_box;
 };

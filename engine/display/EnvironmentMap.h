@@ -19,6 +19,17 @@ inline constexpr int floats = levels * channels * texels;
 inline constexpr int samples = 32;
 } // namespace environment_map
 
+/// A picture of all that lies around is kept the same way, once sharp and once for rough surfaces;
+/// channels follow each other.
+template <int texels_a_side> struct SquareMap {
+    static constexpr int side = texels_a_side; ///< texels without the border
+    static constexpr int stride = side + 2;
+    static constexpr int texels = stride * stride; ///< of one channel
+    static constexpr int floats = environment_map::channels * texels;
+};
+using PictureMap = SquareMap<1024>;
+using BroadMap = SquareMap<64>;
+
 /// The directions that a texel's light comes from, about (0, 0, 1), and how much each counts.
 struct EnvironmentSamples {
     float x[environment_map::samples];

@@ -1,7 +1,5 @@
 #include "engine/display/SkyModel.h"
 
-#include "kelmar/KM_Light.h"
-
 #include <algorithm>
 #include <cmath>
 
@@ -195,9 +193,7 @@ SoftBox overheadBox(const Sky& sky) {
     box.half_width_deg = 34.0F;
     box.half_height_deg = 34.0F;
     box.border = 0.5F;
-    const float bright =
-        0.2126F * sky.horizon.r + 0.7152F * sky.horizon.g + 0.0722F * sky.horizon.b;
-    box.color = scaled({1.0F, 0.985F, 0.96F}, 2.0F * bright);
+    box.color = scaled({1.0F, 0.985F, 0.96F}, 2.0F * brightnessOf(sky.horizon));
     return box;
 }
 
@@ -224,12 +220,18 @@ Lighting studioLighting(const CameraFrame& camera) {
     return lighting;
 }
 
-Lighting skyLighting(std::span<const KM_Light> lights, bool casts_shadows,
-                     const CameraFrame& camera) {
+std::vector<DirectionalLight> documentSuns(std::span<const KM_Light> lights, bool casts_shadows,
+                                           const CameraFrame& camera) {
     std::vector<DirectionalLight> suns;
     for (const KM_Light& light : lights)
         if (light.IsEnabled() && light.IsDirectionalLight())
             suns.push_back(sunOf(light, casts_shadows, camera));
+    return suns;
+}
+
+Lighting skyLighting(std::span<const KM_Light> lights, bool casts_shadows,
+                     const CameraFrame& camera) {
+    const auto suns = documentSuns(lights, casts_shadows, camera);
     if (suns.empty())
         return lightingWithoutSun(camera);
 

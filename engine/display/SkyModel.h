@@ -1,13 +1,14 @@
 #pragma once
 
+#include "engine/display/LampModel.h"
 #include "engine/images/ColorSpace.h"
 
 #include <span>
 #include <vector>
 
-class KM_Light;
-
 namespace quarn {
+
+class PictureLight;
 
 /// A light that shines everywhere from the same direction.
 struct DirectionalLight {
@@ -17,10 +18,14 @@ struct DirectionalLight {
 };
 
 /// Light from all sides that changes linearly with the direction in which a surface faces:
-/// channel c on a surface with unit normal n gets base[c] + slope[c] . n.
+/// channel c on a surface with unit normal n gets base[c] + slope[c] . n. Where that is too plain,
+/// square[c] times (x y, y z, 3 z^2 - 1, x z, x^2 - y^2) of the normal is added: R. Ramamoorthi and
+/// P. Hanrahan, "An Efficient Representation for Irradiance Environment Maps", SIGGRAPH 2001.
 struct AmbientLight {
     float base[3] = {0.0F, 0.0F, 0.0F};
     float slope[3][3] = {};
+    bool has_square = false;
+    float square[3][5] = {};
 };
 
 /// The sky's colours in scene light.
@@ -34,7 +39,7 @@ struct Sky {
     float toward_sun[3] = {0.0F, 0.0F, 1.0F};
 };
 
-/// A soft rectangle of light, far away: it is seen in mirrors.
+/// A soft rectangle of light, far away: surfaces are lit by it and mirror it.
 struct SoftBox {
     float toward[3] = {0.0F, 0.0F, 1.0F}; ///< unit vector to its middle, world coordinates
     float half_width_deg = 30.0F;         ///< level
@@ -50,6 +55,11 @@ struct Lighting {
     std::vector<DirectionalLight> suns;  ///< cast shadows as far as their `shadow` says
     Sky sky;
     std::vector<SoftBox> boxes;
+    std::vector<Lamp> lamps;
+    const PictureLight* picture = nullptr; ///< instead of sky and boxes; `ambient` follows from it
+    float picture_scale = 1.0F;            ///< from its numbers to scene light
+    /// All of this is multiplied by it already; what surfaces give off is not.
+    float exposure = 1.0F;
 };
 
 /// The camera frame's unit vectors in world coordinates.
@@ -67,9 +77,13 @@ Lighting studioLighting(const CameraFrame& camera);
 /// between day, dusk and night, and one below the horizon shines on nothing. At night a dim blue
 /// light keeps the model readable. Without a directional light a bright, even sky and a head light
 /// make the picture.
-/// @param lights         the lights that are on; other kinds than directional ones add nothing
+/// @param lights         the lights that are on; lamps add nothing
 /// @param casts_shadows  whether the suns are shadowed
 Lighting skyLighting(std::span<const KM_Light> lights, bool casts_shadows,
                      const CameraFrame& camera);
+
+/// The suns of a document: its directional lights, dark ones too.
+std::vector<DirectionalLight> documentSuns(std::span<const KM_Light> lights, bool casts_shadows,
+                                           const CameraFrame& camera);
 
 } // namespace quarn

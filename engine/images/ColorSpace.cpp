@@ -75,6 +75,10 @@ float sceneLightShownAs(float shown) {
            shoulder_height * std::log(1.0F - (value - shoulder_start) / shoulder_height);
 }
 
+float brightnessOf(const LinearColor& color) {
+    return 0.2126F * color.r + 0.7152F * color.g + 0.0722F * color.b;
+}
+
 LinearColor linearFromColor(const KM_Color& color) {
     return {linearFromSrgbByte(color.r), linearFromSrgbByte(color.g), linearFromSrgbByte(color.b)};
 }

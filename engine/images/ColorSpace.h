@@ -50,6 +50,9 @@ struct LinearColor {
     float b = 0.0F;
 };
 
+/// The luminance of linear light by ITU-R BT.709.
+float brightnessOf(const LinearColor& color);
+
 /// Linear light of an sRGB colour.
 LinearColor linearFromColor(const KM_Color& color);
 /// The scene light that is shown as this colour.

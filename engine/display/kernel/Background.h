@@ -1,6 +1,6 @@
 #pragma once
 
-#include "engine/display/kernel/RayPacket.h"
+#include "engine/display/kernel/SquareMaps.h"
 
 namespace quarn {
 namespace {
@@ -18,12 +18,15 @@ inline Lanes mixed(float from, float to, const Lanes& t) {
 }
 
 /// From the top of the picture to its bottom.
-inline LaneColors gradientColors(const FrameSetup& frame, const Lanes& y) {
+inline LaneColors gradient(const FrameSetup& frame, const Lanes& y, const float (&top)[3],
+                           const float (&bottom)[3]) {
     const Lanes s = clamped(y * (1.0F / static_cast<float>(frame.height)));
     const Lanes t = s * s * (Lanes(3.0F) - Lanes(2.0F) * s);
-    const float* const top = frame.background_top;
-    const float* const bottom = frame.background_bottom;
     return {mixed(top[0], bottom[0], t), mixed(top[1], bottom[1], t), mixed(top[2], bottom[2], t)};
+}
+
+inline LaneColors gradientColors(const FrameSetup& frame, const Lanes& y) {
+    return gradient(frame, y, frame.background_top, frame.background_bottom);
 }
 
 /// The sky without the sun's disc, in a direction of length 1 / scale. Zenith and horizon blend
@@ -65,8 +68,29 @@ inline LaneColors skyColors(const FrameSetup& frame, const RayPacket& packet) {
             sky.b + disc * frame.sky_disc[2]};
 }
 
+/// The picture of what lies around. A parallel view, whose rays all look the same way, shows of it
+/// what a camera with a usual lens would see.
+inline LaneColors pictureColors(const FrameSetup& frame, const RayPacket& packet) {
+    LaneVectors direction = packet.direction();
+    if (frame.rays.parallel) {
+        constexpr float opening = 0.7F;
+        const float step = opening / static_cast<float>(frame.height);
+        const Lanes right = (packet.x - 0.5F * static_cast<float>(frame.width)) * step;
+        const Lanes up = (Lanes(0.5F * static_cast<float>(frame.height)) - packet.y) * step;
+        const auto axis = [](const float(&a)[3]) { return LaneVectors{a[0], a[1], a[2]}; };
+        direction = along(along(direction, axis(frame.rays.camera_x), right),
+                          axis(frame.rays.camera_y), up);
+    }
+    return seenOnMap<PictureMap>(frame.picture.sharp, frame.picture.scale, direction);
+}
+
+/// What is seen where there is neither surface nor ground.
 inline LaneColors backgroundColors(const FrameSetup& frame, const RayPacket& packet) {
-    return frame.has_sky ? skyColors(frame, packet) : gradientColors(frame, packet.y);
+    if (frame.has_clear_background)
+        return {0.0F, 0.0F, 0.0F};
+    if (!frame.has_sky)
+        return gradientColors(frame, packet.y);
+    return frame.picture.sharp ? pictureColors(frame, packet) : skyColors(frame, packet);
 }
 
 } // namespace

@@ -39,11 +39,21 @@ inline LaneColors blurredLight(const FrameSetup& frame, const EnvironmentSamples
                                     axis(around.a.y, around.b.y, normal.y),
                                     axis(around.a.z, around.b.z, normal.z)};
         const LaneColors light = level == 1
-                                     ? surroundingLight(frame, direction)
-                                     : pictureAt(frame, LaneInts(level - 1), placeOnMap(direction));
+                                     ? broadLight(frame, direction)
+                                     : pictureAt(frame, LaneInts(level - 1),
+                                                 placeOnMap<environment_map::side>(direction));
         sum = {sum.r + light.r * weight, sum.g + light.g * weight, sum.b + light.b * weight};
     }
     return sum;
+}
+
+void findLightAround(const FrameSetup& frame, const float (&directions)[3][lane_count],
+                     float (&colors)[3][lane_count]) {
+    const LaneColors light =
+        broadLight(frame, {load(directions[0]), load(directions[1]), load(directions[2])});
+    store(colors[0], light.r);
+    store(colors[1], light.g);
+    store(colors[2], light.b);
 }
 
 void findEnvironment(const FrameSetup& frame, const EnvironmentSamples& samples, int level,

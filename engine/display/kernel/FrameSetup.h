@@ -38,6 +38,28 @@ struct FrameSoftBox {
 
 inline constexpr int max_soft_boxes = 4;
 
+/// A lamp: it shines from a place, less the farther away.
+struct FrameLamp {
+    float place[3]; ///< in the scene's coordinates
+    float color[3]; ///< scene light on a white surface that faces it from one unit away
+    float axis[3];  ///< where a spot shines to; of unit length
+    /// A spot's light is multiplied by the square of what this gives, moved into 0 to 1:
+    /// cone_slope * cosine of the angle to the axis + cone_base. Other lamps: 0 and 1.
+    float cone_slope;
+    float cone_base;
+    float least_square; ///< of the distance: nearer by, the light grows no more
+    float shadow;       ///< as FrameLight::shadow
+};
+
+inline constexpr int max_lamps = 32;
+
+/// A picture of what lies around, see PictureLight.
+struct FramePicture {
+    const float* sharp = nullptr; ///< PictureMap::floats numbers; null: there is no picture
+    const float* broad = nullptr; ///< its mean over larger parts, BroadMap::floats numbers
+    float scale = 1.0F;           ///< from its numbers to scene light
+};
+
 /// How layers of see-through surfaces cover what lies behind them.
 struct FrameLayers {
     int count = 1;             ///< how many surfaces a ray passes at most; 1: they are opaque
@@ -110,14 +132,21 @@ struct FrameSetup {
     bool has_mirrors = false;     ///< some of these mirror
     bool mirrors_scene = false;   ///< smooth ones show the scene itself, not only what lies around
 
+    /// The light that surfaces give off is to be multiplied by it; that of all lights here is.
+    float exposure = 1.0F;
     float ambient_base[3] = {0, 0, 0};
     float ambient_slope[3][3] = {};
+    bool has_ambient_square = false;
+    float ambient_square[3][5] = {}; ///< see AmbientLight
     int fixed_count = 0;
     FrameLight fixed[max_fixed_lights] = {};
     int sun_count = 0;
     FrameLight suns[max_suns] = {};
+    int lamp_count = 0;
+    FrameLamp lamps[max_lamps] = {};
 
     bool has_ground = false;
+    bool catches_shadows = false; ///< the ground looks as what is behind it, which shadows darken
     float ground_height = 0.0F;
     float ground_center[2] = {0, 0};
     float ground_fade_start = 0.0F; ///< distance from the centre
@@ -126,9 +155,12 @@ struct FrameSetup {
     float ground_light[3] = {0, 0, 0}; ///< that it sends where nothing shadows it
     float ground_eye = 0.0F;           ///< how high the middle of the scene is taken to lie over it
 
-    bool has_sky = false;
-    float background_top[3] = {1, 1, 1}; ///< without a sky
+    bool has_sky = false;              ///< what lies around is seen, else a background
+    bool has_clear_background = false; ///< pixels have an opacity; the background is black
+    float background_top[3] = {1, 1, 1};
     float background_bottom[3] = {1, 1, 1};
+    float shown_top[3] = {1, 1, 1}; ///< the background as it is shown, in linear light
+    float shown_bottom[3] = {1, 1, 1};
     float sky_horizon[3] = {1, 1, 1};
     float sky_side[3] = {0, 0, 0}; ///< see Sky
     float sky_zenith[3] = {1, 1, 1};
@@ -137,7 +169,8 @@ struct FrameSetup {
     float sky_disc[3] = {0, 0, 0};
     float toward_sun[3] = {0, 0, 1};
     int soft_box_count = 0;
-    FrameSoftBox soft_boxes[max_soft_boxes] = {}; ///< seen in mirrors alone
+    FrameSoftBox soft_boxes[max_soft_boxes] = {}; ///< not seen behind the scene
+    FramePicture picture;                         ///< instead of sky and soft boxes
     /// What surfaces mirror of what lies around, see EnvironmentMap.h; null when none does.
     float* environment = nullptr;
     const float* split_sum = nullptr; ///< SplitSum::entries()
@@ -196,6 +229,10 @@ struct RayKernel {
     /// Fills a row of picture `level` of `environment`, from 1 on; the one before must be whole.
     void (*find_environment)(const FrameSetup& frame, const EnvironmentSamples& samples, int level,
                              int row);
+    /// What rough surfaces see of all that lies around and of the ground in sixteen directions of
+    /// unit length; rows are x, y, z and r, g, b.
+    void (*find_light_around)(const FrameSetup& frame, const float (&directions)[3][lane_count],
+                              float (&colors)[3][lane_count]);
 };
 
 /// The loops for the instruction set in force (InstructionSet.h).

@@ -62,6 +62,7 @@ QUARN_LANES_OPERATOR(LaneInts, LaneInts, +)
 QUARN_LANES_OPERATOR(LaneInts, LaneInts, -)
 QUARN_LANES_OPERATOR(LaneInts, LaneInts, *)
 QUARN_LANES_OPERATOR(LaneInts, LaneInts, |)
+QUARN_LANES_OPERATOR(LaneInts, LaneInts, &)
 QUARN_LANES_OPERATOR(LaneInts, LaneMask, ==)
 QUARN_LANES_OPERATOR(LaneInts, LaneMask, !=)
 QUARN_LANES_OPERATOR(LaneInts, LaneMask, >)
@@ -247,6 +248,9 @@ inline LaneColors operator+(const LaneColors& a, const LaneColors& b) {
 inline LaneColors blended(const LaneColors& under, const LaneColors& over, const Lanes& weight) {
     return {under.r + weight * (over.r - under.r), under.g + weight * (over.g - under.g),
             under.b + weight * (over.b - under.b)};
+}
+inline Lanes mean(const LaneColors& a) {
+    return (a.r + a.g + a.b) * (1.0F / 3.0F);
 }
 inline LaneColors uniformColor(const float (&c)[3]) {
     return {c[0], c[1], c[2]};

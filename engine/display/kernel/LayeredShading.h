@@ -48,8 +48,9 @@ inline void keepLayer(const FrameSetup& frame, const RayPacket& packet, int laye
 
 /// Lays one surface after the other under what was seen so far.
 /// @param packet  holds the first of `hits`, and `surfaces` what they are
+/// @param cover   see shadeOpaque
 inline LaneColors shadeLayers(const FrameSetup& frame, RayPacket& packet, LayerHits& hits,
-                              SurfaceLanes& surfaces) {
+                              SurfaceLanes& surfaces, Lanes* cover) {
     const LaneMask active = packet.active;
     LaneColors left{1.0F, 1.0F, 1.0F}; // what still comes through
     LaneColors sum{0.0F, 0.0F, 0.0F};
@@ -70,6 +71,8 @@ inline LaneColors shadeLayers(const FrameSetup& frame, RayPacket& packet, LayerH
         readSurfaces(frame, packet, surfaces);
     }
     packet.active = active;
+    if (cover)
+        *cover = Lanes(1.0F) - mean(left);
     const LaneColors behind = backgroundColors(frame, packet);
     return {sum.r + left.r * behind.r, sum.g + left.g * behind.g, sum.b + left.b * behind.b};
 }

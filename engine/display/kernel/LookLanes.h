@@ -16,8 +16,8 @@ struct LookLanes {
     LaneVectors coat_normal; ///< as that of the surface without its map, or by one of its own
 };
 
-inline LaneColors emissionOf(const LookNumbers<Lanes>& look) {
-    return {look.emission[0], look.emission[1], look.emission[2]};
+inline LaneColors emissionOf(const FrameSetup& frame, const LookNumbers<Lanes>& look) {
+    return LaneColors{look.emission[0], look.emission[1], look.emission[2]} * frame.exposure;
 }
 
 constexpr int look_number_count = sizeof(LookNumbers<float>) / sizeof(float);

@@ -22,8 +22,8 @@ inline LaneColors shadeMatt(const FrameSetup& frame, const RayPacket& packet,
                             const LaneMask& lit) {
     LaneColors light = skyLight(frame, packet, surfaces, lit) * look.occlusion;
     addFixedLights(frame, surfaces.normal, light);
-    addSuns(frame, packet, surfaces, lit, light, [](const auto&...) {});
-    return surfaces.albedo * light + emissionOf(look);
+    addLights(frame, packet, surfaces, lit, light, [](const auto&...) {});
+    return surfaces.albedo * light + emissionOf(frame, look);
 }
 
 LaneColors shadeLooks(const FrameSetup& frame, const RayPacket& packet, SurfaceLanes surfaces,

@@ -82,12 +82,11 @@ inline void findMirrors(const FrameSetup& frame, const RayPacket& packet, const 
 constexpr float least_spread = 0.015F;
 
 /// The highlight of a light of color 1, beside what a white surface that faces it sends.
-
-inline LaneColors highlight(const MirrorLanes& mirrors, const float (&toward)[3]) {
+inline LaneColors highlight(const MirrorLanes& mirrors, const LaneVectors& toward) {
     const Lanes facing = greatest(dot(mirrors.normal, toward), 0.0F);
     const LaneVectors half =
-        ofUnitLength({mirrors.observer.x + toward[0], mirrors.observer.y + toward[1],
-                      mirrors.observer.z + toward[2]});
+        ofUnitLength({mirrors.observer.x + toward.x, mirrors.observer.y + toward.y,
+                      mirrors.observer.z + toward.z});
     const Lanes spread = greatest(mirrors.roughness * mirrors.roughness, least_spread);
     const Lanes square = spread * spread;
     const Lanes cosine = clamped(dot(mirrors.normal, half));

@@ -37,7 +37,7 @@ inline MirrorLayers mirrorLayers(const FrameSetup& frame, const RayPacket& packe
     return layers;
 }
 
-/// What the suns' light does on a surface.
+/// What the light of suns and lamps does on a surface.
 struct SunnyLanes {
     LaneColors scattered; ///< on a white surface
     LaneColors spots;
@@ -49,15 +49,14 @@ inline SunnyLanes sunlight(const FrameSetup& frame, const RayPacket& packet,
                            const LaneMask& lit) {
     const LaneColors black{0.0F, 0.0F, 0.0F};
     SunnyLanes sunny{black, black, black};
-    addSuns(frame, packet, surfaces, lit, sunny.scattered,
-            [&](const FrameLight& sun, const Lanes& facing, const Lanes& arriving) {
-                const LaneColors light = uniformColor(sun.color) * arriving;
-                sunny.spots = sunny.spots + highlight(layers.base, sun.toward) * light;
-                if (layers.has_coat)
-                    sunny.coat_spots =
-                        sunny.coat_spots + highlight(layers.coat, sun.toward) *
-                                               (light * select(facing > 0.0F, 1.0F, 0.0F));
-            });
+    addLights(frame, packet, surfaces, lit, sunny.scattered,
+              [&](const LaneColors& light, const LaneVectors& toward, const Lanes& facing) {
+                  sunny.spots = sunny.spots + highlight(layers.base, toward) * light;
+                  if (layers.has_coat)
+                      sunny.coat_spots =
+                          sunny.coat_spots + highlight(layers.coat, toward) *
+                                                 (light * select(facing > 0.0F, 1.0F, 0.0F));
+              });
     return sunny;
 }
 
@@ -98,7 +97,7 @@ inline LaneColors shadeMirrors(const FrameSetup& frame, const RayPacket& packet,
     LaneColors sent = entering * (Lanes(1.0F) - look.transmission) * light +
                       base.first * mirroredLight(frame, packet, surfaces, base,
                                                  sending & ~layers.coated, look.occlusion) +
-                      base.further * sky + sunny.spots + emissionOf(look);
+                      base.further * sky + sunny.spots + emissionOf(frame, look);
     LaneColors passing{0.0F, 0.0F, 0.0F};
     if (any(look.transmission > 0.0F)) {
         passing = entering * LaneColors{look.passing[0], look.passing[1], look.passing[2]};

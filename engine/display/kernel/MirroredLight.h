@@ -40,7 +40,7 @@ inline LaneColors sceneInMirrors(const FrameSetup& frame, RayPacket& rays,
     SurfaceLanes met;
     readSurfaces(frame, rays, met);
     Lanes weight = 0.0F;
-    if (frame.has_ground)
+    if (mirrorsGround(frame))
         weight = meetGround(frame, rays, met).weight;
     weight = select(rays.hit, Lanes(1.0F), weight);
     if (frame.has_see_through)

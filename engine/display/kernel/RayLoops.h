@@ -27,6 +27,21 @@ inline LaneInts encoded(const FrameSetup& frame, const LaneColors& color) {
            LaneInts(static_cast<std::int32_t>(0xFF000000U));
 }
 
+/// Pixels with an opacity of their own, whose colour is not multiplied by it.
+/// @param color  what is seen before black
+/// @param cover  how opaque it is
+[[gnu::noinline]] LaneInts encodedBeforeNothing(const FrameSetup& frame, const LaneColors& color,
+                                                const Lanes& cover) {
+    // What glass mirrors is seen, too, where it lets everything through.
+    const Lanes brightest = greatest(greatest(color.r, color.g), color.b);
+    const Lanes opacity = clamped(greatest(cover, brightest));
+    const LaneInts alpha = wholePart(opacity * 255.0F + 0.5F);
+    const LaneMask seen = alpha > LaneInts(0);
+    const LaneInts opaque = encoded(frame, color * (Lanes(1.0F) / select(seen, opacity, 1.0F)));
+    const LaneInts shown = (opaque & LaneInts(0xFFFFFF)) | shiftedLeft(alpha, 24);
+    return select(seen, shown, LaneInts(0));
+}
+
 struct TracedPacket {
     LaneInts pixels;
     LaneInts objects;
@@ -50,8 +65,24 @@ inline TracedPacket firstMet(const FrameSetup& frame, const RayPacket& packet,
     hits.next(frame, packet, 0.0F);
     SurfaceLanes surfaces;
     TracedPacket traced = firstMet(frame, packet, surfaces);
-    traced.pixels = encoded(frame, shadeLayers(frame, packet, hits, surfaces));
+    if (frame.has_clear_background) {
+        Lanes cover;
+        const LaneColors color = shadeLayers(frame, packet, hits, surfaces, &cover);
+        traced.pixels = encodedBeforeNothing(frame, color, cover);
+    } else {
+        traced.pixels = encoded(frame, shadeLayers(frame, packet, hits, surfaces, nullptr));
+    }
     return traced;
+}
+
+/// What rays that met surfaces see before a clear background.
+[[gnu::noinline]] LaneInts shadeBeforeNothing(const FrameSetup& frame, RayPacket& packet,
+                                              SurfaceLanes& surfaces, Lanes& nearness) {
+    Lanes cover;
+    const LaneColors color = frame.has_see_through
+                                 ? shadeThroughPanes(frame, packet, surfaces, nearness, &cover)
+                                 : shadeOpaque(frame, packet, surfaces, nullptr, &cover);
+    return encodedBeforeNothing(frame, color, cover);
 }
 
 /// Shoots the packet's rays and finds the colours that they see.
@@ -62,8 +93,11 @@ inline TracedPacket trace(const FrameSetup& frame, RayPacket& packet) {
     intersect(frame, packet);
     SurfaceLanes surfaces;
     TracedPacket traced = firstMet(frame, packet, surfaces);
-    if (frame.has_see_through)
-        traced.pixels = encoded(frame, shadeThroughPanes(frame, packet, surfaces, traced.nearness));
+    if (frame.has_clear_background)
+        traced.pixels = shadeBeforeNothing(frame, packet, surfaces, traced.nearness);
+    else if (frame.has_see_through)
+        traced.pixels =
+            encoded(frame, shadeThroughPanes(frame, packet, surfaces, traced.nearness, nullptr));
     else
         traced.pixels = encoded(frame, shadeOpaque(frame, packet, surfaces));
     return traced;
@@ -152,7 +186,7 @@ void traceSamples(const FrameSetup& frame, SamplePacket& samples) {
 } // namespace
 
 extern const RayKernel QUARN_RAY_KERNEL;
-const RayKernel QUARN_RAY_KERNEL{QUARN_RAY_KERNEL_NAME, traceBlock,     traceSamples, findSteps,
-                                 findFreeSky,           findEnvironment};
+const RayKernel QUARN_RAY_KERNEL{QUARN_RAY_KERNEL_NAME, traceBlock,      traceSamples,   findSteps,
+                                 findFreeSky,           findEnvironment, findLightAround};
 
 } // namespace quarn

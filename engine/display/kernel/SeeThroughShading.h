@@ -25,19 +25,24 @@ inline void goOn(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfa
 /// @param packet    holds the first hits
 /// @param nearness  of the first hits; takes that of the last surface which each ray met, so that
 ///   lines are seen through panes
+/// @param cover     see shadeOpaque
 [[gnu::noinline]] inline LaneColors shadeThroughPanes(const FrameSetup& frame, RayPacket& packet,
-                                                      SurfaceLanes& surfaces, Lanes& nearness) {
+                                                      SurfaceLanes& surfaces, Lanes& nearness,
+                                                      Lanes* cover) {
     const LaneMask active = packet.active;
     LaneColors left{1.0F, 1.0F, 1.0F}; // what still comes through
     LaneColors sum{0.0F, 0.0F, 0.0F};
+    Lanes covered = 1.0F;
     for (int pane = 0;; ++pane) {
         const Lanes opacity = pane < most_panes ? paneOpacities(frame, packet, surfaces) : 1.0F;
         const Lanes near = nearnessOf(frame, packet);
         const LaneMask hit = packet.hit;
         LaneColors through{0.0F, 0.0F, 0.0F};
-        const LaneColors shaded = shadeOpaque(frame, packet, surfaces, &through);
+        const LaneColors shaded = shadeOpaque(frame, packet, surfaces, &through, cover);
         const LaneColors part = left * select(packet.active, opacity, 0.0F);
         sum = sum + part * shaded;
+        if (cover)
+            covered = covered - mean(part) * (Lanes(1.0F) - *cover);
         left = left - part;
         if (pane + 1 < most_panes)
             left = left + part * through;
@@ -52,6 +57,8 @@ inline void goOn(const FrameSetup& frame, RayPacket& packet, SurfaceLanes& surfa
     }
     store(packet.rays.ray.tnear, 0.0F);
     packet.active = active;
+    if (cover)
+        *cover = covered;
     return sum;
 }
 

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/display/kernel/OpenSky.h"
+#include "engine/display/kernel/SquareMaps.h"
 
 namespace quarn {
 namespace {
@@ -11,12 +12,6 @@ struct SkyNeighbours {
     LaneInts row;
     Lanes weight; ///< of the four on all sides, together 1
 };
-
-inline LaneInts limited(const LaneInts& a, int greatest_value) {
-    const LaneInts from_0 = select(a > LaneInts(0), a, LaneInts(0));
-    const LaneInts last(greatest_value);
-    return select(from_0 > last, last, from_0);
-}
 
 /// @param dx, dy  0 or 1: left or right, above or below
 inline SkyNeighbours skyNeighbours(const FrameSetup& frame, const RayPacket& packet, int dx,

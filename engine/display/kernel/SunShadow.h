@@ -49,8 +49,8 @@ inline void liftTurnedAway(const FrameSetup& frame, const RayPacket& packet,
     }
 }
 
-/// The part of the sun's light that arrives where see-through surfaces may stand before it.
-[[gnu::noinline]] inline Lanes throughPanes(const FrameSetup& frame, const FrameLight& sun,
+/// The part of a light that arrives where see-through surfaces may stand before it.
+[[gnu::noinline]] inline Lanes throughPanes(const FrameSetup& frame, float shadow,
                                             const LaneMask& look, RTCRay16& ray) {
     PassingLight light;
     rtcInitIntersectContext(&light.context);
@@ -63,7 +63,47 @@ inline void liftTurnedAway(const FrameSetup& frame, const RayPacket& packet,
     for (int i = 0; i < lane_count; ++i)
         passed[i] = light.passed[i];
     const Lanes kept_off = select(load(ray.tfar) < 0.0F, Lanes(1.0F), Lanes(1.0F) - load(passed));
-    return select(look, Lanes(1.0F) - kept_off * sun.shadow, 1.0F);
+    return select(look, Lanes(1.0F) - kept_off * shadow, 1.0F);
+}
+
+/// Where shadow rays start.
+struct ShadowStart {
+    LaneMask look; ///< the lanes that look toward the light
+    Lanes distance;
+    LaneVectors place;
+};
+
+/// @param lanes  those whose places are asked for; to begin with all of them look
+inline ShadowStart shadowStart(const RayPacket& packet, const LaneMask& lanes) {
+    const Lanes t = select(lanes, packet.distance, 0.0F);
+    return {lanes, t, along(packet.origin(), packet.direction(), t)};
+}
+
+/// Looks toward a light.
+/// @param shadow  how much of it is kept off where something stands before it
+/// @param toward  unit vectors
+/// @param reach   how far away the light is
+/// @return the part of it that arrives
+inline Lanes lightArriving(const FrameSetup& frame, float shadow, const RayPacket& packet,
+                           const SurfaceLanes& surfaces, const ShadowStart& start,
+                           const LaneVectors& toward, const Lanes& reach) {
+    const LaneMask& look = start.look;
+    RTCRay16 ray;
+    prepare(ray);
+    setOrigin(ray,
+              along(start.place, surfaces.face, shadowOffset(frame, start.distance, start.place)));
+    setDirection(ray, toward);
+    store(ray.tfar, select(look, reach, no_distance));
+    const LaneMask turned_away = packet.hit & look & (dot(surfaces.face, toward) < Lanes(0.25F));
+    if (any(turned_away))
+        liftTurnedAway(frame, packet, surfaces, bits(turned_away), ray);
+    // Not coherent: occlusion packets of partly masked rays do not end there in Embree 3.13.
+    if (frame.has_see_through)
+        return throughPanes(frame, shadow, look, ray);
+    RTCIntersectContext context;
+    rtcInitIntersectContext(&context);
+    rtcOccluded16(look.data(), frame.scene, &context, &ray);
+    return select(look & (load(ray.tfar) < 0.0F), 1.0F - shadow, 1.0F);
 }
 
 /// Looks from the lit lanes toward the sun.
@@ -74,28 +114,12 @@ inline Lanes sunlightArriving(const FrameSetup& frame, const FrameLight& sun,
                               const LaneMask& lit, const Lanes& facing) {
     if (!frame.scene || sun.shadow <= 0.0F)
         return 1.0F;
-    const LaneMask wanted = lit & (facing > 0.0F);
-    const Lanes t = select(wanted, packet.distance, 0.0F);
-    const LaneVectors place = along(packet.origin(), packet.direction(), t);
-    const LaneMask look = wanted & reachesScene(frame, sun, place);
-    if (!any(look))
+    ShadowStart start = shadowStart(packet, lit & (facing > 0.0F));
+    start.look = start.look & reachesScene(frame, sun, start.place);
+    if (!any(start.look))
         return 1.0F;
-    RTCRay16 ray;
-    prepare(ray);
-    setOrigin(ray, along(place, surfaces.face, shadowOffset(frame, t, place)));
-    setDirection(ray, {sun.toward[0], sun.toward[1], sun.toward[2]});
-    store(ray.tfar, select(look, unlimited, no_distance));
-    const LaneMask turned_away =
-        packet.hit & look & (dot(surfaces.face, sun.toward) < Lanes(0.25F));
-    if (any(turned_away))
-        liftTurnedAway(frame, packet, surfaces, bits(turned_away), ray);
-    // Not coherent: occlusion packets of partly masked rays do not end there in Embree 3.13.
-    if (frame.has_see_through)
-        return throughPanes(frame, sun, look, ray);
-    RTCIntersectContext context;
-    rtcInitIntersectContext(&context);
-    rtcOccluded16(look.data(), frame.scene, &context, &ray);
-    return select(look & (load(ray.tfar) < 0.0F), 1.0F - sun.shadow, 1.0F);
+    return lightArriving(frame, sun.shadow, packet, surfaces, start,
+                         {sun.toward[0], sun.toward[1], sun.toward[2]}, unlimited);
 }
 
 } // namespace

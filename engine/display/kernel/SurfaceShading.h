@@ -1,15 +1,33 @@
 #pragma once
 
+#include "engine/display/kernel/LampLight.h"
 #include "engine/display/kernel/SkyGrid.h"
 
 namespace quarn {
 namespace {
 
+/// What changes with the square of the normal.
+inline LaneColors ambientSquares(const FrameSetup& frame, const LaneVectors& n) {
+    const Lanes terms[5] = {n.x * n.y, n.y * n.z, n.z * n.z * 3.0F - 1.0F, n.x * n.z,
+                            n.x * n.x - n.y * n.y};
+    const auto channel = [&](int c) {
+        Lanes sum = 0.0F;
+        for (int i = 0; i < 5; ++i)
+            sum = sum + terms[i] * frame.ambient_square[c][i];
+        return sum;
+    };
+    return {channel(0), channel(1), channel(2)};
+}
+
+/// The light from all around on surfaces that nothing hides it from.
 inline LaneColors ambientLight(const FrameSetup& frame, const LaneVectors& normal) {
     const auto channel = [&](int c) {
         return dot(normal, frame.ambient_slope[c]) + frame.ambient_base[c];
     };
-    return {channel(0), channel(1), channel(2)};
+    const LaneColors light{channel(0), channel(1), channel(2)};
+    if (!frame.has_ambient_square)
+        return light;
+    return light + ambientSquares(frame, normal);
 }
 
 inline void addLight(const float (&color)[3], const Lanes& amount, LaneColors& light) {
@@ -35,18 +53,23 @@ inline void addFixedLights(const FrameSetup& frame, const LaneVectors& normal, L
     }
 }
 
-/// Adds the light of the suns.
-/// @param also  is called with each sun, the cosine to it and the part of its light that arrives
+/// Adds the light that shadows keep off: of suns and lamps.
+/// @param also  is called for each with its light that arrives, unit vectors to it and the cosine
+///   to these
 template <class Also>
-inline void addSuns(const FrameSetup& frame, const RayPacket& packet, const SurfaceLanes& surfaces,
-                    const LaneMask& lit, LaneColors& light, const Also& also) {
+inline void addLights(const FrameSetup& frame, const RayPacket& packet,
+                      const SurfaceLanes& surfaces, const LaneMask& lit, LaneColors& light,
+                      const Also& also) {
     for (int k = 0; k < frame.sun_count; ++k) {
         const FrameLight& sun = frame.suns[k];
         const Lanes facing = greatest(dot(surfaces.normal, sun.toward), 0.0F);
         const Lanes arriving = sunlightArriving(frame, sun, packet, surfaces, lit, facing);
         addLight(sun.color, facing * arriving, light);
-        also(sun, facing, arriving);
+        also(uniformColor(sun.color) * arriving,
+             LaneVectors{sun.toward[0], sun.toward[1], sun.toward[2]}, facing);
     }
+    if (frame.lamp_count > 0)
+        addLamps(frame, packet, surfaces, lit, light, also);
 }
 
 /// The light that diffuse surfaces send to the observer, in the lanes of `lit`.
@@ -54,7 +77,7 @@ inline LaneColors shadeSurfaces(const FrameSetup& frame, const RayPacket& packet
                                 const SurfaceLanes& surfaces, const LaneMask& lit) {
     LaneColors light = skyLight(frame, packet, surfaces, lit);
     addFixedLights(frame, surfaces.normal, light);
-    addSuns(frame, packet, surfaces, lit, light, [](const auto&...) {});
+    addLights(frame, packet, surfaces, lit, light, [](const auto&...) {});
     return {surfaces.albedo.r * light.r, surfaces.albedo.g * light.g, surfaces.albedo.b * light.b};
 }
 

@@ -1,6 +1,5 @@
 #pragma once
 
-#include "engine/display/EnvironmentMap.h"
 #include "engine/display/kernel/Background.h"
 #include "engine/display/kernel/SurfaceShading.h"
 
@@ -31,66 +30,55 @@ inline Lanes softBoxAround(const FrameSoftBox& box, const LaneVectors& direction
                   0.0F);
 }
 
-/// The light that comes from far away in a direction of unit length. The suns are not in it: they
-/// are lights of their own.
-inline LaneColors surroundingLight(const FrameSetup& frame, const LaneVectors& direction) {
+/// The light that comes from far away in a direction of unit length, as if there were no ground.
+/// The suns are not in it: they are lights of their own.
+inline LaneColors lightAround(const FrameSetup& frame, const LaneVectors& direction) {
+    if (frame.picture.sharp)
+        return seenOnMap<PictureMap>(frame.picture.sharp, frame.picture.scale, direction);
     const Lanes toward_sun = dot(direction, frame.toward_sun);
     LaneColors light = skyWithoutDisc(frame, direction, 1.0F, direction.z, toward_sun);
     for (int i = 0; i < frame.soft_box_count; ++i) {
         const FrameSoftBox& box = frame.soft_boxes[i];
         addLight(box.color, softBoxAround(box, direction), light);
     }
-    if (!frame.has_ground)
+    return light;
+}
+
+/// True where mirrors show the ground. A picture of what lies around has its own.
+inline bool mirrorsGround(const FrameSetup& frame) {
+    return frame.has_ground && !frame.picture.sharp;
+}
+
+/// Lays the ground, as it is seen from the middle of the scene, over what lies around.
+inline LaneColors aboveGround(const FrameSetup& frame, const LaneVectors& direction,
+                              const LaneColors& light) {
+    if (!mirrorsGround(frame))
         return light;
     return blended(light, uniformColor(frame.ground_light), groundAround(frame, direction));
 }
 
-/// A place on the pictures of an environment map: between four texels.
-struct MapPlace {
-    LaneInts texel; ///< the one at the upper left
-    Lanes right;
-    Lanes below;
-};
-
-inline MapPlace placeOnMap(const LaneVectors& d) {
-    constexpr float half = 0.5F * environment_map::side;
-    const Lanes scale = Lanes(1.0F) / (magnitude(d.x) + magnitude(d.y) + magnitude(d.z));
-    const Lanes u = d.x * scale;
-    const Lanes v = d.y * scale;
-    const LaneMask folded = d.z < 0.0F;
-    const Lanes x =
-        select(folded, withSignOf(greatest(Lanes(1.0F) - magnitude(v), 0.0F), u), u) * half +
-        (half + 0.5F);
-    const Lanes y =
-        select(folded, withSignOf(greatest(Lanes(1.0F) - magnitude(u), 0.0F), v), v) * half +
-        (half + 0.5F);
-    // Whatever the direction is, nothing but the map is read.
-    const LaneInts column = limited(wholePart(x), environment_map::side);
-    const LaneInts row = limited(wholePart(y), environment_map::side);
-    return {row * LaneInts(environment_map::stride) + column, x - floatsOf(column),
-            y - floatsOf(row)};
+/// The light that comes from far away and from the ground in a direction of unit length. The suns
+/// are not in it.
+inline LaneColors surroundingLight(const FrameSetup& frame, const LaneVectors& direction) {
+    return aboveGround(frame, direction, lightAround(frame, direction));
 }
 
-/// @param first  of each lane the first texel of the channel
-inline Lanes channelAt(const float* map, const LaneInts& first, const MapPlace& place) {
-    const auto* const from = reinterpret_cast<const std::uint32_t*>(map);
-    const LaneInts at = first + place.texel;
-    const auto texel = [&](int offset) { return floatsWith(gathered(from + offset, at)); };
-    constexpr int below = environment_map::stride;
-    const Lanes upper_left = texel(0);
-    const Lanes lower_left = texel(below);
-    const Lanes upper = upper_left + place.right * (texel(1) - upper_left);
-    const Lanes lower = lower_left + place.right * (texel(below + 1) - lower_left);
-    return upper + place.below * (lower - upper);
+/// The same for surfaces that are rough enough not to tell apart what lies side by side.
+inline LaneColors broadLight(const FrameSetup& frame, const LaneVectors& direction) {
+    if (!frame.picture.broad)
+        return surroundingLight(frame, direction);
+    return aboveGround(frame, direction,
+                       seenOnMap<BroadMap>(frame.picture.broad, frame.picture.scale, direction));
 }
 
-/// The light of picture `level`, from 1 on.
+/// The light of picture `level` of the environment map, from 1 on.
 inline LaneColors pictureAt(const FrameSetup& frame, const LaneInts& level, const MapPlace& place) {
     constexpr int texels = environment_map::texels;
+    constexpr int stride = environment_map::stride;
     const LaneInts first = (level - LaneInts(1)) * LaneInts(environment_map::channels * texels);
-    return {channelAt(frame.environment, first, place),
-            channelAt(frame.environment + texels, first, place),
-            channelAt(frame.environment + 2 * texels, first, place)};
+    return {channelAt(frame.environment, stride, first, place),
+            channelAt(frame.environment + texels, stride, first, place),
+            channelAt(frame.environment + 2 * texels, stride, first, place)};
 }
 
 /// The light from around as a surface of some roughness mirrors it.
@@ -100,7 +88,7 @@ inline LaneColors mirroredSurroundings(const FrameSetup& frame, const LaneVector
     const Lanes level = roughness * static_cast<float>(environment_map::levels);
     const LaneInts whole = limited(wholePart(level), environment_map::levels - 1);
     const Lanes part = level - floatsOf(whole);
-    const MapPlace place = placeOnMap(direction);
+    const MapPlace place = placeOnMap<environment_map::side>(direction);
     const LaneColors rougher = pictureAt(frame, whole + LaneInts(1), place);
     const LaneMask is_sharp = whole == LaneInts(0);
     LaneColors sharper = pictureAt(frame, select(is_sharp, LaneInts(1), whole), place);
