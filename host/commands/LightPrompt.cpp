@@ -50,7 +50,7 @@ CQuarnCommand::result askPicture(const CQuarnCommandContext& context, DocumentDr
         return asked;
     std::error_code error;
     file = std::filesystem::absolute(file, error);
-    if (const Result<void> is_read = drawing.readSurroundings(file); !is_read)
+    if (const Result<void> is_read = drawing.light().readSurroundings(file); !is_read)
         return fail(is_read.message());
     choice.picture = file;
     return CQuarnCommand::success;

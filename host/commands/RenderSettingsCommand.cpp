@@ -125,7 +125,7 @@ RenderSettingsSources sourcesFor(const CQuarnCommandContext& context, Document& 
         return chooseSurroundings(context, present);
     };
     sources.read_picture = [&document](const std::filesystem::path& file) {
-        return document.drawing().readSurroundings(surroundingsFile(document, file));
+        return document.drawing().light().readSurroundings(surroundingsFile(document, file));
     };
     return sources;
 }

@@ -94,11 +94,10 @@ CQuarnCommand::result askWish(const CQuarnCommandContext& context, const StoredA
 Result<FrameScene> sunAtFrame(const StoredAnimation& animation, int frame) {
     FrameScene scene;
     scene.viewport = animation.view->viewport();
-    SceneChanges::Sun sun;
-    sun.replaced_light = animation.record->LightIndex();
+    KM_Light sun;
     const auto found = acrossBorder([&] {
         return animation.access->AnimatedSunAtFrame(animation.view->document().face(),
-                                                    *animation.record, frame + 1, sun.light);
+                                                    *animation.record, frame + 1, sun);
     });
     if (!found || !found.value())
         return Error{"The sun of frame " + std::to_string(frame) +

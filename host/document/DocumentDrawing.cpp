@@ -1,7 +1,6 @@
 #include "host/document/DocumentDrawing.h"
 
 #include "engine/render/Renderer.h"
-#include "engine/scene/UnitLength.h"
 #include "host/document/Document.h"
 #include "host/document/DocumentScene.h"
 
@@ -11,47 +10,13 @@
 
 namespace quarn {
 
-DocumentDrawing::DocumentDrawing(const Document& document) : m_document(document) {}
+DocumentDrawing::DocumentDrawing(const Document& document)
+    : m_document(document), m_light(document) {}
 
 DocumentDrawing::~DocumentDrawing() = default;
 
 void DocumentDrawing::release() {
     m_scene.reset();
-}
-
-bool DocumentDrawing::isSunStudy(const SceneChanges& changes) const {
-    return changes.sun || (!m_document.sun().isEnabled() && m_document.lights().hasStudySun());
-}
-
-std::vector<KM_Light> DocumentDrawing::shiningLights(const SceneChanges& changes) const {
-    const LightStore& table = m_document.lights();
-    const int replaced = changes.sun ? changes.sun->replaced_light : LightStore::no_index;
-    std::vector<KM_Light> lights = table.shiningLights(
-        isSunStudy(changes) ? ShiningLights::of_plug_ins : ShiningLights::all, replaced);
-    if (changes.sun && LightStore::canShine(changes.sun->light))
-        lights.push_back(changes.sun->light);
-    if (const auto sun = m_document.sun().light(); sun && !changes.sun)
-        lights.insert(lights.begin(), *sun);
-    return lights;
-}
-
-LightSettings DocumentDrawing::lightSettings(const SceneChanges& changes) {
-    const LightChoice& choice = m_document.renderWindow().settings.light;
-    LightSettings settings;
-    settings.surroundings = choice.surroundings;
-    if (choice.surroundings == Surroundings::picture)
-        settings.picture = m_surroundings.pictureFor(m_document, choice.picture);
-    if (settings.surroundings == Surroundings::picture && !settings.picture)
-        settings.surroundings = Surroundings::automatic;
-    if (settings.surroundings == Surroundings::automatic && isSunStudy(changes))
-        settings.surroundings = Surroundings::sky;
-    settings.exposure = choice.exposure;
-    settings.background = choice.background;
-    settings.background_color = choice.background_color;
-    settings.has_ground = choice.has_ground;
-    if (const double metres = metresPerUnit(m_document.units()); metres > 0.0)
-        settings.metres_per_unit = metres;
-    return settings;
 }
 
 Result<void> DocumentDrawing::update(const SceneChanges& changes) {

@@ -1,10 +1,9 @@
 #pragma once
 
-#include "engine/scene/LightSettings.h"
 #include "ground/Result.h"
+#include "host/document/DocumentLight.h"
 #include "host/document/RangeWarnings.h"
 #include "host/document/SceneChanges.h"
-#include "host/document/SurroundingsFile.h"
 
 #include <functional>
 #include <memory>
@@ -66,31 +65,17 @@ public:
     /// Tells which objects are out of range, of which no scene need be built.
     void tellObjectsOutOfRange();
 
-    /// The lights that shine now: the sun, when it is on, and the lights of the table.
-    ///
-    /// In a sun study the lights of the document rest: the sun of the study shines alone. A study
-    /// is drawn where `changes` has its sun, and while a plug-in has one in the table with the
-    /// document's own sun off.
-    std::vector<KM_Light> shiningLights(const SceneChanges& changes = {}) const;
-    /// What the scene is lit by beside them, and what it stands before and on. A picture of the
-    /// surroundings is read where it was not yet; one that cannot be read is told once.
-    LightSettings lightSettings(const SceneChanges& changes = {});
-    /// Reads the picture of surroundings that a document is to be given.
-    /// @param file  absolute
-    /// @return an error in a sentence where it cannot be read
-    Result<void> readSurroundings(const std::filesystem::path& file) {
-        return m_surroundings.read(file);
-    }
+    /// What the document is lit by.
+    DocumentLight& light() { return m_light; }
 
 private:
-    bool isSunStudy(const SceneChanges& changes) const;
     Result<void> update(const SceneChanges& changes);
     Error memoryLacks(const char* how, int width_px, int height_px);
 
     const Document& m_document;
     std::unique_ptr<DocumentScene> m_scene; ///< null until something is drawn
     ObjectRangeWarning m_object_warning;
-    SurroundingsPicture m_surroundings;
+    DocumentLight m_light;
     bool m_showed_scene = true;
 };
 

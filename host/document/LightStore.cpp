@@ -45,7 +45,7 @@ int LightStore::add(const KM_Light& light) {
 int LightStore::addOfPlugIn(const KM_Light& light) {
     const int index = add(light);
     if (index != no_index)
-        m_of_plug_ins.insert(index);
+        m_last_of_plug_in = index;
     return index;
 }
 
@@ -54,25 +54,23 @@ void LightStore::addDeletedUpTo(int count) {
 }
 
 bool LightStore::remove(int index) {
-    m_of_plug_ins.erase(index);
     return m_live.erase(index) > 0;
 }
 
-std::vector<KM_Light> LightStore::shiningLights(ShiningLights which, int but) const {
+std::vector<KM_Light> LightStore::shiningLights() const {
     std::vector<KM_Light> lights;
-    for (const auto& [index, slot] : m_live) {
-        const bool counts = which == ShiningLights::all || m_of_plug_ins.contains(index);
-        if (counts && index != but && slot.Light().IsEnabled())
+    for (const auto& [index, slot] : m_live)
+        if (slot.Light().IsEnabled())
             lights.push_back(slot.Light());
-    }
     return lights;
 }
 
-bool LightStore::hasStudySun() const {
-    return std::ranges::any_of(m_of_plug_ins, [this](int index) {
-        const KM_Light& light = at(index).Light();
-        return light.IsEnabled() && light.Style() == KM_LightStyle::world_directional;
-    });
+std::optional<KM_Light> LightStore::studySun() const {
+    const CQuarnLight& slot = at(m_last_of_plug_in);
+    const KM_Light& light = slot.Light();
+    const bool is_sun =
+        !slot.IsDeleted() && light.IsEnabled() && light.Style() == KM_LightStyle::world_directional;
+    return is_sun ? std::optional(light) : std::nullopt;
 }
 
 } // namespace quarn

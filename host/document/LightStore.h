@@ -3,16 +3,10 @@
 #include "sdk/qncore/QnLightTable.h"
 
 #include <map>
-#include <set>
+#include <optional>
 #include <vector>
 
 namespace quarn {
-
-/// Which of the lights that are there and on shine.
-enum class ShiningLights {
-    all,
-    of_plug_ins, ///< those that plug-ins put there since the document was opened
-};
 
 /// The lights of a document. Slots of deleted lights stay, so that an index that was handed out
 /// never means another light; they take no memory and no time, as a sun study leaves one a frame.
@@ -49,11 +43,10 @@ public:
     const std::map<int, CQuarnLight>& live() const { return m_live; }
 
     /// The lights that are there and switched on.
-    /// @param but  index of one that is left out; an index without a slot leaves out none
-    std::vector<KM_Light> shiningLights(ShiningLights which = ShiningLights::all,
-                                        int but = no_index) const;
-    /// Whether a plug-in has put a light there that shines from one direction, as a sun does.
-    bool hasStudySun() const;
+    std::vector<KM_Light> shiningLights() const;
+    /// The light that a plug-in put there last, while it is there, if it is on and shines from one
+    /// direction, as the sun of a study does. Nothing where there is none.
+    std::optional<KM_Light> studySun() const;
 
     /// From now on every call of a plug-in is a breach.
     void close() { m_is_open = false; }
@@ -64,7 +57,7 @@ public:
 
 private:
     std::map<int, CQuarnLight> m_live;
-    std::set<int> m_of_plug_ins; ///< indices of live ones
+    int m_last_of_plug_in = no_index;
     int m_slot_count = 0;
     CQuarnLight m_no_light = deletedLight();
     CQuarnLightTable m_face;

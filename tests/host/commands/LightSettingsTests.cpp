@@ -82,8 +82,8 @@ TEST_F(LightSettingsTest, APictureIsReadBeforeItIsTaken) {
     const std::wstring file = pictureFile(flatRadiance(1, 1, {{128, 0, 0, ONE}}));
     ASSERT_EQ(set(L"Light Picture " + file), CQuarnCommand::success) << printed();
     EXPECT_EQ(light().picture, folder / "sky.hdr");
-    ASSERT_TRUE(document().drawing().lightSettings().picture);
-    EXPECT_EQ(document().drawing().lightSettings().picture->rgb[0], 1.0F);
+    ASSERT_TRUE(document().drawing().light().settings().picture);
+    EXPECT_EQ(document().drawing().light().settings().picture->rgb[0], 1.0F);
     ASSERT_EQ(set(L"Light Studio"), CQuarnCommand::success);
     const LightChoice before = light();
     EXPECT_EQ(set(L"Light Picture " + pictureFile("no picture")), CQuarnCommand::failure);

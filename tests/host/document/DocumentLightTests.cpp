@@ -19,7 +19,7 @@ using testing::Not;
 class DocumentLight : public DocumentTest {
 protected:
     LightChoice& choice() { return document.renderWindow().settings.light; }
-    LightSettings settings() { return document.drawing().lightSettings(); }
+    LightSettings settings() { return document.drawing().light().settings(); }
     /// Chooses a picture of one pixel, which is as red as this.
     void choosePicture(std::uint8_t red) {
         writeFile(picture, flatRadiance(1, 1, {{red, 0, 0, ONE}}));
@@ -74,7 +74,7 @@ TEST_F(DocumentLight, APictureIsReadOnceAndAgainWhenItsFileChanges) {
 TEST_F(DocumentLight, APictureThatIsMissingIsToldOnceAndTheLightIsTheAutomaticOne) {
     choosePicture(128);
     std::filesystem::remove(picture);
-    EXPECT_EQ(settings().surroundings, Surroundings::automatic);
+    EXPECT_EQ(settings().surroundings, Surroundings::sky);
     EXPECT_THAT(printed(), HasSubstr("Cannot read the picture " + picture.string()));
     EXPECT_THAT(printed(), HasSubstr("Until it can be read the light is the automatic one."));
     const std::string told = printed();
@@ -118,13 +118,42 @@ TEST_F(DocumentLight, APictureThatWasMovedWithItsDocumentIsFoundBesideIt) {
     EXPECT_EQ(settings().picture->rgb[0], 0.5F) << "where it was chosen it is preferred";
 }
 
+TEST_F(DocumentLight, AProductStandsInAStudioWithoutTheSunAndABuildingUnderTheSkyWithIt) {
+    addBox(document, {0, 0, 0}, {1, 1, 1});
+    EXPECT_EQ(settings().surroundings, Surroundings::studio);
+    EXPECT_TRUE(document.drawing().light().shiningLights().empty());
+    addBox(document, {0, 0, 0}, {1, 20, 1});
+    EXPECT_EQ(settings().surroundings, Surroundings::sky);
+    EXPECT_EQ(document.drawing().light().shiningLights().size(), 1U);
+    choice().surroundings = Surroundings::studio;
+    EXPECT_TRUE(document.drawing().light().shiningLights().empty()) << "the sun is the sky's";
+}
+
+TEST_F(DocumentLight, WhatIsHiddenCountsSoThatTheLightStaysThroughoutAFilm) {
+    addBox(document, {0, 0, 0}, {1, 20, 1});
+    document.objects().setVisible(document.objects().objects()[0]->id, false);
+    EXPECT_EQ(settings().surroundings, Surroundings::sky);
+}
+
+TEST_F(DocumentLight, WhoMovesTheSunHasTheSky) {
+    addBox(document, {0, 0, 0}, {1, 1, 1});
+    document.sun().beginChange();
+    document.sun().setDirectionToSun({0, 0, 1});
+    EXPECT_EQ(settings().surroundings, Surroundings::sky);
+    EXPECT_EQ(document.drawing().light().shiningLights().size(), 1U);
+    document.sun().setEnabled(false);
+    EXPECT_EQ(settings().surroundings, Surroundings::studio);
+}
+
 TEST_F(DocumentLight, ASunStudyStandsUnderTheSkyUnlessAnotherLightIsChosen) {
+    addBox(document, {0, 0, 0}, {1, 1, 1});
     SceneChanges study;
     study.sun.emplace();
-    EXPECT_EQ(settings().surroundings, Surroundings::automatic);
-    EXPECT_EQ(document.drawing().lightSettings(study).surroundings, Surroundings::sky);
+    DocumentLight& light = document.drawing().light();
+    EXPECT_EQ(light.settings().surroundings, Surroundings::studio);
+    EXPECT_EQ(light.settings(study).surroundings, Surroundings::sky);
     choice().surroundings = Surroundings::studio;
-    EXPECT_EQ(document.drawing().lightSettings(study).surroundings, Surroundings::studio);
+    EXPECT_EQ(light.settings(study).surroundings, Surroundings::studio);
 }
 
 } // namespace
