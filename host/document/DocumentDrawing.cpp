@@ -22,8 +22,8 @@ void DocumentDrawing::release() {
 Result<void> DocumentDrawing::update(const SceneChanges& changes) {
     if (!m_scene)
         m_scene = std::make_unique<DocumentScene>();
-    const auto updated = m_scene->update(m_document.objects(), shiningLights(changes),
-                                         lightSettings(changes), changes.hidden);
+    const auto updated = m_scene->update(m_document.objects(), m_light.shiningLights(changes),
+                                         m_light.settings(changes), changes.hidden);
     if (updated)
         m_object_warning.tell(m_document, m_scene->display().outOfRange());
     return updated;

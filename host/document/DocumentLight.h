@@ -3,6 +3,7 @@
 #include "engine/scene/LightSettings.h"
 #include "host/document/SceneChanges.h"
 #include "host/document/SurroundingsFile.h"
+#include "kelmar/KM_BoundingBox.h"
 
 #include <cstdint>
 #include <optional>
