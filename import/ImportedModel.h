@@ -77,7 +77,7 @@ struct ImportedModel {
     std::vector<ImportedCurve> curves;
     KM_3dPointArray points;
     std::vector<ImportedCamera> cameras;
-    std::vector<KM_Light> lights;        ///< switched off, in world coordinates
+    std::vector<KM_Light> lights;        ///< in world coordinates
     UnitSystem units = UnitSystem::none; ///< of the coordinates, where the format defines them
     TakenUpAxis up;
     std::optional<ImportedPlace> place;

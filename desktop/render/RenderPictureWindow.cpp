@@ -1,5 +1,6 @@
 #include "desktop/render/RenderPictureWindow.h"
 
+#include "desktop/front_end/ShownImage.h"
 #include "desktop/render/PictureSheet.h"
 #include "desktop/texts/Texts.h"
 
@@ -23,18 +24,6 @@ namespace {
 
 constexpr int FAREWELL_MS = 400;
 constexpr qint64 LONG_RENDERING_MS = 500;
-
-/// Rows follow each other without gaps; the fourth byte of a pixel says nothing.
-QImage copyOf(const ShownPicture& picture) {
-    constexpr int bytes_per_pixel = 4;
-    const qint64 bytes = qint64(picture.width_px) * picture.height_px * bytes_per_pixel;
-    if (picture.width_px <= 0 || picture.height_px <= 0 ||
-        static_cast<qint64>(picture.rgba.size()) < bytes)
-        return {};
-    const QImage shared(picture.rgba.data(), picture.width_px, picture.height_px,
-                        picture.width_px * bytes_per_pixel, QImage::Format_RGBX8888);
-    return shared.copy();
-}
 
 } // namespace
 
@@ -110,7 +99,7 @@ QWidget* RenderPictureWindow::makeFoot() {
 }
 
 void RenderPictureWindow::showPicture(const ShownPicture& picture) {
-    const QImage image = copyOf(picture);
+    const QImage image = imageOf(picture);
     if (image.isNull()) {
         m_sheet->setPicture({});
         m_farewell.start(FAREWELL_MS);

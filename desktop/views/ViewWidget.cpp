@@ -1,5 +1,6 @@
 #include "desktop/views/ViewWidget.h"
 
+#include "desktop/front_end/ShownImage.h"
 #include "desktop/texts/Texts.h"
 #include "desktop/views/PicturePlace.h"
 
@@ -36,12 +37,6 @@ QIcon cornerIcon(bool is_four) {
         painter.drawLine(QLineF(6, 16, 26, 16));
     }
     return pixmap;
-}
-
-QImage copyOf(const ShownPicture& picture) {
-    const QImage borrowed(picture.rgba.data(), picture.width_px, picture.height_px,
-                          qsizetype{picture.width_px} * 4, QImage::Format_RGBX8888);
-    return borrowed.convertToFormat(QImage::Format_RGB32);
 }
 
 } // namespace
@@ -94,7 +89,7 @@ void ViewWidget::setMaximized(bool is_maximized) {
 }
 
 void ViewWidget::setPicture(const ShownPicture& picture) {
-    m_picture = copyOf(picture);
+    m_picture = imageOf(picture);
     update();
 }
 

@@ -7,7 +7,8 @@
 
 namespace quarn {
 
-/// A picture of 8-bit sRGB pixels. Rows run from the top of the picture to its bottom.
+/// A picture of 8-bit sRGB pixels: red, green, blue and opacity, by which the colours are not
+/// multiplied. Rows run from the top of the picture to its bottom.
 struct Image {
     int width = 0;                  ///< pixels
     int height = 0;                 ///< pixels

@@ -16,6 +16,11 @@ namespace quarn {
 
 enum class ImageFormat { jpeg, png, bmp, tga };
 
+/// Whether pictures of a format may be see-through.
+constexpr bool holdsOpacity(ImageFormat format) {
+    return format == ImageFormat::png || format == ImageFormat::tga;
+}
+
 /// The format that an extension stands for, ignoring case: jpg, jpeg, png, bmp, tga. The extension
 /// may have its dot. Nothing for any other.
 std::optional<ImageFormat> imageFormatFor(std::string_view extension);
@@ -35,8 +40,9 @@ struct ImageView {
 /// The quality of JPEG pictures, from 1 to 100, where nobody chooses another one.
 inline constexpr int STANDARD_JPEG_QUALITY = 90;
 
-/// Turns a picture into the bytes of an image file. All formats are written with 24 bits a pixel;
-/// opacity is left out. JPEG has full colour resolution. BMP and TGA are not compressed.
+/// Turns a picture into the bytes of an image file, with 24 bits a pixel; PNG and TGA of a picture
+/// that is see-through somewhere with 32, the last 8 its opacity, which JPEG and BMP leave out.
+/// JPEG has full colour resolution. BMP and TGA are not compressed.
 /// @param jpeg_quality  1 to 100; of no account to the other formats
 /// @return why the picture cannot be encoded, a part of a sentence: it is empty, its size and its
 ///   pixels disagree, or a side is longer than the format allows (65500 for JPEG, 65535 for TGA)

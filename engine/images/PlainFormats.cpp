@@ -1,5 +1,7 @@
 #include "engine/images/PlainFormats.h"
 
+#include "engine/images/Opacity.h"
+
 #include <cstdint>
 
 namespace quarn {
@@ -24,7 +26,8 @@ private:
     std::vector<std::byte>& m_bytes;
 };
 
-void appendRowsFromBottom(const ImageView& image, std::size_t row_bytes,
+/// @param pixel_bytes  3, or 4 with the opacity
+void appendRowsFromBottom(const ImageView& image, std::size_t pixel_bytes, std::size_t row_bytes,
                           std::vector<std::byte>& bytes) {
     const auto width = static_cast<std::size_t>(image.width);
     const auto height = static_cast<std::size_t>(image.height);
@@ -33,10 +36,12 @@ void appendRowsFromBottom(const ImageView& image, std::size_t row_bytes,
     for (std::size_t row = 0; row < height; ++row) {
         const std::uint8_t* pixel = image.rgba.data() + 4 * width * (height - 1 - row);
         std::byte* target = bytes.data() + begin + row_bytes * row;
-        for (std::size_t x = 0; x < width; ++x, pixel += 4, target += 3) {
+        for (std::size_t x = 0; x < width; ++x, pixel += 4, target += pixel_bytes) {
             target[0] = static_cast<std::byte>(pixel[2]);
             target[1] = static_cast<std::byte>(pixel[1]);
             target[2] = static_cast<std::byte>(pixel[0]);
+            if (pixel_bytes > 3)
+                target[3] = static_cast<std::byte>(pixel[3]);
         }
     }
 }
@@ -68,7 +73,7 @@ Result<void> encodeBmp(const ImageView& image, std::vector<std::byte>& bytes) {
     out.put32(pixels_per_metre);
     out.put32(0); // no palette
     out.put32(0);
-    appendRowsFromBottom(image, row_bytes, bytes);
+    appendRowsFromBottom(image, 3, row_bytes, bytes);
     return {};
 }
 
@@ -76,6 +81,7 @@ Result<void> encodeTga(const ImageView& image, std::vector<std::byte>& bytes) {
     if (image.width > 0xFFFF || image.height > 0xFFFF) {
         return Error{"a TGA picture has at most 65535 pixels a side"};
     }
+    const std::uint32_t opacity_bits = isSeeThrough(image) ? 8 : 0;
     LittleEndianWriter out(bytes);
     out.put8(0); // no text before the pixels
     out.put8(0); // no palette
@@ -86,9 +92,11 @@ Result<void> encodeTga(const ImageView& image, std::vector<std::byte>& bytes) {
     out.put16(0); // origin
     out.put16(static_cast<std::uint32_t>(image.width));
     out.put16(static_cast<std::uint32_t>(image.height));
-    out.put8(24); // bits a pixel
-    out.put8(0);  // rows from the bottom, no opacity
-    appendRowsFromBottom(image, 3 * static_cast<std::size_t>(image.width), bytes);
+    out.put8(24 + opacity_bits); // bits a pixel
+    out.put8(opacity_bits);      // rows from the bottom
+    const std::size_t pixel_bytes = opacity_bits > 0 ? 4 : 3;
+    appendRowsFromBottom(image, pixel_bytes, pixel_bytes * static_cast<std::size_t>(image.width),
+                         bytes);
     return {};
 }
 

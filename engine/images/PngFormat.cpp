@@ -1,5 +1,8 @@
 #include "engine/images/PngFormat.h"
 
+#include "engine/images/Opacity.h"
+
+#include <algorithm>
 #include <memory>
 #include <new>
 #include <spng.h>
@@ -26,12 +29,13 @@ int appendBytes(spng_ctx*, void* target, void* source, std::size_t count) {
     return 0;
 }
 
-int begin(spng_ctx* context, const ImageView& image, std::vector<std::byte>& bytes) {
+int begin(spng_ctx* context, const ImageView& image, bool has_opacity,
+          std::vector<std::byte>& bytes) {
     spng_ihdr header{};
     header.width = static_cast<std::uint32_t>(image.width);
     header.height = static_cast<std::uint32_t>(image.height);
     header.bit_depth = 8;
-    header.color_type = SPNG_COLOR_TYPE_TRUECOLOR;
+    header.color_type = has_opacity ? SPNG_COLOR_TYPE_TRUECOLOR_ALPHA : SPNG_COLOR_TYPE_TRUECOLOR;
     int failure = spng_set_png_stream(context, appendBytes, &bytes);
     failure = failure ? failure : spng_set_ihdr(context, &header);
     failure =
@@ -43,17 +47,15 @@ int begin(spng_ctx* context, const ImageView& image, std::vector<std::byte>& byt
                                        SPNG_ENCODE_PROGRESSIVE | SPNG_ENCODE_FINALIZE);
 }
 
-int encodeRows(spng_ctx* context, const ImageView& image) {
+int encodeRows(spng_ctx* context, const ImageView& image, bool has_opacity) {
     const auto width = static_cast<std::size_t>(image.width);
-    std::vector<std::uint8_t> row(3 * width);
+    const std::size_t channels = has_opacity ? 4 : 3;
+    std::vector<std::uint8_t> row(channels * width);
     const std::uint8_t* pixel = image.rgba.data();
     int failure = 0;
     for (int y = 0; y < image.height && failure == 0; ++y) {
-        for (std::size_t x = 0; x < width; ++x, pixel += 4) {
-            row[3 * x] = pixel[0];
-            row[3 * x + 1] = pixel[1];
-            row[3 * x + 2] = pixel[2];
-        }
+        for (std::size_t x = 0; x < width; ++x, pixel += 4)
+            std::copy_n(pixel, channels, &row[channels * x]);
         failure = spng_encode_row(context, row.data(), row.size());
     }
     return failure == SPNG_EOI ? 0 : failure;
@@ -66,8 +68,9 @@ Result<void> encodePng(const ImageView& image, std::vector<std::byte>& bytes) {
     if (context == nullptr) {
         return Error{"there is not enough memory"};
     }
-    int failure = begin(context.get(), image, bytes);
-    failure = failure ? failure : encodeRows(context.get(), image);
+    const bool has_opacity = isSeeThrough(image);
+    int failure = begin(context.get(), image, has_opacity, bytes);
+    failure = failure ? failure : encodeRows(context.get(), image, has_opacity);
     return failure ? Result<void>(Error{spng_strerror(failure)}) : Result<void>();
 }
 

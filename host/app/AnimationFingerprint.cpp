@@ -51,6 +51,7 @@ std::string settingsMark(const KM_3dmAnimationProperties& record, const Recordin
     const RenderSettings& render = document.renderWindow().settings;
     sum.add(record.RenderFull() ? render.samples : 0);
     sum.add(record.RenderPreview() ? render.preview_samples : 0);
+    addLight(document.drawing().light().settings(), sum);
     sum.add(document.edgesOf(record.DisplayMode()));
     addPoints(record.CameraPoints(), sum);
     addPoints(record.TargetPoints(), sum);

@@ -5,6 +5,7 @@
 #include "host/app/AnimationFingerprint.h"
 #include "host/app/Application.h"
 #include "host/app/FrameNoter.h"
+#include "host/app/PictureOpacity.h"
 #include "host/border/Border.h"
 #include "host/document/DisplayModeList.h"
 #include "host/document/Document.h"
@@ -95,6 +96,7 @@ RecordingPlan planOf(const KM_3dmAnimationProperties& record, Document& document
     };
     plan.choice = application.takeNextRecording();
     plan.overwrites = application.options().overwrites;
+    plan.refusal = whyNotSeeThrough(document, plan.settings.extension).value_or("");
     return plan;
 }
 

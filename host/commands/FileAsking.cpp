@@ -35,6 +35,8 @@ const wchar_t* titleFor(FileUse use) {
         return QnLocalizeString(L"Load a plug-in", 42507);
     case FileUse::save_film:
         return QnLocalizeString(L"Save the film", 42765);
+    case FileUse::surroundings:
+        return QnLocalizeString(L"Choose a picture of the surroundings", 42917);
     case FileUse::run:
         break;
     }
@@ -107,6 +109,8 @@ std::vector<FileKind> kindsFor(FileUse use) {
         return {{QnLocalizeString(L"Plug-ins", 42518), {"qnp"}}, allFiles()};
     case FileUse::save_film:
         return films();
+    case FileUse::surroundings:
+        return {{QnLocalizeString(L"Radiance pictures", 42918), {"hdr"}}, allFiles()};
     case FileUse::run:
         break;
     }

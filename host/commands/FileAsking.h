@@ -24,6 +24,7 @@ enum class FileUse {
     load_plug_in,
     run,
     save_film,
+    surroundings,
 };
 
 /// The folder that choosers show first where nothing else is offered: that of the document at work,

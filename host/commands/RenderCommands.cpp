@@ -1,5 +1,7 @@
 #include "engine/images/ImageFile.h"
+#include "engine/images/Opacity.h"
 #include "host/app/Application.h"
+#include "host/app/PictureOpacity.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileAsking.h"
 #include "host/commands/HostCommands.h"
@@ -71,6 +73,9 @@ CQuarnCommand::result runSaveRenderWindowAs(const CQuarnCommandContext& context)
         askFile(context, FileUse::save_rendering, QnLocalizeString(L"Image file", 42201), file);
     if (asked != CQuarnCommand::success)
         return asked;
+    if (isSeeThrough(window.picture))
+        if (const auto why = whyHoldsNoOpacity(file.extension().string()))
+            return fail(*why);
     Application& application = *Application::current();
     if (!application.mayWrite(file)) {
         document.list().noteUnsavedPicture("The picture was not written.");

@@ -1,11 +1,26 @@
 #pragma once
 
+#include "ground/Result.h"
 #include "host/document/RenderSettings.h"
+#include "sdk/qncore/QnComboBox.h"
 #include "sdk/qncore/QnDialog.h"
+
+#include <functional>
 
 namespace quarn {
 
-/// Asks for the size and the samples of rendered pictures. A button fills in the size of the view.
+/// What the form of the render settings takes from outside.
+struct RenderSettingsSources {
+    int view_width_px = 0; ///< of the view that is rendered
+    int view_height_px = 0;
+    /// Lets the person choose a picture of surroundings; empty where none was chosen.
+    std::function<std::filesystem::path(const std::filesystem::path& present)> choose_picture;
+    /// Reads one; an error in a sentence where it cannot be read.
+    std::function<Result<void>(const std::filesystem::path& file)> read_picture;
+};
+
+/// Asks for the size and the samples of rendered pictures, and for the light. Buttons fill in the
+/// size of the view and a picture of surroundings. An empty exposure is automatic.
 class RenderSettingsForm final : public CDialog {
 public:
     static constexpr int form_id = 4202;
@@ -15,20 +30,37 @@ public:
         view_size_id = 4303,
         samples_id = 4304,
         preview_samples_id = 4305,
+        light_id = 4306,
+        picture_id = 4307,
+        choose_picture_id = 4308,
+        exposure_id = 4309,
+        background_id = 4310,
+        color_id = 4311,
+        ground_id = 4312,
     };
+    enum state : int { on = 0, off = 1 };
 
-    /// @param view_width_px, view_height_px  the size of the view that is rendered
-    RenderSettingsForm(const RenderSettings& present, int view_width_px, int view_height_px);
+    RenderSettingsForm(const RenderSettings& present, RenderSettingsSources sources);
 
     RenderSettings settings;
 
 protected:
     void DoDataExchange(CQnDialogExchange& exchange) override;
+    int OnInitDialog() override;
     void OnButton(int control) override;
 
 private:
-    int m_view_width_px;
-    int m_view_height_px;
+    void exchangeLight(CQnDialogExchange& exchange);
+    void exchangePicture(CQnDialogExchange& exchange);
+    void exchangeExposure(CQnDialogExchange& exchange);
+    void exchangeColor(CQnDialogExchange& exchange);
+    void fillInViewSize();
+    void choosePicture();
+
+    RenderSettingsSources m_sources;
+    CComboBox m_light;
+    CComboBox m_background;
+    CComboBox m_ground;
 };
 
 } // namespace quarn

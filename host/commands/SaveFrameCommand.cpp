@@ -2,6 +2,7 @@
 #include "engine/images/ImageFile.h"
 #include "ground/PathText.h"
 #include "host/app/Application.h"
+#include "host/app/PictureOpacity.h"
 #include "host/border/Border.h"
 #include "host/commands/CommandEnd.h"
 #include "host/commands/FileAsking.h"
@@ -56,12 +57,14 @@ CQuarnCommand::result askFrame(const KM_3dmAnimationProperties& record, FrameWis
 }
 
 /// Why no picture can be written there, as far as that is seen before one is drawn.
-Result<void> checkImageFile(const std::filesystem::path& file) {
+Result<void> checkImageFile(const Document& document, const std::filesystem::path& file) {
     const std::string name = textFromPath(file).ToUtf8();
     if (!imageFormatFor(file.extension().string()))
         return Error{"Cannot write " + name +
                      ": no image format has this extension. Give a file that ends in .jpg, .jpeg, "
                      ".png, .bmp or .tga."};
+    if (const auto why = whyNotSeeThrough(document, file.extension().string()))
+        return Error{*why};
     const std::filesystem::path folder = file.has_parent_path() ? file.parent_path() : ".";
     std::error_code error;
     if (!std::filesystem::is_directory(folder, error))
@@ -75,7 +78,7 @@ CQuarnCommand::result askImageFile(const CQuarnCommandContext& context, FrameWis
         askFile(context, FileUse::save_frame, QnLocalizeString(L"Image file", 42201), wish.file);
     if (asked != CQuarnCommand::success)
         return asked;
-    const auto checked = checkImageFile(wish.file);
+    const auto checked = checkImageFile(Document::of(context.Document()), wish.file);
     return checked ? CQuarnCommand::success : fail(checked.message());
 }
 
@@ -91,11 +94,10 @@ CQuarnCommand::result askWish(const CQuarnCommandContext& context, const StoredA
 Result<FrameScene> sunAtFrame(const StoredAnimation& animation, int frame) {
     FrameScene scene;
     scene.viewport = animation.view->viewport();
-    SceneChanges::Sun sun;
-    sun.replaced_light = animation.record->LightIndex();
+    KM_Light sun;
     const auto found = acrossBorder([&] {
         return animation.access->AnimatedSunAtFrame(animation.view->document().face(),
-                                                    *animation.record, frame + 1, sun.light);
+                                                    *animation.record, frame + 1, sun);
     });
     if (!found || !found.value())
         return Error{"The sun of frame " + std::to_string(frame) +

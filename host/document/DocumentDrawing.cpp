@@ -10,7 +10,8 @@
 
 namespace quarn {
 
-DocumentDrawing::DocumentDrawing(const Document& document) : m_document(document) {}
+DocumentDrawing::DocumentDrawing(const Document& document)
+    : m_document(document), m_light(document) {}
 
 DocumentDrawing::~DocumentDrawing() = default;
 
@@ -18,27 +19,11 @@ void DocumentDrawing::release() {
     m_scene.reset();
 }
 
-std::vector<KM_Light> DocumentDrawing::shiningLights() const {
-    std::vector<KM_Light> lights = m_document.lights().shiningLights();
-    if (const auto sun = m_document.sun().light())
-        lights.insert(lights.begin(), *sun);
-    return lights;
-}
-
-std::vector<KM_Light> DocumentDrawing::shiningLights(const SceneChanges& changes) const {
-    if (!changes.sun)
-        return shiningLights();
-    std::vector<KM_Light> lights = m_document.lights().shiningLights(changes.sun->replaced_light);
-    if (LightStore::canShine(changes.sun->light))
-        lights.push_back(changes.sun->light);
-    return lights;
-}
-
 Result<void> DocumentDrawing::update(const SceneChanges& changes) {
     if (!m_scene)
         m_scene = std::make_unique<DocumentScene>();
-    const auto updated =
-        m_scene->update(m_document.objects(), shiningLights(changes), changes.hidden);
+    const auto updated = m_scene->update(m_document.objects(), m_light.shiningLights(changes),
+                                         m_light.settings(changes), changes.hidden);
     if (updated)
         m_object_warning.tell(m_document, m_scene->display().outOfRange());
     return updated;

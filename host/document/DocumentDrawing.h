@@ -1,6 +1,7 @@
 #pragma once
 
 #include "ground/Result.h"
+#include "host/document/DocumentLight.h"
 #include "host/document/RangeWarnings.h"
 #include "host/document/SceneChanges.h"
 
@@ -64,17 +65,17 @@ public:
     /// Tells which objects are out of range, of which no scene need be built.
     void tellObjectsOutOfRange();
 
-    /// The lights that shine now: the sun, when it is on, and the lights of the table.
-    std::vector<KM_Light> shiningLights() const;
+    /// What the document is lit by.
+    DocumentLight& light() { return m_light; }
 
 private:
-    std::vector<KM_Light> shiningLights(const SceneChanges& changes) const;
     Result<void> update(const SceneChanges& changes);
     Error memoryLacks(const char* how, int width_px, int height_px);
 
     const Document& m_document;
     std::unique_ptr<DocumentScene> m_scene; ///< null until something is drawn
     ObjectRangeWarning m_object_warning;
+    DocumentLight m_light;
     bool m_showed_scene = true;
 };
 

@@ -33,11 +33,12 @@ Result<void> DocumentScene::build(BuildProgress& progress) {
 }
 
 Result<void> DocumentScene::update(const ObjectTable& objects, std::span<const KM_Light> lights,
-                                   std::span<const KM_UUID> hidden) {
+                                   const LightSettings& light, std::span<const KM_UUID> hidden) {
     if (m_content.revision != objects.revision())
         takeObjects(objects);
     takeVisibility(objects, hidden);
     m_content.lights.assign(lights.begin(), lights.end());
+    m_content.light = light;
     return m_display.update(m_content);
 }
 

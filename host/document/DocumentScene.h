@@ -32,10 +32,12 @@ public:
 
     /// Takes over what changed since the last call: everything when an object was added, removed
     /// or changed, else the lights and what is shown or hidden.
+    /// @param lights  that shine
+    /// @param light   beside them
     /// @param hidden  objects that are not shown although they are visible
     /// @return an error when the scene cannot be built
     Result<void> update(const ObjectTable& objects, std::span<const KM_Light> lights,
-                        std::span<const KM_UUID> hidden = {});
+                        const LightSettings& light = {}, std::span<const KM_UUID> hidden = {});
 
     /// What was built of large meshes of another scene need not be built again by the next update.
     void shareWith(const DocumentScene& other) { m_display.shareWith(other.m_display); }

@@ -26,6 +26,8 @@ public:
 
     bool isEnabled() const { return m_state.enabled; }
     const KM_3dVector& directionToSun() const { return m_state.direction_to_sun; }
+    /// Whether it stands elsewhere than a new one.
+    bool wasMoved() const { return m_state.direction_to_sun != State().direction_to_sun; }
 
     /// Opens a change; changes nest, and each must be ended.
     void beginChange();

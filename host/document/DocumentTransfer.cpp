@@ -2,6 +2,8 @@
 #include "host/document/file/DocumentContent.h"
 #include "host/document/file/FileRemainder.h"
 
+#include <utility>
+
 namespace quarn {
 
 namespace {
@@ -88,8 +90,12 @@ DocumentContent Document::contentWithoutObjects() const {
         content.cameras.push_back({camera.name, camera.viewport});
     for (const auto& [display_mode, choice] : m_edges)
         content.edges.push_back({display_mode, choice});
-    if (m_render_window.settings != RenderSettings())
-        content.rendering = m_render_window.settings;
+    RenderSettings pictures = m_render_window.settings;
+    const LightChoice light = std::exchange(pictures.light, {});
+    if (pictures != RenderSettings())
+        content.rendering = pictures;
+    if (light != LightChoice())
+        content.light = light;
     content.settings.light_slots = m_lights.count();
     for (const auto& [index, slot] : m_lights.live())
         content.lights.push_back({index, slot.Light()});
@@ -105,6 +111,7 @@ std::vector<std::string> Document::openContent(const DocumentContent& content) {
     for (const EdgesContent& edges : content.edges)
         setEdgesOf(edges.display_mode, edges.choice);
     m_render_window.settings = content.rendering.value_or(RenderSettings());
+    m_render_window.settings.light = content.light.value_or(LightChoice());
     for (const LightContent& light : content.lights) {
         m_lights.addDeletedUpTo(light.index);
         m_lights.add(light.light);

@@ -42,6 +42,13 @@ int LightStore::add(const KM_Light& light) {
     return m_slot_count++;
 }
 
+int LightStore::addOfPlugIn(const KM_Light& light) {
+    const int index = add(light);
+    if (index != no_index)
+        m_last_of_plug_in = index;
+    return index;
+}
+
 void LightStore::addDeletedUpTo(int count) {
     m_slot_count = std::max(m_slot_count, std::min(count, most_slots));
 }
@@ -50,12 +57,20 @@ bool LightStore::remove(int index) {
     return m_live.erase(index) > 0;
 }
 
-std::vector<KM_Light> LightStore::shiningLights(int but) const {
+std::vector<KM_Light> LightStore::shiningLights() const {
     std::vector<KM_Light> lights;
     for (const auto& [index, slot] : m_live)
-        if (index != but && slot.Light().IsEnabled())
+        if (slot.Light().IsEnabled())
             lights.push_back(slot.Light());
     return lights;
+}
+
+std::optional<KM_Light> LightStore::studySun() const {
+    const CQuarnLight& slot = at(m_last_of_plug_in);
+    const KM_Light& light = slot.Light();
+    const bool is_sun =
+        !slot.IsDeleted() && light.IsEnabled() && light.Style() == KM_LightStyle::world_directional;
+    return is_sun ? std::optional(light) : std::nullopt;
 }
 
 } // namespace quarn
@@ -73,7 +88,7 @@ const CQuarnLight& CQuarnLightTable::operator[](int index) const {
 
 int CQuarnLightTable::AddLight(const KM_Light& light, const KM_3dmObjectAttributes*) {
     const bool allowed = mayCallDocument(*m_lights, "CQuarnLightTable::AddLight");
-    return allowed ? m_lights->add(light) : quarn::LightStore::no_index;
+    return allowed ? m_lights->addOfPlugIn(light) : quarn::LightStore::no_index;
 }
 
 bool CQuarnLightTable::DeleteLight(int index, bool quiet) {

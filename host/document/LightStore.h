@@ -3,6 +3,7 @@
 #include "sdk/qncore/QnLightTable.h"
 
 #include <map>
+#include <optional>
 #include <vector>
 
 namespace quarn {
@@ -30,6 +31,8 @@ public:
     /// @return the index of the light's slot, or no_index when the light cannot shine or the table
     ///         is full
     int add(const KM_Light& light);
+    /// The same of a light that a plug-in puts there.
+    int addOfPlugIn(const KM_Light& light);
     /// @return false, with nothing changed, when the index names no live light
     bool remove(int index);
     /// Adds slots of deleted lights until there are `count`, for the indices of a stored table to
@@ -40,8 +43,10 @@ public:
     const std::map<int, CQuarnLight>& live() const { return m_live; }
 
     /// The lights that are there and switched on.
-    /// @param but  index of one that is left out; an index without a slot leaves out none
-    std::vector<KM_Light> shiningLights(int but = -1) const;
+    std::vector<KM_Light> shiningLights() const;
+    /// The light that a plug-in put there last, while it is there, if it is on and shines from one
+    /// direction, as the sun of a study does. Nothing where there is none.
+    std::optional<KM_Light> studySun() const;
 
     /// From now on every call of a plug-in is a breach.
     void close() { m_is_open = false; }
@@ -52,6 +57,7 @@ public:
 
 private:
     std::map<int, CQuarnLight> m_live;
+    int m_last_of_plug_in = no_index;
     int m_slot_count = 0;
     CQuarnLight m_no_light = deletedLight();
     CQuarnLightTable m_face;

@@ -131,6 +131,21 @@ void add(const KM_Light& light, Checksum& sum) {
 
 } // namespace
 
+void addLight(const LightSettings& light, Checksum& sum) {
+    sum.add(light.surroundings);
+    if (light.picture) {
+        sum.add(light.picture->width);
+        sum.add(light.picture->height);
+        addAll(light.picture->rgb, sum);
+    }
+    sum.add(light.exposure.has_value());
+    sum.add(light.exposure.value_or(0.0));
+    sum.add(light.background);
+    add(light.background_color, sum);
+    sum.add(light.has_ground);
+    sum.add(light.metres_per_unit);
+}
+
 void addScene(const SceneContent& content, Checksum& sum) {
     SharedParts parts;
     sum.add(std::uint64_t{content.meshes.size()});

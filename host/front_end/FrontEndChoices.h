@@ -43,8 +43,8 @@ struct FileChoice {
     std::filesystem::path file = {};
 };
 
-/// A picture for a window to show: 8-bit sRGB pixels, red, green, blue and an unused byte, rows
-/// from top to bottom without gaps. Valid during the call that hands it over.
+/// A picture for a window to show: 8-bit sRGB pixels, red, green, blue and opacity, rows from
+/// top to bottom without gaps. Valid during the call that hands it over.
 struct ShownPicture {
     int width_px = 0;
     int height_px = 0;

@@ -31,6 +31,7 @@ struct RecordingPlan {
     std::function<RecordingFingerprint()> fingerprint;
     RecordingChoice choice;
     bool overwrites = false; ///< files of others may be replaced
+    std::string refusal;     ///< why it must not begin, in a sentence; empty: it may
 };
 
 /// What NAME.recording tells of a recording that begins anew.

@@ -31,7 +31,9 @@ bool RunningRecording::begin(const fs::path& folder) {
         return m_state == State::running || folderAsParent(folder) != m_parent;
     m_place.folder = folder;
     m_parent = folderAsParent(folder);
-    if (!openJournal())
+    if (!m_plan.refusal.empty())
+        refuse(m_plan.refusal);
+    if (m_state != State::waiting || !openJournal())
         return false;
     const auto alone = claimBeginning();
     if (const auto started = start(); !started) {

@@ -45,7 +45,7 @@ public:
         m_materials.tellLosses();
         if (const std::string passed_over = passedOverText(m_json); !passed_over.empty())
             m_result.warnings.push_back(passed_over);
-        finishLights();
+        normalizeIntensities(m_result.lights);
         if (const std::string rounded = roundingText(m_result); !rounded.empty())
             m_result.warnings.push_back(rounded);
         m_result.units = UnitSystem::meters;
@@ -135,15 +135,6 @@ private:
             m_result.meshes.push_back(std::move(piece.value()));
         }
         return pieces;
-    }
-
-    void finishLights() {
-        normalizeIntensities(m_result.lights);
-        const std::size_t count = m_result.lights.size();
-        if (count > 0)
-            m_result.warnings.push_back(std::to_string(count) +
-                                        (count > 1 ? " lights were read and are switched off."
-                                                   : " light was read and is switched off."));
     }
 
     using Key = std::tuple<std::uint64_t, std::optional<std::uint64_t>,

@@ -74,8 +74,7 @@ std::optional<KM_Light> lightOf(const Json& json, const Json& node,
     read.SetDirection(world_from_node * KM_3dVector(0.0, 0.0, -1.0));
     read.SetDiffuse(colorFromLinear(static_cast<float>(c[0]), static_cast<float>(c[1]),
                                     static_cast<float>(c[2]), 1.0F));
-    read.SetIntensity(number(member(light, "intensity"), 1.0));
-    read.Enable(false);
+    read.SetIntensity(std::max(0.0, number(member(light, "intensity"), 1.0)));
     return read;
 }
 

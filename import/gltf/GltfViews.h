@@ -15,8 +15,8 @@ namespace quarn::gltf {
 std::optional<SourceCamera> cameraOf(const Json& json, const Json& node,
                                      const KM_Xform& world_from_node);
 
-/// The light that the extension KHR_lights_punctual gives a node, switched off, with the node's
-/// name or else its own, and the intensity of the file.
+/// The light that the extension KHR_lights_punctual gives a node, with the node's name
+/// or else its own, and the intensity of the file; one below 0 counts as 0.
 /// @return nothing where the node has none
 std::optional<KM_Light> lightOf(const Json& json, const Json& node,
                                 const KM_Xform& world_from_node);

@@ -72,6 +72,7 @@ Examples:
   quarn turntable house.glb --frames 120 --out out/house
   quarn turntable part.stl --frames 36 --out out --mode Shaded --format png --size 640x480
   quarn turntable house.glb --frames 120 --out out/film --video house.mp4
+  quarn turntable part.stl --light studio --background transparent --format png --out out/cut
   quarn turntable town.obj --frames 240 --out out --elevation 35 --distance 0.8 --name Town
   quarn turntable town.obj --start-angle -30 --lens 85 --quality 95 --out out/near
   quarn turntable town.obj --frames 240 --out out --show-script > town.txt)";
@@ -228,7 +229,8 @@ takes no direction for it as pointing up.
 
 Examples:
   quarn frame house.quarn --number 0 --out first.jpg
-  quarn frame house.quarn --number 60 --size 3840x2160 --out middle.png)";
+  quarn frame house.quarn --number 60 --size 3840x2160 --out middle.png
+  quarn frame house.quarn --number 60 --light sky --exposure 0.5 --out brighter.png)";
 
 inline constexpr const char* CAMERA_FOOTER = R"(
 Each frame of the recording has one key: the camera that it is drawn with. glTF is in metres with Y

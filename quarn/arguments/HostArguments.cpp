@@ -1,4 +1,5 @@
 // The commands that read a file and let the host work on it.
+#include "quarn/arguments/LightArguments.h"
 #include "quarn/arguments/Readings.h"
 #include "quarn/arguments/RecordingArguments.h"
 #include "quarn/arguments/Subcommands.h"
@@ -37,6 +38,12 @@ CLI::Option* addModel(CLI::App& command, FileWish& wish, const std::string& desc
                                 description);
 }
 
+/// Without its dot.
+std::string endingOf(const std::filesystem::path& file) {
+    const std::string ending = file.extension().native();
+    return ending.empty() ? "" : ending.substr(1);
+}
+
 } // namespace
 
 Action addCurves(CLI::App& command) {
@@ -67,12 +74,18 @@ Action addFrame(CLI::App& command) {
         ->required();
     add("--size", request.size, "WxH", sizeOfPicture(),
         "Size of the picture in pixels (default: the view's)");
+    addLight(add, request.light);
     add("--out", request.file, "FILE", scriptWord("the path of --out"),
         "The picture: .jpg, .png, .bmp or .tga")
         ->required();
     addShowScript(command, asked->use.is_only_shown);
     addCommonOptions(command, asked->use.common);
-    return [asked] { return writeSingleFrame(asked->request, asked->use); };
+    return [asked] {
+        const FrameRequest& frame = asked->request;
+        if (const auto mistake = whyLightIsMisused(frame.light, endingOf(frame.file)))
+            return Outcome::misuse(*mistake + " Give --out a file that ends in .png.");
+        return writeSingleFrame(frame, asked->use);
+    };
 }
 
 Action addCamera(CLI::App& command) {

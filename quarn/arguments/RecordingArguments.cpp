@@ -1,6 +1,7 @@
 #include "quarn/arguments/RecordingArguments.h"
 
 #include "quarn/arguments/FilmArguments.h"
+#include "quarn/arguments/LightArguments.h"
 #include "quarn/arguments/Readings.h"
 #include "quarn/words/AnimationName.h"
 
@@ -132,6 +133,7 @@ void addRecordingOptions(CLI::App& command, RecordingRequest& request, ScriptUse
         "jpg, png, bmp or tga", "jpg");
     add("--quality", request.quality, "N", wholeNumberFrom(1, 100),
         "Of jpg, 1 to 100: larger files look better (default: 90)");
+    addLight(add, request.light);
     addHidden(command, request.hidden);
     add("--name", request.name, "NAME", animationName(),
         "Name of the animation (default: the model file's)");
@@ -160,6 +162,8 @@ std::optional<std::string> settle(RecordingRequest& request) {
                request.mode.name + "\".";
     if (request.quality && request.format != "jpg")
         return "--quality is for jpg pictures, not for " + request.format + ".";
+    if (auto mistake = whyLightIsMisused(request.light, request.format))
+        return *mistake + " Give --format png.";
     if (request.folder.empty()) {
         request.folder = request.model.parent_path() / request.model.stem();
         request.has_own_folder = true;

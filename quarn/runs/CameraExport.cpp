@@ -34,7 +34,7 @@ Outcome runExport(const std::string& line, HostSession& host) {
 
 Outcome exportCamera(const CameraExportRequest& request, const ScriptUse& use) {
     const std::string line = exportLine(request);
-    return runOnDocument(request.document, line, use,
+    return runOnDocument(request.document, {line}, use,
                          [&](HostSession& host) { return runExport(line, host); });
 }
 

@@ -6,13 +6,13 @@
 #include <filesystem>
 #include <functional>
 #include <string>
+#include <vector>
 
 namespace quarn::program {
 
-/// Reads a saved document and has one host command done with its animation; or only shows both
-/// lines.
-/// @param done  runs the line in the session and tells how it ended
-Outcome runOnDocument(const std::filesystem::path& document, const std::string& line,
+/// Reads a saved document and has host commands done with its animation; or only shows all lines.
+/// @param done  runs the lines in the session and tells how they ended
+Outcome runOnDocument(const std::filesystem::path& document, const std::vector<std::string>& lines,
                       const ScriptUse& use, const std::function<Outcome(HostSession&)>& done);
 
 } // namespace quarn::program

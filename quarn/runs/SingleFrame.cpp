@@ -18,10 +18,14 @@ std::string savingLine(const FrameRequest& request) {
 } // namespace
 
 Outcome writeSingleFrame(const FrameRequest& request, const ScriptUse& use) {
-    const std::string line = savingLine(request);
-    return runOnDocument(request.document, line, use, [&](HostSession& host) {
-        if (const auto trouble = host.run(line))
-            return *trouble;
+    std::vector<std::string> lines;
+    if (const std::string light = lightAnswers(request.light); !light.empty())
+        lines.push_back(renderSettingsLine(light));
+    lines.push_back(savingLine(request));
+    return runOnDocument(request.document, lines, use, [&](HostSession& host) {
+        for (const std::string& line : lines)
+            if (const auto trouble = host.run(line))
+                return *trouble;
         return Outcome::success("frame " + std::to_string(request.number) + " in " +
                                 request.file.native());
     });

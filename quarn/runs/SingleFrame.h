@@ -11,6 +11,7 @@ struct FrameRequest {
     std::filesystem::path document;
     int number = 0;                ///< from 0
     std::optional<PixelSize> size; ///< nothing: the view's
+    LightRequest light;
     std::filesystem::path file;
 };
 

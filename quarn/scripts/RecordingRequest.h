@@ -2,6 +2,7 @@
 
 #include "quarn/scripts/CaptureMode.h"
 #include "quarn/scripts/FilmScript.h"
+#include "quarn/scripts/LightScript.h"
 #include "quarn/scripts/ViewerScript.h"
 #include "quarn/words/Words.h"
 
@@ -26,6 +27,7 @@ struct RecordingRequest {
     int samples = 0;            ///< of each pixel, by the render method; 0: as the document has it
     std::string format;         ///< "jpg", "png", "bmp" or "tga"
     std::optional<int> quality; ///< of jpg; 1 to 100; nothing: the host's
+    LightRequest light;
     std::vector<std::string> hidden; ///< names of objects; UTF-8
     std::filesystem::path document;  ///< to save, a .quarn file; empty: none
     FilmRequest film;

@@ -27,8 +27,10 @@ RecordingScript composeRecording(const RecordingRequest& request, const Animatio
     set_up.insert(set_up.end(), lines.preparing.begin(), lines.preparing.end());
     set_up.push_back("_-AnimationName \"" + request.name + "\"");
     set_up.push_back(lines.setting_up);
-    if (request.mode.is_rendered)
-        set_up.push_back("_-RenderSettings _Size " + size + samplesAnswer(request) + " _Enter");
+    const std::string pictures =
+        request.mode.is_rendered ? " _Size " + size + samplesAnswer(request) : "";
+    if (const std::string settings = pictures + lightAnswers(request.light); !settings.empty())
+        set_up.push_back(renderSettingsLine(settings));
     if (request.quality)
         set_up.push_back("_-JpegQuality " + std::to_string(*request.quality));
     if (!request.document.empty())

@@ -23,6 +23,8 @@ inline constexpr std::uint32_t VIEW = named("VIEW");
 inline constexpr std::uint32_t CAMERA = named("CAMR");
 inline constexpr std::uint32_t EDGES = named("EDGE");
 inline constexpr std::uint32_t RENDERING = named("RNDR");
+/// What a scene is lit by beside its lights, and what it stands before and on.
+inline constexpr std::uint32_t SURROUNDINGS = named("SURR");
 inline constexpr std::uint32_t LIGHT = named("LITE");
 inline constexpr std::uint32_t PLUG_IN = named("PLUG");
 /// The last one: a file without it was cut off.

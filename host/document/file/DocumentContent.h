@@ -94,8 +94,10 @@ struct DocumentContent {
     std::vector<ObjectContent> objects;
     std::vector<ViewContent> views;
     std::vector<CameraContent> cameras;
-    std::vector<EdgesContent> edges;         ///< each display mode once
-    std::optional<RenderSettings> rendering; ///< none: those that a new document has
+    std::vector<EdgesContent> edges; ///< each display mode once
+    /// None: those that a new document has. Without the light, which is kept beside them.
+    std::optional<RenderSettings> rendering;
+    std::optional<LightChoice> light; ///< none: that which a new document has
     std::vector<LightContent> lights; ///< by ascending index, each below settings.light_slots
     std::vector<PlugInContent> plug_ins;
     std::vector<UnknownContent> unknown;

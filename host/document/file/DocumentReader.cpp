@@ -2,6 +2,7 @@
 #include "host/document/file/ContentLayouts.h"
 #include "host/document/file/DocumentCoding.h"
 #include "host/document/file/DocumentHeader.h"
+#include "host/document/file/LightChoiceLayout.h"
 #include "host/document/file/SurfaceLayout.h"
 
 #include <algorithm>
@@ -85,6 +86,9 @@ private:
         case chunk::RENDERING:
             return !m_content.rendering ? readRendering(m_archive, m_content.rendering.emplace())
                                         : m_archive.Fail();
+        case chunk::SURROUNDINGS:
+            return !m_content.light ? readLightChoice(m_archive, m_content.light.emplace())
+                                    : m_archive.Fail();
         case chunk::LIGHT:
             return readLight(m_archive, m_content.lights.emplace_back());
         case chunk::PLUG_IN:

@@ -2,6 +2,7 @@
 #include "host/document/file/ContentLayouts.h"
 #include "host/document/file/DocumentCoding.h"
 #include "host/document/file/DocumentHeader.h"
+#include "host/document/file/LightChoiceLayout.h"
 #include "host/document/file/SurfaceLayout.h"
 
 #include <algorithm>
@@ -119,7 +120,7 @@ private:
         if (!writeEach(chunk::VIEW, "a view", m_content.views, writeView) ||
             !writeEach(chunk::CAMERA, "a camera", m_content.cameras, writeCamera) ||
             !writeEach(chunk::EDGES, "the edges of a display mode", m_content.edges, writeEdges) ||
-            !writeRenderSettings() ||
+            !writeRenderSettings() || !writeLightChoice() ||
             !writeEach(chunk::LIGHT, "a light", m_content.lights, writeLight) ||
             !writeEach(chunk::PLUG_IN, "what a plug-in keeps", m_content.plug_ins, writePlugIn))
             return false;
@@ -135,6 +136,12 @@ private:
         return !m_content.rendering ||
                writeChunk(chunk::RENDERING, "the settings of the renderer",
                           [&] { return writeRendering(m_archive, *m_content.rendering); });
+    }
+
+    bool writeLightChoice() {
+        return !m_content.light ||
+               writeChunk(chunk::SURROUNDINGS, "the settings of the light",
+                          [&] { return quarn::writeLightChoice(m_archive, *m_content.light); });
     }
 
     const DocumentContent& m_content;

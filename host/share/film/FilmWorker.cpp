@@ -1,5 +1,7 @@
 #include "host/share/film/FilmWorker.h"
 
+#include "engine/images/Opacity.h"
+
 #include <utility>
 
 namespace quarn {
@@ -81,9 +83,10 @@ std::chrono::duration<double> FilmWorker::timeAtWork() const {
 void FilmWorker::run() {
     using Clock = std::chrono::steady_clock;
     Frame frame;
+    Image on_white;
     while (takeFrame(frame)) {
         const auto start = Clock::now();
-        const auto added = m_film->add(frame.picture, frame.caption);
+        const auto added = m_film->add(onWhite(frame.picture, on_white), frame.caption);
         const Lock lock(m_mutex);
         m_time_at_work += Clock::now() - start;
         m_is_at_work = false;

@@ -13,8 +13,8 @@
 
 namespace quarn {
 
-/// Encodes a film on a thread of its own, beside whatever makes its frames. One thread hands them
-/// over and asks.
+/// Encodes a film, whose frames are seen on white where they are see-through, on a thread of its
+/// own, beside whatever makes its frames. One thread hands them over and asks.
 class FilmWorker {
 public:
     explicit FilmWorker(std::unique_ptr<FilmWriter> film);

@@ -1,6 +1,7 @@
 #include "host/share/viewer/PagePictures.h"
 
 #include "engine/images/ImageFile.h"
+#include "engine/images/Opacity.h"
 #include "ground/FileBytes.h"
 #include "ground/PathText.h"
 #include "host/share/frames/FramePicture.h"
@@ -78,7 +79,8 @@ Result<std::vector<std::byte>> framesJpeg(const std::filesystem::path& file) {
     const Result<Image> picture = readFramePicture(file);
     if (!picture)
         return picture.error();
-    return encodeImage(picture.value(), ImageFormat::jpeg);
+    Image on_white;
+    return encodeImage(onWhite(picture.value(), on_white), ImageFormat::jpeg);
 }
 
 } // namespace quarn

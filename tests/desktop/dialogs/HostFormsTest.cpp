@@ -97,6 +97,25 @@ TEST_F(HostFormsTest, RenderSettingsTakeTheSizeOfTheViewByAButton) {
     EXPECT_EQ(last_result, CQuarnCommand::success);
 }
 
+TEST_F(HostFormsTest, RenderSettingsKeepTheLightThatIsChosenInTheirForm) {
+    answer("_RenderSettings", render_settings, [](QWidget& form) {
+        EXPECT_EQ(field(form, 4309).text(), "");
+        part<QComboBox>(form, "control4306").setCurrentIndex(1);
+        type(form, 4309, "-0,5");
+        part<QComboBox>(form, "control4310").setCurrentIndex(2);
+        part<QComboBox>(form, "control4312").setCurrentIndex(1);
+        press(form, "ok");
+    });
+    EXPECT_EQ(last_result, CQuarnCommand::success);
+    answer("_RenderSettings", render_settings, [](QWidget& form) {
+        EXPECT_EQ(part<QComboBox>(form, "control4306").currentText(), "Studio");
+        EXPECT_EQ(field(form, 4309).text(), "-0.5");
+        EXPECT_EQ(part<QComboBox>(form, "control4310").currentText(), "Transparent");
+        EXPECT_EQ(part<QComboBox>(form, "control4312").currentText(), "Off");
+        press(form, "cancel");
+    });
+}
+
 TEST_F(HostFormsTest, SunIsPutByAPlaceChosenBeforeTheForm) {
     answer("_Sun", sun, [](QWidget& form) {
         onceShown("location", [&](QWidget& picker) {

@@ -15,12 +15,12 @@ namespace {
 
 using test::part;
 
-/// A picture whose pixels tell where they stand; the byte behind the colour means nothing.
+/// A picture whose pixels tell where they stand.
 struct Pixels {
     Pixels(int width, int height) : width_px(width), height_px(height) {
         for (int y = 0; y < height; ++y) {
             for (int x = 0; x < width; ++x)
-                for (const int byte : {x % 251, y % 241, (x + y) % 239, 7})
+                for (const int byte : {x % 251, y % 241, (x + y) % 239, 255})
                     rgba.push_back(static_cast<std::uint8_t>(byte));
         }
     }

@@ -22,7 +22,7 @@ std::vector<std::uint8_t> bytesOf(const fs::path& path) {
     return {std::istreambuf_iterator<char>(file), {}};
 }
 
-/// Red grows to the right, green downward; opacity varies and must not matter.
+/// Red grows to the right, green downward.
 Image ramp(int width, int height) {
     Image image;
     image.resize(width, height);
@@ -32,7 +32,7 @@ Image ramp(int width, int height) {
             pixel[0] = static_cast<std::uint8_t>(255 * x / width);
             pixel[1] = static_cast<std::uint8_t>(255 * y / height);
             pixel[2] = 77;
-            pixel[3] = static_cast<std::uint8_t>(x);
+            pixel[3] = 255;
         }
     }
     return image;
@@ -64,6 +64,24 @@ TEST(ImageFile, PngComesBackPixelByPixel) {
         ASSERT_EQ(rgb[3 * i + 1], image.rgba[4 * i + 1]);
         ASSERT_EQ(rgb[3 * i + 2], image.rgba[4 * i + 2]);
     }
+}
+
+TEST(ImageFile, PngOfASeeThroughPictureKeepsItsOpacity) {
+    Image image = ramp(9, 5);
+    for (std::size_t i = 3; i < image.rgba.size(); i += 4)
+        image.rgba[i] = static_cast<std::uint8_t>(i);
+    const TempFolder folder;
+    ASSERT_TRUE(writeImageFile(folder.path() / "a.png", image).ok());
+    const auto bytes = bytesOf(folder.path() / "a.png");
+    spng_ctx* context = spng_ctx_new(0);
+    spng_set_png_buffer(context, bytes.data(), bytes.size());
+    spng_ihdr header{};
+    ASSERT_EQ(spng_get_ihdr(context, &header), 0);
+    EXPECT_EQ(header.color_type, SPNG_COLOR_TYPE_TRUECOLOR_ALPHA);
+    std::vector<std::uint8_t> rgba(image.rgba.size());
+    ASSERT_EQ(spng_decode_image(context, rgba.data(), rgba.size(), SPNG_FMT_RGBA8, 0), 0);
+    spng_ctx_free(context);
+    EXPECT_EQ(rgba, image.rgba);
 }
 
 TEST(ImageFile, JpegHasFullColourResolutionAndComesBackClose) {
@@ -113,10 +131,21 @@ TEST(ImageFile, BmpHoldsBlueGreenRedFromTheBottomInPaddedRows) {
     EXPECT_EQ(bytesOf(folder.path() / "a.bmp"), expected);
 }
 
-TEST(ImageFile, TgaHoldsBlueGreenRedFromTheBottom) {
+TEST(ImageFile, TgaOfASeeThroughPictureHoldsItsOpacityBehindTheColours) {
     Image image;
     image.resize(1, 2);
     image.rgba = {10, 20, 30, 0, 40, 50, 60, 255};
+    const TempFolder folder;
+    ASSERT_TRUE(writeImageFile(folder.path() / "a.tga", image).ok());
+    const std::vector<std::uint8_t> expected{0, 0, 2, 0,  0, 0,  0,  0,  0,   0,  0,  0,  1,
+                                             0, 2, 0, 32, 8, 60, 50, 40, 255, 30, 20, 10, 0};
+    EXPECT_EQ(bytesOf(folder.path() / "a.tga"), expected);
+}
+
+TEST(ImageFile, TgaHoldsBlueGreenRedFromTheBottom) {
+    Image image;
+    image.resize(1, 2);
+    image.rgba = {10, 20, 30, 255, 40, 50, 60, 255};
     const TempFolder folder;
     ASSERT_TRUE(writeImageFile(folder.path() / "a.tga", image).ok());
     const std::vector<std::uint8_t> expected{0, 0, 2, 0, 0,  0, 0,  0,  0,  0,  0,  0,

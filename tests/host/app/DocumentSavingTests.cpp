@@ -163,7 +163,8 @@ TEST_F(DocumentFile, ADocumentIsSavedAndOpened) {
     ASSERT_EQ(1U, document().namedViews().size());
     EXPECT_EQ(sample.cameras[0].viewport, document().namedViews()[0].viewport);
     EXPECT_EQ(document().edgesOf(wireframe_mode_id), MeshEdgeChoice::all);
-    EXPECT_EQ(document().renderWindow().settings, (RenderSettings{640, 360, 128, 4}));
+    EXPECT_EQ(document().renderWindow().settings,
+              (RenderSettings{640, 360, 128, 4, *sample.light}));
 }
 
 TEST_F(DocumentFile, OpeningBringsItsViewsInPlaceOfTheStandardOnes) {

@@ -1,3 +1,5 @@
+#include "engine/display/DisplayMode.h"
+#include "host/share/frames/FramePicture.h"
 #include "sdk/qncore/QnPlatform.h"
 #include "tests/host/app/TestCommand.h"
 #include "tests/host/document/DocumentFixtures.h"
@@ -155,6 +157,29 @@ TEST_F(SaveFrameTest, RenderedFrameHasTheRenderSizeAndShowsTheView) {
     keeper.record.SetRenderPreview(true);
     ASSERT_EQ(save(L"Size 20 10 0"), CQuarnCommand::success) << printed();
     EXPECT_EQ(std::filesystem::file_size(file), 54U + 10U * 60U);
+}
+
+TEST_F(SaveFrameTest, ATransparentFrameIsClearAroundTheModelAndNotWrittenAsBmp) {
+    FrameKeeper keeper;
+    addBox(view().document(), {-5, -5, 0}, {5, 5, 5});
+    keeper.record.SetDisplayMode(rendered_mode_id);
+    view().setFrameSize(32, 24);
+    ASSERT_EQ(run(L"RenderSettings Size 32 24 PreviewSamples 1 Background Transparent Ground=No "
+                  L"_Enter"),
+              CQuarnCommand::success);
+    EXPECT_EQ(save(L"0"), CQuarnCommand::failure);
+    EXPECT_THAT(printed(), HasSubstr("Pictures of the kind bmp have no opacity"));
+    EXPECT_FALSE(std::filesystem::exists(file));
+    for (const bool is_rendered : {false, true}) {
+        keeper.record.SetRenderPreview(is_rendered);
+        ASSERT_EQ(run((L"SaveFrame 0 \"" + (folder / "frame.png").wstring() + L"\"").c_str()),
+                  CQuarnCommand::success)
+            << printed();
+        const auto picture = readFramePicture(folder / "frame.png");
+        ASSERT_TRUE(picture) << picture.message();
+        EXPECT_EQ(picture.value().pixel(0, 0)[3], 0) << is_rendered;
+        EXPECT_EQ(picture.value().pixel(16, 12)[3], 255) << is_rendered;
+    }
 }
 
 TEST_F(SaveFrameTest, RenderingThatIsCancelledWritesNoFile) {

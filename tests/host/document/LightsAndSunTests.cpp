@@ -1,4 +1,5 @@
 #include "host/document/DocumentDrawing.h"
+#include "import/ImportedModel.h"
 #include "tests/host/document/DocumentFixtures.h"
 
 #include <limits>
@@ -47,16 +48,10 @@ TEST_F(LightTableTest, LightsShineInTheOrderOfTheirIndices) {
         lights.add(sunFrom({static_cast<double>(x), 0, -1}));
     lights.remove(3);
     lights.remove(0);
-    const auto shining = [&](int but) {
-        std::vector<int> xs;
-        for (const KM_Light& light : lights.shiningLights(but))
-            xs.push_back(static_cast<int>(light.Direction().x));
-        return xs;
-    };
-    EXPECT_EQ(shining(-1), (std::vector{1, 2, 4}));
-    EXPECT_EQ(shining(2), (std::vector{1, 4}));
-    EXPECT_EQ(shining(3), (std::vector{1, 2, 4}));
-    EXPECT_EQ(shining(std::numeric_limits<int>::max()), (std::vector{1, 2, 4}));
+    std::vector<int> xs;
+    for (const KM_Light& light : lights.shiningLights())
+        xs.push_back(static_cast<int>(light.Direction().x));
+    EXPECT_EQ(xs, (std::vector{1, 2, 4}));
 }
 
 TEST_F(LightTableTest, RefusesLightsThatCannotShine) {
@@ -80,10 +75,64 @@ TEST_F(LightTableTest, OnlyLiveLightsThatAreOnShineBesideTheSun) {
     document.lights().add(off);
     document.lights().remove(document.lights().add(sunFrom({0, 1, -1})));
 
-    const std::vector<KM_Light> lights = document.drawing().shiningLights();
+    const std::vector<KM_Light> lights = document.drawing().light().shiningLights();
     ASSERT_EQ(lights.size(), 2U);
     EXPECT_EQ(lights[0].Direction(), -document.sun().directionToSun());
     EXPECT_EQ(lights[1].Direction(), KM_3dVector(0, 0, -1));
+}
+
+KM_Light lampOfModel() {
+    KM_Light lamp;
+    lamp.SetStyle(KM_LightStyle::world_point);
+    lamp.SetLocation({1, 2, 3});
+    return lamp;
+}
+
+TEST_F(LightTableTest, LightsOfAModelShineBesideTheSun) {
+    ImportedModel model;
+    model.lights = {lampOfModel()};
+    document.addModel(model);
+    const std::vector<KM_Light> lights = document.drawing().light().shiningLights();
+    ASSERT_EQ(lights.size(), 2U);
+    EXPECT_EQ(lights[1].Style(), KM_LightStyle::world_point);
+    EXPECT_EQ(document.face().LightTable().LightCount(), 1);
+}
+
+TEST_F(LightTableTest, LightsOfTheDocumentRestWhileAStudyMovesASun) {
+    document.lights().add(lampOfModel());
+    CQuarnLightTable& table = document.face().LightTable();
+    const int sun = table.AddLight(sunFrom({0, 0, -1}), nullptr);
+    EXPECT_EQ(document.drawing().light().shiningLights().size(), 3U) << "a light beside the sun";
+
+    document.sun().beginChange();
+    document.sun().setEnabled(false);
+    const std::vector<KM_Light> lights = document.drawing().light().shiningLights();
+    ASSERT_EQ(lights.size(), 1U);
+    EXPECT_EQ(lights[0].Direction(), KM_3dVector(0, 0, -1));
+    EXPECT_FALSE(table[0].IsDeleted());
+    EXPECT_TRUE(table[0].Light().IsEnabled()) << "plug-ins see it as it is";
+
+    table.DeleteLight(sun, true);
+    ASSERT_EQ(document.drawing().light().shiningLights().size(), 1U);
+    EXPECT_EQ(document.drawing().light().shiningLights()[0].Style(), KM_LightStyle::world_point);
+}
+
+TEST_F(LightTableTest, TheSunOfASingleFrameOfAStudyShinesAlone) {
+    document.lights().add(lampOfModel());
+    document.lights().add(sunFrom({1, 0, -1}));
+    SceneChanges changes;
+    changes.sun = sunFrom({0, 0, -1});
+    const std::vector<KM_Light> lights = document.drawing().light().shiningLights(changes);
+    ASSERT_EQ(lights.size(), 1U);
+    EXPECT_EQ(lights[0].Direction(), KM_3dVector(0, 0, -1));
+}
+
+TEST_F(LightTableTest, ALampOfAPlugInMakesNoStudy) {
+    document.lights().add(sunFrom({1, 0, -1}));
+    document.face().LightTable().AddLight(lampOfModel(), nullptr);
+    document.sun().beginChange();
+    document.sun().setEnabled(false);
+    EXPECT_EQ(document.drawing().light().shiningLights().size(), 2U);
 }
 
 using DocumentSunTest = DocumentTest;
@@ -126,12 +175,13 @@ TEST_F(DocumentSunTest, AChangeThatIsTakenBackIsNone) {
 }
 
 TEST_F(DocumentSunTest, ShinesOnlyWhileItIsOn) {
-    ASSERT_EQ(document.drawing().shiningLights().size(), 1U);
-    EXPECT_EQ(document.drawing().shiningLights()[0].Style(), KM_LightStyle::world_directional);
+    ASSERT_EQ(document.drawing().light().shiningLights().size(), 1U);
+    EXPECT_EQ(document.drawing().light().shiningLights()[0].Style(),
+              KM_LightStyle::world_directional);
     document.sun().beginChange();
     document.sun().setEnabled(false);
     document.sun().endChange();
-    EXPECT_TRUE(document.drawing().shiningLights().empty());
+    EXPECT_TRUE(document.drawing().light().shiningLights().empty());
 }
 
 } // namespace

@@ -119,6 +119,12 @@ void addViews(DocumentContent& content) {
     content.cameras.push_back({L"Kamera 1", view.viewport});
     content.edges.push_back({wireframe_mode_id, MeshEdgeChoice::all});
     content.rendering = RenderSettings{640, 360, 128, 4};
+    content.light = LightChoice{.surroundings = Surroundings::picture,
+                                .picture = "/pictures/sky.hdr",
+                                .exposure = 0.5,
+                                .background = BackgroundKind::color,
+                                .background_color = {1, 2, 3, 255},
+                                .has_ground = false};
 }
 
 void addLights(std::vector<LightContent>& lights) {

@@ -118,5 +118,39 @@ TEST(SceneFingerprintTest, TellsATextureOfOneQualityFromThatOfAnother) {
     EXPECT_NE(use(&Material::clearcoat_texture), use(&Material::specular_texture));
 }
 
+std::uint64_t fingerprintOf(const LightSettings& light) {
+    Checksum sum;
+    addLight(light, sum);
+    return sum.value();
+}
+
+LightSettings withPicture(float light) {
+    LightSettings settings;
+    settings.picture =
+        std::make_shared<const EnvironmentPicture>(EnvironmentPicture{1, 1, {light, 0.0F, 0.0F}});
+    return settings;
+}
+
+TEST(SceneFingerprintTest, OfTheLightChangesWithAllThatIsChosen) {
+    const std::function<void(LightSettings&)> changes[] = {
+        [](LightSettings& light) { light.surroundings = Surroundings::sky; },
+        [](LightSettings& light) { light.exposure = 0.0; },
+        [](LightSettings& light) { light.exposure = 1.0; },
+        [](LightSettings& light) { light.background = BackgroundKind::transparent; },
+        [](LightSettings& light) { light.background_color.b = 0; },
+        [](LightSettings& light) { light.has_ground = false; },
+        [](LightSettings& light) { light.metres_per_unit = 0.001; },
+        [](LightSettings& light) { light = withPicture(1.0F); },
+        [](LightSettings& light) { light = withPicture(2.0F); }};
+    std::set<std::uint64_t> fingerprints{fingerprintOf(LightSettings())};
+    for (const auto& change : changes) {
+        LightSettings light;
+        change(light);
+        EXPECT_TRUE(fingerprints.insert(fingerprintOf(light)).second);
+    }
+    EXPECT_EQ(fingerprintOf(withPicture(1.0F)), fingerprintOf(withPicture(1.0F)))
+        << "the same picture read again";
+}
+
 } // namespace
 } // namespace quarn::test

@@ -69,6 +69,18 @@ TEST_F(DocumentStateTest, RenderSettingsBelongToTheDocument) {
     EXPECT_FALSE(modified());
 }
 
+TEST_F(DocumentStateTest, TheLightBelongsToTheDocument) {
+    runAll({L"RenderSettings Light Studio Exposure -0.5 Background Transparent Ground=No _Enter"});
+    EXPECT_TRUE(modified());
+    const LightChoice chosen = document().renderWindow().settings.light;
+    runAll({L"SaveAs " + path("a.quarn"), L"New"});
+    EXPECT_EQ(document().renderWindow().settings.light, LightChoice());
+    runAll({L"Open " + path("a.quarn")});
+    EXPECT_EQ(document().renderWindow().settings.light, chosen);
+    EXPECT_EQ(chosen.surroundings, Surroundings::studio);
+    EXPECT_FALSE(modified());
+}
+
 TEST_F(DocumentStateTest, WhatDoesNotBecomeTheDocumentsFileLeavesItModified) {
     runAll({L"Point 1,2,3", L"Select _All", L"SaveSelected " + path("part.quarn")});
     EXPECT_TRUE(modified());

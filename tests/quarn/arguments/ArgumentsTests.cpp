@@ -154,6 +154,37 @@ TEST(Arguments, SamplesAreForRenderedPicturesAndFrom1To16384) {
     expectRefusal(wholeTurntable({"--samples", "64"}), {"--samples is for rendered pictures"});
 }
 
+TEST(Arguments, LightThatIsNoneIsRefusedWithWhatMayBeGiven) {
+    expectRefusal(wholeTurntable({"--light", "moon"}),
+                  {"--light must be studio, sky, automatic or a picture that ends in .hdr, not "
+                   "\"moon\"."});
+    expectRefusal(wholeTurntable({"--light", "nowhere.hdr"}),
+                  {"--light: there is no picture nowhere.hdr."});
+    for (const char* stops : {"bright", "10.5", "-11", "nan", "1e999", ""})
+        expectRefusal(wholeTurntable({"--exposure", stops}),
+                      {"--exposure must be automatic or a number of stops from -10 to 10, not \"" +
+                       std::string(stops) + "\"."});
+    for (const char* color : {"red", "#ff88", "ff88001"})
+        expectRefusal(wholeTurntable({"--background", color}),
+                      {"--background must be transparent, automatic, black, grey, white or a "
+                       "colour such as ff8800, not \"" +
+                       std::string(color) + "\"."});
+    expectRefusal(wholeTurntable({"--ground", "maybe"}),
+                  {"--ground must be on or off, not \"maybe\"."});
+}
+
+TEST(Arguments, TransparentPicturesOfAKindWithoutOpacityAreRefusedNamingPng) {
+    for (const char* kind : {"jpg", "bmp"})
+        expectRefusal(wholeTurntable({"--background", "transparent", "--format", kind}),
+                      {"--background transparent needs pictures of the kind png, not " +
+                       std::string(kind) + ". Give --format png."});
+    expectRefusal(wholeTurntable({"--background", "transparent"}), {"not jpg. Give --format png."});
+    EXPECT_EQ(wholeTurntable({"--background", "transparent", "--format", "tga"}).exit_code, 0);
+    expectRefusal(run({"frame", "house.quarn", "--number", "0", "--background", "transparent",
+                       "--show-script", "--out", "still.JPG"}),
+                  {"kind png, not jpg. Give --out a file that ends in .png."});
+}
+
 TEST(Arguments, UnknownFormatListsTheFormats) {
     expectRefusal(wholeTurntable({"--format", "gif"}), {"jpg, png, bmp or tga", "gif"});
 }

@@ -1,5 +1,6 @@
 #include "tests/quarn/pages/Workshop.h"
 
+#include "tests/import/environment/RadianceBytes.h"
 #include "tests/quarn/Models.h"
 
 #include <cstdint>
@@ -81,6 +82,7 @@ void Workshop::writeModels() const {
         writeFile(m_folder / name, glbTriangle());
     for (const char* name : {"part.stl", "machine.stl"})
         writeFile(m_folder / name, STL_TRIANGLE);
+    writeFile(m_folder / "sky.hdr", plainRadiance(16, 8, {64, 96, 128, ONE}));
 }
 
 void Workshop::writeCurves() const {

@@ -190,6 +190,20 @@ TEST(ShowScript, SamplesAreThoseOfTheRenderMethod) {
               "_-RenderSettings _Size 1280 720 _Samples 16384 _Enter");
 }
 
+TEST(ShowScript, LightIsSetAsItIsAskedForAndElseLeftAsTheDocumentHasIt) {
+    EXPECT_EQ(scriptWith({"--light", "Studio"})[6], "_-RenderSettings _Light _Studio _Enter");
+    EXPECT_EQ(scriptWith({"--exposure", "-1.50", "--ground", "off"})[6],
+              "_-RenderSettings _Exposure -1.5 _Ground=No _Enter");
+    EXPECT_EQ(scriptWith({"--background", "FF8800", "--ground", "on"})[6],
+              "_-RenderSettings _Background _Colour \"#ff8800\" _Ground=Yes _Enter");
+    EXPECT_EQ(scriptWith({"--light", "automatic", "--exposure", "automatic", "--background",
+                          "automatic", "--mode", "RenderPreview", "--samples", "4"})[6],
+              "_-RenderSettings _Size 1280 720 _PreviewSamples 4 _Light _Automatic _Exposure "
+              "_Automatic _Background _Automatic _Enter");
+    EXPECT_EQ(scriptWith({"--background", "transparent", "--format", "png"})[6],
+              "_-RenderSettings _Background _Transparent _Enter");
+}
+
 TEST(ShowScript, NameComesFromTheModelWithoutForbiddenCharacters) {
     const auto name_of = [](const std::string& model) {
         return scriptOf({model, "--frames", "8", "--out", "out"})[4];

@@ -1,0 +1,65 @@
+#include "host/document/DocumentLight.h"
+
+#include "engine/display/LightChoice.h"
+#include "engine/scene/UnitLength.h"
+#include "host/document/Document.h"
+
+namespace quarn {
+
+std::optional<KM_Light> DocumentLight::studySun(const SceneChanges& changes) const {
+    if (changes.sun)
+        return changes.sun;
+    return m_document.sun().isEnabled() ? std::nullopt : m_document.lights().studySun();
+}
+
+std::vector<KM_Light> DocumentLight::shiningLights(const SceneChanges& changes) {
+    if (const auto sun = studySun(changes))
+        return LightStore::canShine(*sun) ? std::vector{*sun} : std::vector<KM_Light>();
+    std::vector<KM_Light> lights = m_document.lights().shiningLights();
+    const auto sun = m_document.sun().light();
+    if (sun && settings(changes).surroundings == Surroundings::sky)
+        lights.insert(lights.begin(), *sun);
+    return lights;
+}
+
+LightSettings DocumentLight::settings(const SceneChanges& changes) {
+    const LightChoice& choice = m_document.renderWindow().settings.light;
+    LightSettings settings;
+    settings.exposure = choice.exposure;
+    settings.background = choice.background;
+    settings.background_color = choice.background_color;
+    settings.has_ground = choice.has_ground;
+    if (const double metres = metresPerUnit(m_document.units()); metres > 0.0)
+        settings.metres_per_unit = metres;
+    settings.surroundings = choice.surroundings;
+    if (choice.surroundings == Surroundings::picture)
+        settings.picture = m_picture.pictureFor(m_document, choice.picture);
+    if (choice.surroundings == Surroundings::automatic ||
+        (choice.surroundings == Surroundings::picture && !settings.picture))
+        settings.surroundings = openSurroundings(settings, changes);
+    return settings;
+}
+
+Surroundings DocumentLight::openSurroundings(const LightSettings& settings,
+                                             const SceneChanges& changes) {
+    const DocumentSun& sun = m_document.sun();
+    if (studySun(changes) || (sun.isEnabled() && sun.wasMoved()))
+        return Surroundings::sky;
+    LightSettings open = settings;
+    open.surroundings = Surroundings::automatic;
+    return surroundingsOf(open, m_document.lights().shiningLights(), surfaceBox());
+}
+
+const KM_BoundingBox& DocumentLight::surfaceBox() {
+    const ObjectTable& objects = m_document.objects();
+    if (m_box_revision == objects.revision())
+        return m_surface_box;
+    m_surface_box = KM_BoundingBox();
+    for (const auto& object : objects.objects())
+        if (object->placed.mesh && object->isInDrawableRange())
+            m_surface_box.Union(object->boundingBox());
+    m_box_revision = objects.revision();
+    return m_surface_box;
+}
+
+} // namespace quarn
