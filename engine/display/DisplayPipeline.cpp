@@ -91,7 +91,7 @@ Result<void> DisplayPipeline::draw(const DisplayScene& scene, const KM_Viewport&
         frame.layer_nearness = m_layers.data();
     }
     const float* const layers = frame.layer_nearness;
-    if (frame.scene && frame.catches_shadows)
+    if (frame.scene && frame.catches_shadows && frame.sky_reach <= 0.0F)
         m_open_ground.find(frame, *m_kernel, scene.surfacesNumber());
     drawSurfaces(frame, mode);
     if (has_lines)

@@ -45,7 +45,7 @@ inline LaneColors shadeOpaque(const FrameSetup& frame, RayPacket& packet, Surfac
     } else {
         const Lanes shade = shadeCatcher(frame, packet, ground, shaded, color);
         if (cover)
-            *cover = select(packet.hit, Lanes(1.0F), shade);
+            *cover = select(packet.hit, Lanes(1.0F), opacityOfShade(frame, shade));
     }
     return select(packet.hit, shaded, color);
 }

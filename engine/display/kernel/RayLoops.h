@@ -1,6 +1,6 @@
 // The ray loops. Each RayKernel_*.cpp includes this once, with its own processor's flags.
 
-#include "engine/display/DisplayTable.h"
+#include "engine/display/kernel/Displayed.h"
 #include "engine/display/kernel/EnvironmentLoops.h"
 #include "engine/display/kernel/LayeredShading.h"
 #include "engine/display/kernel/OneSided.h"
@@ -13,15 +13,6 @@
 
 namespace quarn {
 namespace {
-
-/// The display table's byte for each lane.
-inline LaneInts displayed(const FrameSetup& frame, const Lanes& light) {
-    constexpr float darkest = DisplayTable::darkest;
-    constexpr float brightest = DisplayTable::brightest;
-    const LaneInts step =
-        shiftedRight(bitsOf(least(greatest(light, darkest), brightest)), DisplayTable::shift);
-    return gathered(frame.display_table, step - LaneInts(DisplayTable::first));
-}
 
 inline LaneInts encoded(const FrameSetup& frame, const LaneColors& color) {
     return displayed(frame, color.r) | shiftedLeft(displayed(frame, color.g), 8) |

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/display/kernel/Background.h"
+#include "engine/display/kernel/Displayed.h"
 #include "engine/display/kernel/GroundPlane.h"
 #include "engine/display/kernel/LookShading.h"
 
@@ -54,6 +55,14 @@ inline LaneColors shadedBackground(const FrameSetup& frame, const RayPacket& pac
             : lightShownAs(frame,
                            gradient(frame, packet.y, frame.shown_top, frame.shown_bottom) * left);
     return select(shaded, darker, background);
+}
+
+/// How opaque a black shadow is before nothing. Pictures are laid over each other by the numbers of
+/// their pixels, so a shadow is as dark as it is on white when these are.
+[[gnu::noinline]] inline Lanes opacityOfShade(const FrameSetup& frame, const Lanes& shade) {
+    const Lanes left = Lanes(1.0F) - shade;
+    const Lanes number = floatsOf(displayed(frame, lightShownAs(frame, {left, left, left}).r));
+    return select(shade > 0.0F, Lanes(1.0F) - number * (1.0F / 255.0F), 0.0F);
 }
 
 } // namespace

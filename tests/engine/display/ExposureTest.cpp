@@ -44,6 +44,22 @@ TEST(Exposure, AStopDoublesWhatASurfaceGivesOff) {
     expectDoubles(content);
 }
 
+TEST(Exposure, ItFallsSteadilyWhileASunRisesOverAStudio) {
+    SceneContent content = cubeOnGround();
+    content.light.surroundings = Surroundings::studio;
+    content.lights.resize(1);
+    float before = 1.0F;
+    for (double altitude = -10.0; altitude <= 90.0; altitude += 0.5) {
+        const double a = altitude * KM_PI / 180.0;
+        content.lights[0] = sunLight({std::cos(a), 0.0, -std::sin(a)});
+        const float exposure = frameOf(content, productView()).frame.exposure;
+        EXPECT_LE(exposure, before) << altitude;
+        EXPECT_GT(exposure, before - 0.01F) << altitude;
+        before = exposure;
+    }
+    EXPECT_LT(before, 0.6F);
+}
+
 TEST(Exposure, NoneIsThatOfNoStops) {
     for (const Surroundings surroundings : {Surroundings::studio, Surroundings::sky}) {
         SceneContent content = cubeOnGround();

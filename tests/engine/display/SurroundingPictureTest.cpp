@@ -127,6 +127,24 @@ TEST(SurroundingPicture, NumbersThatNoLampSendsAndPicturesOfNothingAreDrawn) {
     EXPECT_LT(meanBrightness(spot), 250.0);
 }
 
+TEST(SurroundingPicture, OneOfVeryManyPixelsLooksAsItsSmallerOne) {
+    const auto striped = [](int width, int pixels_a_stripe) {
+        auto picture = std::make_shared<EnvironmentPicture>();
+        picture->width = width;
+        picture->height = 2;
+        for (int i = 0; i < 2 * width; ++i)
+            for (int c = 0; c < 3; ++c)
+                picture->rgb.push_back(i % width / pixels_a_stripe % 2 == c % 2 ? 0.2F : 1.0F);
+        return inPicture(picture);
+    };
+    const Image large = litPicture(striped(8192, 512), productView(), SIZE, SIZE);
+    const Image small = litPicture(striped(2048, 128), productView(), SIZE, SIZE);
+    for (int y = 0; y < SIZE; ++y)
+        for (int x = 0; x < SIZE; ++x)
+            ASSERT_NEAR(brightness(large, x, y), brightness(small, x, y), 8.0) << x << ' ' << y;
+    EXPECT_NEAR(meanBrightness(large), meanBrightness(small), 0.5);
+}
+
 TEST(SurroundingPicture, APictureOfOnePixelIsOneLightFromAllSides) {
     auto picture = std::make_shared<EnvironmentPicture>(EnvironmentPicture{1, 1, {1, 0.5F, 0.25F}});
     const LitFrame lit = frameOf(inPicture(picture), productView());
