@@ -16,7 +16,7 @@ namespace {
 using testing::HasSubstr;
 using testing::Not;
 
-class DocumentLight : public DocumentTest {
+class DocumentLightTest : public DocumentTest {
 protected:
     LightChoice& choice() { return document.renderWindow().settings.light; }
     LightSettings settings() { return document.drawing().light().settings(); }
@@ -32,7 +32,7 @@ protected:
     const std::filesystem::path picture = folder / "sky.hdr";
 };
 
-TEST_F(DocumentLight, ChoicesReachTheSceneThatIsDrawn) {
+TEST_F(DocumentLightTest, ChoicesReachTheSceneThatIsDrawn) {
     choice().surroundings = Surroundings::studio;
     choice().exposure = 1.5;
     choice().background = BackgroundKind::color;
@@ -49,7 +49,7 @@ TEST_F(DocumentLight, ChoicesReachTheSceneThatIsDrawn) {
     EXPECT_EQ(scene.value()->content().light, drawn);
 }
 
-TEST_F(DocumentLight, LengthsAreThoseOfTheDocumentsUnits) {
+TEST_F(DocumentLightTest, LengthsAreThoseOfTheDocumentsUnits) {
     EXPECT_EQ(settings().metres_per_unit, 1.0) << "without units";
     ImportedModel model;
     model.units = UnitSystem::millimeters;
@@ -57,7 +57,7 @@ TEST_F(DocumentLight, LengthsAreThoseOfTheDocumentsUnits) {
     EXPECT_EQ(settings().metres_per_unit, 0.001);
 }
 
-TEST_F(DocumentLight, APictureIsReadOnceAndAgainWhenItsFileChanges) {
+TEST_F(DocumentLightTest, APictureIsReadOnceAndAgainWhenItsFileChanges) {
     choosePicture(128);
     const auto first = settings().picture;
     ASSERT_TRUE(first);
@@ -71,7 +71,7 @@ TEST_F(DocumentLight, APictureIsReadOnceAndAgainWhenItsFileChanges) {
     EXPECT_EQ(printed(), "");
 }
 
-TEST_F(DocumentLight, APictureThatIsMissingIsToldOnceAndTheLightIsTheAutomaticOne) {
+TEST_F(DocumentLightTest, APictureThatIsMissingIsToldOnceAndTheLightIsTheAutomaticOne) {
     choosePicture(128);
     std::filesystem::remove(picture);
     EXPECT_EQ(settings().surroundings, Surroundings::sky);
@@ -84,7 +84,7 @@ TEST_F(DocumentLight, APictureThatIsMissingIsToldOnceAndTheLightIsTheAutomaticOn
     EXPECT_EQ(settings().surroundings, Surroundings::picture);
 }
 
-TEST_F(DocumentLight, ABrokenPictureIsToldAgainOnlyWhenItIsBrokenAnew) {
+TEST_F(DocumentLightTest, ABrokenPictureIsToldAgainOnlyWhenItIsBrokenAnew) {
     choosePicture(128);
     writeFile(picture, "no picture");
     settings();
@@ -97,7 +97,7 @@ TEST_F(DocumentLight, ABrokenPictureIsToldAgainOnlyWhenItIsBrokenAnew) {
     EXPECT_GT(printed().size(), told.size());
 }
 
-TEST_F(DocumentLight, PixelsThatAreTooBrightAreToldOnce) {
+TEST_F(DocumentLightTest, PixelsThatAreTooBrightAreToldOnce) {
     choosePicture(128);
     writeFile(picture, flatRadiance(2, 1, {{255, 0, 0, 255}, {1, 1, 1, ONE}}));
     ASSERT_TRUE(settings().picture);
@@ -107,7 +107,7 @@ TEST_F(DocumentLight, PixelsThatAreTooBrightAreToldOnce) {
     EXPECT_EQ(printed().find("as bright as that"), printed().rfind("as bright as that"));
 }
 
-TEST_F(DocumentLight, APictureThatWasMovedWithItsDocumentIsFoundBesideIt) {
+TEST_F(DocumentLightTest, APictureThatWasMovedWithItsDocumentIsFoundBesideIt) {
     choosePicture(128);
     const TempFolder elsewhere;
     document.setFile(elsewhere / "house.quarn");
@@ -118,7 +118,7 @@ TEST_F(DocumentLight, APictureThatWasMovedWithItsDocumentIsFoundBesideIt) {
     EXPECT_EQ(settings().picture->rgb[0], 0.5F) << "where it was chosen it is preferred";
 }
 
-TEST_F(DocumentLight, AProductStandsInAStudioWithoutTheSunAndABuildingUnderTheSkyWithIt) {
+TEST_F(DocumentLightTest, AProductStandsInAStudioWithoutTheSunAndABuildingUnderTheSkyWithIt) {
     addBox(document, {0, 0, 0}, {1, 1, 1});
     EXPECT_EQ(settings().surroundings, Surroundings::studio);
     EXPECT_TRUE(document.drawing().light().shiningLights().empty());
@@ -129,13 +129,13 @@ TEST_F(DocumentLight, AProductStandsInAStudioWithoutTheSunAndABuildingUnderTheSk
     EXPECT_TRUE(document.drawing().light().shiningLights().empty()) << "the sun is the sky's";
 }
 
-TEST_F(DocumentLight, WhatIsHiddenCountsSoThatTheLightStaysThroughoutAFilm) {
+TEST_F(DocumentLightTest, WhatIsHiddenCountsSoThatTheLightStaysThroughoutAFilm) {
     addBox(document, {0, 0, 0}, {1, 20, 1});
     document.objects().setVisible(document.objects().objects()[0]->id, false);
     EXPECT_EQ(settings().surroundings, Surroundings::sky);
 }
 
-TEST_F(DocumentLight, WhoMovesTheSunHasTheSky) {
+TEST_F(DocumentLightTest, WhoMovesTheSunHasTheSky) {
     addBox(document, {0, 0, 0}, {1, 1, 1});
     document.sun().beginChange();
     document.sun().setDirectionToSun({0, 0, 1});
@@ -145,7 +145,7 @@ TEST_F(DocumentLight, WhoMovesTheSunHasTheSky) {
     EXPECT_EQ(settings().surroundings, Surroundings::studio);
 }
 
-TEST_F(DocumentLight, ASunStudyStandsUnderTheSkyUnlessAnotherLightIsChosen) {
+TEST_F(DocumentLightTest, ASunStudyStandsUnderTheSkyUnlessAnotherLightIsChosen) {
     addBox(document, {0, 0, 0}, {1, 1, 1});
     SceneChanges study;
     study.sun.emplace();
