@@ -10,7 +10,7 @@ namespace quarn {
 namespace {
 
 /// Directions that the light of an entry is summed up from.
-constexpr int SAMPLES = 512;
+constexpr int SAMPLES = 2048;
 /// Seen along its very face a surface sends nothing.
 constexpr float LEAST_FACING = 0.002F;
 /// Roughness squared; a perfect mirror would be one direction.

@@ -137,7 +137,7 @@ TEST(Lobes, LightTakesEachWayBackAsItCame) {
 
 /// The part of even light that comes off, by the rays that the surface would send.
 double sentOfEvenLight(const Seen& seen) {
-    constexpr int side = 64;
+    constexpr int side = 256;
     constexpr float golden = 0.61803399F; // its multiples are well spread between whole numbers
     double sum = 0.0;
     for (int i = 0; i < side; ++i)
