@@ -4,6 +4,9 @@
 // best of many frames counts, so that the ratio holds on a busy machine too. "smoothed" is the
 // picture as a recording writes it; the second ratio is that of smoothed to not smoothed.
 //
+// A second table compares surfaces of Rendered that mirror with matt ones: rough hills, and chrome
+// balls on matt hills. It is printed where Rendered is among the modes.
+//
 // usage: bench_display [MODE | TRIANGLES | SIZE]...   e.g. bench_display Rendered 1M 1280x720
 
 #include "bench/BareRayLoop.h"
@@ -14,7 +17,9 @@
 #include "engine/display/DisplayScene.h"
 
 #include <algorithm>
+#include <cmath>
 #include <cstdio>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -123,6 +128,96 @@ void measureMesh(const MeshSize& mesh_size, const Selection& selection) {
         }
 }
 
+/// How a scene is drawn where nothing in it mirrors, and as it is.
+struct Looks {
+    const char* name;
+    float hills_roughness;
+    bool has_chrome;
+};
+constexpr Looks looks_compared[] = {{"rough hills", 0.6F, false}, {"chrome balls", 1.0F, true}};
+
+std::shared_ptr<KM_Mesh> makeBall(const KM_3dPoint& middle, double radius) {
+    auto mesh = std::make_shared<KM_Mesh>();
+    constexpr std::uint32_t rings = 24;
+    constexpr std::uint32_t around = 2 * rings;
+    for (std::uint32_t j = 0; j <= rings; ++j)
+        for (std::uint32_t i = 0; i < around; ++i) {
+            const double polar = KM_PI * j / rings;
+            const double turn = KM_PI * i / rings;
+            const KM_3dVector n(std::sin(polar) * std::cos(turn), std::sin(polar) * std::sin(turn),
+                                std::cos(polar));
+            mesh->m_V.emplace_back(middle + radius * n);
+        }
+    for (std::uint32_t j = 0; j < rings; ++j)
+        for (std::uint32_t i = 0; i < around; ++i) {
+            const std::uint32_t a = j * around + i;
+            const std::uint32_t b = j * around + (i + 1) % around;
+            mesh->m_F.push_back({{a, a + around, b}});
+            mesh->m_F.push_back({{b, a + around, b + around}});
+        }
+    mesh->ComputeVertexNormals();
+    mesh->PadForRayTracing();
+    return mesh;
+}
+
+quarn::SceneContent lookedAt(const std::shared_ptr<const KM_Mesh>& hills, const Looks& looks,
+                             bool mirrors) {
+    quarn::SceneContent content = bench::sunlit(hills);
+    auto ground = std::make_shared<quarn::Material>();
+    auto chrome = std::make_shared<quarn::Material>();
+    if (mirrors) {
+        ground->roughness = looks.hills_roughness;
+        chrome->metalness = 1.0F;
+        chrome->roughness = 0.05F;
+    }
+    content.meshes[0].placed.material = ground;
+    for (int i = 0; looks.has_chrome && i < 8; ++i) {
+        const KM_3dPoint middle(-28.0 + 8.0 * i, -18.0 + 6.0 * (i % 3), 6.0);
+        content.meshes.push_back({{makeBall(middle, 3.5), chrome, {}}, KM_CreateUuid()});
+    }
+    return content;
+}
+
+void compareLooks(const MeshSize& mesh_size, const Looks& looks, const PictureSize& size) {
+    const auto hills = bench::makeHills(mesh_size.cells);
+    const auto mode = *quarn::findDisplayMode(quarn::rendered_mode_id);
+    double best[2][2] = {{1e9, 1e9}, {1e9, 1e9}}; // matt or not, plain or smoothed
+    quarn::DisplayScene scenes[2];
+    quarn::DisplayPipeline pipelines[2];
+    for (int i = 0; i < 2; ++i)
+        bench::require(scenes[i].update(lookedAt(hills, looks, i == 1)));
+    quarn::Image image;
+    bench::repeatFor(budget_of_row_ms, [&] {
+        for (int i = 0; i < 4; ++i) {
+            auto attributes = mode;
+            attributes.antialiasing_level = i / 2 * 2;
+            keepBest(best[i % 2][i / 2], [&] {
+                bench::require(pipelines[i % 2].draw(scenes[i % 2], bench::hillsView(), attributes,
+                                                     size.width, size.height, image));
+            });
+        }
+    });
+    std::printf("| %s | %s | %s | %.1f | %.1f | %.2f | %.1f | %.1f | %.2f |\n",
+                bench::inWords(hills->TriangleCount()).c_str(), size.word, looks.name, best[0][0],
+                best[1][0], best[1][0] / best[0][0], best[0][1], best[1][1],
+                best[1][1] / best[0][1]);
+    std::fflush(stdout);
+}
+
+void compareAllLooks(const Selection& selection) {
+    if (!selection.has(*quarn::findDisplayMode(quarn::rendered_mode_id)))
+        return;
+    std::printf("\nMilliseconds a frame of Rendered\n\n"
+                "| triangles | picture | what mirrors | matt | mirroring | ratio "
+                "| matt, smoothed | mirroring, smoothed | ratio |\n"
+                "|---|---|---|---|---|---|---|---|---|\n");
+    for (const MeshSize& mesh : mesh_sizes)
+        for (const PictureSize& picture : picture_sizes)
+            for (const Looks& looks : looks_compared)
+                if (selection.has(mesh) && selection.has(picture))
+                    compareLooks(mesh, looks, picture);
+}
+
 } // namespace
 
 int main(int count, char** words) {
@@ -133,5 +228,6 @@ int main(int count, char** words) {
     for (const MeshSize& size : mesh_sizes)
         if (selection.has(size))
             measureMesh(size, selection);
+    compareAllLooks(selection);
     return 0;
 }

@@ -18,6 +18,9 @@ namespace {
 constexpr int block_width = PixelMarks::block_width;
 constexpr int block_height = 32;
 
+/// Shadows on the ground of a mode to work with are found again with every change of the model.
+constexpr int directions_to_work_with = 64;
+
 /// After so many pictures of less than a quarter of the pixels the buffers of a large one go.
 constexpr int small_pictures_to_let_go = 64;
 
@@ -92,7 +95,9 @@ Result<void> DisplayPipeline::draw(const DisplayScene& scene, const KM_Viewport&
     }
     const float* const layers = frame.layer_nearness;
     if (frame.scene && frame.catches_shadows && frame.sky_reach <= 0.0F)
-        m_open_ground.find(frame, *m_kernel, scene.surfacesNumber());
+        m_open_ground.find(frame, *m_kernel, scene.surfacesNumber(),
+                           mode.surface_style == SurfaceStyle::studio ? directions_to_work_with
+                                                                      : ground_directions);
     drawSurfaces(frame, mode);
     if (has_lines)
         m_lines.draw(scene, frame.rays, mode,

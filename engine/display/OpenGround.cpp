@@ -36,7 +36,7 @@ FrameGroundMap mapUnder(const FrameSetup& frame) {
 }
 
 /// Directions, each for an equal part of the light that arrives at open ground.
-GroundDirections directionsOf(const FrameSetup& frame) {
+GroundDirections directionsOf(const FrameSetup& frame, int wanted) {
     FrameSetup open = frame;
     open.has_ground = false;
     double all = 0.0;
@@ -47,16 +47,17 @@ GroundDirections directionsOf(const FrameSetup& frame) {
         all += arrivingFrom(z, color);
     });
     GroundDirections directions{};
+    directions.count = wanted;
     double sum = 0.0;
     int count = 0;
     lookAround(open, [&](float x, float y, float z, const float(&color)[3]) {
         sum += arrivingFrom(z, color);
-        for (; count < ground_directions && sum * ground_directions > (count + 0.5) * all; ++count)
+        for (; count < wanted && sum * wanted > (count + 0.5) * all; ++count)
             for (int axis = 0; axis < 3; ++axis)
                 directions.toward[count][axis] = axis == 0 ? x : axis == 1 ? y : z;
     });
     // Where there is no light, no shadow is missed.
-    for (; count < ground_directions; ++count)
+    for (; count < wanted; ++count)
         directions.toward[count][2] = 1.0F;
     return directions;
 }
@@ -67,9 +68,10 @@ template <class T> bool areSame(const T& a, const T& b) {
 
 } // namespace
 
-void OpenGround::find(FrameSetup& frame, const RayKernel& kernel, std::uint64_t surfaces_number) {
+void OpenGround::find(FrameSetup& frame, const RayKernel& kernel, std::uint64_t surfaces_number,
+                      int directions_wanted) {
     FrameGroundMap map = mapUnder(frame);
-    const GroundDirections directions = directionsOf(frame);
+    const GroundDirections directions = directionsOf(frame, directions_wanted);
     const bool is_known = !m_open.empty() && surfaces_number == m_surfaces_number &&
                           areSame(map, m_map) && areSame(directions, m_directions);
     frame.ground_map = map;

@@ -16,7 +16,10 @@ public:
     /// Finds the map of `frame`, if it is not known yet, and lets the ray loops use it.
     /// @param frame            its ground and all its light are known
     /// @param surfaces_number  another one whenever the scene's surfaces are others
-    void find(FrameSetup& frame, const RayKernel& kernel, std::uint64_t surfaces_number);
+    /// @param directions       how many it looks in, up to ground_directions: more of them make
+    ///   smoother shadows and take longer
+    void find(FrameSetup& frame, const RayKernel& kernel, std::uint64_t surfaces_number,
+              int directions);
 
 private:
     std::vector<float> m_open;

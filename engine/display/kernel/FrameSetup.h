@@ -118,6 +118,7 @@ struct FrameGroundMap {
 inline constexpr int ground_directions = 256;
 struct GroundDirections {
     float toward[ground_directions][3];
+    int count; ///< of those that are used
 };
 
 /// Everything that the ray loops need for one picture; plain numbers and pointers, because the

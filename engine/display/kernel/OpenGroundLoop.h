@@ -47,9 +47,10 @@ void findOpenGround(const FrameSetup& frame, const GroundDirections& directions,
         const LaneVectors place{(column + 0.5F) * (1.0F / map.texels_a_unit[0]) + map.corner[0], y,
                                 frame.ground_height};
         Lanes arriving = 0.0F;
-        for (const auto& toward : directions.toward)
-            arriving = arriving + arrivingOnGround(frame, place, toward);
-        const Lanes kept_off = Lanes(1.0F) - arriving * (1.0F / ground_directions);
+        for (int i = 0; i < directions.count; ++i)
+            arriving = arriving + arrivingOnGround(frame, place, directions.toward[i]);
+        const Lanes kept_off =
+            Lanes(1.0F) - arriving * (1.0F / static_cast<float>(directions.count));
         const Lanes result = Lanes(1.0F) - kept_off * withinMap(column, row);
         alignas(64) float values[lane_count];
         store(values, result);

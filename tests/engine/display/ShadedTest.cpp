@@ -116,6 +116,24 @@ TEST(Shaded, GroundRunsIntoTheBackdropWithoutABorder) {
         EXPECT_NEAR(brightness(image, 5, y), brightness(image, 5, y - 1), 4.0) << y;
 }
 
+TEST(Shaded, ModelsDarkenTheGroundWhereTheyStand) {
+    SceneContent content;
+    addMesh(content, sphereMesh({0.0, 0.0, 1.0}, 1.0F, 48), {255, 255, 255, 255});
+    const auto view = perspectiveView({0, -12, 3}, {0, 0, 0.5});
+    const Image image = drawn(content, view, modeNamed(L"Shaded"), size, size);
+    DisplayModeAttributes without = modeNamed(L"Shaded");
+    without.has_ground_plane = false;
+    const Image backdrop = drawn(content, view, without, size, size);
+    int darker = 0;
+    for (int y = 0; y < size; ++y)
+        for (int x = 0; x < size; ++x) {
+            EXPECT_LE(brightness(image, x, y), brightness(backdrop, x, y) + 1.0);
+            darker += brightness(image, x, y) < brightness(backdrop, x, y) - 10.0 ? 1 : 0;
+        }
+    EXPECT_GT(darker, 50);
+    EXPECT_LT(darker, size * size / 8);
+}
+
 TEST(Shaded, MetalShowsTheStudioAndNoNeighbours) {
     const auto ball = [](float metalness, float roughness, bool has_neighbour) {
         SceneContent content;
