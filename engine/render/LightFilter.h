@@ -1,49 +1,61 @@
 #pragma once
 
+#include "engine/render/PixelPlane.h"
 #include "engine/render/RenderLayers.h"
 
-#include <vector>
+#include <span>
 
 namespace quarn {
 
+/// One kind of light among the sums of a picture.
+struct LightSums {
+    int first;         ///< its red
+    int square;        ///< the square of its brightness
+    bool times_albedo; ///< the surfaces' own colours are in it
+};
+
+inline constexpr LightSums sky_sums{RenderPlane::sky_r, RenderPlane::sky_square, true};
+inline constexpr LightSums sun_sums{RenderPlane::sun_r, RenderPlane::sun_square, true};
+inline constexpr LightSums gloss_sums{RenderPlane::gloss_r, RenderPlane::gloss_square, false};
+
 /// Light without the colour of the surface, for each pixel, and how uncertain it is.
 struct LightImage {
-    std::vector<float> color[3];
-    std::vector<float> variance; ///< of its brightness
+    LightImage(int width, int height);
+
+    PixelPlane color[3];
+    PixelPlane variance; ///< of its brightness
 };
 
 /// Takes noise out of sampled light, by averages over surfaces and never over edges. The surer the
-/// samples are, the less it changes; shadows keep their borders.
+/// samples are, the less it changes; shadows and mirrored pictures keep their borders.
 class LightFilter {
 public:
-    /// @param scene_size  in a parallel view, the size of what is seen, model units; else 0
+    /// @param parallel_scene_size  in a parallel view, the size of what is seen, model units; else 0
     LightFilter(const RenderLayers& layers, float parallel_scene_size, const RenderKernel& kernel);
 
-    /// The light of one kind.
-    /// @param first   RenderPlane::sky_r or sun_r
-    /// @param square  RenderPlane::sky_square or sun_square
-    /// @return the filtered light; valid until the next call
-    const LightImage& filtered(int first, int square);
+    /// Filters up to two kinds of light, which takes little longer than one.
+    /// @return an image of each; valid until the next call
+    std::span<const LightImage> filtered(std::span<const LightSums> kinds);
 
     /// Bytes that a pixel takes.
-    static constexpr std::size_t bytes_per_pixel = 16 * sizeof(float);
+    static constexpr std::size_t bytes_per_pixel = 24 * sizeof(float);
 
 private:
     void readGuides();
     void readSlopes();
-    void readLight(int first, int square);
-    void smoothVariance();
-    void pass(int step);
+    void readLight(const LightSums& kind, LightImage& image, PixelPlane& variance) const;
+    void smoothVariance(const PixelPlane& from, PixelPlane& to) const;
+    void pass(int step, int light_count);
 
     const RenderLayers& m_layers;
     const RenderKernel& m_kernel;
-    std::vector<float> m_normal[3];
-    std::vector<float> m_nearness;
-    std::vector<float> m_slope[2];
-    std::vector<float> m_cover;
-    LightImage m_light;
-    LightImage m_other;
-    std::vector<float> m_weight;
+    PixelPlane m_normal[3];
+    PixelPlane m_nearness;
+    PixelPlane m_slope[2];
+    PixelPlane m_tolerance;
+    PixelPlane m_cover;
+    LightImage m_lights[most_filter_lights];
+    LightImage m_others[most_filter_lights];
     float m_nearness_share;
     float m_nearness_tolerance;
 };

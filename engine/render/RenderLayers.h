@@ -1,11 +1,10 @@
 #pragma once
 
+#include "engine/render/AlignedNumbers.h"
 #include "engine/render/kernel/RenderSetup.h"
 
 #include <cstddef>
 #include <cstdint>
-#include <memory>
-#include <vector>
 
 namespace quarn {
 
@@ -28,10 +27,6 @@ public:
     static constexpr std::size_t bytes_per_pixel = RenderPlane::count * sizeof(float);
 
 private:
-    struct alignas(64) Line {
-        float values[lane_count];
-    };
-
     std::size_t offset(int x, int y) const {
         const auto column = static_cast<std::size_t>(x);
         const auto row = static_cast<std::size_t>(y);
@@ -43,7 +38,7 @@ private:
     int m_width;
     int m_height;
     RenderSums m_sums;
-    std::vector<Line> m_storage;
+    AlignedNumbers m_storage;
 };
 
 } // namespace quarn
