@@ -13,17 +13,11 @@ namespace {
 /// How far nearness may deviate from a plane, as a share of the distance or of the scene.
 constexpr float plane_tolerance = 0.004F;
 
-/// Below this albedo a channel tells nothing of the light.
-constexpr float least_albedo = 0.02F;
-
 /// The variance of a few samples says little; then it is taken to be as large as the light.
 constexpr int few_samples = 4;
 
 /// From so many on a pixel's own variance is sure enough.
 constexpr int many_samples = 32;
-
-/// Differences of up to so many standard deviations, squared, are taken for noise.
-constexpr float noise_spread = 9.0F;
 
 template <class Work> void forRows(const RenderLayers& layers, const Work& work) {
     tbb::parallel_for(0, layers.height(), [&](int y) { work(y); });
@@ -35,15 +29,6 @@ float slope(float before, float own, float behind) {
     return std::isfinite(step) ? step : 0.0F;
 }
 
-/// Light of a pixel without albedo. A channel in which the surface is black takes the light of the
-/// channel in which it is brightest.
-void withoutAlbedo(const float (&sum)[3], const float (&albedo)[3], float (&light)[3]) {
-    const auto brightest = std::max_element(albedo, albedo + 3) - albedo;
-    const float sure = albedo[brightest] > 0.0F ? sum[brightest] / albedo[brightest] : 0.0F;
-    for (int c = 0; c < 3; ++c)
-        light[c] = albedo[c] > least_albedo * albedo[brightest] ? sum[c] / albedo[c] : sure;
-}
-
 } // namespace
 
 LightImage::LightImage(int width, int height) : variance(width, height) {
@@ -53,12 +38,12 @@ LightImage::LightImage(int width, int height) : variance(width, height) {
 
 LightFilter::LightFilter(const RenderLayers& layers, float parallel_scene_size,
                          const RenderKernel& kernel)
-    : m_layers(layers), m_kernel(kernel),
+    : m_layers(layers), m_kernel(kernel), m_fit(layers, parallel_scene_size), 
       m_lights{{layers.width(), layers.height()}, {layers.width(), layers.height()}},
       m_others{{layers.width(), layers.height()}, {layers.width(), layers.height()}},
       m_nearness_share(parallel_scene_size > 0.0F ? 0.0F : plane_tolerance),
       m_nearness_tolerance(plane_tolerance * parallel_scene_size + 1e-20F) {
-    for (PixelPlane* plane : {&m_normal[0], &m_normal[1], &m_normal[2], &m_nearness, &m_slope[0],
+    for (PixelPlane* plane : {&m_fitted[0], &m_fitted[1], &m_fitted[2], &m_normal[0], &m_normal[1], &m_normal[2], &m_nearness, &m_slope[0],
                               &m_slope[1], &m_tolerance, &m_cover})
         *plane = PixelPlane(layers.width(), layers.height());
     readGuides();
@@ -152,7 +137,7 @@ void LightFilter::smoothVariance(const PixelPlane& from, PixelPlane& to) const {
     });
 }
 
-void LightFilter::pass(int step, int light_count) {
+void LightFilter::pass(int step, std::span<const LightSums> kinds) {
     tbb::parallel_for(0, m_layers.height(), [&](int y) {
         FilterRow row;
         row.width = m_layers.width();
@@ -167,8 +152,8 @@ void LightFilter::pass(int step, int light_count) {
         row.guides.slope_y = m_slope[1].row(y);
         row.guides.tolerance = m_tolerance.row(y);
         row.guides.cover = m_cover.row(y);
-        row.light_count = light_count;
-        for (int k = 0; k < light_count; ++k) {
+        row.light_count = static_cast<int>(kinds.size());
+        for (std::size_t k = 0; k < kinds.size(); ++k) {
             FilterLight& light = row.lights[k];
             for (int c = 0; c < 3; ++c) {
                 light.color[c] = m_lights[k].color[c].row(y);
@@ -176,12 +161,31 @@ void LightFilter::pass(int step, int light_count) {
             }
             light.variance = m_lights[k].variance.row(y);
             light.out_variance = m_others[k].variance.row(y);
-            light.spread = noise_spread;
+            light.across_surfaces = kinds[k].follows_surfaces;
+            light.spread = kinds[k].spread;
         }
         m_kernel.filter_row(row);
     });
-    for (int k = 0; k < light_count; ++k)
+    for (std::size_t k = 0; k < kinds.size(); ++k)
         std::swap(m_lights[k], m_others[k]);
+}
+
+void LightFilter::takeFitOut(LightImage& image) const {
+    forRows(m_layers, [&](int y) {
+        for (int c = 0; c < 3; ++c)
+            for (int x = 0; x < m_layers.width(); ++x)
+                image.color[c].row(y)[x] -= m_fitted[c].row(y)[x];
+    });
+}
+
+void LightFilter::addFit(LightImage& image) const {
+    forRows(m_layers, [&](int y) {
+        for (int c = 0; c < 3; ++c)
+            for (int x = 0; x < m_layers.width(); ++x) {
+                float& light = image.color[c].row(y)[x];
+                light = std::max(light + m_fitted[c].row(y)[x], 0.0F);
+            }
+    });
 }
 
 std::span<const LightImage> LightFilter::filtered(std::span<const LightSums> kinds) {
@@ -189,8 +193,15 @@ std::span<const LightImage> LightFilter::filtered(std::span<const LightSums> kin
         readLight(kinds[k], m_lights[k], m_others[k].variance);
         smoothVariance(m_others[k].variance, m_lights[k].variance);
     }
+    const bool is_fitted = kinds.front().follows_surfaces;
+    if (is_fitted) {
+        m_fit.fit(kinds.front(), m_fitted);
+        takeFitOut(m_lights[0]);
+    }
     for (const int step : {1, 2, 4, 8})
-        pass(step, static_cast<int>(kinds.size()));
+        pass(step, kinds);
+    if (is_fitted)
+        addFit(m_lights[0]);
     return {m_lights, kinds.size()};
 }
 

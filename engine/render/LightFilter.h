@@ -1,22 +1,12 @@
 #pragma once
 
+#include "engine/render/LightFit.h"
 #include "engine/render/PixelPlane.h"
 #include "engine/render/RenderLayers.h"
 
 #include <span>
 
 namespace quarn {
-
-/// One kind of light among the sums of a picture.
-struct LightSums {
-    int first;         ///< its red
-    int square;        ///< the square of its brightness
-    bool times_albedo; ///< the surfaces' own colours are in it
-};
-
-inline constexpr LightSums sky_sums{RenderPlane::sky_r, RenderPlane::sky_square, true};
-inline constexpr LightSums sun_sums{RenderPlane::sun_r, RenderPlane::sun_square, true};
-inline constexpr LightSums gloss_sums{RenderPlane::gloss_r, RenderPlane::gloss_square, false};
 
 /// Light without the colour of the surface, for each pixel, and how uncertain it is.
 struct LightImage {
@@ -27,25 +17,30 @@ struct LightImage {
 };
 
 /// Takes noise out of sampled light, by averages over surfaces and never over edges. The surer the
-/// samples are, the less it changes; shadows and mirrored pictures keep their borders.
+/// samples are, the less it changes; shadows and mirrored pictures keep their borders. Of light that
+/// follows surfaces it averages what its fit leaves over.
 class LightFilter {
 public:
     /// @param parallel_scene_size  in a parallel view, the size of what is seen, model units; else 0
     LightFilter(const RenderLayers& layers, float parallel_scene_size, const RenderKernel& kernel);
 
-    /// Filters up to two kinds of light, which takes little longer than one.
+    /// Filters up to two kinds of light, which takes little longer than one; the first alone may
+    /// be one that follows surfaces.
     /// @return an image of each; valid until the next call
     std::span<const LightImage> filtered(std::span<const LightSums> kinds);
 
     /// Bytes that a pixel takes.
-    static constexpr std::size_t bytes_per_pixel = 24 * sizeof(float);
+    static constexpr std::size_t bytes_per_pixel =
+        27 * sizeof(float) + LightFit::bytes_per_pixel;
 
 private:
     void readGuides();
     void readSlopes();
     void readLight(const LightSums& kind, LightImage& image, PixelPlane& variance) const;
     void smoothVariance(const PixelPlane& from, PixelPlane& to) const;
-    void pass(int step, int light_count);
+    void takeFitOut(LightImage& image) const;
+    void addFit(LightImage& image) const;
+    void pass(int step, std::span<const LightSums> kinds);
 
     const RenderLayers& m_layers;
     const RenderKernel& m_kernel;
@@ -54,6 +49,8 @@ private:
     PixelPlane m_slope[2];
     PixelPlane m_tolerance;
     PixelPlane m_cover;
+    LightFit m_fit;
+    PixelPlane m_fitted[3];
     LightImage m_lights[most_filter_lights];
     LightImage m_others[most_filter_lights];
     float m_nearness_share;

@@ -5,6 +5,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <vector>
 
 namespace quarn {
 
@@ -16,6 +17,9 @@ public:
     int width() const { return m_width; }
     int height() const { return m_height; }
     RenderSums sums() const { return m_sums; }
+
+    /// Not 0 for the tiles that get no more samples, see RenderSums.
+    std::vector<std::uint8_t>& done() { return m_done; }
 
     /// A sum of one pixel.
     float at(int plane, int x, int y) const { return m_sums.planes[plane][offset(x, y)]; }
@@ -39,6 +43,7 @@ private:
     int m_height;
     RenderSums m_sums;
     AlignedNumbers m_storage;
+    std::vector<std::uint8_t> m_done;
 };
 
 } // namespace quarn

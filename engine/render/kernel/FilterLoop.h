@@ -54,7 +54,7 @@ inline Lanes sameSurface(const FilterGuides& guides, const GuideLanes& own, std:
     const Lanes expected = own.nearness + own.slope_x * tap.dx + own.slope_y * tap.dy;
     const Lanes off = magnitude(loadAnywhere(guides.nearness + q) - expected);
     const Lanes same_plane = greatest(Lanes(1.0F) - off * own.tolerance, 0.0F);
-    return along16 * along16 * same_plane * (loadAnywhere(guides.cover + q) * tap.weight);
+    return along16 * along16 * same_plane;
 }
 
 /// Light of sixteen pixels, or sums of it.
@@ -70,15 +70,16 @@ inline Lanes brightnessOf(const LaneColors& c) {
 
 /// Adds what the pixels from `q` on tell of the light, all the more the less it differs beyond
 /// what noise explains.
+/// @param surface  how much they tell by what they show
 inline void addTap(const FilterLight& light, const LightLanes& own, std::ptrdiff_t q,
-                   const Lanes& same_surface, LightLanes& sum) {
+                   const Lanes& surface, LightLanes& sum) {
     const LaneColors color{loadAnywhere(light.color[0] + q), loadAnywhere(light.color[1] + q),
                            loadAnywhere(light.color[2] + q)};
     const Lanes variance = loadAnywhere(light.variance + q);
     const Lanes step = brightnessOf(color - own.color);
     const Lanes noise = (own.variance + variance) * light.spread + 1e-9F;
     const Lanes alike = greatest(Lanes(1.0F) - step * step / noise, 0.0F);
-    const Lanes weight = same_surface * alike * alike;
+    const Lanes weight = surface * alike * alike;
     sum.color = sum.color + color * weight;
     sum.variance = sum.variance + variance * (weight * weight);
     sum.weight = sum.weight + weight;
@@ -108,9 +109,11 @@ template <int light_count> void filterSixteen(const FilterRow& row, std::ptrdiff
             const int dx = i * row.step;
             const Tap tap{dy * row.stride + dx, spline[i + 2] * spline[j + 2],
                           static_cast<float>(dx), static_cast<float>(dy)};
-            const Lanes same = sameSurface(row.guides, guides, x + tap.offset, tap);
+            const Lanes any = loadAnywhere(row.guides.cover + x + tap.offset) * tap.weight;
+            const Lanes same = any * sameSurface(row.guides, guides, x + tap.offset, tap);
             for (int k = 0; k < light_count; ++k)
-                addTap(row.lights[k], own[k], x + tap.offset, same, sum[k]);
+                addTap(row.lights[k], own[k], x + tap.offset,
+                       row.lights[k].across_surfaces ? any : same, sum[k]);
         }
     }
     for (int k = 0; k < light_count; ++k) {

@@ -108,6 +108,7 @@ struct FilterLight {
     const float* variance = nullptr; ///< of its brightness
     float* out[3] = {};
     float* out_variance = nullptr;
+    bool across_surfaces = false; ///< it is averaged over edges too
     float spread = 1.0F; ///< squared difference of brightness over variance where weights end
 };
 
