@@ -25,7 +25,8 @@ template <class Work> void forRows(const RenderLayers& layers, const Work& work)
 
 /// The smaller step of the two to either side, so that an edge on one side does not count.
 float slope(float before, float own, float behind) {
-    const float step = std::fabs(own - before) < std::fabs(behind - own) ? own - before : behind - own;
+    const float step =
+        std::fabs(own - before) < std::fabs(behind - own) ? own - before : behind - own;
     return std::isfinite(step) ? step : 0.0F;
 }
 
@@ -38,13 +39,15 @@ LightImage::LightImage(int width, int height) : variance(width, height) {
 
 LightFilter::LightFilter(const RenderLayers& layers, float parallel_scene_size,
                          const RenderKernel& kernel)
-    : m_layers(layers), m_kernel(kernel), m_fit(layers, parallel_scene_size), 
-      m_lights{{layers.width(), layers.height()}, {layers.width(), layers.height()}},
+    : m_layers(layers), m_kernel(kernel),
+      m_fit(layers, parallel_scene_size), m_lights{{layers.width(), layers.height()},
+                                                   {layers.width(), layers.height()}},
       m_others{{layers.width(), layers.height()}, {layers.width(), layers.height()}},
       m_nearness_share(parallel_scene_size > 0.0F ? 0.0F : plane_tolerance),
       m_nearness_tolerance(plane_tolerance * parallel_scene_size + 1e-20F) {
-    for (PixelPlane* plane : {&m_fitted[0], &m_fitted[1], &m_fitted[2], &m_normal[0], &m_normal[1], &m_normal[2], &m_nearness, &m_slope[0],
-                              &m_slope[1], &m_tolerance, &m_cover})
+    for (PixelPlane* plane :
+         {&m_fitted[0], &m_fitted[1], &m_fitted[2], &m_normal[0], &m_normal[1], &m_normal[2],
+          &m_nearness, &m_slope[0], &m_slope[1], &m_tolerance, &m_cover})
         *plane = PixelPlane(layers.width(), layers.height());
     readGuides();
     readSlopes();
@@ -77,8 +80,8 @@ void LightFilter::readSlopes() {
         const float* const near = m_nearness.row(y);
         const std::ptrdiff_t stride = m_nearness.stride();
         for (int x = 0; x <= last_x; ++x) {
-            const float across = slope(x > 0 ? near[x - 1] : INFINITY, near[x],
-                                       x < last_x ? near[x + 1] : INFINITY);
+            const float across =
+                slope(x > 0 ? near[x - 1] : INFINITY, near[x], x < last_x ? near[x + 1] : INFINITY);
             const float down = slope(y > 0 ? near[x - stride] : INFINITY, near[x],
                                      y < last_y ? near[x + stride] : INFINITY);
             m_slope[0].row(y)[x] = across;
@@ -99,14 +102,14 @@ void LightFilter::readLight(const LightSums& kind, LightImage& image, PixelPlane
             float light[3];
             for (int c = 0; c < 3; ++c) {
                 sum[c] = m_layers.at(kind.first + c, x, y);
-                albedo[c] = kind.times_albedo ? m_layers.at(RenderPlane::albedo_r + c, x, y) : cover;
+                albedo[c] =
+                    kind.times_albedo ? m_layers.at(RenderPlane::albedo_r + c, x, y) : cover;
             }
             withoutAlbedo(sum, albedo, light);
             for (int c = 0; c < 3; ++c)
                 image.color[c].row(y)[x] = light[c];
             const float brightness = 0.2126F * light[0] + 0.7152F * light[1] + 0.0722F * light[2];
-            const float mean_square =
-                cover > 0.0F ? m_layers.at(kind.square, x, y) / cover : 0.0F;
+            const float mean_square = cover > 0.0F ? m_layers.at(kind.square, x, y) / cover : 0.0F;
             const float spread = samples < few_samples
                                      ? mean_square
                                      : std::max(0.0F, mean_square - brightness * brightness);

@@ -17,11 +17,12 @@ struct LightImage {
 };
 
 /// Takes noise out of sampled light, by averages over surfaces and never over edges. The surer the
-/// samples are, the less it changes; shadows and mirrored pictures keep their borders. Of light that
-/// follows surfaces it averages what its fit leaves over.
+/// samples are, the less it changes; shadows and mirrored pictures keep their borders. Of light
+/// that follows surfaces it averages what its fit leaves over.
 class LightFilter {
 public:
-    /// @param parallel_scene_size  in a parallel view, the size of what is seen, model units; else 0
+    /// @param parallel_scene_size  in a parallel view, the size of what is seen, model units; else
+    /// 0
     LightFilter(const RenderLayers& layers, float parallel_scene_size, const RenderKernel& kernel);
 
     /// Filters up to two kinds of light, which takes little longer than one; the first alone may
@@ -30,8 +31,7 @@ public:
     std::span<const LightImage> filtered(std::span<const LightSums> kinds);
 
     /// Bytes that a pixel takes.
-    static constexpr std::size_t bytes_per_pixel =
-        27 * sizeof(float) + LightFit::bytes_per_pixel;
+    static constexpr std::size_t bytes_per_pixel = 27 * sizeof(float) + LightFit::bytes_per_pixel;
 
 private:
     void readGuides();

@@ -16,7 +16,8 @@ namespace quarn {
 /// Renderings", Computer Graphics Forum 35(4), 2016).
 class LightFit {
 public:
-    /// @param parallel_scene_size  in a parallel view, the size of what is seen, model units; else 0
+    /// @param parallel_scene_size  in a parallel view, the size of what is seen, model units; else
+    /// 0
     LightFit(const RenderLayers& layers, float parallel_scene_size);
 
     /// @param fitted  takes the red, green and blue of the light, without the albedo that is in it

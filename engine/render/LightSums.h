@@ -20,7 +20,7 @@ struct LightSums {
 inline constexpr LightSums sky_sums{RenderPlane::sky_r, RenderPlane::sky_square, true, true, 9.0F};
 inline constexpr LightSums sun_sums{RenderPlane::sun_r, RenderPlane::sun_square, true, false, 1.0F};
 inline constexpr LightSums gloss_sums{RenderPlane::gloss_r, RenderPlane::gloss_square, false, false,
-                                      4.0F};
+                                      9.0F};
 
 /// Light of a pixel without albedo. A channel in which the surface is black takes the light of the
 /// channel in which it is brightest.

@@ -9,7 +9,6 @@
 #include <algorithm>
 #include <bit>
 #include <chrono>
-#include <cstdlib>
 
 namespace quarn {
 
@@ -21,6 +20,12 @@ constexpr int block_height = 32;
 constexpr int samples_at_once = 32;
 
 constexpr double batch_seconds = 0.05;
+
+/// With fewer a tile is not stopped: thin things would be missed. A look at a picture of few
+/// samples is to be quick.
+int leastSamples(int samples) {
+    return samples <= 8 ? 4 : 8;
+}
 
 int columnsOf(const RenderLayers& layers) {
     return (layers.width() + block_width - 1) / block_width;
@@ -45,7 +50,6 @@ int SampleTaking::passEnd(int first, bool grows_evenly) const {
 
 RenderEnd SampleTaking::run(bool grows_evenly, const Pause& pause) {
     TileStopping stopping(m_layers, m_samples);
-    const bool nostop = std::getenv("NOSTOP");
     for (int first = 0; first < m_samples;) {
         const int end = passEnd(first, grows_evenly);
         for (int finished = 0; finished < m_blocks;) {
@@ -57,7 +61,7 @@ RenderEnd SampleTaking::run(bool grows_evenly, const Pause& pause) {
             finished = next;
         }
         first = end;
-        if (first >= TileStopping::least_samples && first < m_samples && !nostop && !stopping.stopGoodTiles())
+        if (first >= leastSamples(m_samples) && first < m_samples && !stopping.stopGoodTiles())
             break;
     }
     return RenderEnd::done;

@@ -7,23 +7,26 @@
 #include <algorithm>
 #include <bit>
 #include <cmath>
-#include <cstdlib>
 
 namespace quarn {
 
 namespace {
 
-float envf(const char* n, float d) { const char* v = std::getenv(n); return v ? float(std::atof(v)) : d; }
+/// Steps of 255 that a picture of one sample may be wrong by; of more samples less, as noise is.
+constexpr float tolerance_of_one = 4.0F;
 
-/// Steps of 255 that a pixel of one sample may be wrong by; of more samples less, as noise is.
-const float tolerance_of_one = envf("TOL", 4.0F);
+/// Parts of the noise that the filter leaves on one flat surface: of light from all around, and of
+/// the suns', whose borders it keeps.
+constexpr float left_of_sky = 0.2F;
+constexpr float left_of_sun = 0.6F;
 
-/// What the filter leaves of the noise of light on a flat surface.
-const float left_by_filter = envf("LEFT", 0.2F);
-const float left_sun = envf("SUN", 0.6F);
-const float impure = envf("IMP", 8.0F);
-const float neigh = envf("NEIGH", 0.5F);
+/// How much more it leaves where surfaces meet.
+constexpr float left_by_mixture = 8.0F;
 
+/// A tile's own error may have been missed by chance: that of a neighbour counts half.
+constexpr float share_of_neighbours = 0.5F;
+
+/// The brightness of a sum of colours.
 struct HalvedSum {
     float mean;
     float error; ///< half the difference of the halves' means
@@ -40,8 +43,8 @@ public:
     float value(int plane) const { return m_sums.planes[plane][m_at]; }
 
     HalvedSum halved(int first, int even_plane) const {
-        const float all = 0.2126F * value(first) + 0.7152F * value(first + 1) +
-                          0.0722F * value(first + 2);
+        const float all =
+            0.2126F * value(first) + 0.7152F * value(first + 1) + 0.0722F * value(first + 2);
         const float even = value(even_plane);
         return {all / (m_even + m_odd), 0.5F * (even / m_even - (all - even) / m_odd)};
     }
@@ -89,17 +92,13 @@ float errorOfPixel(const TilePixel& pixel) {
     const HalvedSum gloss = pixel.halved(RenderPlane::gloss_r, RenderPlane::even_gloss);
     const float per_albedo = albedo.mean > 0.0F ? 1.0F / albedo.mean : 0.0F;
     const float of_albedo = albedo.error * per_albedo;
-    const float smoothed =
-        std::min(1.0F, left_by_filter + impure * (1.0F - std::min(pixel.purity(), 1.0F)));
-    const float smoothed_sun =
-        std::min(1.0F, left_sun + impure * (1.0F - std::min(pixel.purity(), 1.0F)));
+    const float mixed = left_by_mixture * (1.0F - std::min(pixel.purity(), 1.0F));
+    const float of_sky = std::min(left_of_sky + mixed, 1.0F) * (sky.error - of_albedo * sky.mean);
+    const float of_sun = std::min(left_of_sun + mixed, 1.0F) * (sun.error - of_albedo * sun.mean);
     const float sharp = direct.error + gloss.error + of_albedo * (sky.mean + sun.mean);
-    const float of_sky = smoothed * (sky.error - of_albedo * sky.mean);
-    const float of_sun = smoothed_sun * (sun.error - of_albedo * sun.mean);
-    const float steps =
-        steepness(direct.mean + sky.mean + sun.mean + gloss.mean);
-    const float total = sharp + of_sun + of_sky;
-    return total * total * steps * steps;
+    const float error =
+        (sharp + of_sun + of_sky) * steepness(direct.mean + sky.mean + sun.mean + gloss.mean);
+    return error * error;
 }
 
 } // namespace
@@ -118,29 +117,32 @@ float TileStopping::errorOf(std::size_t tile) const {
     return sum / lane_count;
 }
 
+std::size_t TileStopping::tileAt(int column, int row) const {
+    return static_cast<std::size_t>(row) * static_cast<std::size_t>(m_columns) +
+           static_cast<std::size_t>(column);
+}
+
 float TileStopping::errorAround(int column, int row) const {
     float worst = 0.0F;
     for (int y = std::max(row - 1, 0); y <= std::min(row + 1, m_rows - 1); ++y)
         for (int x = std::max(column - 1, 0); x <= std::min(column + 1, m_columns - 1); ++x) {
-            const float error = m_errors[static_cast<std::size_t>(y) * static_cast<std::size_t>(m_columns) + static_cast<std::size_t>(x)];
-            worst = std::max(worst, y == row && x == column ? error : neigh * error);
+            const float error = m_errors[tileAt(x, y)];
+            worst = std::max(worst, y == row && x == column ? error : share_of_neighbours * error);
         }
     return worst;
 }
 
 bool TileStopping::stopGoodTiles() {
     std::vector<std::uint8_t>& done = m_layers.done();
-    const auto columns = static_cast<std::size_t>(m_columns);
     tbb::parallel_for(0, m_rows, [&](int row) {
-        const std::size_t begin = static_cast<std::size_t>(row) * columns;
-        for (std::size_t tile = begin; tile < begin + columns; ++tile)
+        for (std::size_t tile = tileAt(0, row); tile < tileAt(0, row + 1); ++tile)
             if (!done[tile])
                 m_errors[tile] = errorOf(tile);
     });
     tbb::parallel_for(0, m_rows, [&](int row) {
         for (int column = 0; column < m_columns; ++column)
             if (errorAround(column, row) <= m_tolerance)
-                done[static_cast<std::size_t>(row) * columns + static_cast<std::size_t>(column)] = 1;
+                done[tileAt(column, row)] = 1;
     });
     return std::find(done.begin(), done.end(), 0) != done.end();
 }

@@ -17,15 +17,13 @@ public:
     TileStopping(RenderLayers& layers, int samples);
 
     /// Stops every tile whose error, and that of the tiles around it, is small enough. All tiles
-    /// that are not done have the same number of samples, at least least_samples.
+    /// that are not done have the same number of samples, at least two.
     /// @return whether a tile is left
     bool stopGoodTiles();
 
-    /// With fewer samples nothing is known of the error.
-    static constexpr int least_samples = 4;
-
 private:
     float errorOf(std::size_t tile) const;
+    std::size_t tileAt(int column, int row) const;
     float errorAround(int column, int row) const;
 
     RenderLayers& m_layers;

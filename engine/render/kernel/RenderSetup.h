@@ -94,12 +94,12 @@ struct RenderSums {
 
 /// What a light filter's pass knows of the surfaces that pixels show.
 struct FilterGuides {
-    const float* normal[3] = {};         ///< unit vectors; zero where nothing is
-    const float* nearness = nullptr;     ///< linear on flat surfaces
-    const float* slope_x = nullptr;      ///< its change from pixel to pixel
+    const float* normal[3] = {};     ///< unit vectors; zero where nothing is
+    const float* nearness = nullptr; ///< linear on flat surfaces
+    const float* slope_x = nullptr;  ///< its change from pixel to pixel
     const float* slope_y = nullptr;
-    const float* tolerance = nullptr;    ///< 1 / how far nearness may be off a plane
-    const float* cover = nullptr;        ///< how much of a pixel surfaces fill; 0 beside rows
+    const float* tolerance = nullptr; ///< 1 / how far nearness may be off a plane
+    const float* cover = nullptr;     ///< how much of a pixel surfaces fill; 0 beside rows
 };
 
 /// Light that a pass smooths.
