@@ -13,177 +13,199 @@ namespace {
 /// How far nearness may deviate from a plane, as a share of the distance or of the scene.
 constexpr float plane_tolerance = 0.004F;
 
-/// Below this albedo a channel tells nothing of the light.
-constexpr float least_albedo = 0.02F;
-
 /// The variance of a few samples says little; then it is taken to be as large as the light.
 constexpr int few_samples = 4;
 
 /// From so many on a pixel's own variance is sure enough.
 constexpr int many_samples = 32;
 
-/// Differences of up to so many standard deviations, squared, are taken for noise.
-constexpr float noise_spread = 9.0F;
-
-std::size_t pixelCount(const RenderLayers& layers) {
-    return static_cast<std::size_t>(layers.width()) * static_cast<std::size_t>(layers.height());
-}
-
-/// For all pixels, row by row: work(pixel, x, y).
-template <class Work> void forPixels(const RenderLayers& layers, const Work& work) {
-    tbb::parallel_for(0, layers.height(), [&](int y) {
-        const std::size_t start =
-            static_cast<std::size_t>(y) * static_cast<std::size_t>(layers.width());
-        for (int x = 0; x < layers.width(); ++x)
-            work(start + static_cast<std::size_t>(x), x, y);
-    });
+template <class Work> void forRows(const RenderLayers& layers, const Work& work) {
+    tbb::parallel_for(0, layers.height(), [&](int y) { work(y); });
 }
 
 /// The smaller step of the two to either side, so that an edge on one side does not count.
-float slope(const std::vector<float>& plane, std::size_t at, std::size_t stride, bool has_before,
-            bool has_behind) {
-    const float before = has_before ? plane[at] - plane[at - stride] : INFINITY;
-    const float behind = has_behind ? plane[at + stride] - plane[at] : INFINITY;
-    const float least = std::fabs(before) < std::fabs(behind) ? before : behind;
-    return std::isfinite(least) ? least : 0.0F;
-}
-
-/// Light of a pixel without albedo. A channel in which the surface is black takes the light of the
-/// channel in which it is brightest.
-void withoutAlbedo(const float (&sum)[3], const float (&albedo)[3], float (&light)[3]) {
-    const auto brightest = std::max_element(albedo, albedo + 3) - albedo;
-    const float sure = albedo[brightest] > 0.0F ? sum[brightest] / albedo[brightest] : 0.0F;
-    for (int c = 0; c < 3; ++c)
-        light[c] = albedo[c] > least_albedo * albedo[brightest] ? sum[c] / albedo[c] : sure;
+float slope(float before, float own, float behind) {
+    const float step =
+        std::fabs(own - before) < std::fabs(behind - own) ? own - before : behind - own;
+    return std::isfinite(step) ? step : 0.0F;
 }
 
 } // namespace
 
+LightImage::LightImage(int width, int height) : variance(width, height) {
+    for (PixelPlane& plane : color)
+        plane = PixelPlane(width, height);
+}
+
 LightFilter::LightFilter(const RenderLayers& layers, float parallel_scene_size,
                          const RenderKernel& kernel)
     : m_layers(layers), m_kernel(kernel),
+      m_fit(layers, parallel_scene_size), m_lights{{layers.width(), layers.height()},
+                                                   {layers.width(), layers.height()}},
+      m_others{{layers.width(), layers.height()}, {layers.width(), layers.height()}},
       m_nearness_share(parallel_scene_size > 0.0F ? 0.0F : plane_tolerance),
       m_nearness_tolerance(plane_tolerance * parallel_scene_size + 1e-20F) {
-    const std::size_t count = pixelCount(layers);
-    for (auto& plane : m_normal)
-        plane.resize(count);
-    for (auto& plane : m_slope)
-        plane.resize(count);
-    for (LightImage* image : {&m_light, &m_other}) {
-        for (auto& plane : image->color)
-            plane.resize(count);
-        image->variance.resize(count);
-    }
-    for (auto* plane : {&m_nearness, &m_cover, &m_weight})
-        plane->resize(count);
+    for (PixelPlane* plane :
+         {&m_fitted[0], &m_fitted[1], &m_fitted[2], &m_normal[0], &m_normal[1], &m_normal[2],
+          &m_nearness, &m_slope[0], &m_slope[1], &m_tolerance, &m_cover})
+        *plane = PixelPlane(layers.width(), layers.height());
     readGuides();
     readSlopes();
 }
 
 void LightFilter::readGuides() {
-    forPixels(m_layers, [&](std::size_t pixel, int x, int y) {
-        const float cover = m_layers.at(RenderPlane::cover, x, y);
-        float normal[3];
-        float square = 0.0F;
-        for (int axis = 0; axis < 3; ++axis) {
-            normal[axis] = m_layers.at(RenderPlane::normal_x + axis, x, y);
-            square += normal[axis] * normal[axis];
+    forRows(m_layers, [&](int y) {
+        for (int x = 0; x < m_layers.width(); ++x) {
+            const float cover = m_layers.at(RenderPlane::cover, x, y);
+            float normal[3];
+            float square = 0.0F;
+            for (int axis = 0; axis < 3; ++axis) {
+                normal[axis] = m_layers.at(RenderPlane::normal_x + axis, x, y);
+                square += normal[axis] * normal[axis];
+            }
+            const float scale = square > 0.0F ? 1.0F / std::sqrt(square) : 0.0F;
+            for (int axis = 0; axis < 3; ++axis)
+                m_normal[axis].row(y)[x] = normal[axis] * scale;
+            m_nearness.row(y)[x] =
+                cover > 0.0F ? m_layers.at(RenderPlane::nearness, x, y) / cover : 0.0F;
+            m_cover.row(y)[x] = cover / m_layers.at(RenderPlane::samples, x, y);
         }
-        const float scale = square > 0.0F ? 1.0F / std::sqrt(square) : 0.0F;
-        for (int axis = 0; axis < 3; ++axis)
-            m_normal[axis][pixel] = normal[axis] * scale;
-        m_nearness[pixel] = cover > 0.0F ? m_layers.at(RenderPlane::nearness, x, y) / cover : 0.0F;
-        m_cover[pixel] = cover / m_layers.at(RenderPlane::samples, x, y);
     });
 }
 
 void LightFilter::readSlopes() {
-    const auto stride = static_cast<std::size_t>(m_layers.width());
-    forPixels(m_layers, [&](std::size_t pixel, int x, int y) {
-        m_slope[0][pixel] = slope(m_nearness, pixel, 1, x > 0, x + 1 < m_layers.width());
-        m_slope[1][pixel] = slope(m_nearness, pixel, stride, y > 0, y + 1 < m_layers.height());
+    const int last_x = m_layers.width() - 1;
+    const int last_y = m_layers.height() - 1;
+    forRows(m_layers, [&](int y) {
+        const float* const near = m_nearness.row(y);
+        const std::ptrdiff_t stride = m_nearness.stride();
+        for (int x = 0; x <= last_x; ++x) {
+            const float across =
+                slope(x > 0 ? near[x - 1] : INFINITY, near[x], x < last_x ? near[x + 1] : INFINITY);
+            const float down = slope(y > 0 ? near[x - stride] : INFINITY, near[x],
+                                     y < last_y ? near[x + stride] : INFINITY);
+            m_slope[0].row(y)[x] = across;
+            m_slope[1].row(y)[x] = down;
+            m_tolerance.row(y)[x] = 1.0F / (m_nearness_share * near[x] + m_nearness_tolerance +
+                                            0.25F * (std::fabs(across) + std::fabs(down)));
+        }
     });
 }
 
-void LightFilter::readLight(int first, int square) {
-    forPixels(m_layers, [&](std::size_t pixel, int x, int y) {
-        const int samples = m_layers.samplesAt(x, y);
-        float sum[3];
-        float albedo[3];
-        float light[3];
-        for (int c = 0; c < 3; ++c) {
-            sum[c] = m_layers.at(first + c, x, y);
-            albedo[c] = m_layers.at(RenderPlane::albedo_r + c, x, y);
+void LightFilter::readLight(const LightSums& kind, LightImage& image, PixelPlane& variance) const {
+    forRows(m_layers, [&](int y) {
+        for (int x = 0; x < m_layers.width(); ++x) {
+            const int samples = m_layers.samplesAt(x, y);
+            const float cover = m_layers.at(RenderPlane::cover, x, y);
+            float sum[3];
+            float albedo[3];
+            float light[3];
+            for (int c = 0; c < 3; ++c) {
+                sum[c] = m_layers.at(kind.first + c, x, y);
+                albedo[c] =
+                    kind.times_albedo ? m_layers.at(RenderPlane::albedo_r + c, x, y) : cover;
+            }
+            withoutAlbedo(sum, albedo, light);
+            for (int c = 0; c < 3; ++c)
+                image.color[c].row(y)[x] = light[c];
+            const float brightness = 0.2126F * light[0] + 0.7152F * light[1] + 0.0722F * light[2];
+            const float mean_square = cover > 0.0F ? m_layers.at(kind.square, x, y) / cover : 0.0F;
+            const float spread = samples < few_samples
+                                     ? mean_square
+                                     : std::max(0.0F, mean_square - brightness * brightness);
+            variance.row(y)[x] = spread / static_cast<float>(samples);
         }
-        withoutAlbedo(sum, albedo, light);
-        for (int c = 0; c < 3; ++c)
-            m_light.color[c][pixel] = light[c];
-        const float cover = m_layers.at(RenderPlane::cover, x, y);
-        const float brightness = 0.2126F * light[0] + 0.7152F * light[1] + 0.0722F * light[2];
-        const float mean_square = cover > 0.0F ? m_layers.at(square, x, y) / cover : 0.0F;
-        const float spread = samples < few_samples
-                                 ? mean_square
-                                 : std::max(0.0F, mean_square - brightness * brightness);
-        m_other.variance[pixel] = spread / static_cast<float>(samples);
     });
 }
 
 /// Neighbours know better than a pixel alone how far its samples scatter, all the more the fewer
 /// these are.
-void LightFilter::smoothVariance() {
-    const auto stride = static_cast<std::ptrdiff_t>(m_layers.width());
-    forPixels(m_layers, [&](std::size_t pixel, int x, int y) {
-        const int reach = m_layers.samplesAt(x, y) < many_samples ? 3 : 1;
-        float sum = 0.0F;
-        float weights = 0.0F;
-        for (int dy = -std::min(reach, y); dy <= std::min(reach, m_layers.height() - 1 - y); ++dy)
-            for (int dx = -std::min(reach, x); dx <= std::min(reach, m_layers.width() - 1 - x);
-                 ++dx) {
-                const auto at = static_cast<std::ptrdiff_t>(pixel) + dy * stride + dx;
-                const auto other = static_cast<std::size_t>(at);
-                const float weight =
-                    static_cast<float>((reach + 1 - std::abs(dx)) * (reach + 1 - std::abs(dy))) *
-                    m_cover[other];
-                sum += weight * m_other.variance[other];
-                weights += weight;
-            }
-        m_light.variance[pixel] = weights > 0.0F ? sum / weights : 0.0F;
+void LightFilter::smoothVariance(const PixelPlane& from, PixelPlane& to) const {
+    forRows(m_layers, [&](int y) {
+        for (int x = 0; x < m_layers.width(); ++x) {
+            const int reach = m_layers.samplesAt(x, y) < many_samples ? 3 : 1;
+            float sum = 0.0F;
+            float weights = 0.0F;
+            for (int dy = -std::min(reach, y); dy <= std::min(reach, m_layers.height() - 1 - y);
+                 ++dy)
+                for (int dx = -reach; dx <= reach; ++dx) {
+                    const float weight = static_cast<float>((reach + 1 - std::abs(dx)) *
+                                                            (reach + 1 - std::abs(dy))) *
+                                         m_cover.row(y + dy)[x + dx];
+                    sum += weight * from.row(y + dy)[x + dx];
+                    weights += weight;
+                }
+            to.row(y)[x] = weights > 0.0F ? sum / weights : 0.0F;
+        }
     });
 }
 
-void LightFilter::pass(int step) {
+void LightFilter::pass(int step, std::span<const LightSums> kinds) {
     tbb::parallel_for(0, m_layers.height(), [&](int y) {
         FilterRow row;
         row.width = m_layers.width();
         row.height = m_layers.height();
         row.y = y;
         row.step = step;
-        for (int c = 0; c < 3; ++c) {
-            row.light[c] = m_light.color[c].data();
-            row.normal[c] = m_normal[c].data();
-            row.out[c] = m_other.color[c].data();
+        row.stride = m_cover.stride();
+        for (int axis = 0; axis < 3; ++axis)
+            row.guides.normal[axis] = m_normal[axis].row(y);
+        row.guides.nearness = m_nearness.row(y);
+        row.guides.slope_x = m_slope[0].row(y);
+        row.guides.slope_y = m_slope[1].row(y);
+        row.guides.tolerance = m_tolerance.row(y);
+        row.guides.cover = m_cover.row(y);
+        row.light_count = static_cast<int>(kinds.size());
+        for (std::size_t k = 0; k < kinds.size(); ++k) {
+            FilterLight& light = row.lights[k];
+            for (int c = 0; c < 3; ++c) {
+                light.color[c] = m_lights[k].color[c].row(y);
+                light.out[c] = m_others[k].color[c].row(y);
+            }
+            light.variance = m_lights[k].variance.row(y);
+            light.out_variance = m_others[k].variance.row(y);
+            light.across_surfaces = kinds[k].follows_surfaces;
+            light.spread = kinds[k].spread;
         }
-        row.variance = m_light.variance.data();
-        row.out_variance = m_other.variance.data();
-        row.nearness = m_nearness.data();
-        row.slope_x = m_slope[0].data();
-        row.slope_y = m_slope[1].data();
-        row.cover = m_cover.data();
-        row.nearness_share = m_nearness_share;
-        row.nearness_tolerance = m_nearness_tolerance;
-        row.spread = noise_spread;
-        row.weight = m_weight.data();
         m_kernel.filter_row(row);
     });
-    std::swap(m_light, m_other);
+    for (std::size_t k = 0; k < kinds.size(); ++k)
+        std::swap(m_lights[k], m_others[k]);
 }
 
-const LightImage& LightFilter::filtered(int first, int square) {
-    readLight(first, square);
-    smoothVariance();
+void LightFilter::takeFitOut(LightImage& image) const {
+    forRows(m_layers, [&](int y) {
+        for (int c = 0; c < 3; ++c)
+            for (int x = 0; x < m_layers.width(); ++x)
+                image.color[c].row(y)[x] -= m_fitted[c].row(y)[x];
+    });
+}
+
+void LightFilter::addFit(LightImage& image) const {
+    forRows(m_layers, [&](int y) {
+        for (int c = 0; c < 3; ++c)
+            for (int x = 0; x < m_layers.width(); ++x) {
+                float& light = image.color[c].row(y)[x];
+                light = std::max(light + m_fitted[c].row(y)[x], 0.0F);
+            }
+    });
+}
+
+std::span<const LightImage> LightFilter::filtered(std::span<const LightSums> kinds) {
+    for (std::size_t k = 0; k < kinds.size(); ++k) {
+        readLight(kinds[k], m_lights[k], m_others[k].variance);
+        smoothVariance(m_others[k].variance, m_lights[k].variance);
+    }
+    const bool is_fitted = kinds.front().follows_surfaces;
+    if (is_fitted) {
+        m_fit.fit(kinds.front(), m_fitted);
+        takeFitOut(m_lights[0]);
+    }
     for (const int step : {1, 2, 4, 8})
-        pass(step);
-    return m_light;
+        pass(step, kinds);
+    if (is_fitted)
+        addFit(m_lights[0]);
+    return {m_lights, kinds.size()};
 }
 
 } // namespace quarn

@@ -1,49 +1,58 @@
 #pragma once
 
+#include "engine/render/LightFit.h"
+#include "engine/render/PixelPlane.h"
 #include "engine/render/RenderLayers.h"
 
-#include <vector>
+#include <span>
 
 namespace quarn {
 
 /// Light without the colour of the surface, for each pixel, and how uncertain it is.
 struct LightImage {
-    std::vector<float> color[3];
-    std::vector<float> variance; ///< of its brightness
+    LightImage(int width, int height);
+
+    PixelPlane color[3];
+    PixelPlane variance; ///< of its brightness
 };
 
 /// Takes noise out of sampled light, by averages over surfaces and never over edges. The surer the
-/// samples are, the less it changes; shadows keep their borders.
+/// samples are, the less it changes; shadows and mirrored pictures keep their borders. Of light
+/// that follows surfaces it averages what its fit leaves over.
 class LightFilter {
 public:
-    /// @param scene_size  in a parallel view, the size of what is seen, model units; else 0
+    /// @param parallel_scene_size  in a parallel view, the size of what is seen, model units; else
+    /// 0
     LightFilter(const RenderLayers& layers, float parallel_scene_size, const RenderKernel& kernel);
 
-    /// The light of one kind.
-    /// @param first   RenderPlane::sky_r or sun_r
-    /// @param square  RenderPlane::sky_square or sun_square
-    /// @return the filtered light; valid until the next call
-    const LightImage& filtered(int first, int square);
+    /// Filters up to two kinds of light, which takes little longer than one; the first alone may
+    /// be one that follows surfaces.
+    /// @return an image of each; valid until the next call
+    std::span<const LightImage> filtered(std::span<const LightSums> kinds);
 
     /// Bytes that a pixel takes.
-    static constexpr std::size_t bytes_per_pixel = 16 * sizeof(float);
+    static constexpr std::size_t bytes_per_pixel = 27 * sizeof(float) + LightFit::bytes_per_pixel;
 
 private:
     void readGuides();
     void readSlopes();
-    void readLight(int first, int square);
-    void smoothVariance();
-    void pass(int step);
+    void readLight(const LightSums& kind, LightImage& image, PixelPlane& variance) const;
+    void smoothVariance(const PixelPlane& from, PixelPlane& to) const;
+    void takeFitOut(LightImage& image) const;
+    void addFit(LightImage& image) const;
+    void pass(int step, std::span<const LightSums> kinds);
 
     const RenderLayers& m_layers;
     const RenderKernel& m_kernel;
-    std::vector<float> m_normal[3];
-    std::vector<float> m_nearness;
-    std::vector<float> m_slope[2];
-    std::vector<float> m_cover;
-    LightImage m_light;
-    LightImage m_other;
-    std::vector<float> m_weight;
+    PixelPlane m_normal[3];
+    PixelPlane m_nearness;
+    PixelPlane m_slope[2];
+    PixelPlane m_tolerance;
+    PixelPlane m_cover;
+    LightFit m_fit;
+    PixelPlane m_fitted[3];
+    LightImage m_lights[most_filter_lights];
+    LightImage m_others[most_filter_lights];
     float m_nearness_share;
     float m_nearness_tolerance;
 };

@@ -36,8 +36,7 @@ void addDirect(const RenderLayers& layers, Colors& colors) {
         const float scale = meanScale(layers, x, y);
         for (int c = 0; c < 3; ++c)
             colors[3 * pixel + static_cast<std::size_t>(c)] =
-                scale * (layers.at(RenderPlane::direct_r + c, x, y) +
-                         layers.at(RenderPlane::gloss_r + c, x, y));
+                scale * layers.at(RenderPlane::direct_r + c, x, y);
     });
 }
 
@@ -46,8 +45,24 @@ void addLight(const RenderLayers& layers, const LightImage& light, Colors& color
         const float scale = meanScale(layers, x, y);
         for (int c = 0; c < 3; ++c)
             colors[3 * pixel + static_cast<std::size_t>(c)] +=
-                scale * layers.at(RenderPlane::albedo_r + c, x, y) * light.color[c][pixel];
+                scale * layers.at(RenderPlane::albedo_r + c, x, y) * light.color[c].row(y)[x];
     });
+}
+
+void addGloss(const RenderLayers& layers, const LightImage& light, Colors& colors) {
+    forRows(layers, [&](std::size_t pixel, int x, int y) {
+        const float cover = meanScale(layers, x, y) * layers.at(RenderPlane::cover, x, y);
+        for (int c = 0; c < 3; ++c)
+            colors[3 * pixel + static_cast<std::size_t>(c)] += cover * light.color[c].row(y)[x];
+    });
+}
+
+bool hasGloss(const RenderLayers& layers) {
+    for (int y = 0; y < layers.height(); ++y)
+        for (int x = 0; x < layers.width(); ++x)
+            if (layers.at(RenderPlane::gloss_square, x, y) > 0.0F)
+                return true;
+    return false;
 }
 
 std::uint8_t shown(float light, const std::uint32_t* table) {
@@ -83,8 +98,11 @@ void encodeRender(const RenderLayers& layers, LightFilter& filter, Image& image)
     Colors colors(std::size_t{3} * static_cast<std::size_t>(layers.width()) *
                   static_cast<std::size_t>(layers.height()));
     addDirect(layers, colors);
-    addLight(layers, filter.filtered(RenderPlane::sky_r, RenderPlane::sky_square), colors);
-    addLight(layers, filter.filtered(RenderPlane::sun_r, RenderPlane::sun_square), colors);
+    constexpr LightSums diffuse[] = {sky_sums, sun_sums};
+    for (const LightImage& light : filter.filtered(diffuse))
+        addLight(layers, light, colors);
+    if (hasGloss(layers))
+        addGloss(layers, filter.filtered({&gloss_sums, 1}).front(), colors);
     image.resize(layers.width(), layers.height());
     const std::uint32_t* const table = displayTable().entries();
     forRows(layers, [&](std::size_t pixel, int, int) {

@@ -1,10 +1,10 @@
 #pragma once
 
+#include "engine/render/AlignedNumbers.h"
 #include "engine/render/kernel/RenderSetup.h"
 
 #include <cstddef>
 #include <cstdint>
-#include <memory>
 #include <vector>
 
 namespace quarn {
@@ -18,6 +18,9 @@ public:
     int height() const { return m_height; }
     RenderSums sums() const { return m_sums; }
 
+    /// Not 0 for the tiles that get no more samples, see RenderSums.
+    std::vector<std::uint8_t>& done() { return m_done; }
+
     /// A sum of one pixel.
     float at(int plane, int x, int y) const { return m_sums.planes[plane][offset(x, y)]; }
 
@@ -28,10 +31,6 @@ public:
     static constexpr std::size_t bytes_per_pixel = RenderPlane::count * sizeof(float);
 
 private:
-    struct alignas(64) Line {
-        float values[lane_count];
-    };
-
     std::size_t offset(int x, int y) const {
         const auto column = static_cast<std::size_t>(x);
         const auto row = static_cast<std::size_t>(y);
@@ -43,7 +42,8 @@ private:
     int m_width;
     int m_height;
     RenderSums m_sums;
-    std::vector<Line> m_storage;
+    AlignedNumbers m_storage;
+    std::vector<std::uint8_t> m_done;
 };
 
 } // namespace quarn

@@ -2,10 +2,12 @@
 
 #include "engine/display/FlushDenormals.h"
 #include "engine/render/RenderLayers.h"
+#include "engine/render/TileStopping.h"
 
 #include <tbb/parallel_for.h>
 
 #include <algorithm>
+#include <bit>
 #include <chrono>
 
 namespace quarn {
@@ -19,6 +21,12 @@ constexpr int samples_at_once = 32;
 
 constexpr double batch_seconds = 0.05;
 
+/// With fewer a tile is not stopped: thin things would be missed. A look at a picture of few
+/// samples is to be quick.
+int leastSamples(int samples) {
+    return samples <= 8 ? 4 : 8;
+}
+
 int columnsOf(const RenderLayers& layers) {
     return (layers.width() + block_width - 1) / block_width;
 }
@@ -31,16 +39,17 @@ SampleTaking::SampleTaking(const RenderSetup& setup, const RenderKernel& kernel,
       m_columns(columnsOf(layers)),
       m_blocks(m_columns * ((layers.height() + block_height - 1) / block_height)) {}
 
-/// 1, 4, 8, 16, 32 and then all 32.
+/// 4, 8, 12, 16, 24, 32, 48, 64 and so on: the tiles that need no more are looked for after a
+/// half more at the most.
 int SampleTaking::passEnd(int first, bool grows_evenly) const {
-    const int wanted = !grows_evenly || first >= samples_at_once ? first + samples_at_once
-                       : first == 0                              ? 1
-                       : first == 1                              ? 4
-                                                                 : 2 * first;
+    const auto octave = static_cast<int>(std::bit_floor(static_cast<unsigned>(std::max(first, 8))));
+    const int step = std::min(octave / 2, samples_at_once);
+    const int wanted = grows_evenly && first == 0 ? 1 : (first / step + 1) * step;
     return std::min(m_samples, wanted);
 }
 
 RenderEnd SampleTaking::run(bool grows_evenly, const Pause& pause) {
+    TileStopping stopping(m_layers, m_samples);
     for (int first = 0; first < m_samples;) {
         const int end = passEnd(first, grows_evenly);
         for (int finished = 0; finished < m_blocks;) {
@@ -52,6 +61,8 @@ RenderEnd SampleTaking::run(bool grows_evenly, const Pause& pause) {
             finished = next;
         }
         first = end;
+        if (first >= leastSamples(m_samples) && first < m_samples && !stopping.stopGoodTiles())
+            break;
     }
     return RenderEnd::done;
 }

@@ -6,11 +6,13 @@ namespace quarn {
 
 class RenderLayers;
 
-/// Takes the samples of a picture, as many blocks of pixels at a time as last for some hundredths
+/// Takes the samples of a picture, of all pixels at first and then of the tiles that are not yet
+/// good enough, as many blocks of pixels at a time as last for some hundredths
 /// of a second.
 class SampleTaking {
 public:
-    /// @param layers  the sums, all 0
+    /// @param layers   the sums, all 0
+    /// @param samples  the most that a pixel gets, see RenderRequest
     SampleTaking(const RenderSetup& setup, const RenderKernel& kernel, RenderLayers& layers,
                  int samples);
 

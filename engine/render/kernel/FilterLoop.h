@@ -1,5 +1,6 @@
 #pragma once
 
+#include "engine/display/kernel/Lanes.h"
 #include "engine/render/kernel/RenderSetup.h"
 
 #include <cstddef>
@@ -7,82 +8,120 @@
 namespace quarn {
 namespace {
 
-// Plain loops over a row: the compiler makes vectors of them, as wide as the processor's.
+/// Sixteen numbers that begin anywhere.
+inline Lanes loadAnywhere(const float* from) {
+    const auto* const words = reinterpret_cast<const std::uint32_t*>(from);
+    return eachPart<Lanes>([&](int p) {
+        return reinterpret_cast<NativeFloats>(nativeLoad(words + p * native_lanes));
+    });
+}
 
-/// Where the pixels of a tap lie: those at x + offset of the row at `other`, for x in [begin, end).
+/// The surfaces that sixteen pixels show.
+struct GuideLanes {
+    LaneVectors normal;
+    Lanes nearness;
+    Lanes slope_x;
+    Lanes slope_y;
+    Lanes tolerance;
+};
+
+inline GuideLanes guidesAt(const FilterGuides& guides, std::ptrdiff_t x) {
+    return {{load(guides.normal[0] + x), load(guides.normal[1] + x), load(guides.normal[2] + x)},
+            load(guides.nearness + x),
+            load(guides.slope_x + x),
+            load(guides.slope_y + x),
+            load(guides.tolerance + x)};
+}
+
+/// Where the pixels that are looked at lie, seen from those that they are for.
 struct Tap {
-    std::ptrdiff_t center; ///< of the row's pixel 0
-    std::ptrdiff_t other;  ///< of the pixel that is looked at from there
+    std::ptrdiff_t offset;
     float weight;
     float dx;
     float dy;
 };
 
-inline float brightnessOf(float r, float g, float b) {
-    return 0.2126F * r + 0.7152F * g + 0.0722F * b;
-}
-inline float largerOf(float a, float b) {
-    return a > b ? a : b;
-}
-inline float sizeOf(float a) {
-    return a < 0.0F ? -a : a;
-}
-
-/// How much the pixel at `q` tells of the one at `p`: they must lie on one flat surface or a nearly
-/// flat one, and be no more different than their noise explains.
-inline float likeness(const FilterRow& row, std::ptrdiff_t p, std::ptrdiff_t q, const Tap& tap) {
-    const float turn = row.normal[0][p] * row.normal[0][q] + row.normal[1][p] * row.normal[1][q] +
-                       row.normal[2][p] * row.normal[2][q];
-    const float along = largerOf(turn, 0.0F);
-    const float along2 = along * along;
-    const float along4 = along2 * along2;
-    const float along16 = along4 * along4 * along4 * along4;
-    const float expected = row.nearness[p] + tap.dx * row.slope_x[p] + tap.dy * row.slope_y[p];
-    const float off = sizeOf(row.nearness[q] - expected);
-    const float allowed = row.nearness_share * row.nearness[p] + row.nearness_tolerance +
-                          0.25F * (sizeOf(row.slope_x[p]) + sizeOf(row.slope_y[p]));
-    const float same_plane = largerOf(0.0F, 1.0F - off / allowed);
-    const float step =
-        brightnessOf(row.light[0][q] - row.light[0][p], row.light[1][q] - row.light[1][p],
-                     row.light[2][q] - row.light[2][p]);
-    const float noise = row.spread * (row.variance[p] + row.variance[q]) + 1e-9F;
-    const float alike = largerOf(0.0F, 1.0F - step * step / noise);
-    return along16 * along16 * same_plane * alike * alike * row.cover[q];
+/// How surely the pixels from `q` on show the same surface: one flat surface or a nearly flat one.
+inline Lanes sameSurface(const FilterGuides& guides, const GuideLanes& own, std::ptrdiff_t q,
+                         const Tap& tap) {
+    const Lanes turn = own.normal.x * loadAnywhere(guides.normal[0] + q) +
+                       own.normal.y * loadAnywhere(guides.normal[1] + q) +
+                       own.normal.z * loadAnywhere(guides.normal[2] + q);
+    const Lanes along = greatest(turn, 0.0F);
+    const Lanes along2 = along * along;
+    const Lanes along4 = along2 * along2;
+    const Lanes along16 = along4 * along4 * (along4 * along4);
+    const Lanes expected = own.nearness + own.slope_x * tap.dx + own.slope_y * tap.dy;
+    const Lanes off = magnitude(loadAnywhere(guides.nearness + q) - expected);
+    const Lanes same_plane = greatest(Lanes(1.0F) - off * own.tolerance, 0.0F);
+    return along16 * along16 * same_plane;
 }
 
-inline void addTap(const FilterRow& row, const Tap& tap, int begin, int end) {
-    float* const __restrict weight = row.weight + tap.center;
-    float* const __restrict r = row.out[0] + tap.center;
-    float* const __restrict g = row.out[1] + tap.center;
-    float* const __restrict b = row.out[2] + tap.center;
-    float* const __restrict variance = row.out_variance + tap.center;
-    for (std::ptrdiff_t x = begin; x < end; ++x) {
-        const std::ptrdiff_t q = tap.other + x;
-        const float w = tap.weight * likeness(row, tap.center + x, q, tap);
-        weight[x] += w;
-        r[x] += w * row.light[0][q];
-        g[x] += w * row.light[1][q];
-        b[x] += w * row.light[2][q];
-        variance[x] += w * w * row.variance[q];
+/// Light of sixteen pixels, or sums of it.
+struct LightLanes {
+    LaneColors color;
+    Lanes variance;
+    Lanes weight;
+};
+
+inline Lanes brightnessOf(const LaneColors& c) {
+    return c.r * 0.2126F + c.g * 0.7152F + c.b * 0.0722F;
+}
+
+/// Adds what the pixels from `q` on tell of the light, all the more the less it differs beyond
+/// what noise explains.
+/// @param surface  how much they tell by what they show
+inline void addTap(const FilterLight& light, const LightLanes& own, std::ptrdiff_t q,
+                   const Lanes& surface, LightLanes& sum) {
+    const LaneColors color{loadAnywhere(light.color[0] + q), loadAnywhere(light.color[1] + q),
+                           loadAnywhere(light.color[2] + q)};
+    const Lanes variance = loadAnywhere(light.variance + q);
+    const Lanes step = brightnessOf(color - own.color);
+    const Lanes noise = (own.variance + variance) * light.spread + 1e-9F;
+    const Lanes alike = greatest(Lanes(1.0F) - step * step / noise, 0.0F);
+    const Lanes weight = surface * alike * alike;
+    sum.color = sum.color + color * weight;
+    sum.variance = sum.variance + variance * (weight * weight);
+    sum.weight = sum.weight + weight;
+}
+
+template <int light_count> void filterSixteen(const FilterRow& row, std::ptrdiff_t x) {
+    constexpr float spline[5] = {1.0F / 16, 1.0F / 4, 3.0F / 8, 1.0F / 4, 1.0F / 16};
+    constexpr float own_weight = spline[2] * spline[2]; // the pixel itself counts in full
+    const GuideLanes guides = guidesAt(row.guides, x);
+    LightLanes own[light_count];
+    LightLanes sum[light_count];
+    for (int k = 0; k < light_count; ++k) {
+        const FilterLight& light = row.lights[k];
+        own[k] = {{load(light.color[0] + x), load(light.color[1] + x), load(light.color[2] + x)},
+                  load(light.variance + x),
+                  own_weight};
+        sum[k] = {own[k].color * Lanes(own_weight), own[k].variance * (own_weight * own_weight),
+                  own_weight};
     }
-}
-
-/// The pixel itself counts in full.
-inline void startRow(const FilterRow& row, std::ptrdiff_t start, float own_weight) {
-    for (std::ptrdiff_t p = start; p < start + row.width; ++p) {
-        row.weight[p] = own_weight;
-        for (int c = 0; c < 3; ++c)
-            row.out[c][p] = own_weight * row.light[c][p];
-        row.out_variance[p] = own_weight * own_weight * row.variance[p];
+    for (int j = -2; j <= 2; ++j) {
+        const int dy = j * row.step;
+        if (row.y + dy < 0 || row.y + dy >= row.height)
+            continue;
+        for (int i = -2; i <= 2; ++i) {
+            if (i == 0 && j == 0)
+                continue;
+            const int dx = i * row.step;
+            const Tap tap{dy * row.stride + dx, spline[i + 2] * spline[j + 2],
+                          static_cast<float>(dx), static_cast<float>(dy)};
+            const Lanes any = loadAnywhere(row.guides.cover + x + tap.offset) * tap.weight;
+            const Lanes same = any * sameSurface(row.guides, guides, x + tap.offset, tap);
+            for (int k = 0; k < light_count; ++k)
+                addTap(row.lights[k], own[k], x + tap.offset,
+                       row.lights[k].across_surfaces ? any : same, sum[k]);
+        }
     }
-}
-
-inline void endRow(const FilterRow& row, std::ptrdiff_t start) {
-    for (std::ptrdiff_t p = start; p < start + row.width; ++p) {
-        const float scale = 1.0F / row.weight[p];
-        for (int c = 0; c < 3; ++c)
-            row.out[c][p] *= scale;
-        row.out_variance[p] *= scale * scale;
+    for (int k = 0; k < light_count; ++k) {
+        const Lanes scale = Lanes(1.0F) / sum[k].weight;
+        store(row.lights[k].out[0] + x, sum[k].color.r * scale);
+        store(row.lights[k].out[1] + x, sum[k].color.g * scale);
+        store(row.lights[k].out[2] + x, sum[k].color.b * scale);
+        store(row.lights[k].out_variance + x, sum[k].variance * (scale * scale));
     }
 }
 
@@ -91,24 +130,12 @@ inline void endRow(const FilterRow& row, std::ptrdiff_t start) {
 /// Filtering", High Performance Graphics 2010), steered by the variance as in C. Schied et al.,
 /// "Spatiotemporal Variance-Guided Filtering", High Performance Graphics 2017.
 void filterRow(const FilterRow& row) {
-    constexpr float spline[5] = {1.0F / 16, 1.0F / 4, 3.0F / 8, 1.0F / 4, 1.0F / 16};
-    const std::ptrdiff_t start = static_cast<std::ptrdiff_t>(row.y) * row.width;
-    startRow(row, start, spline[2] * spline[2]);
-    for (int j = -2; j <= 2; ++j) {
-        const int dy = j * row.step;
-        if (row.y + dy < 0 || row.y + dy >= row.height)
-            continue;
-        for (int i = -2; i <= 2; ++i) {
-            const int dx = i * row.step;
-            if (i == 0 && j == 0)
-                continue;
-            const Tap tap{start, start + static_cast<std::ptrdiff_t>(dy) * row.width + dx,
-                          spline[i + 2] * spline[j + 2], static_cast<float>(dx),
-                          static_cast<float>(dy)};
-            addTap(row, tap, dx < 0 ? -dx : 0, dx > 0 ? row.width - dx : row.width);
-        }
+    for (std::ptrdiff_t x = 0; x < row.width; x += lane_count) {
+        if (row.light_count == 2)
+            filterSixteen<2>(row, x);
+        else
+            filterSixteen<1>(row, x);
     }
-    endRow(row, start);
 }
 
 } // namespace

@@ -3,6 +3,7 @@
 #include "engine/display/SplitSum.h"
 #include "engine/display/kernel/FrameSetup.h"
 
+#include <cstddef>
 #include <cstdint>
 
 namespace quarn {
@@ -124,25 +125,39 @@ struct RenderSums {
     float* planes[RenderPlane::count] = {}; ///< aligned to 64 bytes
 };
 
-/// One row of a light filter's pass. Pointers are of whole planes of width * height numbers.
-struct FilterRow {
-    int width = 0;
-    int height = 0;
-    int y = 0;
-    int step = 1; ///< distance between the pixels that are looked at
-    const float* light[3] = {};
-    const float* variance = nullptr; ///< of the light's brightness
+/// What a light filter's pass knows of the surfaces that pixels show.
+struct FilterGuides {
     const float* normal[3] = {};     ///< unit vectors; zero where nothing is
     const float* nearness = nullptr; ///< linear on flat surfaces
     const float* slope_x = nullptr;  ///< its change from pixel to pixel
     const float* slope_y = nullptr;
-    const float* cover = nullptr;
-    float nearness_share = 0.0F;     ///< how far nearness may deviate, as a share of itself
-    float nearness_tolerance = 0.0F; ///< and absolutely
-    float spread = 1.0F; ///< squared difference of brightness over variance where weights end
+    const float* tolerance = nullptr; ///< 1 / how far nearness may be off a plane
+    const float* cover = nullptr;     ///< how much of a pixel surfaces fill; 0 beside rows
+};
+
+/// Light that a pass smooths.
+struct FilterLight {
+    const float* color[3] = {};
+    const float* variance = nullptr; ///< of its brightness
     float* out[3] = {};
     float* out_variance = nullptr;
-    float* weight = nullptr; ///< scratch
+    bool across_surfaces = false; ///< it is averaged over edges too
+    float spread = 1.0F; ///< squared difference of brightness over variance where weights end
+};
+
+inline constexpr int most_filter_lights = 2;
+
+/// One row of a light filter's pass. Pointers are to the row's first pixel, in planes that have
+/// some numbers more on both sides of each row (PixelPlane).
+struct FilterRow {
+    int width = 0;
+    int height = 0;
+    int y = 0;
+    int step = 1;              ///< distance between the pixels that are looked at
+    std::ptrdiff_t stride = 0; ///< of all planes
+    FilterGuides guides;
+    FilterLight lights[most_filter_lights];
+    int light_count = 1;
 };
 
 /// The render loops, compiled for one kind of processor. All give the same pixels.

