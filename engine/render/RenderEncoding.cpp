@@ -3,6 +3,7 @@
 #include "engine/display/DisplayTable.h"
 #include "engine/render/LightFilter.h"
 #include "engine/render/RenderLayers.h"
+#include "engine/scene/SrgbCurve.h"
 
 #include <tbb/parallel_for.h>
 
@@ -40,13 +41,40 @@ void addDirect(const RenderLayers& layers, Colors& colors) {
     });
 }
 
+/// Ground that takes shadows alone is left out.
 void addLight(const RenderLayers& layers, const LightImage& light, Colors& colors) {
     forRows(layers, [&](std::size_t pixel, int x, int y) {
         const float scale = meanScale(layers, x, y);
+        const float catcher = layers.at(RenderPlane::catcher_albedo, x, y);
         for (int c = 0; c < 3; ++c)
             colors[3 * pixel + static_cast<std::size_t>(c)] +=
-                scale * layers.at(RenderPlane::albedo_r + c, x, y) * light.color[c].row(y)[x];
+                scale * (layers.at(RenderPlane::albedo_r + c, x, y) - catcher) *
+                light.color[c].row(y)[x];
     });
+}
+
+/// Of each pixel the light on ground that takes shadows alone, 1 where nothing shadows it.
+void addCaught(const RenderLayers& layers, const LightImage& light, std::vector<float>& caught) {
+    forRows(layers, [&](std::size_t pixel, int x, int y) {
+        const float bright = 0.2126F * light.color[0].row(y)[x] +
+                             0.7152F * light.color[1].row(y)[x] +
+                             0.0722F * light.color[2].row(y)[x]; // Rec. 709
+        caught[pixel] +=
+            meanScale(layers, x, y) * layers.at(RenderPlane::catcher_albedo, x, y) * bright;
+    });
+}
+
+/// How opaque a pixel is before nothing. A shadow is black, and as dark as on white when pictures
+/// are laid over each other by the numbers of their pixels.
+/// @param caught  see addCaught
+float opacityOf(const RenderLayers& layers, int x, int y, float caught) {
+    const float scale = meanScale(layers, x, y);
+    const float ground = scale * layers.at(RenderPlane::catcher, x, y);
+    const float nothing = scale * layers.at(RenderPlane::nothing, x, y);
+    float shadow = 0.0F;
+    if (ground > 0.0F)
+        shadow = ground * (1.0F - srgbFromLinear(std::clamp(caught / ground, 0.0F, 1.0F)));
+    return std::clamp(1.0F - nothing - ground + shadow, 0.0F, 1.0F);
 }
 
 void addGloss(const RenderLayers& layers, const LightImage& light, Colors& colors) {
@@ -72,6 +100,29 @@ std::uint8_t shown(float light, const std::uint32_t* table) {
     return static_cast<std::uint8_t>(table[std::clamp(place, 0, DisplayTable::count - 1)]);
 }
 
+void showOpaque(const RenderLayers& layers, const Colors& colors, Image& image) {
+    const std::uint32_t* const table = displayTable().entries();
+    forRows(layers, [&](std::size_t pixel, int, int) {
+        for (std::size_t c = 0; c < 3; ++c)
+            image.rgba[4 * pixel + c] = shown(colors[3 * pixel + c], table);
+        image.rgba[4 * pixel + 3] = 255;
+    });
+}
+
+/// Colours are not multiplied by the opacity.
+void showBeforeNothing(const RenderLayers& layers, const Colors& colors,
+                       const std::vector<float>& caught, Image& image) {
+    const std::uint32_t* const table = displayTable().entries();
+    forRows(layers, [&](std::size_t pixel, int x, int y) {
+        const float opacity = opacityOf(layers, x, y, caught[pixel]);
+        const auto alpha = static_cast<std::uint8_t>(opacity * 255.0F + 0.5F);
+        for (std::size_t c = 0; c < 3; ++c)
+            image.rgba[4 * pixel + c] =
+                alpha > 0 ? shown(colors[3 * pixel + c] / opacity, table) : std::uint8_t{0};
+        image.rgba[4 * pixel + 3] = alpha;
+    });
+}
+
 /// Of pixels that nothing is known of, in sRGB.
 constexpr std::uint8_t not_begun = 60;
 
@@ -94,22 +145,25 @@ void encodeRow(const RenderLayers& layers, int y, Image& image) {
     }
 }
 
-void encodeRender(const RenderLayers& layers, LightFilter& filter, Image& image) {
+void encodeRender(const RenderLayers& layers, LightFilter& filter, bool has_clear_background,
+                  Image& image) {
     Colors colors(std::size_t{3} * static_cast<std::size_t>(layers.width()) *
                   static_cast<std::size_t>(layers.height()));
+    std::vector<float> caught(has_clear_background ? colors.size() / 3 : 0);
     addDirect(layers, colors);
     constexpr LightSums diffuse[] = {sky_sums, sun_sums};
-    for (const LightImage& light : filter.filtered(diffuse))
+    for (const LightImage& light : filter.filtered(diffuse)) {
         addLight(layers, light, colors);
+        if (has_clear_background)
+            addCaught(layers, light, caught);
+    }
     if (hasGloss(layers))
         addGloss(layers, filter.filtered({&gloss_sums, 1}).front(), colors);
     image.resize(layers.width(), layers.height());
-    const std::uint32_t* const table = displayTable().entries();
-    forRows(layers, [&](std::size_t pixel, int, int) {
-        for (std::size_t c = 0; c < 3; ++c)
-            image.rgba[4 * pixel + c] = shown(colors[3 * pixel + c], table);
-        image.rgba[4 * pixel + 3] = 255;
-    });
+    if (has_clear_background)
+        showBeforeNothing(layers, colors, caught, image);
+    else
+        showOpaque(layers, colors, image);
 }
 
 } // namespace quarn

@@ -10,7 +10,7 @@ class LightFilter;
 class RenderLayers;
 
 /// Bytes that encodeRender takes for a pixel beside the picture.
-inline constexpr std::size_t render_encoding_bytes = 3 * sizeof(float);
+inline constexpr std::size_t render_encoding_bytes = 4 * sizeof(float);
 
 /// Shows one row of the sums of some samples as they are, with their noise; grey where there is
 /// none.
@@ -18,6 +18,8 @@ inline constexpr std::size_t render_encoding_bytes = 3 * sizeof(float);
 void encodeRow(const RenderLayers& layers, int y, Image& image);
 
 /// Puts the sums together and shows them as Rendered mode does.
-void encodeRender(const RenderLayers& layers, LightFilter& filter, Image& image);
+/// @param has_clear_background  pixels get an opacity of their own
+void encodeRender(const RenderLayers& layers, LightFilter& filter, bool has_clear_background,
+                  Image& image);
 
 } // namespace quarn

@@ -88,8 +88,8 @@ void completeRenderSetup(RenderSetup& setup, const RenderKernel& kernel, RenderT
     double light[3];
     lightOfSky(bounce, kernel, light);
     for (int c = 0; c < 3; ++c) {
-        const double wanted = frame.ambient_base[c] + frame.ambient_slope[c][2] +
-                              2.0 * frame.ambient_square[c][2];
+        const double wanted =
+            frame.ambient_base[c] + frame.ambient_slope[c][2] + 2.0 * frame.ambient_square[c][2];
         setup.sky_scale[c] = light[c] > 0.0 ? static_cast<float>(wanted / light[c]) : 0.0F;
     }
     tables.environment.find(bounce, kernel);

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "engine/display/kernel/LookShading.h"
+#include "engine/display/kernel/OneSided.h"
 #include "engine/display/kernel/SeeThroughShading.h"
 #include "engine/display/kernel/ShadowCatcher.h"
 #include "engine/render/kernel/Glass.h"
@@ -294,35 +295,64 @@ private:
             ground = meetGround(frame, m_packet, surfaces).weight;
         addBackground(m_setup, m_packet, m_path, missed, ground, m_found);
         const LaneMask on_ground = missed & (ground > 0.0F);
-        if (frame.catches_shadows && any(on_ground & m_path.unturned))
-            takeBackground(frame, on_ground & m_path.unturned, ground, surfaces);
+        if (frame.has_clear_background)
+            addNothing(missed & m_path.unturned, ground);
+        const LaneMask seen = on_ground & m_path.unturned;
+        if (frame.catches_shadows && any(seen))
+            catchShadows(frame, seen, ground, surfaces);
         m_path.weight = select(on_ground, m_path.weight * ground, m_path.weight);
         m_path.going = m_path.going & (m_packet.hit | on_ground);
         return ground;
     }
 
-    /// Where nothing shadows it the ground looks like what lies behind it. Shadows take from what
-    /// is shown, see shadedBackground: here from light that is shown alike unshadowed and where
-    /// three tenths of the light are missing.
-    void takeBackground(const FrameSetup& frame, const LaneMask& lanes, const Lanes& ground,
-                        SurfaceLanes& surfaces) {
-        const LaneColors behind = backgroundColors(m_setup.frame, m_packet);
-        constexpr float shade = 0.3F;
-        LaneColors changing = behind;
-        if (!frame.has_sky) {
-            const LaneColors shaded = lightShownAs(
-                frame,
-                gradient(frame, m_packet.y, frame.shown_top, frame.shown_bottom) * (1.0F - shade));
-            changing = (behind - shaded) * (1.0F / shade);
-        }
-        addFound(m_path, lanes, (behind - changing) * ground, m_found);
+    /// Where nothing is seen before a clear background: ground that takes shadows is none in
+    /// itself.
+    void addNothing(const LaneMask& missed, const Lanes& ground) {
+        const Lanes none = luminance(m_path.weight);
+        const LaneMask known = m_setup.frame.catches_shadows ? missed & m_path.first : noLanes();
+        const Lanes seen = select(known, ground, 0.0F);
+        m_sums.add(RenderPlane::nothing, select(missed, none * (Lanes(1.0F) - seen), 0.0F));
+    }
+
+    /// Where nothing shadows it the ground looks like what lies behind it. Before a clear
+    /// background its shadows are kept apart.
+    void catchShadows(const FrameSetup& frame, const LaneMask& lanes, const Lanes& ground,
+                      SurfaceLanes& surfaces) {
         const Lanes t = select(lanes, m_packet.distance, 0.0F);
         const LaneColors open =
             lightOnOpenGround(frame, along(m_packet.origin(), m_packet.direction(), t));
+        if (frame.has_clear_background) {
+            const LaneMask first = lanes & m_path.first;
+            const Lanes weight = select(first, ground, 0.0F);
+            const Lanes part = Lanes(1.0F) / greatest(luminance(open), 1e-6F);
+            m_sums.add(RenderPlane::catcher, weight);
+            m_sums.add(RenderPlane::catcher_albedo, weight * part);
+            const LaneColors none{0.0F, 0.0F, 0.0F};
+            surfaces.albedo =
+                select(lanes, select(first, LaneColors{part, part, part}, none), surfaces.albedo);
+            return;
+        }
+        const LaneColors changing = changingPart(frame, lanes, ground);
         const LaneColors albedo{changing.r / greatest(open.r, 1e-6F),
                                 changing.g / greatest(open.g, 1e-6F),
                                 changing.b / greatest(open.b, 1e-6F)};
         surfaces.albedo = select(lanes, albedo, surfaces.albedo);
+    }
+
+    /// The part of what lies behind the ground that shadows take away; adds the rest. They take
+    /// from what is shown, see shadedBackground: here from light that is shown alike unshadowed and
+    /// where three tenths of the light are missing.
+    LaneColors changingPart(const FrameSetup& frame, const LaneMask& lanes, const Lanes& ground) {
+        const LaneColors behind = backgroundColors(m_setup.frame, m_packet);
+        if (frame.has_sky)
+            return behind;
+        constexpr float shade = 0.3F;
+        const LaneColors shaded =
+            lightShownAs(frame, gradient(frame, m_packet.y, frame.shown_top, frame.shown_bottom) *
+                                    (1.0F - shade));
+        const LaneColors changing = (behind - shaded) * (1.0F / shade);
+        addFound(m_path, lanes, (behind - changing) * ground, m_found);
+        return changing;
     }
 
     /// Keeps what is seen there: the first surfaces that are no panes.
@@ -335,9 +365,9 @@ private:
     void meetSurfaces(int step) {
         const FrameSetup& frame = step == 0 ? m_setup.frame : m_setup.bounce;
         m_packet.active = m_path.going;
-        intersect(frame, m_packet,
-                  step == 0 ? RTC_INTERSECT_CONTEXT_FLAG_COHERENT
-                            : RTC_INTERSECT_CONTEXT_FLAG_INCOHERENT);
+        intersectFronts(frame, m_packet,
+                        step == 0 ? RTC_INTERSECT_CONTEXT_FLAG_COHERENT
+                                  : RTC_INTERSECT_CONTEXT_FLAG_INCOHERENT);
         SurfaceLanes surfaces;
         readSurfaces(frame, m_packet, surfaces);
         const Lanes ground = meetGroundOrNothing(frame, surfaces);

@@ -113,7 +113,11 @@ struct RenderPlane {
         even_sky,
         even_sun,
         even_gloss,
-        samples, ///< how many there are, the same for all pixels of a tile
+        // Before a clear background:
+        nothing,        ///< how much of the pixel shows it
+        catcher,        ///< how much ground that takes shadows alone
+        catcher_albedo, ///< of that ground, whose light is 1 where nothing shadows it
+        samples,        ///< how many there are, the same for all pixels of a tile
         count
     };
 };

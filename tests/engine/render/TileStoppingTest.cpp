@@ -25,8 +25,9 @@ RenderLayers sampled(int samples) {
     EXPECT_TRUE(scene.update(tower()).ok());
     const SampleSequence sequence(samples);
     const RenderKernel& kernel = renderKernelInForce();
+    RenderTables tables;
     const RenderSetup setup =
-        makeRenderSetup(scene, topView(25.0), width_px, height_px, sequence, kernel);
+        makeRenderSetup(scene, topView(25.0), width_px, height_px, sequence, kernel, tables);
     RenderLayers layers(width_px, height_px);
     SampleTaking taking(setup, kernel, layers, samples);
     EXPECT_EQ(taking.run(false, [](double) { return true; }), RenderEnd::done);
@@ -55,7 +56,9 @@ TEST(TileStopping, TilesThatAreDoneGetNoMoreSamples) {
     ASSERT_TRUE(scene.update(tower()).ok());
     const SampleSequence sequence(8);
     const RenderKernel& kernel = renderKernelInForce();
-    const RenderSetup setup = makeRenderSetup(scene, topView(25.0), 32, 32, sequence, kernel);
+    RenderTables tables;
+    const RenderSetup setup =
+        makeRenderSetup(scene, topView(25.0), 32, 32, sequence, kernel, tables);
     RenderLayers layers(32, 32);
     kernel.render_block(setup, {0, 0, 32, 32}, 0, 4, layers.sums());
     layers.done()[9] = 1; // the second of the second row
