@@ -10,22 +10,21 @@ namespace quarn {
 /// What one may choose of, as prompts and forms call it.
 struct LightWord {
     const wchar_t* name;
-    int option_id;
-    int text_id;
+    int id; ///< of the text, and of the option
 
-    CQuarnCommandOptionName option() const { return QnLocalizeCommandOptionName(name, option_id); }
-    const wchar_t* text() const { return QnLocalizeString(name, text_id); }
+    CQuarnCommandOptionName option() const { return QnLocalizeCommandOptionName(name, id); }
+    const wchar_t* text() const { return QnLocalizeString(name, id); }
 };
 
-inline constexpr LightWord AUTOMATIC_WORD = {L"Automatic", 42930, 42903};
+inline constexpr LightWord AUTOMATIC_WORD = {L"Automatic", 42903};
 
 /// In the order of Surroundings.
 inline constexpr LightWord SURROUNDINGS_WORDS[] = {
-    AUTOMATIC_WORD, {L"Studio", 42931, 42904}, {L"Sky", 42932, 42905}, {L"Picture", 42933, 42906}};
+    AUTOMATIC_WORD, {L"Studio", 42904}, {L"Sky", 42905}, {L"Picture", 42906}};
 
 /// In the order of BackgroundKind.
 inline constexpr LightWord BACKGROUND_WORDS[] = {
-    AUTOMATIC_WORD, {L"Colour", 42934, 42912}, {L"Transparent", 42935, 42914}};
+    AUTOMATIC_WORD, {L"Colour", 42912}, {L"Transparent", 42914}};
 
 inline const LightWord& lightWord(Surroundings surroundings) {
     return SURROUNDINGS_WORDS[static_cast<std::size_t>(surroundings)];

@@ -44,8 +44,8 @@ int LightStore::add(const KM_Light& light) {
 
 int LightStore::addOfPlugIn(const KM_Light& light) {
     const int index = add(light);
-    if (index != no_index)
-        m_last_of_plug_in = index;
+    m_last_of_plug_in = index;
+    m_dark_of_plug_in = canShine(light) ? std::nullopt : std::optional(light);
     return index;
 }
 
@@ -67,9 +67,10 @@ std::vector<KM_Light> LightStore::shiningLights() const {
 
 std::optional<KM_Light> LightStore::studySun() const {
     const CQuarnLight& slot = at(m_last_of_plug_in);
-    const KM_Light& light = slot.Light();
+    const KM_Light& light = m_dark_of_plug_in ? *m_dark_of_plug_in : slot.Light();
+    const bool is_there = m_dark_of_plug_in || !slot.IsDeleted();
     const bool is_sun =
-        !slot.IsDeleted() && light.IsEnabled() && light.Style() == KM_LightStyle::world_directional;
+        is_there && light.IsEnabled() && light.Style() == KM_LightStyle::world_directional;
     return is_sun ? std::optional(light) : std::nullopt;
 }
 

@@ -45,7 +45,8 @@ public:
     /// The lights that are there and switched on.
     std::vector<KM_Light> shiningLights() const;
     /// The light that a plug-in put there last, while it is there, if it is on and shines from one
-    /// direction, as the sun of a study does. Nothing where there is none.
+    /// direction, as the sun of a study does. Nothing where there is none. One that cannot shine,
+    /// and so has no slot, counts until a plug-in puts another one there.
     std::optional<KM_Light> studySun() const;
 
     /// From now on every call of a plug-in is a breach.
@@ -58,6 +59,7 @@ public:
 private:
     std::map<int, CQuarnLight> m_live;
     int m_last_of_plug_in = no_index;
+    std::optional<KM_Light> m_dark_of_plug_in; ///< the last one, where it cannot shine
     int m_slot_count = 0;
     CQuarnLight m_no_light = deletedLight();
     CQuarnLightTable m_face;

@@ -31,7 +31,8 @@ KM_wString whatDiffers(const RecordingFile& there, const RecordingFile& own) {
     if (there.fingerprint.document != own.fingerprint.document)
         return QnLocalizeString(L"from another state of the document", 42857);
     if (there.fingerprint.settings != own.fingerprint.settings)
-        return QnLocalizeString(L"with another camera, path, sun or number of samples", 42858);
+        return QnLocalizeString(L"with another camera, path, sun, light or number of samples",
+                                42858);
     return KM_wString::FormatToString(QnLocalizeString(L"by another program, %s", 42859),
                                       wide(there.fingerprint.program).Array());
 }

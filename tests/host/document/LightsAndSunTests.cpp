@@ -127,6 +127,17 @@ TEST_F(LightTableTest, TheSunOfASingleFrameOfAStudyShinesAlone) {
     EXPECT_EQ(lights[0].Direction(), KM_3dVector(0, 0, -1));
 }
 
+TEST_F(LightTableTest, AStudySunThatCannotShineLeavesTheStudyDark) {
+    document.lights().add(lampOfModel());
+    document.sun().beginChange();
+    document.sun().setEnabled(false);
+    CQuarnLightTable& table = document.face().LightTable();
+    EXPECT_EQ(table.AddLight(sunFrom(KM_3dVector::ZeroVector), nullptr), LightStore::no_index);
+    EXPECT_TRUE(document.drawing().light().shiningLights().empty());
+    table.AddLight(sunFrom({0, 0, -1}), nullptr);
+    EXPECT_EQ(document.drawing().light().shiningLights().size(), 1U);
+}
+
 TEST_F(LightTableTest, ALampOfAPlugInMakesNoStudy) {
     document.lights().add(sunFrom({1, 0, -1}));
     document.face().LightTable().AddLight(lampOfModel(), nullptr);
