@@ -1,6 +1,7 @@
 #include "engine/render/RenderEncoding.h"
 
 #include "engine/display/DisplayTable.h"
+#include "engine/display/ShownLight.h"
 #include "engine/render/LightFilter.h"
 #include "engine/render/RenderLayers.h"
 #include "engine/scene/SrgbCurve.h"
@@ -41,40 +42,19 @@ void addDirect(const RenderLayers& layers, Colors& colors) {
     });
 }
 
-/// Ground that takes shadows alone is left out.
-void addLight(const RenderLayers& layers, const LightImage& light, Colors& colors) {
+/// Ground that shows shadows alone is kept apart.
+/// @param caught  takes its light, of 1 where nothing shadows it
+void addLight(const RenderLayers& layers, const LightImage& light, Colors& colors, Colors& caught) {
     forRows(layers, [&](std::size_t pixel, int x, int y) {
         const float scale = meanScale(layers, x, y);
-        const float catcher = layers.at(RenderPlane::catcher_albedo, x, y);
-        for (int c = 0; c < 3; ++c)
-            colors[3 * pixel + static_cast<std::size_t>(c)] +=
-                scale * (layers.at(RenderPlane::albedo_r + c, x, y) - catcher) *
-                light.color[c].row(y)[x];
+        for (int c = 0; c < 3; ++c) {
+            const float arriving = scale * light.color[c].row(y)[x];
+            const float catcher = layers.at(RenderPlane::catcher_r + c, x, y);
+            const std::size_t at = 3 * pixel + static_cast<std::size_t>(c);
+            colors[at] += arriving * (layers.at(RenderPlane::albedo_r + c, x, y) - catcher);
+            caught[at] += arriving * catcher;
+        }
     });
-}
-
-/// Of each pixel the light on ground that takes shadows alone, 1 where nothing shadows it.
-void addCaught(const RenderLayers& layers, const LightImage& light, std::vector<float>& caught) {
-    forRows(layers, [&](std::size_t pixel, int x, int y) {
-        const float bright = 0.2126F * light.color[0].row(y)[x] +
-                             0.7152F * light.color[1].row(y)[x] +
-                             0.0722F * light.color[2].row(y)[x]; // Rec. 709
-        caught[pixel] +=
-            meanScale(layers, x, y) * layers.at(RenderPlane::catcher_albedo, x, y) * bright;
-    });
-}
-
-/// How opaque a pixel is before nothing. A shadow is black, and as dark as on white when pictures
-/// are laid over each other by the numbers of their pixels.
-/// @param caught  see addCaught
-float opacityOf(const RenderLayers& layers, int x, int y, float caught) {
-    const float scale = meanScale(layers, x, y);
-    const float ground = scale * layers.at(RenderPlane::catcher, x, y);
-    const float nothing = scale * layers.at(RenderPlane::nothing, x, y);
-    float shadow = 0.0F;
-    if (ground > 0.0F)
-        shadow = ground * (1.0F - srgbFromLinear(std::clamp(caught / ground, 0.0F, 1.0F)));
-    return std::clamp(1.0F - nothing - ground + shadow, 0.0F, 1.0F);
 }
 
 void addGloss(const RenderLayers& layers, const LightImage& light, Colors& colors) {
@@ -100,6 +80,39 @@ std::uint8_t shown(float light, const std::uint32_t* table) {
     return static_cast<std::uint8_t>(table[std::clamp(place, 0, DisplayTable::count - 1)]);
 }
 
+/// The part of the light that is left on ground that shows shadows alone.
+/// @param caught  see addLight
+float leftOf(float ground, float caught) {
+    return std::clamp(caught / ground, 0.0F, 1.0F);
+}
+
+float lightShownAs(float color) {
+    const auto step =
+        static_cast<std::size_t>(color * static_cast<float>(ShownLight::steps) + 0.5F);
+    return std::bit_cast<float>(shownLight().entries()[step]);
+}
+
+/// The background at a height of the picture as it is shown, see Background.h.
+float backgroundAt(const FrameSetup& frame, int y, std::size_t channel) {
+    const float s = (static_cast<float>(y) + 0.5F) / static_cast<float>(frame.height);
+    const float t = s * s * (3.0F - 2.0F * s);
+    const float top = frame.shown_top[channel];
+    return top + t * (frame.shown_bottom[channel] - top);
+}
+
+/// Lays ground that shows shadows alone under the rest: it looks like the background, of which
+/// shadows take.
+void addCatcher(const RenderLayers& layers, const FrameSetup& frame, const Colors& caught,
+                Colors& colors) {
+    forRows(layers, [&](std::size_t pixel, int x, int y) {
+        const float ground = meanScale(layers, x, y) * layers.at(RenderPlane::catcher, x, y);
+        for (std::size_t c = 0; c < 3 && ground > 0.0F; ++c) {
+            const float left = leftOf(ground, caught[3 * pixel + c]);
+            colors[3 * pixel + c] += ground * lightShownAs(backgroundAt(frame, y, c) * left);
+        }
+    });
+}
+
 void showOpaque(const RenderLayers& layers, const Colors& colors, Image& image) {
     const std::uint32_t* const table = displayTable().entries();
     forRows(layers, [&](std::size_t pixel, int, int) {
@@ -109,12 +122,26 @@ void showOpaque(const RenderLayers& layers, const Colors& colors, Image& image) 
     });
 }
 
+/// How opaque a pixel is before nothing. A shadow is black, and as dark as on white when pictures
+/// are laid over each other by the numbers of their pixels.
+float opacityOf(const RenderLayers& layers, int x, int y, const float* caught) {
+    const float scale = meanScale(layers, x, y);
+    const float ground = scale * layers.at(RenderPlane::catcher, x, y);
+    const float nothing = scale * layers.at(RenderPlane::nothing, x, y);
+    float shadow = 0.0F;
+    if (ground > 0.0F) {
+        const float bright = 0.2126F * caught[0] + 0.7152F * caught[1] + 0.0722F * caught[2];
+        shadow = ground * (1.0F - srgbFromLinear(leftOf(ground, bright)));
+    }
+    return std::clamp(1.0F - nothing - ground + shadow, 0.0F, 1.0F);
+}
+
 /// Colours are not multiplied by the opacity.
-void showBeforeNothing(const RenderLayers& layers, const Colors& colors,
-                       const std::vector<float>& caught, Image& image) {
+void showBeforeNothing(const RenderLayers& layers, const Colors& colors, const Colors& caught,
+                       Image& image) {
     const std::uint32_t* const table = displayTable().entries();
     forRows(layers, [&](std::size_t pixel, int x, int y) {
-        const float opacity = opacityOf(layers, x, y, caught[pixel]);
+        const float opacity = opacityOf(layers, x, y, caught.data() + 3 * pixel);
         const auto alpha = static_cast<std::uint8_t>(opacity * 255.0F + 0.5F);
         for (std::size_t c = 0; c < 3; ++c)
             image.rgba[4 * pixel + c] =
@@ -145,25 +172,25 @@ void encodeRow(const RenderLayers& layers, int y, Image& image) {
     }
 }
 
-void encodeRender(const RenderLayers& layers, LightFilter& filter, bool has_clear_background,
+void encodeRender(const RenderLayers& layers, const FrameSetup& frame, LightFilter& filter,
                   Image& image) {
     Colors colors(std::size_t{3} * static_cast<std::size_t>(layers.width()) *
                   static_cast<std::size_t>(layers.height()));
-    std::vector<float> caught(has_clear_background ? colors.size() / 3 : 0);
+    Colors caught(colors.size());
     addDirect(layers, colors);
     constexpr LightSums diffuse[] = {sky_sums, sun_sums};
-    for (const LightImage& light : filter.filtered(diffuse)) {
-        addLight(layers, light, colors);
-        if (has_clear_background)
-            addCaught(layers, light, caught);
-    }
+    for (const LightImage& light : filter.filtered(diffuse))
+        addLight(layers, light, colors, caught);
     if (hasGloss(layers))
         addGloss(layers, filter.filtered({&gloss_sums, 1}).front(), colors);
     image.resize(layers.width(), layers.height());
-    if (has_clear_background)
+    if (frame.has_clear_background) {
         showBeforeNothing(layers, colors, caught, image);
-    else
-        showOpaque(layers, colors, image);
+        return;
+    }
+    if (frame.catches_shadows && !frame.has_sky)
+        addCatcher(layers, frame, caught, colors);
+    showOpaque(layers, colors, image);
 }
 
 } // namespace quarn

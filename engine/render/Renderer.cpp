@@ -87,7 +87,7 @@ Result<RenderEnd> Renderer::render(const DisplayScene& scene, const KM_Viewport&
         return RenderEnd::cancelled;
     LightFilter filter(layers, setup.frame.rays.parallel ? setup.frame.scene_size : 0.0F,
                        *m_kernel);
-    encodeRender(layers, filter, setup.frame.has_clear_background, image);
+    encodeRender(layers, setup.frame, filter, image);
     lines.draw(image);
     return RenderEnd::done;
 }

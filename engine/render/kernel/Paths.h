@@ -314,45 +314,27 @@ private:
         m_sums.add(RenderPlane::nothing, select(missed, none * (Lanes(1.0F) - seen), 0.0F));
     }
 
-    /// Where nothing shadows it the ground looks like what lies behind it. Before a clear
-    /// background its shadows are kept apart.
+    /// Where nothing shadows it the ground looks like what lies behind it. Its part of the picture
+    /// is kept apart, unless it is seen through glass or all is light from far away: shadows take
+    /// from what is shown, which is found when all samples are there.
     void catchShadows(const FrameSetup& frame, const LaneMask& lanes, const Lanes& ground,
                       SurfaceLanes& surfaces) {
         const Lanes t = select(lanes, m_packet.distance, 0.0F);
         const LaneColors open =
             lightOnOpenGround(frame, along(m_packet.origin(), m_packet.direction(), t));
-        if (frame.has_clear_background) {
-            const LaneMask first = lanes & m_path.first;
-            const Lanes weight = select(first, ground, 0.0F);
-            const Lanes part = Lanes(1.0F) / greatest(luminance(open), 1e-6F);
+        const LaneColors part{Lanes(1.0F) / greatest(open.r, 1e-6F),
+                              Lanes(1.0F) / greatest(open.g, 1e-6F),
+                              Lanes(1.0F) / greatest(open.b, 1e-6F)};
+        LaneMask apart = noLanes();
+        if (!frame.has_sky) {
+            apart = lanes & m_path.first;
+            const Lanes weight = select(apart, ground, 0.0F);
             m_sums.add(RenderPlane::catcher, weight);
-            m_sums.add(RenderPlane::catcher_albedo, weight * part);
-            const LaneColors none{0.0F, 0.0F, 0.0F};
-            surfaces.albedo =
-                select(lanes, select(first, LaneColors{part, part, part}, none), surfaces.albedo);
-            return;
+            m_sums.add(RenderPlane::catcher_r, part * weight);
         }
-        const LaneColors changing = changingPart(frame, lanes, ground);
-        const LaneColors albedo{changing.r / greatest(open.r, 1e-6F),
-                                changing.g / greatest(open.g, 1e-6F),
-                                changing.b / greatest(open.b, 1e-6F)};
-        surfaces.albedo = select(lanes, albedo, surfaces.albedo);
-    }
-
-    /// The part of what lies behind the ground that shadows take away; adds the rest. They take
-    /// from what is shown, see shadedBackground: here from light that is shown alike unshadowed and
-    /// where three tenths of the light are missing.
-    LaneColors changingPart(const FrameSetup& frame, const LaneMask& lanes, const Lanes& ground) {
-        const LaneColors behind = backgroundColors(m_setup.frame, m_packet);
-        if (frame.has_sky)
-            return behind;
-        constexpr float shade = 0.3F;
-        const LaneColors shaded =
-            lightShownAs(frame, gradient(frame, m_packet.y, frame.shown_top, frame.shown_bottom) *
-                                    (1.0F - shade));
-        const LaneColors changing = (behind - shaded) * (1.0F / shade);
-        addFound(m_path, lanes, (behind - changing) * ground, m_found);
-        return changing;
+        const LaneColors behind =
+            select(apart, LaneColors{1.0F, 1.0F, 1.0F}, backgroundColors(m_setup.frame, m_packet));
+        surfaces.albedo = select(lanes, part * behind, surfaces.albedo);
     }
 
     /// Keeps what is seen there: the first surfaces that are no panes.

@@ -113,11 +113,12 @@ struct RenderPlane {
         even_sky,
         even_sun,
         even_gloss,
-        // Before a clear background:
-        nothing,        ///< how much of the pixel shows it
-        catcher,        ///< how much ground that takes shadows alone
-        catcher_albedo, ///< of that ground, whose light is 1 where nothing shadows it
-        samples,        ///< how many there are, the same for all pixels of a tile
+        nothing, ///< how much of the pixel shows a clear background
+        catcher, ///< how much of it ground that shows shadows alone
+        catcher_r,
+        catcher_g,
+        catcher_b, ///< albedo of that ground, whose light is 1 where nothing shadows it
+        samples,   ///< how many there are, the same for all pixels of a tile
         count
     };
 };
