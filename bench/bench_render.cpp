@@ -3,14 +3,10 @@
 //
 // usage: bench_render [WIDTHxHEIGHT] [SAMPLES,...]
 
-#include "bench/PavilionScene.h"
-#include "engine/display/DisplayScene.h"
+#include "bench/RenderedPavilion.h"
 #include "engine/render/Renderer.h"
-#include "kelmar/KM_Viewport.h"
 
-#include <cmath>
 #include <cstdio>
-#include <ctime>
 #include <sstream>
 #include <vector>
 
@@ -30,45 +26,17 @@ struct Measured {
     double processor_seconds;
 };
 
-KM_Viewport fromTheStreet(const quarn::DisplayScene& scene) {
-    const KM_BoundingBox& box = scene.boundingBox();
-    const KM_3dPoint eye =
-        box.Center() + 1.05 * box.Diagonal().Length() * KM_3dVector(0.45, -0.75, 0.42);
-    KM_Viewport viewport;
-    viewport.SetCameraLocation(eye);
-    viewport.SetCameraDirection(box.Center() - eye);
-    viewport.SetCameraUp(KM_3dVector::ZAxis);
-    return viewport;
-}
-
-/// Of all threads.
-double processorSeconds() {
-    std::timespec time{};
-    clock_gettime(CLOCK_PROCESS_CPUTIME_ID, &time);
-    return static_cast<double>(time.tv_sec) + 1e-9 * static_cast<double>(time.tv_nsec);
-}
-
 Measured rendered(const quarn::DisplayScene& scene, const quarn::RenderRequest& request) {
     Measured measured;
     const auto start = bench::Clock::now();
-    const double processor_start = processorSeconds();
+    const double processor_start = bench::processorSeconds();
     const auto end = quarn::Renderer().render(
-        scene, fromTheStreet(scene), request, [](double) { return true; }, measured.image);
+        scene, bench::fromTheStreet(scene), request, [](double) { return true; }, measured.image);
     if (!end)
         bench::fail(end.message());
     measured.seconds = bench::millisecondsSince(start) / 1000.0;
-    measured.processor_seconds = processorSeconds() - processor_start;
+    measured.processor_seconds = bench::processorSeconds() - processor_start;
     return measured;
-}
-
-double difference(const quarn::Image& a, const quarn::Image& b) {
-    double sum = 0.0;
-    for (std::size_t i = 0; i < a.rgba.size(); ++i) {
-        const double step = static_cast<double>(a.rgba[i]) - static_cast<double>(b.rgba[i]);
-        sum += step * step;
-    }
-    // Opacity, one byte in four, is the same everywhere.
-    return std::sqrt(sum / (0.75 * static_cast<double>(a.rgba.size())));
 }
 
 Options readOptions(int count, char** words) {
@@ -92,7 +60,7 @@ void measureErrors(const quarn::DisplayScene& scene, const Options& options) {
     for (const int samples : options.samples) {
         const Measured measured = rendered(scene, {options.width, options.height, samples});
         std::printf("%-10d %12.2f %12.2f %12.2f\n", samples, measured.seconds,
-                    measured.processor_seconds, difference(measured.image, reference));
+                    measured.processor_seconds, bench::difference(measured.image, reference));
         std::fflush(stdout);
     }
 }
