@@ -45,7 +45,7 @@ LightFit::LightFit(const RenderLayers& layers, float parallel_scene_size)
       m_rows((layers.height() + tile_size - 1) / tile_size),
       m_nearness_share(parallel_scene_size > 0.0F ? 0.0F : least_nearness_step),
       m_nearness_tolerance(least_nearness_step * parallel_scene_size + 1e-20F),
-      m_moments(tileAt(0, m_rows)), m_fits(tileAt(0, m_rows)) {}
+      m_moments(tileAt(0, m_rows)), m_fits(tileAt(0, m_rows)), m_means(tileAt(0, m_rows)) {}
 
 std::size_t LightFit::tileAt(int column, int row) const {
     return static_cast<std::size_t>(row) * static_cast<std::size_t>(m_columns) +
@@ -181,23 +181,66 @@ LightFit::Fit LightFit::meanFitAround(int column, int row) const {
     return mean;
 }
 
+/// How a pixel's light follows from its features: between the fits of its tile and of those on the
+/// pixel's sides of it, so that no tile shows where the light changes alone.
+class LightFit::FitBetween {
+public:
+    FitBetween(const LightFit& owner, int column, int row, int lane) {
+        const Side across = sideOf(column, lane % tile_size, owner.m_columns);
+        const Side down = sideOf(row, lane / tile_size, owner.m_rows);
+        const auto part = [&](int place, int tile_column, int tile_row, float weight) {
+            m_fits[place] = &owner.m_means[owner.tileAt(tile_column, tile_row)];
+            m_weights[place] = weight;
+        };
+        part(0, column, row, (1.0F - across.weight) * (1.0F - down.weight));
+        part(1, across.tile, row, across.weight * (1.0F - down.weight));
+        part(2, column, down.tile, (1.0F - across.weight) * down.weight);
+        part(3, across.tile, down.tile, across.weight * down.weight);
+    }
+
+    float light(int channel, const float* features) const {
+        float sum = 0.0F;
+        for (int place = 0; place < 4; ++place) {
+            float light = m_fits[place]->constant[channel];
+            for (int i = 0; i < feature_count; ++i)
+                light += m_fits[place]->slope[i][channel] * features[i];
+            sum += m_weights[place] * light;
+        }
+        return sum;
+    }
+
+private:
+    struct Side {
+        int tile;
+        float weight;
+    };
+
+    static Side sideOf(int tile, int pixel, int count) {
+        const float off = (static_cast<float>(pixel) + 0.5F) / tile_size - 0.5F;
+        return {std::clamp(off < 0.0F ? tile - 1 : tile + 1, 0, count - 1), std::abs(off)};
+    }
+
+    const Fit* m_fits[4];
+    float m_weights[4];
+};
+
 void LightFit::show(const LightSums& kind, int column, int row, PixelPlane (&fitted)[3]) const {
-    const Fit fit = meanFitAround(column, row);
     const TilePixels pixels = pixelsOf(tileAt(column, row), kind);
     for (int lane = 0; lane < lane_count; ++lane) {
         const int x = tile_size * column + lane % tile_size;
         const int y = tile_size * row + lane / tile_size;
         if (x >= m_layers.width() || y >= m_layers.height())
             continue;
+        const FitBetween fit(*this, column, row, lane);
+        float features[feature_count];
+        for (int i = 0; i < feature_count; ++i)
+            features[i] = pixels.feature[i][lane];
         float sum[3];
         float albedo[3];
         float light[3];
         for (int c = 0; c < 3; ++c) {
-            sum[c] = fit.constant[c];
-            for (int i = 0; i < feature_count; ++i)
-                sum[c] += fit.slope[i][c] * pixels.feature[i][lane];
-            sum[c] = std::max(sum[c], 0.0F);
-            albedo[c] = pixels.feature[kind.times_albedo ? 3 + c : feature_count - 1][lane];
+            sum[c] = std::max(fit.light(c, features), 0.0F);
+            albedo[c] = features[kind.times_albedo ? 3 + c : feature_count - 1];
         }
         withoutAlbedo(sum, albedo, light);
         for (int c = 0; c < 3; ++c)
@@ -213,6 +256,8 @@ void LightFit::fit(const LightSums& kind, PixelPlane (&fitted)[3]) {
     forTiles([&](int column, int row) {
         m_fits[tileAt(column, row)] = fitOf(momentsAround(column, row));
     });
+    forTiles(
+        [&](int column, int row) { m_means[tileAt(column, row)] = meanFitAround(column, row); });
     forTiles([&](int column, int row) { show(kind, column, row, fitted); });
 }
 

@@ -45,10 +45,12 @@ private:
     };
 
     struct TilePixels;
+    class FitBetween;
 
 public:
     /// Bytes that a pixel takes.
-    static constexpr std::size_t bytes_per_pixel = (sizeof(Moments) + sizeof(Fit)) / lane_count + 1;
+    static constexpr std::size_t bytes_per_pixel =
+        (sizeof(Moments) + 2 * sizeof(Fit)) / lane_count + 1;
 
 private:
     TilePixels pixelsOf(std::size_t tile, const LightSums& kind) const;
@@ -68,6 +70,7 @@ private:
     float m_nearness_tolerance;
     std::vector<Moments> m_moments;
     std::vector<Fit> m_fits;
+    std::vector<Fit> m_means; ///< of the fits that took each tile in
 };
 
 } // namespace quarn
