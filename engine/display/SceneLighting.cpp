@@ -94,7 +94,8 @@ float lightOfSuns(const std::vector<DirectionalLight>& suns) {
 /// Lets the model's own lights shine, where there is no sky for them.
 void addOwnLights(Lighting& lighting, const DisplayScene& scene, bool casts_shadows,
                   const CameraFrame& camera) {
-    const auto suns = documentSuns(scene.lights(), casts_shadows, camera);
+    const std::size_t of_sky = scene.light().first_light_is_sun && !scene.lights().empty() ? 1 : 0;
+    const auto suns = documentSuns(scene.lights().subspan(of_sky), casts_shadows, camera);
     lighting.exposure /= 1.0F + lightOfSuns(suns) + lightOfLamps(lighting.lamps, scene.wholeBox());
     lighting.suns.insert(lighting.suns.end(), suns.begin(), suns.end());
 }

@@ -32,8 +32,10 @@ struct LightSettings {
     std::optional<double> exposure;
     BackgroundKind background = BackgroundKind::automatic;
     KM_Color background_color{255, 255, 255, 255}; ///< for BackgroundKind::color
-    bool has_ground = true;                        ///< else there is none, and no shadow on it
-    double metres_per_unit = 1.0;                  ///< of the scene's coordinates
+    /// The first of the scene's lights is the sun: it shines under the sky alone.
+    bool first_light_is_sun = false;
+    bool has_ground = true;       ///< else there is none, and no shadow on it
+    double metres_per_unit = 1.0; ///< of the scene's coordinates
 
     friend bool operator==(const LightSettings&, const LightSettings&) = default;
 };

@@ -17,7 +17,7 @@ std::vector<KM_Light> DocumentLight::shiningLights(const SceneChanges& changes) 
         return LightStore::canShine(*sun) ? std::vector{*sun} : std::vector<KM_Light>();
     std::vector<KM_Light> lights = m_document.lights().shiningLights();
     const auto sun = m_document.sun().light();
-    if (sun && settings(changes).surroundings == Surroundings::sky)
+    if (sun)
         lights.insert(lights.begin(), *sun);
     return lights;
 }
@@ -29,6 +29,7 @@ LightSettings DocumentLight::settings(const SceneChanges& changes) {
     settings.background = choice.background;
     settings.background_color = choice.background_color;
     settings.has_ground = choice.has_ground;
+    settings.first_light_is_sun = m_document.sun().isEnabled() && !studySun(changes);
     if (const double metres = metresPerUnit(m_document.units()); metres > 0.0)
         settings.metres_per_unit = metres;
     settings.surroundings = choice.surroundings;

@@ -28,7 +28,7 @@ public:
     /// @param document  must outlive this
     explicit DocumentLight(const Document& document) : m_document(document) {}
 
-    /// The lights that shine: the sun of the document first, then those of its table.
+    /// The lights that are on: the sun of the document first, then those of its table.
     std::vector<KM_Light> shiningLights(const SceneChanges& changes = {});
     /// What lies around, which is never left open, and what the scene stands before and on. A
     /// picture of the surroundings is read where it was not yet; one that cannot be read is told

@@ -46,7 +46,7 @@ inline void check(const quarn::SourceScene& scene) {
         if (mesh.mesh)
             check(*mesh.mesh);
     for (const KM_Light& light : scene.lights)
-        require(!light.IsEnabled() && light.Intensity() <= 1.0);
+        require(light.Intensity() <= 1.0);
 }
 
 /// The bytes are refused with a reason that names the file, or make a scene whose indices name

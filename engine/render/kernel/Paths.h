@@ -42,11 +42,19 @@ struct PathLanes {
     LaneInts bounces = 0;
 };
 
+/// Light that was scattered on its way brings no more than this many times the light of a white
+/// surface: what is found so seldom, and is so bright, would be a lone bright pixel.
+constexpr float most_scattered = 6.0F;
+
 /// Adds light from farther on to what it belongs to.
 inline void addFound(const PathLanes& path, const LaneMask& lanes, const LaneColors& light,
                      PathLight& found) {
     const LaneColors none{0.0F, 0.0F, 0.0F};
-    const LaneColors brought = select(lanes, path.weight * light, none);
+    LaneColors brought = select(lanes, path.weight * light, none);
+    const Lanes bright = luminance(brought);
+    const LaneMask dazzling = ~path.clear & (bright > most_scattered);
+    if (any(dazzling))
+        brought = brought * select(dazzling, Lanes(most_scattered) / bright, 1.0F);
     found.direct = found.direct + select(path.first, brought, none);
     const LaneColors later = select(path.first, none, brought);
     const LaneColors scattered = later * path.matt_share;

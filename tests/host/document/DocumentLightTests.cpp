@@ -121,12 +121,12 @@ TEST_F(DocumentLightTest, APictureThatWasMovedWithItsDocumentIsFoundBesideIt) {
 TEST_F(DocumentLightTest, AProductStandsInAStudioWithoutTheSunAndABuildingUnderTheSkyWithIt) {
     addBox(document, {0, 0, 0}, {1, 1, 1});
     EXPECT_EQ(settings().surroundings, Surroundings::studio);
-    EXPECT_TRUE(document.drawing().light().shiningLights().empty());
+    EXPECT_TRUE(settings().first_light_is_sun);
     addBox(document, {0, 0, 0}, {1, 20, 1});
     EXPECT_EQ(settings().surroundings, Surroundings::sky);
     EXPECT_EQ(document.drawing().light().shiningLights().size(), 1U);
     choice().surroundings = Surroundings::studio;
-    EXPECT_TRUE(document.drawing().light().shiningLights().empty()) << "the sun is the sky's";
+    EXPECT_TRUE(settings().first_light_is_sun) << "it shines under the sky alone";
 }
 
 TEST_F(DocumentLightTest, WhatIsHiddenCountsSoThatTheLightStaysThroughoutAFilm) {

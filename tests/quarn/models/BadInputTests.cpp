@@ -24,8 +24,10 @@ protected:
     /// Records two frames of a model.
     std::vector<Picture> record(const std::string& model, const std::string& size = "160x100") {
         const std::string folder = "out-" + model.substr(0, model.find('.'));
-        const Ended ended = run(m_studio.turntableOf(
-            model, 2, {"--mode", GetParam(), "--format", "bmp", "--size", size, "--out", folder}));
+        const Ended ended = run(m_studio.turntableOf(model, 2,
+                                                     {"--mode", GetParam(), "--light", "sky",
+                                                      "--format", "bmp", "--size", size, "--out",
+                                                      folder})); // whatever the size of the model
         EXPECT_EQ(ended.exit_code, 0) << ended.err;
         m_told = ended.err;
         std::vector<Picture> pictures;
