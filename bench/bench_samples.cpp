@@ -23,8 +23,9 @@ constexpr int reference_samples = 4096;
 quarn::Image sampled(const quarn::DisplayScene& scene, int samples) {
     const quarn::RenderKernel& kernel = quarn::renderKernelInForce();
     const quarn::SampleSequence sequence(samples);
-    const quarn::RenderSetup setup = quarn::makeRenderSetup(scene, bench::fromTheStreet(scene),
-                                                            width_px, height_px, sequence, kernel);
+    quarn::RenderTables tables;
+    const quarn::RenderSetup setup = quarn::makeRenderSetup(
+        scene, bench::fromTheStreet(scene), width_px, height_px, sequence, kernel, tables);
     quarn::RenderLayers layers(width_px, height_px);
     quarn::SampleTaking(setup, kernel, layers, samples).run(false, [](double) { return true; });
     quarn::Image image;

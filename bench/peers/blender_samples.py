@@ -47,11 +47,11 @@ def build(folder):
     camera.rotation_euler = (target - eye).to_track_quat("-Z", "Y").to_euler()
     scene.camera = camera
     light = add("sun", bpy.data.lights.new("sun", "SUN"))
-    light.data.energy = 3.0
+    light.data.energy = 1.5
     light.data.angle = math.radians(SUN_DEG)
     light.rotation_euler = sun.to_track_quat("Z", "Y").to_euler()
     bpy.ops.mesh.primitive_plane_add(size=10000.0, location=(0.0, 0.0, -0.01))
-    scene.world.node_tree.nodes["Background"].inputs["Color"].default_value = (0.55, 0.65, 0.8, 1.0)
+    scene.world.node_tree.nodes["Background"].inputs["Color"].default_value = (0.3, 0.36, 0.45, 1.0)
     return scene
 
 
