@@ -223,9 +223,10 @@ TEST(PrintedNames, AreThoseOfHostCommandsOrOfTheirOptions) {
                                            "PreviewSamples", "RenderPreview"};
     const std::string commands = Workshop().run({"console"}, "Help\n").out;
     static const std::regex name("`([A-Z][a-z]+[A-Z][A-Za-z]*)`");
-    for (const char* page : {"README.md", "docs/flythrough.md", "docs/curve-files.md",
-                             "docs/display-modes.md", "docs/light.md", "docs/rendering.md",
-                             "docs/sun-studies.md", "docs/model-files.md", "docs/window.md"}) {
+    for (const char* page :
+         {"README.md", "docs/flythrough.md", "docs/curve-files.md", "docs/display-modes.md",
+          "docs/light.md", "docs/rendering.md", "docs/sun-studies.md", "docs/materials.md",
+          "docs/model-files.md", "docs/window.md"}) {
         const std::string text = printedText(page);
         for (std::sregex_iterator found(text.begin(), text.end(), name), end; found != end;
              ++found) {
