@@ -18,9 +18,11 @@ struct MirrorLanes {
     Lanes facing;          ///< cosine between normal and observer
     LaneVectors observer;  ///< unit vector
     LaneVectors direction; ///< where a perfect mirror would look; of unit length
-    LaneColors first;      ///< of even light what is sent after one mirror
-    LaneColors further;    ///< and after several
-    Lanes gain;            ///< of highlights, for what several mirrors send
+    Lanes straight;        ///< see readSplitSum
+    Lanes along_face;
+    LaneColors first;   ///< of even light what is sent after one mirror
+    LaneColors further; ///< and after several
+    Lanes gain;         ///< of highlights, for what several mirrors send
 };
 
 /// a f0 + b f90 is `first`.
@@ -49,6 +51,20 @@ inline void readSplitSum(const FrameSetup& frame, const Lanes& facing, const Lan
     b = entry(side * side);
 }
 
+/// What mirrors that lie like these send of even light, if they mirror f0 and f90 of it.
+inline void findSent(const MirrorLanes& mirrors, const LaneColors& f0, const Lanes& f90,
+                     LaneColors& first, LaneColors& further) {
+    const Lanes lost = Lanes(1.0F) - (mirrors.straight + mirrors.along_face);
+    const auto find = [&](const Lanes& facing, Lanes& once, Lanes& more) {
+        once = facing * mirrors.straight + f90 * mirrors.along_face;
+        const Lanes mean = facing + (f90 - facing) * (1.0F / 21.0F);
+        more = once * mean * lost / (Lanes(1.0F) - lost * mean);
+    };
+    find(f0.r, first.r, further.r);
+    find(f0.g, first.g, further.g);
+    find(f0.b, first.b, further.b);
+}
+
 /// Completes `mirrors`, of which f0, f90 and roughness are known. Light that goes from mirror to
 /// mirror: C. Fdez-Aguera, "A Multiple-Scattering Microfacet Model for Real-Time Image-Based
 /// Lighting", JCGT 2019.
@@ -65,20 +81,9 @@ inline void findMirrors(const FrameSetup& frame, const RayPacket& packet, const 
     // Smooth and mapped normals would let some mirrors look into the surface itself.
     const Lanes lift = greatest(Lanes(0.01F) - dot(mirrored, face), 0.0F);
     mirrors.direction = ofUnitLength(along(mirrored, face, lift));
-    Lanes a;
-    Lanes b;
-    readSplitSum(frame, mirrors.facing, mirrors.roughness, a, b);
-    const Lanes single = a + b;
-    const Lanes lost = Lanes(1.0F) - single;
-    mirrors.gain = Lanes(1.0F) / single - 1.0F;
-    const auto find = [&](const Lanes& f0, Lanes& first, Lanes& further) {
-        first = f0 * a + mirrors.f90 * b;
-        const Lanes mean = f0 + (mirrors.f90 - f0) * (1.0F / 21.0F);
-        further = first * mean * lost / (Lanes(1.0F) - lost * mean);
-    };
-    find(mirrors.f0.r, mirrors.first.r, mirrors.further.r);
-    find(mirrors.f0.g, mirrors.first.g, mirrors.further.g);
-    find(mirrors.f0.b, mirrors.first.b, mirrors.further.b);
+    readSplitSum(frame, mirrors.facing, mirrors.roughness, mirrors.straight, mirrors.along_face);
+    mirrors.gain = Lanes(1.0F) / (mirrors.straight + mirrors.along_face) - 1.0F;
+    findSent(mirrors, mirrors.f0, mirrors.f90, mirrors.first, mirrors.further);
 }
 
 /// A sun is no point, and its image on a mirror neither.

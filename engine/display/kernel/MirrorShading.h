@@ -77,6 +77,15 @@ inline LaneColors frostedLight(const FrameSetup& frame, const LaneVectors& obser
     return frosted;
 }
 
+/// The part of even light that gets to what is no metal: of half a metal the other half is as it is
+/// without the metal.
+inline LaneColors enteringLight(const LookNumbers<Lanes>& look, const MirrorLanes& base) {
+    LaneColors first;
+    LaneColors further;
+    findSent(base, {look.f0[0], look.f0[1], look.f0[2]}, look.f90, first, further);
+    return (LaneColors{1.0F, 1.0F, 1.0F} - first - further) * (Lanes(1.0F) - look.metalness);
+}
+
 /// Surfaces some of which mirror. What they mirror is no longer there to be scattered or to come
 /// through.
 inline LaneColors shadeMirrors(const FrameSetup& frame, const RayPacket& packet,
@@ -90,8 +99,7 @@ inline LaneColors shadeMirrors(const FrameSetup& frame, const RayPacket& packet,
     addFixedLights(frame, surfaces.normal, light);
     const LaneMask sending = sends_rays && frame.mirrors_scene ? looks.mirrors & lit : noLanes();
     const MirrorLanes& base = layers.base;
-    const LaneColors entering = (LaneColors{1.0F, 1.0F, 1.0F} - base.first - base.further) *
-                                surfaces.albedo * (Lanes(1.0F) - look.metalness);
+    const LaneColors entering = enteringLight(look, base) * surfaces.albedo;
     LaneColors sent = entering * (Lanes(1.0F) - look.transmission) * light +
                       base.first * mirroredLight(frame, packet, surfaces, base,
                                                  sending & ~layers.coated, look.occlusion) +
