@@ -18,6 +18,9 @@ constexpr float LIGHT_OF_PICTURES = 0.8F;
 /// How much a picture's sun counts for that: half of all surfaces face it, more or less.
 constexpr float PART_OF_SUN = 0.5F;
 constexpr float LAMPS_UNDER_SKY = 0.5F;
+/// Of the lights of Shaded that go with the camera, in the studio: whatever side it looks at, the
+/// faces of a model are told apart.
+constexpr float LIGHT_AT_CAMERA = 0.6F;
 /// More would end the range of numbers.
 constexpr double MOST_STOPS = 30.0;
 
@@ -78,9 +81,14 @@ Lighting lightingAmong(Surroundings surroundings, const DisplayScene& scene, boo
                        const CameraFrame& camera) {
     if (surroundings == Surroundings::sky)
         return skyLighting(scene.lights(), casts_shadows, camera);
-    return surroundings == Surroundings::studio
-               ? productStudio()
-               : pictureLighting(*scene.pictureLight(), casts_shadows);
+    if (surroundings == Surroundings::picture)
+        return pictureLighting(*scene.pictureLight(), casts_shadows);
+    Lighting lighting = productStudio();
+    for (DirectionalLight light : studioLighting(camera).fixed) {
+        light.color = scaled(light.color, LIGHT_AT_CAMERA);
+        lighting.fixed.push_back(light);
+    }
+    return lighting;
 }
 
 /// What suns send to open ground.

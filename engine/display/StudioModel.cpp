@@ -29,7 +29,7 @@ Lighting productStudio() {
     Lighting lighting;
     lighting.sky.horizon = {0.34F, 0.34F, 0.34F};
     lighting.sky.zenith = {0.16F, 0.16F, 0.16F};
-    lighting.sky.nadir = {0.20F, 0.20F, 0.20F};
+    lighting.sky.nadir = {0.16F, 0.16F, 0.16F};
     lighting.boxes = {
         boxAt(0.0F, 90.0F, 30.0F, 30.0F, 1.7F), boxAt(-125.0F, 38.0F, 21.0F, 21.0F, 4.0F),
         boxAt(115.0F, 22.0F, 10.0F, 30.0F, 1.3F), boxAt(15.0F, 28.0F, 30.0F, 12.0F, 1.0F)};

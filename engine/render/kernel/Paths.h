@@ -296,6 +296,7 @@ private:
     /// @return how much of it they see
     Lanes meetGroundOrNothing(const FrameSetup& frame, SurfaceLanes& surfaces) {
         Lanes ground = 0.0F;
+        m_caught = noLanes();
         const LaneMask missed = m_path.going & ~m_packet.hit;
         if (!any(missed))
             return ground;
@@ -328,12 +329,17 @@ private:
     void catchShadows(const FrameSetup& frame, const LaneMask& lanes, const Lanes& ground,
                       SurfaceLanes& surfaces) {
         const Lanes t = select(lanes, m_packet.distance, 0.0F);
+        // The light that follows the camera casts no shadows, and is left out of both sides.
+        LaneColors fixed{0.0F, 0.0F, 0.0F};
+        addFixedLights(m_setup.frame, {0.0F, 0.0F, 1.0F}, fixed);
         const LaneColors open =
-            lightOnOpenGround(frame, along(m_packet.origin(), m_packet.direction(), t));
+            lightOnOpenGround(m_setup.frame, along(m_packet.origin(), m_packet.direction(), t)) -
+            fixed;
         const LaneColors part{Lanes(1.0F) / greatest(open.r, 1e-6F),
                               Lanes(1.0F) / greatest(open.g, 1e-6F),
                               Lanes(1.0F) / greatest(open.b, 1e-6F)};
         LaneMask apart = noLanes();
+        m_caught = lanes;
         if (!frame.has_sky) {
             apart = lanes & m_path.first;
             const Lanes weight = select(apart, ground, 0.0F);
@@ -409,8 +415,9 @@ private:
         GlassLanes glass = noGlass();
         if (met.lobes.has_mirrors && any(met.looks->numbers.transmission > 0.0F))
             startGlass(met, glass, choice);
-        if (m_setup.frame.fixed_count > 0 && any(met.lit & m_path.clear))
-            addFixed(met, met.lit & m_path.clear, m_path, m_found);
+        const LaneMask followed = met.lit & m_path.clear & ~m_caught;
+        if (m_setup.frame.fixed_count > 0 && any(followed))
+            addFixed(met, followed, m_path, m_found);
         addLights(met, m_path, places(SampleUse::light), chance, m_found);
         const LanePlaces place = places(SampleUse::direction);
         scatter(met, place, choice, m_path, origin, direction);
@@ -439,6 +446,7 @@ private:
     PathLanes m_path;
     PathLight m_found;
     int m_surface = 0;             ///< how many of those that send light on the paths have come to
+    LaneMask m_caught = noLanes(); ///< the lanes that are on ground that shows shadows alone
     LaneMask m_passed = noLanes(); ///< the lanes that passed the last surface,
     Lanes m_choice = 0.0F;         ///< and what is left of their choices
 };
