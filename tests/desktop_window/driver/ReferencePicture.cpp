@@ -9,8 +9,8 @@ namespace {
 
 /// One pixel of a reference stands for four by four of the screen.
 constexpr int REDUCTION = 4;
-constexpr double GREATEST_MEAN = 0.012;
-constexpr double GREATEST_SHARE = 0.03;
+constexpr double GREATEST_MEAN = 0.008;
+constexpr double GREATEST_SHARE = 0.02;
 constexpr int VISIBLE_STEP = 255 / 10;
 
 QImage fromSomeWayOff(const QImage& picture) {
