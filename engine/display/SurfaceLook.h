@@ -55,8 +55,8 @@ struct SurfaceLook {
     /// texture of the thickness says how much of them counts.
     float density[3] = {0, 0, 0};
     LookTexture thickness;
-    float index = 1.5F;             ///< of refraction
-    bool is_thin = true;            ///< a sheet that bends no light
+    float index = 1.5F;              ///< of refraction
+    bool is_thin = true;             ///< a sheet that bends no light
     float absorption[3] = {0, 0, 0}; ///< of the inside, by unit of the way, as powers of e
     LookTexture clearcoat;
     LookTexture clearcoat_roughness;
