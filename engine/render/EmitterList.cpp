@@ -2,6 +2,7 @@
 
 #include "engine/display/DisplayScene.h"
 #include "engine/display/SurfaceLook.h"
+#include "engine/images/ColorSpace.h"
 #include "kelmar/KM_Mesh.h"
 
 #include <cmath>
@@ -12,11 +13,11 @@ namespace {
 
 constexpr float LEAST_BRIGHTNESS = 1e-3F;
 
-float brightnessOf(const RaySurface& surface) {
+float brightnessOfSurface(const RaySurface& surface) {
     if (!surface.look)
         return 0.0F;
     const float(&emission)[3] = surface.look->numbers.emission;
-    return 0.2126F * emission[0] + 0.7152F * emission[1] + 0.0722F * emission[2];
+    return brightnessOf({emission[0], emission[1], emission[2]});
 }
 
 void set(float (&to)[3], const KM_3dVector& v) {
@@ -44,7 +45,7 @@ double makeEmitter(const KM_3dPoint (&corners)[3], Emitter& emitter) {
 
 void EmitterList::addMesh(const DisplayScene& scene, std::size_t index) {
     const DisplayScene::MeshObject& object = scene.meshes()[scene.meshOfSurface(index)];
-    const float bright = brightnessOf(scene.rays().surfaces()[index]);
+    const float bright = brightnessOfSurface(scene.rays().surfaces()[index]);
     const KM_Mesh& mesh = object.mesh->mesh();
     for (const KM_MeshTriangle& triangle : mesh.m_F) {
         KM_3dPoint corners[3];
@@ -68,7 +69,7 @@ void EmitterList::find(const DisplayScene& scene) {
     m_density_of_brightness = 0.0F;
     for (std::size_t i = 0; i < scene.rays().surfaces().size(); ++i) {
         const DisplayScene::MeshObject& object = scene.meshes()[scene.meshOfSurface(i)];
-        if (object.visible && brightnessOf(scene.rays().surfaces()[i]) > LEAST_BRIGHTNESS)
+        if (object.visible && brightnessOfSurface(scene.rays().surfaces()[i]) > LEAST_BRIGHTNESS)
             addMesh(scene, i);
         if (m_emitters.size() > most_triangles) {
             m_emitters.clear();

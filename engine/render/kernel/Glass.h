@@ -17,15 +17,6 @@ struct GlassLanes {
     LaneMask front;        ///< the ray comes from outside
 };
 
-/// 1 or -1: whether a transform keeps the turn of triangles.
-inline float handOf(const SurfacePlace& place) {
-    const float(&m)[3][3] = place.linear;
-    const float volume = m[0][0] * (m[1][1] * m[2][2] - m[1][2] * m[2][1]) -
-                         m[0][1] * (m[1][0] * m[2][2] - m[1][2] * m[2][0]) +
-                         m[0][2] * (m[1][0] * m[2][1] - m[1][1] * m[2][0]);
-    return volume < 0.0F ? -1.0F : 1.0F;
-}
-
 inline GlassLanes noGlass() {
     return {1.5F, noLanes(), {0.0F, 0.0F, 0.0F}, noLanes()};
 }
@@ -45,7 +36,7 @@ inline GlassLanes readGlass(const FrameSetup& frame, const RayPacket& packet,
         const SurfaceLook& look = *surface.look;
         LaneVectors outward = geometricNormals(frame, packet);
         if (surface.place)
-            outward = turned(surface.place->cofactors, outward) * handOf(*surface.place);
+            outward = turned(surface.place->cofactors, outward) * Lanes(surface.place->hand);
         glass.front = glass.front | (same & (dot(outward, packet.direction()) < 0.0F));
         glass.index = select(same, Lanes(look.index), glass.index);
         if (look.is_thin)
