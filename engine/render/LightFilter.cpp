@@ -16,6 +16,10 @@ constexpr float plane_tolerance = 0.004F;
 /// The variance of a few samples says little; then it is taken to be as large as the light.
 constexpr int few_samples = 4;
 
+/// A pixel whose samples scatter more than those around it counts so much of that at least: else
+/// one that met something bright by chance would stay as it is, a lone dot.
+constexpr float own_part = 0.6F;
+
 /// From so many on a pixel's own variance is sure enough.
 constexpr int many_samples = 32;
 
@@ -135,7 +139,8 @@ void LightFilter::smoothVariance(const PixelPlane& from, PixelPlane& to) const {
                     sum += weight * from.row(y + dy)[x + dx];
                     weights += weight;
                 }
-            to.row(y)[x] = weights > 0.0F ? sum / weights : 0.0F;
+            const float around = weights > 0.0F ? sum / weights : 0.0F;
+            to.row(y)[x] = std::max(around, own_part * from.row(y)[x]);
         }
     });
 }

@@ -9,7 +9,7 @@ struct RenderSettings {
     int width_px = 1280;
     int height_px = 720;
     int samples = 64;        ///< of a pixel, by Render; 1 to RenderRequest::most_samples
-    int preview_samples = 8; ///< of a pixel, by RenderPreview
+    int preview_samples = 4; ///< of a pixel, by RenderPreview
     LightChoice light = {};
 
     friend bool operator==(const RenderSettings&, const RenderSettings&) = default;

@@ -118,6 +118,17 @@ TEST(LightFilter, SmoothsNoiseOnAFlatWall) {
               0.45 * scatterOf(gloss.unfiltered(gloss_sums)));
 }
 
+TEST(LightFilter, OneSampleThatMetSomethingBrightLeavesNoDot) {
+    Floor floor;
+    floor.addSamples(sky_sums, [](int x, int y) { return x % 2 == y % 2 ? 0.9F : 1.1F; });
+    floor.addSample(sky_sums, 40, 40, 9.0F);
+    const auto dot = [](const std::vector<double>& light) { return light[40 * side_px + 40]; };
+    ASSERT_GT(dot(floor.unfiltered(sky_sums)), 2.0);
+    const std::vector<double> behind = floor.filtered(sky_sums);
+    EXPECT_LT(dot(behind), 1.25);
+    EXPECT_GT(meanOf(behind), 1.0) << "its light is spread, not lost";
+}
+
 TEST(LightFilter, LightOfTwoSurfacesInAPixelIsTheirMixture) {
     // Two walls meet in pixels that each show a part of both, and in whose few samples the light
     // of a surface scatters.

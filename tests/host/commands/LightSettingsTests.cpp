@@ -58,7 +58,7 @@ TEST_F(LightSettingsTest, ThePromptShowsWhatIsChosen) {
     for (const auto& option : front_end.questions().back().options)
         shown += std::wstring(option.english_name.View()) + L"=" +
                  std::wstring(option.value.View()) + L" ";
-    EXPECT_EQ(shown, L"Size=1280x720 Samples=64 PreviewSamples=8 Light=Sky Exposure=-2 "
+    EXPECT_EQ(shown, L"Size=1280x720 Samples=64 PreviewSamples=4 Light=Sky Exposure=-2 "
                      L"Background=#000000 Ground=No ");
 }
 
