@@ -12,6 +12,7 @@
 #include "engine/render/SampleSequence.h"
 #include "engine/render/SampleTaking.h"
 
+#include <cmath>
 #include <fstream>
 
 namespace {
@@ -31,12 +32,34 @@ quarn::Image sampled(const quarn::DisplayScene& scene, int samples) {
     quarn::Image image;
     image.resize(width_px, height_px);
     for (int y = 0; y < height_px; ++y)
-        quarn::encodeRow(layers, y, image);
+        quarn::encodeRow(layers, setup.frame, y, image);
     return image;
 }
 
-/// Lines of three numbers: the eye, what it looks at, where the sun stands; and half the vertical
-/// angle of view in radians.
+/// What the sky sheds on level ground, over pi: the radiance of an even sky that does the same.
+void addEvenSky(const quarn::RenderSetup& setup, const quarn::RenderKernel& kernel,
+                float (&color)[3]) {
+    constexpr int rings = 64;
+    for (int ring = 0; ring < rings; ++ring) {
+        // Rings whose projections onto the ground are of one size.
+        const double across = std::sqrt((ring + 0.5) / rings);
+        alignas(64) float directions[3][quarn::lane_count];
+        for (int i = 0; i < quarn::lane_count; ++i) {
+            const double turn = 2.0 * 3.14159265358979 * i / quarn::lane_count;
+            directions[0][i] = static_cast<float>(across * std::cos(turn));
+            directions[1][i] = static_cast<float>(across * std::sin(turn));
+            directions[2][i] = static_cast<float>(std::sqrt(1.0 - across * across));
+        }
+        alignas(64) float colors[3][quarn::lane_count];
+        kernel.light_around(setup.bounce, directions, colors);
+        for (int c = 0; c < 3; ++c)
+            for (const float light : colors[c])
+                color[c] += light * setup.sky_scale[c] / (rings * quarn::lane_count);
+    }
+}
+
+/// Lines of three numbers: the eye, what it looks at, where the sun stands, the colour of the sun
+/// and that of an even sky; and half the vertical angle of view in radians.
 void writeScene(const quarn::DisplayScene& scene, const std::filesystem::path& folder) {
     std::filesystem::create_directories(folder);
     if (!pavilion::write(folder))
@@ -47,6 +70,16 @@ void writeScene(const quarn::DisplayScene& scene, const std::filesystem::path& f
     std::ofstream file(folder / "view.txt");
     for (const KM_3dVector& v : {eye - KM_3dPoint::Origin, target - KM_3dPoint::Origin, sun})
         file << v.x << ' ' << v.y << ' ' << v.z << '\n';
+    const quarn::RenderKernel& kernel = quarn::renderKernelInForce();
+    const quarn::SampleSequence sequence(1);
+    quarn::RenderTables tables;
+    const quarn::RenderSetup setup = quarn::makeRenderSetup(
+        scene, bench::fromTheStreet(scene), width_px, height_px, sequence, kernel, tables);
+    const float(&sun_color)[3] = setup.frame.suns[0].color;
+    float sky[3] = {};
+    addEvenSky(setup, kernel, sky);
+    file << sun_color[0] << ' ' << sun_color[1] << ' ' << sun_color[2] << '\n';
+    file << sky[0] << ' ' << sky[1] << ' ' << sky[2] << '\n';
     double vertical = 0.0;
     double horizontal = 0.0;
     bench::fromTheStreet(scene).GetCameraHalfAngles(&vertical, &horizontal);

@@ -2,8 +2,10 @@
 
 Renders what `bench_samples FOLDER` wrote there with Cycles on the CPU, without its denoiser, and
 prints the same table: seconds of rendering alone, and how far each picture is from one of 4096
-samples. The light is alike: a sun disc of the same direction and size, an even sky, a ground. Pixels
-are weighed evenly (a box filter one pixel wide), as in our pictures.
+samples. The light is alike: a sun disc of the same direction, size and colour, an even sky that
+sheds as much light, a ground; paths are as long, and what brings too much light is cut at the same
+height. Pixels are weighed evenly (a box filter one pixel wide) and shown by the sRGB curve alone, as
+in our pictures.
 """
 
 import math
@@ -22,8 +24,10 @@ SUN_DEG = 0.53
 
 def read_view(folder):
     with open(os.path.join(folder, "view.txt")) as lines:
-        eye, target, sun, angle = [[float(word) for word in line.split()] for line in lines]
-    return Vector(eye), Vector(target), Vector(sun), angle[0]
+        eye, target, sun, sun_color, sky, angle = [
+            [float(word) for word in line.split()] for line in lines
+        ]
+    return Vector(eye), Vector(target), Vector(sun), sun_color, sky, angle[0]
 
 
 def add(name, data):
@@ -38,7 +42,7 @@ def build(folder):
         bpy.data.objects.remove(thing)
     bpy.ops.wm.obj_import(filepath=os.path.join(folder, "pavilion.obj"),
                           forward_axis="Y", up_axis="Z")  # fmt: skip
-    eye, target, sun, half_angle = read_view(folder)
+    eye, target, sun, sun_color, sky, half_angle = read_view(folder)
     camera = add("camera", bpy.data.cameras.new("camera"))
     camera.data.sensor_fit = "VERTICAL"
     camera.data.angle = 2.0 * half_angle
@@ -47,11 +51,12 @@ def build(folder):
     camera.rotation_euler = (target - eye).to_track_quat("-Z", "Y").to_euler()
     scene.camera = camera
     light = add("sun", bpy.data.lights.new("sun", "SUN"))
-    light.data.energy = 1.5
+    light.data.color = sun_color
+    light.data.energy = math.pi  # white surfaces that face it are as bright as its colour
     light.data.angle = math.radians(SUN_DEG)
     light.rotation_euler = sun.to_track_quat("Z", "Y").to_euler()
     bpy.ops.mesh.primitive_plane_add(size=10000.0, location=(0.0, 0.0, -0.01))
-    scene.world.node_tree.nodes["Background"].inputs["Color"].default_value = (0.3, 0.36, 0.45, 1.0)
+    scene.world.node_tree.nodes["Background"].inputs["Color"].default_value = (*sky, 1.0)
     return scene
 
 
@@ -66,6 +71,9 @@ def set_up(scene, threads):
     scene.cycles.use_denoising = False
     scene.cycles.use_adaptive_sampling = False
     scene.cycles.pixel_filter_type = "BOX"
+    scene.cycles.max_bounces = scene.cycles.diffuse_bounces = scene.cycles.glossy_bounces = 8
+    scene.cycles.sample_clamp_indirect = 6.0
+    scene.view_settings.view_transform = "Standard"
 
 
 def processor_seconds():

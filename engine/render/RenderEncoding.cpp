@@ -102,24 +102,11 @@ float backgroundAt(const FrameSetup& frame, int y, std::size_t channel) {
 
 /// Lays ground that shows shadows alone under the rest: it looks like the background, of which
 /// shadows take.
-void addCatcher(const RenderLayers& layers, const FrameSetup& frame, const Colors& caught,
-                Colors& colors) {
-    forRows(layers, [&](std::size_t pixel, int x, int y) {
-        const float ground = meanScale(layers, x, y) * layers.at(RenderPlane::catcher, x, y);
-        for (std::size_t c = 0; c < 3 && ground > 0.0F; ++c) {
-            const float left = leftOf(ground, caught[3 * pixel + c]);
-            colors[3 * pixel + c] += ground * lightShownAs(backgroundAt(frame, y, c) * left);
-        }
-    });
-}
-
-void showOpaque(const RenderLayers& layers, const Colors& colors, Image& image) {
-    const std::uint32_t* const table = displayTable().entries();
-    forRows(layers, [&](std::size_t pixel, int, int) {
-        for (std::size_t c = 0; c < 3; ++c)
-            image.rgba[4 * pixel + c] = shown(colors[3 * pixel + c], table);
-        image.rgba[4 * pixel + 3] = 255;
-    });
+void addCatcher(const RenderLayers& layers, const FrameSetup& frame, int x, int y,
+                const float* caught, float* color) {
+    const float ground = meanScale(layers, x, y) * layers.at(RenderPlane::catcher, x, y);
+    for (std::size_t c = 0; c < 3 && ground > 0.0F; ++c)
+        color[c] += ground * lightShownAs(backgroundAt(frame, y, c) * leftOf(ground, caught[c]));
 }
 
 /// How opaque a pixel is before nothing. A shadow is black, and as dark as on white when pictures
@@ -137,17 +124,50 @@ float opacityOf(const RenderLayers& layers, int x, int y, const float* caught) {
 }
 
 /// Colours are not multiplied by the opacity.
-void showBeforeNothing(const RenderLayers& layers, const Colors& colors, const Colors& caught,
-                       Image& image) {
-    const std::uint32_t* const table = displayTable().entries();
-    forRows(layers, [&](std::size_t pixel, int x, int y) {
-        const float opacity = opacityOf(layers, x, y, caught.data() + 3 * pixel);
-        const auto alpha = static_cast<std::uint8_t>(opacity * 255.0F + 0.5F);
-        for (std::size_t c = 0; c < 3; ++c)
-            image.rgba[4 * pixel + c] =
-                alpha > 0 ? shown(colors[3 * pixel + c] / opacity, table) : std::uint8_t{0};
-        image.rgba[4 * pixel + 3] = alpha;
-    });
+void showBeforeNothing(const RenderLayers& layers, int x, int y, const float* color,
+                       const float* caught, std::uint8_t* pixel) {
+    const float opacity = opacityOf(layers, x, y, caught);
+    const auto alpha = static_cast<std::uint8_t>(opacity * 255.0F + 0.5F);
+    for (int c = 0; c < 3; ++c)
+        pixel[c] =
+            alpha > 0 ? shown(color[c] / opacity, displayTable().entries()) : std::uint8_t{0};
+    pixel[3] = alpha;
+}
+
+/// @param color   the light of a pixel, without ground that shows shadows alone
+/// @param caught  see addLight
+void showPixel(const RenderLayers& layers, const FrameSetup& frame, int x, int y, float* color,
+               const float* caught, std::uint8_t* pixel) {
+    if (frame.has_clear_background) {
+        showBeforeNothing(layers, x, y, color, caught, pixel);
+        return;
+    }
+    if (frame.catches_shadows && !frame.has_sky)
+        addCatcher(layers, frame, x, y, caught, color);
+    for (int c = 0; c < 3; ++c)
+        pixel[c] = shown(color[c], displayTable().entries());
+    pixel[3] = 255;
+}
+
+/// The light that the samples of a pixel found, as it is.
+/// @param caught  see addLight
+void readUnfiltered(const RenderLayers& layers, int x, int y, float (&color)[3],
+                    float (&caught)[3]) {
+    const float scale = meanScale(layers, x, y);
+    float sum[3];
+    float albedo[3];
+    float light[3];
+    for (int c = 0; c < 3; ++c) {
+        sum[c] = layers.at(RenderPlane::sky_r + c, x, y) + layers.at(RenderPlane::sun_r + c, x, y);
+        albedo[c] = layers.at(RenderPlane::albedo_r + c, x, y);
+    }
+    withoutAlbedo(sum, albedo, light);
+    for (int c = 0; c < 3; ++c) {
+        const float on_catcher = light[c] * layers.at(RenderPlane::catcher_r + c, x, y);
+        caught[c] = scale * on_catcher;
+        color[c] = scale * (layers.at(RenderPlane::direct_r + c, x, y) +
+                            layers.at(RenderPlane::gloss_r + c, x, y) + sum[c] - on_catcher);
+    }
 }
 
 /// Of pixels that nothing is known of, in sRGB.
@@ -155,20 +175,19 @@ constexpr std::uint8_t not_begun = 60;
 
 } // namespace
 
-void encodeRow(const RenderLayers& layers, int y, Image& image) {
-    const std::uint32_t* const table = displayTable().entries();
+void encodeRow(const RenderLayers& layers, const FrameSetup& frame, int y, Image& image) {
     std::uint8_t* pixel = image.rgba.data() + std::size_t{4} * static_cast<std::size_t>(y) *
                                                   static_cast<std::size_t>(image.width);
     for (int x = 0; x < image.width; ++x, pixel += 4) {
-        const float scale = meanScale(layers, x, y);
-        for (int c = 0; c < 3; ++c) {
-            float light = 0.0F;
-            for (const int plane : {RenderPlane::direct_r, RenderPlane::sky_r, RenderPlane::sun_r,
-                                    RenderPlane::gloss_r})
-                light += layers.at(plane + c, x, y);
-            pixel[c] = scale > 0.0F ? shown(scale * light, table) : not_begun;
+        if (layers.samplesAt(x, y) == 0) {
+            std::fill_n(pixel, 3, not_begun);
+            pixel[3] = 255;
+            continue;
         }
-        pixel[3] = 255;
+        float color[3];
+        float caught[3];
+        readUnfiltered(layers, x, y, color, caught);
+        showPixel(layers, frame, x, y, color, caught, pixel);
     }
 }
 
@@ -184,13 +203,10 @@ void encodeRender(const RenderLayers& layers, const FrameSetup& frame, LightFilt
     if (hasGloss(layers))
         addGloss(layers, filter.filtered({&gloss_sums, 1}).front(), colors);
     image.resize(layers.width(), layers.height());
-    if (frame.has_clear_background) {
-        showBeforeNothing(layers, colors, caught, image);
-        return;
-    }
-    if (frame.catches_shadows && !frame.has_sky)
-        addCatcher(layers, frame, caught, colors);
-    showOpaque(layers, colors, image);
+    forRows(layers, [&](std::size_t pixel, int x, int y) {
+        showPixel(layers, frame, x, y, colors.data() + 3 * pixel, caught.data() + 3 * pixel,
+                  image.rgba.data() + 4 * pixel);
+    });
 }
 
 } // namespace quarn

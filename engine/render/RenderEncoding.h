@@ -15,8 +15,9 @@ inline constexpr std::size_t render_encoding_bytes = 6 * sizeof(float);
 
 /// Shows one row of the sums of some samples as they are, with their noise; grey where there is
 /// none.
+/// @param frame  tells of the background
 /// @param image  has the size of the layers
-void encodeRow(const RenderLayers& layers, int y, Image& image);
+void encodeRow(const RenderLayers& layers, const FrameSetup& frame, int y, Image& image);
 
 /// Puts the sums together and shows them as Rendered mode does. Pixels before a clear background
 /// get an opacity of their own.

@@ -78,7 +78,7 @@ Result<RenderEnd> Renderer::render(const DisplayScene& scene, const KM_Viewport&
                       scene.canBeSeenBy(viewport, request.width_px, request.height_px));
     RenderLayers layers(request.width_px, request.height_px);
     SampleTaking taking(setup, *m_kernel, layers, request.samples);
-    PictureSoFar so_far(layers, lines, shown);
+    PictureSoFar so_far(layers, setup.frame, lines, shown);
     const auto pause = [&](double share) {
         so_far.showWhenDue();
         return watch(share);
