@@ -131,6 +131,8 @@ SurfaceLook MaterialCache::makeLook(const Material& material, bool has_coordinat
         setMirrors(material, look);
     if (material.transmission > 0.0F)
         setGlass(material, look);
+    look.shows_scene = look.mirrors && look.numbers.metalness > 0.5F &&
+                       look.numbers.roughness < roughness_of_surroundings;
     if (has_coordinates)
         addTextures(material, look);
     if (!look.thickness.mips)

@@ -1,5 +1,7 @@
 #include "engine/display/PixelSmoother.h"
 
+#include "engine/display/SurfaceLook.h"
+
 #include <algorithm>
 #include <cstdlib>
 
@@ -17,9 +19,10 @@ constexpr SamplePattern inner_samples{
     {{0.0625F, -0.1875F}, {-0.0625F, 0.1875F}, {0.3125F, 0.0625F}, {-0.1875F, -0.3125F}}};
 
 /// How much the first rays of a pixel must differ, in steps of 255, for it to be worth more rays.
-/// Where surfaces let others through, steps are soft and rays dear.
+/// Where surfaces let others through, steps are soft and rays dear; so they are within one mirror.
 constexpr int pixel_threshold = 12;
 constexpr int layered_pixel_threshold = 40;
+constexpr int mirror_threshold = 40;
 
 std::uint8_t channel(std::uint32_t pixel, int index) {
     return static_cast<std::uint8_t>(pixel >> (8 * index));
@@ -40,6 +43,17 @@ bool isVaried(std::uint32_t center, const SampleBatch::Colors& colors, int thres
             if (std::abs(channel(color, c) - channel(center, c)) > threshold)
                 return true;
     return false;
+}
+
+/// Whether all rays of a pixel met one surface, which mirrors the scene.
+bool isWithinMirror(const FrameSetup& frame, std::uint32_t center_object,
+                    std::span<const std::uint32_t> objects) {
+    if (!frame.mirrors_scene || center_object == 0)
+        return false;
+    const SurfaceLook* const look = frame.surfaces[center_object - 1].look;
+    return look && look->shows_scene &&
+           std::all_of(objects.begin(), objects.end(),
+                       [&](std::uint32_t object) { return object == center_object; });
 }
 
 } // namespace
@@ -96,8 +110,11 @@ void PixelSmoother::finish() {
 void PixelSmoother::shootFirst() {
     m_first.shoot([&](SampledPixel& pixel, const Colors& colors, const Colors& objects) {
         std::uint32_t& center = m_frame.pixels[offset(pixel)];
-        const bool outlier = centerIsOutlier(m_frame.objects[offset(pixel)], objects);
-        const bool varied = m_twice && (outlier || isVaried(center, colors, m_threshold));
+        const std::uint32_t object = m_frame.objects[offset(pixel)];
+        const bool outlier = centerIsOutlier(object, objects);
+        const int threshold =
+            isWithinMirror(m_frame, object, objects) ? mirror_threshold : m_threshold;
+        const bool varied = m_twice && (outlier || isVaried(center, colors, threshold));
         if (!outlier)
             pixel.sum.add(center, m_srgb);
         addAll(pixel.sum, colors);

@@ -36,10 +36,15 @@ template <class Number> struct LookNumbers {
 inline constexpr LookNumbers<float> matt_look{1, {0, 0, 0}, 0, 1, {0, 0, 0}, 0,
                                               0, {0, 0, 0}, 0, 0, 0};
 
+/// Up to the first roughness mirrors show the scene itself, from the second on what lies around.
+inline constexpr float roughness_of_scene = 0.2F;
+inline constexpr float roughness_of_surroundings = 0.4F;
+
 /// What a surface looks like beyond its base colour, as the ray loops use it; see Material.
 struct SurfaceLook {
     bool is_unlit = false;
-    bool mirrors = false; ///< else it scatters all light evenly
+    bool mirrors = false;     ///< else it scatters all light evenly
+    bool shows_scene = false; ///< it mirrors most of the light, and sharply
     bool has_textures = false;
     LookNumbers<float> numbers = matt_look; ///< without the textures
     float normal_scale = 1.0F;

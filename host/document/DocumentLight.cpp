@@ -4,7 +4,21 @@
 #include "engine/scene/UnitLength.h"
 #include "host/document/Document.h"
 
+#include <algorithm>
+
 namespace quarn {
+
+namespace {
+
+/// Whether a sun shines that no plug-in put there last.
+bool hasSunOfModel(const LightStore& lights) {
+    const auto suns = std::ranges::count(lights.shiningLights(), KM_LightStyle::world_directional,
+                                         &KM_Light::Style);
+    const auto of_plug_in = lights.studySun();
+    return suns > (of_plug_in && LightStore::canShine(*of_plug_in) ? 1 : 0);
+}
+
+} // namespace
 
 std::optional<KM_Light> DocumentLight::studySun(const SceneChanges& changes) const {
     if (changes.sun)
@@ -12,12 +26,17 @@ std::optional<KM_Light> DocumentLight::studySun(const SceneChanges& changes) con
     return m_document.sun().isEnabled() ? std::nullopt : m_document.lights().studySun();
 }
 
+std::optional<KM_Light> DocumentLight::ownSun(const SceneChanges& changes) const {
+    const DocumentSun& sun = m_document.sun();
+    const bool makes_way = !sun.wasMoved() && hasSunOfModel(m_document.lights());
+    return makes_way || studySun(changes) ? std::nullopt : sun.light();
+}
+
 std::vector<KM_Light> DocumentLight::shiningLights(const SceneChanges& changes) {
     if (const auto sun = studySun(changes))
         return LightStore::canShine(*sun) ? std::vector{*sun} : std::vector<KM_Light>();
     std::vector<KM_Light> lights = m_document.lights().shiningLights();
-    const auto sun = m_document.sun().light();
-    if (sun)
+    if (const auto sun = ownSun(changes))
         lights.insert(lights.begin(), *sun);
     return lights;
 }
@@ -29,7 +48,7 @@ LightSettings DocumentLight::settings(const SceneChanges& changes) {
     settings.background = choice.background;
     settings.background_color = choice.background_color;
     settings.has_ground = choice.has_ground;
-    settings.first_light_is_sun = m_document.sun().isEnabled() && !studySun(changes);
+    settings.first_light_is_sun = ownSun(changes).has_value();
     if (const double metres = metresPerUnit(m_document.units()); metres > 0.0)
         settings.metres_per_unit = metres;
     settings.surroundings = choice.surroundings;

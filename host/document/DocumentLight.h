@@ -18,7 +18,8 @@ class Document;
 /// Its sun belongs to the sky: in a studio and among the surroundings of a picture it does not
 /// shine. Where nobody chose what lies around, it is the sky for buildings and the studio for
 /// products (surroundingsOf), whereby the sun of the document counts only where somebody moved it;
-/// a new one has it too.
+/// a new one has it too. One that nobody moved makes way for the suns of a model: these shine
+/// alone.
 ///
 /// In a sun study the lights of the document rest and the sun of the study shines alone, under the
 /// sky unless something else was chosen. A study is drawn where the changes have its sun, and while
@@ -44,6 +45,8 @@ public:
 
 private:
     std::optional<KM_Light> studySun(const SceneChanges& changes) const;
+    /// The document's sun, where it is on and shines.
+    std::optional<KM_Light> ownSun(const SceneChanges& changes) const;
     Surroundings openSurroundings(const LightSettings& settings, const SceneChanges& changes);
     const KM_BoundingBox& surfaceBox();
 

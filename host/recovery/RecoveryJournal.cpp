@@ -1,6 +1,7 @@
 #include "host/recovery/RecoveryJournal.h"
 
 #include "engine/images/ImageFile.h"
+#include "engine/images/Opacity.h"
 #include "engine/scene/MaterialFields.h"
 #include "ground/PathText.h"
 #include "host/recovery/RecoveryCoding.h"
@@ -241,7 +242,9 @@ Result<void> RecoveryJournal::appendTo(AppendedFile& file,
 bool RecoveryJournal::takePicture(const Image& picture) {
     if (picture.width == 0)
         return false;
-    auto png = encodeImage(picture, ImageFormat::png);
+    // Lists show it on grounds of their own colours, dark ones too.
+    Image space;
+    auto png = encodeImage(onWhite(picture, space), ImageFormat::png);
     if (png)
         m_picture = std::move(png.value());
     return png.ok();

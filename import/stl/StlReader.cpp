@@ -33,10 +33,13 @@ Result<SourceScene> readStl(const ModelReading& reading) {
     const std::string_view file = textOf(reading.bytes);
     const bool is_text = !hasBinaryStlLength(file) && isText(file);
     Result<SourceScene> scene = is_text ? readTextStl(reading) : readBinaryStl(reading);
-    if (scene)
-        scene.value().up = upAxisOf(
-            reading.up, file.substr(0, HEADER_BYTES),
-            {{"Exported from Blender", "Blender", UpAxis::z}, {"OpenSCAD", "OpenSCAD", UpAxis::z}});
+    if (!scene)
+        return scene;
+    // The format states no unit. What is printed or milled from it, does in millimetres.
+    scene.value().units = UnitSystem::millimeters;
+    scene.value().up = upAxisOf(
+        reading.up, file.substr(0, HEADER_BYTES),
+        {{"Exported from Blender", "Blender", UpAxis::z}, {"OpenSCAD", "OpenSCAD", UpAxis::z}});
     return scene;
 }
 

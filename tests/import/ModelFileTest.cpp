@@ -126,12 +126,16 @@ TEST(ModelFile, GltfIsTurnedFromYUpToZUp) {
     expectNear(boundsOf(model).m_max, {1, 0, 1}, 1e-7);
 }
 
-TEST(ModelFile, LengthsOfGltfAreMetresAndThoseOfOtherFormatsAreNotStated) {
+TEST(ModelFile, LengthsOfGltfAreMetresThoseOfStlMillimetresAndThoseOfOtherFormatsAreNotStated) {
     const TemporaryFolder folder;
     const std::string gltf = folder.write("a.gltf", gltfTriangle(R"([{"mesh":0}])", gray_half));
     EXPECT_EQ(readOrFail(gltf).units, UnitSystem::meters);
     const std::string obj = folder.write("a.obj", "v 0 0 0\nv 1 0 0\nv 0 1 0\nf 1 2 3\n");
     EXPECT_EQ(readOrFail(obj).units, UnitSystem::none);
+    const std::string stl = folder.write("a.stl", "solid a\nfacet normal 0 0 1\nouter loop\n"
+                                                  "vertex 0 0 0\nvertex 1 0 0\nvertex 0 1 0\n"
+                                                  "endloop\nendfacet\nendsolid a\n");
+    EXPECT_EQ(readOrFail(stl).units, UnitSystem::millimeters);
 }
 
 TEST(ModelFile, LinearBaseColourOfGltfBecomesSrgb) {

@@ -216,6 +216,7 @@ struct FrameSetup {
 /// How visible a change of colour from pixel to pixel must be for an edge, in steps of a channel's
 /// 255.
 inline constexpr int visible_step = 14;
+inline constexpr int visible_step_in_mirror = 24;
 
 /// A part of the picture, in pixels; the upper left corner lies on a tile's corner.
 struct PixelBlock {

@@ -42,25 +42,25 @@ inline Lanes lamplightArriving(const FrameSetup& frame, const FrameLamp& lamp,
 }
 
 /// Adds the light of the lamps.
-/// @param also  see addLights
-template <class Also>
+/// @param mirrors  see addLights
+template <class Mirrors>
 [[gnu::noinline]] void addLamps(const FrameSetup& frame, const RayPacket& packet,
                                 const SurfaceLanes& surfaces, const LaneMask& lit,
-                                LaneColors& light, const Also& also) {
+                                LaneColors& light, Mirrors& mirrors) {
     const ShadowStart start = shadowStart(packet, lit);
     for (int k = 0; k < frame.lamp_count; ++k) {
         const FrameLamp& lamp = frame.lamps[k];
         const LampLanes seen = lampAt(lamp, start.place);
         const Lanes facing = greatest(dot(surfaces.normal, seen.toward), 0.0F);
         const LaneMask wanted = lit & (facing * seen.amount > 0.0F);
+        const LaneColors full = uniformColor(lamp.color) * select(wanted, seen.amount, 0.0F);
         if (!any(wanted))
             continue;
-        const Lanes arriving =
-            lamplightArriving(frame, lamp, packet, surfaces, start, seen, wanted);
+        const LaneMask shown = wanted & mirrors.show(full, seen.toward, facing);
         const LaneColors sent =
-            uniformColor(lamp.color) * select(wanted, seen.amount * arriving, 0.0F);
+            full * lamplightArriving(frame, lamp, packet, surfaces, start, seen, shown);
         light = light + sent * facing;
-        also(sent, seen.toward, facing);
+        mirrors.add(sent);
     }
 }
 

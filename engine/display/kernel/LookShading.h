@@ -22,7 +22,8 @@ inline LaneColors shadeMatt(const FrameSetup& frame, const RayPacket& packet,
                             const LaneMask& lit) {
     LaneColors light = skyLight(frame, packet, surfaces, lit) * look.occlusion;
     addFixedLights(frame, surfaces.normal, light);
-    addLights(frame, packet, surfaces, lit, light, [](const auto&...) {});
+    NoMirrors none;
+    addLights(frame, packet, surfaces, lit, light, none);
     return surfaces.albedo * light + emissionOf(frame, look);
 }
 

@@ -41,19 +41,53 @@ struct SunnyLanes {
     LaneColors coat_spots;
 };
 
+/// A highlight of less is not worth a shadow ray.
+constexpr float least_spot = 0.001F;
+
+/// The highlights of one light after the other, see addLights.
+class Highlights {
+public:
+    /// @param scattering  the lanes that do not mirror all light
+    Highlights(const MirrorLayers& layers, const LaneMask& scattering, SunnyLanes& sunny)
+        : m_layers(layers), m_scattering(scattering), m_sunny(sunny) {}
+
+    LaneMask show(const LaneColors& light, const LaneVectors& toward, const Lanes& facing) {
+        const LaneMask before = facing > 0.0F;
+        m_spot = highlight(m_layers.base, toward);
+        LaneMask seen = m_scattering | (brightest(m_spot * light) > least_spot);
+        if (m_layers.has_coat) {
+            m_coat_spot = highlight(m_layers.coat, toward) * select(before, 1.0F, 0.0F);
+            seen = seen | (brightest(m_coat_spot * light) > least_spot);
+        }
+        return before & seen;
+    }
+
+    void add(const LaneColors& light) {
+        m_sunny.spots = m_sunny.spots + m_spot * light;
+        if (m_layers.has_coat)
+            m_sunny.coat_spots = m_sunny.coat_spots + m_coat_spot * light;
+    }
+
+private:
+    static Lanes brightest(const LaneColors& color) {
+        return greatest(greatest(color.r, color.g), color.b);
+    }
+
+    const MirrorLayers& m_layers;
+    const LaneMask m_scattering;
+    SunnyLanes& m_sunny;
+    LaneColors m_spot;
+    LaneColors m_coat_spot;
+};
+
 inline SunnyLanes sunlight(const FrameSetup& frame, const RayPacket& packet,
-                           const SurfaceLanes& surfaces, const MirrorLayers& layers,
-                           const LaneMask& lit) {
+                           const SurfaceLanes& surfaces, const LookNumbers<Lanes>& look,
+                           const MirrorLayers& layers, const LaneMask& lit) {
     const LaneColors black{0.0F, 0.0F, 0.0F};
     SunnyLanes sunny{black, black, black};
-    addLights(frame, packet, surfaces, lit, sunny.scattered,
-              [&](const LaneColors& light, const LaneVectors& toward, const Lanes& facing) {
-                  sunny.spots = sunny.spots + highlight(layers.base, toward) * light;
-                  if (layers.has_coat)
-                      sunny.coat_spots =
-                          sunny.coat_spots + highlight(layers.coat, toward) *
-                                                 (light * select(facing > 0.0F, 1.0F, 0.0F));
-              });
+    const LaneMask scattering = (look.metalness < 1.0F) & (look.transmission < 1.0F);
+    Highlights highlights(layers, scattering, sunny);
+    addLights(frame, packet, surfaces, lit, sunny.scattered, highlights);
     return sunny;
 }
 
@@ -93,7 +127,7 @@ inline LaneColors shadeMirrors(const FrameSetup& frame, const RayPacket& packet,
                                const LaneMask& lit, bool sends_rays, LaneColors* through) {
     const LookNumbers<Lanes>& look = looks.numbers;
     const MirrorLayers layers = mirrorLayers(frame, packet, surfaces, looks);
-    const SunnyLanes sunny = sunlight(frame, packet, surfaces, layers, lit);
+    const SunnyLanes sunny = sunlight(frame, packet, surfaces, look, layers, lit);
     const LaneColors sky = skyLight(frame, packet, surfaces, lit) * look.occlusion;
     LaneColors light = sky + sunny.scattered;
     addFixedLights(frame, surfaces.normal, light);

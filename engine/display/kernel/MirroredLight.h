@@ -16,10 +16,6 @@ namespace {
                                                       SurfaceLanes surfaces, const LaneMask& lit,
                                                       bool sends_rays, LaneColors* through);
 
-/// Up to the first roughness mirrors show the scene itself, from the second on what lies around.
-constexpr float roughness_of_scene = 0.2F;
-constexpr float roughness_of_surroundings = 0.4F;
-
 /// Sends a ray from each lane of `wanted` to where it mirrors.
 inline void aimMirrors(const FrameSetup& frame, const RayPacket& packet,
                        const SurfaceLanes& surfaces, const LaneVectors& direction,
@@ -32,7 +28,7 @@ inline void aimMirrors(const FrameSetup& frame, const RayPacket& packet,
     setOrigin(rays.rays.ray, along(place, surfaces.face, shadowOffset(frame, t, place)));
     setDirection(rays.rays.ray, direction);
     rays.active = wanted;
-    intersectFronts(frame, rays, RTC_INTERSECT_CONTEXT_FLAG_INCOHERENT);
+    intersectFronts(frame, rays);
 }
 
 /// What rays from mirrors see, where `around` lies behind the scene. They see the first pane alone.

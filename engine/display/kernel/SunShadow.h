@@ -106,15 +106,14 @@ inline Lanes lightArriving(const FrameSetup& frame, float shadow, const RayPacke
     return select(look & (load(ray.tfar) < 0.0F), 1.0F - shadow, 1.0F);
 }
 
-/// Looks from the lit lanes toward the sun.
-/// @param facing  cosine between shading normal and sun; lanes at 0 are not looked at
-/// @return the part of the sun's light that arrives
+/// Looks from the lanes of `wanted` toward the sun.
+/// @return the part of the sun's light that arrives; 1 in the other lanes
 inline Lanes sunlightArriving(const FrameSetup& frame, const FrameLight& sun,
                               const RayPacket& packet, const SurfaceLanes& surfaces,
-                              const LaneMask& lit, const Lanes& facing) {
-    if (!frame.scene || sun.shadow <= 0.0F)
+                              const LaneMask& wanted) {
+    if (!frame.scene || sun.shadow <= 0.0F || !any(wanted))
         return 1.0F;
-    ShadowStart start = shadowStart(packet, lit & (facing > 0.0F));
+    ShadowStart start = shadowStart(packet, wanted);
     start.look = start.look & reachesScene(frame, sun, start.place);
     if (!any(start.look))
         return 1.0F;

@@ -55,23 +55,33 @@ inline void addFixedLights(const FrameSetup& frame, const LaneVectors& normal, L
     }
 }
 
+/// The mirrors of surfaces that have none: they show every light, on what is matt.
+struct NoMirrors {
+    static LaneMask show(const LaneColors&, const LaneVectors&, const Lanes& facing) {
+        return facing > 0.0F;
+    }
+    static void add(const LaneColors&) {}
+};
+
 /// Adds the light that shadows keep off: of suns and lamps.
-/// @param also  is called for each with its light that arrives, unit vectors to it and the cosine
-///   to these
-template <class Also>
+/// @param mirrors  for each of them mirrors.show(its light, unit vectors to it, the cosine to
+///   these) says in which lanes it would be seen: the others send no shadow ray, and shine as if
+///   nothing stood before the light. Then mirrors.add takes the light that arrives.
+template <class Mirrors>
 inline void addLights(const FrameSetup& frame, const RayPacket& packet,
                       const SurfaceLanes& surfaces, const LaneMask& lit, LaneColors& light,
-                      const Also& also) {
+                      Mirrors& mirrors) {
     for (int k = 0; k < frame.sun_count; ++k) {
         const FrameLight& sun = frame.suns[k];
         const Lanes facing = greatest(dot(surfaces.normal, sun.toward), 0.0F);
-        const Lanes arriving = sunlightArriving(frame, sun, packet, surfaces, lit, facing);
+        const LaneVectors toward{sun.toward[0], sun.toward[1], sun.toward[2]};
+        const LaneMask shown = lit & mirrors.show(uniformColor(sun.color), toward, facing);
+        const Lanes arriving = sunlightArriving(frame, sun, packet, surfaces, shown);
         addLight(sun.color, facing * arriving, light);
-        also(uniformColor(sun.color) * arriving,
-             LaneVectors{sun.toward[0], sun.toward[1], sun.toward[2]}, facing);
+        mirrors.add(uniformColor(sun.color) * arriving);
     }
     if (frame.lamp_count > 0)
-        addLamps(frame, packet, surfaces, lit, light, also);
+        addLamps(frame, packet, surfaces, lit, light, mirrors);
 }
 
 /// The light that diffuse surfaces send to the observer, in the lanes of `lit`.
@@ -79,7 +89,8 @@ inline LaneColors shadeSurfaces(const FrameSetup& frame, const RayPacket& packet
                                 const SurfaceLanes& surfaces, const LaneMask& lit) {
     LaneColors light = skyLight(frame, packet, surfaces, lit);
     addFixedLights(frame, surfaces.normal, light);
-    addLights(frame, packet, surfaces, lit, light, [](const auto&...) {});
+    NoMirrors none;
+    addLights(frame, packet, surfaces, lit, light, none);
     return {surfaces.albedo.r * light.r, surfaces.albedo.g * light.g, surfaces.albedo.b * light.b};
 }
 

@@ -102,6 +102,22 @@ TEST(MirroredScene, MirrorsSeeTheGroundWithTheShadowsOnIt) {
     EXPECT_LT(mirrored(true), mirrored(false) - 40.0);
 }
 
+TEST(MirroredScene, HighlightsOnMetalVanishInTheShade) {
+    const auto highlight = [](bool has_board) {
+        SceneContent scene;
+        addLook(scene, floorMesh(-4, -4, 4, 4, 0), [](Material& material) {
+            makeMirror(material);
+            material.base_color = {40, 40, 40, 255};
+            material.roughness = 0.5F;
+        });
+        if (has_board) // it stands beside what is seen
+            addMesh(scene, floorMesh(-2, 3, 2, 8, 5), {90, 90, 90, 255});
+        scene.lights.push_back(sunLight({0.0, -1.0, -1.0}));
+        return brightness(sloping(scene), size / 2, size / 2);
+    };
+    EXPECT_LT(highlight(true), highlight(false) - 30.0);
+}
+
 TEST(MirroredScene, WhatIsSeenThroughAPaneInAMirrorIsMixedWithThePane) {
     const auto mirrored = [](int opacity) {
         SceneContent content;

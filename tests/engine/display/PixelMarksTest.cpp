@@ -1,8 +1,10 @@
 #include "engine/display/PixelMarks.h"
+#include "engine/display/SurfaceLook.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <array>
 #include <vector>
 
 namespace quarn {
@@ -24,6 +26,13 @@ protected:
     }
     std::uint32_t& pixel(int x, int y) { return m_pixels[at(x, y)]; }
     std::uint32_t& object(int x, int y) { return m_objects[at(x, y)]; }
+    /// Object 1 becomes a mirror, object 2 not.
+    void makeMirror() {
+        m_mirror.shows_scene = true;
+        m_surfaces[0].look = &m_mirror;
+        m_frame.surfaces = m_surfaces.data();
+        m_frame.mirrors_scene = true;
+    }
 
     /// What is marked, row by row.
     std::vector<std::pair<int, int>> marked() {
@@ -56,6 +65,8 @@ private:
 
     std::vector<std::uint32_t> m_pixels;
     std::vector<std::uint32_t> m_objects;
+    SurfaceLook m_mirror;
+    std::array<RaySurface, 2> m_surfaces{};
     FrameSetup m_frame;
 };
 
@@ -73,6 +84,32 @@ TEST_P(PixelMarksTest, AStepOfColourCountsFromFifteenOn) {
     pixel(20, 10) = grey + 15;
     pixel(40, 10) = grey - (15U << 16);
     EXPECT_EQ(marked().size(), 10U);
+}
+
+TEST_P(PixelMarksTest, WithinAMirrorAStepCountsFromTwentyFiveOn) {
+    paint(99, 50);
+    makeMirror();
+    pixel(20, 10) = grey + 24;
+    pixel(97, 10) = grey - (24U << 16);
+    EXPECT_EQ(marked(), Places{});
+    pixel(20, 10) = grey + 25;
+    pixel(97, 10) = grey - (25U << 16);
+    EXPECT_EQ(marked().size(), 10U);
+}
+
+TEST_P(PixelMarksTest, BesideAMirrorStepsCountAsEverywhere) {
+    paint(100, 50);
+    makeMirror();
+    object(20, 10) = 2;
+    object(40, 10) = 0;
+    EXPECT_EQ(marked().size(), 10U);
+    paint(100, 50);
+    for (int y = 0; y < 50; ++y)
+        for (int x = 0; x < 100; ++x)
+            object(x, y) = x < 60 ? 2 : 0;
+    pixel(20, 10) = grey + 15;
+    pixel(80, 10) = grey + 15;
+    EXPECT_EQ(marked().size(), 10U + 100U);
 }
 
 TEST_P(PixelMarksTest, AnotherObjectOfTheSameColourIsAnEdge) {

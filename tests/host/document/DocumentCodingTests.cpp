@@ -1,10 +1,10 @@
 #include "host/document/LightStore.h"
 #include "host/document/file/ChunkIds.h"
-#include "host/document/file/DocumentCoding.h"
 #include "host/document/file/DocumentHeader.h"
 #include "kelmar/KM_LineCurve.h"
 #include "kelmar/KM_NurbsCurve.h"
 #include "kelmar/KM_PolylineCurve.h"
+#include "tests/host/document/CodedContent.h"
 #include "tests/host/document/SampleContent.h"
 
 #include <gmock/gmock.h>
@@ -18,23 +18,13 @@ namespace quarn {
 
 namespace {
 
+using test::Bytes;
+using test::decoded;
+using test::encoded;
 using test::sampleContent;
 using test::sampleId;
 using testing::HasSubstr;
-using Bytes = std::vector<std::uint8_t>;
 using Payload = std::function<void(KM_BinaryArchive&)>;
-
-Bytes encoded(const DocumentContent& content) {
-    auto bytes = encodeDocument(content);
-    EXPECT_TRUE(bytes) << (bytes ? "" : bytes.message());
-    return bytes ? bytes.value() : Bytes();
-}
-
-DocumentContent decoded(const Bytes& bytes) {
-    auto content = decodeDocument(bytes);
-    EXPECT_TRUE(content) << (content ? "" : content.message());
-    return content ? std::move(content.value()) : DocumentContent();
-}
 
 DocumentContent roundTrip(const DocumentContent& content) {
     return decoded(encoded(content));

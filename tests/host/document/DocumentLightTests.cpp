@@ -145,6 +145,42 @@ TEST_F(DocumentLightTest, WhoMovesTheSunHasTheSky) {
     EXPECT_EQ(settings().surroundings, Surroundings::studio);
 }
 
+KM_Light sunOfModel() {
+    KM_Light sun;
+    sun.SetStyle(KM_LightStyle::world_directional);
+    sun.SetDirection({1, 0, -1});
+    return sun;
+}
+
+TEST_F(DocumentLightTest, TheSunOfAModelShinesAloneWhereNobodyMovedThatOfTheDocument) {
+    addBox(document, {0, 0, 0}, {1, 1, 1});
+    DocumentLight& light = document.drawing().light();
+    const int index = document.lights().add(sunOfModel());
+    ASSERT_EQ(light.shiningLights().size(), 1U);
+    EXPECT_EQ(light.shiningLights()[0].Direction(), KM_3dVector(1, 0, -1));
+    EXPECT_EQ(settings().surroundings, Surroundings::sky);
+    EXPECT_FALSE(settings().first_light_is_sun);
+    document.lights().remove(index);
+    ASSERT_EQ(light.shiningLights().size(), 1U);
+    EXPECT_EQ(light.shiningLights()[0].Direction(), -document.sun().directionToSun());
+    EXPECT_TRUE(settings().first_light_is_sun);
+}
+
+TEST_F(DocumentLightTest, ASunThatSomebodyMovedShinesBesideThatOfAModel) {
+    document.lights().add(sunOfModel());
+    document.sun().beginChange();
+    document.sun().setDirectionToSun({0, 0, 1});
+    EXPECT_EQ(document.drawing().light().shiningLights().size(), 2U);
+    EXPECT_TRUE(settings().first_light_is_sun);
+}
+
+TEST_F(DocumentLightTest, ALampOfAModelLeavesTheSunOfTheDocumentOn) {
+    KM_Light lamp = sunOfModel();
+    lamp.SetStyle(KM_LightStyle::world_point);
+    document.lights().add(lamp);
+    EXPECT_EQ(document.drawing().light().shiningLights().size(), 2U);
+}
+
 TEST_F(DocumentLightTest, ASunStudyStandsUnderTheSkyUnlessAnotherLightIsChosen) {
     addBox(document, {0, 0, 0}, {1, 1, 1});
     SceneChanges study;

@@ -69,6 +69,8 @@ TEST_F(LightTableTest, ADirectionKeepsItsLength) {
 }
 
 TEST_F(LightTableTest, OnlyLiveLightsThatAreOnShineBesideTheSun) {
+    document.sun().beginChange();
+    document.sun().setDirectionToSun({0, 0, 1}); // else it would make way for another one
     document.lights().add(sunFrom({0, 0, -1}));
     KM_Light off = sunFrom({1, 0, -1});
     off.Enable(false);

@@ -1,7 +1,7 @@
 #include "engine/scene/MaterialCheck.h"
 #include "host/document/file/ChunkIds.h"
-#include "host/document/file/DocumentCoding.h"
 #include "host/document/file/DocumentHeader.h"
+#include "tests/host/document/CodedContent.h"
 #include "tests/host/document/DocumentFixtures.h"
 #include "tests/host/document/QualityChanges.h"
 #include "tests/host/document/SampleContent.h"
@@ -15,20 +15,6 @@
 
 namespace quarn::test {
 namespace {
-
-using Bytes = std::vector<std::uint8_t>;
-
-Bytes encoded(const DocumentContent& content) {
-    auto bytes = encodeDocument(content);
-    EXPECT_TRUE(bytes) << (bytes ? "" : bytes.message());
-    return bytes ? bytes.value() : Bytes();
-}
-
-DocumentContent decoded(const Bytes& bytes) {
-    auto content = decodeDocument(bytes);
-    EXPECT_TRUE(content) << (content ? "" : content.message());
-    return content ? std::move(content.value()) : DocumentContent();
-}
 
 void addObject(DocumentContent& content, const Material& material) {
     ObjectContent object;

@@ -1,5 +1,6 @@
 #include "host/recovery/RecoveryJournal.h"
 
+#include "engine/images/ImageFile.h"
 #include "host/recovery/RecoveryGlance.h"
 #include "tests/host/document/DocumentFixtures.h"
 #include "tests/host/document/QualityChanges.h"
@@ -324,6 +325,20 @@ TEST_F(RecoveryJournalTest, TheLastPictureIsSeenAlsoWhereTheFileWasWrittenAnew) 
     state.picture.resize(16, 4);
     write(journal, state);
     EXPECT_NE(glanceAt(onlyFile(kept_in)).picture, picture);
+}
+
+TEST_F(RecoveryJournalTest, APictureThatIsSeeThroughIsKeptOnWhite) {
+    RecoveryJournal journal(state_folder, self);
+    RecoveryState state = stateOf(sampleContent());
+    state.picture.resize(2, 1);
+    state.picture.rgba = {10, 20, 30, 255, 10, 20, 30, 0};
+    write(journal, state);
+    Image on_white;
+    on_white.resize(2, 1);
+    on_white.rgba = {10, 20, 30, 255, 255, 255, 255, 255};
+    const auto png = encodeImage(on_white, ImageFormat::png);
+    ASSERT_TRUE(png);
+    EXPECT_EQ(glanceAt(onlyFile(kept_in)).picture, png.value());
 }
 
 // ---- Marks
