@@ -21,7 +21,8 @@ constexpr int pauses_of_its_own_time = 50;
 
 PictureSoFar::PictureSoFar(const RenderLayers& layers, const FrameSetup& frame, RenderLines& lines,
                            const Renderer::Shown& shown)
-    : m_layers(layers), m_frame(frame), m_lines(lines), m_shown(shown), m_due(Clock::now() + least_pause) {}
+    : m_layers(layers), m_frame(frame), m_lines(lines), m_shown(shown),
+      m_due(Clock::now() + least_pause) {}
 
 void PictureSoFar::showWhenDue() {
     const Clock::time_point start = Clock::now();
@@ -36,7 +37,8 @@ void PictureSoFar::showWhenDue() {
 
 void PictureSoFar::encode() {
     m_image.resize(m_layers.width(), m_layers.height());
-    tbb::parallel_for(0, m_layers.height(), [&](int y) { encodeRow(m_layers, m_frame, y, m_image); });
+    tbb::parallel_for(0, m_layers.height(),
+                      [&](int y) { encodeRow(m_layers, m_frame, y, m_image); });
 }
 
 } // namespace quarn

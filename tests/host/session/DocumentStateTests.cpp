@@ -61,7 +61,7 @@ TEST_F(DocumentStateTest, RenderSettingsBelongToTheDocument) {
     runAll({L"SaveAs " + path("a.quarn"), L"New"});
     EXPECT_EQ(document().renderWindow().settings, RenderSettings());
     runAll({L"Open " + path("a.quarn")});
-    EXPECT_EQ(document().renderWindow().settings, (RenderSettings{320, 200, 9, 8}));
+    EXPECT_EQ(document().renderWindow().settings, (RenderSettings{320, 200, 9, 4}));
     EXPECT_FALSE(modified());
     runAll({L"RenderSettings Samples 10 _Enter"});
     EXPECT_TRUE(modified());
