@@ -83,7 +83,8 @@ Zone Zone::fixed(minutes east) {
 
 Zone Zone::solar(double longitude_deg) {
     constexpr double SECONDS_PER_DEGREE = 240.0;
-    const auto offset = static_cast<int>(std::lround(longitude_deg * SECONDS_PER_DEGREE));
+    const auto offset =
+        static_cast<int>(std::lround(std::remainder(longitude_deg, 360.0) * SECONDS_PER_DEGREE));
     return Zone(std::string(SOLAR), std::make_shared<SteadyRules>(seconds(offset), "LMT"));
 }
 

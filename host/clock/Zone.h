@@ -52,7 +52,7 @@ public:
     static Zone fixed(std::chrono::minutes east);
 
     /// The mean solar time of a longitude: four minutes a degree, to the second.
-    /// @param longitude_deg  east positive, -360 to 360
+    /// @param longitude_deg  east positive; 190 is 170 degrees west
     static Zone solar(double longitude_deg);
 
     /// As `written` takes it: "Europe/Berlin", "UTC+5:30", "solar".

@@ -32,9 +32,10 @@ const Places BELOW_COMMANDS = BELOW_DIALOGS + "host/dialogs/" + "host/recovery/"
 const Places BELOW_SHARE = BELOW_COMMANDS + "host/commands/";
 const Places BELOW_SESSION = BELOW_SHARE + "host/share/";
 
-// What a program sees of the host: its door, what it implements itself, the cities of the world and
-// their clocks.
-const Places PROGRAM = {"sdk/", "host/session/", "host/front_end/", "host/cities/", "host/clock/"};
+// What a program sees of the host: its door, what it implements itself, the cities of the world,
+// their sun and their clocks.
+const Places PROGRAM = {"sdk/",         "host/session/", "host/front_end/",
+                        "host/cities/", "host/sun/",     "host/clock/"};
 
 const Places BELOW_SESSIONS = PROGRAM + "quarn/words/" + "quarn/terminal/";
 const Places BELOW_RUNS = PROGRAM + "quarn/words/" + "quarn/session/" + "quarn/scripts/";

@@ -13,8 +13,8 @@ namespace {
 using namespace quarn;
 using namespace std::chrono;
 
-// The C library takes such rules as the name of a zone. The last two days of both years count
-// leap days in their own way.
+// The C library takes such rules as the name of a zone. The rules by the day of the year count leap
+// days in their own way, and 2040 has one.
 TEST(FooterRule, ChangesTheClocksWhenTheCLibraryDoes) {
     const char* const RULES[] = {"CET-1CEST,M3.5.0,M10.5.0/3",
                                  "IST-1GMT0,M10.5.0,M3.5.0/1",
@@ -79,12 +79,12 @@ TEST_F(ZoneFiles, EndWithTheRuleOfLaterTimes) {
 }
 
 TEST_F(ZoneFiles, ThatAreCutOffOrOverwrittenAreRefusedOrRead) {
-    for (std::size_t size = 0; size + 1 < m_berlin.size(); size += 3) {
+    for (std::size_t size = 0; size + 1 < m_berlin.size(); size += 29) {
         const auto end = readCopy(m_berlin.substr(0, size));
         ASSERT_FALSE(end.ok()) << size;
         EXPECT_NE(end.message().find("tzdata"), std::string::npos);
     }
-    for (std::size_t at = 0; at < m_berlin.size(); at += 5) {
+    for (std::size_t at = 0; at < m_berlin.size(); at += 31) {
         std::string damaged = m_berlin;
         damaged[at] = '\xff';
         (void)readCopy(damaged); // whatever it is: the sanitizers see a step too far
