@@ -5,6 +5,7 @@
 #include "host/sun/SunEvents.h"
 #include "quarn/words/DateWords.h"
 
+#include <algorithm>
 #include <charconv>
 #include <utility>
 
@@ -187,11 +188,14 @@ Daylight daylightOf(const StudySite& site, year_month_day day, minutes step) {
         light.last = moment;
         is_found = true;
     }
-    if (!is_found)
+    // Steps may be longer than the day is light: the sun is highest at one moment at least.
+    const auto highest = std::ranges::find_if(events.events, [&](const SunEvent& event) {
+        return event.kind == SunEvent::Kind::transit && isUp(events, event.time);
+    });
+    if (!is_found && highest != events.events.end())
+        light.first = light.last = wholeMinute(highest->time);
+    else if (!is_found)
         light.mistake = "the sun does not rise there on " + textOf(day) +
-                        (events.course == SunEvents::Course::polar_night
-                             ? ""
-                             : " for as long as a step of --every") +
                         "; give --from and --to, such as 09:00 and 15:00.";
     else if (events.course == SunEvents::Course::polar_day)
         light.note = "The sun does not set there on " + textOf(day);

@@ -44,7 +44,7 @@ FoundMoment findTime(const StudySite& site, std::chrono::year_month_day day,
                      const WantedTime& wanted, const std::string& option, bool is_end);
 
 /// The first and the last moment of a day at which the sun's centre is above the horizon, of those
-/// that are a whole number of steps after midnight.
+/// that are a whole number of steps after midnight; where none is, when the sun is highest.
 struct Daylight {
     std::chrono::sys_seconds first;
     std::chrono::sys_seconds last;

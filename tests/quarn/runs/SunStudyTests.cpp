@@ -50,7 +50,8 @@ public:
     /// "2026-06-21T14:30:00 CEST" of each frame in the list of frames.
     Words timesInManifest(const std::string& list = "out/house.frames.json") const {
         Words times;
-        for (const auto& image : nlohmann::json::parse(readFile(m_studio / list))["images"])
+        const auto manifest = nlohmann::json::parse(readFile(m_studio / list));
+        for (const auto& image : manifest["images"])
             times.push_back(image["sun"]["time"].get<std::string>() + " " +
                             image["sun"]["zone"].get<std::string>());
         return times;

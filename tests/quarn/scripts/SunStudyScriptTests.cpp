@@ -316,6 +316,12 @@ TEST(SunStudyDefaults, PolarNightIsRefusedAndPolarDayTold) {
               0);
 }
 
+// The sun of Athens is highest at 13:27 of summer time on that day.
+TEST(SunStudyDefaults, StepLongerThanTheDayIsLightShowsTheHighestSun) {
+    EXPECT_THAT(scriptOf(dayInAthens({"--every", "1440"})),
+                Contains("# First frame: 2026-06-21 13:27 EEST = 10:27 UTC"));
+}
+
 TEST(SunStudyDefaults, TimesOfTheSunAreOneOffset) {
     for (const char* time : {"sunrise+", "sunrise+1", "sunrise1h", "sunset-30", "sunset-30m1h",
                              "sunset--5m", "sunrise+12h", "sunrise+-1h", "Sunrise", "sunset+1h5"})
@@ -384,7 +390,8 @@ TEST(SunStudySite, UnknownPlacesGetSuggestions) {
 
 TEST(SunStudySite, NumbersOutOfRangeAreRefused) {
     const auto at = [](const char* latitude, const char* longitude) {
-        return day({"--date", "2026-06-21", "--latitude", latitude, "--longitude", longitude});
+        return day({"--date", "2026-06-21", "--latitude", latitude, "--longitude", longitude,
+                    "--from", "06:00", "--to", "07:00"});
     };
     for (const char* latitude : {"90.5", "-90.001", "north", "nan", ""})
         expectRefusal(at(latitude, "0"),
