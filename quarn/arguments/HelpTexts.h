@@ -136,9 +136,9 @@ others. An hour that is skipped when clocks are put forward is refused; of one t
 takes the first and --to the second. The zone and the universal time of the first picture are told
 before the recording begins. Seconds are always 0.
 
-The recording's own page tells times by the whole hours of the longitude, without daylight saving: in
-quarn season counted eastward, so that 105.18 W is UTC+16 there, the hour of UTC-8 with the next day's
-date. The list of frames, films and the page of --viewer tell those of the clocks on the wall.)";
+The recording's own page tells times by the whole hours of the longitude, without daylight saving.
+Those of a season count eastward, so that 105.18 W is UTC+16 there, the hour of UTC-8 with the next
+day's date. The list of frames, films and the page of --viewer tell those of the clocks on the wall.)";
 
 inline constexpr const char* RECORD_FOOTER = R"(
 The same command goes on where it was stopped or killed: frames that are whole stay, all others are
