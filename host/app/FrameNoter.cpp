@@ -16,7 +16,7 @@ void FrameNoter::frameRecorded(const RecordedFrame& frame) {
         noted.xxh64 = sum.value().xxh64;
     }
     noted.camera = frameCameraOf(frame.camera);
-    noted.sun = sunOfFrame(m_record, frame.number);
+    noted.sun = sunOfFrame(m_record, frame.number, m_zone);
     m_recording.note(std::move(noted));
 }
 

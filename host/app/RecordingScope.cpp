@@ -6,6 +6,7 @@
 #include "host/app/Application.h"
 #include "host/app/FrameNoter.h"
 #include "host/app/PictureOpacity.h"
+#include "host/app/StudyMoments.h"
 #include "host/border/Border.h"
 #include "host/document/DisplayModeList.h"
 #include "host/document/Document.h"
@@ -130,7 +131,8 @@ void beginRecording(Application& application, Document& document,
                              [&application](const RecordingStart& start) {
                                  application.frontEnd().recordingBegun(start);
                              }});
-    followers.addFirst(std::make_unique<FrameNoter>(record, *recording));
+    followers.addFirst(
+        std::make_unique<FrameNoter>(record, studyZone(document, record), *recording));
     application.setRecording(std::move(recording));
 }
 

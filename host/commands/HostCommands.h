@@ -44,6 +44,7 @@ CQuarnCommand::result runFitView(const CQuarnCommandContext& context);
 CQuarnCommand::result runHide(const CQuarnCommandContext& context);
 CQuarnCommand::result runImport(const CQuarnCommandContext& context);
 CQuarnCommand::result runImportCurve(const CQuarnCommandContext& context);
+CQuarnCommand::result runJoinSunStudy(const CQuarnCommandContext& context);
 CQuarnCommand::result runJpegQuality(const CQuarnCommandContext& context);
 CQuarnCommand::result runLine(const CQuarnCommandContext& context);
 CQuarnCommand::result runList(const CQuarnCommandContext& context);
@@ -70,6 +71,7 @@ CQuarnCommand::result runSpline(const CQuarnCommandContext& context);
 CQuarnCommand::result runSplineThrough(const CQuarnCommandContext& context);
 CQuarnCommand::result runStandardView(const CQuarnCommandContext& context);
 CQuarnCommand::result runSun(const CQuarnCommandContext& context);
+CQuarnCommand::result runSunStudyPlace(const CQuarnCommandContext& context);
 CQuarnCommand::result runViewportSize(const CQuarnCommandContext& context);
 
 } // namespace quarn

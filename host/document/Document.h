@@ -6,13 +6,16 @@
 #include "host/document/LightStore.h"
 #include "host/document/ObjectTable.h"
 #include "host/document/RenderWindow.h"
+#include "host/document/StudiedPlace.h"
 #include "host/document/ViewState.h"
+#include "kelmar/KM_AnimationProperties.h"
 #include "sdk/qncore/QnDoc.h"
 
 #include <chrono>
 #include <filesystem>
 #include <map>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -169,6 +172,12 @@ public:
     /// Draws the document.
     DocumentDrawing& drawing() { return *m_drawing; }
     const DocumentDrawing& drawing() const { return *m_drawing; }
+    /// The place that a person gave the sun study; it counts while the study is there.
+    std::optional<StudiedPlace>& studiedPlace() { return m_studied_place; }
+    const std::optional<StudiedPlace>& studiedPlace() const { return m_studied_place; }
+    /// The part of a sun study that others are put behind. Not saved.
+    std::optional<KM_3dmAnimationProperties>& firstPartOfStudy() { return m_first_part; }
+
     RenderWindow& renderWindow() { return m_render_window; }
     const RenderWindow& renderWindow() const { return m_render_window; }
 
@@ -214,6 +223,8 @@ private:
     bool m_is_open = true;
     std::unique_ptr<DocumentDrawing> m_drawing;
     RenderWindow m_render_window;
+    std::optional<StudiedPlace> m_studied_place;
+    std::optional<KM_3dmAnimationProperties> m_first_part;
     CQuarnDocProperties m_properties;
     CQuarnDoc m_face;
 

@@ -96,6 +96,7 @@ DocumentContent Document::contentWithoutObjects() const {
         content.rendering = pictures;
     if (light != LightChoice())
         content.light = light;
+    content.studied_place = m_studied_place;
     content.settings.light_slots = m_lights.count();
     for (const auto& [index, slot] : m_lights.live())
         content.lights.push_back({index, slot.Light()});
@@ -112,6 +113,7 @@ std::vector<std::string> Document::openContent(const DocumentContent& content) {
         setEdgesOf(edges.display_mode, edges.choice);
     m_render_window.settings = content.rendering.value_or(RenderSettings());
     m_render_window.settings.light = content.light.value_or(LightChoice());
+    m_studied_place = content.studied_place;
     for (const LightContent& light : content.lights) {
         m_lights.addDeletedUpTo(light.index);
         m_lights.add(light.light);

@@ -74,6 +74,7 @@ SavedState savedStateOf(const Document& document) {
     state.direction_to_sun = document.sun().directionToSun();
     state.edges = document.edges();
     state.rendering = document.renderWindow().settings;
+    state.studied_place = document.studiedPlace();
     for (const auto& view : document.views())
         state.views.push_back(stateOf(*view));
     state.named_views = document.namedViews().size();

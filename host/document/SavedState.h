@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/document/RenderSettings.h"
+#include "host/document/StudiedPlace.h"
 #include "kelmar/KM_Light.h"
 #include "kelmar/KM_Uuid.h"
 
@@ -48,6 +49,7 @@ struct SavedState {
     KM_3dVector direction_to_sun;
     std::map<KM_UUID, MeshEdgeChoice> edges;
     RenderSettings rendering;
+    std::optional<StudiedPlace> studied_place;
     std::vector<View> views;
     std::size_t named_views = 0;
     std::optional<Record> record; ///< none while no plug-in keeps one

@@ -10,9 +10,9 @@ inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
   quarn path MODEL --camera NAME --target NAME
                                                record a camera that follows one curve and looks
                                                along another, or at a point
-  quarn day MODEL --place NAME --date DATE
+  quarn day MODEL --place NAME
                                                record the sun and the shadows through one day
-  quarn season MODEL --place NAME --from DATE --to DATE
+  quarn season MODEL --place NAME
                                                record those of one time of day through the seasons
   quarn record DOC --out DIR                   record a saved animation, or a part of it with
                                                --frames RANGES; goes on where it was stopped
@@ -103,26 +103,26 @@ Examples:
 
 inline constexpr const char* DAY_FOOTER = R"(
 A picture is taken at --from, and every so many minutes later until --to; both may be in the night.
-Every picture of the page shows its date and time.
+sunrise and sunset are those of published tables: the sun's upper edge at the horizon, with the air
+that lifts it.
 
 Examples:
-  quarn day house.glb --place Athens --date 2026-06-21 --from 04:00 --to 19:00 --out out/sun
+  quarn day house.glb --place Athens --out out/today
+  quarn day house.glb --place Berlin --date solstice-june --from sunrise+1h --to sunset-30m --out sun
   quarn day house.obj --latitude 51.5 --longitude -0.12 --north 12 --date 2026-12-21 --out out/dec
   quarn day site.quarn --place "Mexico City" --date 2026-03-20 --view Top --out out/plan
 )";
 
 inline constexpr const char* SEASON_FOOTER = R"(
-A picture is taken on the date of --from, and every so many days later until that of --to, always
-at the same time by the clock. Every picture of the page shows its date and time.
+A picture is taken on the date of --from, and every so many days later until that of --to. Without
+dates it is this year, with one of them the year that begins or ends with it. All pictures keep the
+same time of the place's standard clock: where clocks are put forward in summer they show an hour
+more, and so do the captions.
 
 Examples:
+  quarn season house.glb --place Athens --out out/year
   quarn season house.glb --place Athens --from 2026-01-01 --to 2026-12-31 --at 11:00 --out out/year
   quarn season yard.obj --place Sydney --from 2026-06-21 --to 2026-12-21 --every 1 --out out/spring
-
-In the west: a seasonal study counts longitudes eastward from 0 to 360, and its clock with them.
-105.18 W is 254.82 E, on UTC+16, where 12:00 on 22 March is 20:00 UTC on the 21st: that is the hour
-of UTC-8 with the next day's date, while quarn day has UTC-7 there. For the sun that quarn day shows
-at 12:00 give --at 11:00 (on the multiples of 15 degrees, such as 105 W, both show the same hour).
 )";
 
 /// Follows the footers of the two sun studies.
@@ -130,14 +130,15 @@ inline constexpr const char* SITE_FOOTER = R"(
 North: the sun stands as if the model's Y axis pointed north. --north 30 says that north lies 30
 degrees clockwise from the Y axis, as seen from above.
 
-Clock: the zone is the longitude divided by 15, cut to whole hours toward zero. Borders and daylight
-saving do not count, so clocks on the wall differ, most of all in summer:
-  Athens, 23.73 E   here UTC+1, on the wall UTC+3: for 14:30 give 12:30
-  Berlin, 13.41 E   here UTC,   on the wall UTC+2: for 14:30 give 12:30
-  Madrid,  3.7 W    here UTC,   on the wall UTC+2: for 14:30 give 12:30
-  London,  0.13 W   here UTC,   on the wall UTC+1: for 14:30 give 13:30
-The zone and the universal time of the first picture are told before the recording begins. Seconds
-are always 0.)";
+Clock: times are those of clocks on the wall there, with daylight saving as it was, is or will be on
+that day. A place by latitude and longitude has the clocks of the nearest city known; --zone takes
+others. An hour that is skipped when clocks are put forward is refused; of one that comes twice --from
+takes the first and --to the second. The zone and the universal time of the first picture are told
+before the recording begins. Seconds are always 0.
+
+The recording's own page tells times by the whole hours of the longitude, without daylight saving.
+Those of a season count eastward, so that 105.18 W is UTC+16 there, the hour of UTC-8 with the next
+day's date. The list of frames, films and the page of --viewer tell those of the clocks on the wall.)";
 
 inline constexpr const char* RECORD_FOOTER = R"(
 The same command goes on where it was stopped or killed: frames that are whole stay, all others are
@@ -207,8 +208,8 @@ Examples:
   quarn day house.glb --place Athens --date 2026-06-21 --out out/sun --video sun.mp4 --caption)";
 
 inline constexpr const char* PLACES_FOOTER = R"(
-The last two columns tell the zone of the clock in quarn day and in quarn season; quarn season
---help explains why they differ in the west.
+The last column tells whose clocks the times of a study are of, with daylight saving as it was, is or
+will be in that place.
 
 Examples:
   quarn places

@@ -151,9 +151,4 @@ Reading<COleDateTime> dateUntil(int last_year) {
     };
 }
 
-Reading<ClockTime> timeOfDay() {
-    return reading<ClockTime>("a time from 00:00 to 23:59",
-                              [](const std::string& word) { return clockTime(word); });
-}
-
 } // namespace quarn::program

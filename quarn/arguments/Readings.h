@@ -43,6 +43,5 @@ Reading<FrameRanges> frameRanges();
 
 /// A day of the calendar from the first year that sun studies know.
 Reading<COleDateTime> dateUntil(int last_year);
-Reading<ClockTime> timeOfDay();
 
 } // namespace quarn::program

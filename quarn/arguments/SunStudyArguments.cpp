@@ -1,9 +1,9 @@
 // The recordings whose sun moves, and the places that they know.
 #include "host/cities/Cities.h"
-#include "host/session/StatedSite.h"
 #include "quarn/arguments/Readings.h"
 #include "quarn/arguments/RecordingArguments.h"
 #include "quarn/arguments/Subcommands.h"
+#include "quarn/arguments/TypedStudy.h"
 #include "quarn/reports/PlaceList.h"
 #include "quarn/scripts/SunStudyScript.h"
 
@@ -11,23 +11,7 @@ namespace quarn::program {
 
 namespace {
 
-constexpr int LAST_YEAR_OF_DAY = 2199;    // as the host's sun takes them
-constexpr int LAST_YEAR_OF_SEASON = 2100; // as the command of a seasonal study takes them
 constexpr int MINUTES_OF_DAY = 1440;
-
-/// A study as it is typed: what it is made of is put together when all words are read.
-struct TypedStudy {
-    SunStudyRequest request{};
-    const City* city = nullptr;
-    std::optional<double> latitude_deg;
-    std::optional<double> longitude_deg;
-    std::optional<double> north_deg;
-    COleDateTime first_date;
-    COleDateTime last_date;
-    ClockTime first_time{};
-    ClockTime last_time{};
-    ScriptUse use;
-};
 
 Reading<const City*> cityName() {
     return [](const std::string& option,
@@ -36,6 +20,51 @@ Reading<const City*> cityName() {
             return city;
         return Refusal{option + ": " + whyNoCity(word) +
                        " quarn places lists those that are known."};
+    };
+}
+
+Reading<std::chrono::year_month_day> dayUntil(int last_year) {
+    return [=](const std::string& option,
+               const std::string& word) -> std::variant<std::chrono::year_month_day, Refusal> {
+        const auto read = dateUntil(last_year)(option, word);
+        if (const Refusal* const refusal = std::get_if<Refusal>(&read))
+            return *refusal;
+        const COleDateTime& date = std::get<COleDateTime>(read);
+        return std::chrono::year(date.GetYear()) / date.GetMonth() / date.GetDay();
+    };
+}
+
+Reading<WantedDay> wantedDay() {
+    return
+        [](const std::string& option, const std::string& word) -> std::variant<WantedDay, Refusal> {
+            constexpr std::pair<std::string_view, SeasonDay> NAMED[] = {
+                {"equinox-march", SeasonDay::march_equinox},
+                {"solstice-june", SeasonDay::june_solstice},
+                {"equinox-september", SeasonDay::september_equinox},
+                {"solstice-december", SeasonDay::december_solstice}};
+            for (const auto& [name, day] : NAMED)
+                if (word == name)
+                    return WantedDay(day);
+            if (word == "today")
+                return WantedDay();
+            const auto read = dayUntil(LAST_YEAR_OF_DAY)(option, word);
+            if (const Refusal* const refusal = std::get_if<Refusal>(&read))
+                return *refusal;
+            return WantedDay(std::get<std::chrono::year_month_day>(read));
+        };
+}
+
+/// @param sun  whether sunrise and sunset count
+Reading<WantedTime> timeOfStudy(bool sun) {
+    return [=](const std::string& option,
+               const std::string& word) -> std::variant<WantedTime, Refusal> {
+        const auto time = wantedTime(word);
+        if (time && (sun || time->since == WantedTime::Since::midnight))
+            return *time;
+        return mustBe(option,
+                      std::string("a time from 00:00 to 23:59") +
+                          (sun ? ", or one such as sunrise+1h and sunset-30m" : ""),
+                      word);
     };
 }
 
@@ -49,6 +78,9 @@ void addSiteOptions(const OptionAdder& add, TypedStudy& typed) {
         "and degrees east, -180 to 180; west is negative");
     add("--north", typed.north_deg, "DEG", numberFrom(-360, 360, "degrees"),
         "Where north is in the model, in degrees clockwise from its Y axis (default: 0)");
+    add("--zone", typed.zone, "ZONE", scriptWord("the name of --zone"),
+        "Clocks that times are of: a time zone such as Europe/Berlin, hours from UTC such as "
+        "+05:30, or solar for the mean time of the sun (default: those of the place)");
 }
 
 void addViewOptions(const OptionAdder& add, StudyView& view) {
@@ -66,65 +98,17 @@ void addViewOptions(const OptionAdder& add, StudyView& view) {
     addLens(add, view.lens_mm, "(default: 50; a document's own)");
 }
 
-/// Takes the place that the model's file states.
-std::optional<std::string> settleByModel(const std::filesystem::path& model, StudySite& site) {
-    const std::optional<StatedSite> stated = statedSite(model);
-    if (!stated)
-        return "say where the model stands with --place, or with --latitude and --longitude; "
-               "quarn places lists the places.";
-    site = {"As " + model.filename().native() + " states", stated->latitude_deg,
-            stated->longitude_deg, stated->north_angle_deg};
-    return std::nullopt;
-}
-
-std::optional<std::string> settleSite(const TypedStudy& typed, StudySite& site) {
-    const bool has_coordinate = typed.latitude_deg || typed.longitude_deg;
-    if (typed.city && has_coordinate)
-        return "give either --place, or --latitude and --longitude.";
-    if (!typed.city && has_coordinate && !(typed.latitude_deg && typed.longitude_deg))
-        return "--latitude and --longitude go together.";
-    std::optional<std::string> mistake;
-    if (typed.city)
-        site = {nameWithCountry(*typed.city), typed.city->latitude_deg, typed.city->longitude_deg};
-    else if (has_coordinate)
-        site = {"", *typed.latitude_deg, *typed.longitude_deg};
-    else
-        mistake = settleByModel(typed.request.recording.model, site);
-    site.north_deg = typed.north_deg.value_or(site.north_deg);
-    return mistake;
-}
-
-/// An end of the span, as its option has it.
-std::string endText(const SunStudyRequest& request, const COleDateTime& end) {
-    return request.kind == SunStudyRequest::Kind::one_day ? timeOfDayText(end) : dateText(end);
-}
-
-/// A span is counted in frames; both of its ends have one where the steps meet them.
-std::optional<std::string> settleSpan(SunStudyRequest& request, std::int64_t minutes_of_step) {
-    const std::int64_t minutes = minutesBetween(request.start, request.end);
-    if (minutes < 0)
-        return "--to " + endText(request, request.end) + " is before --from " +
-               endText(request, request.start) + ".";
-    request.recording.frames = static_cast<int>(minutes / minutes_of_step) + 1;
-    return std::nullopt;
-}
-
 Outcome recordStudy(TypedStudy& typed) {
     SunStudyRequest& request = typed.request;
-    const bool is_one_day = request.kind == SunStudyRequest::Kind::one_day;
-    request.start = atTime(typed.first_date, typed.first_time);
-    request.end = is_one_day ? atTime(typed.first_date, typed.last_time)
-                             : atTime(typed.last_date, typed.first_time);
     std::optional<std::string> mistake = settle(request.recording);
     if (!mistake)
-        mistake = settleSite(typed, request.site);
+        mistake = settleSite(typed);
     if (!mistake && request.view.name && request.view.aims())
         mistake = "--view takes the place of --azimuth, --elevation and --target.";
     if (!mistake && request.view.lens_mm && request.view.isParallel())
         mistake = "--lens is for perspective views; --view " + *request.view.name + " has none.";
     if (!mistake)
-        mistake =
-            settleSpan(request, std::int64_t{request.step} * (is_one_day ? 1 : MINUTES_OF_DAY));
+        mistake = settleTimes(typed);
     if (mistake)
         return Outcome::misuse(*mistake);
     return recordOrShow(request.recording, sunStudyLines(request), typed.use);
@@ -145,12 +129,15 @@ Action addDay(CLI::App& command) {
     const OptionAdder add(command);
     addModelAndFolder(add, request.recording);
     addSiteOptions(add, *typed);
-    add("--date", typed->first_date, "DATE", dateUntil(LAST_YEAR_OF_DAY),
-        "The day, such as 2026-06-21")
-        ->required();
-    add("--from", typed->first_time, "HH:MM", timeOfDay(), "Time of the first picture", "06:00");
-    add("--to", typed->last_time, "HH:MM", timeOfDay(), "Time that no picture is later than",
-        "20:00");
+    add("--date", typed->day, "DATE", wantedDay(),
+        "The day, such as 2026-06-21, or this year's solstice-june, solstice-december, "
+        "equinox-march or equinox-september (default: today)");
+    add("--from", typed->first_time, "TIME", timeOfStudy(true),
+        "Time of the first picture, such as 06:30 or sunrise+1h (default: the first step of "
+        "--every with the sun's centre above the horizon)");
+    add("--to", typed->last_time, "TIME", timeOfStudy(true),
+        "Time that no picture is later than, such as 18:00 or sunset-30m (default: the last such "
+        "step)");
     add("--every", request.step, "MINUTES", wholeNumberFrom(1, MINUTES_OF_DAY, "minutes"),
         "Minutes between pictures, 1 to 1440", "15");
     return finish(command, typed);
@@ -163,15 +150,15 @@ Action addSeason(CLI::App& command) {
     const OptionAdder add(command);
     addModelAndFolder(add, request.recording);
     addSiteOptions(add, *typed);
-    add("--from", typed->first_date, "DATE", dateUntil(LAST_YEAR_OF_SEASON),
-        "Date of the first picture, such as 2026-03-21")
-        ->required();
-    add("--to", typed->last_date, "DATE", dateUntil(LAST_YEAR_OF_SEASON),
-        "Date that no picture is later than")
-        ->required();
+    add("--from", typed->first_date, "DATE", dayUntil(LAST_YEAR_OF_SEASON),
+        "Date of the first picture, such as 2026-03-21 (default: 1 January of this year, or a year "
+        "before --to)");
+    add("--to", typed->last_date, "DATE", dayUntil(LAST_YEAR_OF_SEASON),
+        "Date that no picture is later than (default: a year after --from)");
     add("--every", request.step, "DAYS", wholeNumberFrom(1, {}, "days"),
         "Days between pictures, from 1", "7");
-    add("--at", typed->first_time, "HH:MM", timeOfDay(), "Time of day of every picture", "12:00");
+    add("--at", typed->noon, "HH:MM", timeOfStudy(false),
+        "Time of day of every picture, in the place's standard time", "12:00");
     return finish(command, typed);
 }
 

@@ -1,9 +1,7 @@
 #include "quarn/reports/PlaceList.h"
 
 #include "host/cities/Cities.h"
-#include "quarn/scripts/StudySite.h"
 #include "quarn/words/Words.h"
-#include "sdk/zel/QnZone.h"
 
 #include <algorithm>
 #include <array>
@@ -14,7 +12,7 @@ namespace quarn::program {
 
 namespace {
 
-using Row = std::array<std::wstring, 6>;
+using Row = std::array<std::wstring, 5>;
 
 /// Two digits behind the point, as the table has them.
 std::wstring coordinate(double degrees, wchar_t positive, wchar_t negative) {
@@ -27,18 +25,9 @@ std::wstring coordinate(double degrees, wchar_t positive, wchar_t negative) {
            (degrees < 0.0 ? negative : positive);
 }
 
-std::wstring zoneText(double longitude_deg) {
-    return std::wstring(QnZoneText(60 * QnZoneOfLongitude(longitude_deg)).View());
-}
-
 Row rowOf(const City& city) {
-    const double longitude_deg = city.longitude_deg;
-    return {wideText(city.name),
-            wideText(city.country),
-            coordinate(city.latitude_deg, L'N', L'S'),
-            coordinate(longitude_deg, L'E', L'W'),
-            zoneText(longitude_deg),
-            zoneText(eastwardLongitude(longitude_deg))};
+    return {wideText(city.name), wideText(city.country), coordinate(city.latitude_deg, L'N', L'S'),
+            coordinate(city.longitude_deg, L'E', L'W'), wideText(city.zone)};
 }
 
 std::string table(const std::vector<Row>& rows) {
@@ -63,7 +52,7 @@ Outcome listPlaces(const std::string& text) {
     if (found.empty())
         return Outcome::failure("no place is called anything like \"" + text +
                                 "\"; --latitude and --longitude take every place on earth.");
-    std::vector<Row> rows = {{L"place", L"country", L"latitude", L"longitude", L"day", L"season"}};
+    std::vector<Row> rows = {{L"place", L"country", L"latitude", L"longitude", L"time zone"}};
     for (const City* const city : found)
         rows.push_back(rowOf(*city));
     return Outcome::success(table(rows));

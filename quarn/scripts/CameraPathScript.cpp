@@ -51,7 +51,7 @@ AnimationLines cameraPathLines(const CameraPathRequest& request) {
     if (request.has_even_speed)
         lines.preparing.push_back("_-EvenSpeed " + quotedName(request.camera, "Camera"));
     lines.preparing.push_back(lens(request));
-    lines.setting_up = setUp(request);
+    lines.setting_up = {setUp(request)};
     return lines;
 }
 

@@ -26,7 +26,7 @@ RecordingScript composeRecording(const RecordingRequest& request, const Animatio
     set_up.push_back("_-ViewportSize " + size);
     set_up.insert(set_up.end(), lines.preparing.begin(), lines.preparing.end());
     set_up.push_back("_-AnimationName \"" + request.name + "\"");
-    set_up.push_back(lines.setting_up);
+    set_up.insert(set_up.end(), lines.setting_up.begin(), lines.setting_up.end());
     const std::string pictures =
         request.mode.is_rendered ? " _Size " + size + samplesAnswer(request) : "";
     if (const std::string settings = pictures + lightAnswers(request.light); !settings.empty())

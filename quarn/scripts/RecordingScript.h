@@ -10,9 +10,9 @@ namespace quarn::program {
 
 /// The host commands of one kind of animation: one line each, in UTF-8.
 struct AnimationLines {
-    std::vector<std::string> preparing; ///< what is needed before: the camera, curves
-    std::string setting_up;             ///< the command that sets the animation up
-    std::vector<std::string> notes{};   ///< what a person is told before it is recorded
+    std::vector<std::string> preparing;  ///< what is needed before: the camera, curves
+    std::vector<std::string> setting_up; ///< the commands that set the animation up
+    std::vector<std::string> notes{};    ///< what a person is told before it is recorded
 };
 
 /// The host commands of a whole recording.

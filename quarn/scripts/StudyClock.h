@@ -2,6 +2,7 @@
 
 #include "quarn/scripts/SunStudyRequest.h"
 
+#include <chrono>
 #include <string>
 #include <vector>
 
@@ -11,8 +12,19 @@ namespace quarn::program {
 /// from 0 to 360, and takes the zone from that.
 double studyLongitude(const SunStudyRequest& request);
 
-/// What a person should know before a study is recorded: the place, the zone that its clock shows,
-/// and the universal time of the first frame.
+/// The first moment of a study, and one that no frame is later than, by the clock that the set-up
+/// commands reckon in: the whole hours of the longitude.
+struct StudySpan {
+    std::chrono::local_seconds first;
+    std::chrono::local_seconds last;
+};
+
+/// What the set-up commands are to be told. A day has one span for each date of that clock that its
+/// frames fall on, as the command takes one date; a season has one.
+std::vector<StudySpan> studySpans(const SunStudyRequest& request);
+
+/// What a person should know before a study is recorded: the place, its zone, when the first frame
+/// is, and what is uncommon about the times.
 std::vector<std::string> studyNotes(const SunStudyRequest& request);
 
 } // namespace quarn::program

@@ -1,5 +1,6 @@
 #include "quarn/scripts/StudySite.h"
 
+#include "host/cities/Cities.h"
 #include "quarn/words/Words.h"
 
 #include <cmath>
@@ -20,6 +21,12 @@ double eastwardLongitude(double longitude_deg) {
     // A billionth of a degree is a tenth of a millimetre; what the sum rounds off is less.
     constexpr double BILLION = 1e9;
     return std::round((longitude_deg + 360.0) * BILLION) / BILLION;
+}
+
+std::string placeName(const StudySite& site) {
+    if (findCity(site.place))
+        return site.place;
+    return latitudeText(site.latitude_deg) + ", " + longitudeText(site.longitude_deg);
 }
 
 std::string latitudeText(double latitude_deg) {

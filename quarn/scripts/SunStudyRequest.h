@@ -3,7 +3,8 @@
 #include "quarn/scripts/RecordingRequest.h"
 #include "quarn/scripts/StudySite.h"
 #include "quarn/scripts/StudyView.h"
-#include "quarn/words/DateWords.h"
+
+#include <chrono>
 
 namespace quarn::program {
 
@@ -14,9 +15,10 @@ struct SunStudyRequest {
     RecordingRequest recording;
     StudySite site;
     StudyView view;
-    COleDateTime start; ///< of the first frame, by the clock of the site
-    COleDateTime end;   ///< no frame is later
-    int step = 1;       ///< between frames: minutes of a day, days of a season
+    std::chrono::sys_seconds start;   ///< of the first frame, a whole minute of UTC
+    std::chrono::sys_seconds end;     ///< no frame is later; a whole minute too
+    int step = 1;                     ///< between frames: minutes of a day, days of a season
+    std::vector<std::string> notes{}; ///< what a person should know of how the times were found
 };
 
 } // namespace quarn::program

@@ -7,6 +7,8 @@ namespace quarn::program {
 
 namespace {
 
+using namespace std::chrono;
+
 std::string numbers(std::initializer_list<int> values) {
     std::string text;
     for (const int value : values)
@@ -19,22 +21,26 @@ std::string site(const SunStudyRequest& request) {
            numberText(request.site.north_deg) + " ";
 }
 
-std::string date(const COleDateTime& moment) {
-    return numbers({moment.GetDay(), moment.GetMonth(), moment.GetYear()});
+std::string date(local_seconds moment) {
+    const year_month_day day{floor<days>(moment)};
+    return numbers({static_cast<int>(unsigned(day.day())), static_cast<int>(unsigned(day.month())),
+                    int(day.year())});
 }
 
-std::string time(const COleDateTime& moment) {
-    return numbers({moment.GetHour(), moment.GetMinute()});
+std::string time(local_seconds moment) {
+    const hh_mm_ss clock{moment - floor<days>(moment)};
+    return numbers(
+        {static_cast<int>(clock.hours().count()), static_cast<int>(clock.minutes().count())});
 }
 
-std::string oneDay(const SunStudyRequest& request) {
-    return "_-SetOneDaySunAnimation " + site(request) + date(request.start) + time(request.start) +
-           time(request.end);
+std::string oneDay(const SunStudyRequest& request, const StudySpan& span) {
+    return "_-SetOneDaySunAnimation " + site(request) + date(span.first) + time(span.first) +
+           time(span.last);
 }
 
-std::string seasonal(const SunStudyRequest& request) {
-    return "_-SetSeasonalSunAnimation " + site(request) + date(request.start) + date(request.end) +
-           time(request.start);
+std::string seasonal(const SunStudyRequest& request, const StudySpan& span) {
+    return "_-SetSeasonalSunAnimation " + site(request) + date(span.first) + date(span.last) +
+           time(span.first);
 }
 
 } // namespace
@@ -43,8 +49,17 @@ AnimationLines sunStudyLines(const SunStudyRequest& request) {
     const bool is_one_day = request.kind == SunStudyRequest::Kind::one_day;
     AnimationLines lines;
     lines.preparing = linesFor(request.view, isDocument(request.recording.model));
-    lines.setting_up = (is_one_day ? oneDay(request) : seasonal(request)) +
-                       numbers({request.step}) + sharedAnswers(request.recording);
+    const std::vector<StudySpan> spans = studySpans(request);
+    for (const StudySpan& span : spans) {
+        const bool is_first = lines.setting_up.empty();
+        lines.setting_up.push_back((is_one_day ? oneDay(request, span) : seasonal(request, span)) +
+                                   numbers({request.step}) + sharedAnswers(request.recording));
+        if (spans.size() > 1)
+            lines.setting_up.push_back(is_first ? "_-JoinSunStudy _Keep"
+                                                : "_-JoinSunStudy _Append");
+    }
+    lines.setting_up.push_back("_-SunStudyPlace \"" + placeName(request.site) + "\" \"" +
+                               request.site.zone.name() + "\"");
     lines.notes = studyNotes(request);
     return lines;
 }

@@ -55,7 +55,7 @@ AnimationLines turntableLines(const TurntableRequest& request) {
         std::to_string(request.recording.frames) +
         (request.direction == "clockwise" ? " _Clockwise " : " _AntiClockwise ") +
         sharedAnswers(request.recording);
-    return {{camera(request), fitView(request)}, "_-SetTurntableAnimation " + answers};
+    return {{camera(request), fitView(request)}, {"_-SetTurntableAnimation " + answers}};
 }
 
 } // namespace quarn::program

@@ -3,7 +3,6 @@
 #include "quarn/words/Words.h"
 
 #include <algorithm>
-#include <chrono>
 
 namespace quarn::program {
 
@@ -13,13 +12,6 @@ namespace {
 std::optional<int> digits(std::string_view word) {
     const auto is_digit = [](char c) { return c >= '0' && c <= '9'; };
     return std::ranges::all_of(word, is_digit) ? wholeNumber(word) : std::nullopt;
-}
-
-std::int64_t minutesSince1970(const COleDateTime& moment) {
-    using namespace std::chrono;
-    const sys_days day = year(moment.GetYear()) / moment.GetMonth() / moment.GetDay();
-    const minutes midnight = day.time_since_epoch();
-    return midnight.count() + moment.GetHour() * 60 + moment.GetMinute();
 }
 
 } // namespace
@@ -44,22 +36,6 @@ std::optional<ClockTime> clockTime(std::string_view word) {
     if (!hour || !minute || *hour > 23 || *minute > 59)
         return std::nullopt;
     return ClockTime{*hour, *minute};
-}
-
-COleDateTime atTime(const COleDateTime& date, const ClockTime& time) {
-    return {date.GetYear(), date.GetMonth(), date.GetDay(), time.hour, time.minute, 0};
-}
-
-std::int64_t minutesBetween(const COleDateTime& start, const COleDateTime& end) {
-    return minutesSince1970(end) - minutesSince1970(start);
-}
-
-std::string dateText(const COleDateTime& moment) {
-    return utf8Text(moment.Format().View()).substr(0, 10);
-}
-
-std::string timeOfDayText(const COleDateTime& moment) {
-    return utf8Text(moment.Format().View()).substr(11, 5);
 }
 
 } // namespace quarn::program

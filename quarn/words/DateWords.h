@@ -2,9 +2,7 @@
 
 #include "sdk/qncore/QnDateTime.h"
 
-#include <cstdint>
 #include <optional>
-#include <string>
 #include <string_view>
 
 namespace quarn::program {
@@ -21,16 +19,5 @@ std::optional<COleDateTime> isoDate(std::string_view word);
 
 /// Reads "6:05" or "06:05", from 00:00 to 23:59.
 std::optional<ClockTime> clockTime(std::string_view word);
-
-/// The date at that time of day.
-COleDateTime atTime(const COleDateTime& date, const ClockTime& time);
-
-/// From the start to the end, both valid; negative where the end is earlier.
-std::int64_t minutesBetween(const COleDateTime& start, const COleDateTime& end);
-
-/// "2026-06-21"
-std::string dateText(const COleDateTime& moment);
-/// "06:05"
-std::string timeOfDayText(const COleDateTime& moment);
 
 } // namespace quarn::program

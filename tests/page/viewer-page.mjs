@@ -67,7 +67,7 @@ export function writePage(folder, ...options) {
 }
 
 export const TURNTABLE = ['turntable', '--frames', '24'];
-export const DAY = ['day', '--place', 'Athens', '--date', '2026-06-21', '--from', '04:00', '--to', '18:00', '--every', '120'];
+export const DAY = ['day', '--place', 'Athens', '--date', '2026-06-21', '--from', '04:00', '--to', '18:00', '--every', '120', '--zone', '+01:00'];
 
 export const WALK = ['flythrough', '--camera-curve', 'walk.txt', '--frames', '10'];
 

@@ -25,6 +25,8 @@ inline constexpr std::uint32_t EDGES = named("EDGE");
 inline constexpr std::uint32_t RENDERING = named("RNDR");
 /// What a scene is lit by beside its lights, and what it stands before and on.
 inline constexpr std::uint32_t SURROUNDINGS = named("SURR");
+/// What the place of the sun study is called, and its clocks.
+inline constexpr std::uint32_t STUDIED_PLACE = named("PLCE");
 inline constexpr std::uint32_t LIGHT = named("LITE");
 inline constexpr std::uint32_t PLUG_IN = named("PLUG");
 /// The last one: a file without it was cut off.

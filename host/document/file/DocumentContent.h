@@ -4,6 +4,7 @@
 #include "engine/scene/PlacedMesh.h"
 #include "engine/scene/UnitSystem.h"
 #include "host/document/RenderSettings.h"
+#include "host/document/StudiedPlace.h"
 #include "kelmar/KM_BinaryArchive.h"
 #include "kelmar/KM_Curve.h"
 #include "kelmar/KM_Light.h"
@@ -98,6 +99,7 @@ struct DocumentContent {
     /// None: those that a new document has. Without the light, which is kept beside them.
     std::optional<RenderSettings> rendering;
     std::optional<LightChoice> light; ///< none: that which a new document has
+    std::optional<StudiedPlace> studied_place;
     std::vector<LightContent> lights; ///< by ascending index, each below settings.light_slots
     std::vector<PlugInContent> plug_ins;
     std::vector<UnknownContent> unknown;

@@ -3,6 +3,7 @@
 #include "host/document/file/DocumentCoding.h"
 #include "host/document/file/DocumentHeader.h"
 #include "host/document/file/LightChoiceLayout.h"
+#include "host/document/file/StudiedPlaceLayout.h"
 #include "host/document/file/SurfaceLayout.h"
 
 #include <algorithm>
@@ -89,6 +90,10 @@ private:
         case chunk::SURROUNDINGS:
             return !m_content.light ? readLightChoice(m_archive, m_content.light.emplace())
                                     : m_archive.Fail();
+        case chunk::STUDIED_PLACE:
+            return !m_content.studied_place
+                       ? readStudiedPlace(m_archive, m_content.studied_place.emplace())
+                       : m_archive.Fail();
         case chunk::LIGHT:
             return readLight(m_archive, m_content.lights.emplace_back());
         case chunk::PLUG_IN:

@@ -3,6 +3,7 @@
 #include "host/document/file/DocumentCoding.h"
 #include "host/document/file/DocumentHeader.h"
 #include "host/document/file/LightChoiceLayout.h"
+#include "host/document/file/StudiedPlaceLayout.h"
 #include "host/document/file/SurfaceLayout.h"
 
 #include <algorithm>
@@ -120,7 +121,7 @@ private:
         if (!writeEach(chunk::VIEW, "a view", m_content.views, writeView) ||
             !writeEach(chunk::CAMERA, "a camera", m_content.cameras, writeCamera) ||
             !writeEach(chunk::EDGES, "the edges of a display mode", m_content.edges, writeEdges) ||
-            !writeRenderSettings() || !writeLightChoice() ||
+            !writeRenderSettings() || !writeLightChoice() || !writePlaceOfStudy() ||
             !writeEach(chunk::LIGHT, "a light", m_content.lights, writeLight) ||
             !writeEach(chunk::PLUG_IN, "what a plug-in keeps", m_content.plug_ins, writePlugIn))
             return false;
@@ -142,6 +143,12 @@ private:
         return !m_content.light ||
                writeChunk(chunk::SURROUNDINGS, "the settings of the light",
                           [&] { return quarn::writeLightChoice(m_archive, *m_content.light); });
+    }
+
+    bool writePlaceOfStudy() {
+        return !m_content.studied_place ||
+               writeChunk(chunk::STUDIED_PLACE, "the place of the sun study",
+                          [&] { return writeStudiedPlace(m_archive, *m_content.studied_place); });
     }
 
     const DocumentContent& m_content;

@@ -95,12 +95,13 @@ Error noSun(int frame) {
 Result<void> followSun(const StoredAnimation& animation, CameraTrack& track) {
     const KM_3dmAnimationProperties& record = *animation.record;
     track.keys.push_back(keyOf(pictureCamera(animation)));
+    const std::optional<Zone> zone = studyZone(animation.view->document(), record);
     for (int frame = 0; frame < record.FrameCount(); ++frame) {
         const auto aim = aimOf(animation, frame);
         KM_3dVector to_sun = aim ? aim->camera - aim->target : KM_3dVector();
         if (!to_sun.IsValid() || !to_sun.Unitize())
             return noSun(frame);
-        track.suns.push_back({to_sun, sunOfFrame(record, frame)});
+        track.suns.push_back({to_sun, sunOfFrame(record, frame, zone)});
     }
     return {};
 }

@@ -37,7 +37,7 @@ Result<void> FilmFollower::take(int number, const Image& picture) {
         begin();
     std::string caption;
     if (m_wish.has_caption) {
-        auto text = captionOf(sunOfFrame(m_record, number), m_wish.file);
+        auto text = captionOf(sunOfFrame(m_record, number, m_zone), m_wish.file);
         if (!text)
             return text.error();
         caption = std::move(text.value());
@@ -48,8 +48,10 @@ Result<void> FilmFollower::take(int number, const Image& picture) {
 void FilmFollower::begin() {
     const IQnZoetrixDynamicAccess* const access = Zoetrix_QuarnDynamicAccess();
     Document* const document = m_application.documents().active();
-    if (access && document)
+    if (access && document) {
         m_record = access->AnimationProperties(document->face());
+        m_zone = studyZone(*document, m_record);
+    }
     const int frames = std::max(1, m_record.FrameCount());
     const int rate = m_wish.frame_rate > 0 ? m_wish.frame_rate : standardFrameRate(frames);
     m_making.emplace(FilmMaking::Plan{m_wish, frames, rate, threadsBesideDrawing()},

@@ -1,9 +1,11 @@
 #pragma once
 
+#include "host/clock/Zone.h"
 #include "host/recording/RecordingFollower.h"
 #include "host/share/film/FilmMaking.h"
 #include "kelmar/KM_AnimationProperties.h"
 
+#include <optional>
 #include <tbb/global_control.h>
 
 namespace quarn {
@@ -29,6 +31,7 @@ private:
 
     FilmWish m_wish;
     Application& m_application;
+    std::optional<Zone> m_zone;                         ///< of a sun study
     KM_3dmAnimationProperties m_record;                 ///< of the animation, once a frame came
     std::optional<tbb::global_control> m_drawing_limit; ///< what drawing leaves is the encoder's
     std::optional<FilmMaking> m_making;

@@ -118,6 +118,7 @@ void addViews(DocumentContent& content) {
     content.views.push_back(plan);
     content.cameras.push_back({L"Kamera 1", view.viewport});
     content.edges.push_back({wireframe_mode_id, MeshEdgeChoice::all});
+    content.studied_place = StudiedPlace{L"Zürich, Switzerland", L"Europe/Zurich", 47.37, 8.54};
     content.rendering = RenderSettings{640, 360, 128, 4};
     content.light = LightChoice{.surroundings = Surroundings::picture,
                                 .picture = "/pictures/sky.hdr",

@@ -51,7 +51,7 @@ TEST(RecordedManifestTest, OfASunStudyTellsWhenAFrameIsAndWhereItsSunStands) {
     start.arguments = {"day",       "house.obj", "--latitude", "39.742476", "--longitude",
                        "-105.1786", "--date",    "2003-10-17", "--from",    "12:30",
                        "--to",      "12:31",     "--every",    "1",         "--size",
-                       "64x48",     "--out",     "out"};
+                       "64x48",     "--out",     "out",        "--zone",    "-7"};
     const Ended ended = run(start);
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     const json manifest = manifestOf(studio / "out/house.frames.json");

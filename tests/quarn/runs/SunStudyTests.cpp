@@ -3,6 +3,7 @@
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
 
 namespace quarn::test {
 namespace {
@@ -46,6 +47,16 @@ public:
         return dates;
     }
 
+    /// "2026-06-21T14:30:00 CEST" of each frame in the list of frames.
+    Words timesInManifest(const std::string& list = "out/house.frames.json") const {
+        Words times;
+        const auto manifest = nlohmann::json::parse(readFile(m_studio / list));
+        for (const auto& image : manifest["images"])
+            times.push_back(image["sun"]["time"].get<std::string>() + " " +
+                            image["sun"]["zone"].get<std::string>());
+        return times;
+    }
+
     std::filesystem::path operator/(const std::filesystem::path& name) const {
         return m_studio / name;
     }
@@ -75,18 +86,22 @@ TEST(Day, HasAFrameAtBothEndsAndEveryStepBetween) {
                                               "06:00", "--to", "18:00", "--every", "60"});
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     const Words told = linesOf(ended.out);
-    ASSERT_THAT(told, SizeIs(4));
+    ASSERT_THAT(told, SizeIs(5));
     EXPECT_EQ(told[0], "Athens, Greece: 37.98 N, 23.73 E");
-    EXPECT_EQ(told[1], "Clock: UTC+1, the whole hours of longitude 23.73 E, without daylight "
-                       "saving");
-    EXPECT_EQ(told[2], "First frame: 2026-06-21 06:00 = 05:00 UTC");
-    EXPECT_THAT(told[3], MatchesRegex("13 frames and out/house\\.html in [0-9.]+ s"));
+    EXPECT_EQ(told[1], "Clock: Europe/Athens, EEST (UTC+3)");
+    EXPECT_EQ(told[2], "First frame: 2026-06-21 06:00 EEST = 03:00 UTC");
+    EXPECT_THAT(told[4], MatchesRegex("13 frames and out/house\\.html in [0-9.]+ s"));
     EXPECT_THAT(filesIn(garden / "out"), SizeIs(16));
     const Words dates = garden.datesOnPage();
     ASSERT_THAT(dates, SizeIs(13));
-    EXPECT_EQ(dates.front(), "2026-06-21 06:00:00");
-    EXPECT_EQ(dates[1], "2026-06-21 07:00:00");
-    EXPECT_EQ(dates.back(), "2026-06-21 18:00:00");
+    // The page is on the whole hours of the longitude, the list of frames on the wall's clock.
+    EXPECT_EQ(dates.front(), "2026-06-21 04:00:00");
+    EXPECT_EQ(dates[1], "2026-06-21 05:00:00");
+    EXPECT_EQ(dates.back(), "2026-06-21 16:00:00");
+    const Words times = garden.timesInManifest();
+    ASSERT_THAT(times, SizeIs(13));
+    EXPECT_EQ(times.front(), "2026-06-21T06:00:00 EEST");
+    EXPECT_EQ(times.back(), "2026-06-21T18:00:00 EEST");
     EXPECT_THAT(readFile(garden / "out/house.html"), HasSubstr("bDisplayDate = 1;"));
 }
 
@@ -112,11 +127,47 @@ TEST(Day, CountsItsFramesBeforehand) {
     }
 }
 
+/// In Auckland the clock of studies is UTC+11, and in summer the clock on the wall UTC+13: its
+/// first two hours belong to the day before. The last picture is that of a study on one date.
+TEST(Day, ThatFallsOnTwoDatesOfTheStudiesClockIsOneRecording) {
+    const Garden garden;
+    const Words site = {"--place", "Auckland", "--date", "2026-12-21", "--to", "07:00"};
+    const auto from = [&](const char* time, const char* folder) {
+        Words options = site;
+        options.insert(options.end(), {"--from", time, "--every", "360"});
+        const Ended ended = garden.record("day", options, folder);
+        EXPECT_EQ(ended.exit_code, 0) << ended.err;
+    };
+    from("01:00", "both");
+    from("07:00", "one");
+    EXPECT_THAT(garden.datesOnPage("both/house.html"),
+                ElementsAre("2026-12-20 23:00:00", "2026-12-21 05:00:00"));
+    EXPECT_THAT(garden.timesInManifest("both/house.frames.json"),
+                ElementsAre("2026-12-21T01:00:00 NZDT", "2026-12-21T07:00:00 NZDT"));
+    EXPECT_TRUE(readFile(garden / "both/house001.bmp") == readFile(garden / "one/house000.bmp"));
+}
+
+/// The document keeps whose clocks its study goes by.
+TEST(Day, OfASavedDocumentIsToldByTheSameClock) {
+    const Garden garden;
+    const Ended saved =
+        garden.record("day", {"--place", "Kolkata", "--date", "2026-06-21", "--from", "06:15",
+                              "--to", "06:15", "--save", "kept.quarn"});
+    ASSERT_EQ(saved.exit_code, 0) << saved.err;
+    Start start;
+    start.folder = (garden / "").parent_path();
+    start.arguments = {"record", "kept.quarn", "--out", "again"};
+    const Ended ended = run(start);
+    ASSERT_EQ(ended.exit_code, 0) << ended.err;
+    EXPECT_THAT(garden.timesInManifest("again/house.frames.json"),
+                ElementsAre("2026-06-21T06:15:00 IST"));
+}
+
 TEST(Day, IsDarkAtNightAndItsShadowsMove) {
     const Garden garden;
-    // Night, morning, noon, afternoon in Athens, by its whole-hour zone
+    // Night, morning, noon, afternoon in Athens
     const Ended ended = garden.record("day", {"--place", "Athens", "--date", "2026-06-21", "--from",
-                                              "00:00", "--to", "18:00", "--every", "360"});
+                                              "01:00", "--to", "19:00", "--every", "360"});
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     const Picture night = garden.picture("out/house000.bmp");
     const Picture morning = garden.picture("out/house001.bmp");
@@ -185,31 +236,37 @@ TEST(Season, HasAFrameOnEveryDateToTheLastOne) {
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
     // 55 days after 21 March is 15 May, then 9 July, 2 September, 27 October, 21 December.
     EXPECT_THAT(garden.datesOnPage(),
-                ElementsAre("2026-03-21 15:30:00", "2026-05-15 15:30:00", "2026-07-09 15:30:00",
-                            "2026-09-02 15:30:00", "2026-10-27 15:30:00", "2026-12-21 15:30:00"));
+                ElementsAre("2026-03-21 14:30:00", "2026-05-15 14:30:00", "2026-07-09 14:30:00",
+                            "2026-09-02 14:30:00", "2026-10-27 14:30:00", "2026-12-21 14:30:00"));
+    EXPECT_THAT(garden.timesInManifest(),
+                ElementsAre("2026-03-21T15:30:00 EET", "2026-05-15T16:30:00 EEST",
+                            "2026-07-09T16:30:00 EEST", "2026-09-02T16:30:00 EEST",
+                            "2026-10-27T15:30:00 EET", "2026-12-21T15:30:00 EET"));
     EXPECT_THAT(filesIn(garden / "out"), SizeIs(9));
-    EXPECT_THAT(linesOf(ended.out), Contains("First frame: 2026-03-21 15:30 = 14:30 UTC"));
+    EXPECT_THAT(linesOf(ended.out), Contains("First frame: 2026-03-21 15:30 EET = 13:30 UTC"));
     EXPECT_GT(
         meanDifference(garden.picture("out/house002.bmp"), garden.picture("out/house005.bmp")),
         0.01);
 }
 
-/// At 105.18 degrees west a season is on UTC+16 and a day on UTC-7: 11:00 on 22 March there is
-/// 12:00 on 21 March here, 19:00 universal time. The pictures are of the same sun.
-TEST(Season, InTheWestIsADayAheadOfTheDay) {
+/// At 105.18 degrees west a season is set up on UTC+16 and a day on UTC-7. 12:00 of standard time
+/// on 21 March is 13:00 on the wall, and 19:00 universal time: the pictures are of the same sun.
+TEST(Season, InTheWestShowsTheSunOfItsDates) {
     const Garden garden;
     const auto west = [](Words options) {
         options.insert(options.end(), {"--latitude", "39.74", "--longitude", "-105.18"});
         return options;
     };
     const Ended season = garden.record(
-        "season", west({"--from", "2026-03-22", "--to", "2026-03-22", "--at", "11:00"}), "season");
+        "season", west({"--from", "2026-03-21", "--to", "2026-03-21", "--at", "12:00"}), "season");
     const Ended day = garden.record(
-        "day", west({"--date", "2026-03-21", "--from", "12:00", "--to", "12:00"}), "day");
+        "day", west({"--date", "2026-03-21", "--from", "13:00", "--to", "13:00"}), "day");
     ASSERT_EQ(season.exit_code, 0) << season.err;
     ASSERT_EQ(day.exit_code, 0) << day.err;
-    EXPECT_THAT(season.out, HasSubstr("First frame: 2026-03-22 11:00 = 2026-03-21 19:00 UTC"));
-    EXPECT_THAT(day.out, HasSubstr("First frame: 2026-03-21 12:00 = 19:00 UTC"));
+    for (const Ended* const ended : {&season, &day})
+        EXPECT_THAT(ended->out, HasSubstr("First frame: 2026-03-21 13:00 MDT = 19:00 UTC"));
+    EXPECT_EQ(garden.timesInManifest("season/house.frames.json"),
+              garden.timesInManifest("day/house.frames.json"));
     EXPECT_LT(
         meanDifference(garden.picture("season/house000.bmp"), garden.picture("day/house000.bmp")),
         0.001);

@@ -1,0 +1,43 @@
+#pragma once
+
+#include "host/sunpath/SkyDisk.h"
+#include "kelmar/KM_Point.h"
+
+#include <cstddef>
+#include <functional>
+#include <vector>
+
+namespace quarn {
+
+class DisplayScene;
+
+/// What hides the sky from a point: looked at along lines from the horizon to the zenith, at even
+/// steps of the azimuth from north on.
+struct Obstruction {
+    /// A part of such a line that is hidden, by altitudes of 0 to 90 degrees.
+    struct Band {
+        double low_deg;
+        double high_deg;
+    };
+    std::vector<std::vector<Band>> lines; ///< each from the horizon up; empty: nobody looked
+};
+
+/// Where somebody stands who looks at the sky.
+struct SkyWatch {
+    KM_3dPoint point;     ///< in the world; a surface that it lies on should be a little away
+    double north_deg = 0; ///< clockwise from the world's Y axis, as seen from above
+    /// Whether a mesh of the scene hides nothing; none: all hide. By its index in
+    /// DisplayScene::meshes.
+    std::function<bool(std::size_t mesh)> isPassed;
+};
+
+/// Looks around from a point with rays, a quarter of a degree of the azimuth and half a degree of
+/// the altitude apart; the borders of what is hidden are found to a hundredth of a degree of the
+/// altitude. What is smaller than a step may be missed. Takes some tenths of a second.
+Obstruction obstructionAround(const DisplayScene& scene, const SkyWatch& watch);
+
+/// What is hidden as areas of a disk, to be filled as one path.
+std::vector<std::vector<DrawnPoint>> hiddenAreas(const Obstruction& obstruction,
+                                                 const SkyDisk& disk);
+
+} // namespace quarn
