@@ -3,6 +3,7 @@
 #include "host/session/StatedSite.h"
 #include "quarn/arguments/Readings.h"
 #include "quarn/arguments/RecordingArguments.h"
+#include "quarn/arguments/SiteArguments.h"
 #include "quarn/arguments/Subcommands.h"
 #include "quarn/reports/PlaceList.h"
 #include "quarn/scripts/SunStudyScript.h"
@@ -28,16 +29,6 @@ struct TypedStudy {
     ClockTime last_time{};
     ScriptUse use;
 };
-
-Reading<const City*> cityName() {
-    return [](const std::string& option,
-              const std::string& word) -> std::variant<const City*, Refusal> {
-        if (const City* const city = findCity(word))
-            return city;
-        return Refusal{option + ": " + whyNoCity(word) +
-                       " quarn places lists those that are known."};
-    };
-}
 
 void addSiteOptions(const OptionAdder& add, TypedStudy& typed) {
     add("--place", typed.city, "NAME", cityName(),
