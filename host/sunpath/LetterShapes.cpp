@@ -40,7 +40,8 @@ Result<LetterShapes> LetterShapes::read(const std::filesystem::path& font) {
     constexpr std::size_t MOST_BYTES = std::size_t{64} << 20;
     const auto file = readFileBytes(font, MOST_BYTES);
     if (!file)
-        return file.error();
+        return Error{"Cannot read the font " + font.native() + ": " + file.message() +
+                     ". Install the program with all its files."};
     auto read = std::make_shared<Font>();
     const auto found = file.value().bytes();
     read->bytes.assign(found.begin(), found.end());
