@@ -10,7 +10,7 @@ namespace quarn {
 namespace {
 
 constexpr Grey GRID_GREY = 0.72;
-constexpr Grey HIDDEN_GREY = 0.84;
+constexpr Grey HIDDEN_GREY = 0.8;
 constexpr Grey LOOP_GREY = 0.35;
 constexpr double DASH_PX = 5;
 constexpr std::size_t JUNE = 5;
@@ -19,7 +19,8 @@ constexpr std::size_t DECEMBER = 11;
 /// How far outside the horizon things stand: degrees, dates, the letters of the compass.
 constexpr double DEGREES_PX = 15;
 constexpr double DATES_PX = 33;
-constexpr double LETTERS_PX = 96;
+constexpr double LETTERS_BESIDE_DATES_PX = 96;
+constexpr double LETTERS_PX = 42;
 
 std::string twoDigits(std::size_t number) {
     return (number < 10 ? "0" : "") + std::to_string(number);
@@ -53,19 +54,11 @@ std::optional<SunPosition> endOnHorizon(const SunPath& path, bool is_set) {
     return std::nullopt;
 }
 
-/// Where a way passes a direction of the compass nearest.
-SunPosition nearest(const SunPath& path, double azimuth_deg) {
-    SunPosition found{};
-    double least_deg = std::numeric_limits<double>::infinity();
-    for (const auto& piece : path)
-        for (const SunPosition& sun : piece) {
-            const double away_deg = std::abs(std::remainder(sun.azimuth_deg - azimuth_deg, 360));
-            if (away_deg < least_deg) {
-                least_deg = away_deg;
-                found = sun;
-            }
-        }
-    return found;
+/// Where the sun is at a time of day, on a day without night.
+SunPosition atHour(const SunPath& path, double hour) {
+    const auto& piece = path.front();
+    const auto index = static_cast<std::size_t>(hour / 24 * static_cast<double>(piece.size()));
+    return piece[std::min(index, piece.size() - 1)];
 }
 
 DrawnPoint between(const DrawnPoint& from, const DrawnPoint& to, double distance_px) {
@@ -121,7 +114,7 @@ void DiskParts::addRings() {
     for (int altitude = 10; altitude < 90; altitude += 10)
         m_drawing.shapes.push_back(DrawnCircle{.middle = m_disk.middle,
                                                .radius_px = m_disk.radiusOf(altitude),
-                                               .fill = {},
+
                                                .stroke = grid});
     DrawnPath rays{.stroke = grid};
     for (int azimuth = 0; azimuth < 360; azimuth += 10) {
@@ -131,7 +124,7 @@ void DiskParts::addRings() {
     m_drawing.shapes.push_back(std::move(rays));
     m_drawing.shapes.push_back(DrawnCircle{.middle = m_disk.middle,
                                            .radius_px = m_disk.radius_px,
-                                           .fill = {},
+
                                            .stroke = DrawnStroke{.width_px = 1.6}});
 }
 
@@ -187,7 +180,10 @@ void DiskParts::addDate(std::size_t month, const SunPath& path) {
     }
     text.anchor = TextAnchor::middle;
     text.has_halo = true;
-    addTextAt(m_disk.at(nearest(path, is_first_half ? 270 : 90)), std::move(text));
+    // A day without night has a ring: each ring has its date between other hours.
+    const double hour = is_first_half ? 16.5 + static_cast<double>(month)
+                                      : 7.5 - static_cast<double>(month - JUNE - 1);
+    addTextAt(m_disk.at(atHour(path, hour)), std::move(text));
 }
 
 void DiskParts::addAltitudes(const SunSite& site) {
@@ -211,6 +207,8 @@ void DiskParts::addAltitudes(const SunSite& site) {
 
 void DiskParts::addHours(const YearOfPaths& year, const SunSite& site) {
     constexpr double BESIDE_PX = 13;
+    constexpr double LEAST_GAP_PX = 19;
+    std::optional<DrawnPoint> last;
     for (std::size_t hour = 0; hour < year.hours.size(); ++hour) {
         const LoopEnds ends(year.hours[hour]);
         const bool is_june = site.latitude_deg < 0 ? !ends.december : ends.june.has_value();
@@ -222,12 +220,16 @@ void DiskParts::addHours(const YearOfPaths& year, const SunSite& site) {
         const auto& piece = is_june ? half.back() : half.front();
         const SunPosition& inner = piece[piece.size() / 2];
         const DrawnPoint place = m_disk.at(*end);
-        addTextAt(between(place, m_disk.at(inner), -BESIDE_PX), {.place = {},
-                                                                 .text = std::to_string(hour),
-                                                                 .size_px = 14,
-                                                                 .anchor = TextAnchor::middle,
-                                                                 .is_bold = true,
-                                                                 .has_halo = true});
+        const DrawnPoint middle = between(place, m_disk.at(inner), -BESIDE_PX);
+        if (last && std::hypot(middle.x_px - last->x_px, middle.y_px - last->y_px) < LEAST_GAP_PX)
+            continue;
+        last = middle;
+        addTextAt(middle, {.place = {},
+                           .text = std::to_string(hour),
+                           .size_px = 14,
+                           .anchor = TextAnchor::middle,
+                           .is_bold = true,
+                           .has_halo = true});
     }
 }
 
@@ -240,7 +242,8 @@ void DiskParts::addCompass() {
                                                       .anchor = TextAnchor::middle,
                                                       .grey = LOOP_GREY});
     for (std::size_t quarter = 0; quarter < LETTERS.size(); ++quarter)
-        addTextAt(m_disk.onRim(90.0 * static_cast<double>(quarter), LETTERS_PX),
+        addTextAt(m_disk.onRim(90.0 * static_cast<double>(quarter),
+                               quarter % 2 == 0 ? LETTERS_PX : LETTERS_BESIDE_DATES_PX),
                   {.place = {},
                    .text = LETTERS[quarter],
                    .size_px = 22,

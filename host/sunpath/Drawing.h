@@ -24,18 +24,18 @@ struct DrawnStroke {
 
 /// Lines through points, or areas inside of them.
 struct DrawnPath {
-    std::string id; ///< names the shape in the file, for whoever edits it; empty: no name
-    std::vector<std::vector<DrawnPoint>> lines;
+    std::string id{}; ///< names the shape in the file, for whoever edits it; empty: no name
+    std::vector<std::vector<DrawnPoint>> lines{};
     bool is_closed = false;
-    std::optional<Grey> fill;
-    std::optional<DrawnStroke> stroke;
+    std::optional<Grey> fill{};
+    std::optional<DrawnStroke> stroke{};
 };
 
 struct DrawnCircle {
     DrawnPoint middle;
     double radius_px;
-    std::optional<Grey> fill;
-    std::optional<DrawnStroke> stroke;
+    std::optional<Grey> fill{};
+    std::optional<DrawnStroke> stroke{};
 };
 
 enum class TextAnchor { start, middle, end };

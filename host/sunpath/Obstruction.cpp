@@ -120,7 +120,7 @@ public:
                 going_on.push_back(std::move(m_open[before]));
             } else {
                 going_on.emplace_back();
-                going_on.back().add(std::max(0.0, azimuth_deg - m_half_step_deg), band);
+                going_on.back().add(azimuth_deg - m_half_step_deg, band);
             }
             going_on.back().add(azimuth_deg, band);
         }
@@ -171,18 +171,20 @@ private:
 Obstruction obstructionAround(const DisplayScene& scene, const SkyWatch& watch) {
     const Looking looking(scene, watch);
     Obstruction found;
+    found.lines.resize(LINES);
     for (std::size_t line = 0; line < LINES; ++line)
-        found.lines.push_back(looking.line(360.0 * static_cast<double>(line) / LINES));
+        found.lines[line] = looking.line(found.azimuthOf(line));
     return found;
 }
 
 std::vector<std::vector<DrawnPoint>> hiddenAreas(const Obstruction& obstruction,
                                                  const SkyDisk& disk) {
     const std::size_t count = obstruction.lines.size();
-    StripMaking making(std::max<std::size_t>(count, 1));
-    for (std::size_t line = 0; count > 0 && line <= count; ++line)
-        making.add(360.0 * static_cast<double>(line) / static_cast<double>(count),
-                   obstruction.lines[line % count]);
+    if (count == 0)
+        return {};
+    StripMaking making(count);
+    for (std::size_t line = 0; line <= count; ++line) // the first one closes the turn
+        making.add(obstruction.azimuthOf(line), obstruction.lines[line % count]);
     std::vector<std::vector<DrawnPoint>> areas;
     for (const Strip& strip : making.finish())
         areas.push_back(outlineOf(strip, disk));

@@ -12,7 +12,8 @@ namespace quarn {
 class DisplayScene;
 
 /// What hides the sky from a point: looked at along lines from the horizon to the zenith, at even
-/// steps of the azimuth from north on.
+/// steps of the azimuth, the first half a step from north: walls that stand along the axes or
+/// halfway between them are not looked along.
 struct Obstruction {
     /// A part of such a line that is hidden, by altitudes of 0 to 90 degrees.
     struct Band {
@@ -20,6 +21,10 @@ struct Obstruction {
         double high_deg;
     };
     std::vector<std::vector<Band>> lines; ///< each from the horizon up; empty: nobody looked
+
+    double azimuthOf(std::size_t line) const {
+        return 360.0 * (static_cast<double>(line) + 0.5) / static_cast<double>(lines.size());
+    }
 };
 
 /// Where somebody stands who looks at the sky.

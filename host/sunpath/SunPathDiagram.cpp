@@ -38,7 +38,7 @@ void addHeading(const SunPathWish& wish, Drawing& drawing) {
     drawing.shapes.push_back(
         DrawnText{{LEFT_PX, 58}, "Sun path: " + place, 28, TextAnchor::start, true});
     drawing.shapes.push_back(DrawnText{{LEFT_PX, 86},
-                                       siteText(wish.site) + " · " +
+                                       (wish.place.empty() ? "" : siteText(wish.site) + " · ") +
                                            std::to_string(wish.clock.year) +
                                            " · hours of standard time, " + wish.clock_name,
                                        16});
@@ -47,24 +47,23 @@ void addHeading(const SunPathWish& wish, Drawing& drawing) {
 /// Where north is in the model: its Y axis beside north.
 void addNorthArrow(double north_deg, Drawing& drawing) {
     const SkyDisk compass{SkyProjection::orthographic, {drawing.width_px - 90, 78}, 34};
-    const auto arrow = [&](double azimuth_deg, double dash_px, const char* name) {
+    const auto arrow = [&](double azimuth_deg, double width_px, const char* name) {
         const DrawnPoint tip = compass.onRim(azimuth_deg);
-        drawing.shapes.push_back(DrawnPath{
-            .lines = {{compass.middle, tip},
-                      {compass.onRim(azimuth_deg - 14, -10), tip,
-                       compass.onRim(azimuth_deg + 14, -10)}},
-            .stroke = DrawnStroke{.width_px = dash_px > 0 ? 1.0 : 2.0, .dash_px = dash_px}});
+        drawing.shapes.push_back(DrawnPath{.lines = {{compass.middle, tip},
+                                                     {compass.onRim(azimuth_deg - 14, -10), tip,
+                                                      compass.onRim(azimuth_deg + 14, -10)}},
+                                           .stroke = DrawnStroke{.width_px = width_px}});
         const DrawnPoint place = compass.onRim(azimuth_deg, 11);
         drawing.shapes.push_back(DrawnText{.place = {place.x_px, place.y_px + 5},
                                            .text = name,
                                            .size_px = 14,
                                            .anchor = TextAnchor::middle,
-                                           .is_bold = dash_px == 0,
+                                           .is_bold = width_px > 1,
                                            .has_halo = true});
     };
     if (std::remainder(north_deg, 360) != 0)
-        arrow(-north_deg, 3, "Y");
-    arrow(0, 0, std::remainder(north_deg, 360) != 0 ? "N" : "N, Y");
+        arrow(-north_deg, 1, "Y");
+    arrow(0, 2, std::remainder(north_deg, 360) != 0 ? "N" : "N, Y");
 }
 
 /// "Nov, Dec": the months on whose 21st the sun stays below the horizon.
@@ -83,6 +82,8 @@ std::vector<std::string> notesOf(const SunPathWish& wish, const YearOfPaths& yea
         "Full lines: December to June. Dashed lines: July to November."};
     if (const std::string dark = darkMonths(year); !dark.empty())
         notes[1] += " The sun does not rise on the 21st of: " + dark + ".";
+    if (!wish.clock_note.empty())
+        notes.push_back(wish.clock_note);
     if (wish.point)
         notes.push_back("Grey: what hides the sky from " + wish.point->name +
                         ". Glass hides nothing.");

@@ -22,8 +22,9 @@ struct DiagramPoint {
 struct SunPathWish {
     std::string place; ///< "Berlin, Germany"; empty: its coordinates alone name it
     SunSite site;
-    StandardClock clock;                    ///< of a year that SunYears.h names
-    std::string clock_name;                 ///< "UTC+1 (CET)"
+    StandardClock clock;    ///< of a year that SunYears.h names
+    std::string clock_name; ///< "UTC+1 (CET)"
+    std::string clock_note; ///< a sentence about summer time; empty: there is none to be told
     std::vector<SkyProjection> projections; ///< side by side
     std::optional<double> north_deg;        ///< of the model, clockwise from its Y axis, to show it
     std::optional<DiagramPoint> point;

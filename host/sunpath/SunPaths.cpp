@@ -12,12 +12,12 @@ using std::chrono::days;
 using std::chrono::minutes;
 using std::chrono::sys_seconds;
 
-/// The sun goes at most one degree in this time: a straight line leaves its way by a hundredth of a
-/// degree at the most.
-constexpr minutes STEP_OF_DAY(4);
+/// The sun goes at most a degree and a half in this time: a straight line leaves its way by a
+/// hundredth of a degree at the most.
+constexpr minutes STEP_OF_DAY(6);
 
-/// In two days a loop bends as little.
-constexpr days STEP_OF_YEAR(2);
+/// In four days a loop bends as little.
+constexpr days STEP_OF_YEAR(4);
 
 /// Where the line between two positions on either side of the horizon crosses it.
 SunPosition atHorizon(const SunPosition& one, const SunPosition& other) {

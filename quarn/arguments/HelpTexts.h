@@ -22,6 +22,9 @@ inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
   quarn farm cancel DIR                        end it; its frames stay
   quarn video FOLDER FILE                      make a film of recorded pictures: .mp4, .webm, .gif,
                                                .webp or .apng
+  quarn sun --place NAME                       tell where the sun stands, and when it rises and sets
+  quarn sunpath --place NAME --out FILE.svg
+                                               draw the ways of the sun through a year
   quarn places [TEXT]                          list the cities that a sun study knows by name
   quarn curves MODEL                           list what a camera can follow
   quarn frame DOC --number K --out FILE        write one frame of a saved animation
@@ -206,6 +209,35 @@ Examples:
   quarn video out/house house.mp4
   quarn video out/house house.gif --width 480 --fps 20
   quarn day house.glb --place Athens --date 2026-06-21 --out out/sun --video sun.mp4 --caption)";
+
+inline constexpr const char* SUN_FOOTER = R"(
+Times are those of the clock on the wall, daylight saving included. Azimuths are degrees clockwise
+from north; altitudes are those of the sun's centre above a level horizon, without refraction. The
+sun rises and sets where published tables have it: with its centre 50 minutes of arc below the
+horizon (34 of refraction, 16 of half diameter). Without --time and --date it is now. --date alone
+tells a whole day, every hour; the years are 1800 to 2199.
+
+Examples:
+  quarn sun --place Berlin
+  quarn sun --place Berlin --date 2026-06-21
+  quarn sun --place Berlin --time "2026-03-21 09:00" --to "2026-03-21 17:00" --every 30
+  quarn sun --latitude 69.65 --longitude 18.96 --date 2026-12-21 --format json
+  quarn sun --place Athens --date 2026-06-21 --every 10 --format csv > sun.csv)";
+
+inline constexpr const char* SUNPATH_FOOTER = R"(
+The sky is a disk with the zenith in its middle and north up. Lines show the sun's way on the 21st of
+each month, loops where it stands at each whole hour of the place's standard time (in summer time
+clocks show an hour more). FILE ends in .svg, which every drawing program opens, or in .png.
+
+With a MODEL and --point or --object what hides the sky from there is grey: where a line is on grey,
+the point is in shade. A point on a surface should be a little off it; an object is looked at from
+the middle of its box, and hides nothing itself. Glass hides nothing. --north 30 says that north lies
+30 degrees clockwise from the model's Y axis.
+
+Examples:
+  quarn sunpath --place Berlin --out berlin.svg
+  quarn sunpath --place Sydney --year 2030 --projection both --out sydney.png
+  quarn sunpath house.obj --place Athens --north 20 --point 2,-1,1.5 --out terrace.svg)";
 
 inline constexpr const char* PLACES_FOOTER = R"(
 The last column tells whose clocks the times of a study are of, with daylight saving as it was, is or

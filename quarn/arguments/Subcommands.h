@@ -24,6 +24,8 @@ Action addRecord(CLI::App& command);
 Action addFinish(CLI::App& command);
 Action addFarm(CLI::App& command);
 Action addVideo(CLI::App& command);
+Action addSun(CLI::App& command);
+Action addSunPath(CLI::App& command);
 Action addPlaces(CLI::App& command);
 Action addCurves(CLI::App& command);
 Action addFrame(CLI::App& command);

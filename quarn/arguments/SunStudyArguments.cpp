@@ -2,6 +2,7 @@
 #include "host/cities/Cities.h"
 #include "quarn/arguments/Readings.h"
 #include "quarn/arguments/RecordingArguments.h"
+#include "quarn/arguments/SiteArguments.h"
 #include "quarn/arguments/Subcommands.h"
 #include "quarn/arguments/TypedStudy.h"
 #include "quarn/reports/PlaceList.h"
@@ -12,16 +13,6 @@ namespace quarn::program {
 namespace {
 
 constexpr int MINUTES_OF_DAY = 1440;
-
-Reading<const City*> cityName() {
-    return [](const std::string& option,
-              const std::string& word) -> std::variant<const City*, Refusal> {
-        if (const City* const city = findCity(word))
-            return city;
-        return Refusal{option + ": " + whyNoCity(word) +
-                       " quarn places lists those that are known."};
-    };
-}
 
 Reading<std::chrono::year_month_day> dayUntil(int last_year) {
     return [=](const std::string& option,

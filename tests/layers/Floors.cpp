@@ -30,12 +30,12 @@ const Places BELOW_PROMPT = BELOW_APP + "host/app/";
 const Places BELOW_DIALOGS = BELOW_PROMPT + "host/prompt/";
 const Places BELOW_COMMANDS = BELOW_DIALOGS + "host/dialogs/" + "host/recovery/";
 const Places BELOW_SHARE = BELOW_COMMANDS + "host/commands/";
-const Places BELOW_SESSION = BELOW_SHARE + "host/share/";
+const Places BELOW_SESSION = BELOW_SHARE + "host/share/" + "host/sunpath/";
 
 // What a program sees of the host: its door, what it implements itself, the cities of the world,
-// their sun and their clocks.
-const Places PROGRAM = {"sdk/",         "host/session/", "host/front_end/",
-                        "host/cities/", "host/sun/",     "host/clock/"};
+// their sun, their clocks and the diagram of the sun's paths.
+const Places PROGRAM = {"sdk/",        "host/session/", "host/front_end/", "host/cities/",
+                        "host/clock/", "host/sun/",     "host/sunpath/"};
 
 const Places BELOW_SESSIONS = PROGRAM + "quarn/words/" + "quarn/terminal/";
 const Places BELOW_RUNS = PROGRAM + "quarn/words/" + "quarn/session/" + "quarn/scripts/";
@@ -73,6 +73,7 @@ const Room FLOORS[] = {
     {5, "host/document/", BELOW_DOCUMENT},
     {5, "host/reader/", BELOW_DOCUMENT},
     {5, "host/recording/", BELOW_DOCUMENT},
+    {6, "host/sunpath/", BELOW_DOCUMENT},
     {6, "host/app/", BELOW_APP},
     {7, "host/recovery/", BELOW_PROMPT},
     {7, "host/prompt/", BELOW_PROMPT},
