@@ -18,7 +18,7 @@ const Places BELOW_DISPLAY = BELOW_IMPORT + "engine/images/";
 // The host: each of its rooms sees all that stand above it here.
 const Places BELOW_HOST = {"kelmar/",        "sdk/",           "ground/",
                            "engine/scene/",  "engine/images/", "engine/display/",
-                           "engine/render/", "import/"};
+                           "engine/render/", "engine/sunhours/", "import/"};
 const Places BELOW_FRONT_END = BELOW_HOST + "host/border/";
 const Places BELOW_CITIES = BELOW_FRONT_END + "host/front_end/";
 const Places BELOW_SUN = BELOW_CITIES + "host/cities/";
@@ -58,6 +58,7 @@ const Room FLOORS[] = {
     {2, "engine/images/", BELOW_IMPORT},
     {2, "engine/display/", BELOW_DISPLAY},
     {2, "engine/render/", BELOW_DISPLAY + "engine/display/"},
+    {2, "engine/sunhours/", BELOW_DISPLAY + "engine/display/"},
 
     {3, "import/", BELOW_IMPORT},
     {4, "reader/", BELOW_IMPORT + "import/"},
