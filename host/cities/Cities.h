@@ -16,6 +16,7 @@ struct City {
     std::string_view country; ///< in English
     double latitude_deg;      ///< of the city's middle, north positive, WGS 84, to 0.01 degrees
     double longitude_deg;     ///< east positive, -180 to 180, to 0.01 degrees
+    std::string_view zone;    ///< of the IANA time zone database: "Europe/Berlin"
 };
 
 /// All cities that are known by name, some 350 on every inhabited continent: the capitals, large
@@ -49,6 +50,9 @@ QNCORE_API std::vector<const City*> citiesLike(std::string_view name);
 /// @return those found by their name, then by a word, then by the country, each in the order of
 ///         cities(); where there is none, as citiesLike; for an empty text all cities
 QNCORE_API std::vector<const City*> citiesOf(std::string_view typed);
+
+/// The city whose middle is nearest to a place on the earth, on a sphere.
+QNCORE_API const City& nearestCity(double latitude_deg, double longitude_deg);
 
 /// "Athens, Greece", as findCity takes it; UTF-8.
 QNCORE_API std::string nameWithCountry(const City& city);

@@ -3,6 +3,8 @@
 #include "host/cities/CitySpelling.h"
 
 #include <algorithm>
+#include <cmath>
+#include <numbers>
 #include <optional>
 #include <string>
 
@@ -88,6 +90,15 @@ std::string namesOf(const std::vector<const City*>& cities) {
     return names;
 }
 
+/// Of the straight line between two places through a sphere: it grows with their distance.
+double squaredChord(const City& city, double latitude_deg, double longitude_deg) {
+    constexpr double RADIANS = std::numbers::pi / 180.0;
+    const double north = std::sin(0.5 * RADIANS * (city.latitude_deg - latitude_deg));
+    const double east = std::sin(0.5 * RADIANS * (city.longitude_deg - longitude_deg));
+    return north * north +
+           std::cos(RADIANS * city.latitude_deg) * std::cos(RADIANS * latitude_deg) * east * east;
+}
+
 } // namespace
 
 const City* findCity(std::string_view name) {
@@ -120,6 +131,12 @@ std::vector<const City*> citiesLike(std::string_view name) {
             result.push_back(suggestion.city);
     }
     return result;
+}
+
+const City& nearestCity(double latitude_deg, double longitude_deg) {
+    return *std::ranges::min_element(cities(), {}, [&](const City& city) {
+        return squaredChord(city, latitude_deg, longitude_deg);
+    });
 }
 
 std::string nameWithCountry(const City& city) {

@@ -22,7 +22,8 @@ const Places BELOW_HOST = {"kelmar/",        "sdk/",           "ground/",
 const Places BELOW_FRONT_END = BELOW_HOST + "host/border/";
 const Places BELOW_CITIES = BELOW_FRONT_END + "host/front_end/";
 const Places BELOW_SUN = BELOW_CITIES + "host/cities/";
-const Places BELOW_CURVES = BELOW_SUN + "host/sun/";
+const Places BELOW_CLOCK = BELOW_SUN + "host/sun/";
+const Places BELOW_CURVES = BELOW_CLOCK + "host/clock/";
 const Places BELOW_DOCUMENT = BELOW_CURVES + "host/curves/";
 const Places BELOW_APP = BELOW_DOCUMENT + "host/document/" + "host/reader/" + "host/recording/";
 const Places BELOW_PROMPT = BELOW_APP + "host/app/";
@@ -31,9 +32,9 @@ const Places BELOW_COMMANDS = BELOW_DIALOGS + "host/dialogs/" + "host/recovery/"
 const Places BELOW_SHARE = BELOW_COMMANDS + "host/commands/";
 const Places BELOW_SESSION = BELOW_SHARE + "host/share/";
 
-// What a program sees of the host: its door, what it implements itself, and the cities of the
-// world.
-const Places PROGRAM = {"sdk/", "host/session/", "host/front_end/", "host/cities/"};
+// What a program sees of the host: its door, what it implements itself, the cities of the world and
+// their clocks.
+const Places PROGRAM = {"sdk/", "host/session/", "host/front_end/", "host/cities/", "host/clock/"};
 
 const Places BELOW_SESSIONS = PROGRAM + "quarn/words/" + "quarn/terminal/";
 const Places BELOW_RUNS = PROGRAM + "quarn/words/" + "quarn/session/" + "quarn/scripts/";
@@ -67,6 +68,7 @@ const Room FLOORS[] = {
     {4, "host/front_end/", BELOW_FRONT_END},
     {4, "host/cities/", BELOW_CITIES},
     {4, "host/sun/", BELOW_SUN},
+    {4, "host/clock/", BELOW_CLOCK},
     {4, "host/curves/", BELOW_CURVES},
     {5, "host/document/", BELOW_DOCUMENT},
     {5, "host/reader/", BELOW_DOCUMENT},
