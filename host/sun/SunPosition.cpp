@@ -1,5 +1,6 @@
 #include "host/sun/SunPosition.h"
 
+#include <cmath>
 #include <erfa.h>
 #include <erfam.h>
 
@@ -11,6 +12,9 @@ namespace {
 /// 1800 and is expected to be some 440 in 2199 (F. Espenak and J. Meeus, Five Millennium Canon of
 /// Solar Eclipses, NASA/TP-2006-214141): the sun then stands a quarter of an arc-minute elsewhere.
 constexpr double earth_rotation_delay_s = 69.2;
+
+/// Julian day number of the midnight that began 1 January 1970.
+constexpr double EPOCH_JULIAN_DAY = 2440587.5;
 
 /// A moment of terrestrial time, in two parts so that no digits are lost.
 struct Moment {
@@ -29,6 +33,22 @@ struct Earth {
         eraEpv00(moment.day, moment.fraction, from_sun, from_barycentre);
     }
 };
+
+/// Universal time as the Julian day number of a midnight and a part of a day.
+struct UniversalTime {
+    double day;
+    double fraction;
+
+    explicit UniversalTime(std::chrono::sys_seconds utc) {
+        const auto midnight = std::chrono::floor<std::chrono::days>(utc);
+        day = EPOCH_JULIAN_DAY + static_cast<double>(midnight.time_since_epoch().count());
+        fraction = static_cast<double>((utc - midnight).count()) / ERFA_DAYSEC;
+    }
+};
+
+Moment momentOf(double ut_day, double ut_fraction) {
+    return {ut_day, ut_fraction + earth_rotation_delay_s / ERFA_DAYSEC};
+}
 
 /// What the sky of the site looks like at the moment: where the observer is and how the local
 /// horizon lies among the stars.
@@ -64,7 +84,7 @@ void naturalDirection(const Earth& earth, const eraASTROM& sky, double (&directi
 } // namespace
 
 SunPosition sunPosition(const SunSite& site, double ut_day, double ut_fraction) {
-    const Moment moment{ut_day, ut_fraction + earth_rotation_delay_s / ERFA_DAYSEC};
+    const Moment moment = momentOf(ut_day, ut_fraction);
     Earth earth(moment);
     eraASTROM sky = skyOf(site, moment, earth, eraEra00(ut_day, ut_fraction));
 
@@ -84,6 +104,37 @@ SunPosition sunPosition(const SunSite& site, double ut_day, double ut_fraction) 
     eraAtioq(right_ascension, declination, &sky, &azimuth, &zenith_distance, &unused[0], &unused[1],
              &unused[2]);
     return {azimuth * ERFA_DR2D, 90 - zenith_distance * ERFA_DR2D};
+}
+
+SunPosition sunPosition(const SunSite& site, std::chrono::sys_seconds utc) {
+    const UniversalTime time(utc);
+    return sunPosition(site, time.day, time.fraction);
+}
+
+double sunLongitude(std::chrono::sys_seconds utc) {
+    const UniversalTime time(utc);
+    const Moment moment = momentOf(time.day, time.fraction);
+    const Earth earth(moment);
+    double natural[3];
+    double speed[3]; // in units of that of light
+    double distance = 0;
+    for (int axis = 0; axis < 3; ++axis) {
+        natural[axis] = -earth.from_sun[0][axis];
+        speed[axis] = earth.from_barycentre[1][axis] * ERFA_AULT / ERFA_DAYSEC;
+    }
+    eraPn(natural, &distance, natural);
+    double proper[3];
+    eraAb(natural, speed, distance, std::sqrt(1 - eraPdp(speed, speed)), proper);
+
+    double nutation = 0;
+    double obliquity_change = 0;
+    eraNut00b(moment.day, moment.fraction, &nutation, &obliquity_change);
+    double equator[3][3];
+    eraPnm00b(moment.day, moment.fraction, equator);
+    eraRx(eraObl06(moment.day, moment.fraction) + obliquity_change, equator);
+    double of_date[3];
+    eraRxp(equator, proper, of_date);
+    return eraAnp(std::atan2(of_date[1], of_date[0])) * ERFA_DR2D;
 }
 
 } // namespace quarn

@@ -1,5 +1,9 @@
 #pragma once
 
+#include "sdk/qncore/QnExport.h"
+
+#include <chrono>
+
 namespace quarn {
 
 /// Where the sun's centre stands in the sky.
@@ -22,5 +26,13 @@ struct SunSite {
 /// @param ut_day       Julian day number of the midnight that `ut_fraction` counts from, UT1
 /// @param ut_fraction  days since then; may lie outside 0 to 1
 SunPosition sunPosition(const SunSite& site, double ut_day, double ut_fraction);
+
+/// The same at an instant of universal time.
+QNCORE_API SunPosition sunPosition(const SunSite& site, std::chrono::sys_seconds utc);
+
+/// The apparent longitude of the sun, as seen from the middle of the earth: 0 at the equinox of
+/// March, 90 at the solstice of June. The delay of the earth's rotation is that of sunPosition.
+/// @return degrees along the ecliptic of date, 0 up to but not including 360
+double sunLongitude(std::chrono::sys_seconds utc);
 
 } // namespace quarn
