@@ -31,6 +31,8 @@ constexpr Subcommand SUBCOMMANDS[] = {
     {"day", "Record the sun and the shadows through one day", DAY_FOOTER, addDay, SITE_FOOTER},
     {"season", "Record the sun and the shadows of one time of day through the seasons",
      SEASON_FOOTER, addSeason, SITE_FOOTER},
+    {"sunhours", "Tell how many hours of sun each place of a model gets", SUN_HOURS_FOOTER,
+     addSunHours},
     {"places", "List the cities that a sun study knows by name", PLACES_FOOTER, addPlaces},
     {"curves", "List what a camera can follow", CURVES_FOOTER, addCurves},
     {"record", "Record a document's animation, or a part of it; goes on where it was stopped",

@@ -30,7 +30,8 @@ const Places BELOW_PROMPT = BELOW_APP + "host/app/";
 const Places BELOW_DIALOGS = BELOW_PROMPT + "host/prompt/";
 const Places BELOW_COMMANDS = BELOW_DIALOGS + "host/dialogs/" + "host/recovery/";
 const Places BELOW_SHARE = BELOW_COMMANDS + "host/commands/";
-const Places BELOW_SESSION = BELOW_SHARE + "host/share/";
+const Places BELOW_SUN_HOURS = BELOW_SHARE + "host/share/";
+const Places BELOW_SESSION = BELOW_SUN_HOURS + "host/sunhours/";
 
 // What a program sees of the host: its door, what it implements itself, the cities of the world and
 // their clocks.
@@ -79,6 +80,7 @@ const Room FLOORS[] = {
     {8, "host/dialogs/", BELOW_DIALOGS},
     {9, "host/commands/", BELOW_COMMANDS},
     {9, "host/share/", BELOW_SHARE},
+    {9, "host/sunhours/", BELOW_SUN_HOURS},
     {10, "host/session/", BELOW_SESSION},
     {10, "host/cocoa/", INTERFACE + "ground/Result.h" + "host/front_end/", {}, any_and_cocoa},
 
