@@ -25,6 +25,8 @@ inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
   quarn sun --place NAME                       tell where the sun stands, and when it rises and sets
   quarn sunpath --place NAME --out FILE.svg
                                                draw the ways of the sun through a year
+  quarn sunhours MODEL --place NAME --date DATE --out DIR
+                                               tell how many hours of sun each place gets
   quarn places [TEXT]                          list the cities that a sun study knows by name
   quarn curves MODEL                           list what a camera can follow
   quarn frame DOC --number K --out FILE        write one frame of a saved animation
@@ -142,6 +144,25 @@ before the recording begins. Seconds are always 0.
 The recording's own page tells times by the whole hours of the longitude, without daylight saving.
 Those of a season count eastward, so that 105.18 W is UTC+16 there, the hour of UTC-8 with the next
 day's date. The list of frames, films and the page of --viewer tell those of the clocks on the wall.)";
+
+inline constexpr const char* SUN_HOURS_FOOTER = R"(
+Written into the folder, NAME being the model file's:
+  NAME-sunhours.png    the picture in colours, with title and legend, to print
+  NAME-sunhours.html   a page to read: the pointer tells the hours, a slider goes through the day
+  NAME-sunhours.npy    the hours of each pixel as 32-bit floats, for NumPy and others
+  NAME-sunhours.csv    of each object its area, the mean of its hours, and the share of its area
+                       that gets at least --threshold hours; and the same of what looks up
+  NAME-sunhours.ply    with --grid: all surfaces in small triangles, with colours and hours
+
+An hour counts where the side of a surface that is seen looks toward the sun, the sun's centre stands
+above the horizon, and nothing is between. Glass, less than half opaque or letting more than half of
+the light through, shades nothing and is looked through; everything else shades. Times are those of
+the clocks of the place, with daylight saving. Of several days the hours are the mean of a day.
+
+Examples:
+  quarn sunhours house.glb --place Athens --date 2026-03-21 --view plan --out out/hours
+  quarn sunhours house.glb --place Athens --date 2026-03-21 --from 09:00 --to 17:00 --isolines 1 --out out/day
+  quarn sunhours house.glb --place Athens --date 2026-01-01 --to-date 2026-12-31 --every-days 30 --every 30 --out out/year)";
 
 inline constexpr const char* RECORD_FOOTER = R"(
 The same command goes on where it was stopped or killed: frames that are whole stay, all others are

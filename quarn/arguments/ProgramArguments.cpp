@@ -34,6 +34,8 @@ constexpr Subcommand SUBCOMMANDS[] = {
     {"sun", "Tell where the sun stands, and when it rises and sets", SUN_FOOTER, addSun},
     {"sunpath", "Draw the ways of the sun through a year, and what hides them", SUNPATH_FOOTER,
      addSunPath},
+    {"sunhours", "Tell how many hours of sun each place of a model gets", SUN_HOURS_FOOTER,
+     addSunHours},
     {"places", "List the cities that a sun study knows by name", PLACES_FOOTER, addPlaces},
     {"curves", "List what a camera can follow", CURVES_FOOTER, addCurves},
     {"record", "Record a document's animation, or a part of it; goes on where it was stopped",

@@ -20,6 +20,7 @@ Action addFlythrough(CLI::App& command);
 Action addPath(CLI::App& command);
 Action addDay(CLI::App& command);
 Action addSeason(CLI::App& command);
+Action addSunHours(CLI::App& command);
 Action addRecord(CLI::App& command);
 Action addFinish(CLI::App& command);
 Action addFarm(CLI::App& command);

@@ -18,7 +18,7 @@ const Places BELOW_DISPLAY = BELOW_IMPORT + "engine/images/";
 // The host: each of its rooms sees all that stand above it here.
 const Places BELOW_HOST = {"kelmar/",        "sdk/",           "ground/",
                            "engine/scene/",  "engine/images/", "engine/display/",
-                           "engine/render/", "import/"};
+                           "engine/render/", "engine/sunhours/", "import/"};
 const Places BELOW_FRONT_END = BELOW_HOST + "host/border/";
 const Places BELOW_CITIES = BELOW_FRONT_END + "host/front_end/";
 const Places BELOW_SUN = BELOW_CITIES + "host/cities/";
@@ -30,7 +30,8 @@ const Places BELOW_PROMPT = BELOW_APP + "host/app/";
 const Places BELOW_DIALOGS = BELOW_PROMPT + "host/prompt/";
 const Places BELOW_COMMANDS = BELOW_DIALOGS + "host/dialogs/" + "host/recovery/";
 const Places BELOW_SHARE = BELOW_COMMANDS + "host/commands/";
-const Places BELOW_SESSION = BELOW_SHARE + "host/share/" + "host/sunpath/";
+const Places BELOW_SUN_HOURS = BELOW_SHARE + "host/share/";
+const Places BELOW_SESSION = BELOW_SUN_HOURS + "host/sunhours/" + "host/sunpath/";
 
 // What a program sees of the host: its door, what it implements itself, the cities of the world,
 // their sun, their clocks and the diagram of the sun's paths.
@@ -60,6 +61,7 @@ const Room FLOORS[] = {
     {2, "engine/images/", BELOW_IMPORT},
     {2, "engine/display/", BELOW_DISPLAY},
     {2, "engine/render/", BELOW_DISPLAY + "engine/display/"},
+    {2, "engine/sunhours/", BELOW_DISPLAY + "engine/display/"},
 
     {3, "import/", BELOW_IMPORT},
     {4, "reader/", BELOW_IMPORT + "import/"},
@@ -80,6 +82,7 @@ const Room FLOORS[] = {
     {8, "host/dialogs/", BELOW_DIALOGS},
     {9, "host/commands/", BELOW_COMMANDS},
     {9, "host/share/", BELOW_SHARE},
+    {9, "host/sunhours/", BELOW_SUN_HOURS},
     {10, "host/session/", BELOW_SESSION},
     {10, "host/cocoa/", INTERFACE + "ground/Result.h" + "host/front_end/", {}, any_and_cocoa},
 

@@ -117,7 +117,8 @@ void expectCommandWorks(const Workshop& workshop, const Words& arguments) {
         shown.push_back("--show-script");
         expectWorks(workshop, shown);
     }
-    const bool has_size = isRecording(arguments[0]) || arguments[0] == "frame";
+    const bool has_size =
+        isRecording(arguments[0]) || arguments[0] == "frame" || arguments[0] == "sunhours";
     expectWorks(workshop, has_size && !is_shown ? made(arguments) : arguments);
 }
 

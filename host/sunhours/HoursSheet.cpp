@@ -1,0 +1,191 @@
+#include "host/sunhours/HoursSheet.h"
+
+#include "host/sunhours/HourColors.h"
+
+#include <algorithm>
+#include <cmath>
+#include <cstdio>
+#include <numbers>
+
+namespace quarn {
+
+namespace {
+
+constexpr KM_Color INK{24, 26, 30, 255};
+constexpr KM_Color QUIET{92, 96, 102, 255};
+
+/// All lengths follow from the picture's, so that sheets of any size look alike.
+struct SheetSizes {
+    explicit SheetSizes(const Image& map)
+        : unit(std::max(8.0, 0.022 * std::sqrt(double(map.width) * map.height) * 0.8)),
+          margin(static_cast<int>(std::lround(1.5 * unit))),
+          head(static_cast<int>(std::lround(4.6 * unit))),
+          foot(static_cast<int>(std::lround(5.4 * unit))) {}
+    double unit; ///< height of the small text
+    int margin;
+    int head;
+    int foot;
+};
+
+std::string hoursText(double hours) {
+    const int minutes = static_cast<int>(std::lround(60.0 * hours));
+    std::string text = std::to_string(minutes / 60) + " h";
+    if (minutes % 60 != 0)
+        text += " " + std::to_string(minutes % 60) + " min";
+    return text;
+}
+
+std::string dayText(const std::chrono::year_month_day& day) {
+    constexpr const char* MONTHS[] = {"January",   "February", "March",    "April",
+                                      "May",       "June",     "July",     "August",
+                                      "September", "October",  "November", "December"};
+    return std::to_string(static_cast<unsigned>(day.day())) + " " +
+           MONTHS[static_cast<unsigned>(day.month()) - 1] + " " +
+           std::to_string(static_cast<int>(day.year()));
+}
+
+std::string timeText(std::chrono::minutes time) {
+    char text[16];
+    std::snprintf(text, sizeof text, "%02d:%02d", static_cast<int>(time.count() / 60),
+                  static_cast<int>(time.count() % 60));
+    return text;
+}
+
+Image whiteSheet(int width, int height) {
+    Image sheet;
+    sheet.resize(width, height);
+    std::ranges::fill(sheet.rgba, std::uint8_t{255});
+    return sheet;
+}
+
+void fillBox(Image& sheet, int left, int top, int right, int bottom, KM_Color color) {
+    for (int y = top; y < bottom; ++y)
+        for (int x = left; x < right; ++x)
+            cover(sheet, x, y, color, 1.0);
+}
+
+void layMap(Image& sheet, const Image& map, int left, int top) {
+    for (int y = 0; y < map.height; ++y)
+        for (int x = 0; x < map.width; ++x) {
+            const auto pixel = map.pixel(x, y);
+            cover(sheet, left + x, top + y, {pixel[0], pixel[1], pixel[2], 255}, 1.0);
+        }
+}
+
+/// The size that lets a text fit, at most the one that is wished.
+double fittingSize(const TextPainter& text, const std::string& words, double size, double room) {
+    const double width = text.width(words, size);
+    return width > room ? size * room / width : size;
+}
+
+/// A bar of the colours with its hours below.
+void drawLegend(Image& sheet, const SheetSizes& sizes, int top, const SunHoursRequest& request,
+                const SunMoments& moments, const TextPainter& text) {
+    const int left = sizes.margin;
+    const int width = sheet.width - 2 * sizes.margin;
+    const int height = static_cast<int>(std::lround(0.9 * sizes.unit));
+    const double end = endOfScale(moments.hours);
+    for (int x = 0; x < width; ++x)
+        fillBox(sheet, left + x, top, left + x + 1, top + height, viridis((x + 0.5) / width));
+    const double room = text.width("24 h", sizes.unit) * 1.6;
+    int step = 1;
+    while (width / end * step < room)
+        ++step;
+    for (int hour = 0; hour <= static_cast<int>(end); hour += step) {
+        const int x = left + static_cast<int>(std::lround(width * hour / end));
+        const int tick = std::min(x, left + width - 1);
+        fillBox(sheet, tick, top + height, tick + 1, top + height + height / 3, INK);
+        const std::string label = std::to_string(hour) + (hour == 0 ? "" : " h");
+        const double across = text.width(label, sizes.unit);
+        text.draw(sheet, std::clamp(x - 0.5 * across, double(left), left + width - across),
+                  top + height + 1.35 * sizes.unit, label, sizes.unit, INK);
+    }
+    const std::string words = std::string("Hours of direct sun") +
+                              (moments.days > 1 ? " a day, mean of the days" : "") + "; " +
+                              errorText(request) + ". Colours: viridis.";
+    text.draw(sheet, left, top + height + 2.9 * sizes.unit, words,
+              fittingSize(text, words, 0.85 * sizes.unit, width), QUIET);
+}
+
+/// A needle in a ring, whose filled half points north.
+void drawNorth(Image& sheet, double x, double y, double radius, double north_deg,
+               const TextPainter& text) {
+    const double angle = north_deg * std::numbers::pi / 180.0;
+    const double nx = std::sin(angle);
+    const double ny = -std::cos(angle);
+    const int reach = static_cast<int>(std::ceil(radius)) + 2;
+    for (int j = -reach; j <= reach; ++j)
+        for (int i = -reach; i <= reach; ++i) {
+            constexpr int FINE = 4;
+            int ring = 0;
+            int needle = 0;
+            for (int s = 0; s < FINE * FINE; ++s) {
+                const double px = i + (s % FINE + 0.5) / FINE - 0.5;
+                const double py = j + (s / FINE + 0.5) / FINE - 0.5;
+                const double along = (px * nx + py * ny) / radius;
+                const double across = std::abs(px * ny - py * nx) / radius;
+                const double far = std::hypot(px, py) / radius;
+                ring += far > 0.95 && far < 1.03;
+                needle += along > -0.55 && along < 0.85 && across < 0.30 * (0.85 - along) / 1.4 &&
+                          across > 0.5 * (-0.25 - along);
+            }
+            const int px = static_cast<int>(std::lround(x)) + i;
+            const int py = static_cast<int>(std::lround(y)) + j;
+            cover(sheet, px, py, INK, double(std::max(ring, needle)) / (FINE * FINE));
+        }
+    const double size = 0.75 * radius;
+    text.draw(sheet, x + 1.45 * radius * nx - 0.5 * text.width("N", size),
+              y + 1.45 * radius * ny + 0.36 * size, "N", size, INK);
+}
+
+} // namespace
+
+std::string daysText(const SunHoursRequest& request) {
+    if (request.last_day == request.first_day)
+        return dayText(request.first_day);
+    return dayText(request.first_day) + " to " + dayText(request.last_day) +
+           (request.every_days > 1 ? ", every " + std::to_string(request.every_days) + " days"
+                                   : "");
+}
+
+std::string errorText(const SunHoursRequest& request) {
+    const int half = (request.every_minutes + 1) / 2;
+    return "steps of " + std::to_string(request.every_minutes) +
+           " minutes, each begin and end of sun is known to " + std::to_string(half) + " min";
+}
+
+std::string subtitleOf(const SunHoursRequest& request, const SunMoments& moments) {
+    std::string text = request.place.empty() ? "" : request.place + " · ";
+    text += daysText(request);
+    if (request.from || request.to)
+        text += " · " + timeText(request.from.value_or(std::chrono::minutes(0))) + " to " +
+                timeText(request.to.value_or(std::chrono::hours(24)));
+    if (!moments.moments.empty())
+        text += " (" + request.zone.at(moments.moments.front().time).abbreviation + ")";
+    text += " · at most " + hoursText(moments.hours);
+    return text;
+}
+
+Image sheetOf(const Image& map, const SunHoursRequest& request, const SunMoments& moments,
+              const TextPainter& text) {
+    const SheetSizes sizes(map);
+    Image sheet = whiteSheet(map.width + 2 * sizes.margin, map.height + sizes.head + sizes.foot);
+    layMap(sheet, map, sizes.margin, sizes.head);
+    const double room = map.width - 4.5 * sizes.unit; // the arrow stands beside them
+    const std::string title = "Hours of sun · " + request.title;
+    text.draw(sheet, sizes.margin, 2.2 * sizes.unit, title,
+              fittingSize(text, title, 1.55 * sizes.unit, room), INK);
+    const std::string subtitle = subtitleOf(request, moments);
+    text.draw(sheet, sizes.margin, 3.8 * sizes.unit, subtitle,
+              fittingSize(text, subtitle, sizes.unit, room), QUIET);
+    drawLegend(sheet, sizes, sizes.head + map.height + static_cast<int>(sizes.unit), request,
+               moments, text);
+    if (request.is_plan) {
+        const double radius = 1.1 * sizes.unit;
+        drawNorth(sheet, sizes.margin + map.width - 1.8 * radius, 2.6 * sizes.unit, radius,
+                  request.north_deg, text);
+    }
+    return sheet;
+}
+
+} // namespace quarn

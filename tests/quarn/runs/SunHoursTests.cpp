@@ -1,0 +1,83 @@
+#include "tests/quarn/Studio.h"
+
+#include <gmock/gmock.h>
+
+#include <fstream>
+#include <sstream>
+
+namespace quarn::test {
+namespace {
+
+using testing::HasSubstr;
+
+Start sunHours(const Studio& studio, const std::vector<std::string>& options) {
+    Start start;
+    start.folder = studio.path();
+    start.arguments = {"sunhours", "house.obj", "--out", "out", "--size", "96x64"};
+    start.arguments.insert(start.arguments.end(), options.begin(), options.end());
+    return start;
+}
+
+std::string textOf(const std::filesystem::path& file) {
+    std::ifstream stream(file, std::ios::binary);
+    std::ostringstream text;
+    text << stream.rdbuf();
+    return text.str();
+}
+
+TEST(SunHoursTests, PlanOfADayIsAPictureAPageNumbersAndATable) {
+    const Studio studio;
+    const Ended ended = run(sunHours(
+        studio, {"--place", "Athens", "--date", "2026-03-21", "--view", "plan", "--grid", "0.5"}));
+    ASSERT_EQ(ended.exit_code, 0) << ended.err;
+    EXPECT_THAT(ended.out, HasSubstr("known to 5 min"));
+    for (const char* const extension : {"png", "npy", "csv", "html", "ply"})
+        EXPECT_GT(std::filesystem::file_size(studio / "out" /
+                                             (std::string("house-sunhours.") + extension)),
+                  60U)
+            << extension;
+    const std::string page = textOf(studio / "out/house-sunhours.html");
+    EXPECT_THAT(page, HasSubstr("Athens, Greece"));
+    EXPECT_THAT(page, HasSubstr("\"12:00 EET\""));
+    EXPECT_EQ(page.find("{{"), page.npos);
+    EXPECT_THAT(textOf(studio / "out/house-sunhours.csv"), HasSubstr("share_from_2_hours"));
+}
+
+TEST(SunHoursTests, PolarNightIsToldAndHasNoHours) {
+    const Studio studio;
+    const Ended ended = run(sunHours(studio, {"--latitude", "78.2", "--longitude", "15.6", "--date",
+                                              "2026-12-21", "--view", "plan"}));
+    ASSERT_EQ(ended.exit_code, 0) << ended.err;
+    EXPECT_THAT(ended.out, HasSubstr("The sun does not rise there in this time"));
+    EXPECT_THAT(textOf(studio / "out/house-sunhours.csv"), HasSubstr(",0.000,0.0000,"));
+}
+
+TEST(SunHoursTests, MistakesAreToldBeforeAnythingIsRead) {
+    const Studio studio;
+    const auto misuse = [&](std::vector<std::string> options) {
+        options.insert(options.end(), {"--place", "Athens"});
+        const Ended ended = run(sunHours(studio, options));
+        EXPECT_EQ(ended.exit_code, 2) << ended.err;
+        return ended.err;
+    };
+    EXPECT_THAT(misuse({"--date", "2026-02-30"}), HasSubstr("a day of the calendar"));
+    EXPECT_THAT(misuse({"--date", "2026-03-21", "--every", "0"}), HasSubstr("--every"));
+    EXPECT_THAT(misuse({"--date", "2026-03-21", "--from", "15:00", "--to", "09:00"}),
+                HasSubstr("--to is not after --from"));
+    EXPECT_THAT(misuse({"--date", "2026-03-21", "--to-date", "2026-03-20"}),
+                HasSubstr("is before --date"));
+    EXPECT_THAT(misuse({"--date", "2026-03-21", "--zone", "Europe/Nowhere"}), HasSubstr("--zone"));
+    EXPECT_FALSE(std::filesystem::exists(studio / "out"));
+}
+
+TEST(SunHoursTests, ModelWithoutSurfacesIsRefusedAndWritesNothing) {
+    const Studio studio;
+    std::ofstream(studio / "house.obj") << "v 0 0 0\nv 1 1 0\nl 1 2\n";
+    const Ended ended =
+        run(sunHours(studio, {"--place", "Athens", "--date", "2026-03-21", "--view", "plan"}));
+    EXPECT_EQ(ended.exit_code, 1);
+    EXPECT_FALSE(std::filesystem::exists(studio / "out/house-sunhours.png"));
+}
+
+} // namespace
+} // namespace quarn::test
