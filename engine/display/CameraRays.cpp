@@ -107,4 +107,9 @@ CameraRays cameraRays(const KM_Viewport& viewport, int width, int height,
     return rays;
 }
 
+double depthOf(const CameraRays& rays, const KM_3dPoint& p) {
+    return (rays.eye[0] - p.x) * rays.camera_z[0] + (rays.eye[1] - p.y) * rays.camera_z[1] +
+           (rays.eye[2] - p.z) * rays.camera_z[2];
+}
+
 } // namespace quarn

@@ -1,5 +1,6 @@
 #pragma once
 
+class KM_3dPoint;
 class KM_BoundingBox;
 class KM_Viewport;
 
@@ -45,5 +46,8 @@ struct CameraRays {
 /// @param scene     the box that must lie in front of the origins of a parallel view; may be empty
 CameraRays cameraRays(const KM_Viewport& viewport, int width, int height,
                       const KM_BoundingBox& scene);
+
+/// How far a point lies before `eye`, along the view direction.
+double depthOf(const CameraRays& rays, const KM_3dPoint& point);
 
 } // namespace quarn

@@ -28,12 +28,6 @@ float radians(float degrees) {
     return degrees * std::numbers::pi_v<float> / 180.0F;
 }
 
-void set(float (&to)[3], const LinearColor& color) {
-    to[0] = color.r;
-    to[1] = color.g;
-    to[2] = color.b;
-}
-
 void setVector(float (&to)[3], const KM_3dVector& v) {
     to[0] = static_cast<float>(v.x);
     to[1] = static_cast<float>(v.y);
@@ -43,7 +37,7 @@ void setVector(float (&to)[3], const KM_3dVector& v) {
 FrameLight frameLight(const DirectionalLight& light) {
     FrameLight result{};
     std::copy_n(light.toward, 3, result.toward);
-    set(result.color, light.color);
+    setChannels(result.color, light.color);
     result.shadow = light.shadow;
     return result;
 }
@@ -68,7 +62,7 @@ FrameSoftBox frameSoftBox(const SoftBox& box) {
     result.half_width = std::tan(radians(box.half_width_deg));
     result.half_height = std::tan(radians(box.half_height_deg));
     result.border = box.border;
-    set(result.color, box.color);
+    setChannels(result.color, box.color);
     return result;
 }
 
@@ -81,7 +75,7 @@ void setSoftBoxes(FrameSetup& frame, const std::vector<SoftBox>& boxes) {
 FrameLamp frameLamp(const Lamp& lamp, const KM_3dPoint& origin, float size) {
     FrameLamp result{};
     setVector(result.place, lamp.place - origin);
-    set(result.color, lamp.color);
+    setChannels(result.color, lamp.color);
     setVector(result.axis, lamp.axis);
     const float outer = std::cos(radians(SPOT_OUTER_DEG));
     result.cone_slope = lamp.is_spot ? 1.0F / (std::cos(radians(SPOT_INNER_DEG)) - outer) : 0.0F;
@@ -103,14 +97,14 @@ void setLamps(FrameSetup& frame, std::vector<Lamp> lamps, const DisplayScene& sc
 }
 
 void setSky(FrameSetup& frame, const Lighting& lighting) {
-    set(frame.sky_horizon, lighting.sky.horizon);
-    set(frame.sky_side, lighting.sky.side);
-    set(frame.sky_zenith, lighting.sky.zenith);
-    set(frame.sky_nadir, lighting.sky.nadir);
-    set(frame.sky_glow, lighting.sky.glow);
+    setChannels(frame.sky_horizon, lighting.sky.horizon);
+    setChannels(frame.sky_side, lighting.sky.side);
+    setChannels(frame.sky_zenith, lighting.sky.zenith);
+    setChannels(frame.sky_nadir, lighting.sky.nadir);
+    setChannels(frame.sky_glow, lighting.sky.glow);
     // In a parallel view all rays look the same way: the disc would fill the picture.
     if (!frame.rays.parallel)
-        set(frame.sky_disc, lighting.sky.disc);
+        setChannels(frame.sky_disc, lighting.sky.disc);
     std::copy_n(lighting.sky.toward_sun, 3, frame.toward_sun);
 }
 
@@ -143,7 +137,7 @@ void placeGround(FrameSetup& frame) {
     frame.ground_fade_start = 1.5F * reach; // far enough for the long shadows of a low sun
     frame.ground_fade_end = 12.0F * reach;
     frame.ground_eye = GROUND_EYE_OF_REACH * frame.ground_fade_start;
-    set(frame.ground_albedo, {0.49F, 0.48F, 0.455F});
+    setChannels(frame.ground_albedo, {0.49F, 0.48F, 0.455F});
     // Far ground lies in the haze of the horizon, so that both meet without a line.
     std::copy_n(frame.sky_horizon, 3, frame.sky_nadir);
 }
@@ -160,8 +154,8 @@ void setGroundLight(FrameSetup& frame) {
 
 void setGradient(FrameSetup& frame, const KM_Color& top, const KM_Color& bottom, float exposure) {
     const auto setEnd = [exposure](float(&light)[3], float(&shown)[3], const KM_Color& color) {
-        set(light, sceneLightShownAs(color));
-        set(shown, linearFromColor(color));
+        setChannels(light, sceneLightShownAs(color));
+        setChannels(shown, linearFromColor(color));
         if (exposure == 1.0F)
             return;
         for (int c = 0; c < 3; ++c) {
@@ -201,10 +195,11 @@ void setLighting(FrameSetup& frame, const DisplayScene& scene, const KM_Viewport
         placeGround(frame);
     if (mode.surface_style == SurfaceStyle::clay) {
         frame.sky_reach = SKY_REACH_OF_CLAY * frame.scene_size;
-        set(frame.ground_albedo, {0.72F, 0.72F, 0.72F});
+        setChannels(frame.ground_albedo, {0.72F, 0.72F, 0.72F});
     }
     if (surroundings == Surroundings::studio)
-        set(frame.ground_albedo, {STUDIO_FLOOR_ALBEDO, STUDIO_FLOOR_ALBEDO, STUDIO_FLOOR_ALBEDO});
+        setChannels(frame.ground_albedo,
+                    {STUDIO_FLOOR_ALBEDO, STUDIO_FLOOR_ALBEDO, STUDIO_FLOOR_ALBEDO});
     setBackground(frame, scene.light(), mode, surroundings);
     if (mode.surface_style == SurfaceStyle::studio)
         std::copy_n(frame.background_bottom, 3, frame.ground_light);

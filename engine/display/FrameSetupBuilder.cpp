@@ -15,12 +15,6 @@ namespace quarn {
 
 namespace {
 
-void set(float (&to)[3], const LinearColor& color) {
-    to[0] = color.r;
-    to[1] = color.g;
-    to[2] = color.b;
-}
-
 void setPoint(float (&to)[3], const KM_3dPoint& point) {
     to[0] = static_cast<float>(point.x);
     to[1] = static_cast<float>(point.y);
@@ -82,9 +76,9 @@ void setStyle(FrameSetup& frame, SurfaceStyle style, const RayScene& rays) {
     if (style == SurfaceStyle::clay || style == SurfaceStyle::x_ray || style == SurfaceStyle::paper)
         frame.base_colors = false;
     if (style == SurfaceStyle::clay)
-        set(frame.plain_albedo, {0.86F, 0.86F, 0.86F});
+        setChannels(frame.plain_albedo, {0.86F, 0.86F, 0.86F});
     if (style == SurfaceStyle::x_ray)
-        set(frame.plain_albedo, {0.42F, 0.58F, 0.76F});
+        setChannels(frame.plain_albedo, {0.42F, 0.58F, 0.76F});
 }
 
 } // namespace

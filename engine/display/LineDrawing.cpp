@@ -27,11 +27,6 @@ bool wantsEdges(const DisplayModeAttributes& mode) {
     return mode.draws_edges || mode.draws_all_edges || mode.draws_outlines;
 }
 
-double depthOf(const CameraRays& rays, const KM_3dPoint& p) {
-    return (rays.eye[0] - p.x) * rays.camera_z[0] + (rays.eye[1] - p.y) * rays.camera_z[1] +
-           (rays.eye[2] - p.z) * rays.camera_z[2];
-}
-
 /// How near the nearest and the farthest part of a mesh are, in the measure of DepthImage.
 struct NearnessRange {
     float nearest;

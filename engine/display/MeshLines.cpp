@@ -10,15 +10,6 @@
 
 namespace quarn {
 
-namespace {
-
-double depthOf(const CameraRays& rays, const KM_3dPoint& p) {
-    return (rays.eye[0] - p.x) * rays.camera_z[0] + (rays.eye[1] - p.y) * rays.camera_z[1] +
-           (rays.eye[2] - p.z) * rays.camera_z[2];
-}
-
-} // namespace
-
 DepthFade::DepthFade(float strength, float far_strength, const CameraRays& rays,
                      const KM_BoundingBox& box)
     : m_strength(strength), m_far_depth(rays.far_depth), m_parallel(rays.parallel) {

@@ -24,10 +24,6 @@ constexpr float LIGHT_AT_CAMERA = 0.6F;
 /// More would end the range of numbers.
 constexpr double MOST_STOPS = 30.0;
 
-LinearColor scaled(const LinearColor& c, float s) {
-    return {c.r * s, c.g * s, c.b * s};
-}
-
 /// Light without colour, more of it from the sky and less from the suns, so that shadows are soft:
 /// a model of plaster in a room with large windows.
 Lighting clayLighting(Lighting lighting) {

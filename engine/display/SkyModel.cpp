@@ -11,10 +11,6 @@ LinearColor mix(const LinearColor& a, const LinearColor& b, float t) {
     return {a.r + t * (b.r - a.r), a.g + t * (b.g - a.g), a.b + t * (b.b - a.b)};
 }
 
-LinearColor scaled(const LinearColor& c, float s) {
-    return {c.r * s, c.g * s, c.b * s};
-}
-
 float smoothStep(float from, float to, float x) {
     const float t = std::clamp((x - from) / (to - from), 0.0F, 1.0F);
     return t * t * (3.0F - 2.0F * t);

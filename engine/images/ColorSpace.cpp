@@ -75,6 +75,16 @@ float sceneLightShownAs(float shown) {
            shoulder_height * std::log(1.0F - (value - shoulder_start) / shoulder_height);
 }
 
+LinearColor scaled(const LinearColor& color, float by) {
+    return {color.r * by, color.g * by, color.b * by};
+}
+
+void setChannels(float (&to)[3], const LinearColor& color) {
+    to[0] = color.r;
+    to[1] = color.g;
+    to[2] = color.b;
+}
+
 float brightnessOf(const LinearColor& color) {
     return 0.2126F * color.r + 0.7152F * color.g + 0.0722F * color.b;
 }

@@ -50,6 +50,9 @@ struct LinearColor {
     float b = 0.0F;
 };
 
+LinearColor scaled(const LinearColor& color, float by);
+void setChannels(float (&to)[3], const LinearColor& color);
+
 /// The luminance of linear light by ITU-R BT.709.
 float brightnessOf(const LinearColor& color);
 

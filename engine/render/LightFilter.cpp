@@ -23,7 +23,7 @@ constexpr float own_part = 0.6F;
 /// From so many on a pixel's own variance is sure enough.
 constexpr int many_samples = 32;
 
-template <class Work> void forRows(const RenderLayers& layers, const Work& work) {
+template <class Work> void forEachRow(const RenderLayers& layers, const Work& work) {
     tbb::parallel_for(0, layers.height(), [&](int y) { work(y); });
 }
 
@@ -58,7 +58,7 @@ LightFilter::LightFilter(const RenderLayers& layers, float parallel_scene_size,
 }
 
 void LightFilter::readGuides() {
-    forRows(m_layers, [&](int y) {
+    forEachRow(m_layers, [&](int y) {
         for (int x = 0; x < m_layers.width(); ++x) {
             const float cover = m_layers.at(RenderPlane::cover, x, y);
             float normal[3];
@@ -80,7 +80,7 @@ void LightFilter::readGuides() {
 void LightFilter::readSlopes() {
     const int last_x = m_layers.width() - 1;
     const int last_y = m_layers.height() - 1;
-    forRows(m_layers, [&](int y) {
+    forEachRow(m_layers, [&](int y) {
         const float* const near = m_nearness.row(y);
         const std::ptrdiff_t stride = m_nearness.stride();
         for (int x = 0; x <= last_x; ++x) {
@@ -97,7 +97,7 @@ void LightFilter::readSlopes() {
 }
 
 void LightFilter::readLight(const LightSums& kind, LightImage& image, PixelPlane& variance) const {
-    forRows(m_layers, [&](int y) {
+    forEachRow(m_layers, [&](int y) {
         for (int x = 0; x < m_layers.width(); ++x) {
             const int samples = m_layers.samplesAt(x, y);
             const float cover = m_layers.at(RenderPlane::cover, x, y);
@@ -125,7 +125,7 @@ void LightFilter::readLight(const LightSums& kind, LightImage& image, PixelPlane
 /// Neighbours know better than a pixel alone how far its samples scatter, all the more the fewer
 /// these are.
 void LightFilter::smoothVariance(const PixelPlane& from, PixelPlane& to) const {
-    forRows(m_layers, [&](int y) {
+    forEachRow(m_layers, [&](int y) {
         for (int x = 0; x < m_layers.width(); ++x) {
             const int reach = m_layers.samplesAt(x, y) < many_samples ? 3 : 1;
             float sum = 0.0F;
@@ -179,7 +179,7 @@ void LightFilter::pass(int step, std::span<const LightSums> kinds) {
 }
 
 void LightFilter::takeFitOut(LightImage& image) const {
-    forRows(m_layers, [&](int y) {
+    forEachRow(m_layers, [&](int y) {
         for (int c = 0; c < 3; ++c)
             for (int x = 0; x < m_layers.width(); ++x)
                 image.color[c].row(y)[x] -= m_fitted[c].row(y)[x];
@@ -187,7 +187,7 @@ void LightFilter::takeFitOut(LightImage& image) const {
 }
 
 void LightFilter::addFit(LightImage& image) const {
-    forRows(m_layers, [&](int y) {
+    forEachRow(m_layers, [&](int y) {
         for (int c = 0; c < 3; ++c)
             for (int x = 0; x < m_layers.width(); ++x) {
                 float& light = image.color[c].row(y)[x];

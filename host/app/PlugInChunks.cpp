@@ -14,7 +14,7 @@ namespace quarn {
 
 namespace {
 
-std::string nameOf(const CQuarnPlugIn& plug_in) {
+std::string nameOfPlugIn(const CQuarnPlugIn& plug_in) {
     const auto name = acrossBorder([&] { return plug_in.PlugInName(); });
     return name && name.value() ? KM_wString(name.value()).ToUtf8() : std::string("a plug-in");
 }
@@ -95,7 +95,7 @@ Result<std::vector<PlugInContent>> plugInContents(Application& application, Docu
     for (const LoadedPlugIn& loaded : application.plugIns().loaded()) {
         auto content = written(loaded, document, options);
         if (!content)
-            return Error{"what " + nameOf(*loaded.plug_in) +
+            return Error{"what " + nameOfPlugIn(*loaded.plug_in) +
                          " keeps in it cannot be written: " + content.message()};
         if (content.value())
             contents.push_back(std::move(*content.value()));
@@ -130,7 +130,7 @@ PlugInReading readPlugInContents(Application& application, Document& document,
         }
         if (is_own_file)
             remainder.keep(content);
-        reading.warnings.push_back("What " + nameOf(*plug_in) +
+        reading.warnings.push_back("What " + nameOfPlugIn(*plug_in) +
                                    " keeps in the file cannot be read: " + done.message() +
                                    ". The rest of the file is there.");
     }

@@ -9,28 +9,28 @@ namespace quarn {
 
 namespace {
 
-using json = nlohmann::json;
+using RecordingJson = nlohmann::json;
 
 constexpr const char* format_name = "quarn-recording";
 constexpr int format_version = 2;
 
 // ---- To JSON
 
-json jsonOf(const FrameSet& frames) {
-    json ranges = json::array();
+RecordingJson jsonOf(const FrameSet& frames) {
+    RecordingJson ranges = RecordingJson::array();
     for (const FrameSet::Range& range : frames.ranges())
         ranges.push_back({range.first, range.last});
     return ranges;
 }
 
-json jsonOf(const PicturesByExtension& pictures) {
-    json object = json::object();
+RecordingJson jsonOf(const PicturesByExtension& pictures) {
+    RecordingJson object = RecordingJson::object();
     for (const auto& [extension, frames] : pictures)
         object[extension] = jsonOf(frames);
     return object;
 }
 
-json jsonOf(const RecordingSettings& settings) {
+RecordingJson jsonOf(const RecordingSettings& settings) {
     return {{"kind", settings.kind},
             {"frames", settings.frames},
             {"width_px", settings.width_px},
@@ -40,14 +40,14 @@ json jsonOf(const RecordingSettings& settings) {
             {"jpeg_quality", settings.jpeg_quality}};
 }
 
-json jsonOf(const RecordingFingerprint& fingerprint) {
+RecordingJson jsonOf(const RecordingFingerprint& fingerprint) {
     return {{"program", fingerprint.program},
             {"document", fingerprint.document},
             {"settings", fingerprint.settings},
             {"instructions", fingerprint.instructions}};
 }
 
-json jsonOf(const RecordingFile& recording) {
+RecordingJson jsonOf(const RecordingFile& recording) {
     return {{"format", format_name},
             {"version", format_version},
             {"name", recording.animation},
@@ -67,10 +67,10 @@ json jsonOf(const RecordingFile& recording) {
 
 // ---- From JSON. What has another type than it should throws, which ends in parseRecording.
 
-FrameSet framesOf(const json& ranges) {
+FrameSet framesOf(const RecordingJson& ranges) {
     FrameSet frames;
     int before = -1;
-    for (const json& range : ranges) {
+    for (const RecordingJson& range : ranges) {
         const int first = intOf(range.at(0));
         const int last = intOf(range.at(1));
         if (first <= before || first > last)
@@ -81,14 +81,14 @@ FrameSet framesOf(const json& ranges) {
     return frames;
 }
 
-PicturesByExtension picturesOf(const json& object) {
+PicturesByExtension picturesOf(const RecordingJson& object) {
     PicturesByExtension pictures;
     for (const auto& [extension, frames] : object.items())
         pictures[extension] = framesOf(frames);
     return pictures;
 }
 
-RecordingSettings settingsOf(const json& object) {
+RecordingSettings settingsOf(const RecordingJson& object) {
     return {object.at("kind"),
             intOf(object.at("frames")),
             intOf(object.at("width_px")),
@@ -98,16 +98,16 @@ RecordingSettings settingsOf(const json& object) {
             object.contains("jpeg_quality") ? intOf(object["jpeg_quality"]) : 0};
 }
 
-RecordingFingerprint fingerprintOf(const json& object) {
+RecordingFingerprint fingerprintOf(const RecordingJson& object) {
     return {object.at("program"), object.at("document"), object.at("settings"),
             object.at("instructions")};
 }
 
-RecordingFile recordingOf(const json& object) {
+RecordingFile recordingOf(const RecordingJson& object) {
     RecordingFile recording;
     recording.animation = object.at("name");
     recording.is_running = object.at("state") == "recording";
-    const json& writer = object.at("writer");
+    const RecordingJson& writer = object.at("writer");
     recording.writer = {writer.at("host"), intOf(writer.at("pid")),
                         integerOf<std::uint64_t>(writer.at("started"))};
     recording.settings = settingsOf(object.at("settings"));
@@ -148,13 +148,13 @@ constexpr std::uintmax_t largest_file_bytes = 64'000'000;
 
 Result<RecordingFile> parseRecordingFile(std::string_view text, const std::filesystem::path& file) {
     try {
-        const json object = json::parse(text);
+        const RecordingJson object = RecordingJson::parse(text);
         if (object.at("format") != format_name)
             return notARecording(file);
         if (integerOf<std::int64_t>(object.at("version")) > format_version)
             return ofALaterVersion(file);
         return recordingOf(object);
-    } catch (const json::exception&) {
+    } catch (const RecordingJson::exception&) {
         return notARecording(file);
     } catch (const std::out_of_range&) {
         return notARecording(file);
@@ -162,7 +162,7 @@ Result<RecordingFile> parseRecordingFile(std::string_view text, const std::files
 }
 
 std::string recordingFileText(const RecordingFile& recording) {
-    return jsonOf(recording).dump(2, ' ', false, json::error_handler_t::replace) + "\n";
+    return jsonOf(recording).dump(2, ' ', false, RecordingJson::error_handler_t::replace) + "\n";
 }
 
 Result<std::optional<RecordingFile>> readRecordingFile(const std::filesystem::path& file) {

@@ -12,7 +12,7 @@ namespace {
 
 // "Draco 3D Data Compression", bitstream specification 2.2, sections 3 and 4: a head of 11 bytes,
 // then the counts of the mesh.
-constexpr std::size_t HEAD = 11;
+constexpr std::size_t HEADER_BYTES = 11;
 constexpr std::uint8_t EDGE_BREAKER = 1;
 constexpr std::uint8_t HAS_METADATA = 0x80; // in the higher byte of the flags
 
@@ -30,14 +30,14 @@ std::optional<std::uint64_t> takeVarint(Bytes& bytes) {
 
 /// The library asks for memory by these counts before it has seen what they count.
 std::string whyBadCounts(Bytes bytes, const DracoLimits& limits) {
-    if (bytes.size() < HEAD + 1 || std::memcmp(bytes.data(), "DRACO", 5) != 0)
+    if (bytes.size() < HEADER_BYTES + 1 || std::memcmp(bytes.data(), "DRACO", 5) != 0)
         return "they are of another kind";
     if (bytes[5] != 2 || bytes[6] < 2)
         return "they are of another version";
-    if ((bytes[HEAD - 1] & HAS_METADATA) != 0)
+    if ((bytes[HEADER_BYTES - 1] & HAS_METADATA) != 0)
         return "they hold more than a mesh";
     const bool is_edge_breaker = bytes[8] == EDGE_BREAKER;
-    bytes = bytes.subspan(HEAD + (is_edge_breaker ? 1 : 0));
+    bytes = bytes.subspan(HEADER_BYTES + (is_edge_breaker ? 1 : 0));
     const auto first = takeVarint(bytes);
     const auto second = takeVarint(bytes);
     if (!first || !second)

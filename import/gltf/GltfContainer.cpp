@@ -11,7 +11,7 @@ namespace quarn::gltf {
 namespace {
 
 // Khronos Group, glTF 2.0, section 4.4: a head of 12 bytes, then chunks with heads of 8.
-constexpr std::size_t HEAD = 12;
+constexpr std::size_t GLB_HEADER = 12;
 constexpr std::size_t CHUNK_HEAD = 8;
 constexpr std::uint32_t JSON_CHUNK = 0x4E4F534A;
 constexpr std::uint32_t BINARY_CHUNK = 0x004E4942;
@@ -41,7 +41,7 @@ Result<Chunk> chunkAt(Bytes file, std::size_t at) {
 }
 
 Result<Container> takeGlbApart(Bytes file) {
-    if (file.size() < HEAD)
+    if (file.size() < GLB_HEADER)
         return Error{"the file is cut short"};
     Container parts;
     parts.is_old_glb = numberAt(file, 4) < 2;
@@ -51,13 +51,13 @@ Result<Container> takeGlbApart(Bytes file) {
     if (length > file.size())
         return Error{"the lengths in its header do not fit the file's length: it claims " +
                      std::to_string(length) + " bytes and has " + std::to_string(file.size())};
-    const Result<Chunk> first = chunkAt(file, HEAD);
+    const Result<Chunk> first = chunkAt(file, GLB_HEADER);
     if (!first)
         return first.error();
     if (first.value().kind != JSON_CHUNK)
         return Error{"its first part is not the description of a model"};
     parts.text = textOf(first.value().bytes);
-    std::size_t at = HEAD + CHUNK_HEAD + first.value().bytes.size();
+    std::size_t at = GLB_HEADER + CHUNK_HEAD + first.value().bytes.size();
     while (at + CHUNK_HEAD <= file.size()) {
         const Result<Chunk> chunk = chunkAt(file, at);
         if (!chunk)

@@ -19,7 +19,7 @@ TextureWrap wrapOf(const Json& mode) {
 
 /// The extension KHR_texture_transform scales coordinates, turns and moves them, with v running
 /// downward: 1 - v comes out.
-TexturePlace placeOf(const Json& transform) {
+TexturePlace placeOfTexture(const Json& transform) {
     std::array<double, 2> offset{0.0, 0.0};
     std::array<double, 2> scale{1.0, 1.0};
     readNumbers(member(transform, "offset"), offset);
@@ -49,7 +49,7 @@ std::optional<TextureReference> referenceOf(const Json& reference) {
     const Json& transform = extension(reference, "KHR_texture_transform");
     const Json& own_set = member(transform, "texCoord");
     const Json& set = own_set.is_null() ? member(reference, "texCoord") : own_set;
-    return TextureReference{*index, wholeNumber(set).value_or(0), placeOf(transform)};
+    return TextureReference{*index, wholeNumber(set).value_or(0), placeOfTexture(transform)};
 }
 
 std::shared_ptr<const Texture> Textures::at(std::uint64_t index) {

@@ -43,9 +43,9 @@ std::uint8_t byteOfFiveBits(unsigned bits) {
 }
 
 /// The triangles of a file where they lie in it.
-class Facets {
+class BinaryFacets {
 public:
-    Facets(std::string_view file, std::size_t count, ReadingProgress& progress)
+    BinaryFacets(std::string_view file, std::size_t count, ReadingProgress& progress)
         : m_facets(file.data() + FACETS_BEGIN), m_progress(progress) {
         constexpr std::string_view MARK = "COLOR=";
         const std::size_t mark = file.substr(0, HEADER_BYTES - 4).find(MARK);
@@ -153,7 +153,7 @@ Result<SourceScene> readBinaryStl(const ModelReading& reading) {
     if (!taken)
         return cannotReadModel(reading.path, taken.message(), "Use a smaller model.");
     ReadingProgress progress(reading.watch, ReadingStep::read, 6 * count.value());
-    const Facets facets(file, count.value(), progress);
+    const BinaryFacets facets(file, count.value(), progress);
     SourceMesh piece;
     piece.mesh = StlMesh(facets, count.value()).make();
     if (!progress.goesOn(0))

@@ -15,9 +15,9 @@ namespace quarn {
 namespace {
 
 /// The corners of a solid, each for itself.
-class Facets {
+class TextFacets {
 public:
-    explicit Facets(std::span<const KM_3fPoint> corners) : m_corners(corners) {}
+    explicit TextFacets(std::span<const KM_3fPoint> corners) : m_corners(corners) {}
 
     KM_3fPoint corner(std::uint32_t number) const { return m_corners[number]; }
     static bool hasColors() { return false; }
@@ -118,7 +118,7 @@ private:
                 i + 1 < m_solids.size() ? m_solids[i + 1].first_corner : m_corners.size();
             if (begin == end)
                 continue;
-            const Facets facets({m_corners.data() + begin, end - begin});
+            const TextFacets facets({m_corners.data() + begin, end - begin});
             SourceMesh piece;
             piece.name = KM_wString::FromUtf8(m_solids[i].name);
             piece.origin = m_origin;

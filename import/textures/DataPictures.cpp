@@ -12,16 +12,6 @@ constexpr std::size_t GREEN = 1;
 constexpr std::size_t BLUE = 2;
 constexpr std::size_t ALPHA = 3;
 
-std::shared_ptr<Texture> whiteLike(const Texture& texture) {
-    auto white = std::make_shared<Texture>();
-    white->width = texture.width;
-    white->height = texture.height;
-    white->wrap_u = texture.wrap_u;
-    white->wrap_v = texture.wrap_v;
-    white->rgba.assign(texture.rgba.size(), 255);
-    return white;
-}
-
 std::uint8_t meanOfColors(const std::uint8_t* rgba) {
     return static_cast<std::uint8_t>((rgba[0] + rgba[1] + rgba[2]) / 3);
 }
@@ -41,6 +31,16 @@ void setChannel(const Texture& from, std::size_t channel, Texture& to) {
 }
 
 } // namespace
+
+std::shared_ptr<Texture> whiteLike(const Texture& texture) {
+    auto white = std::make_shared<Texture>();
+    white->width = texture.width;
+    white->height = texture.height;
+    white->wrap_u = texture.wrap_u;
+    white->wrap_v = texture.wrap_v;
+    white->rgba.assign(texture.rgba.size(), 255);
+    return white;
+}
 
 std::shared_ptr<Texture> metalRoughPicture(const Texture* roughness, const Texture* metalness) {
     auto both = whiteLike(roughness != nullptr ? *roughness : *metalness);

@@ -10,6 +10,9 @@ namespace quarn {
 inline constexpr const char* HEIGHTS_NOT_DRAWN =
     "it holds heights, which are not drawn; a map of normals is";
 
+/// A white, opaque picture of this one's size and wrap modes.
+std::shared_ptr<Texture> whiteLike(const Texture& texture);
+
 /// A picture of roughness and one of metalness, each the mean of its colours, as one: green is
 /// roughness, blue is metalness. It has the size and the wrap modes of the roughness, where there
 /// is one.

@@ -1,5 +1,7 @@
 #include "import/textures/OpacityMap.h"
 
+#include "import/textures/DataPictures.h"
+
 #include <cstddef>
 
 namespace quarn {
@@ -23,12 +25,6 @@ std::size_t nearestOffset(const Texture& texture, int x, int width, int y, int h
     const auto column = static_cast<std::size_t>(static_cast<long long>(x) * texture.width / width);
     const auto row = static_cast<std::size_t>(static_cast<long long>(y) * texture.height / height);
     return 4 * (row * static_cast<std::size_t>(texture.width) + column);
-}
-
-std::shared_ptr<Texture> whiteLike(const Texture& texture) {
-    auto white = std::make_shared<Texture>(texture);
-    white->rgba.assign(texture.rgba.size(), 255);
-    return white;
 }
 
 } // namespace

@@ -11,7 +11,6 @@ namespace quarn::program {
 namespace {
 
 constexpr int MOST_JOBS = 1024;
-constexpr int MOST_RETRIES = 100;
 
 struct AskedRecording {
     DocumentRecordingRequest request{};
@@ -98,7 +97,7 @@ Action addFinish(CLI::App& command) {
         ->required();
     add("--document", request.document, "DOC", savedDocument(),
         "The document (default: where it was when the recording began)");
-    add("--retries", request.retries, "N", wholeNumberFrom(0, MOST_RETRIES),
+    add("--retries", request.retries, "N", numberOfRetries(),
         "How often frames that cannot be made are tried again", "2");
     addQuality(add, request.quality);
     addViewer(command, request.viewer);

@@ -16,7 +16,6 @@ using Path = std::filesystem::path;
 
 constexpr int MOST_TASKS = 1'000'000;
 constexpr int MOST_CPUS = 4096;
-constexpr int MOST_RETRIES = 100;
 constexpr double LONGEST_FRAME_S = 1e6;
 
 struct AskedFarm {
@@ -73,7 +72,7 @@ void addJobOptions(const OptionAdder& add, FarmRequest& request) {
         "partition's)");
     add("--cpus", request.cpus, "N", wholeNumberFrom(1, MOST_CPUS),
         "Processors and threads of a task", "1");
-    add("--retries", request.retries, "N", wholeNumberFrom(0, MOST_RETRIES),
+    add("--retries", request.retries, "N", numberOfRetries(),
         "How often the last job tries frames again that are missing", "2");
     add("--stage", request.stage, "DIR", folderOfNodes(),
         "Copy the document once a node into this folder of the node's own disk, such as /tmp");

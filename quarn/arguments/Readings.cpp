@@ -85,6 +85,11 @@ Reading<int> threadCount() {
     return wholeNumberFrom(1, MOST_THREADS, "threads");
 }
 
+Reading<int> numberOfRetries() {
+    constexpr int MOST_RETRIES = 100;
+    return wholeNumberFrom(0, MOST_RETRIES);
+}
+
 Reading<std::string> instructionSet() {
     return [](const std::string& option,
               const std::string& word) -> std::variant<std::string, Refusal> {

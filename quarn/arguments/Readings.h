@@ -20,6 +20,8 @@ Reading<int> wholeNumberFrom(int low, std::optional<int> high = {}, const std::s
 Reading<double> numberFrom(double low, double high, const std::string& unit = "");
 Reading<Triple> point();
 Reading<PixelSize> sizeOfPicture();
+/// How often a frame that fails is tried again.
+Reading<int> numberOfRetries();
 /// In bytes.
 Reading<std::uint64_t> sizeOfMemory();
 

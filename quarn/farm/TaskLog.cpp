@@ -12,7 +12,7 @@ namespace {
 
 const std::string OURS = "[quarn farm] ";
 const std::string BEGAN = " began on ";
-const std::string ENDED = " ended with ";
+const std::string ENDED_WITH = " ended with ";
 const std::string QUARN = "quarn: ";
 const std::string DUE_TO = " DUE TO ";
 const std::string OUT_OF_MEMORY = "oom";
@@ -29,7 +29,8 @@ std::string behind(const std::string& line, const std::string& mark, const std::
 void readOurs(const std::string& line, std::vector<TaskAttempt>& attempts) {
     if (const std::string node = behind(line, BEGAN, ":"); !node.empty())
         attempts.push_back({.node = node, .exit_code = std::nullopt, .words = ""});
-    else if (const auto code = wholeNumber(behind(line, ENDED, " ")); code && !attempts.empty())
+    else if (const auto code = wholeNumber(behind(line, ENDED_WITH, " "));
+             code && !attempts.empty())
         attempts.back().exit_code = code;
 }
 

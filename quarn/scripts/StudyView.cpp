@@ -11,7 +11,7 @@ namespace {
 
 /// From the right of a front that looks along the negative Y axis, and high enough to look down on
 /// the shadows between the parts of a model.
-constexpr double AZIMUTH_DEG = 150.0;
+constexpr double STUDY_AZIMUTH_DEG = 150.0;
 constexpr double ELEVATION_DEG = 30.0;
 /// Leaves room on the ground for shadows.
 constexpr double DISTANCE_FACTOR = 1.1;
@@ -63,7 +63,7 @@ std::vector<std::string> linesFor(const StudyView& view, bool is_of_document) {
         return ownView(view);
     // The model's azimuth is a compass's, which runs the other way round from the Y axis.
     return {cameraToBeFitted(view.target.value_or(Triple{}),
-                             90.0 - view.azimuth_deg.value_or(AZIMUTH_DEG),
+                             90.0 - view.azimuth_deg.value_or(STUDY_AZIMUTH_DEG),
                              view.elevation_deg.value_or(ELEVATION_DEG), view.lens_mm),
             fitView(view)};
 }

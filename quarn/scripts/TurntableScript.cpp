@@ -10,7 +10,7 @@ namespace quarn::program {
 namespace {
 
 /// In front of the model and to its right: shows two sides of a building, one of them more.
-constexpr double AZIMUTH_DEG = -60.0;
+constexpr double FIRST_AZIMUTH_DEG = -60.0;
 
 /// How far round frame 0 is from where the camera stands when the turn is set up, which is the
 /// place of the last frame. The set-up command divides its circle by the circle's parameter: each
@@ -29,7 +29,7 @@ double firstStep_deg(int frames) {
 /// The camera goes round the other way than the model seems to turn.
 double azimuthAtSetUp_deg(const TurntableRequest& request) {
     if (!request.start_angle_deg)
-        return AZIMUTH_DEG;
+        return FIRST_AZIMUTH_DEG;
     const double step = firstStep_deg(request.recording.frames);
     return *request.start_angle_deg - (request.direction == "clockwise" ? step : -step);
 }
