@@ -2,7 +2,9 @@
 
 #include <algorithm>
 #include <chrono>
+#include <fstream>
 #include <gtest/gtest.h>
+#include <sstream>
 #include <thread>
 
 namespace quarn::test {
@@ -15,9 +17,16 @@ const fs::path FOLDER = FARM_CLUSTER;
 constexpr std::chrono::milliseconds BETWEEN_LOOKS{20};
 constexpr double LONGEST_START_S = 30;
 
+/// Nothing of a process that has just ended.
+std::string fileOfProcess(const fs::path& file) {
+    std::ostringstream bytes;
+    bytes << std::ifstream(file).rdbuf();
+    return bytes.str();
+}
+
 /// The variables that a process was started with, each ended by a zero.
 std::string environmentOf(const fs::path& process) {
-    return '\0' + readFile(process / "environ");
+    return '\0' + fileOfProcess(process / "environ");
 }
 
 bool isTaskOf(const fs::path& process, const std::string& node) {
@@ -47,7 +56,7 @@ bool isNumber(const std::string& name) {
 std::optional<Drawing> drawingOn(const std::vector<std::string>& where, const fs::path& folder) {
     for (const fs::directory_entry& entry : fs::directory_iterator("/proc")) {
         const std::string name = entry.path().filename();
-        if (!isNumber(name) || readFile(entry.path() / "comm") != "quarn\n" ||
+        if (!isNumber(name) || fileOfProcess(entry.path() / "comm") != "quarn\n" ||
             !hasClaim(std::stoi(name), folder))
             continue;
         for (const std::string& node : where) {
