@@ -4,7 +4,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <cstdio>
 #include <numbers>
 
 namespace quarn {
@@ -42,13 +41,6 @@ std::string dayText(const std::chrono::year_month_day& day) {
     return std::to_string(static_cast<unsigned>(day.day())) + " " +
            MONTHS[static_cast<unsigned>(day.month()) - 1] + " " +
            std::to_string(static_cast<int>(day.year()));
-}
-
-std::string timeText(std::chrono::minutes time) {
-    char text[16];
-    std::snprintf(text, sizeof text, "%02d:%02d", static_cast<int>(time.count() / 60),
-                  static_cast<int>(time.count() % 60));
-    return text;
 }
 
 Image whiteSheet(int width, int height) {
@@ -155,13 +147,13 @@ std::string errorText(const SunHoursRequest& request) {
 }
 
 std::string subtitleOf(const SunHoursRequest& request, const SunMoments& moments) {
-    std::string text = request.place.empty() ? "" : request.place + " · ";
+    std::string text = request.site.place.empty() ? "" : request.site.place + " · ";
     text += daysText(request);
     if (request.from || request.to)
-        text += " · " + timeText(request.from.value_or(std::chrono::minutes(0))) + " to " +
-                timeText(request.to.value_or(std::chrono::hours(24)));
+        text += " · " + (request.from ? wantedTimeText(*request.from) : "00:00") + " to " +
+                (request.to ? wantedTimeText(*request.to) : "24:00");
     if (!moments.moments.empty())
-        text += " (" + request.zone.at(moments.moments.front().time).abbreviation + ")";
+        text += " (" + request.site.zone.at(moments.moments.front().time).abbreviation + ")";
     text += " · at most " + hoursText(moments.hours);
     return text;
 }

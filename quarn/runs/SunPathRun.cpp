@@ -59,8 +59,10 @@ SunPathWish wishOf(const SunPathRequest& request) {
                      .clock_name = clockName(request),
                      .clock_note = clockNote(request),
                      .projections = {},
-                     .north_deg = request.north_deg,
+                     .north_deg = {},
                      .point = {}};
+    if (request.has_north)
+        wish.north_deg = request.site.north_deg;
     if (request.is_stereographic)
         wish.projections.push_back(SkyProjection::stereographic);
     if (request.is_orthographic)
@@ -79,8 +81,7 @@ std::optional<Outcome> lookAround(const SunPathRequest& request, const CommonOpt
     SkyPoint place = request.object;
     if (request.point)
         place = KM_3dPoint((*request.point)[0], (*request.point)[1], (*request.point)[2]);
-    auto obstruction =
-        obstructionAround(host.session().document(), place, request.north_deg.value_or(0.0));
+    auto obstruction = obstructionAround(host.session().document(), place, request.site.north_deg);
     if (!obstruction)
         return Outcome::failure(request.model.native() + ": " + obstruction.message());
     wish.point = DiagramPoint{pointName(request), std::move(obstruction.value())};
@@ -93,9 +94,8 @@ std::string doneText(const SunPathRequest& request, const SunPathWish& wish) {
     std::string text = request.file.native() + ": sun path of " +
                        (request.site.place.empty() ? "the place" : request.site.place) + " in " +
                        std::to_string(request.year) + ", hours of " + wish.clock_name + ".\n";
-    if (!request.site.zone_origin.empty())
-        text += "The zone is that of " + request.site.zone_origin +
-                ", the nearest place that is known; --zone takes another.\n";
+    if (!request.zone_note.empty())
+        text += request.zone_note + ".\n";
     return text;
 }
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "quarn/scripts/CivilSite.h"
+#include "host/almanac/CivilSite.h"
 #include "quarn/session/HostSession.h"
 #include "quarn/words/Words.h"
 
@@ -13,10 +13,11 @@ namespace quarn::program {
 /// A sun path diagram that is to be written.
 struct SunPathRequest {
     CivilSite site;
+    bool has_north = false; ///< whether the site's is known
+    std::string zone_note;  ///< a sentence without its full stop; empty: nothing
     int year = 0;
     bool is_stereographic = true;
     bool is_orthographic = false;
-    std::optional<double> north_deg;
     std::filesystem::path model; ///< empty: none
     std::optional<Triple> point; ///< in model units; with a model this or an object
     std::string object;          ///< its name or id
