@@ -17,8 +17,6 @@ using std::chrono::minutes;
 using std::chrono::seconds;
 using std::chrono::year_month_day;
 
-constexpr int MINUTES_OF_DAY = 1440;
-
 /// A time of a day; one without a day is of the day that is asked for.
 struct TypedMoment {
     std::optional<WantedDay> day;
@@ -124,30 +122,52 @@ Outcome tellSun(const TypedSun& typed) {
 }
 
 struct TypedSunPath {
-    SunPathRequest request;
+    SunPathOrder order;
     TypedSite site;
     std::optional<int> year;
     std::string projection;
-    CommonOptions common;
+    std::optional<Triple> point;
+    std::string object;
 };
 
-std::optional<std::string> settleSunPath(const TypedSunPath& typed, SunPathRequest& request) {
-    const bool has_place = request.point || !request.object.empty();
-    if (request.model.empty() && has_place)
-        return "--point and --object are for a model: give its file too.";
-    if (!request.model.empty() && !has_place)
-        return "say from where the model is to be seen, with --point X,Y,Z or --object NAME.";
-    if (request.point && !request.object.empty())
-        return "give either --point or --object.";
-    auto settled = settleSite(typed.site, request.model);
+std::optional<std::string> settlePlace(const TypedSunPath& typed, SunPathOrder& order) {
+    const auto settled = settleSite(typed.site, order.model);
     if (!settled)
         return settled.message();
-    request.site = std::move(settled.value().site);
-    request.has_north = settled.value().has_north;
-    request.zone_note = settled.value().zone_note;
-    request.year = typed.year.value_or(int(today(request.site.zone).year()));
-    request.is_stereographic = typed.projection != "orthographic";
-    request.is_orthographic = typed.projection != "stereographic";
+    const CivilSite& site = settled.value().site;
+    order.diagram.place = site.place;
+    order.diagram.site = {site.latitude_deg, site.longitude_deg};
+    order.diagram.zone = site.zone;
+    if (settled.value().has_north)
+        order.diagram.north_deg = site.north_deg;
+    order.zone_note = settled.value().zone_note;
+    return std::nullopt;
+}
+
+std::optional<std::string> settlePoint(const TypedSunPath& typed, SunPathOrder& order) {
+    const bool has_place = typed.point || !typed.object.empty();
+    if (order.model.empty() && has_place)
+        return "--point and --object are for a model: give its file too.";
+    if (!order.model.empty() && !has_place)
+        return "say from where the model is to be seen, with --point X,Y,Z or --object NAME.";
+    if (typed.point && !typed.object.empty())
+        return "give either --point or --object.";
+    if (typed.point)
+        order.diagram.point = KM_3dPoint((*typed.point)[0], (*typed.point)[1], (*typed.point)[2]);
+    else if (has_place)
+        order.diagram.point = typed.object;
+    order.diagram.model = order.model.filename().native();
+    return std::nullopt;
+}
+
+std::optional<std::string> settleSunPath(const TypedSunPath& typed, SunPathOrder& order) {
+    if (auto mistake = settlePoint(typed, order))
+        return mistake;
+    if (auto mistake = settlePlace(typed, order))
+        return mistake;
+    order.diagram.year = typed.year.value_or(int(today(order.diagram.zone).year()));
+    order.diagram.is_stereographic = typed.projection != "orthographic";
+    order.diagram.is_orthographic = typed.projection != "stereographic";
     return std::nullopt;
 }
 
@@ -163,8 +183,8 @@ Action addSun(CLI::App& command) {
         "Or a time by the clock on the wall: 14:30, sunrise+1h, or \"2026-06-21 14:30\" (default: "
         "now)");
     add("--to", typed->to, "TIME", moment(), "and the time that no position is later than");
-    add("--every", typed->step, "MINUTES", wholeNumberFrom(1, MINUTES_OF_DAY, "minutes"),
-        "Minutes between positions, 1 to 1440", "60");
+    add("--every", typed->step, "MINUTES", minutesOfADay(), "Minutes between positions, 1 to 1440",
+        "60");
     add("--format", typed->form, "NAME", oneOf({"text", "csv", "json"}), "text, csv or json",
         "text");
     return [typed] { return tellSun(*typed); };
@@ -172,27 +192,28 @@ Action addSun(CLI::App& command) {
 
 Action addSunPath(CLI::App& command) {
     const auto typed = std::make_shared<TypedSunPath>();
-    SunPathRequest& request = typed->request;
+    SunPathOrder& order = typed->order;
     const OptionAdder add(command);
-    add("MODEL", request.model, "", scriptWord("the model's path"),
+    add("MODEL", order.model, "", scriptWord("the model's path"),
         "A model file or document, to see what it hides of the sky");
     addSiteOfModel(add, typed->site);
     add("--year", typed->year, "YEAR", wholeNumberFrom(FIRST_SUN_YEAR, LAST_SUN_YEAR, "a year"),
         "1800 to 2199 (default: this year)");
     add("--projection", typed->projection, "NAME", oneOf({"stereographic", "orthographic", "both"}),
         "stereographic, orthographic or both", "stereographic");
-    add("--point", request.point, "X,Y,Z", point(), "Point of the model to look at the sky from");
-    add("--object", request.object, "NAME", scriptWord("the name of --object"),
+    add("--point", typed->point, "X,Y,Z", point(), "Point of the model to look at the sky from");
+    add("--object", typed->object, "NAME", scriptWord("the name of --object"),
         "Or: the object to look from, by its name or id");
-    add("--out", request.file, "FILE", scriptWord("the path of --out"), "The drawing: .svg or .png")
+    add("--out", order.diagram.file, "FILE", scriptWord("the path of --out"),
+        "The drawing: .svg or .png")
         ->required();
-    command.add_flag("--overwrite", typed->common.overwrites, "Replace a file that is there");
-    addCommonOptions(command, typed->common);
+    command.add_flag("--overwrite", order.common.overwrites, "Replace a file that is there");
+    addCommonOptions(command, order.common);
     return [typed] {
-        SunPathRequest settled = typed->request;
+        SunPathOrder settled = typed->order;
         if (const auto mistake = settleSunPath(*typed, settled))
             return Outcome::misuse(*mistake);
-        return drawSunPath(settled, typed->common);
+        return drawSunPath(settled);
     };
 }
 

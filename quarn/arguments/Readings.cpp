@@ -57,6 +57,11 @@ Reading<int> wholeNumberFrom(int low, std::optional<int> high, const std::string
     });
 }
 
+Reading<int> minutesOfADay() {
+    constexpr int MINUTES_OF_DAY = 1440;
+    return wholeNumberFrom(1, MINUTES_OF_DAY, "minutes");
+}
+
 Reading<double> numberFrom(double low, double high, const std::string& unit) {
     const std::string demand =
         "a number" + ofUnit(unit) + " from " + numberText(low) + " to " + numberText(high);

@@ -18,6 +18,8 @@ Refusal mustBe(const std::string& option, const std::string& demand, const std::
 /// @param high  nothing: as large as a number can be
 /// @param unit  what is counted; empty: nothing
 Reading<int> wholeNumberFrom(int low, std::optional<int> high = {}, const std::string& unit = "");
+/// A step of a day.
+Reading<int> minutesOfADay();
 Reading<double> numberFrom(double low, double high, const std::string& unit = "");
 Reading<Triple> point();
 Reading<PixelSize> sizeOfPicture();

@@ -11,7 +11,6 @@ namespace quarn::program {
 
 namespace {
 
-constexpr int MINUTES_OF_DAY = 1440;
 constexpr int DAYS_OF_YEAR = 366;
 constexpr const char* PLAN = "plan";
 
@@ -108,7 +107,7 @@ void addTimes(const OptionAdder& add, TypedHours& typed) {
         "sunrise+1h (default: midnight)");
     add("--to", hours.to, "TIME", timeOfTheSun(),
         "Time that they count to, such as 15:00 or sunset-1h (default: midnight)");
-    add("--every", hours.every_minutes, "MINUTES", wholeNumberFrom(1, MINUTES_OF_DAY, "minutes"),
+    add("--every", hours.every_minutes, "MINUTES", minutesOfADay(),
         "Minutes between the places of the sun, 1 to 1440", "10");
 }
 

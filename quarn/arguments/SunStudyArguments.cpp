@@ -11,8 +11,6 @@ namespace quarn::program {
 
 namespace {
 
-constexpr int MINUTES_OF_DAY = 1440;
-
 /// A study as it is typed: what it is made of is put together when all words are read.
 struct TypedStudy {
     SunStudyRequest request{};
@@ -102,8 +100,8 @@ Action addDay(CLI::App& command) {
     add("--to", typed->day.last, "TIME", timeOfTheSun(),
         "Time that no picture is later than, such as 18:00 or sunset-30m (default: the last such "
         "step)");
-    add("--every", typed->step, "MINUTES", wholeNumberFrom(1, MINUTES_OF_DAY, "minutes"),
-        "Minutes between pictures, 1 to 1440", "15");
+    add("--every", typed->step, "MINUTES", minutesOfADay(), "Minutes between pictures, 1 to 1440",
+        "15");
     return finish(command, typed);
 }
 
