@@ -35,7 +35,7 @@ Result<Found> find(const ObjectTable& objects, const SkyPoint& place) {
     const std::string& name = std::get<std::string>(place);
     const DocumentObject* const object = objectCalled(objects, name);
     if (!object)
-        return Error{"No object is called \"" + name + "\"; quarn info MODEL lists them."};
+        return Error{"No object is called \"" + name + "\", nor is that the id of one."};
     if (object->point)
         return Found{*object->point};
     const KM_BoundingBox box = object->boundingBox();
@@ -57,8 +57,8 @@ Result<Obstruction> obstructionAround(CQuarnDoc& document, const SkyPoint& place
         return scene.error();
     const DisplayScene& display = scene.value()->display();
     if (!display.surfaceBox().IsValid())
-        return Error{"There is no visible surface that could hide the sky: leave --point and "
-                     "--object out, or give another model."};
+        return Error{"There is no visible surface that could hide the sky: draw the diagram "
+                     "without a point, or of another model."};
     const std::span<const SceneMesh> meshes = scene.value()->content().meshes;
     const auto isPassed = [&](std::size_t mesh) {
         return meshes[mesh].id == found.value().object ||

@@ -3,7 +3,6 @@
 #include "ground/Result.h"
 #include "host/sunpath/Obstruction.h"
 #include "kelmar/KM_Point.h"
-#include "sdk/qncore/QnExport.h"
 
 #include <string>
 #include <variant>
@@ -22,7 +21,6 @@ using SkyPoint = std::variant<KM_3dPoint, std::string>;
 /// @param north_deg  clockwise from the Y axis, as seen from above
 /// @return an English error when there is no such object, no visible surface, or the scene cannot
 ///         be built
-QNCORE_API Result<Obstruction> obstructionAround(CQuarnDoc& document, const SkyPoint& place,
-                                                 double north_deg);
+Result<Obstruction> obstructionAround(CQuarnDoc& document, const SkyPoint& place, double north_deg);
 
 } // namespace quarn

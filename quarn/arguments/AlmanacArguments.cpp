@@ -153,44 +153,62 @@ Outcome tellSun(const TypedSun& typed) {
 }
 
 struct TypedSunPath {
-    SunPathRequest request;
+    SunPathOrder order;
     TypedSite site;
     std::optional<int> year;
     std::string projection;
-    CommonOptions common;
+    std::optional<Triple> point;
+    std::string object;
 };
 
 /// The place that is typed; else the one that the model's file states, with its north.
-std::optional<std::string> settlePlace(const TypedSunPath& typed, SunPathRequest& request) {
-    if (isTyped(typed.site) || request.model.empty())
-        return settleSite(typed.site, request.site);
-    const auto stated = statedSite(request.model);
-    if (!stated)
-        return settleSite(typed.site, request.site);
-    request.site.place = "as " + request.model.filename().native() + " states";
-    request.site.latitude_deg = stated->latitude_deg;
-    request.site.longitude_deg = stated->longitude_deg;
-    if (!request.north_deg)
-        request.north_deg = stated->north_angle_deg;
-    return settleZone(typed.site.zone, request.site);
+std::optional<std::string> settlePlace(const TypedSunPath& typed, SunPathOrder& order) {
+    CivilSite site;
+    const auto stated =
+        isTyped(typed.site) || order.model.empty() ? std::nullopt : statedSite(order.model);
+    if (stated) {
+        site.place = order.model.filename().native();
+        site.latitude_deg = stated->latitude_deg;
+        site.longitude_deg = stated->longitude_deg;
+        if (!order.diagram.north_deg)
+            order.diagram.north_deg = stated->north_angle_deg;
+    }
+    if (auto mistake = stated ? settleZone(typed.site.zone, site) : settleSite(typed.site, site))
+        return mistake;
+    order.diagram.place = site.place;
+    order.diagram.site = {site.latitude_deg, site.longitude_deg};
+    order.diagram.zone = site.zone;
+    order.zone_origin = site.zone_origin;
+    return std::nullopt;
 }
 
-std::optional<std::string> settleSunPath(const TypedSunPath& typed, SunPathRequest& request) {
-    const bool has_place = request.point || !request.object.empty();
-    if (request.model.empty() && has_place)
+std::optional<std::string> settlePoint(const TypedSunPath& typed, SunPathOrder& order) {
+    const bool has_place = typed.point || !typed.object.empty();
+    if (order.model.empty() && has_place)
         return "--point and --object are for a model: give its file too.";
-    if (!request.model.empty() && !has_place)
+    if (!order.model.empty() && !has_place)
         return "say from where the model is to be seen, with --point X,Y,Z or --object NAME.";
-    if (request.point && !request.object.empty())
+    if (typed.point && !typed.object.empty())
         return "give either --point or --object.";
-    if (auto mistake = settlePlace(typed, request))
+    if (typed.point)
+        order.diagram.point = KM_3dPoint((*typed.point)[0], (*typed.point)[1], (*typed.point)[2]);
+    else if (has_place)
+        order.diagram.point = typed.object;
+    order.diagram.model = order.model.filename().native();
+    return std::nullopt;
+}
+
+std::optional<std::string> settleSunPath(const TypedSunPath& typed, SunPathOrder& order) {
+    if (auto mistake = settlePoint(typed, order))
+        return mistake;
+    if (auto mistake = settlePlace(typed, order))
         return mistake;
     const auto now = std::chrono::floor<seconds>(std::chrono::system_clock::now());
     const std::chrono::year_month_day today(
-        std::chrono::floor<days>(request.site.zone.at(now).local));
-    request.year = typed.year.value_or(static_cast<int>(today.year()));
-    request.is_stereographic = typed.projection != "orthographic";
-    request.is_orthographic = typed.projection != "stereographic";
+        std::chrono::floor<days>(order.diagram.zone.at(now).local));
+    order.diagram.year = typed.year.value_or(static_cast<int>(today.year()));
+    order.diagram.is_stereographic = typed.projection != "orthographic";
+    order.diagram.is_orthographic = typed.projection != "stereographic";
     return std::nullopt;
 }
 
@@ -214,29 +232,30 @@ Action addSun(CLI::App& command) {
 
 Action addSunPath(CLI::App& command) {
     const auto typed = std::make_shared<TypedSunPath>();
-    SunPathRequest& request = typed->request;
+    SunPathOrder& order = typed->order;
     const OptionAdder add(command);
-    add("MODEL", request.model, "", scriptWord("the model's path"),
+    add("MODEL", order.model, "", scriptWord("the model's path"),
         "A model file or document, to see what it hides of the sky");
     addSite(add, typed->site);
     add("--year", typed->year, "YEAR", wholeNumberFrom(FIRST_YEAR, LAST_YEAR, "a year"),
         "1800 to 2199 (default: this year)");
     add("--projection", typed->projection, "NAME", oneOf({"stereographic", "orthographic", "both"}),
         "stereographic, orthographic or both", "stereographic");
-    add("--north", request.north_deg, "DEG", numberFrom(-360, 360, "degrees"),
+    add("--north", order.diagram.north_deg, "DEG", numberFrom(-360, 360, "degrees"),
         "Where north is in the model, in degrees clockwise from its Y axis (default: 0)");
-    add("--point", request.point, "X,Y,Z", point(), "Point of the model to look at the sky from");
-    add("--object", request.object, "NAME", scriptWord("the name of --object"),
+    add("--point", typed->point, "X,Y,Z", point(), "Point of the model to look at the sky from");
+    add("--object", typed->object, "NAME", scriptWord("the name of --object"),
         "Or: the object to look from, by its name or id");
-    add("--out", request.file, "FILE", scriptWord("the path of --out"), "The drawing: .svg or .png")
+    add("--out", order.diagram.file, "FILE", scriptWord("the path of --out"),
+        "The drawing: .svg or .png")
         ->required();
-    command.add_flag("--overwrite", typed->common.overwrites, "Replace a file that is there");
-    addCommonOptions(command, typed->common);
+    command.add_flag("--overwrite", order.common.overwrites, "Replace a file that is there");
+    addCommonOptions(command, order.common);
     return [typed] {
-        SunPathRequest settled = typed->request;
+        SunPathOrder settled = typed->order;
         if (const auto mistake = settleSunPath(*typed, settled))
             return Outcome::misuse(*mistake);
-        return drawSunPath(settled, typed->common);
+        return drawSunPath(settled);
     };
 }
 
