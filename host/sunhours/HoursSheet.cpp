@@ -4,7 +4,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <cstdio>
 #include <numbers>
 
 namespace quarn {
@@ -37,13 +36,6 @@ struct SheetSizes {
     int head;
     int foot;
 };
-
-std::string clockText(std::chrono::minutes time) {
-    char text[16];
-    std::snprintf(text, sizeof text, "%02d:%02d", static_cast<int>(time.count() / 60),
-                  static_cast<int>(time.count() % 60));
-    return text;
-}
 
 Image whiteSheet(int width, int height) {
     Image sheet;
@@ -156,13 +148,13 @@ std::string titleOf(const SunHoursRequest& request, const SheetWords& words) {
 
 std::string subtitleOf(const SunHoursRequest& request, const SunMoments& moments,
                        const SheetWords& words) {
-    std::string text = request.place.empty() ? "" : request.place + SEPARATOR;
+    std::string text = request.site.place.empty() ? "" : request.site.place + SEPARATOR;
     text += daysText(request, words);
     if (request.from || request.to)
-        text += SEPARATOR + words(SPAN, {clockText(request.from.value_or(std::chrono::minutes(0))),
-                                         clockText(request.to.value_or(std::chrono::hours(24)))});
+        text += SEPARATOR + words(SPAN, {request.from ? wantedTimeText(*request.from) : "00:00",
+                                         request.to ? wantedTimeText(*request.to) : "24:00"});
     if (!moments.moments.empty())
-        text += " (" + request.zone.at(moments.moments.front().time).abbreviation + ")";
+        text += " (" + request.site.zone.at(moments.moments.front().time).abbreviation + ")";
     return text + SEPARATOR + words(AT_MOST, {hoursText(moments.hours, words)});
 }
 
@@ -192,7 +184,7 @@ Image sheetOf(const Image& map, const SunHoursRequest& request, const SunMoments
     if (request.is_plan) {
         const double radius = 1.1 * sizes.unit;
         drawNorth(sheet, sizes.margin + map.width - 1.8 * radius, 2.6 * sizes.unit, radius,
-                  request.north_deg, text);
+                  request.site.north_deg, text);
     }
     return sheet;
 }

@@ -101,7 +101,7 @@ std::string wallText(const WallTime& time) {
 nlohmann::json timesOf(const SunHoursPage& page) {
     nlohmann::json times = nlohmann::json::array();
     for (const SunMoment& moment : page.moments.moments)
-        times.push_back(wallText(page.request.zone.at(moment.time)));
+        times.push_back(wallText(page.request.site.zone.at(moment.time)));
     return times;
 }
 
