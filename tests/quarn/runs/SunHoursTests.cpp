@@ -8,6 +8,7 @@
 namespace quarn::test {
 namespace {
 
+using testing::AllOf;
 using testing::HasSubstr;
 
 Start sunHours(const Studio& studio, const std::vector<std::string>& options) {
@@ -41,6 +42,34 @@ TEST(SunHoursTests, PlanOfADayIsAPictureAPageNumbersAndATable) {
     EXPECT_THAT(page, HasSubstr("\"12:00 EET\""));
     EXPECT_EQ(page.find("{{"), page.npos);
     EXPECT_THAT(textOf(studio / "out/house-sunhours.csv"), HasSubstr("share_from_2_hours"));
+}
+
+/// Picture and page of a plan in a language.
+struct Sheet {
+    std::string picture;
+    std::string page;
+};
+
+Sheet sheetIn(const std::string& language) {
+    const Studio studio;
+    const Ended ended =
+        run(sunHours(studio, {"--place", "Athens", "--date", "2026-03-21", "--every", "120",
+                              "--view", "plan", "--language", language}));
+    EXPECT_EQ(ended.exit_code, 0) << ended.err;
+    return {textOf(studio / "out/house-sunhours.png"), textOf(studio / "out/house-sunhours.html")};
+}
+
+TEST(SunHoursTests, SheetIsInTheLanguageAndItsPictureInEnglishWhereTheFontLacksLetters) {
+    const Sheet english = sheetIn("en");
+    const Sheet german = sheetIn("de");
+    const Sheet japanese = sheetIn("ja");
+    EXPECT_THAT(german.page, AllOf(HasSubstr("<html lang=\"de\">"), HasSubstr("Sonnenstunden"),
+                                   HasSubstr("21. M\xC3\xA4r 2026")));
+    EXPECT_THAT(japanese.page, AllOf(HasSubstr("<html lang=\"ja\">"), HasSubstr("2026\xE5\xB9\xB4"
+                                                                                "3\xE6\x9C\x88"
+                                                                                "21\xE6\x97\xA5")));
+    EXPECT_NE(german.picture, english.picture);
+    EXPECT_EQ(japanese.picture, english.picture);
 }
 
 TEST(SunHoursTests, PolarNightIsToldAndHasNoHours) {

@@ -82,6 +82,15 @@ TEST_F(SunPathRun, ShowsWhatTheModelHidesFromAPoint) {
     EXPECT_THAT(text, HasSubstr("the point 0.5,-3,1 of house.obj"));
 }
 
+TEST_F(SunPathRun, SpeaksTheLanguage) {
+    const Ended ended =
+        draw({"--place", "Berlin", "--north", "20", "--language", "de", "--out", "sun.svg"});
+    ASSERT_EQ(ended.exit_code, 0) << ended.err;
+    EXPECT_THAT(svg("sun.svg"),
+                AllOf(HasSubstr("Sonnenbahn: Berlin, Germany"), HasSubstr("13.41\xC2\xB0 O"),
+                      HasSubstr(">21. Dez<"), HasSubstr("20\xC2\xB0 im Uhrzeigersinn")));
+}
+
 TEST_F(SunPathRun, DrawsAPicture) {
     const Ended ended = draw({"--place", "Berlin", "--projection", "both", "--out", "sun.PNG"});
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
