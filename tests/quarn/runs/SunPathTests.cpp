@@ -136,7 +136,10 @@ TEST_F(SunPathRun, RefusesAModelWithoutSurfaces) {
 
 TEST_F(SunPathRun, KeepsAFileThatIsThereUnlessToldOtherwise) {
     writeFile(m_studio / "mine.svg", "mine");
-    EXPECT_EQ(draw({"--place", "Berlin", "--out", "mine.svg"}).exit_code, 1);
+    const Ended refused = draw({"--place", "Berlin", "--out", "mine.svg"});
+    EXPECT_EQ(refused.exit_code, 1);
+    EXPECT_EQ(refused.err, "quarn: mine.svg is there already: give --overwrite to replace it, or "
+                           "another --out.\n");
     EXPECT_EQ(svg("mine.svg"), "mine");
     EXPECT_EQ(draw({"--place", "Berlin", "--out", "mine.svg", "--overwrite"}).exit_code, 0);
     EXPECT_THAT(svg("mine.svg"), StartsWith("<?xml"));
