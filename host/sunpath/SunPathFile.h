@@ -16,7 +16,6 @@ QNCORE_API std::optional<std::string> whyDiagramIsRefused(const std::filesystem:
 /// The file appears whole or not at all, and replaces one of the same name.
 /// @return an error that names the file: another extension, the folder is missing, no permission,
 ///         write-protected, the disk is full
-QNCORE_API Result<void> writeSunPathDiagram(const SunPathWish& wish,
-                                            const std::filesystem::path& file);
+Result<void> writeSunPathDiagram(const SunPathWish& wish, const std::filesystem::path& file);
 
 } // namespace quarn

@@ -10,8 +10,6 @@ namespace quarn::program {
 
 namespace {
 
-constexpr int FIRST_YEAR = 1800; // as the host's sun takes them
-
 /// A reading that knows one reason to refuse a word.
 /// @param read  nothing for a word that is not as demanded
 template <class Value>
@@ -35,6 +33,14 @@ std::string alternatives(const std::vector<std::string>& words) {
     return text;
 }
 
+/// The year that a word named; nothing: this one.
+std::optional<int> yearOf(const WantedDay& day) {
+    if (const auto* const date = std::get_if<std::chrono::year_month_day>(&day))
+        return int(date->year());
+    const auto* const season = std::get_if<SeasonDay>(&day);
+    return season ? season->year : std::nullopt;
+}
+
 } // namespace
 
 Refusal mustBe(const std::string& option, const std::string& demand, const std::string& word) {
@@ -48,6 +54,11 @@ Reading<int> wholeNumberFrom(int low, std::optional<int> high, const std::string
         const std::optional<int> number = wholeNumber(word);
         return number && *number >= low && (!high || *number <= *high) ? number : std::nullopt;
     });
+}
+
+Reading<int> minutesOfADay() {
+    constexpr int MINUTES_OF_DAY = 1440;
+    return wholeNumberFrom(1, MINUTES_OF_DAY, "minutes");
 }
 
 Reading<double> numberFrom(double low, double high, const std::string& unit) {
@@ -139,21 +150,35 @@ Reading<FrameRanges> frameRanges() {
     };
 }
 
-Reading<COleDateTime> dateUntil(int last_year) {
+Reading<WantedDay> dayOfTheSun(int last_year) {
     return [=](const std::string& option,
-               const std::string& word) -> std::variant<COleDateTime, Refusal> {
-        const std::optional<COleDateTime> date = isoDate(word);
-        if (!date)
-            return mustBe(option, "a date such as 2026-06-21", word);
-        if (!date->IsValid())
-            return mustBe(option, "a day of the calendar", word);
-        if (date->GetYear() < FIRST_YEAR || date->GetYear() > last_year)
+               const std::string& word) -> std::variant<WantedDay, Refusal> {
+        const std::optional<WantedDay> day = wantedDay(word);
+        if (!day)
             return mustBe(option,
-                          "in the years " + std::to_string(FIRST_YEAR) + " to " +
+                          "a date such as 2026-06-21, today, or a day such as solstice-june or "
+                          "equinox-march-2030",
+                          word);
+        const auto* const date = std::get_if<std::chrono::year_month_day>(&*day);
+        if (date && (!date->ok() || date->year() == std::chrono::year(0)))
+            return mustBe(option, "a day of the calendar", word);
+        const std::optional<int> year = yearOf(*day);
+        if (year && (*year < FIRST_SUN_YEAR || *year > last_year))
+            return mustBe(option,
+                          "in the years " + std::to_string(FIRST_SUN_YEAR) + " to " +
                               std::to_string(last_year),
                           word);
-        return *date;
+        return *day;
     };
+}
+
+Reading<WantedTime> timeOfTheSun() {
+    return reading<WantedTime>(
+        "a time from 00:00 to 23:59, or one such as sunrise+1h and sunset-30m", &wantedTime);
+}
+
+Reading<std::chrono::minutes> timeByTheClock() {
+    return reading<std::chrono::minutes>("a time from 00:00 to 23:59", &timeOfDay);
 }
 
 } // namespace quarn::program

@@ -1,29 +1,23 @@
 #pragma once
 
-#include "quarn/scripts/CivilSite.h"
+#include "host/session/SunPath.h"
 #include "quarn/session/HostSession.h"
-#include "quarn/words/Words.h"
+#include "quarn/words/Outcome.h"
 
 #include <filesystem>
-#include <optional>
 #include <string>
 
 namespace quarn::program {
 
 /// A sun path diagram that is to be written.
-struct SunPathRequest {
-    CivilSite site;
-    int year = 0;
-    bool is_stereographic = true;
-    bool is_orthographic = false;
-    std::optional<double> north_deg;
+struct SunPathOrder {
+    SunPathRequest diagram;
     std::filesystem::path model; ///< empty: none
-    std::optional<Triple> point; ///< in model units; with a model this or an object
-    std::string object;          ///< its name or id
-    std::filesystem::path file;
+    std::string zone_note{};     ///< a sentence without its full stop; empty: nothing
+    CommonOptions common;
 };
 
 /// `quarn sunpath`: draws the diagram, with what the model hides of the sky where there is one.
-Outcome drawSunPath(const SunPathRequest& request, const CommonOptions& common);
+Outcome drawSunPath(const SunPathOrder& order);
 
 } // namespace quarn::program

@@ -9,8 +9,8 @@ namespace quarn {
 
 namespace {
 
-constexpr int LAYOUT_MAJOR = 1;
-constexpr int LAYOUT_MINOR = 0;
+constexpr int LIGHT_LAYOUT_MAJOR = 1;
+constexpr int LIGHT_LAYOUT_MINOR = 0;
 
 /// A choice as it stands in the file.
 struct LightFieldsOfFile {
@@ -34,7 +34,7 @@ template <class Step, class AnyFields> bool choiceFields(Step step, AnyFields& f
 /// Of a newer minor layout, what follows is passed over.
 bool endLayout(KM_BinaryArchive& archive, int minor) {
     std::span<const std::uint8_t> rest;
-    return minor == LAYOUT_MINOR || archive.ViewBytes(archive.BytesLeft(), rest);
+    return minor == LIGHT_LAYOUT_MINOR || archive.ViewBytes(archive.BytesLeft(), rest);
 }
 
 } // namespace
@@ -47,7 +47,7 @@ bool writeLightChoice(KM_BinaryArchive& archive, const LightChoice& choice) {
                                    choice.background,
                                    choice.background_color,
                                    choice.has_ground};
-    return archive.Write3dmChunkVersion(LAYOUT_MAJOR, LAYOUT_MINOR) &&
+    return archive.Write3dmChunkVersion(LIGHT_LAYOUT_MAJOR, LIGHT_LAYOUT_MINOR) &&
            choiceFields(FieldWriter(archive), fields);
 }
 
@@ -58,7 +58,7 @@ bool readLightChoice(KM_BinaryArchive& archive, LightChoice& choice) {
     if (!archive.Read3dmChunkVersion(major, minor) || !choiceFields(FieldReader(archive), fields) ||
         !endLayout(archive, minor))
         return false;
-    if (major != LAYOUT_MAJOR)
+    if (major != LIGHT_LAYOUT_MAJOR)
         return archive.Fail();
     choice.surroundings = fields.surroundings;
     choice.picture = pathFromText(fields.picture.View());

@@ -8,8 +8,8 @@ namespace quarn {
 
 namespace {
 
-constexpr int LAYOUT_MAJOR = 1;
-constexpr int LAYOUT_MINOR = 0;
+constexpr int PLACE_LAYOUT_MAJOR = 1;
+constexpr int PLACE_LAYOUT_MINOR = 0;
 
 template <class Step, class Place> bool placeFields(Step step, Place& place) {
     return step(place.city) && step(place.zone) && step(place.latitude_deg) &&
@@ -21,7 +21,7 @@ template <class Step, class Place> bool placeFields(Step step, Place& place) {
 } // namespace
 
 bool writeStudiedPlace(KM_BinaryArchive& archive, const StudiedPlace& place) {
-    return archive.Write3dmChunkVersion(LAYOUT_MAJOR, LAYOUT_MINOR) &&
+    return archive.Write3dmChunkVersion(PLACE_LAYOUT_MAJOR, PLACE_LAYOUT_MINOR) &&
            placeFields(FieldWriter(archive), place);
 }
 
@@ -31,9 +31,9 @@ bool readStudiedPlace(KM_BinaryArchive& archive, StudiedPlace& place) {
     if (!archive.Read3dmChunkVersion(major, minor) || !placeFields(FieldReader(archive), place))
         return false;
     std::span<const std::uint8_t> rest;
-    if (minor != LAYOUT_MINOR && !archive.ViewBytes(archive.BytesLeft(), rest))
+    if (minor != PLACE_LAYOUT_MINOR && !archive.ViewBytes(archive.BytesLeft(), rest))
         return false;
-    return major == LAYOUT_MAJOR || archive.Fail();
+    return major == PLACE_LAYOUT_MAJOR || archive.Fail();
 }
 
 } // namespace quarn

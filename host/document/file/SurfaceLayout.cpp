@@ -9,8 +9,8 @@ namespace quarn {
 
 namespace {
 
-constexpr int LAYOUT_MAJOR = 1;
-constexpr int LAYOUT_MINOR = 0;
+constexpr int SURFACE_LAYOUT_MAJOR = 1;
+constexpr int SURFACE_LAYOUT_MINOR = 0;
 
 /// The qualities as numbers that can be compared; of textures only whether they are there.
 class QualityNumbers {
@@ -87,7 +87,7 @@ private:
 /// Of a newer minor layout, what follows is passed over.
 bool endSurface(KM_BinaryArchive& archive, int minor) {
     std::span<const std::uint8_t> rest;
-    return minor == LAYOUT_MINOR || archive.ViewBytes(archive.BytesLeft(), rest);
+    return minor == SURFACE_LAYOUT_MINOR || archive.ViewBytes(archive.BytesLeft(), rest);
 }
 
 } // namespace
@@ -106,7 +106,7 @@ bool losesSurfaces(const DocumentContent& content) {
 bool writeSurface(KM_BinaryArchive& archive, const Material& material, const SharedPlaces& places) {
     Material drawable = material;
     makeDrawable(drawable);
-    return archive.Write3dmChunkVersion(LAYOUT_MAJOR, LAYOUT_MINOR) &&
+    return archive.Write3dmChunkVersion(SURFACE_LAYOUT_MAJOR, SURFACE_LAYOUT_MINOR) &&
            qualityFields(QualityWriter(archive, places), drawable);
 }
 
@@ -117,7 +117,7 @@ bool readSurface(KM_BinaryArchive& archive, SharedContent& shared) {
     if (!archive.Read3dmChunkVersion(major, minor) ||
         !qualityFields(QualityReader(archive, shared), *material) || !endSurface(archive, minor))
         return false;
-    if (major != LAYOUT_MAJOR)
+    if (major != SURFACE_LAYOUT_MAJOR)
         return archive.Fail();
     makeDrawable(*material);
     shared.materials.back() = std::move(material);
