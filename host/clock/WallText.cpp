@@ -10,34 +10,41 @@ namespace {
 
 using namespace std::chrono;
 
-struct Shown {
-    std::string date;
-    std::string time;
-};
+std::string formatted(const char* form, int first, int second, int third = 0) {
+    std::array<char, 48> text{};
+    std::snprintf(text.data(), text.size(), form, first, second, third);
+    return text.data();
+}
 
-Shown shown(const WallTime& wall) {
-    const auto minute = floor<minutes>(wall.local + 30s);
-    const auto day = floor<days>(minute);
-    const year_month_day date{day};
-    const hh_mm_ss time{minute - day};
-    std::array<char, 32> text{};
-    std::snprintf(text.data(), text.size(), "%04d-%02u-%02u", int(date.year()),
-                  unsigned(date.month()), unsigned(date.day()));
-    Shown both{text.data(), {}};
-    std::snprintf(text.data(), text.size(), "%02d:%02d", int(time.hours().count()),
-                  int(time.minutes().count()));
-    both.time = text.data();
-    return both;
+local_seconds toTheMinute(const WallTime& wall) {
+    return floor<minutes>(wall.local + 30s);
+}
+
+std::string timeOfDay(local_seconds local, const char* form) {
+    const hh_mm_ss time{local - floor<days>(local)};
+    return formatted(form, int(time.hours().count()), int(time.minutes().count()),
+                     int(time.seconds().count()));
+}
+
+constexpr const char* TO_THE_SECOND = "%02d:%02d:%02d";
+
+std::string dateText(local_seconds local) {
+    return quarn::dateText(year_month_day{floor<days>(local)});
 }
 
 } // namespace
 
+std::string dateText(year_month_day day) {
+    return formatted("%04d-%02d-%02d", int(day.year()), static_cast<int>(unsigned(day.month())),
+                     static_cast<int>(unsigned(day.day())));
+}
+
 std::string dateText(const WallTime& wall) {
-    return shown(wall).date;
+    return dateText(toTheMinute(wall));
 }
 
 std::string timeText(const WallTime& wall) {
-    return shown(wall).time;
+    return timeOfDay(toTheMinute(wall), "%02d:%02d");
 }
 
 std::string timeWithZone(const WallTime& wall) {
@@ -49,8 +56,16 @@ std::string dateAndTime(const WallTime& wall) {
 }
 
 std::string isoText(const WallTime& wall) {
-    const Shown both = shown(wall);
-    return both.date + "T" + both.time + ":00";
+    return dateText(wall) + "T" + timeOfDay(toTheMinute(wall), TO_THE_SECOND);
+}
+
+std::string isoTextWithOffset(const WallTime& wall) {
+    const hh_mm_ss offset{wall.offset};
+    const char* const form = offset.seconds() == 0s ? "%02d:%02d" : TO_THE_SECOND;
+    return dateText(wall.local) + "T" + timeOfDay(wall.local, TO_THE_SECOND) +
+           (offset.is_negative() ? "-" : "+") +
+           formatted(form, int(offset.hours().count()), int(offset.minutes().count()),
+                     int(offset.seconds().count()));
 }
 
 std::string offsetText(const WallTime& wall) {

@@ -10,8 +10,8 @@ namespace {
 using std::chrono::seconds;
 using std::chrono::sys_seconds;
 
-constexpr double RADIANS_PER_DEGREE = std::numbers::pi / 180;
-constexpr double SECONDS_PER_DEGREE = 240; // of the hour angle
+constexpr double RADIANS_OF_DEGREE = std::numbers::pi / 180;
+constexpr double SECONDS_OF_HOUR_ANGLE = 240; // of the hour angle
 
 /// The altitude has one highest and one lowest point a day: looks at this distance see each of them
 /// as a look that lies above or below both of its neighbours.
@@ -24,13 +24,13 @@ struct Look {
 };
 
 double hourAngle(const SunSite& site, const SunPosition& sun) {
-    const double latitude = site.latitude_deg * RADIANS_PER_DEGREE;
-    const double azimuth = sun.azimuth_deg * RADIANS_PER_DEGREE;
-    const double altitude = sun.altitude_deg * RADIANS_PER_DEGREE;
+    const double latitude = site.latitude_deg * RADIANS_OF_DEGREE;
+    const double azimuth = sun.azimuth_deg * RADIANS_OF_DEGREE;
+    const double altitude = sun.altitude_deg * RADIANS_OF_DEGREE;
     return std::atan2(-std::cos(altitude) * std::sin(azimuth),
                       std::sin(altitude) * std::cos(latitude) -
                           std::cos(altitude) * std::sin(latitude) * std::cos(azimuth)) /
-           RADIANS_PER_DEGREE;
+           RADIANS_OF_DEGREE;
 }
 
 /// The sky of one place, looked at in the course of time.
@@ -73,7 +73,8 @@ public:
         constexpr int ROUNDS = 3; // the sun's own motion changes the hour angle by a thousandth
         Look look = before;
         for (int round = 0; round < ROUNDS; ++round)
-            look = at(look.time - seconds(std::llround(look.hour_angle_deg * SECONDS_PER_DEGREE)));
+            look =
+                at(look.time - seconds(std::llround(look.hour_angle_deg * SECONDS_OF_HOUR_ANGLE)));
         return look.time;
     }
 

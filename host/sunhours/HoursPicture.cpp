@@ -10,7 +10,6 @@ namespace quarn {
 namespace {
 
 constexpr KM_Color PAPER{255, 255, 255, 255};
-constexpr KM_Color INK{24, 26, 30, 255};
 constexpr double BORDER_SHARE = 0.45; ///< where another object begins
 constexpr double CREASE_SHARE = 0.2;
 constexpr double ISOLINE_SHARE = 0.85;
@@ -21,7 +20,7 @@ constexpr float EDGE_COSINE = 0.9F;
 constexpr int ISOLINE_REACH = 4;
 constexpr double ISOLINE_SURROUNDINGS = 0.7;
 /// Around a whole number of lines means of even places would flicker.
-constexpr double HOUR_DIGITS = 0.02;
+constexpr double ISOLINE_DIGITS = 0.02;
 
 /// Four places of a pixel, no two in a row or column.
 constexpr int SAMPLES = 4;
@@ -81,7 +80,7 @@ public:
         for (int y = 0; y < image.height; ++y)
             for (int x = 0; x < image.width; ++x) {
                 if (isBorder(x, y, x + 1, y) || isBorder(x, y, x, y + 1))
-                    cover(image, x, y, INK, isCrease(x, y) ? CREASE_SHARE : BORDER_SHARE);
+                    cover(image, x, y, SHEET_INK, isCrease(x, y) ? CREASE_SHARE : BORDER_SHARE);
                 else if (!bands.empty() &&
                          (isIsoline(bands, x, y, x + 1, y) || isIsoline(bands, x, y, x, y + 1)))
                     cover(image, x, y, PAPER, ISOLINE_SHARE);
@@ -145,7 +144,7 @@ private:
                 }
         if (m_map.object(x, y) == 0 || same < ISOLINE_SURROUNDINGS * ALL)
             return -1.0;
-        return std::floor((sum / same + HOUR_DIGITS) / m_request.isoline_hours);
+        return std::floor((sum / same + ISOLINE_DIGITS) / m_request.isoline_hours);
     }
 
     bool isIsoline(const std::vector<double>& bands, int ax, int ay, int bx, int by) const {

@@ -4,14 +4,12 @@
 
 #include <algorithm>
 #include <cmath>
-#include <cstdio>
 #include <numbers>
 
 namespace quarn {
 
 namespace {
 
-constexpr KM_Color INK{24, 26, 30, 255};
 constexpr KM_Color QUIET{92, 96, 102, 255};
 
 /// All lengths follow from the picture's, so that sheets of any size look alike.
@@ -42,13 +40,6 @@ std::string dayText(const std::chrono::year_month_day& day) {
     return std::to_string(static_cast<unsigned>(day.day())) + " " +
            MONTHS[static_cast<unsigned>(day.month()) - 1] + " " +
            std::to_string(static_cast<int>(day.year()));
-}
-
-std::string timeText(std::chrono::minutes time) {
-    char text[16];
-    std::snprintf(text, sizeof text, "%02d:%02d", static_cast<int>(time.count() / 60),
-                  static_cast<int>(time.count() % 60));
-    return text;
 }
 
 Image whiteSheet(int width, int height) {
@@ -94,11 +85,11 @@ void drawLegend(Image& sheet, const SheetSizes& sizes, int top, const SunHoursRe
     for (int hour = 0; hour <= static_cast<int>(end); hour += step) {
         const int x = left + static_cast<int>(std::lround(width * hour / end));
         const int tick = std::min(x, left + width - 1);
-        fillBox(sheet, tick, top + height, tick + 1, top + height + height / 3, INK);
+        fillBox(sheet, tick, top + height, tick + 1, top + height + height / 3, SHEET_INK);
         const std::string label = std::to_string(hour) + (hour == 0 ? "" : " h");
         const double across = text.width(label, sizes.unit);
         text.draw(sheet, std::clamp(x - 0.5 * across, double(left), left + width - across),
-                  top + height + 1.35 * sizes.unit, label, sizes.unit, INK);
+                  top + height + 1.35 * sizes.unit, label, sizes.unit, SHEET_INK);
     }
     const std::string words = std::string("Hours of direct sun") +
                               (moments.days > 1 ? " a day, mean of the days" : "") + "; " +
@@ -131,11 +122,11 @@ void drawNorth(Image& sheet, double x, double y, double radius, double north_deg
             }
             const int px = static_cast<int>(std::lround(x)) + i;
             const int py = static_cast<int>(std::lround(y)) + j;
-            cover(sheet, px, py, INK, double(std::max(ring, needle)) / (FINE * FINE));
+            cover(sheet, px, py, SHEET_INK, double(std::max(ring, needle)) / (FINE * FINE));
         }
     const double size = 0.75 * radius;
     text.draw(sheet, x + 1.45 * radius * nx - 0.5 * text.width("N", size),
-              y + 1.45 * radius * ny + 0.36 * size, "N", size, INK);
+              y + 1.45 * radius * ny + 0.36 * size, "N", size, SHEET_INK);
 }
 
 } // namespace
@@ -155,13 +146,13 @@ std::string errorText(const SunHoursRequest& request) {
 }
 
 std::string subtitleOf(const SunHoursRequest& request, const SunMoments& moments) {
-    std::string text = request.place.empty() ? "" : request.place + " · ";
+    std::string text = request.site.place.empty() ? "" : request.site.place + " · ";
     text += daysText(request);
     if (request.from || request.to)
-        text += " · " + timeText(request.from.value_or(std::chrono::minutes(0))) + " to " +
-                timeText(request.to.value_or(std::chrono::hours(24)));
+        text += " · " + (request.from ? wantedTimeText(*request.from) : "00:00") + " to " +
+                (request.to ? wantedTimeText(*request.to) : "24:00");
     if (!moments.moments.empty())
-        text += " (" + request.zone.at(moments.moments.front().time).abbreviation + ")";
+        text += " (" + request.site.zone.at(moments.moments.front().time).abbreviation + ")";
     text += " · at most " + hoursText(moments.hours);
     return text;
 }
@@ -174,7 +165,7 @@ Image sheetOf(const Image& map, const SunHoursRequest& request, const SunMoments
     const double room = map.width - 4.5 * sizes.unit; // the arrow stands beside them
     const std::string title = "Hours of sun · " + request.title;
     text.draw(sheet, sizes.margin, 2.2 * sizes.unit, title,
-              fittingSize(text, title, 1.55 * sizes.unit, room), INK);
+              fittingSize(text, title, 1.55 * sizes.unit, room), SHEET_INK);
     const std::string subtitle = subtitleOf(request, moments);
     text.draw(sheet, sizes.margin, 3.8 * sizes.unit, subtitle,
               fittingSize(text, subtitle, sizes.unit, room), QUIET);
@@ -183,7 +174,7 @@ Image sheetOf(const Image& map, const SunHoursRequest& request, const SunMoments
     if (request.is_plan) {
         const double radius = 1.1 * sizes.unit;
         drawNorth(sheet, sizes.margin + map.width - 1.8 * radius, 2.6 * sizes.unit, radius,
-                  request.north_deg, text);
+                  request.site.north_deg, text);
     }
     return sheet;
 }

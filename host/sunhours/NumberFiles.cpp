@@ -10,7 +10,7 @@ namespace quarn {
 namespace {
 
 /// Sums of steps that should meet the threshold may miss it by their last digits.
-constexpr double HOUR_DIGITS = 1e-4;
+constexpr double THRESHOLD_DIGITS = 1e-4;
 
 constexpr float LOOKING_UP = 0.70710678F;
 
@@ -21,7 +21,7 @@ struct Sums {
 
     void add(float of_point, double threshold_hours) {
         hours += double{of_point};
-        reaching += double{of_point} >= threshold_hours - HOUR_DIGITS ? 1.0 : 0.0;
+        reaching += double{of_point} >= threshold_hours - THRESHOLD_DIGITS ? 1.0 : 0.0;
         count += 1.0;
     }
     double mean(double sum) const { return count > 0.0 ? sum / count : 0.0; }

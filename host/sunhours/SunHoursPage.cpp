@@ -97,7 +97,7 @@ std::string timeText(const WallTime& time) {
 nlohmann::json timesOf(const SunHoursPage& page) {
     nlohmann::json times = nlohmann::json::array();
     for (const SunMoment& moment : page.moments.moments)
-        times.push_back(timeText(page.request.zone.at(moment.time)));
+        times.push_back(timeText(page.request.site.zone.at(moment.time)));
     return times;
 }
 

@@ -1,6 +1,7 @@
 #pragma once
 
-#include "host/clock/Zone.h"
+#include "host/almanac/CivilSite.h"
+#include "host/almanac/DayTimes.h"
 
 #include <chrono>
 #include <filesystem>
@@ -12,18 +13,14 @@ namespace quarn {
 /// What hours of sun are asked for, of which picture, and where they go.
 struct SunHoursRequest {
     std::string title; ///< UTF-8: of the model
-    std::string place; ///< UTF-8: "Athens, Greece"
-    double latitude_deg = 0.0;
-    double longitude_deg = 0.0;
-    double north_deg = 0.0; ///< clockwise from the model's Y axis
-    Zone zone = Zone::fixed(std::chrono::minutes(0));
+    CivilSite site;
 
     std::chrono::year_month_day first_day{};
     std::chrono::year_month_day last_day{};
-    int every_days = 1;                       ///< from 1
-    std::optional<std::chrono::minutes> from; ///< since midnight by the clock; none: midnight
-    std::optional<std::chrono::minutes> to;   ///< none: the midnight that ends the day
-    int every_minutes = 10;                   ///< from 1
+    int every_days = 1;             ///< from 1
+    std::optional<WantedTime> from; ///< of each day; none: midnight
+    std::optional<WantedTime> to;   ///< none: the midnight that ends the day
+    int every_minutes = 10;         ///< from 1
 
     bool is_plan = false; ///< straight from above; else as the active view sees it
     int width_px = 1280;

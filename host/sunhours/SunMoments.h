@@ -16,7 +16,8 @@ struct SunMoment {
 /// The moments of the days that are asked for, in their order: at each step from `from` on, and at
 /// `to`. A moment stands for the halves of the spans on its two sides, so that together they last
 /// from `from` to `to`; an hour that clocks skip is not there, one that they show twice is there
-/// twice.
+/// twice. Ends that are told from sunrise or sunset are each day's own, and midnight on days
+/// without.
 struct SunMoments {
     std::vector<SunMoment> moments;
     int days = 0;

@@ -3,14 +3,13 @@
 #include "host/session/InstructionSets.h"
 #include "host/session/MemorySize.h"
 #include "host/session/RecordingCheck.h"
+#include "host/sun/SunYears.h"
 
 #include <algorithm>
 
 namespace quarn::program {
 
 namespace {
-
-constexpr int FIRST_YEAR = 1800; // as the host's sun takes them
 
 /// A reading that knows one reason to refuse a word.
 /// @param read  nothing for a word that is not as demanded
@@ -35,6 +34,14 @@ std::string alternatives(const std::vector<std::string>& words) {
     return text;
 }
 
+bool isWithin(int year, int last_year) {
+    return year >= FIRST_SUN_YEAR && year <= last_year;
+}
+
+std::string yearsUntil(int last_year) {
+    return "in the years " + std::to_string(FIRST_SUN_YEAR) + " to " + std::to_string(last_year);
+}
+
 } // namespace
 
 Refusal mustBe(const std::string& option, const std::string& demand, const std::string& word) {
@@ -48,6 +55,11 @@ Reading<int> wholeNumberFrom(int low, std::optional<int> high, const std::string
         const std::optional<int> number = wholeNumber(word);
         return number && *number >= low && (!high || *number <= *high) ? number : std::nullopt;
     });
+}
+
+Reading<int> minutesOfADay() {
+    constexpr int MINUTES_OF_DAY = 1440;
+    return wholeNumberFrom(1, MINUTES_OF_DAY, "minutes");
 }
 
 Reading<double> numberFrom(double low, double high, const std::string& unit) {
@@ -139,21 +151,48 @@ Reading<FrameRanges> frameRanges() {
     };
 }
 
-Reading<COleDateTime> dateUntil(int last_year) {
-    return [=](const std::string& option,
-               const std::string& word) -> std::variant<COleDateTime, Refusal> {
-        const std::optional<COleDateTime> date = isoDate(word);
+Reading<std::chrono::year_month_day> dateUntil(int last_year) {
+    using Date = std::chrono::year_month_day;
+    return [=](const std::string& option, const std::string& word) -> std::variant<Date, Refusal> {
+        const std::optional<Date> date = isoDate(word);
         if (!date)
             return mustBe(option, "a date such as 2026-06-21", word);
-        if (!date->IsValid())
+        if (!date->ok() || date->year() == std::chrono::year(0))
             return mustBe(option, "a day of the calendar", word);
-        if (date->GetYear() < FIRST_YEAR || date->GetYear() > last_year)
-            return mustBe(option,
-                          "in the years " + std::to_string(FIRST_YEAR) + " to " +
-                              std::to_string(last_year),
-                          word);
+        if (!isWithin(int(date->year()), last_year))
+            return mustBe(option, yearsUntil(last_year), word);
         return *date;
     };
+}
+
+Reading<WantedDay> dayOfTheSun() {
+    return
+        [](const std::string& option, const std::string& word) -> std::variant<WantedDay, Refusal> {
+            const std::optional<WantedDay> day = wantedDay(word);
+            if (!day)
+                return mustBe(option,
+                              "a date such as 2026-06-21, today, or a day such as solstice-june or "
+                              "equinox-march-2030",
+                              word);
+            if (const SeasonDay* const season = std::get_if<SeasonDay>(&*day)) {
+                if (season->year && !isSunYear(*season->year))
+                    return mustBe(option, yearsUntil(LAST_SUN_YEAR), word);
+            } else if (std::holds_alternative<std::chrono::year_month_day>(*day)) {
+                auto date = dateUntil(LAST_SUN_YEAR)(option, word);
+                if (Refusal* const refusal = std::get_if<Refusal>(&date))
+                    return std::move(*refusal);
+            }
+            return *day;
+        };
+}
+
+Reading<WantedTime> timeOfTheSun() {
+    return reading<WantedTime>(
+        "a time from 00:00 to 23:59, or one such as sunrise+1h and sunset-30m", &wantedTime);
+}
+
+Reading<std::chrono::minutes> timeByTheClock() {
+    return reading<std::chrono::minutes>("a time from 00:00 to 23:59", &timeOfDay);
 }
 
 } // namespace quarn::program

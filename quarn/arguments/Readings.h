@@ -1,7 +1,8 @@
 #pragma once
 
+#include "host/almanac/DayTimes.h"
+#include "host/almanac/WantedDay.h"
 #include "quarn/arguments/OptionAdder.h"
-#include "quarn/words/DateWords.h"
 #include "quarn/words/FrameRanges.h"
 
 #include <cstdint>
@@ -17,6 +18,8 @@ Refusal mustBe(const std::string& option, const std::string& demand, const std::
 /// @param high  nothing: as large as a number can be
 /// @param unit  what is counted; empty: nothing
 Reading<int> wholeNumberFrom(int low, std::optional<int> high = {}, const std::string& unit = "");
+/// A step of a day.
+Reading<int> minutesOfADay();
 Reading<double> numberFrom(double low, double high, const std::string& unit = "");
 Reading<Triple> point();
 Reading<PixelSize> sizeOfPicture();
@@ -44,6 +47,20 @@ Reading<std::filesystem::path> savedDocument();
 Reading<FrameRanges> frameRanges();
 
 /// A day of the calendar from the first year that sun studies know.
-Reading<COleDateTime> dateUntil(int last_year);
+Reading<std::chrono::year_month_day> dateUntil(int last_year);
+
+/// What help says of the days that dayOfTheSun reads.
+inline constexpr const char* DAY_HELP =
+    "The day, such as 2026-06-21, or solstice-june, solstice-december, equinox-march or "
+    "equinox-september of this year; solstice-june-2030 is of another one (default: today)";
+
+/// A date, or a day that the sun's course names, of the years that the sun is known in.
+Reading<WantedDay> dayOfTheSun();
+
+/// A time by the clock, or one that is told from sunrise or sunset.
+Reading<WantedTime> timeOfTheSun();
+
+/// A time by the clock, since midnight.
+Reading<std::chrono::minutes> timeByTheClock();
 
 } // namespace quarn::program

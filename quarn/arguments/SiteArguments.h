@@ -1,36 +1,40 @@
 #pragma once
 
-#include "host/cities/Cities.h"
+#include "ground/Result.h"
+#include "host/almanac/CivilSite.h"
 #include "quarn/arguments/OptionAdder.h"
-#include "quarn/scripts/CivilSite.h"
 
+#include <filesystem>
 #include <optional>
 #include <string>
 
 namespace quarn::program {
-
-/// A city by its name.
-Reading<const City*> cityName();
 
 /// A place on the earth as it is typed.
 struct TypedSite {
     const City* city = nullptr;
     std::optional<double> latitude_deg;
     std::optional<double> longitude_deg;
-    std::string zone;
+    std::optional<double> north_deg;
+    std::string zone; ///< empty: that of the place
 };
 
 /// Adds --place, --latitude, --longitude and --zone.
 void addSite(const OptionAdder& add, TypedSite& typed);
 
-/// Whether a place was typed at all.
-bool isTyped(const TypedSite& typed);
+/// Adds the same, of a model that may state its place itself, and --north.
+void addSiteOfModel(const OptionAdder& add, TypedSite& typed);
 
-/// Takes what was typed together.
-/// @return what does not go together, or which zone there is not; else nothing
-std::optional<std::string> settleSite(const TypedSite& typed, CivilSite& site);
+/// A place with its clocks, and what a person should know of them.
+struct SettledSite {
+    CivilSite site;
+    bool has_north = false; ///< typed or stated; else the Y axis counts as north
+    std::string zone_note;  ///< a sentence without its full stop; empty: nothing
+};
 
-/// The zone of a place, where nobody typed one: that of the nearest known city.
-std::optional<std::string> settleZone(const std::string& typed_zone, CivilSite& site);
+/// Takes what was typed together; where no place was, the one that the model's file states.
+/// @param model  empty: there is none
+/// @return why there is no place, or no such zone
+Result<SettledSite> settleSite(const TypedSite& typed, const std::filesystem::path& model);
 
 } // namespace quarn::program

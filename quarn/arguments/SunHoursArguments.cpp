@@ -1,8 +1,8 @@
 // The command that tells how much sun each place gets.
-#include "host/cities/Cities.h"
-#include "host/session/StatedSite.h"
+#include "host/clock/WallText.h"
 #include "quarn/arguments/Readings.h"
 #include "quarn/arguments/RecordingArguments.h"
+#include "quarn/arguments/SiteArguments.h"
 #include "quarn/arguments/Subcommands.h"
 #include "quarn/runs/SunHoursRun.h"
 #include "quarn/words/AnimationName.h"
@@ -11,104 +11,61 @@ namespace quarn::program {
 
 namespace {
 
-constexpr int LAST_YEAR = 2199;
-constexpr int MINUTES_OF_DAY = 1440;
 constexpr int DAYS_OF_YEAR = 366;
 constexpr const char* PLAN = "plan";
 
 /// What is typed; what it means together is found out when all words are read.
 struct TypedHours {
     SunHoursWish wish{};
-    const City* city = nullptr;
-    std::optional<double> latitude_deg;
-    std::optional<double> longitude_deg;
-    std::optional<double> north_deg;
-    std::optional<std::string> zone;
-    COleDateTime date;
-    std::optional<COleDateTime> last_date;
-    std::optional<ClockTime> from;
-    std::optional<ClockTime> to;
+    TypedSite site;
+    WantedDay day;
+    std::optional<WantedDay> last_day;
     PixelSize size{};
 };
 
-Reading<const City*> knownCity() {
-    return [](const std::string& option,
-              const std::string& word) -> std::variant<const City*, Refusal> {
-        if (const City* const city = findCity(word))
-            return city;
-        return Refusal{option + ": " + whyNoCity(word) +
-                       " quarn places lists those that are known."};
-    };
-}
-
-std::chrono::year_month_day dayOf(const COleDateTime& date) {
-    return std::chrono::year_month_day(std::chrono::year(date.GetYear()),
-                                       std::chrono::month(static_cast<unsigned>(date.GetMonth())),
-                                       std::chrono::day(static_cast<unsigned>(date.GetDay())));
-}
-
-std::optional<std::chrono::minutes> minutesOf(const std::optional<ClockTime>& time) {
-    if (!time)
-        return std::nullopt;
-    return std::chrono::minutes(60 * time->hour + time->minute);
-}
-
-/// The place, without its clock.
 std::optional<std::string> settlePlace(TypedHours& typed) {
-    SunHoursRequest& hours = typed.wish.hours;
-    const bool has_coordinate = typed.latitude_deg || typed.longitude_deg;
-    if (typed.city && has_coordinate)
-        return "give either --place, or --latitude and --longitude.";
-    if (has_coordinate && !(typed.latitude_deg && typed.longitude_deg))
-        return "--latitude and --longitude go together.";
-    if (typed.city) {
-        hours.place = nameWithCountry(*typed.city);
-        hours.latitude_deg = typed.city->latitude_deg;
-        hours.longitude_deg = typed.city->longitude_deg;
-    } else if (has_coordinate) {
-        hours.latitude_deg = *typed.latitude_deg;
-        hours.longitude_deg = *typed.longitude_deg;
-    } else {
-        const std::optional<StatedSite> stated = statedSite(typed.wish.model);
-        if (!stated)
-            return "say where the model stands with --place, or with --latitude and --longitude; "
-                   "quarn places lists the places.";
-        hours.latitude_deg = stated->latitude_deg;
-        hours.longitude_deg = stated->longitude_deg;
-        hours.north_deg = stated->north_angle_deg;
-    }
-    hours.north_deg = typed.north_deg.value_or(hours.north_deg);
+    auto settled = settleSite(typed.site, typed.wish.model);
+    if (!settled)
+        return settled.message();
+    typed.wish.hours.site = std::move(settled.value().site);
+    if (const std::string& note = settled.value().zone_note; !note.empty())
+        typed.wish.notes.push_back(note);
     return std::nullopt;
 }
 
-/// The zone that was named, that of the city, or that of the city that is nearest.
-std::optional<std::string> settleClock(TypedHours& typed) {
-    SunHoursRequest& hours = typed.wish.hours;
-    const City& nearest = nearestCity(hours.latitude_deg, hours.longitude_deg);
-    const std::string name =
-        typed.zone ? *typed.zone : std::string(typed.city ? typed.city->zone : nearest.zone);
-    const auto zone = Zone::written(name, hours.longitude_deg);
-    if (!zone)
-        return (typed.zone ? "--zone: " : "") + zone.message();
-    hours.zone = zone.value();
-    if (!typed.zone && !typed.city)
-        typed.wish.zone_note = "Times are those of " + hours.zone.name() + ", the zone of " +
-                               nameWithCountry(nearest) + "; --zone names another one.\n";
-    return std::nullopt;
-}
-
+/// Looks at the times of the first day, before a model is read; those of the days behind it that
+/// are not there count as SunMoments has it.
 std::optional<std::string> settleTimes(TypedHours& typed) {
-    SunHoursRequest& hours = typed.wish.hours;
-    hours.first_day = dayOf(typed.date);
-    hours.last_day = dayOf(typed.last_date.value_or(typed.date));
-    hours.from = minutesOf(typed.from);
-    hours.to = minutesOf(typed.to);
-    if (std::chrono::sys_days(hours.last_day) < std::chrono::sys_days(hours.first_day))
-        return "--to-date " + dateText(*typed.last_date) + " is before --date " +
-               dateText(typed.date) + ".";
-    if (typed.to && minutesOf(typed.to) <= hours.from.value_or(std::chrono::minutes(0)))
+    const SunHoursRequest& hours = typed.wish.hours;
+    std::optional<std::chrono::sys_seconds> ends[2];
+    for (const bool is_end : {false, true}) {
+        const auto& wanted = is_end ? hours.to : hours.from;
+        const FoundMoment found =
+            findTime(hours.site, hours.first_day, wanted.value_or(WantedTime()),
+                     is_end ? "--to" : "--from", is_end);
+        if (!found.mistake.empty() && (wanted || found.kind == FoundMoment::Kind::no_day))
+            return found.mistake;
+        if (!wanted)
+            continue;
+        if (!found.note.empty())
+            typed.wish.notes.push_back(found.note);
+        ends[is_end] = found.time;
+    }
+    if (ends[1] &&
+        *ends[1] <=
+            ends[0].value_or(hours.site.zone.read(std::chrono::local_days(hours.first_day)).first))
         return "--to is not after --from: no time is between them.";
     return std::nullopt;
+}
+
+std::optional<std::string> settleDays(TypedHours& typed) {
+    SunHoursRequest& hours = typed.wish.hours;
+    hours.first_day = dayOf(typed.day, hours.site.zone);
+    hours.last_day = typed.last_day ? dayOf(*typed.last_day, hours.site.zone) : hours.first_day;
+    if (hours.last_day < hours.first_day)
+        return "--to-date " + dateText(hours.last_day) + " is before --date " +
+               dateText(hours.first_day) + ".";
+    return settleTimes(typed);
 }
 
 std::optional<std::string> settleView(TypedHours& typed) {
@@ -129,7 +86,7 @@ std::optional<std::string> settleView(TypedHours& typed) {
 }
 
 Outcome tellHours(TypedHours& typed) {
-    for (const auto settle : {settlePlace, settleClock, settleTimes, settleView})
+    for (const auto settle : {settlePlace, settleDays, settleView})
         if (const auto mistake = settle(typed))
             return Outcome::misuse(*mistake);
     SunHoursRequest& hours = typed.wish.hours;
@@ -138,32 +95,19 @@ Outcome tellHours(TypedHours& typed) {
     return writeSunHours(typed.wish);
 }
 
-void addSite(const OptionAdder& add, TypedHours& typed) {
-    add("--place", typed.city, "NAME", knownCity(),
-        "City where the model stands; quarn places lists them. An IFC file may state its own place "
-        "and north, which count where these options are left out");
-    add("--latitude", typed.latitude_deg, "DEG", numberFrom(-90, 90, "degrees"),
-        "Or: degrees north, -90 to 90");
-    add("--longitude", typed.longitude_deg, "DEG", numberFrom(-180, 180, "degrees"),
-        "and degrees east, -180 to 180; west is negative");
-    add("--north", typed.north_deg, "DEG", numberFrom(-360, 360, "degrees"),
-        "Where north is in the model, in degrees clockwise from its Y axis (default: 0)");
-    add("--zone", typed.zone, "NAME", scriptWord("the name of --zone"),
-        "The clock: a time zone such as Europe/Berlin, +05:30 or solar (default: the place's)");
-}
-
 void addTimes(const OptionAdder& add, TypedHours& typed) {
     SunHoursRequest& hours = typed.wish.hours;
-    add("--date", typed.date, "DATE", dateUntil(LAST_YEAR), "The day, such as 2026-03-21")
-        ->required();
-    add("--to-date", typed.last_date, "DATE", dateUntil(LAST_YEAR),
+    add("--date", typed.day, "DATE", dayOfTheSun(), DAY_HELP);
+    add("--to-date", typed.last_day, "DATE", dayOfTheSun(),
         "The last of several days: hours are the mean of a day then");
     add("--every-days", hours.every_days, "N", wholeNumberFrom(1, DAYS_OF_YEAR, "days"),
         "Days between those that are looked at, 1 to 366", "1");
-    add("--from", typed.from, "HH:MM", timeOfDay(),
-        "Time that hours count from, by the clock of the place (default: midnight)");
-    add("--to", typed.to, "HH:MM", timeOfDay(), "Time that they count to (default: midnight)");
-    add("--every", hours.every_minutes, "MINUTES", wholeNumberFrom(1, MINUTES_OF_DAY, "minutes"),
+    add("--from", hours.from, "TIME", timeOfTheSun(),
+        "Time that hours count from, by the clock of the place, such as 09:00, or each day's own "
+        "sunrise+1h (default: midnight)");
+    add("--to", hours.to, "TIME", timeOfTheSun(),
+        "Time that they count to, such as 15:00 or sunset-1h (default: midnight)");
+    add("--every", hours.every_minutes, "MINUTES", minutesOfADay(),
         "Minutes between the places of the sun, 1 to 1440", "10");
 }
 
@@ -210,10 +154,11 @@ Action addSunHours(CLI::App& command) {
     add("--up", wish.up_axis, "AXIS", oneOf({"y", "z"}),
         "Axis that points up in the file, y or z (default: y for glTF and such, z for OBJ, PLY, "
         "STL)");
-    addSite(add, *typed);
+    addSiteOfModel(add, typed->site);
     addTimes(add, *typed);
     addView(add, *typed);
     addResults(add, wish.hours);
+    command.add_flag("--overwrite", wish.common.overwrites, "Replace files that are there");
     addCommonOptions(command, wish.common);
     return [typed] { return tellHours(*typed); };
 }

@@ -1,10 +1,9 @@
 // The recordings whose sun moves, and the places that they know.
-#include "host/cities/Cities.h"
+#include "host/almanac/CourseChoice.h"
 #include "quarn/arguments/Readings.h"
 #include "quarn/arguments/RecordingArguments.h"
 #include "quarn/arguments/SiteArguments.h"
 #include "quarn/arguments/Subcommands.h"
-#include "quarn/arguments/TypedStudy.h"
 #include "quarn/reports/PlaceList.h"
 #include "quarn/scripts/SunStudyScript.h"
 
@@ -12,67 +11,17 @@ namespace quarn::program {
 
 namespace {
 
-constexpr int MINUTES_OF_DAY = 1440;
-
-Reading<std::chrono::year_month_day> dayUntil(int last_year) {
-    return [=](const std::string& option,
-               const std::string& word) -> std::variant<std::chrono::year_month_day, Refusal> {
-        const auto read = dateUntil(last_year)(option, word);
-        if (const Refusal* const refusal = std::get_if<Refusal>(&read))
-            return *refusal;
-        const COleDateTime& date = std::get<COleDateTime>(read);
-        return std::chrono::year(date.GetYear()) / date.GetMonth() / date.GetDay();
-    };
-}
-
-Reading<WantedDay> wantedDay() {
-    return
-        [](const std::string& option, const std::string& word) -> std::variant<WantedDay, Refusal> {
-            constexpr std::pair<std::string_view, SeasonDay> NAMED[] = {
-                {"equinox-march", SeasonDay::march_equinox},
-                {"solstice-june", SeasonDay::june_solstice},
-                {"equinox-september", SeasonDay::september_equinox},
-                {"solstice-december", SeasonDay::december_solstice}};
-            for (const auto& [name, day] : NAMED)
-                if (word == name)
-                    return WantedDay(day);
-            if (word == "today")
-                return WantedDay();
-            const auto read = dayUntil(LAST_YEAR_OF_DAY)(option, word);
-            if (const Refusal* const refusal = std::get_if<Refusal>(&read))
-                return *refusal;
-            return WantedDay(std::get<std::chrono::year_month_day>(read));
-        };
-}
-
-/// @param sun  whether sunrise and sunset count
-Reading<WantedTime> timeOfStudy(bool sun) {
-    return [=](const std::string& option,
-               const std::string& word) -> std::variant<WantedTime, Refusal> {
-        const auto time = wantedTime(word);
-        if (time && (sun || time->since == WantedTime::Since::midnight))
-            return *time;
-        return mustBe(option,
-                      std::string("a time from 00:00 to 23:59") +
-                          (sun ? ", or one such as sunrise+1h and sunset-30m" : ""),
-                      word);
-    };
-}
-
-void addSiteOptions(const OptionAdder& add, TypedStudy& typed) {
-    add("--place", typed.city, "NAME", cityName(),
-        "City where the model stands; quarn places lists them. An IFC file may state its own place "
-        "and north, which count where these options are left out");
-    add("--latitude", typed.latitude_deg, "DEG", numberFrom(-90, 90, "degrees"),
-        "Or: degrees north, -90 to 90");
-    add("--longitude", typed.longitude_deg, "DEG", numberFrom(-180, 180, "degrees"),
-        "and degrees east, -180 to 180; west is negative");
-    add("--north", typed.north_deg, "DEG", numberFrom(-360, 360, "degrees"),
-        "Where north is in the model, in degrees clockwise from its Y axis (default: 0)");
-    add("--zone", typed.zone, "ZONE", scriptWord("the name of --zone"),
-        "Clocks that times are of: a time zone such as Europe/Berlin, hours from UTC such as "
-        "+05:30, or solar for the mean time of the sun (default: those of the place)");
-}
+/// A study as it is typed: what it is made of is put together when all words are read.
+struct TypedStudy {
+    SunStudyRequest request{};
+    TypedSite site;
+    int step = 1;
+    WantedCourse day;                                      ///< of a day's study
+    std::optional<std::chrono::year_month_day> first_date; ///< of a season
+    std::optional<std::chrono::year_month_day> last_date;
+    std::chrono::minutes time{}; ///< of a season: since midnight
+    ScriptUse use;
+};
 
 void addViewOptions(const OptionAdder& add, StudyView& view) {
     add("--view", view.name, "NAME", scriptWord("the name of --view"),
@@ -89,17 +38,41 @@ void addViewOptions(const OptionAdder& add, StudyView& view) {
     addLens(add, view.lens_mm, "(default: 50; a document's own)");
 }
 
+std::optional<std::string> checkView(const StudyView& view) {
+    if (view.name && view.aims())
+        return "--view takes the place of --azimuth, --elevation and --target.";
+    if (view.lens_mm && view.isParallel())
+        return "--lens is for perspective views; --view " + *view.name + " has none.";
+    return std::nullopt;
+}
+
+/// Settles the place and the moments; the request's recording must be settled.
+std::optional<std::string> settleCourse(TypedStudy& typed) {
+    SunStudyRequest& request = typed.request;
+    const auto settled = settleSite(typed.site, request.recording.model);
+    if (!settled)
+        return settled.message();
+    const CivilSite& site = settled.value().site;
+    auto course =
+        request.course.kind == StudyCourse::Kind::one_day
+            ? courseOfDay(site, typed.day, typed.step)
+            : courseOfSeason(site, typed.first_date, typed.last_date, typed.time, typed.step);
+    if (!course)
+        return course.message();
+    request.course = std::move(course.value());
+    if (const std::string& note = settled.value().zone_note; !note.empty())
+        request.course.notes.insert(request.course.notes.begin(), note);
+    request.recording.frames = frameCount(request.course);
+    return std::nullopt;
+}
+
 Outcome recordStudy(TypedStudy& typed) {
     SunStudyRequest& request = typed.request;
     std::optional<std::string> mistake = settle(request.recording);
     if (!mistake)
-        mistake = settleSite(typed);
-    if (!mistake && request.view.name && request.view.aims())
-        mistake = "--view takes the place of --azimuth, --elevation and --target.";
-    if (!mistake && request.view.lens_mm && request.view.isParallel())
-        mistake = "--lens is for perspective views; --view " + *request.view.name + " has none.";
+        mistake = checkView(request.view);
     if (!mistake)
-        mistake = settleTimes(typed);
+        mistake = settleCourse(typed);
     if (mistake)
         return Outcome::misuse(*mistake);
     return recordOrShow(request.recording, sunStudyLines(request), typed.use);
@@ -116,39 +89,37 @@ Action finish(CLI::App& command, const std::shared_ptr<TypedStudy>& typed) {
 Action addDay(CLI::App& command) {
     const auto typed = std::make_shared<TypedStudy>();
     SunStudyRequest& request = typed->request;
-    request.kind = SunStudyRequest::Kind::one_day;
+    request.course.kind = StudyCourse::Kind::one_day;
     const OptionAdder add(command);
     addModelAndFolder(add, request.recording);
-    addSiteOptions(add, *typed);
-    add("--date", typed->day, "DATE", wantedDay(),
-        "The day, such as 2026-06-21, or this year's solstice-june, solstice-december, "
-        "equinox-march or equinox-september (default: today)");
-    add("--from", typed->first_time, "TIME", timeOfStudy(true),
+    addSiteOfModel(add, typed->site);
+    add("--date", typed->day.day, "DATE", dayOfTheSun(), DAY_HELP);
+    add("--from", typed->day.first, "TIME", timeOfTheSun(),
         "Time of the first picture, such as 06:30 or sunrise+1h (default: the first step of "
         "--every with the sun's centre above the horizon)");
-    add("--to", typed->last_time, "TIME", timeOfStudy(true),
+    add("--to", typed->day.last, "TIME", timeOfTheSun(),
         "Time that no picture is later than, such as 18:00 or sunset-30m (default: the last such "
         "step)");
-    add("--every", request.step, "MINUTES", wholeNumberFrom(1, MINUTES_OF_DAY, "minutes"),
-        "Minutes between pictures, 1 to 1440", "15");
+    add("--every", typed->step, "MINUTES", minutesOfADay(), "Minutes between pictures, 1 to 1440",
+        "15");
     return finish(command, typed);
 }
 
 Action addSeason(CLI::App& command) {
     const auto typed = std::make_shared<TypedStudy>();
     SunStudyRequest& request = typed->request;
-    request.kind = SunStudyRequest::Kind::seasonal;
+    request.course.kind = StudyCourse::Kind::seasonal;
     const OptionAdder add(command);
     addModelAndFolder(add, request.recording);
-    addSiteOptions(add, *typed);
-    add("--from", typed->first_date, "DATE", dayUntil(LAST_YEAR_OF_SEASON),
+    addSiteOfModel(add, typed->site);
+    add("--from", typed->first_date, "DATE", dateUntil(LAST_SEASON_YEAR),
         "Date of the first picture, such as 2026-03-21 (default: 1 January of this year, or a year "
         "before --to)");
-    add("--to", typed->last_date, "DATE", dayUntil(LAST_YEAR_OF_SEASON),
+    add("--to", typed->last_date, "DATE", dateUntil(LAST_SEASON_YEAR),
         "Date that no picture is later than (default: a year after --from)");
-    add("--every", request.step, "DAYS", wholeNumberFrom(1, {}, "days"),
+    add("--every", typed->step, "DAYS", wholeNumberFrom(1, {}, "days"),
         "Days between pictures, from 1", "7");
-    add("--at", typed->noon, "HH:MM", timeOfStudy(false),
+    add("--at", typed->time, "HH:MM", timeByTheClock(),
         "Time of day of every picture, in the place's standard time", "12:00");
     return finish(command, typed);
 }

@@ -1,4 +1,5 @@
 // The sun as JSON.
+#include "host/clock/WallText.h"
 #include "quarn/reports/SunTelling.h"
 #include "quarn/words/Words.h"
 
@@ -16,14 +17,14 @@ double rounded(double degrees) {
 }
 
 Json jsonOf(const Zone& zone, const SunDay& day) {
-    Json json = {{"date", dateText(day.date)},
+    Json json = {{"date", dateText(std::chrono::year_month_day(day.date))},
                  {"day_length_s", day.sun.day_length.count()},
                  {"events", Json::array()}};
     if (const std::string course = nameOf(day.sun.course); !course.empty())
         json["course"] = course;
     for (const SunEvent& event : day.sun.events)
         json["events"].push_back(
-            {{"kind", nameOf(event.kind)}, {"time", isoText(zone, event.time)}});
+            {{"kind", nameOf(event.kind)}, {"time", isoTextWithOffset(zone.at(event.time))}});
     return json;
 }
 
@@ -42,7 +43,7 @@ std::string jsonOf(const SunRequest& request, const SunTelling& telling) {
     for (const SunDay& day : telling.days)
         json["days"].push_back(jsonOf(site.zone, day));
     for (const TimedSun& sun : telling.positions)
-        json["positions"].push_back({{"time", isoText(site.zone, sun.time)},
+        json["positions"].push_back({{"time", isoTextWithOffset(site.zone.at(sun.time))},
                                      {"azimuth_deg", rounded(sun.position.azimuth_deg)},
                                      {"altitude_deg", rounded(sun.position.altitude_deg)}});
     return json.dump(2, ' ', false, Json::error_handler_t::replace) + "\n";

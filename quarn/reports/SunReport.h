@@ -1,6 +1,6 @@
 #pragma once
 
-#include "quarn/scripts/CivilSite.h"
+#include "host/almanac/CivilSite.h"
 #include "quarn/words/Outcome.h"
 
 #include <chrono>
@@ -16,7 +16,7 @@ struct SunRequest {
     std::chrono::sys_seconds to;   ///< no position is later; not before `from`
     std::chrono::minutes step{60};
     Form form = Form::text;
-    std::vector<std::string> notes; ///< sentences to be told with the text
+    std::vector<std::string> notes; ///< sentences without their full stops
 };
 
 /// `quarn sun`: tells the positions of the sun, and its rises, transits and sets on the days of the

@@ -28,10 +28,6 @@ struct SunTelling {
     std::vector<TimedSun> positions;
 };
 
-/// "2026-06-21"
-std::string dateText(std::chrono::local_days date);
-/// "2026-06-21T14:30:00+02:00"
-std::string isoText(const Zone& zone, std::chrono::sys_seconds time);
 /// "rise", "transit", "set"
 const char* nameOf(SunEvent::Kind kind);
 /// "polar day", "polar night"; empty where the sun rises or sets.

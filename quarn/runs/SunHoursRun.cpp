@@ -57,14 +57,15 @@ std::string toldText(const SunHoursWish& wish, const SunHoursFiles& made) {
     std::string text;
     for (const std::filesystem::path& file : made.files)
         text += file.native() + "\n";
+    for (const std::string& note : wish.notes)
+        text += note + ".\n";
     if (made.steps == 0)
         return text + "The sun does not rise there in this time: all hours are 0.\n";
     const int minutes = static_cast<int>(std::lround(60.0 * made.most_hours));
-    text += std::to_string(made.steps) + " steps with the sun above the horizon, at most " +
-            std::to_string(minutes / 60) + " h " + std::to_string(minutes % 60) +
-            " min of sun a day; each begin and end of sun is known to " +
-            std::to_string((wish.hours.every_minutes + 1) / 2) + " min.\n";
-    return text + wish.zone_note;
+    return text + std::to_string(made.steps) + " steps with the sun above the horizon, at most " +
+           std::to_string(minutes / 60) + " h " + std::to_string(minutes % 60) +
+           " min of sun a day; each begin and end of sun is known to " +
+           std::to_string((wish.hours.every_minutes + 1) / 2) + " min.\n";
 }
 
 } // namespace

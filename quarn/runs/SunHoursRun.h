@@ -5,6 +5,9 @@
 #include "quarn/session/HostSession.h"
 #include "quarn/words/Outcome.h"
 
+#include <string>
+#include <vector>
+
 namespace quarn::program {
 
 /// Of which model hours of sun are asked for.
@@ -13,7 +16,7 @@ struct SunHoursWish {
     std::string up_axis; ///< as readingLine has it
     StudyView view;      ///< of no account to a plan
     SunHoursRequest hours;
-    std::string zone_note; ///< how the clock was chosen, where nobody named it; a sentence
+    std::vector<std::string> notes{}; ///< of the times: sentences without their full stops
     CommonOptions common;
 };
 

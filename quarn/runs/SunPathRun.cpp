@@ -14,10 +14,7 @@ std::string doneText(const SunPathOrder& order, const SunPathDrawn& drawn) {
     std::string text = diagram.file.native() + ": sun path of " +
                        (diagram.place.empty() ? "the place" : diagram.place) + " in " +
                        std::to_string(diagram.year) + ", hours of " + drawn.clock_name + ".\n";
-    if (!order.zone_origin.empty())
-        text += "The zone is that of " + order.zone_origin +
-                ", the nearest place that is known; --zone takes another.\n";
-    return text;
+    return order.zone_note.empty() ? text : text + order.zone_note + ".\n";
 }
 
 } // namespace

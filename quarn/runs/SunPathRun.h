@@ -13,7 +13,7 @@ namespace quarn::program {
 struct SunPathOrder {
     SunPathRequest diagram;
     std::filesystem::path model; ///< empty: none
-    std::string zone_origin;     ///< whose zone it is, where nobody named one: "Potsdam, Germany"
+    std::string zone_note{};     ///< a sentence without its full stop; empty: nothing
     CommonOptions common;
 };
 

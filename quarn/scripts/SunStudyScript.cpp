@@ -1,6 +1,5 @@
 #include "quarn/scripts/SunStudyScript.h"
 
-#include "quarn/scripts/StudyClock.h"
 #include "quarn/words/Words.h"
 
 namespace quarn::program {
@@ -16,9 +15,9 @@ std::string numbers(std::initializer_list<int> values) {
     return text;
 }
 
-std::string site(const SunStudyRequest& request) {
-    return numberText(request.site.latitude_deg) + " " + numberText(studyLongitude(request)) + " " +
-           numberText(request.site.north_deg) + " ";
+std::string site(const StudyCourse& course) {
+    return numberText(course.site.latitude_deg) + " " + numberText(studyLongitude(course)) + " " +
+           numberText(course.site.north_deg) + " ";
 }
 
 std::string date(local_seconds moment) {
@@ -33,34 +32,35 @@ std::string time(local_seconds moment) {
         {static_cast<int>(clock.hours().count()), static_cast<int>(clock.minutes().count())});
 }
 
-std::string oneDay(const SunStudyRequest& request, const StudySpan& span) {
-    return "_-SetOneDaySunAnimation " + site(request) + date(span.first) + time(span.first) +
+std::string oneDay(const StudyCourse& course, const StudySpan& span) {
+    return "_-SetOneDaySunAnimation " + site(course) + date(span.first) + time(span.first) +
            time(span.last);
 }
 
-std::string seasonal(const SunStudyRequest& request, const StudySpan& span) {
-    return "_-SetSeasonalSunAnimation " + site(request) + date(span.first) + date(span.last) +
+std::string seasonal(const StudyCourse& course, const StudySpan& span) {
+    return "_-SetSeasonalSunAnimation " + site(course) + date(span.first) + date(span.last) +
            time(span.first);
 }
 
 } // namespace
 
 AnimationLines sunStudyLines(const SunStudyRequest& request) {
-    const bool is_one_day = request.kind == SunStudyRequest::Kind::one_day;
+    const StudyCourse& course = request.course;
+    const bool is_one_day = course.kind == StudyCourse::Kind::one_day;
     AnimationLines lines;
     lines.preparing = linesFor(request.view, isDocument(request.recording.model));
-    const std::vector<StudySpan> spans = studySpans(request);
+    const std::vector<StudySpan> spans = studySpans(course);
     for (const StudySpan& span : spans) {
         const bool is_first = lines.setting_up.empty();
-        lines.setting_up.push_back((is_one_day ? oneDay(request, span) : seasonal(request, span)) +
-                                   numbers({request.step}) + sharedAnswers(request.recording));
+        lines.setting_up.push_back((is_one_day ? oneDay(course, span) : seasonal(course, span)) +
+                                   numbers({course.step}) + sharedAnswers(request.recording));
         if (spans.size() > 1)
             lines.setting_up.push_back(is_first ? "_-JoinSunStudy _Keep"
                                                 : "_-JoinSunStudy _Append");
     }
-    lines.setting_up.push_back("_-SunStudyPlace \"" + placeName(request.site) + "\" \"" +
-                               request.site.zone.name() + "\"");
-    lines.notes = studyNotes(request);
+    lines.setting_up.push_back("_-SunStudyPlace \"" + placeName(course.site) + "\" \"" +
+                               course.site.zone.name() + "\"");
+    lines.notes = studyNotes(course);
     return lines;
 }
 

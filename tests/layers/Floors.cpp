@@ -23,7 +23,8 @@ const Places BELOW_FRONT_END = BELOW_HOST + "host/border/";
 const Places BELOW_CITIES = BELOW_FRONT_END + "host/front_end/";
 const Places BELOW_SUN = BELOW_CITIES + "host/cities/";
 const Places BELOW_CLOCK = BELOW_SUN + "host/sun/";
-const Places BELOW_CURVES = BELOW_CLOCK + "host/clock/";
+const Places BELOW_ALMANAC = BELOW_CLOCK + "host/clock/";
+const Places BELOW_CURVES = BELOW_ALMANAC + "host/almanac/";
 const Places BELOW_DOCUMENT = BELOW_CURVES + "host/curves/";
 const Places BELOW_APP = BELOW_DOCUMENT + "host/document/" + "host/reader/" + "host/recording/";
 const Places BELOW_PROMPT = BELOW_APP + "host/app/";
@@ -34,9 +35,9 @@ const Places BELOW_SUN_HOURS = BELOW_SHARE + "host/share/";
 const Places BELOW_SESSION = BELOW_SUN_HOURS + "host/sunhours/" + "host/sunpath/";
 
 // What a program sees of the host: its door, what it implements itself, the cities of the world,
-// their sun, their clocks and the diagram of the sun's paths.
-const Places PROGRAM = {"sdk/",        "host/session/", "host/front_end/", "host/cities/",
-                        "host/clock/", "host/sun/",     "host/sunpath/"};
+// their sun, their clocks, their almanac and the diagram of the sun's paths.
+const Places PROGRAM = {"sdk/",      "host/session/", "host/front_end/", "host/cities/",
+                        "host/sun/", "host/clock/",   "host/almanac/",   "host/sunpath/"};
 
 const Places BELOW_SESSIONS = PROGRAM + "quarn/words/" + "quarn/terminal/";
 const Places BELOW_RUNS = PROGRAM + "quarn/words/" + "quarn/session/" + "quarn/scripts/";
@@ -71,6 +72,7 @@ const Room FLOORS[] = {
     {4, "host/cities/", BELOW_CITIES},
     {4, "host/sun/", BELOW_SUN},
     {4, "host/clock/", BELOW_CLOCK},
+    {4, "host/almanac/", BELOW_ALMANAC},
     {4, "host/curves/", BELOW_CURVES},
     {5, "host/document/", BELOW_DOCUMENT},
     {5, "host/reader/", BELOW_DOCUMENT},

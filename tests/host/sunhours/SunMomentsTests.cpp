@@ -7,11 +7,15 @@ namespace {
 
 using namespace std::chrono;
 
+WantedTime byTheClock(minutes time) {
+    return {WantedTime::Since::midnight, time};
+}
+
 SunHoursRequest athensOn(year_month_day day) {
     SunHoursRequest request;
-    request.latitude_deg = 37.98;
-    request.longitude_deg = 23.73;
-    request.zone = Zone::named("Europe/Athens").value();
+    request.site.latitude_deg = 37.98;
+    request.site.longitude_deg = 23.73;
+    request.site.zone = Zone::named("Europe/Athens").value();
     request.first_day = request.last_day = day;
     return request;
 }
@@ -23,24 +27,24 @@ TEST(SunMomentsTests, LongestDayOfAthensLastsAsLongAsTheSunsCentreIsUp) {
 
 TEST(SunMomentsTests, SpanThatStepsDoNotFillKeepsItsLength) {
     SunHoursRequest request = athensOn(2026y / June / 21);
-    request.from = hours(10);
-    request.to = hours(11) + minutes(25);
+    request.from = byTheClock(hours(10));
+    request.to = byTheClock(hours(11) + minutes(25));
     const SunMoments found = momentsOf(request);
     EXPECT_NEAR(found.hours, 85.0 / 60.0, 1e-9);
     ASSERT_EQ(found.moments.size(), 10U); // 10:00, ..., 11:20, 11:25
     EXPECT_NEAR(found.moments.front().step.hours, 5.0 / 60.0, 1e-9);
     EXPECT_NEAR(found.moments.back().step.hours, 2.5 / 60.0, 1e-9);
-    EXPECT_EQ(request.zone.at(found.moments.front().time).local,
+    EXPECT_EQ(request.site.zone.at(found.moments.front().time).local,
               local_days(2026y / June / 21) + hours(10));
 }
 
 /// From 01:00 to 05:00 by the clock of Berlin, where the sun does not set.
 double hoursAroundTheChange(double latitude_deg, year_month_day day) {
     SunHoursRequest request = athensOn(day);
-    request.latitude_deg = latitude_deg;
-    request.zone = Zone::named("Europe/Berlin").value();
-    request.from = hours(1);
-    request.to = hours(5);
+    request.site.latitude_deg = latitude_deg;
+    request.site.zone = Zone::named("Europe/Berlin").value();
+    request.from = byTheClock(hours(1));
+    request.to = byTheClock(hours(5));
     return momentsOf(request).hours;
 }
 
@@ -52,7 +56,7 @@ TEST(SunMomentsTests, HourThatClocksSkipIsMissingAndTheOneTheyShowTwiceCountsTwi
 
 TEST(SunMomentsTests, PolarNightHasNoMoments) {
     SunHoursRequest request = athensOn(2026y / December / 21);
-    request.latitude_deg = 80;
+    request.site.latitude_deg = 80;
     EXPECT_TRUE(momentsOf(request).moments.empty());
     EXPECT_EQ(momentsOf(request).hours, 0.0);
 }
@@ -61,8 +65,8 @@ TEST(SunMomentsTests, HoursOfSeveralDaysAreTheirMean) {
     SunHoursRequest request = athensOn(2026y / March / 1);
     request.last_day = 2026y / March / 22;
     request.every_days = 7;
-    request.from = hours(10);
-    request.to = hours(12);
+    request.from = byTheClock(hours(10));
+    request.to = byTheClock(hours(12));
     const SunMoments found = momentsOf(request);
     EXPECT_EQ(found.days, 4);
     EXPECT_NEAR(found.hours, 2.0, 1e-9);
@@ -70,12 +74,12 @@ TEST(SunMomentsTests, HoursOfSeveralDaysAreTheirMean) {
 
 TEST(SunMomentsTests, NorthTurnsTheSunClockwise) {
     SunHoursRequest request = athensOn(2026y / March / 21);
-    request.from = hours(12);
-    request.to = hours(13); // the sun is in the south at half past twelve
+    request.from = byTheClock(hours(12));
+    request.to = byTheClock(hours(13)); // the sun is in the south at half past twelve
     const KM_3dVector plain = momentsOf(request).moments[3].step.toward;
     EXPECT_NEAR(plain.x, 0.0, 0.05);
     EXPECT_LT(plain.y, -0.5);
-    request.north_deg = 90; // along X: south is against it
+    request.site.north_deg = 90; // along X: south is against it
     const KM_3dVector turned = momentsOf(request).moments[3].step.toward;
     EXPECT_NEAR(turned.x, plain.y, 1e-9);
     EXPECT_NEAR(turned.y, -plain.x, 1e-9);
