@@ -11,13 +11,13 @@ namespace {
 
 constexpr float HALF = 0.5F;
 
-const RaySurface& surfaceMet(const GlassFilter& filter,
-                             const RTCFilterFunctionNArguments& arguments, unsigned i) {
+std::uint32_t surfaceMet(const GlassFilter& filter, const RTCFilterFunctionNArguments& arguments,
+                         unsigned i) {
     const unsigned first =
         filter.first_surfaces
             ? filter.first_surfaces[RTCHitN_instID(arguments.hit, arguments.N, i, 0)]
             : filter.sole_first_surface;
-    return filter.surfaces[first + RTCHitN_geomID(arguments.hit, arguments.N, i)];
+    return first + RTCHitN_geomID(arguments.hit, arguments.N, i);
 }
 
 bool isGlass(const RaySurface& surface, const RTCFilterFunctionNArguments& arguments, unsigned i) {
@@ -44,23 +44,25 @@ void dropGlass(const RTCFilterFunctionNArguments* arguments) {
     for (unsigned i = 0; i < arguments->N; ++i) {
         if (arguments->valid[i] == 0)
             continue;
-        const RaySurface& surface = surfaceMet(filter, *arguments, i);
+        const std::uint32_t met = surfaceMet(filter, *arguments, i);
+        const RaySurface& surface = filter.surfaces[met];
         const bool is_unseen_back =
             filter.passes_backs && surface.one_sided && isBack(*arguments, i);
-        if (is_unseen_back || isGlass(surface, *arguments, i))
+        if (met == filter.absent_surface || is_unseen_back || isGlass(surface, *arguments, i))
             arguments->valid[i] = 0;
     }
 }
 
 } // namespace
 
-GlassFilter::GlassFilter(const DisplayScene& scene, bool fronts_alone)
+GlassFilter::GlassFilter(const DisplayScene& scene, bool fronts_alone, std::uint32_t absent)
     : surfaces(scene.rays().surfaces().data()),
       first_surfaces(scene.rays().hasInstances() ? scene.rays().firstSurfaces().data() : nullptr),
-      sole_first_surface(scene.rays().soleFirstSurface()), passes_backs(fronts_alone) {
+      sole_first_surface(scene.rays().soleFirstSurface()), passes_backs(fronts_alone),
+      absent_surface(absent) {
     rtcInitIntersectContext(&context);
     const RayScene& rays = scene.rays();
-    if (rays.hasSeeThrough() || (fronts_alone && rays.hasOneSided()))
+    if (rays.hasSeeThrough() || (fronts_alone && rays.hasOneSided()) || absent != NO_SURFACE)
         context.filter = dropGlass; // the library asks about every surface then
 }
 

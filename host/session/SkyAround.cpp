@@ -3,18 +3,17 @@
 #include "host/document/Document.h"
 #include "host/document/DocumentDrawing.h"
 #include "host/document/DocumentScene.h"
+#include "host/letters/SheetWords.h"
 
 namespace quarn {
 namespace {
 
-constexpr double HALF = 0.5;
-
-bool isGlass(const Material* material) {
-    if (!material)
-        return false;
-    const double opacity = material->base_color.a / 255.0;
-    return (material->see_through && opacity < HALF) || material->transmission > HALF;
-}
+constexpr SheetText NO_OBJECT{L"No object is called \"%1\", nor is that the id of one.", 43427};
+constexpr SheetText NO_PLACE{L"The object \"%1\" has no place: it holds no point in space.", 43428};
+constexpr SheetText NO_SURFACE{
+    L"There is no visible surface that could hide the sky: draw the diagram "
+    L"without a point, or of another model.",
+    43429};
 
 const DocumentObject* objectCalled(const ObjectTable& objects, const std::string& name) {
     const KM_wString wide = KM_wString::FromUtf8(name);
@@ -35,12 +34,12 @@ Result<Found> find(const ObjectTable& objects, const SkyPoint& place) {
     const std::string& name = std::get<std::string>(place);
     const DocumentObject* const object = objectCalled(objects, name);
     if (!object)
-        return Error{"No object is called \"" + name + "\", nor is that the id of one."};
+        return Error{SheetWords()(NO_OBJECT, {name})};
     if (object->point)
         return Found{*object->point};
     const KM_BoundingBox box = object->boundingBox();
     if (!box.IsValid())
-        return Error{"The object \"" + name + "\" has no place: it holds no point in space."};
+        return Error{SheetWords()(NO_PLACE, {name})};
     return Found{box.Center(), object->id};
 }
 
@@ -57,14 +56,13 @@ Result<Obstruction> obstructionAround(CQuarnDoc& document, const SkyPoint& place
         return scene.error();
     const DisplayScene& display = scene.value()->display();
     if (!display.surfaceBox().IsValid())
-        return Error{"There is no visible surface that could hide the sky: draw the diagram "
-                     "without a point, or of another model."};
+        return Error{SheetWords()(NO_SURFACE)};
     const std::span<const SceneMesh> meshes = scene.value()->content().meshes;
-    const auto isPassed = [&](std::size_t mesh) {
-        return meshes[mesh].id == found.value().object ||
-               isGlass(meshes[mesh].placed.material.get());
-    };
-    return obstructionAround(display, SkyWatch{found.value().point, north_deg, isPassed});
+    SkyWatch watch{found.value().point, north_deg, {}};
+    for (std::size_t mesh = 0; mesh < meshes.size(); ++mesh)
+        if (meshes[mesh].id == found.value().object)
+            watch.absent_mesh = mesh;
+    return obstructionAround(display, watch);
 }
 
 } // namespace quarn

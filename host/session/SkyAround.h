@@ -16,11 +16,11 @@ namespace quarn {
 /// and hide nothing themselves.
 using SkyPoint = std::variant<KM_3dPoint, std::string>;
 
-/// What the visible surfaces of a document hide of the sky. A surface hides nothing where it is
-/// less than half opaque, or lets more than half of the light through.
+/// What the visible surfaces of a document hide of the sky, but for glass as GlassFilter has it.
 /// @param north_deg  clockwise from the Y axis, as seen from above
-/// @return an English error when there is no such object, no visible surface, or the scene cannot
-///         be built
+/// @return an error, a sentence: there is no such object, no visible surface, or the scene cannot
+/// be
+///         built
 Result<Obstruction> obstructionAround(CQuarnDoc& document, const SkyPoint& place, double north_deg);
 
 } // namespace quarn

@@ -9,9 +9,8 @@ Result<SunHoursFiles> makeSunHours(CQuarnDoc& document, const SunHoursRequest& r
                                    const std::function<bool(double share)>& watch) {
     const std::filesystem::path shared =
         Application::current()->options().viewer_folder.parent_path();
-    auto made = writeSunHours(
-        Document::of(document), request,
-        {shared / "sunhours" / "sunhours.html", shared / "fonts" / "DejaVuSans.ttf"}, watch);
+    auto made = writeSunHours(Document::of(document), request,
+                              shared / "sunhours" / "sunhours.html", watch);
     if (!made)
         return made.error();
     SunHoursReport& report = made.value();

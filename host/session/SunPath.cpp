@@ -34,15 +34,13 @@ std::string clockName(const SunPathRequest& request) {
     return distance;
 }
 
-/// What clocks show in the year besides: empty where they show nothing else.
-std::string clockNote(const SunPathRequest& request) {
+std::optional<SummerTime> summerTime(const SunPathRequest& request) {
     for (const WallTime& wall : wallTimes(request)) {
-        const auto ahead = floor<minutes>(wall.offset - clockOf(request).ahead).count();
-        if (ahead > 0)
-            return "While summer time is kept (" + wall.abbreviation + ") clocks show " +
-                   (ahead == 60 ? "one hour" : std::to_string(ahead) + " minutes") + " more.";
+        const auto ahead = floor<minutes>(wall.offset - clockOf(request).ahead);
+        if (ahead > minutes(0))
+            return SummerTime{wall.abbreviation, ahead};
     }
-    return "";
+    return std::nullopt;
 }
 
 std::string coordinateText(double coordinate) {
@@ -51,12 +49,11 @@ std::string coordinateText(double coordinate) {
     return {static_cast<const char*>(text.data()), end};
 }
 
-std::string pointName(const SkyPoint& place, const std::string& model) {
+std::string nameOf(const SkyPoint& place) {
     if (const auto* const name = std::get_if<std::string>(&place))
-        return "\"" + *name + "\" of " + model;
+        return *name;
     const auto& point = std::get<KM_3dPoint>(place);
-    return "the point " + coordinateText(point.x) + "," + coordinateText(point.y) + "," +
-           coordinateText(point.z) + " of " + model;
+    return coordinateText(point.x) + "," + coordinateText(point.y) + "," + coordinateText(point.z);
 }
 
 SunPathWish wishOf(const SunPathRequest& request) {
@@ -64,7 +61,7 @@ SunPathWish wishOf(const SunPathRequest& request) {
                      .site = request.site,
                      .clock = clockOf(request),
                      .clock_name = clockName(request),
-                     .clock_note = clockNote(request),
+                     .summer_time = summerTime(request),
                      .projections = {},
                      .north_deg = request.north_deg,
                      .point = {}};
@@ -84,8 +81,9 @@ Result<SunPathDrawn> makeSunPath(CQuarnDoc& document, const SunPathRequest& requ
             obstructionAround(document, *request.point, request.north_deg.value_or(0.0));
         if (!obstruction)
             return Error{request.model + ": " + obstruction.message()};
-        wish.point =
-            DiagramPoint{pointName(*request.point, request.model), std::move(obstruction.value())};
+        wish.point = DiagramPoint{nameOf(*request.point),
+                                  std::holds_alternative<std::string>(*request.point),
+                                  request.model, std::move(obstruction.value())};
     }
     if (const auto written = writeSunPathDiagram(wish, request.file); !written)
         return written.error();

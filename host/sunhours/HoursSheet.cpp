@@ -10,6 +10,18 @@ namespace quarn {
 
 namespace {
 
+constexpr SheetText TITLE{L"Hours of sun", 42985};
+constexpr SheetText SPAN{L"%1 to %2", 42986};
+constexpr SheetText EVERY_DAYS{L"%1, every %2 days", 42987};
+constexpr SheetText AT_MOST{L"at most %1", 42988};
+constexpr SheetText HOURS_MINUTES{L"%1 h %2 min", 42990};
+constexpr SheetText LEGEND{L"Hours of direct sun", 42991};
+constexpr SheetText LEGEND_OF_DAYS{L"Hours of direct sun a day, mean of the days", 42992};
+constexpr SheetText STEPS{L"steps of %1 minutes, each begin and end of sun is known to %2 min",
+                          42993};
+constexpr SheetText COLORS{L"Colours: %1.", 42994};
+
+constexpr const char* SEPARATOR = " · ";
 constexpr KM_Color QUIET{92, 96, 102, 255};
 
 /// All lengths follow from the picture's, so that sheets of any size look alike.
@@ -24,23 +36,6 @@ struct SheetSizes {
     int head;
     int foot;
 };
-
-std::string hoursText(double hours) {
-    const int minutes = static_cast<int>(std::lround(60.0 * hours));
-    std::string text = std::to_string(minutes / 60) + " h";
-    if (minutes % 60 != 0)
-        text += " " + std::to_string(minutes % 60) + " min";
-    return text;
-}
-
-std::string dayText(const std::chrono::year_month_day& day) {
-    constexpr const char* MONTHS[] = {"January",   "February", "March",    "April",
-                                      "May",       "June",     "July",     "August",
-                                      "September", "October",  "November", "December"};
-    return std::to_string(static_cast<unsigned>(day.day())) + " " +
-           MONTHS[static_cast<unsigned>(day.month()) - 1] + " " +
-           std::to_string(static_cast<int>(day.year()));
-}
 
 Image whiteSheet(int width, int height) {
     Image sheet;
@@ -72,13 +67,14 @@ double fittingSize(const TextPainter& text, const std::string& words, double siz
 /// A bar of the colours with its hours below.
 void drawLegend(Image& sheet, const SheetSizes& sizes, int top, const SunHoursRequest& request,
                 const SunMoments& moments, const TextPainter& text) {
+    const SheetWords words(text.letters());
     const int left = sizes.margin;
     const int width = sheet.width - 2 * sizes.margin;
     const int height = static_cast<int>(std::lround(0.9 * sizes.unit));
     const double end = endOfScale(moments.hours);
     for (int x = 0; x < width; ++x)
         fillBox(sheet, left + x, top, left + x + 1, top + height, viridis((x + 0.5) / width));
-    const double room = text.width("24 h", sizes.unit) * 1.6;
+    const double room = text.width(hoursText(24, words), sizes.unit) * 1.6;
     int step = 1;
     while (width / end * step < room)
         ++step;
@@ -86,16 +82,14 @@ void drawLegend(Image& sheet, const SheetSizes& sizes, int top, const SunHoursRe
         const int x = left + static_cast<int>(std::lround(width * hour / end));
         const int tick = std::min(x, left + width - 1);
         fillBox(sheet, tick, top + height, tick + 1, top + height + height / 3, SHEET_INK);
-        const std::string label = std::to_string(hour) + (hour == 0 ? "" : " h");
+        const std::string label = hour == 0 ? "0" : hoursText(hour, words);
         const double across = text.width(label, sizes.unit);
         text.draw(sheet, std::clamp(x - 0.5 * across, double(left), left + width - across),
                   top + height + 1.35 * sizes.unit, label, sizes.unit, SHEET_INK);
     }
-    const std::string words = std::string("Hours of direct sun") +
-                              (moments.days > 1 ? " a day, mean of the days" : "") + "; " +
-                              errorText(request) + ". Colours: viridis.";
-    text.draw(sheet, left, top + height + 2.9 * sizes.unit, words,
-              fittingSize(text, words, 0.85 * sizes.unit, width), QUIET);
+    const std::string legend = legendOf(request, moments, words);
+    text.draw(sheet, left, top + height + 2.9 * sizes.unit, legend,
+              fittingSize(text, legend, 0.85 * sizes.unit, width), QUIET);
 }
 
 /// A needle in a ring, whose filled half points north.
@@ -125,48 +119,64 @@ void drawNorth(Image& sheet, double x, double y, double radius, double north_deg
             cover(sheet, px, py, SHEET_INK, double(std::max(ring, needle)) / (FINE * FINE));
         }
     const double size = 0.75 * radius;
-    text.draw(sheet, x + 1.45 * radius * nx - 0.5 * text.width("N", size),
-              y + 1.45 * radius * ny + 0.36 * size, "N", size, SHEET_INK);
+    const std::string north = SheetWords(text.letters()).quarter(NORTH);
+    text.draw(sheet, x + 1.45 * radius * nx - 0.5 * text.width(north, size),
+              y + 1.45 * radius * ny + 0.36 * size, north, size, SHEET_INK);
+}
+
+std::string daysText(const SunHoursRequest& request, const SheetWords& words) {
+    if (request.last_day == request.first_day)
+        return words.date(request.first_day);
+    const std::string span =
+        words(SPAN, {words.date(request.first_day), words.date(request.last_day)});
+    return request.every_days > 1 ? words(EVERY_DAYS, {span, std::to_string(request.every_days)})
+                                  : span;
 }
 
 } // namespace
 
-std::string daysText(const SunHoursRequest& request) {
-    if (request.last_day == request.first_day)
-        return dayText(request.first_day);
-    return dayText(request.first_day) + " to " + dayText(request.last_day) +
-           (request.every_days > 1 ? ", every " + std::to_string(request.every_days) + " days"
-                                   : "");
+std::string hoursText(double hours, const SheetWords& words) {
+    const int minutes = static_cast<int>(std::lround(60.0 * hours));
+    const std::string whole = std::to_string(minutes / 60);
+    return minutes % 60 == 0 ? words(WHOLE_HOURS, {whole})
+                             : words(HOURS_MINUTES, {whole, std::to_string(minutes % 60)});
 }
 
-std::string errorText(const SunHoursRequest& request) {
-    const int half = (request.every_minutes + 1) / 2;
-    return "steps of " + std::to_string(request.every_minutes) +
-           " minutes, each begin and end of sun is known to " + std::to_string(half) + " min";
+std::string titleOf(const SunHoursRequest& request, const SheetWords& words) {
+    return words(TITLE) + SEPARATOR + request.title;
 }
 
-std::string subtitleOf(const SunHoursRequest& request, const SunMoments& moments) {
-    std::string text = request.site.place.empty() ? "" : request.site.place + " · ";
-    text += daysText(request);
+std::string subtitleOf(const SunHoursRequest& request, const SunMoments& moments,
+                       const SheetWords& words) {
+    std::string text = request.site.place.empty() ? "" : request.site.place + SEPARATOR;
+    text += daysText(request, words);
     if (request.from || request.to)
-        text += " · " + (request.from ? wantedTimeText(*request.from) : "00:00") + " to " +
-                (request.to ? wantedTimeText(*request.to) : "24:00");
+        text += SEPARATOR + words(SPAN, {request.from ? wantedTimeText(*request.from) : "00:00",
+                                         request.to ? wantedTimeText(*request.to) : "24:00"});
     if (!moments.moments.empty())
         text += " (" + request.site.zone.at(moments.moments.front().time).abbreviation + ")";
-    text += " · at most " + hoursText(moments.hours);
-    return text;
+    return text + SEPARATOR + words(AT_MOST, {hoursText(moments.hours, words)});
+}
+
+std::string legendOf(const SunHoursRequest& request, const SunMoments& moments,
+                     const SheetWords& words) {
+    const int half = (request.every_minutes + 1) / 2;
+    return words(moments.days > 1 ? LEGEND_OF_DAYS : LEGEND) + "; " +
+           words(STEPS, {std::to_string(request.every_minutes), std::to_string(half)}) + ". " +
+           words(COLORS, {"viridis"});
 }
 
 Image sheetOf(const Image& map, const SunHoursRequest& request, const SunMoments& moments,
               const TextPainter& text) {
     const SheetSizes sizes(map);
+    const SheetWords words(text.letters());
     Image sheet = whiteSheet(map.width + 2 * sizes.margin, map.height + sizes.head + sizes.foot);
     layMap(sheet, map, sizes.margin, sizes.head);
     const double room = map.width - 4.5 * sizes.unit; // the arrow stands beside them
-    const std::string title = "Hours of sun · " + request.title;
+    const std::string title = titleOf(request, words);
     text.draw(sheet, sizes.margin, 2.2 * sizes.unit, title,
               fittingSize(text, title, 1.55 * sizes.unit, room), SHEET_INK);
-    const std::string subtitle = subtitleOf(request, moments);
+    const std::string subtitle = subtitleOf(request, moments, words);
     text.draw(sheet, sizes.margin, 3.8 * sizes.unit, subtitle,
               fittingSize(text, subtitle, sizes.unit, room), QUIET);
     drawLegend(sheet, sizes, sizes.head + map.height + static_cast<int>(sizes.unit), request,

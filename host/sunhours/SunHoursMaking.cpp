@@ -18,6 +18,9 @@ namespace {
 
 namespace fs = std::filesystem;
 
+constexpr SheetText NO_SURFACE{L"%1 shows no surface that the sun could reach.", 42997};
+constexpr SheetText NO_YEAR{L"The sun is known from %1 to %2 only. Give another year.", 42998};
+
 /// Shares of the whole that its parts take; they go by the numbers of their points.
 class Parts {
 public:
@@ -58,11 +61,11 @@ std::vector<std::string> namesOf(const Document& document, const SceneContent& c
 
 Result<void> check(const SunHoursRequest& request, const DisplayScene& scene) {
     if (!scene.rays().root())
-        return Error{request.title + " shows no surface that the sun could reach."};
+        return Error{SheetWords()(NO_SURFACE, {request.title})};
     for (const auto& day : {request.first_day, request.last_day})
         if (!isSunYear(static_cast<int>(day.year())))
-            return Error{"The sun is known from " + std::to_string(FIRST_SUN_YEAR) + " to " +
-                         std::to_string(LAST_SUN_YEAR) + " only. Give another year."};
+            return Error{SheetWords()(
+                NO_YEAR, {std::to_string(FIRST_SUN_YEAR), std::to_string(LAST_SUN_YEAR)})};
     return {};
 }
 
@@ -114,16 +117,17 @@ private:
 };
 
 Result<void> writeAll(const Document& document, const SunHoursRequest& request,
-                      const SunMoments& moments, const SunHoursSources& sources,
+                      const SunMoments& moments, const fs::path& page_template,
                       const Findings& found, const KM_3dPoint& origin, SunHoursReport& report) {
-    const auto text = TextPainter::open(sources.font);
-    if (!text)
-        return text.error();
+    auto letters = Letters::read(programFont());
+    if (!letters)
+        return letters.error();
+    const TextPainter text(std::move(letters.value()));
     Writing writing(request, report);
     const std::string unit = metresPerUnit(document.units()) == 1.0 ? "m2" : "";
     const std::string csv = objectsCsv(found.objects, request.threshold_hours, unit);
-    Result<void> written = writeImageFile(writing.next(".png"),
-                                          sheetOf(found.picture, request, moments, text.value()));
+    Result<void> written =
+        writeImageFile(writing.next(".png"), sheetOf(found.picture, request, moments, text));
     if (written)
         written = writeHoursArray(writing.next(".npy"), found.map);
     if (written)
@@ -131,7 +135,7 @@ Result<void> writeAll(const Document& document, const SunHoursRequest& request,
     if (written)
         written =
             writeSunHoursPage(writing.next(".html"), {request, moments, found.map, found.picture,
-                                                      found.names, sources.page_template});
+                                                      found.names, page_template});
     if (written && found.grid)
         written = writeGrid(writing.next(".ply"), *found.grid, found.grid_light, origin,
                             endOfScale(moments.hours));
@@ -141,7 +145,7 @@ Result<void> writeAll(const Document& document, const SunHoursRequest& request,
 } // namespace
 
 Result<SunHoursReport> writeSunHours(Document& document, const SunHoursRequest& request,
-                                     const SunHoursSources& sources,
+                                     const fs::path& page_template,
                                      const std::function<bool(double share)>& watch) {
     const auto built = document.drawing().scene();
     if (!built)
@@ -169,7 +173,7 @@ Result<SunHoursReport> writeSunHours(Document& document, const SunHoursRequest& 
     if (!found)
         return report;
     const auto written =
-        writeAll(document, request, moments, sources, *found, scene.origin(), report);
+        writeAll(document, request, moments, page_template, *found, scene.origin(), report);
     return written ? Result<SunHoursReport>(report) : written.error();
 }
 

@@ -15,19 +15,14 @@ struct SunHoursReport {
     bool is_given_up = false;                 ///< by who watched: nothing was written
 };
 
-/// Where the program's own files are.
-struct SunHoursSources {
-    std::filesystem::path page_template;
-    std::filesystem::path font;
-};
-
 /// Finds the hours of sun of a document's surfaces and writes picture, numbers, table and page;
 /// each file appears whole or not at all.
+/// @param page_template  sunhours.html
 /// @param watch  called some times a second with what is done, from 0 to 1; false ends the work
 /// @return an error, sentences: the document shows no surface, the sun has no positions for a year,
 ///         the scene cannot be built, a file cannot be written
 Result<SunHoursReport> writeSunHours(Document& document, const SunHoursRequest& request,
-                                     const SunHoursSources& sources,
+                                     const std::filesystem::path& page_template,
                                      const std::function<bool(double share)>& watch);
 
 } // namespace quarn

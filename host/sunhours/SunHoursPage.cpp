@@ -16,6 +16,10 @@ namespace quarn {
 
 namespace {
 
+constexpr SheetText TIME_OF_DAY{L"Time of day", 42995};
+constexpr SheetText MOVE{L"move to see shadows", 42996};
+constexpr SheetText LANGUAGE{L"en", 42999}; // of these texts, as web pages name it
+
 /// Numbers as the page's script reads them: seven bits a byte, the lowest first, the eighth set
 /// where more follow.
 class RunBytes {
@@ -84,7 +88,7 @@ nlohmann::json litRuns(const SunHoursMap& map, std::size_t steps) {
     return all;
 }
 
-std::string timeText(const WallTime& time) {
+std::string wallText(const WallTime& time) {
     const auto since_midnight = std::chrono::floor<std::chrono::minutes>(
                                     time.local - std::chrono::floor<std::chrono::days>(time.local))
                                     .count();
@@ -97,7 +101,7 @@ std::string timeText(const WallTime& time) {
 nlohmann::json timesOf(const SunHoursPage& page) {
     nlohmann::json times = nlohmann::json::array();
     for (const SunMoment& moment : page.moments.moments)
-        times.push_back(timeText(page.request.site.zone.at(moment.time)));
+        times.push_back(wallText(page.request.site.zone.at(moment.time)));
     return times;
 }
 
@@ -123,6 +127,8 @@ std::string dataOf(const SunHoursPage& page) {
     data["end"] = endOfScale(page.moments.hours);
     data["scale"] = scaleOf();
     data["names"] = page.names;
+    data["hour"] = SheetWords()(WHOLE_HOURS);
+    data["move"] = SheetWords()(MOVE);
     data["hours"] = hourRuns(map);
     data["objects"] = runsOf(map, [&](int x, int y) -> std::int64_t { return map.object(x, y); });
     data["times"] = has_day ? timesOf(page) : nlohmann::json::array();
@@ -136,7 +142,8 @@ Result<void> writeSunHoursPage(const std::filesystem::path& file, const SunHours
     const auto picture = encodeImage(page.picture, ImageFormat::png);
     if (!picture)
         return picture.error();
-    const std::string title = "Hours of sun · " + page.request.title;
+    const SheetWords words;
+    const std::string title = titleOf(page.request, words);
     char nonce[17];
     std::snprintf(nonce, sizeof nonce, "%016zx", std::hash<std::string>()(title));
     const auto text = [](std::string words) {
@@ -145,8 +152,10 @@ Result<void> writeSunHoursPage(const std::filesystem::path& file, const SunHours
     const PlaceFillers fillers = {
         {"nonce", text(nonce)},
         {"title", text(htmlText(title))},
-        {"subtitle", text(htmlText(subtitleOf(page.request, page.moments)))},
-        {"error", text(htmlText(errorText(page.request)))},
+        {"language", text(words(LANGUAGE))},
+        {"subtitle", text(htmlText(subtitleOf(page.request, page.moments, words)))},
+        {"time of day", text(htmlText(words(TIME_OF_DAY)))},
+        {"legend", text(htmlText(legendOf(page.request, page.moments, words)))},
         {"data", text(jsonInHtml(dataOf(page)))},
         {"picture", text("data:image/png;base64," + base64Text(picture.value()))},
     };

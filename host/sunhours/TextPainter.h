@@ -1,23 +1,17 @@
 #pragma once
 
 #include "engine/images/Image.h"
-#include "ground/Result.h"
+#include "host/letters/Letters.h"
 #include "kelmar/KM_Color.h"
-
-#include <filesystem>
-#include <memory>
-#include <string_view>
 
 namespace quarn {
 
-/// Draws text into pictures with the letters of a font file.
+/// Draws text into pictures.
 class TextPainter {
 public:
-    /// @param font  a TrueType file; must be one that came with the program
-    /// @return an error where it cannot be read
-    static Result<TextPainter> open(const std::filesystem::path& font);
-    TextPainter(TextPainter&&) noexcept;
-    ~TextPainter();
+    explicit TextPainter(Letters letters) : m_letters(std::move(letters)) {}
+
+    const Letters& letters() const { return m_letters; }
 
     /// How far a text reaches to the right.
     /// @param size_px  from the lowest descender to the highest ascender
@@ -28,9 +22,7 @@ public:
               KM_Color color) const;
 
 private:
-    struct Font;
-    explicit TextPainter(std::unique_ptr<Font> font);
-    std::unique_ptr<Font> m_font;
+    Letters m_letters;
 };
 
 /// Lays a colour over a pixel; one outside the picture is left out.

@@ -89,9 +89,8 @@ struct LoopEnds {
 
 YearOfPaths pathsOfYear(const SunSite& site, const StandardClock& clock) {
     YearOfPaths year;
-    for (unsigned month = 0; month < year.days.size(); ++month)
-        year.days[month] =
-            pathOfDay(site, clock, std::chrono::month(month + 1) / std::chrono::day(21));
+    for (std::size_t month = 0; month < year.days.size(); ++month)
+        year.days[month] = pathOfDay(site, clock, monthAt(month) / std::chrono::day(21));
     for (std::size_t hour = 0; hour < year.hours.size(); ++hour)
         year.hours[hour] = loopOfHour(site, clock, static_cast<int>(hour));
     return year;
@@ -172,7 +171,7 @@ void DiskParts::addDate(std::size_t month, const SunPath& path) {
     if (path.empty())
         return;
     const bool is_first_half = month <= JUNE;
-    DrawnText text{.place = {}, .text = "21 " + std::string(MONTH_NAMES[month]), .size_px = 13};
+    DrawnText text{.place = {}, .text = m_words.date(monthAt(month) / 21), .size_px = 13};
     if (const auto end = endOnHorizon(path, is_first_half)) {
         text.anchor = anchorOutside(end->azimuth_deg);
         addTextAt(m_disk.onRim(end->azimuth_deg, DATES_PX), std::move(text));
@@ -234,21 +233,20 @@ void DiskParts::addHours(const YearOfPaths& year, const SunSite& site) {
 }
 
 void DiskParts::addCompass() {
-    constexpr std::array<const char*, 4> LETTERS = {"N", "E", "S", "W"};
     for (int azimuth = 0; azimuth < 360; azimuth += 10)
         addTextAt(m_disk.onRim(azimuth, DEGREES_PX), {.place = {},
                                                       .text = std::to_string(azimuth),
                                                       .size_px = 11,
                                                       .anchor = TextAnchor::middle,
                                                       .grey = LOOP_GREY});
-    for (std::size_t quarter = 0; quarter < LETTERS.size(); ++quarter)
-        addTextAt(m_disk.onRim(90.0 * static_cast<double>(quarter),
-                               quarter % 2 == 0 ? LETTERS_PX : LETTERS_BESIDE_DATES_PX),
-                  {.place = {},
-                   .text = LETTERS[quarter],
-                   .size_px = 22,
-                   .anchor = TextAnchor::middle,
-                   .is_bold = true});
+    for (const Quarter quarter : {NORTH, EAST, SOUTH, WEST})
+        addTextAt(
+            m_disk.onRim(90.0 * quarter, quarter % 2 == 0 ? LETTERS_PX : LETTERS_BESIDE_DATES_PX),
+            {.place = {},
+             .text = m_words.quarter(quarter),
+             .size_px = 22,
+             .anchor = TextAnchor::middle,
+             .is_bold = true});
 }
 
 } // namespace quarn

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/letters/SheetWords.h"
 #include "host/sunpath/Drawing.h"
 #include "host/sunpath/Obstruction.h"
 #include "host/sunpath/SkyDisk.h"
@@ -9,8 +10,10 @@
 
 namespace quarn {
 
-inline constexpr std::array<const char*, 12> MONTH_NAMES = {
-    "Jan", "Feb", "Mar", "Apr", "May", "Jun", "Jul", "Aug", "Sep", "Oct", "Nov", "Dec"};
+/// The months by their index, from 0.
+inline std::chrono::month monthAt(std::size_t index) {
+    return std::chrono::month(static_cast<unsigned>(index) + 1);
+}
 
 /// The ways of the sun that a diagram shows.
 struct YearOfPaths {
@@ -23,8 +26,8 @@ YearOfPaths pathsOfYear(const SunSite& site, const StandardClock& clock);
 class DiskParts {
 public:
     /// @param name  begins the names of shapes
-    DiskParts(const SkyDisk& disk, std::string name, Drawing& drawing)
-        : m_disk(disk), m_name(std::move(name)), m_drawing(drawing) {}
+    DiskParts(const SkyDisk& disk, std::string name, const SheetWords& words, Drawing& drawing)
+        : m_disk(disk), m_name(std::move(name)), m_words(words), m_drawing(drawing) {}
 
     void addSky();
     void addHidden(const Obstruction& obstruction);
@@ -45,6 +48,7 @@ private:
 
     SkyDisk m_disk;
     std::string m_name;
+    const SheetWords& m_words;
     Drawing& m_drawing;
 };
 

@@ -1,6 +1,5 @@
 #include "host/sunpath/DrawingPicture.h"
 
-#include "host/sunpath/LetterShapes.h"
 #include "host/sunpath/StrokeShapes.h"
 
 #include <algorithm>
@@ -114,9 +113,25 @@ private:
     double m_scale;
 };
 
+/// The outlines of a line of text where it stands.
+Areas outlinesOf(const DrawnText& text, const Letters& letters) {
+    const double spread_px = text.is_bold ? 0.06 * text.size_px : 0;
+    const double width_px = letters.width(text.text, text.size_px, spread_px);
+    const double shift_px = text.anchor == TextAnchor::start    ? 0
+                            : text.anchor == TextAnchor::middle ? width_px / 2
+                                                                : width_px;
+    Areas areas;
+    for (const auto& outline : letters.outlines(text.text, text.size_px, spread_px)) {
+        auto& area = areas.emplace_back();
+        for (const LetterPoint& point : outline)
+            area.push_back({text.place.x_px - shift_px + point.x_px, text.place.y_px + point.y_px});
+    }
+    return areas;
+}
+
 class Painter {
 public:
-    Painter(Image& picture, double scale, const LetterShapes& letters)
+    Painter(Image& picture, double scale, const Letters& letters)
         : m_filling(picture, scale), m_letters(letters) {}
 
     void operator()(const DrawnPath& path) {
@@ -139,7 +154,7 @@ public:
     }
 
     void operator()(const DrawnText& text) {
-        const Areas letters = m_letters.outlinesOf(text);
+        const Areas letters = outlinesOf(text, m_letters);
         if (text.has_halo)
             stroke(letters, true, {.width_px = text.size_px / 3, .grey = 1});
         m_filling.fill(letters, text.grey);
@@ -153,20 +168,17 @@ private:
     }
 
     Filling m_filling;
-    const LetterShapes& m_letters;
+    const Letters& m_letters;
 };
 
 } // namespace
 
-Result<Image> pictureOf(const Drawing& drawing, double scale, const std::filesystem::path& font) {
-    const auto letters = LetterShapes::read(font);
-    if (!letters)
-        return letters.error();
+Image pictureOf(const Drawing& drawing, double scale, const Letters& letters) {
     Image picture;
     picture.resize(static_cast<int>(std::lround(scale * drawing.width_px)),
                    static_cast<int>(std::lround(scale * drawing.height_px)));
     std::ranges::fill(picture.rgba, std::uint8_t{255});
-    Painter painter(picture, scale, letters.value());
+    Painter painter(picture, scale, letters);
     for (const DrawnShape& shape : drawing.shapes)
         std::visit(painter, shape);
     return picture;

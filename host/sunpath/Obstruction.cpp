@@ -1,7 +1,6 @@
 #include "host/sunpath/Obstruction.h"
 
-#include "engine/display/DisplayScene.h"
-#include "engine/display/RayPick.h"
+#include "engine/sunhours/SkyRays.h"
 #include "host/sun/SunDirection.h"
 
 #include <algorithm>
@@ -13,33 +12,17 @@ namespace {
 constexpr std::size_t LINES = 1440;
 constexpr int STEPS_OF_LINE = 180;
 
-/// Where a ray goes on behind a surface that hides nothing, of the scene's size.
-constexpr double STEP_THROUGH = 1e-6;
-
 class Looking {
 public:
     Looking(const DisplayScene& scene, const SkyWatch& watch)
-        : m_scene(scene), m_watch(watch),
-          m_step(STEP_THROUGH * scene.surfaceBox().Diagonal().Length()) {}
+        : m_north_deg(watch.north_deg), m_rays(scene, watch.point, watch.absent_mesh) {}
 
-    bool isHidden(double azimuth_deg, double altitude_deg) const {
-        constexpr int MOST_PANES = 64;
-        PickRay ray;
-        ray.origin = m_watch.point;
-        ray.direction = directionToSun({azimuth_deg + m_watch.north_deg, altitude_deg});
-        for (int pane = 0; pane < MOST_PANES; ++pane) {
-            const auto hit = firstSurface(m_scene, ray);
-            if (!hit)
-                return false;
-            if (!m_watch.isPassed || !m_watch.isPassed(hit->mesh))
-                return true;
-            ray.origin = hit->point + m_step * ray.direction;
-        }
-        return true;
+    bool isHidden(double azimuth_deg, double altitude_deg) {
+        return m_rays.isHidden(directionToSun({azimuth_deg + m_north_deg, altitude_deg}));
     }
 
     /// The altitude at which what is hidden begins or ends between two.
-    double border(double azimuth_deg, double low_deg, double high_deg) const {
+    double border(double azimuth_deg, double low_deg, double high_deg) {
         constexpr double FINE_DEG = 0.01;
         const bool is_hidden_below = isHidden(azimuth_deg, low_deg);
         while (high_deg - low_deg > FINE_DEG) {
@@ -50,7 +33,7 @@ public:
         return (low_deg + high_deg) / 2;
     }
 
-    std::vector<Obstruction::Band> line(double azimuth_deg) const {
+    std::vector<Obstruction::Band> line(double azimuth_deg) {
         std::vector<Obstruction::Band> bands;
         bool was_hidden = false;
         double last_deg = 0;
@@ -72,9 +55,8 @@ public:
     }
 
 private:
-    const DisplayScene& m_scene;
-    const SkyWatch& m_watch;
-    double m_step;
+    double m_north_deg;
+    SkyRays m_rays;
 };
 
 using Band = Obstruction::Band;
@@ -169,7 +151,7 @@ private:
 } // namespace
 
 Obstruction obstructionAround(const DisplayScene& scene, const SkyWatch& watch) {
-    const Looking looking(scene, watch);
+    Looking looking(scene, watch);
     Obstruction found;
     found.lines.resize(LINES);
     for (std::size_t line = 0; line < LINES; ++line)

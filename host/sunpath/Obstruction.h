@@ -4,7 +4,7 @@
 #include "kelmar/KM_Point.h"
 
 #include <cstddef>
-#include <functional>
+#include <optional>
 #include <vector>
 
 namespace quarn {
@@ -31,14 +31,13 @@ struct Obstruction {
 struct SkyWatch {
     KM_3dPoint point;     ///< in the world; a surface that it lies on should be a little away
     double north_deg = 0; ///< clockwise from the world's Y axis, as seen from above
-    /// Whether a mesh of the scene hides nothing; none: all hide. By its index in
-    /// DisplayScene::meshes.
-    std::function<bool(std::size_t mesh)> isPassed;
+    std::optional<std::size_t> absent_mesh{}; ///< hides nothing; an index of DisplayScene::meshes
 };
 
-/// Looks around from a point with rays, a quarter of a degree of the azimuth and half a degree of
-/// the altitude apart; the borders of what is hidden are found to a hundredth of a degree of the
-/// altitude. What is smaller than a step may be missed. Takes some tenths of a second.
+/// Looks around from a point with rays, to which glass is not there as GlassFilter has it, a
+/// quarter of a degree of the azimuth and half a degree of the altitude apart; the borders of what
+/// is hidden are found to a hundredth of a degree of the altitude. What is smaller than a step may
+/// be missed. Takes some tenths of a second.
 Obstruction obstructionAround(const DisplayScene& scene, const SkyWatch& watch);
 
 /// What is hidden as areas of a disk, to be filled as one path.

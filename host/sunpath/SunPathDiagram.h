@@ -1,10 +1,10 @@
 #pragma once
 
+#include "host/letters/SheetWords.h"
 #include "host/sunpath/Drawing.h"
 #include "host/sunpath/Obstruction.h"
 #include "host/sunpath/SkyDisk.h"
 #include "host/sunpath/SunPaths.h"
-#include "sdk/qncore/QnExport.h"
 
 #include <optional>
 #include <string>
@@ -14,8 +14,16 @@ namespace quarn {
 
 /// The point of a model that a diagram is of.
 struct DiagramPoint {
-    std::string name; ///< "the point 1,2,3 of house.glb"
+    std::string name; ///< of an object, or "1,2,3"
+    bool is_object;
+    std::string model; ///< "house.glb"
     Obstruction obstruction;
+};
+
+/// What clocks show in summer.
+struct SummerTime {
+    std::string name;           ///< "CEST"
+    std::chrono::minutes ahead; ///< of standard time
 };
 
 /// A sun path diagram, as somebody wants it.
@@ -24,7 +32,7 @@ struct SunPathWish {
     SunSite site;
     StandardClock clock;    ///< of a year that SunYears.h names
     std::string clock_name; ///< "UTC+1 (CET)"
-    std::string clock_note; ///< a sentence about summer time; empty: there is none to be told
+    std::optional<SummerTime> summer_time;
     std::vector<SkyProjection> projections; ///< side by side
     std::optional<double> north_deg;        ///< of the model, clockwise from its Y axis, to show it
     std::optional<DiagramPoint> point;
@@ -35,6 +43,6 @@ struct SunPathWish {
 /// standard time, and in grey what hides the sky from a point of a model. Ways and loops are named
 /// shapes: "stereographic-03-21", "orthographic-hour-12"; what is hidden is
 /// "stereographic-hidden".
-Drawing sunPathDiagram(const SunPathWish& wish);
+Drawing sunPathDiagram(const SunPathWish& wish, const SheetWords& words);
 
 } // namespace quarn

@@ -2,7 +2,7 @@
 
 #include "engine/images/ImageFile.h"
 #include "ground/AtomicFile.h"
-#include "ground/ModuleFile.h"
+#include "ground/PathText.h"
 #include "host/sunpath/DrawingPicture.h"
 #include "host/sunpath/SvgText.h"
 
@@ -19,14 +19,14 @@ std::string endingOf(const std::filesystem::path& file) {
     return ending;
 }
 
-Result<void> writePicture(const Drawing& drawing, const std::filesystem::path& file) {
+Result<void> writePicture(const SunPathWish& wish, const std::filesystem::path& file) {
     constexpr double SCALE = 2; // 250 dots an inch, where one disk fills the width of A4
-    const auto font = installedTree() / "share" / "quarn" / "fonts" / "DejaVuSans.ttf";
-    const auto picture = pictureOf(drawing, SCALE, font);
-    if (!picture)
-        return Error{file.native() + ": its letters cannot be drawn. " + picture.message() +
-                     " A file that ends in .svg needs no font."};
-    return writeImageFile(file, picture.value());
+    const auto letters = Letters::read(programFont());
+    if (!letters)
+        return Error{textFromPath(file).ToUtf8() + ": its letters cannot be drawn. " +
+                     letters.message() + " A file that ends in .svg needs no font."};
+    const Drawing drawing = sunPathDiagram(wish, SheetWords(letters.value()));
+    return writeImageFile(file, pictureOf(drawing, SCALE, letters.value()));
 }
 
 } // namespace
@@ -41,10 +41,9 @@ std::optional<std::string> whyDiagramIsRefused(const std::filesystem::path& file
 Result<void> writeSunPathDiagram(const SunPathWish& wish, const std::filesystem::path& file) {
     if (const auto refusal = whyDiagramIsRefused(file))
         return Error{*refusal};
-    const Drawing drawing = sunPathDiagram(wish);
     if (endingOf(file) == ".png")
-        return writePicture(drawing, file);
-    const std::string text = svgText(drawing);
+        return writePicture(wish, file);
+    const std::string text = svgText(sunPathDiagram(wish, SheetWords()));
     return writeFileAtomically(file, std::as_bytes(std::span(text)));
 }
 

@@ -3,6 +3,7 @@
     const data = JSON.parse(document.getElementById("data").textContent);
     const element = id => document.getElementById(id);
     const pixels = data.width * data.height;
+    const inHours = number => data.hour.replace("%1", number);
 
     // Runs of equal numbers: the change of the number, by turns up and down, and how long it stays.
     const expand = (text, into) => {
@@ -68,7 +69,7 @@
         const isInside = x >= 0 && y >= 0 && x < data.width && y < data.height;
         const pixel = isInside && hours[y * data.width + x] >= 0 ? y * data.width + x : -1;
         element("reading").textContent = pixel < 0 ? "\u00a0"
-            : (hours[pixel] / 100).toFixed(1) + " h · " + data.names[objects[pixel] - 1];
+            : inHours((hours[pixel] / 100).toFixed(1)) + " · " + data.names[objects[pixel] - 1];
         if (lit.length) showStrip(pixel);
     };
 
@@ -77,7 +78,7 @@
     for (let hour = 0; hour <= data.end; hour += every) {
         const tick = document.createElement("span");
         tick.style.left = 100 * hour / data.end + "%";
-        tick.textContent = hour + (hour ? " h" : "");
+        tick.textContent = hour ? inHours(hour) : hour;
         element("ticks").append(tick);
     }
     element("stage").addEventListener("pointermove", read);
@@ -87,7 +88,7 @@
         slider.max = lit.length - 1;
         slider.value = lit.length >> 1;
         slider.addEventListener("input", () => showStep(slider.valueAsNumber));
-        element("clock").textContent = "move to see shadows";
+        element("clock").textContent = data.move;
         element("day").hidden = false;
         showStrip(-1);
     }

@@ -16,9 +16,9 @@ const Places BELOW_IMPORT = {"kelmar/", "ground/", "engine/scene/"};
 const Places BELOW_DISPLAY = BELOW_IMPORT + "engine/images/";
 
 // The host: each of its rooms sees all that stand above it here.
-const Places BELOW_HOST = {"kelmar/",        "sdk/",           "ground/",
-                           "engine/scene/",  "engine/images/", "engine/display/",
-                           "engine/render/", "engine/sunhours/", "import/"};
+const Places BELOW_HOST = {
+    "kelmar/",         "sdk/",           "ground/",          "engine/scene/", "engine/images/",
+    "engine/display/", "engine/render/", "engine/sunhours/", "import/"};
 const Places BELOW_FRONT_END = BELOW_HOST + "host/border/";
 const Places BELOW_CITIES = BELOW_FRONT_END + "host/front_end/";
 const Places BELOW_SUN = BELOW_CITIES + "host/cities/";
@@ -26,7 +26,8 @@ const Places BELOW_CLOCK = BELOW_SUN + "host/sun/";
 const Places BELOW_ALMANAC = BELOW_CLOCK + "host/clock/";
 const Places BELOW_CURVES = BELOW_ALMANAC + "host/almanac/";
 const Places BELOW_DOCUMENT = BELOW_CURVES + "host/curves/";
-const Places BELOW_APP = BELOW_DOCUMENT + "host/document/" + "host/reader/" + "host/recording/";
+const Places BELOW_APP =
+    BELOW_DOCUMENT + "host/letters/" + "host/document/" + "host/reader/" + "host/recording/";
 const Places BELOW_PROMPT = BELOW_APP + "host/app/";
 const Places BELOW_DIALOGS = BELOW_PROMPT + "host/prompt/";
 const Places BELOW_COMMANDS = BELOW_DIALOGS + "host/dialogs/" + "host/recovery/";
@@ -77,7 +78,8 @@ const Room FLOORS[] = {
     {5, "host/document/", BELOW_DOCUMENT},
     {5, "host/reader/", BELOW_DOCUMENT},
     {5, "host/recording/", BELOW_DOCUMENT},
-    {6, "host/sunpath/", BELOW_DOCUMENT},
+    {5, "host/letters/", BELOW_DOCUMENT},
+    {6, "host/sunpath/", BELOW_DOCUMENT + "host/letters/"},
     {6, "host/app/", BELOW_APP},
     {7, "host/recovery/", BELOW_PROMPT},
     {7, "host/prompt/", BELOW_PROMPT},

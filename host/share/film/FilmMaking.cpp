@@ -2,6 +2,7 @@
 
 #include "ground/FileLinks.h"
 #include "ground/PathText.h"
+#include "host/letters/Letters.h"
 #include "sdk/qncore/QnLocalize.h"
 
 #include <algorithm>
@@ -72,7 +73,7 @@ Result<void> FilmMaking::begin(const Image& first) {
                         m_plan.frame_rate,
                         quality,
                         std::max(1, m_plan.threads),
-                        m_plan.wish.has_caption ? captionFont() : fs::path()};
+                        m_plan.wish.has_caption ? programFont() : fs::path()};
     auto film = filmModule().value()->open(form, m_part->path());
     if (!film)
         return cannotWrite(film.message());

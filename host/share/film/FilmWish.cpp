@@ -3,6 +3,7 @@
 #include "ground/ModuleFile.h"
 #include "ground/PartFile.h"
 #include "ground/PathText.h"
+#include "host/letters/Letters.h"
 #include "sdk/qncore/QnLocalize.h"
 
 #include <cerrno>
@@ -91,11 +92,11 @@ Result<void> checkEncoder(const FilmWish& wish, const Result<const FilmModule*>&
                         name.Array(), KM_wString::FromUtf8(missing).Array(),
                         KM_wString::FromUtf8(kind.encoder_package).Array());
     std::error_code error;
-    if (wish.has_caption && !fs::is_regular_file(captionFont(), error))
+    if (wish.has_caption && !fs::is_regular_file(programFont(), error))
         return sentence(QnLocalizeString(L"%s is not written: the font of its captions, %s, is not "
                                          L"there. Install Quarn with all its files.",
                                          42778),
-                        name.Array(), textFromPath(captionFont()).Array());
+                        name.Array(), textFromPath(programFont()).Array());
     return {};
 }
 
@@ -118,10 +119,6 @@ const Result<const FilmModule*>& filmModule() {
         return &reinterpret_cast<GetFilmModule>(opened.value())();
     }();
     return module;
-}
-
-fs::path captionFont() {
-    return installedTree() / "share" / "quarn" / "fonts" / "DejaVuSans.ttf";
 }
 
 } // namespace quarn

@@ -27,7 +27,4 @@ Result<void> checkFilm(const FilmWish& wish, const Result<const FilmModule*>& mo
 /// @return an error, a part of a sentence, where it is not there
 const Result<const FilmModule*>& filmModule();
 
-/// The font of captions.
-std::filesystem::path captionFont();
-
 } // namespace quarn

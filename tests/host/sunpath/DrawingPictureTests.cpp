@@ -1,24 +1,16 @@
-#include "ground/ModuleFile.h"
 #include "host/sunpath/DrawingPicture.h"
 
-#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 namespace quarn {
 namespace {
 
-using testing::HasSubstr;
-
-std::filesystem::path font() {
-    return installedTree() / "share" / "quarn" / "fonts" / "DejaVuSans.ttf";
-}
-
 /// A picture of 100 x 80 pixels, two for each of the drawing.
 Image picture(DrawnShape shape) {
-    Drawing drawing{.width_px = 50, .height_px = 40, .title = "", .shapes = {std::move(shape)}};
-    auto drawn = pictureOf(drawing, 2, font());
-    EXPECT_TRUE(drawn) << (drawn ? "" : drawn.message());
-    return drawn ? drawn.value() : Image{};
+    const auto letters = Letters::read(programFont());
+    EXPECT_TRUE(letters) << letters.message();
+    return pictureOf({.width_px = 50, .height_px = 40, .title = "", .shapes = {std::move(shape)}},
+                     2, letters.value());
 }
 
 int grey(const Image& image, int x, int y) {
@@ -95,15 +87,6 @@ TEST(DrawingPicture, TextsStandAtTheirAnchor) {
     EXPECT_GT(inkIn(middle, 0, 100), 1.2 * inkIn(start, 0, 100));
     EXPECT_GT(inkIn(middle, 0, 50), 2000);
     EXPECT_GT(inkIn(middle, 50, 100), 2000);
-}
-
-TEST(DrawingPicture, NeedsItsFont) {
-    const auto drawn = pictureOf({}, 1, "/nowhere/letters.ttf");
-    ASSERT_FALSE(drawn);
-    EXPECT_THAT(drawn.message(), HasSubstr("/nowhere/letters.ttf"));
-    const auto no_font = pictureOf({}, 1, QUARN_SOURCE_DIR "/README.md");
-    ASSERT_FALSE(no_font);
-    EXPECT_THAT(no_font.message(), HasSubstr("is no font"));
 }
 
 } // namespace

@@ -84,15 +84,45 @@ TEST(Obstruction, UnderARoofLeavesTheHorizonFree) {
     }
 }
 
-TEST(Obstruction, IsNothingWhereTheMeshHidesNothing) {
+/// How high the walls stand toward the north; 0 where they hide nothing.
+double heightInNorth(const SceneContent& content, const std::optional<std::size_t>& absent = {}) {
+    const auto bands = seen(content, {{0, 0, 1.5}, 0, absent}).lines[0];
+    return bands.empty() ? 0 : bands[0].high_deg;
+}
+
+/// A wall with another one behind it, which is twice as far away.
+SceneContent wallWithOneBehind() {
     SceneContent content = wall();
     addMesh(content, boxMesh({-50, 20, 0}, {50, 21, 5}));
-    const Obstruction behind =
-        seen(content, {{0, 0, 1.5}, 0, [](std::size_t mesh) { return mesh == 0; }});
-    ASSERT_THAT(behind.lines[0], SizeIs(1));
-    EXPECT_NEAR(behind.lines[0][0].high_deg, std::atan(3.5 / 20) / RADIANS_PER_DEGREE, 0.011);
-    const Obstruction none = seen(content, {{0, 0, 1.5}, 0, [](std::size_t) { return true; }});
-    EXPECT_THAT(none.lines[0], IsEmpty());
+    return content;
+}
+
+const double FIRST_WALL_DEG = std::atan(3.5 / 10) / RADIANS_PER_DEGREE;
+const double SECOND_WALL_DEG = std::atan(3.5 / 20) / RADIANS_PER_DEGREE;
+
+TEST(Obstruction, LeavesOutTheMeshThatIsAbsent) {
+    EXPECT_NEAR(heightInNorth(wallWithOneBehind()), FIRST_WALL_DEG, 0.011);
+    EXPECT_NEAR(heightInNorth(wallWithOneBehind(), 0), SECOND_WALL_DEG, 0.011);
+    EXPECT_EQ(heightInNorth(wall(), 0), 0);
+}
+
+TEST(Obstruction, GlassHidesNothingAsItShadesNothing) {
+    const auto heightBehind = [](const Material& material) {
+        SceneContent content = wallWithOneBehind();
+        content.meshes[0].placed.material = std::make_shared<const Material>(material);
+        return heightInNorth(content);
+    };
+    Material glass;
+    glass.transmission = 0.9F;
+    EXPECT_NEAR(heightBehind(glass), SECOND_WALL_DEG, 0.011);
+    glass.transmission = 0.4F;
+    EXPECT_NEAR(heightBehind(glass), FIRST_WALL_DEG, 0.011);
+    Material pane;
+    pane.see_through = true;
+    pane.base_color.a = 100;
+    EXPECT_NEAR(heightBehind(pane), SECOND_WALL_DEG, 0.011);
+    pane.base_color.a = 150;
+    EXPECT_NEAR(heightBehind(pane), FIRST_WALL_DEG, 0.011);
 }
 
 /// Directions in the areas are hidden, others are not; those within half a degree of a border may

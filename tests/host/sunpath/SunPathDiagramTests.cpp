@@ -27,7 +27,7 @@ SunPathWish wishFor(const SunSite& site, int zone_hours) {
             .site = site,
             .clock = {2026, hours(zone_hours)},
             .clock_name = "XST, UTC",
-            .clock_note = {},
+            .summer_time = {},
             .projections = {SkyProjection::stereographic, SkyProjection::orthographic},
             .north_deg = {},
             .point = {}};
@@ -60,7 +60,7 @@ const std::string& diagramOf(const Place& place) {
     static std::map<std::string, std::string> drawn;
     std::string& svg = drawn[place.name];
     if (svg.empty())
-        svg = svgText(sunPathDiagram(wishFor(place.site, place.zone_hours)));
+        svg = svgText(sunPathDiagram(wishFor(place.site, place.zone_hours), {}));
     return svg;
 }
 
@@ -165,11 +165,11 @@ TEST(SvgText, EscapesTextsAndStaysUtf8) {
 TEST(DiagramText, TellsTheClockAndNorth) {
     SunPathWish wish = wishFor({52.52, 13.41}, 1);
     wish.clock_name = "CET, UTC+1";
-    wish.clock_note = "While summer time is kept (CEST) clocks show one hour more.";
+    wish.summer_time = SummerTime{"CEST", hours(1)};
     wish.north_deg = -20;
-    const std::string svg = svgText(sunPathDiagram(wish));
+    const std::string svg = svgText(sunPathDiagram(wish, {}));
     EXPECT_THAT(svg, HasSubstr("hours of standard time, CET, UTC+1<"));
-    EXPECT_THAT(svg, HasSubstr(wish.clock_note));
+    EXPECT_THAT(svg, HasSubstr("While summer time is kept (CEST) clocks show one hour more."));
     EXPECT_THAT(svg, HasSubstr("North lies 20\xC2\xB0 anticlockwise from the model's Y axis"));
 }
 

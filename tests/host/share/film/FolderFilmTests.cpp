@@ -1,5 +1,6 @@
 #include "host/share/film/FolderFilm.h"
 
+#include "host/letters/Letters.h"
 #include "host/recording/FramesManifest.h"
 #include "tests/host/share/film/FilmStudio.h"
 
@@ -210,7 +211,7 @@ TEST_F(FilmOfAFolder, ThatTellsNoTimesHasNone) {
 TEST_F(FilmOfAFolder, HasItsTimesWhereverTheFontIsInstalled) {
     const auto odd = m_folder / "it's: [a], \\folder;";
     std::filesystem::create_directory(odd);
-    std::filesystem::copy_file(captionFont(), odd / "font.ttf");
+    std::filesystem::copy_file(programFont(), odd / "font.ttf");
     writeFile(m_folder / "house.apng", "");
     const FilmForm form{FilmKind::apng, 640, 360, 10, 80, 1, odd / "font.ttf"};
     const auto film = filmModule().value()->open(form, m_folder / "house.apng");
