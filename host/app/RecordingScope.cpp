@@ -92,6 +92,8 @@ RecordingPlan planOf(const KM_3dmAnimationProperties& record, Document& document
     if (!document.file().empty())
         plan.document = std::filesystem::absolute(document.file(), error);
     plan.metres_per_unit = metresPerUnit(document.units());
+    const auto place = record.IsSunStudy() ? document.studiedPlace() : std::nullopt;
+    plan.place = place ? place->city.ToUtf8() : "";
     plan.fingerprint = [record, settings = plan.settings, &document] {
         return fingerprintOf(record, settings, document);
     };

@@ -65,9 +65,8 @@ double turned(double degrees) {
 } // namespace
 
 std::optional<Zone> studyZone(const Document& document, const KM_3dmAnimationProperties& record) {
-    const std::optional<StudiedPlace>& place = document.studiedPlace();
-    if (!place || place->latitude_deg != record.Latitude() ||
-        place->longitude_deg != record.Longitude())
+    const std::optional<StudiedPlace> place = document.studiedPlace();
+    if (!place || !place->isAt(record.Latitude(), record.Longitude()))
         return std::nullopt;
     // Without the time zone database a recording goes on, told by the clock that needs none.
     const auto zone = Zone::written(place->zone.ToUtf8(), place->longitude_deg);

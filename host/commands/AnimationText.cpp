@@ -38,9 +38,11 @@ KM_wString animationText(Document& document) {
     if (!kind)
         return {};
     const KM_3dmAnimationProperties& record = *found.value();
-    return KM_wString::FormatToString(L"%s, %d %s in %s", kind, record.FrameCount(),
-                                      record.FrameCount() == 1 ? L"frame" : L"frames",
-                                      record.ViewportName().Array());
+    const KM_wString text = KM_wString::FormatToString(
+        L"%s, %d %s in %s", kind, record.FrameCount(),
+        record.FrameCount() == 1 ? L"frame" : L"frames", record.ViewportName().Array());
+    const auto place = record.IsSunStudy() ? document.studiedPlace() : std::nullopt;
+    return place ? text + L"; " + place->city + L", by the clocks of " + place->zone : text;
 }
 
 } // namespace quarn

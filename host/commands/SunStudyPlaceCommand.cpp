@@ -28,7 +28,7 @@ CQuarnCommand::result runSunStudyPlace(const CQuarnCommandContext& context) {
         return fail(known.message());
     place.city = city.String();
     place.zone = KM_wString::FromUtf8(known.value().name());
-    Document::of(context.Document()).studiedPlace() = place;
+    Document::of(context.Document()).setStudiedPlace(place);
     return CQuarnCommand::success;
 }
 

@@ -1,6 +1,7 @@
 #include "host/document/Document.h"
 
 #include "engine/display/DisplayMode.h"
+#include "host/border/Border.h"
 #include "host/document/DocumentDrawing.h"
 #include "host/document/DocumentList.h"
 #include "host/document/SavedState.h"
@@ -10,6 +11,7 @@
 #include "import/ModelFile.h"
 #include "kelmar/KM_PolylineCurve.h"
 #include "sdk/qncore/QnLocalize.h"
+#include "sdk/qncore/QnZoetrixDynamicAccess.h"
 
 #include <algorithm>
 #include <utility>
@@ -175,6 +177,17 @@ void Document::resizeDueFrames() {
         if (m_saved_state)
             m_saved_state->follow(*view, old_width_px, old_height_px);
     }
+}
+
+std::optional<StudiedPlace> Document::studiedPlace() const {
+    const IQnZoetrixDynamicAccess* const access = Zoetrix_QuarnDynamicAccess();
+    if (!m_studied_place || !access)
+        return m_studied_place; // the record may be in the file, unread
+    const auto agrees = acrossBorder([&] {
+        const KM_3dmAnimationProperties& record = access->AnimationProperties(face());
+        return m_studied_place->isAt(record.Latitude(), record.Longitude());
+    });
+    return !agrees || agrees.value() ? m_studied_place : std::nullopt;
 }
 
 bool Document::isModified() const {

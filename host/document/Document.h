@@ -172,9 +172,10 @@ public:
     /// Draws the document.
     DocumentDrawing& drawing() { return *m_drawing; }
     const DocumentDrawing& drawing() const { return *m_drawing; }
-    /// The place that a person gave the sun study; it counts while the study is there.
-    std::optional<StudiedPlace>& studiedPlace() { return m_studied_place; }
-    const std::optional<StudiedPlace>& studiedPlace() const { return m_studied_place; }
+    /// The place that a person gave the sun study. Another study that was set up since has other
+    /// coordinates: it is nothing then, whatever was given.
+    std::optional<StudiedPlace> studiedPlace() const;
+    void setStudiedPlace(const StudiedPlace& place) { m_studied_place = place; }
     /// The part of a sun study that others are put behind. Not saved.
     std::optional<KM_3dmAnimationProperties>& firstPartOfStudy() { return m_first_part; }
 

@@ -96,7 +96,7 @@ DocumentContent Document::contentWithoutObjects() const {
         content.rendering = pictures;
     if (light != LightChoice())
         content.light = light;
-    content.studied_place = m_studied_place;
+    content.studied_place = studiedPlace();
     content.settings.light_slots = m_lights.count();
     for (const auto& [index, slot] : m_lights.live())
         content.lights.push_back({index, slot.Light()});

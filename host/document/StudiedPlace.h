@@ -12,6 +12,11 @@ struct StudiedPlace {
     double latitude_deg = 0.0;
     double longitude_deg = 0.0; ///< as the record has it, -180 to 360
 
+    /// Whether it is the place of a record with these coordinates.
+    bool isAt(double latitude, double longitude) const {
+        return latitude_deg == latitude && longitude_deg == longitude;
+    }
+
     friend bool operator==(const StudiedPlace&, const StudiedPlace&) = default;
 };
 

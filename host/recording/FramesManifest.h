@@ -62,6 +62,7 @@ struct FramesManifest {
     std::string extension;             ///< of the pictures, without a point
     int frame_rate = 0;                ///< at which they are to be played, frames a second
     double metres_per_unit = 0.0;      ///< 0: the document has no units
+    std::string place;                 ///< of a sun study, UTF-8; empty: not known, or none
     std::string document;              ///< fingerprint, 16 hexadecimal digits; empty: not known
     std::string settings;              ///< the same of all settings that change pictures
     std::string instructions;          ///< the instruction set that drew them; empty: not known

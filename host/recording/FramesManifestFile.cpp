@@ -18,21 +18,24 @@ constexpr std::uintmax_t LARGEST_FILE_BYTES = 1'000'000'000;
 // ---- To JSON
 
 json headOf(const FramesManifest& manifest) {
-    return {{"format", FORMAT_NAME},
-            {"version", FORMAT_VERSION},
-            {"program", manifest.program},
-            {"name", manifest.name},
-            {"kind", manifest.kind},
-            {"frames", manifest.frames},
-            {"width_px", manifest.width_px},
-            {"height_px", manifest.height_px},
-            {"mode", manifest.mode},
-            {"extension", manifest.extension},
-            {"frame_rate", manifest.frame_rate},
-            {"metres_per_unit", manifest.metres_per_unit},
-            {"document", manifest.document},
-            {"settings", manifest.settings},
-            {"instructions", manifest.instructions}};
+    json head{{"format", FORMAT_NAME},
+              {"version", FORMAT_VERSION},
+              {"program", manifest.program},
+              {"name", manifest.name},
+              {"kind", manifest.kind},
+              {"frames", manifest.frames},
+              {"width_px", manifest.width_px},
+              {"height_px", manifest.height_px},
+              {"mode", manifest.mode},
+              {"extension", manifest.extension},
+              {"frame_rate", manifest.frame_rate},
+              {"metres_per_unit", manifest.metres_per_unit}};
+    if (!manifest.place.empty())
+        head["place"] = manifest.place;
+    head["document"] = manifest.document;
+    head["settings"] = manifest.settings;
+    head["instructions"] = manifest.instructions;
+    return head;
 }
 
 std::string textOf(const json& object, int indent) {
@@ -53,6 +56,7 @@ FramesManifest manifestOf(const json& object) {
     manifest.extension = object.at("extension");
     manifest.frame_rate = intOf(object.at("frame_rate"));
     manifest.metres_per_unit = finiteOf(object.at("metres_per_unit"));
+    manifest.place = object.value("place", "");
     manifest.document = object.at("document");
     manifest.settings = object.at("settings");
     manifest.instructions = object.value("instructions", "");

@@ -27,6 +27,7 @@ struct RecordingPlan {
     RecordingSettings settings;
     std::filesystem::path document; ///< absolute path of its file; empty: it has none
     double metres_per_unit = 0.0;
+    std::string place; ///< of a sun study, UTF-8; empty: none is known
     /// What its pictures are made of now.
     std::function<RecordingFingerprint()> fingerprint;
     RecordingChoice choice;

@@ -117,6 +117,7 @@ FramesManifest RunningRecording::manifest() const {
     manifest.extension = m_file.settings.extension;
     manifest.frame_rate = standardFrameRate(manifest.frames);
     manifest.metres_per_unit = m_plan.metres_per_unit;
+    manifest.place = m_plan.place;
     manifest.document = m_file.fingerprint.document;
     manifest.settings = m_file.fingerprint.settings;
     manifest.instructions = m_file.fingerprint.instructions;

@@ -18,8 +18,7 @@ using SkyPoint = std::variant<KM_3dPoint, std::string>;
 
 /// What the visible surfaces of a document hide of the sky, but for glass as GlassFilter has it.
 /// @param north_deg  clockwise from the Y axis, as seen from above
-/// @return an error, a sentence: there is no such object, no visible surface, or the scene cannot
-/// be
+/// @return an error, a sentence: there is no such object, no visible surface, or no scene can be
 ///         built
 Result<Obstruction> obstructionAround(CQuarnDoc& document, const SkyPoint& place, double north_deg);
 

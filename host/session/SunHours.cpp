@@ -5,6 +5,10 @@
 
 namespace quarn {
 
+std::vector<std::filesystem::path> sunHoursFiles(const SunHoursRequest& request) {
+    return filesOf(request);
+}
+
 Result<SunHoursFiles> makeSunHours(CQuarnDoc& document, const SunHoursRequest& request,
                                    const std::function<bool(double share)>& watch) {
     const std::filesystem::path shared =

@@ -19,6 +19,9 @@ struct SunHoursFiles {
     bool is_given_up = false; ///< by who watched: nothing was written
 };
 
+/// The files that makeSunHours writes, and replaces where they are there.
+QNCORE_API std::vector<std::filesystem::path> sunHoursFiles(const SunHoursRequest& request);
+
 /// Finds how many hours of direct sun the surfaces of a document get, and writes NAME-sunhours.png,
 /// .npy, .csv and .html, with a grid .ply too, into the request's folder, which must be there.
 /// @param watch  called some times a second with what is done, from 0 to 1; false ends the work

@@ -13,7 +13,7 @@ namespace {
 constexpr SheetText TITLE{L"Hours of sun", 42985};
 constexpr SheetText SPAN{L"%1 to %2", 42986};
 constexpr SheetText EVERY_DAYS{L"%1, every %2 days", 42987};
-constexpr SheetText AT_MOST{L"at most %1", 42988};
+constexpr SheetText AT_MOST{L"at most %1 of sun", 42988};
 constexpr SheetText HOURS_MINUTES{L"%1 h %2 min", 42990};
 constexpr SheetText LEGEND{L"Hours of direct sun", 42991};
 constexpr SheetText LEGEND_OF_DAYS{L"Hours of direct sun a day, mean of the days", 42992};

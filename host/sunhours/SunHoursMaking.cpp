@@ -100,22 +100,6 @@ std::optional<Findings> find(const DisplayScene& scene, const KM_Viewport& view,
     return found;
 }
 
-/// Writes the files one after the other, until one cannot be written.
-class Writing {
-public:
-    Writing(const SunHoursRequest& request, SunHoursReport& report)
-        : m_request(request), m_report(report) {}
-
-    fs::path next(const char* extension) {
-        m_report.files.push_back(m_request.folder / (m_request.name + "-sunhours" + extension));
-        return m_report.files.back();
-    }
-
-private:
-    const SunHoursRequest& m_request;
-    SunHoursReport& m_report;
-};
-
 Result<void> writeAll(const Document& document, const SunHoursRequest& request,
                       const SunMoments& moments, const fs::path& page_template,
                       const Findings& found, const KM_3dPoint& origin, SunHoursReport& report) {
@@ -123,26 +107,34 @@ Result<void> writeAll(const Document& document, const SunHoursRequest& request,
     if (!letters)
         return letters.error();
     const TextPainter text(std::move(letters.value()));
-    Writing writing(request, report);
+    report.files = filesOf(request);
+    auto file = report.files.begin();
     const std::string unit = metresPerUnit(document.units()) == 1.0 ? "m2" : "";
     const std::string csv = objectsCsv(found.objects, request.threshold_hours, unit);
-    Result<void> written =
-        writeImageFile(writing.next(".png"), sheetOf(found.picture, request, moments, text));
+    Result<void> written = writeImageFile(*file++, sheetOf(found.picture, request, moments, text));
     if (written)
-        written = writeHoursArray(writing.next(".npy"), found.map);
+        written = writeHoursArray(*file++, found.map);
     if (written)
-        written = writeFileAtomically(writing.next(".csv"), std::as_bytes(std::span(csv)));
+        written = writeFileAtomically(*file++, std::as_bytes(std::span(csv)));
     if (written)
-        written =
-            writeSunHoursPage(writing.next(".html"), {request, moments, found.map, found.picture,
-                                                      found.names, page_template});
+        written = writeSunHoursPage(
+            *file++, {request, moments, found.map, found.picture, found.names, page_template});
     if (written && found.grid)
-        written = writeGrid(writing.next(".ply"), *found.grid, found.grid_light, origin,
-                            endOfScale(moments.hours));
+        written =
+            writeGrid(*file++, *found.grid, found.grid_light, origin, endOfScale(moments.hours));
     return written;
 }
 
 } // namespace
+
+std::vector<fs::path> filesOf(const SunHoursRequest& request) {
+    std::vector<fs::path> files;
+    for (const char* const extension : {".png", ".npy", ".csv", ".html"})
+        files.push_back(request.folder / (request.name + "-sunhours" + extension));
+    if (request.grid_size > 0.0)
+        files.push_back(request.folder / (request.name + "-sunhours.ply"));
+    return files;
+}
 
 Result<SunHoursReport> writeSunHours(Document& document, const SunHoursRequest& request,
                                      const fs::path& page_template,

@@ -3,7 +3,9 @@
 #include "host/document/Document.h"
 #include "host/sunhours/SunHoursRequest.h"
 
+#include <filesystem>
 #include <functional>
+#include <vector>
 
 namespace quarn {
 
@@ -14,6 +16,9 @@ struct SunHoursReport {
     std::size_t steps = 0;                    ///< with the sun above the horizon
     bool is_given_up = false;                 ///< by who watched: nothing was written
 };
+
+/// The files that a request is answered with, the picture first.
+std::vector<std::filesystem::path> filesOf(const SunHoursRequest& request);
 
 /// Finds the hours of sun of a document's surfaces and writes picture, numbers, table and page;
 /// each file appears whole or not at all.

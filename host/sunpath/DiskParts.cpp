@@ -19,7 +19,7 @@ constexpr std::size_t DECEMBER = 11;
 /// How far outside the horizon things stand: degrees, dates, the letters of the compass.
 constexpr double DEGREES_PX = 15;
 constexpr double DATES_PX = 33;
-constexpr double LETTERS_BESIDE_DATES_PX = 96;
+constexpr double LETTERS_BESIDE_DATES_PX = 112;
 constexpr double LETTERS_PX = 42;
 
 std::string twoDigits(std::size_t number) {

@@ -135,7 +135,7 @@ std::optional<std::string> settlePlace(const TypedSunPath& typed, SunPathOrder& 
     if (!settled)
         return settled.message();
     const CivilSite& site = settled.value().site;
-    order.diagram.place = site.place;
+    order.diagram.place = settled.value().is_stated ? order.model.filename().native() : site.place;
     order.diagram.site = {site.latitude_deg, site.longitude_deg};
     order.diagram.zone = site.zone;
     if (settled.value().has_north)

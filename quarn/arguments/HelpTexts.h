@@ -25,7 +25,7 @@ inline constexpr const char* SHORT_HELP = R"(usage: quarn COMMAND ...
   quarn sun --place NAME                       tell where the sun stands, and when it rises and sets
   quarn sunpath --place NAME --out FILE.svg
                                                draw the ways of the sun through a year
-  quarn sunhours MODEL --place NAME --date DATE --out DIR
+  quarn sunhours MODEL --place NAME --out DIR
                                                tell how many hours of sun each place gets
   quarn places [TEXT]                          list the cities that a sun study knows by name
   quarn curves MODEL                           list what a camera can follow
@@ -157,11 +157,14 @@ Written into the folder, NAME being the model file's:
 An hour counts where the side of a surface that is seen looks toward the sun, the sun's centre stands
 above the horizon, and nothing is between. Glass, less than half opaque or letting more than half of
 the light through, shades nothing and is looked through; everything else shades. Times are those of
-the clocks of the place, with daylight saving. Of several days the hours are the mean of a day.
+the clocks of the place, with daylight saving. Of several days the hours are the mean of a day; ends
+such as sunrise+1h are each day's own then, and midnight on days without a sunrise or sunset. An hour
+that is skipped when clocks are put forward is refused on the first day; later ones begin with the
+change. Files that are there already are replaced with --overwrite alone.
 
 Examples:
   quarn sunhours house.glb --place Athens --date 2026-03-21 --view plan --out out/hours
-  quarn sunhours house.glb --place Athens --date 2026-03-21 --from 09:00 --to 17:00 --isolines 1 --out out/day
+  quarn sunhours house.glb --place Athens --date solstice-june --from sunrise+1h --to 17:00 --isolines 1 --out out/day
   quarn sunhours house.glb --place Athens --date 2026-01-01 --to-date 2026-12-31 --every-days 30 --every 30 --out out/year)";
 
 inline constexpr const char* RECORD_FOOTER = R"(
@@ -236,11 +239,12 @@ Times are those of the clock on the wall, daylight saving included. Azimuths are
 from north; altitudes are those of the sun's centre above a level horizon, without refraction. The
 sun rises and sets where published tables have it: with its centre 50 minutes of arc below the
 horizon (34 of refraction, 16 of half diameter). Without --time and --date it is now. --date alone
-tells a whole day, every hour; the years are 1800 to 2199.
+tells a whole day, every hour; the years are 1800 to 2199. Of a time that comes twice --time takes the
+first and --to the second.
 
 Examples:
   quarn sun --place Berlin
-  quarn sun --place Berlin --date 2026-06-21
+  quarn sun --place Berlin --date solstice-june
   quarn sun --place Berlin --time "2026-03-21 09:00" --to "2026-03-21 17:00" --every 30
   quarn sun --latitude 69.65 --longitude 18.96 --date 2026-12-21 --format json
   quarn sun --place Athens --date 2026-06-21 --every 10 --format csv > sun.csv)";

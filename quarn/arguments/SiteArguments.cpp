@@ -43,7 +43,7 @@ std::optional<std::string> settleByModel(const std::filesystem::path& model, Set
     settled.site.latitude_deg = stated->latitude_deg;
     settled.site.longitude_deg = stated->longitude_deg;
     settled.site.north_deg = stated->north_angle_deg;
-    settled.has_north = true;
+    settled.is_stated = settled.has_north = true;
     return std::nullopt;
 }
 

@@ -1,6 +1,5 @@
 #pragma once
 
-#include "ground/Result.h"
 #include "host/almanac/CivilSite.h"
 #include "quarn/arguments/OptionAdder.h"
 
@@ -28,6 +27,7 @@ void addSiteOfModel(const OptionAdder& add, TypedSite& typed);
 /// A place with its clocks, and what a person should know of them.
 struct SettledSite {
     CivilSite site;
+    bool is_stated = false; ///< by the model, not typed
     bool has_north = false; ///< typed or stated; else the Y axis counts as north
     std::string zone_note;  ///< a sentence without its full stop; empty: nothing
 };

@@ -37,4 +37,11 @@ std::optional<std::string> whyFolderCannotBeUsed(const std::filesystem::path& fo
     return std::nullopt;
 }
 
+std::optional<std::string> whyNotReplaced(const std::filesystem::path& file, bool overwrites) {
+    std::error_code unknown; // what cannot be looked at cannot be written either, and says why then
+    if (overwrites || !std::filesystem::exists(file, unknown))
+        return std::nullopt;
+    return file.native() + " is there already: give --overwrite to replace it, or another --out.";
+}
+
 } // namespace quarn::program

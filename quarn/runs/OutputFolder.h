@@ -10,4 +10,8 @@ namespace quarn::program {
 /// @return nothing when they can, else why not, naming the folder
 std::optional<std::string> whyFolderCannotBeUsed(const std::filesystem::path& folder);
 
+/// @param overwrites  whether --overwrite was given
+/// @return why a file cannot be written: it is there already; nothing where it may
+std::optional<std::string> whyNotReplaced(const std::filesystem::path& file, bool overwrites);
+
 } // namespace quarn::program

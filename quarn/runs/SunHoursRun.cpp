@@ -73,6 +73,9 @@ std::string toldText(const SunHoursWish& wish, const SunHoursFiles& made) {
 Outcome writeSunHours(const SunHoursWish& wish) {
     if (const auto why = whyFolderCannotBeUsed(wish.hours.folder))
         return Outcome::failure(*why);
+    for (const std::filesystem::path& file : sunHoursFiles(wish.hours))
+        if (const auto refusal = whyNotReplaced(file, wish.common.overwrites))
+            return Outcome::failure(*refusal);
     watchForInterruption();
     ConsoleFrontEnd front_end(printsFor(wish.common));
     HostSession host(front_end, wish.common);

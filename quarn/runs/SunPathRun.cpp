@@ -1,9 +1,8 @@
 #include "quarn/runs/SunPathRun.h"
 
 #include "host/sunpath/SunPathFile.h"
+#include "quarn/runs/OutputFolder.h"
 #include "quarn/session/Interruption.h"
-
-#include <system_error>
 
 namespace quarn::program {
 
@@ -23,10 +22,8 @@ Outcome drawSunPath(const SunPathOrder& order) {
     const std::filesystem::path& file = order.diagram.file;
     if (const auto refusal = whyDiagramIsRefused(file))
         return Outcome::misuse(*refusal);
-    std::error_code unknown; // what cannot be looked at cannot be written either, and says why then
-    if (!order.common.overwrites && std::filesystem::exists(file, unknown))
-        return Outcome::failure(file.native() + " is there already: give --overwrite to replace "
-                                                "it, or another file.");
+    if (const auto refusal = whyNotReplaced(file, order.common.overwrites))
+        return Outcome::failure(*refusal);
     watchForInterruption();
     ConsoleFrontEnd front_end(printsFor(order.common));
     HostSession host(front_end, order.common, HostSession::Use::numbers);

@@ -3,6 +3,7 @@
     const data = JSON.parse(document.getElementById("data").textContent);
     const element = id => document.getElementById(id);
     const pixels = data.width * data.height;
+    const tenths = new Intl.NumberFormat(document.documentElement.lang, { minimumFractionDigits: 1, maximumFractionDigits: 1 });
     const inHours = number => data.hour.replace("%1", number);
 
     // Runs of equal numbers: the change of the number, by turns up and down, and how long it stays.
@@ -69,7 +70,7 @@
         const isInside = x >= 0 && y >= 0 && x < data.width && y < data.height;
         const pixel = isInside && hours[y * data.width + x] >= 0 ? y * data.width + x : -1;
         element("reading").textContent = pixel < 0 ? "\u00a0"
-            : inHours((hours[pixel] / 100).toFixed(1)) + " · " + data.names[objects[pixel] - 1];
+            : inHours(tenths.format(hours[pixel] / 100)) + " · " + data.names[objects[pixel] - 1];
         if (lit.length) showStrip(pixel);
     };
 

@@ -3,9 +3,10 @@
 const HORIZON = 44; // radius in the dial
 
 class Sun {
-    constructor(suns) {
+    constructor(suns, place) {
         this.suns = suns; // [time, zone, azimuth, altitude] of each frame, or null
         element('sun').hidden = false;
+        element('sun-site').textContent = place;
         element('sun-way').setAttribute('d', this.way());
     }
 

@@ -11,7 +11,7 @@ class Viewer {
         this.picture = new Picture(element('picture'), recording);
         this.frames = new Frames(recording, element('first'), () => this.loadedMore());
         this.motion = new Motion(recording, () => this.draw());
-        this.sun = recording.suns ? new Sun(recording.suns) : null;
+        this.sun = recording.suns ? new Sun(recording.suns, recording.place) : null;
         element('viewer').classList.add(recording.kind);
         this.controls = new Controls(this);
         new Gestures(this);

@@ -24,7 +24,7 @@ describe('The page of a sun study', () => {
     const place = () => viewer.page.locator('#sun-place').evaluate((sun) => [Number(sun.getAttribute('cx')), Number(sun.getAttribute('cy'))]);
 
     // The pictures are two hours apart, from 4 to 18 o'clock.
-    it('shows date, time and zone of the place as its slider moves', async () => {
+    it('shows the place, and its date, time and zone as its slider moves', async () => {
         const slider = viewer.page.locator('#slider');
         assert.equal(await slider.getAttribute('max'), '7');
         await slider.fill('4');
@@ -32,6 +32,7 @@ describe('The page of a sun study', () => {
         assert.equal(await text('#sun-date'), 'June 21, 2026');
         assert.equal(await text('#sun-time'), '12:00');
         assert.equal(await text('#sun-zone'), 'UTC+1');
+        assert.equal(await text('#sun-site'), 'Athens, Greece');
         await slider.press('ArrowRight');
         await viewer.waitFor(5);
         assert.equal(await text('#sun-time'), '14:00');

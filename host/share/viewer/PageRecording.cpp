@@ -87,6 +87,7 @@ std::string pageRecordingJson(const PageRecording& recording) {
         {"bytes", meanBytes(manifest)},
         {"files", filesOf(recording)},
         {"suns", sunsOf(manifest)},
+        {"place", manifest.place},
     };
     return json.dump(-1, ' ', false, Json::error_handler_t::replace);
 }

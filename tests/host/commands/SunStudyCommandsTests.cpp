@@ -1,4 +1,6 @@
 #include "host/app/StudyMoments.h"
+#include "host/commands/AnimationText.h"
+#include "host/document/file/DocumentContent.h"
 #include "tests/host/app/TestCommand.h"
 #include "tests/host/document/DocumentFixtures.h"
 
@@ -93,6 +95,19 @@ TEST_F(SunStudyCommands, ClocksOfAnotherPlaceDoNotCount) {
     keeper.record.SetLongitude(150.0);
     EXPECT_EQ(toldTime(0), "2026-12-20T22:00:00 UTC+10");
     EXPECT_FALSE(studyZone(document(), keeper.record));
+}
+
+TEST_F(SunStudyCommands, NameOfAnotherPlaceIsNeitherShownNorSaved) {
+    keeper.record = study(20, 22, 23);
+    ASSERT_EQ(run(L"_-SunStudyPlace \"Auckland, New Zealand\" \"Pacific/Auckland\""),
+              CQuarnCommand::success);
+    ASSERT_EQ(run(L"_-List"), CQuarnCommand::success);
+    EXPECT_THAT(printed(), HasSubstr("Auckland, New Zealand, by the clocks of Pacific/Auckland"));
+    EXPECT_TRUE(document().content(false).studied_place);
+    keeper.record.SetLatitude(-36.0);
+    EXPECT_FALSE(document().studiedPlace());
+    EXPECT_FALSE(document().content(false).studied_place);
+    EXPECT_THAT(animationText(document()).ToUtf8(), testing::Not(HasSubstr("Auckland")));
 }
 
 TEST_F(SunStudyCommands, LabelsOfDaysThatDoNotExistAreToldAsTheyAre) {

@@ -23,6 +23,7 @@ FramesManifest sampleManifest() {
     manifest.extension = "jpg";
     manifest.frame_rate = 10;
     manifest.metres_per_unit = 0.3048;
+    manifest.place = "Zürich, Switzerland";
     manifest.document = "00000000000000ab";
     manifest.settings = "00000000000000cd";
     ManifestFrame first{0, manifest.name + "000.jpg", 1234, 0xFFFF'FFFF'FFFF'FFFEU, {}, {}};

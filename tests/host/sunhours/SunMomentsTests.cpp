@@ -85,5 +85,31 @@ TEST(SunMomentsTests, NorthTurnsTheSunClockwise) {
     EXPECT_NEAR(turned.y, -plain.x, 1e-9);
 }
 
+// Days of all seasons, each without its first and its last hour of sun; the bare horizon is a few
+// minutes later than that of the tables.
+TEST(SunMomentsTests, TimesOfTheSunAreEachDaysOwn) {
+    SunHoursRequest request = athensOn(2026y / March / 21);
+    request.last_day = 2026y / December / 31;
+    request.every_days = 91;
+    const double whole = momentsOf(request).hours;
+    request.from = wantedTime("sunrise+1h");
+    request.to = wantedTime("sunset-1h");
+    EXPECT_NEAR(momentsOf(request).hours, whole - 2.0, 0.25);
+}
+
+TEST(SunMomentsTests, DaysWithoutASunriseAreTakenWhole) {
+    SunHoursRequest request = athensOn(2026y / June / 21);
+    request.site.latitude_deg = 80;
+    request.from = wantedTime("sunrise+1h");
+    EXPECT_NEAR(momentsOf(request).hours, 24.0, 1e-9);
+}
+
+TEST(SunMomentsTests, EndBeforeTheBeginningHasNone) {
+    SunHoursRequest request = athensOn(2026y / December / 21);
+    request.from = wantedTime("sunrise+6h");
+    request.to = byTheClock(hours(9));
+    EXPECT_TRUE(momentsOf(request).moments.empty());
+}
+
 } // namespace
 } // namespace quarn

@@ -8,6 +8,7 @@
 namespace quarn::test {
 namespace {
 
+using testing::AllOf;
 using testing::HasSubstr;
 
 Start sunHours(const Studio& studio, const std::vector<std::string>& options) {
@@ -43,6 +44,34 @@ TEST(SunHoursTests, PlanOfADayIsAPictureAPageNumbersAndATable) {
     EXPECT_THAT(textOf(studio / "out/house-sunhours.csv"), HasSubstr("share_from_2_hours"));
 }
 
+/// Picture and page of a plan in a language.
+struct Sheet {
+    std::string picture;
+    std::string page;
+};
+
+Sheet sheetIn(const std::string& language) {
+    const Studio studio;
+    const Ended ended =
+        run(sunHours(studio, {"--place", "Athens", "--date", "2026-03-21", "--every", "120",
+                              "--view", "plan", "--language", language}));
+    EXPECT_EQ(ended.exit_code, 0) << ended.err;
+    return {textOf(studio / "out/house-sunhours.png"), textOf(studio / "out/house-sunhours.html")};
+}
+
+TEST(SunHoursTests, SheetIsInTheLanguageAndItsPictureInEnglishWhereTheFontLacksLetters) {
+    const Sheet english = sheetIn("en");
+    const Sheet german = sheetIn("de");
+    const Sheet japanese = sheetIn("ja");
+    EXPECT_THAT(german.page, AllOf(HasSubstr("<html lang=\"de\">"), HasSubstr("Sonnenstunden"),
+                                   HasSubstr("21. M\xC3\xA4r 2026")));
+    EXPECT_THAT(japanese.page, AllOf(HasSubstr("<html lang=\"ja\">"), HasSubstr("2026\xE5\xB9\xB4"
+                                                                                "3\xE6\x9C\x88"
+                                                                                "21\xE6\x97\xA5")));
+    EXPECT_NE(german.picture, english.picture);
+    EXPECT_EQ(japanese.picture, english.picture);
+}
+
 TEST(SunHoursTests, PolarNightIsToldAndHasNoHours) {
     const Studio studio;
     const Ended ended = run(sunHours(studio, {"--latitude", "78.2", "--longitude", "15.6", "--date",
@@ -66,6 +95,10 @@ TEST(SunHoursTests, MistakesAreToldBeforeAnythingIsRead) {
                 HasSubstr("--to is not after --from"));
     EXPECT_THAT(misuse({"--date", "2026-03-21", "--to-date", "2026-03-20"}),
                 HasSubstr("is before --date"));
+    EXPECT_THAT(misuse({"--date", "2026-03-21", "--from", "sunset", "--to", "sunrise"}),
+                HasSubstr("--to is not after --from"));
+    EXPECT_THAT(misuse({"--date", "2026-03-29", "--from", "03:30"}),
+                HasSubstr("--from 03:30 on 2026-03-29 does not exist in Europe/Athens"));
     EXPECT_THAT(misuse({"--date", "2026-03-21", "--zone", "Europe/Nowhere"}), HasSubstr("--zone"));
     EXPECT_FALSE(std::filesystem::exists(studio / "out"));
 }
@@ -77,6 +110,45 @@ TEST(SunHoursTests, ModelWithoutSurfacesIsRefusedAndWritesNothing) {
         run(sunHours(studio, {"--place", "Athens", "--date", "2026-03-21", "--view", "plan"}));
     EXPECT_EQ(ended.exit_code, 1);
     EXPECT_FALSE(std::filesystem::exists(studio / "out/house-sunhours.png"));
+}
+
+TEST(SunHoursTests, DayAndTimesMayBeThoseOfTheSun) {
+    const Studio studio;
+    const Ended ended =
+        run(sunHours(studio, {"--place", "Athens", "--date", "solstice-june-2026", "--from",
+                              "sunrise+1h", "--to", "sunset-1h", "--view", "plan"}));
+    ASSERT_EQ(ended.exit_code, 0) << ended.err;
+    // The sun is up for some 14 h 49 min that day.
+    EXPECT_THAT(ended.out, HasSubstr("at most 12 h 4"));
+    const std::string page = textOf(studio / "out/house-sunhours.html");
+    EXPECT_THAT(page, HasSubstr("21 June 2026"));
+    EXPECT_THAT(page, HasSubstr("sunrise+1h to sunset-1h"));
+}
+
+TEST(SunHoursTests, PlaceByCoordinatesIsToldWhoseClocksItGoesBy) {
+    const Studio studio;
+    const Ended ended = run(sunHours(studio, {"--latitude", "37.9", "--longitude", "23.7", "--date",
+                                              "2026-03-21", "--view", "plan"}));
+    ASSERT_EQ(ended.exit_code, 0) << ended.err;
+    EXPECT_THAT(ended.out, HasSubstr("The clock is that of Athens, Greece, the nearest city known; "
+                                     "--zone takes another.\n"));
+}
+
+TEST(SunHoursTests, FilesThatAreThereStayUnlessToldOtherwise) {
+    const Studio studio;
+    std::filesystem::create_directory(studio / "out");
+    std::ofstream(studio / "out/house-sunhours.csv") << "mine";
+    std::vector<std::string> options = {"--place", "Athens", "--date", "2026-12-21",
+                                        "--every", "60",     "--view", "plan"};
+    const Ended refused = run(sunHours(studio, options));
+    EXPECT_EQ(refused.exit_code, 1);
+    EXPECT_EQ(refused.err, "quarn: out/house-sunhours.csv is there already: give --overwrite to "
+                           "replace it, or another --out.\n");
+    EXPECT_EQ(textOf(studio / "out/house-sunhours.csv"), "mine");
+    EXPECT_FALSE(std::filesystem::exists(studio / "out/house-sunhours.png"));
+    options.push_back("--overwrite");
+    EXPECT_EQ(run(sunHours(studio, options)).exit_code, 0);
+    EXPECT_NE(textOf(studio / "out/house-sunhours.csv"), "mine");
 }
 
 } // namespace

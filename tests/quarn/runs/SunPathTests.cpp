@@ -82,6 +82,15 @@ TEST_F(SunPathRun, ShowsWhatTheModelHidesFromAPoint) {
     EXPECT_THAT(text, HasSubstr("the point 0.5,-3,1 of house.obj"));
 }
 
+TEST_F(SunPathRun, SpeaksTheLanguage) {
+    const Ended ended =
+        draw({"--place", "Berlin", "--north", "20", "--language", "de", "--out", "sun.svg"});
+    ASSERT_EQ(ended.exit_code, 0) << ended.err;
+    EXPECT_THAT(svg("sun.svg"),
+                AllOf(HasSubstr("Sonnenbahn: Berlin, Germany"), HasSubstr("13.41\xC2\xB0 O"),
+                      HasSubstr(">21. Dez<"), HasSubstr("20\xC2\xB0 im Uhrzeigersinn")));
+}
+
 TEST_F(SunPathRun, DrawsAPicture) {
     const Ended ended = draw({"--place", "Berlin", "--projection", "both", "--out", "sun.PNG"});
     ASSERT_EQ(ended.exit_code, 0) << ended.err;
@@ -127,7 +136,10 @@ TEST_F(SunPathRun, RefusesAModelWithoutSurfaces) {
 
 TEST_F(SunPathRun, KeepsAFileThatIsThereUnlessToldOtherwise) {
     writeFile(m_studio / "mine.svg", "mine");
-    EXPECT_EQ(draw({"--place", "Berlin", "--out", "mine.svg"}).exit_code, 1);
+    const Ended refused = draw({"--place", "Berlin", "--out", "mine.svg"});
+    EXPECT_EQ(refused.exit_code, 1);
+    EXPECT_EQ(refused.err, "quarn: mine.svg is there already: give --overwrite to replace it, or "
+                           "another --out.\n");
     EXPECT_EQ(svg("mine.svg"), "mine");
     EXPECT_EQ(draw({"--place", "Berlin", "--out", "mine.svg", "--overwrite"}).exit_code, 0);
     EXPECT_THAT(svg("mine.svg"), StartsWith("<?xml"));

@@ -272,6 +272,7 @@ TEST(SunStudyDefaults, DaysMayBeThoseOfTheYearsCourse) {
     EXPECT_THAT(on("solstice-june"), frame("06-(20|21|22)"));
     EXPECT_THAT(on("equinox-september"), frame("09-(22|23|24)"));
     EXPECT_THAT(on("solstice-december"), frame("12-(20|21|22|23)"));
+    EXPECT_THAT(on("solstice-june-2030"), Contains(HasSubstr("First frame: 2030-06-21 ")));
 }
 
 TEST(SunStudyDefaults, DayIsToday) {

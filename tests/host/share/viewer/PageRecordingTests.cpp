@@ -97,8 +97,10 @@ TEST(PageRecording, OfAStudyHasTimeAndSunOfEachFrame) {
     FramesManifest manifest = turntable(2, 0.0);
     manifest.kind = "one_day_sun";
     manifest.images[0].sun = FrameSun{"2026-06-21T04:00:00", "UTC+1", 57.25, -3.5};
+    manifest.place = "Athens, Greece";
     const Json json = jsonOf(manifest);
     EXPECT_EQ(json["kind"], "study");
+    EXPECT_EQ(json["place"], "Athens, Greece");
     EXPECT_EQ(json["suns"],
               Json::parse(R"([["2026-06-21T04:00:00", "UTC+1", 57.25, -3.5], null])"));
     manifest.images[0].sun.reset();
