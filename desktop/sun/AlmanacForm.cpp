@@ -67,7 +67,6 @@ void AlmanacForm::addTable() {
     m_events = new QLabel(this);
     m_events->setObjectName("events");
     m_events->setTextFormat(Qt::PlainText);
-    m_events->setWordWrap(true);
     auto* const copy_all = new QPushButton(localized(L"&Copy", 45592), this);
     copy_all->setObjectName("copy");
     copy_all->setAutoDefault(false);
@@ -79,11 +78,12 @@ void AlmanacForm::addTable() {
     m_hours->setHorizontalHeaderLabels({localized(L"Time", 45594),
                                         localized(L"Azimuth, clockwise from north", 45595),
                                         localized(L"Altitude", 45596)});
-    m_hours->horizontalHeader()->setSectionResizeMode(QHeaderView::Stretch);
+    m_hours->horizontalHeader()->setSectionResizeMode(QHeaderView::ResizeToContents);
+    m_hours->horizontalHeader()->setStretchLastSection(true);
     m_hours->verticalHeader()->hide();
     m_hours->verticalHeader()->setDefaultSectionSize(m_hours->fontMetrics().height() + 5);
     m_hours->setTabKeyNavigation(false);
-    m_hours->setMinimumSize(420, 220);
+    m_hours->setMinimumSize(460, 220);
     column().addWidget(m_hours, 1);
 }
 

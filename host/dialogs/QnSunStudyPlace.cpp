@@ -162,7 +162,7 @@ QnSunStudyPlace QnPlaceOfSunStudy(const KM_3dmAnimationProperties& record) {
     if (!document)
         return place;
     const std::optional<quarn::StudiedPlace> kept = document->studiedPlace();
-    if (kept && kept->latitude_deg == place.latitude && kept->longitude_deg == place.longitude)
+    if (kept && kept->isAt(place.latitude, place.longitude))
         place.clocks = kept->zone;
     return place;
 }
@@ -171,9 +171,8 @@ void QnKeepPlaceOfSunStudy(const QnSunStudyPlace& place) {
     quarn::Document* const document = activeDocument();
     const auto zone = clocksOf(place);
     if (document && zone)
-        document->studiedPlace() =
-            quarn::StudiedPlace{QnCityOfSunStudy(place), KM_wString::FromUtf8(zone->name()),
-                                place.latitude, place.longitude};
+        document->setStudiedPlace({QnCityOfSunStudy(place), KM_wString::FromUtf8(zone->name()),
+                                   place.latitude, place.longitude});
 }
 
 KM_wString QnCityOfSunStudy(const QnSunStudyPlace& place) {

@@ -41,9 +41,8 @@ StudiedSite studiedSite(CQuarnDoc& document) {
     StudiedSite site{{}, {}, place.latitude_deg, place.longitude_deg, 0.0};
     if (std::abs(record.NorthAngle()) <= 360.0)
         site.north_deg = record.NorthAngle();
-    const std::optional<StudiedPlace>& kept = whole.studiedPlace();
-    if (kept && kept->latitude_deg == record.Latitude() &&
-        kept->longitude_deg == record.Longitude()) {
+    const std::optional<StudiedPlace> kept = whole.studiedPlace();
+    if (kept && kept->isAt(record.Latitude(), record.Longitude())) {
         site.city = kept->city.ToUtf8();
         site.zone = kept->zone.ToUtf8();
     }
@@ -58,9 +57,8 @@ void keepStudiedSite(CQuarnDoc& document, const StudiedSite& site) {
     if (!Zoetrix_QuarnDynamicAccess() || recordOf(whole).IsSunStudy())
         return;
     keepInRecord(whole, site);
-    whole.studiedPlace() =
-        StudiedPlace{KM_wString::FromUtf8(site.city), KM_wString::FromUtf8(site.zone),
-                     site.latitude_deg, site.longitude_deg};
+    whole.setStudiedPlace({KM_wString::FromUtf8(site.city), KM_wString::FromUtf8(site.zone),
+                           site.latitude_deg, site.longitude_deg});
 }
 
 } // namespace quarn

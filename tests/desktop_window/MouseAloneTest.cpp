@@ -155,6 +155,33 @@ TEST(MouseAlone, ADayOfSunAtAPlaceOfTheMapIsSetUpPlayedAndRecorded) {
     openPage(desk, desk.documents() / "Animation" / "Animation.html");
 }
 
+TEST(MouseAlone, HoursOfSunAndASunPathDiagramAreMadeAndOpenedFromTheMenu) {
+    HouseDesk desk;
+    desk.start();
+    desk.openHouse();
+
+    desk.chooseInMenu("sunHours");
+    desk.choose("namedDay", "Equinox in March");
+    desk.click("ok");
+    desk.waitUntilIdle();
+    const std::filesystem::path plan = desk.documents() / "model-sunhours.png";
+    const std::optional<PictureHeader> header = readPictureHeader(plan);
+    ASSERT_TRUE(header);
+    EXPECT_GE(header->width_px, 1280);
+    desk.click("sharedFilePicture");
+    desk.lookUntil("the opener called",
+                   [&](const Windows&) { return !desk.openedFiles().empty(); });
+    EXPECT_EQ(desk.openedFiles(), plan.string() + '\n');
+    desk.waitUntilIdle();
+
+    desk.chooseInMenu("sunPath");
+    desk.choose("projection", "Both, side by side");
+    desk.click("ok");
+    desk.waitUntilIdle();
+    const std::filesystem::path diagram = desk.documents() / "model-sunpath.svg";
+    EXPECT_NE(readFile(diagram).find("orthographic-hour-12"), std::string::npos);
+}
+
 /// References are worth something only where another window is told from them.
 TEST(MouseAlone, AnotherWindowIsToldFromTheReferences) {
     Desk desk;

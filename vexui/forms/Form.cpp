@@ -22,6 +22,7 @@ namespace vexui {
 namespace {
 
 constexpr int least_width_px = 460;
+constexpr int least_width_of_two_px = 880;
 constexpr int icon_size_px = 24;
 
 /// The background of a field that cannot be taken: reddish, and as light or dark as the others.
@@ -65,6 +66,7 @@ Form::Form(const char* name, const QString& title, QWidget* owner)
 // ---- Fields
 
 void Form::beginColumn() {
+    setMinimumWidth(least_width_of_two_px);
     m_column->addStretch(1);
     m_column = new QVBoxLayout;
     m_column->setSpacing(12);

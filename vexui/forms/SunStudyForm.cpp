@@ -6,7 +6,6 @@
 
 #include <QDateEdit>
 #include <QFormLayout>
-#include <QHBoxLayout>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
@@ -115,15 +114,11 @@ void SunStudyForm::addChooser(QFormLayout& section) {
     button->setToolTip(localText(L"Find the place in a table of cities or on a map", 44048));
     button->setAutoDefault(false);
     connect(button, &QPushButton::clicked, this, [this] { m_place.choose(); });
-    auto* row = new QWidget(this);
-    auto* line = new QHBoxLayout(row);
-    line->setContentsMargins(0, 0, 0, 0);
-    line->addWidget(button);
-    m_place.city = new QLabel(row);
+    addBeneath(section, *button);
+    m_place.city = new QLabel(this);
     m_place.city->setObjectName(QString::fromLatin1("city"));
     m_place.city->setTextFormat(Qt::PlainText);
-    line->addWidget(m_place.city, 1);
-    addBeneath(section, *row);
+    addBeneath(section, *m_place.city);
     addToTabOrder(*button);
 }
 
@@ -153,6 +148,7 @@ QFormLayout& SunStudyForm::addTimes() {
     m_local_times->setObjectName(QString::fromLatin1("localTimes"));
     m_local_times->setTextFormat(Qt::PlainText);
     m_local_times->setWordWrap(true);
+    m_local_times->setMinimumHeight(2 * m_local_times->fontMetrics().lineSpacing() + 2);
     return section;
 }
 
