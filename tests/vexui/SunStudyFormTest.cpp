@@ -436,6 +436,7 @@ TEST_F(FirstSunForms, ClocksThatAPersonNamesAreKeptByTheDocument) {
         EXPECT_FALSE(isMarked(form, "clocks"));
         click(form, "ok");
     }));
+    session->document().Properties().SetAnimationProperties(record); // as the command does
     openSeason([](QDialog& form) {
         EXPECT_EQ("UTC+5:30", textIn(form, "clocks"));
         typeInto(form, "clocks", "");
