@@ -1,5 +1,6 @@
 #include "host/sunhours/HoursSheet.h"
 
+#include "host/clock/WallText.h"
 #include "host/sunhours/HourColors.h"
 
 #include <algorithm>
@@ -133,6 +134,18 @@ std::string daysText(const SunHoursRequest& request, const SheetWords& words) {
                                   : span;
 }
 
+/// An end of the time of day. Sunrise and sunset are told by the clock where there is one day.
+std::string endText(const SunHoursRequest& request, const SunMoments& moments,
+                    const std::optional<WantedTime>& wanted, bool is_last) {
+    if (!wanted)
+        return is_last ? "24:00" : "00:00";
+    const bool is_by_sun = wanted->since != WantedTime::Since::midnight;
+    if (!is_by_sun || moments.days > 1 || moments.moments.empty())
+        return wantedTimeText(*wanted);
+    const SunMoment& moment = is_last ? moments.moments.back() : moments.moments.front();
+    return timeText(request.site.zone.at(moment.time));
+}
+
 } // namespace
 
 std::string hoursText(double hours, const SheetWords& words) {
@@ -151,8 +164,8 @@ std::string subtitleOf(const SunHoursRequest& request, const SunMoments& moments
     std::string text = request.site.place.empty() ? "" : request.site.place + SEPARATOR;
     text += daysText(request, words);
     if (request.from || request.to)
-        text += SEPARATOR + words(SPAN, {request.from ? wantedTimeText(*request.from) : "00:00",
-                                         request.to ? wantedTimeText(*request.to) : "24:00"});
+        text += SEPARATOR + words(SPAN, {endText(request, moments, request.from, false),
+                                         endText(request, moments, request.to, true)});
     if (!moments.moments.empty())
         text += " (" + request.site.zone.at(moments.moments.front().time).abbreviation + ")";
     return text + SEPARATOR + words(AT_MOST, {hoursText(moments.hours, words)});

@@ -1,6 +1,7 @@
 #include "host/sunhours/SunHoursPage.h"
 
 #include "engine/images/ImageFile.h"
+#include "host/clock/WallText.h"
 #include "host/share/Base64Text.h"
 #include "host/share/viewer/PageTemplate.h"
 #include "host/sunhours/HourColors.h"
@@ -88,20 +89,10 @@ nlohmann::json litRuns(const SunHoursMap& map, std::size_t steps) {
     return all;
 }
 
-std::string wallText(const WallTime& time) {
-    const auto since_midnight = std::chrono::floor<std::chrono::minutes>(
-                                    time.local - std::chrono::floor<std::chrono::days>(time.local))
-                                    .count();
-    char text[16];
-    std::snprintf(text, sizeof text, "%02d:%02d ", static_cast<int>(since_midnight / 60),
-                  static_cast<int>(since_midnight % 60));
-    return text + time.abbreviation;
-}
-
 nlohmann::json timesOf(const SunHoursPage& page) {
     nlohmann::json times = nlohmann::json::array();
     for (const SunMoment& moment : page.moments.moments)
-        times.push_back(wallText(page.request.site.zone.at(moment.time)));
+        times.push_back(timeWithZone(page.request.site.zone.at(moment.time)));
     return times;
 }
 

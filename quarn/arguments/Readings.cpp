@@ -3,7 +3,6 @@
 #include "host/session/InstructionSets.h"
 #include "host/session/MemorySize.h"
 #include "host/session/RecordingCheck.h"
-#include "host/sun/SunYears.h"
 
 #include <algorithm>
 
@@ -34,12 +33,12 @@ std::string alternatives(const std::vector<std::string>& words) {
     return text;
 }
 
-bool isWithin(int year, int last_year) {
-    return year >= FIRST_SUN_YEAR && year <= last_year;
-}
-
-std::string yearsUntil(int last_year) {
-    return "in the years " + std::to_string(FIRST_SUN_YEAR) + " to " + std::to_string(last_year);
+/// The year that a word named; nothing: this one.
+std::optional<int> yearOf(const WantedDay& day) {
+    if (const auto* const date = std::get_if<std::chrono::year_month_day>(&day))
+        return int(date->year());
+    const auto* const season = std::get_if<SeasonDay>(&day);
+    return season ? season->year : std::nullopt;
 }
 
 } // namespace
@@ -151,39 +150,26 @@ Reading<FrameRanges> frameRanges() {
     };
 }
 
-Reading<std::chrono::year_month_day> dateUntil(int last_year) {
-    using Date = std::chrono::year_month_day;
-    return [=](const std::string& option, const std::string& word) -> std::variant<Date, Refusal> {
-        const std::optional<Date> date = isoDate(word);
-        if (!date)
-            return mustBe(option, "a date such as 2026-06-21", word);
-        if (!date->ok() || date->year() == std::chrono::year(0))
+Reading<WantedDay> dayOfTheSun(int last_year) {
+    return [=](const std::string& option,
+               const std::string& word) -> std::variant<WantedDay, Refusal> {
+        const std::optional<WantedDay> day = wantedDay(word);
+        if (!day)
+            return mustBe(option,
+                          "a date such as 2026-06-21, today, or a day such as solstice-june or "
+                          "equinox-march-2030",
+                          word);
+        const auto* const date = std::get_if<std::chrono::year_month_day>(&*day);
+        if (date && (!date->ok() || date->year() == std::chrono::year(0)))
             return mustBe(option, "a day of the calendar", word);
-        if (!isWithin(int(date->year()), last_year))
-            return mustBe(option, yearsUntil(last_year), word);
-        return *date;
+        const std::optional<int> year = yearOf(*day);
+        if (year && (*year < FIRST_SUN_YEAR || *year > last_year))
+            return mustBe(option,
+                          "in the years " + std::to_string(FIRST_SUN_YEAR) + " to " +
+                              std::to_string(last_year),
+                          word);
+        return *day;
     };
-}
-
-Reading<WantedDay> dayOfTheSun() {
-    return
-        [](const std::string& option, const std::string& word) -> std::variant<WantedDay, Refusal> {
-            const std::optional<WantedDay> day = wantedDay(word);
-            if (!day)
-                return mustBe(option,
-                              "a date such as 2026-06-21, today, or a day such as solstice-june or "
-                              "equinox-march-2030",
-                              word);
-            if (const SeasonDay* const season = std::get_if<SeasonDay>(&*day)) {
-                if (season->year && !isSunYear(*season->year))
-                    return mustBe(option, yearsUntil(LAST_SUN_YEAR), word);
-            } else if (std::holds_alternative<std::chrono::year_month_day>(*day)) {
-                auto date = dateUntil(LAST_SUN_YEAR)(option, word);
-                if (Refusal* const refusal = std::get_if<Refusal>(&date))
-                    return std::move(*refusal);
-            }
-            return *day;
-        };
 }
 
 Reading<WantedTime> timeOfTheSun() {

@@ -2,6 +2,7 @@
 
 #include "host/almanac/DayTimes.h"
 #include "host/almanac/WantedDay.h"
+#include "host/sun/SunYears.h"
 #include "quarn/arguments/OptionAdder.h"
 #include "quarn/words/FrameRanges.h"
 
@@ -46,16 +47,14 @@ Reading<std::filesystem::path> savedDocument();
 /// Frames of an animation: "0-9,20-30:2".
 Reading<FrameRanges> frameRanges();
 
-/// A day of the calendar from the first year that sun studies know.
-Reading<std::chrono::year_month_day> dateUntil(int last_year);
-
 /// What help says of the days that dayOfTheSun reads.
 inline constexpr const char* DAY_HELP =
     "The day, such as 2026-06-21, or solstice-june, solstice-december, equinox-march or "
     "equinox-september of this year; solstice-june-2030 is of another one (default: today)";
 
-/// A date, or a day that the sun's course names, of the years that the sun is known in.
-Reading<WantedDay> dayOfTheSun();
+/// A date, or a day that the sun's course names.
+/// @param last_year  the first is that of the sun
+Reading<WantedDay> dayOfTheSun(int last_year = LAST_SUN_YEAR);
 
 /// A time by the clock, or one that is told from sunrise or sunset.
 Reading<WantedTime> timeOfTheSun();

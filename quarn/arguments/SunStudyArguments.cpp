@@ -16,9 +16,9 @@ struct TypedStudy {
     SunStudyRequest request{};
     TypedSite site;
     int step = 1;
-    WantedCourse day;                                      ///< of a day's study
-    std::optional<std::chrono::year_month_day> first_date; ///< of a season
-    std::optional<std::chrono::year_month_day> last_date;
+    WantedCourse day;                   ///< of a day's study
+    std::optional<WantedDay> first_day; ///< of a season
+    std::optional<WantedDay> last_day;
     std::chrono::minutes time{}; ///< of a season: since midnight
     ScriptUse use;
 };
@@ -46,6 +46,11 @@ std::optional<std::string> checkView(const StudyView& view) {
     return std::nullopt;
 }
 
+std::optional<std::chrono::year_month_day> dateOf(const std::optional<WantedDay>& day,
+                                                  const Zone& zone) {
+    return day ? std::optional(dayOf(*day, zone)) : std::nullopt;
+}
+
 /// Settles the place and the moments; the request's recording must be settled.
 std::optional<std::string> settleCourse(TypedStudy& typed) {
     SunStudyRequest& request = typed.request;
@@ -53,10 +58,10 @@ std::optional<std::string> settleCourse(TypedStudy& typed) {
     if (!settled)
         return settled.message();
     const CivilSite& site = settled.value().site;
-    auto course =
-        request.course.kind == StudyCourse::Kind::one_day
-            ? courseOfDay(site, typed.day, typed.step)
-            : courseOfSeason(site, typed.first_date, typed.last_date, typed.time, typed.step);
+    auto course = request.course.kind == StudyCourse::Kind::one_day
+                      ? courseOfDay(site, typed.day, typed.step)
+                      : courseOfSeason(site, dateOf(typed.first_day, site.zone),
+                                       dateOf(typed.last_day, site.zone), typed.time, typed.step);
     if (!course)
         return course.message();
     request.course = std::move(course.value());
@@ -112,10 +117,10 @@ Action addSeason(CLI::App& command) {
     const OptionAdder add(command);
     addModelAndFolder(add, request.recording);
     addSiteOfModel(add, typed->site);
-    add("--from", typed->first_date, "DATE", dateUntil(LAST_SEASON_YEAR),
-        "Date of the first picture, such as 2026-03-21 (default: 1 January of this year, or a year "
-        "before --to)");
-    add("--to", typed->last_date, "DATE", dateUntil(LAST_SEASON_YEAR),
+    add("--from", typed->first_day, "DATE", dayOfTheSun(LAST_SEASON_YEAR),
+        "Date of the first picture, such as 2026-03-21 or solstice-june (default: 1 January of "
+        "this year, or a year before --to)");
+    add("--to", typed->last_day, "DATE", dayOfTheSun(LAST_SEASON_YEAR),
         "Date that no picture is later than (default: a year after --from)");
     add("--every", typed->step, "DAYS", wholeNumberFrom(1, {}, "days"),
         "Days between pictures, from 1", "7");

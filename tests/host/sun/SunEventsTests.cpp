@@ -130,9 +130,9 @@ TEST(SunEvents, DayLengthIsTheCountOfMinutesWithTheSunUp) {
     std::mt19937 chance(20);
     std::uniform_real_distribution<double> latitude(64, 70);
     std::uniform_real_distribution<double> longitude(-180, 180);
-    for (int round = 0; round < 12; ++round) {
+    for (int round = 0; round < 6; ++round) {
         const SunSite site{round % 2 ? latitude(chance) : -latitude(chance), longitude(chance)};
-        const auto day = utc("2024-05-10") + DAY * (20 * round);
+        const auto day = utc("2024-05-10") + DAY * (40 * round);
         int minutes = 0;
         for (auto time = day; time < day + DAY; time += 1min)
             minutes += sunPosition(site, time).altitude_deg >= PUBLISHED_HORIZON_DEG;

@@ -119,6 +119,10 @@ TEST(HoursSheetTests, WordsTellWhatWasAskedFor) {
     EXPECT_EQ(titleOf(request, {}), "Hours of sun · yard");
     EXPECT_EQ(subtitleOf(request, moments, {}),
               "Quito, Ecuador · 21 Mar 2026 (UTC-5) · at most 12 h of sun");
+    request.from = WantedTime{WantedTime::Since::sunrise, minutes(0)};
+    for (SunMoment& moment : moments.moments)
+        moment.time = sys_days(2026y / March / 21) + hours(11) + minutes(20); // 06:20 there
+    EXPECT_THAT(subtitleOf(request, moments, {}), testing::HasSubstr(" · 06:20 to 24:00 (UTC-5)"));
     request.last_day = 2026y / December / 31;
     request.every_days = 7;
     request.every_minutes = 15;
@@ -126,6 +130,7 @@ TEST(HoursSheetTests, WordsTellWhatWasAskedFor) {
     moments.hours = 11.25;
     EXPECT_THAT(subtitleOf(request, moments, {}),
                 testing::AllOf(testing::HasSubstr("21 Mar 2026 to 31 Dec 2026, every 7 days"),
+                               testing::HasSubstr("sunrise to 24:00"),
                                testing::HasSubstr("11 h 15 min")));
     EXPECT_EQ(
         legendOf(request, moments, {}),

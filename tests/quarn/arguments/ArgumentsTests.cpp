@@ -73,7 +73,7 @@ TEST(Arguments, VersionIsPrinted) {
 
 TEST(Arguments, UnknownCommandIsNamed) {
     expectRefusal(run({"turnip"}), {"unknown command turnip",
-                                    "turntable, flythrough, path, day, season, places, curves, "});
+                                    "day, season, sun, sunpath, sunhours, places, curves, "});
 }
 
 TEST(Arguments, UnknownOptionIsNamed) {

@@ -273,6 +273,8 @@ TEST(SunStudyDefaults, DaysMayBeThoseOfTheYearsCourse) {
     EXPECT_THAT(on("equinox-september"), frame("09-(22|23|24)"));
     EXPECT_THAT(on("solstice-december"), frame("12-(20|21|22|23)"));
     EXPECT_THAT(on("solstice-june-2030"), Contains(HasSubstr("First frame: 2030-06-21 ")));
+    EXPECT_THAT(scriptOf(season({"--place", "Athens", "--from", "solstice-june-2030"})),
+                Contains("# First frame: 2030-06-21 13:00 EEST = 10:00 UTC"));
 }
 
 TEST(SunStudyDefaults, DayIsToday) {
