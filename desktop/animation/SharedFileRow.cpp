@@ -56,6 +56,9 @@ SharedFileRow::SharedFileRow(QWidget* parent) : QWidget(parent), m_text(new Narr
     row->addWidget(m_text, 1);
     m_open = addButton("sharedFileOpen", localized(L"Open", 45330),
                        localized(L"Opens the page in the browser", 45448), m_open_line);
+    m_open_picture = addButton(
+        "sharedFilePicture", localized(L"Open picture", 45598),
+        localized(L"Opens the picture with the desktop's program for it", 45599), m_picture_line);
     m_show_in_folder =
         addButton("showInFolder", localized(L"Show in folder", 45447),
                   localized(L"Opens the folder that the file is in", 45449), m_folder_line);
@@ -89,6 +92,10 @@ void SharedFileRow::showReport(const SharedFileReport& report) {
     const std::filesystem::path file = std::filesystem::absolute(report.file, unknown);
     m_folder_line = report.is_made ? openingLine(file.parent_path()) : std::nullopt;
     m_open_line = report.is_made && isPage(file) ? openingLine(file) : std::nullopt;
+    m_picture_line = report.is_made && !report.picture.empty()
+                         ? openingLine(std::filesystem::absolute(report.picture, unknown))
+                         : std::nullopt;
+    m_open_picture->setVisible(m_picture_line.has_value());
     m_show_in_folder->setVisible(m_folder_line.has_value());
     m_open->setVisible(m_open_line.has_value());
     show();
@@ -97,6 +104,7 @@ void SharedFileRow::showReport(const SharedFileReport& report) {
 void SharedFileRow::setFree(bool is_free) {
     m_show_in_folder->setEnabled(is_free);
     m_open->setEnabled(is_free);
+    m_open_picture->setEnabled(is_free);
 }
 
 } // namespace quarn::desktop

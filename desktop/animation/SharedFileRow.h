@@ -9,7 +9,8 @@
 
 namespace quarn::desktop {
 
-/// What became of the file for others that was made last: a page, a film or a camera. Stays until
+/// What became of the file for others that was made last: a page, a film, a camera,
+/// or what is known of the sun. Stays until
 /// the person closes it, or something else is made.
 class SharedFileRow final : public QWidget {
     Q_OBJECT
@@ -32,8 +33,10 @@ private:
     NarrowLabel* m_text;
     QPushButton* m_show_in_folder;
     QPushButton* m_open;
+    QPushButton* m_open_picture;
     std::optional<QString> m_folder_line; ///< nothing where there is nothing to show
     std::optional<QString> m_open_line;
+    std::optional<QString> m_picture_line;
 };
 
 } // namespace quarn::desktop

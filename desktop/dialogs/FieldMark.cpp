@@ -64,6 +64,11 @@ void markField(QLineEdit& field, const QString& why) {
     field.setAccessibleDescription(why);
 }
 
+QColor warningColour(const QPalette& palette) {
+    return palette.color(QPalette::Window).lightness() < 128 ? QColor(255, 138, 128)
+                                                             : QColor(183, 28, 28);
+}
+
 bool isMarked(const QLineEdit& field) {
     return markOf(field) != nullptr;
 }

@@ -1,6 +1,8 @@
 #pragma once
 
+class QColor;
 class QLineEdit;
+class QPalette;
 class QString;
 
 namespace quarn::desktop {
@@ -9,6 +11,9 @@ namespace quarn::desktop {
 /// its end that tells why when the mouse rests on it.
 /// @param why  a sentence in the user's language; empty for no mark
 void markField(QLineEdit& field, const QString& why);
+
+/// The colour of a sentence about a field that cannot be taken, read on a light or a dark ground.
+QColor warningColour(const QPalette& palette);
 
 /// Whether a field is marked.
 bool isMarked(const QLineEdit& field);

@@ -48,12 +48,6 @@ QString longitudeFlaw(Flaw flaw) {
     return {};
 }
 
-/// Read on a light or a dark ground.
-QColor warningColour(const QPalette& palette) {
-    return palette.color(QPalette::Window).lightness() < 128 ? QColor(255, 138, 128)
-                                                             : QColor(183, 28, 28);
-}
-
 QLabel* makeLabel(const QString& text, QWidget* buddy, QWidget* parent) {
     auto* const label = new QLabel(text, parent);
     label->setBuddy(buddy);

@@ -7,9 +7,11 @@ namespace {
 using enum MenuPlace;
 
 constexpr MenuTitle TITLES[] = {
-    {file, L"&File", 45120},   {edit, L"&Edit", 45121},         {view, L"&View", 45122},
-    {draw, L"&Curves", 45123}, {display, L"&Render", 45124},    {animation, L"&Animation", 45125},
-    {share, L"&Share", 45440}, {plug_ins, L"&Plug-ins", 45126}, {help, L"&Help", 45127},
+    {file, L"&File", 45120},           {edit, L"&Edit", 45121},
+    {view, L"&View", 45122},           {draw, L"&Curves", 45123},
+    {display, L"&Render", 45124},      {sun, L"S&un", 45597},
+    {animation, L"&Animation", 45125}, {share, L"&Share", 45440},
+    {plug_ins, L"&Plug-ins", 45126},   {help, L"&Help", 45127},
 };
 
 constexpr MenuRow ROWS[] = {
@@ -48,7 +50,6 @@ constexpr MenuRow ROWS[] = {
 
     {display, L"DisplayMode", L"&Display mode…", 45159, "F3"},
     {display, L"DisplayEdges", L"&Edges…", 45160},
-    {display, L"Sun", L"S&un…", 45161},
     {display, L"Render", L"&Render", 45162, "F11", true},
     {display, L"RenderPreview", L"Render a &preview", 45163, "F12"},
     {display, L"RenderSettings", L"Picture si&ze and quality…", 45164},
@@ -56,11 +57,13 @@ constexpr MenuRow ROWS[] = {
     {display, L"SaveRenderWindowAs", L"&Save the rendered picture…", 45165},
     {display, L"CloseRenderWindow", L"&Close the rendered picture", 45166},
 
+    {sun, L"Sun", L"S&un…", 45161},
+    {sun, L"SetOneDaySunAnimation", L"&One day of sun…", 45173},
+    {sun, L"SetSeasonalSunAnimation", L"A &season of sun…", 45174},
+
     {animation, L"SetTurntableAnimation", L"&Turntable…", 45170},
     {animation, L"SetPathAnimation", L"&Along a path…", 45171},
     {animation, L"SetFlythroughAnimation", L"Flyt&hrough…", 45172},
-    {animation, L"SetOneDaySunAnimation", L"&One day of sun…", 45173},
-    {animation, L"SetSeasonalSunAnimation", L"A &season of sun…", 45174},
     {animation, L"PlayAnimation", L"Pla&y", 45175, "F5", true},
     {animation, L"ViewFirstFrame", L"&First frame", 45176, "Ctrl+Home", true},
     {animation, L"ViewPreviousFrame", L"Pre&vious frame", 45177, "Ctrl+Left"},

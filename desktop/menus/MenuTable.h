@@ -7,7 +7,7 @@
 namespace quarn::desktop {
 
 /// The menus of the window, from left to right.
-enum class MenuPlace { file, edit, view, draw, display, animation, share, plug_ins, help };
+enum class MenuPlace { file, edit, view, draw, display, sun, animation, share, plug_ins, help };
 
 /// A menu's title: English, and its number in the window's string tables.
 struct MenuTitle {

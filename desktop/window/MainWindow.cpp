@@ -18,6 +18,7 @@
 #include "desktop/recovery/RecoveryBeat.h"
 #include "desktop/recovery/RecoveryOffer.h"
 #include "desktop/render/RenderPictureWindow.h"
+#include "desktop/sun/SunActions.h"
 #include "desktop/texts/Texts.h"
 #include "desktop/views/ViewArea.h"
 #include "desktop/window/WindowActions.h"
@@ -65,7 +66,8 @@ MainWindow::MainWindow(Session& session, DesktopFrontEnd& front_end)
       m_file_drop(new FileDrop(*m_starter, *m_changes, *this)),
       m_end(new ProgramEnd(*m_starter, *m_pane, this)),
       m_session_end(new SessionEnd(session, *m_starter, *m_closing, *m_changes, *m_end, this)),
-      m_up_axis(new UpAxisAsking(this)) {
+      m_up_axis(new UpAxisAsking(this)),
+      m_sun(new SunActions(session, front_end, *m_starter, *this)) {
     setObjectName("mainWindow");
     layOut();
     buildMenus();
@@ -109,6 +111,8 @@ void MainWindow::layOut() {
 void MainWindow::buildMenus() {
     m_menus->addBelow("Open", {m_recent_files->menu().menuAction()});
     m_menus->addBelow("Import", {&m_up_axis->switchAction()});
+    m_menus->menu(MenuPlace::sun).addSeparator();
+    m_menus->menu(MenuPlace::sun).addActions(m_sun->actions());
     addWindowActions(*this, *m_command_dock);
     addFrameSizeButton(*this);
     m_menus->menu(MenuPlace::animation).addSeparator();

@@ -25,6 +25,7 @@ class RecoveryOffer;
 class RenderPictureWindow;
 class SessionEnd;
 class UnsavedChanges;
+class SunActions;
 class UpAxisAsking;
 class ViewArea;
 class WindowClosing;
@@ -96,6 +97,7 @@ private:
     ProgramEnd* m_end;
     SessionEnd* m_session_end;
     UpAxisAsking* m_up_axis;
+    SunActions* m_sun;
     RecoveryBeat* m_recovery = nullptr;
     RecoveryOffer* m_recovery_offer = nullptr;
     RenderPictureWindow* m_render_window = nullptr;

@@ -1,5 +1,6 @@
 #include "host/session/DocumentState.h"
 
+#include "host/commands/FileAsking.h"
 #include "host/document/Document.h"
 
 namespace quarn {
@@ -10,6 +11,10 @@ std::filesystem::path documentFile(CQuarnDoc& document) {
 
 bool isModified(CQuarnDoc& document) {
     return Document::of(document).isModified();
+}
+
+std::filesystem::path firstFolder() {
+    return firstChooserFolder();
 }
 
 int objectCount(CQuarnDoc& document) {

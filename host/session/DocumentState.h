@@ -27,6 +27,10 @@ QNCORE_API std::filesystem::path documentFile(CQuarnDoc& document);
 /// not for every picture.
 QNCORE_API bool isModified(CQuarnDoc& document);
 
+/// The folder that choosers show first: that of the document at work, else that of the user's
+/// documents; empty where neither is known.
+QNCORE_API std::filesystem::path firstFolder();
+
 /// How many objects it has, hidden ones too.
 QNCORE_API int objectCount(CQuarnDoc& document);
 

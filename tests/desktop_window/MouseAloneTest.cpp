@@ -128,6 +128,7 @@ TEST(MouseAlone, ADayOfSunAtAPlaceOfTheMapIsSetUpPlayedAndRecorded) {
     desk.openHouse();
 
     desk.chooseInMenu("command_SetOneDaySunAnimation");
+    desk.choose("namedDay", "Longest day");
     desk.click("choosePlace");
     desk.display().click(onMap(desk.widget("map").place, 37.98, 23.73));
     desk.waitForText("latitude", "37.98");
@@ -143,15 +144,42 @@ TEST(MouseAlone, ADayOfSunAtAPlaceOfTheMapIsSetUpPlayedAndRecorded) {
     desk.click("ok");
     desk.waitUntilIdle();
 
-    // On the hour, from six in the morning to six in the evening.
-    play(desk, 12);
+    // On the hour, while the sun is up: from seven to eight in the evening by the clocks there.
+    play(desk, 13);
     EXPECT_TRUE(desk.widget("frameDate").text.contains("18:00"));
     record(desk);
-    expectRecording(desk.documents() / "Animation", "jpg", 13, toldFrameSize(desk));
+    expectRecording(desk.documents() / "Animation", "jpg", 14, toldFrameSize(desk));
     const QImage morning = frame(desk, 0);
-    const QImage noon = frame(desk, 6);
+    const QImage noon = frame(desk, 7);
     EXPECT_GT(differenceOf(morning, noon).differing_share, 0.02) << "no shadow has moved";
     openPage(desk, desk.documents() / "Animation" / "Animation.html");
+}
+
+TEST(MouseAlone, HoursOfSunAndASunPathDiagramAreMadeAndOpenedFromTheMenu) {
+    HouseDesk desk;
+    desk.start();
+    desk.openHouse();
+
+    desk.chooseInMenu("sunHours");
+    desk.choose("namedDay", "Equinox in March");
+    desk.click("ok");
+    desk.waitUntilIdle();
+    const std::filesystem::path plan = desk.documents() / "model-sunhours.png";
+    const std::optional<PictureHeader> header = readPictureHeader(plan);
+    ASSERT_TRUE(header);
+    EXPECT_GE(header->width_px, 1280);
+    desk.click("sharedFilePicture");
+    desk.lookUntil("the opener called",
+                   [&](const Windows&) { return !desk.openedFiles().empty(); });
+    EXPECT_EQ(desk.openedFiles(), plan.string() + '\n');
+    desk.waitUntilIdle();
+
+    desk.chooseInMenu("sunPath");
+    desk.choose("projection", "Both, side by side");
+    desk.click("ok");
+    desk.waitUntilIdle();
+    const std::filesystem::path diagram = desk.documents() / "model-sunpath.svg";
+    EXPECT_NE(readFile(diagram).find("orthographic-hour-12"), std::string::npos);
 }
 
 /// References are worth something only where another window is told from them.

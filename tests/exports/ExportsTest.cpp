@@ -88,7 +88,8 @@ TEST(Exports, TheHostShowsItsInterfaceAndThePublishedFrontEnd) {
     const std::string interface =
         declarationsBelow(QUARN_SOURCE_DIR "/sdk") + declarationsBelow(QUARN_SOURCE_DIR "/kelmar");
     std::string front_end;
-    for (const std::string room : {"front_end", "session", "cities"})
+    for (const std::string room :
+         {"front_end", "session", "cities", "sun", "clock", "almanac", "sunpath"})
         front_end += declarationsBelow(QUARN_SOURCE_DIR "/host/" + room);
     ASSERT_FALSE(exportedSymbols(QNCORE_LIBRARY).empty());
     EXPECT_EQ(strangersIn(QNCORE_LIBRARY,

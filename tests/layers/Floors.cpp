@@ -48,7 +48,7 @@ const Places BELOW_STARTER = BELOW_PORT + "desktop/front_end/";
 const Places BELOW_BARS = BELOW_STARTER + "desktop/command_line/";
 const Places BELOW_WINDOW = BELOW_BARS + "desktop/dialogs/" + "desktop/render/" +
                             "desktop/documents/" + "desktop/recovery/" + "desktop/animation/" +
-                            "desktop/menus/" + "desktop/views/";
+                            "desktop/menus/" + "desktop/views/" + "desktop/sun/";
 
 constexpr std::string_view UTILITIES = "zoetrix/plugin/ZoetrixUtilities.h";
 
@@ -136,6 +136,7 @@ const Room FLOORS[] = {
     {11, "desktop/dialogs/", BELOW_STARTER},
     {11, "desktop/render/", BELOW_STARTER},
     {11, "desktop/documents/", BELOW_BARS},
+    {11, "desktop/sun/", BELOW_BARS + "desktop/dialogs/"},
     {11, "desktop/recovery/", BELOW_BARS + "desktop/dialogs/" + "desktop/documents/"},
     {11, "desktop/animation/", BELOW_BARS + "desktop/documents/"},
     {11, "desktop/menus/", BELOW_BARS + "desktop/animation/"},

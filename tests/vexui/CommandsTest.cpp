@@ -67,6 +67,7 @@ TEST_F(CommandsWithForms, ADayHasTheFramesThatItsFormPromised) {
     storeName(L"Day");
     std::string promised;
     EXPECT_EQ(CQuarnCommand::success, run(L"SetOneDaySunAnimation", [&](QDialog& form) {
+                  field<QDateEdit>(form, "date").setDate({2010, 6, 1});
                   field<QTimeEdit>(form, "startTime").setTime({6, 0});
                   field<QTimeEdit>(form, "endTime").setTime({18, 0});
                   typeInto(form, "minutes", "50");

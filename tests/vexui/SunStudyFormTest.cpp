@@ -361,3 +361,114 @@ TEST_F(SunForms, APickerThatIsClosedChangesNothing) {
     }));
     EXPECT_EQ(1u, front_end.locationQuestions().size()) << "Enter confirms the form";
 }
+
+namespace {
+
+/// Athens, in a document that nobody has set a sun study up in.
+class FirstSunForms : public VexUiFixture {
+protected:
+    FirstSunForms() {
+        record = KM_3dmAnimationProperties();
+        record.SetHtmlFilename(L"Sun");
+        record.SetLatitude(37.98);
+        record.SetLongitude(23.73);
+    }
+};
+
+} // namespace
+
+TEST_F(FirstSunForms, ADayGoesFromSunriseToSunsetAndTheClocksThereAreTold) {
+    EXPECT_TRUE(openDay([](QDialog& form) {
+        EXPECT_EQ(QDate::currentDate().year(), field<QDateEdit>(form, "date").date().year());
+        EXPECT_EQ("Athens, Greece", textIn(form, "city"));
+        EXPECT_EQ("Europe/Athens", textIn(form, "clocks"));
+        typeInto(form, "minutes", "30");
+        field<QDateEdit>(form, "date").setDate({2026, 6, 21});
+        EXPECT_EQ("Longest day", field<QComboBox>(form, "namedDay").currentText().toStdString());
+        // The sun rises at 06:03 and sets at 20:51 there, some minutes before and after its centre
+        // is at the bare horizon.
+        EXPECT_EQ("04:30", textIn(form, "startTime"));
+        EXPECT_EQ("18:30", textIn(form, "endTime"));
+        EXPECT_EQ("04:30 - 18:30 UTC+1 is 06:30 - 20:30 EEST by the clocks there.",
+                  textIn(form, "localTimes"));
+        click(form, "ok");
+    }));
+    EXPECT_EQ(4, record.StartHour());
+    EXPECT_EQ(30, record.EndMinutes());
+}
+
+TEST_F(FirstSunForms, OfferedTimesFollowThePlaceUntilAPersonChoosesOne) {
+    openDay([](QDialog& form) {
+        field<QDateEdit>(form, "date").setDate({2026, 6, 21});
+        typeInto(form, "latitude", "52.52");
+        typeInto(form, "longitude", "13.40");
+        // Berlin: 04:43 to 21:33 of UTC+2, and the study reckons in UTC.
+        EXPECT_EQ("03:00", textIn(form, "startTime"));
+        EXPECT_EQ("19:00", textIn(form, "endTime"));
+        EXPECT_EQ("Europe/Berlin", textIn(form, "clocks"));
+        field<QTimeEdit>(form, "startTime").setTime({9, 0});
+        typeInto(form, "longitude", "-70");
+        EXPECT_EQ("09:00", textIn(form, "startTime"));
+        EXPECT_EQ("19:00", textIn(form, "endTime"));
+        form.reject();
+    });
+}
+
+TEST_F(FirstSunForms, ASeasonIsThisYearAtNoonByTheClocksThere) {
+    const int year = QDate::currentDate().year();
+    openSeason([&](QDialog& form) {
+        EXPECT_EQ(QDate(year, 1, 1), field<QDateEdit>(form, "startDate").date());
+        EXPECT_EQ(QDate(year, 12, 31), field<QDateEdit>(form, "endDate").date());
+        EXPECT_EQ("11:00", textIn(form, "timeOfDay"));
+        EXPECT_EQ("11:00 UTC+1 is 12:00 EET, 13:00 EEST by the clocks there.",
+                  textIn(form, "localTimes"));
+        form.reject();
+    });
+}
+
+TEST_F(FirstSunForms, ClocksThatAPersonNamesAreKeptByTheDocument) {
+    EXPECT_TRUE(openDay([](QDialog& form) {
+        typeInto(form, "clocks", "Europe/Atlantis");
+        EXPECT_TRUE(isMarked(form, "clocks"));
+        click(form, "ok");
+        EXPECT_TRUE(form.isVisible());
+        typeInto(form, "clocks", "+05:30");
+        EXPECT_FALSE(isMarked(form, "clocks"));
+        click(form, "ok");
+    }));
+    session->document().Properties().SetAnimationProperties(record); // as the command does
+    openSeason([](QDialog& form) {
+        EXPECT_EQ("UTC+5:30", textIn(form, "clocks"));
+        typeInto(form, "clocks", "");
+        EXPECT_EQ("Europe/Athens",
+                  field<QLineEdit>(form, "clocks").placeholderText().toStdString());
+        EXPECT_FALSE(isMarked(form, "clocks"));
+        form.reject();
+    });
+}
+
+TEST_F(FirstSunForms, PolarNightOffersTheMiddleOfTheDay) {
+    openDay([](QDialog& form) {
+        field<QDateEdit>(form, "date").setDate({2026, 12, 21});
+        typeInto(form, "latitude", "78.22");
+        typeInto(form, "longitude", "15.65");
+        EXPECT_EQ("09:00", textIn(form, "startTime"));
+        EXPECT_EQ("15:00", textIn(form, "endTime"));
+        form.reject();
+    });
+}
+
+TEST_F(FirstSunForms, FitALowScreen) {
+    for (const char* const language : {"C", "de", "es", "fr", "ja", "zh"}) {
+        start(language);
+        const auto fits = [&](QDialog& form) {
+            EXPECT_LE(form.height(), 560) << language;
+            EXPECT_LE(form.width(), 1000) << language;
+            if (const QByteArray to = qgetenv("QUARN_FORM_PICTURES"); !to.isEmpty())
+                form.grab().save(QString("%1/%2-%3.png").arg(to, form.objectName(), language));
+            form.reject();
+        };
+        openDay(fits);
+        openSeason(fits);
+    }
+}

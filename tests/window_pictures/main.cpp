@@ -13,7 +13,7 @@ using namespace quarn::test;
 
 constexpr int JPEG_QUALITY = 80;
 /// The frame of that time, where the first is of six o'clock, and half an hour lies between them.
-constexpr int HALF_PAST_EIGHT = 5;
+constexpr int HALF_PAST_EIGHT = 8;
 
 /// Darkens what lies around a window, as the shadow that a window manager gives it.
 /// @param before  what stands before it and stays as it is; may be empty
@@ -60,6 +60,7 @@ public:
         desk.waitUntilIdle();
         take(desk, "window-recorded");
         desk.chooseInMenu("command_SetOneDaySunAnimation");
+        desk.choose("namedDay", "Longest day");
         desk.click("choosePlace");
         const QRect map = desk.widget("map").place;
         const double pixels_per_degree = map.width() / 360.0;

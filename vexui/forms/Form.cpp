@@ -22,6 +22,7 @@ namespace vexui {
 namespace {
 
 constexpr int least_width_px = 460;
+constexpr int least_width_of_two_px = 880;
 constexpr int icon_size_px = 24;
 
 /// The background of a field that cannot be taken: reddish, and as light or dark as the others.
@@ -52,15 +53,25 @@ QString withoutMnemonic(QString label) {
 } // namespace
 
 Form::Form(const char* name, const QString& title, QWidget* owner)
-    : QDialog(owner), m_column(new QVBoxLayout(this)) {
+    : QDialog(owner), m_columns(new QHBoxLayout(this)), m_column(new QVBoxLayout) {
     setObjectName(QString::fromLatin1(name));
     setWindowTitle(title);
     setMinimumWidth(least_width_px);
+    m_columns->setSpacing(16);
+    m_columns->setContentsMargins(16, 16, 16, 16);
+    m_columns->addLayout(m_column, 1);
     m_column->setSpacing(12);
-    m_column->setContentsMargins(16, 16, 16, 16);
 }
 
 // ---- Fields
+
+void Form::beginColumn() {
+    setMinimumWidth(least_width_of_two_px);
+    m_column->addStretch(1);
+    m_column = new QVBoxLayout;
+    m_column->setSpacing(12);
+    m_columns->addLayout(m_column, 1);
+}
 
 QFormLayout& Form::addSection(const QString& title) {
     auto* group = new QGroupBox(title, this);

@@ -12,6 +12,7 @@
 
 class QComboBox;
 class QFormLayout;
+class QHBoxLayout;
 class QLabel;
 class QVBoxLayout;
 
@@ -51,6 +52,9 @@ protected:
     /// Says why a field cannot be taken; empty when it can.
     using Fault = std::function<QString()>;
 
+    /// Sections that are added from now on, the line and the buttons stand to the right of those
+    /// that are there: a form of many fields is wide, for screens that are low.
+    void beginColumn();
     /// A framed group of fields; the forms fill it from top to bottom.
     QFormLayout& addSection(const QString& title);
     /// Adds a field. Fields are reached with Tab in the order they are added.
@@ -87,7 +91,8 @@ private:
     void mark(Check& check, const QString& fault);
     void tell(const Outcome& outcome, bool is_fault);
 
-    QVBoxLayout* m_column;
+    QHBoxLayout* m_columns;
+    QVBoxLayout* m_column; ///< the last
     std::vector<QLabel*> m_labels;
     std::vector<QWidget*> m_tab_order;
     std::vector<Check> m_checks;

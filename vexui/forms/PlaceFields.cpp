@@ -7,6 +7,7 @@
 #include "vexui/texts/LocalText.h"
 
 #include <QLabel>
+#include <QLineEdit>
 
 #include <cmath>
 
@@ -33,6 +34,24 @@ void PlaceFields::show(const KM_3dmAnimationProperties& record) const {
     north_angle->setNumber(record.NorthAngle());
 }
 
+std::optional<QnSunStudyPlace> PlaceFields::place() const {
+    if (!latitude->number() || !longitude->number())
+        return std::nullopt;
+    return QnSunStudyPlace{*latitude->number(), *longitude->number(), fromQt(clocks->text())};
+}
+
+void PlaceFields::followPlace() const {
+    std::optional<QnSunStudyPlace> here = place();
+    city->setText(here ? toQt(QnCityOfSunStudy(*here)) : QString());
+    if (!here)
+        return;
+    here->clocks = {};
+    const QString of_place = toQt(QnClocksOfSunStudy(*here));
+    clocks->setPlaceholderText(of_place);
+    if (!has_own_clocks && !clocks->hasFocus()) // nobody empties it to type another one
+        clocks->setText(of_place);
+}
+
 void PlaceFields::choose() const {
     double chosen_latitude = latitude->number().value_or(0.0);
     double chosen_longitude = longitude->number().value_or(0.0);
@@ -54,6 +73,8 @@ void PlaceFields::takeInto(KM_3dmAnimationProperties& record) const {
     record.SetLatitude(latitude->number().value_or(0.0));
     record.SetLongitude(longitude->number().value_or(0.0));
     record.SetNorthAngle(north_angle->number().value_or(0.0));
+    if (const std::optional<QnSunStudyPlace> here = place())
+        QnKeepPlaceOfSunStudy(*here);
 }
 
 QString PlaceFields::latitudeFault() const {
@@ -70,6 +91,14 @@ QString PlaceFields::northAngleFault() const {
     return north_angle->number()
                ? QString()
                : localText(L"Enter a north angle from -360 to 360 degrees.", 44074);
+}
+
+QString PlaceFields::clocksFault() const {
+    const std::optional<QnSunStudyPlace> here = place();
+    if (!here || here->clocks.IsEmpty() || !QnClocksOfSunStudy(*here).IsEmpty())
+        return {};
+    return localText(L"There is no such time zone. Enter one as Europe/Berlin, +05:30 or solar.",
+                     44125);
 }
 
 } // namespace vexui

@@ -27,11 +27,11 @@ SeasonForm::SeasonForm(const IZoetrixDataUI& lists, const KM_3dmAnimationPropert
     m_start = &addDate(section,
                        {"startDate", localText(L"&Start date:", 44034),
                         localText(L"The day of the first frame", 44054)},
-                       record.StartYear(), record.StartMonth(), record.StartDay());
+                       record.StartYear(), record.StartMonth(), record.StartDay(), true);
     m_end = &addDate(section,
                      {"endDate", localText(L"&End date:", 44035),
                       localText(L"No frame is later; one can be on that day", 44055)},
-                     record.EndYear(), record.EndMonth(), record.EndDay());
+                     record.EndYear(), record.EndMonth(), record.EndDay(), true);
     m_time = &addTime(section,
                       {"timeOfDay", localText(L"Time of &day:", 44036),
                        localText(L"The time of every frame", 44056)},
@@ -42,6 +42,16 @@ SeasonForm::SeasonForm(const IZoetrixDataUI& lists, const KM_3dmAnimationPropert
             record.DaysBetweenFrames(), longest_step_days,
             localText(L"Enter how many days are between frames, 0 or more.", 44080));
     finishWith(lists, record);
+}
+
+void SeasonForm::offer(const QnSunStudyPlace& place, KM_3dmAnimationProperties& record) const {
+    QnOfferSunYear(place, record);
+}
+
+void SeasonForm::showTimes(const KM_3dmAnimationProperties& record) {
+    m_start->setDate({record.StartYear(), record.StartMonth(), record.StartDay()});
+    m_end->setDate({record.EndYear(), record.EndMonth(), record.EndDay()});
+    m_time->setTime({record.StartHour(), record.StartMinutes()});
 }
 
 SunStudyForm::Span SeasonForm::span() const {

@@ -13,6 +13,9 @@ public:
 protected:
     Span span() const override;
     std::int64_t stepInSeconds() const override;
+    bool isOneDay() const override { return false; }
+    void offer(const QnSunStudyPlace& place, KM_3dmAnimationProperties& record) const override;
+    void showTimes(const KM_3dmAnimationProperties& record) override;
     void takeStep(KM_3dmAnimationProperties& record) const override;
     QString momentsText(const QDateTime& start, const StudyFrames& frames) const override;
 

@@ -7,10 +7,12 @@
 #include <QDateEdit>
 #include <QFormLayout>
 #include <QLabel>
+#include <QLineEdit>
 #include <QPushButton>
 #include <QTimeEdit>
 
 #include <algorithm>
+#include <array>
 #include <cstdlib>
 #include <limits>
 
@@ -52,6 +54,17 @@ void takeEnd(const QDateTime& end, KM_3dmAnimationProperties& record) {
     record.SetEndSeconds(end.time().second());
 }
 
+/// Nobody has set times up in the document: they are those that every record begins with.
+bool hasFirstTimes(const KM_3dmAnimationProperties& record) {
+    const KM_3dmAnimationProperties fresh;
+    const auto times = [](const KM_3dmAnimationProperties& of) {
+        return std::array{of.StartYear(),    of.StartMonth(),   of.StartDay(),  of.StartHour(),
+                          of.StartMinutes(), of.StartSeconds(), of.EndYear(),   of.EndMonth(),
+                          of.EndDay(),       of.EndHour(),      of.EndMinutes()};
+    };
+    return !record.IsSunStudy() && times(record) == times(fresh);
+}
+
 } // namespace
 
 SunStudyForm::SunStudyForm(const char* name, const QString& title, QWidget* owner)
@@ -89,6 +102,7 @@ void SunStudyForm::addPlace(const KM_3dmAnimationProperties& record) {
                          44049)},
               *m_place.north_angle);
     m_place.show(record);
+    addClocks(section, record);
     check(*m_place.latitude, [this] { return m_place.latitudeFault(); });
     check(*m_place.longitude, [this] { return m_place.longitudeFault(); });
     check(*m_place.north_angle, [this] { return m_place.northAngleFault(); });
@@ -101,24 +115,56 @@ void SunStudyForm::addChooser(QFormLayout& section) {
     button->setAutoDefault(false);
     connect(button, &QPushButton::clicked, this, [this] { m_place.choose(); });
     addBeneath(section, *button);
+    m_place.city = new QLabel(this);
+    m_place.city->setObjectName(QString::fromLatin1("city"));
+    m_place.city->setTextFormat(Qt::PlainText);
+    addBeneath(section, *m_place.city);
     addToTabOrder(*button);
+}
+
+void SunStudyForm::addClocks(QFormLayout& section, const KM_3dmAnimationProperties& record) {
+    QnSunStudyPlace kept = QnPlaceOfSunStudy(record);
+    const QString own = toQt(kept.clocks);
+    kept.clocks = {};
+    m_place.has_own_clocks = !own.isEmpty() && own != toQt(QnClocksOfSunStudy(kept));
+    m_place.clocks = new QLineEdit(own, this);
+    addField(section,
+             {"clocks", localText(L"Cloc&ks there:", 44123),
+              localText(L"Whose time the clocks on the walls show: Europe/Berlin, +05:30 or solar; "
+                        L"empty: that of the nearest city",
+                        44124)},
+             *m_place.clocks);
+    check(*m_place.clocks, [this] { return m_place.clocksFault(); });
+    connect(m_place.clocks, &QLineEdit::textEdited, this, [this](const QString& text) {
+        m_place.has_own_clocks = !text.trimmed().isEmpty();
+        review();
+    });
 }
 
 QFormLayout& SunStudyForm::addTimes() {
     QFormLayout& section = addSection(localText(L"Time", 44009));
     section.addRow(m_place.zone);
+    m_local_times = new QLabel(this);
+    m_local_times->setObjectName(QString::fromLatin1("localTimes"));
+    m_local_times->setTextFormat(Qt::PlainText);
+    m_local_times->setWordWrap(true);
+    m_local_times->setMinimumHeight(2 * m_local_times->fontMetrics().lineSpacing() + 2);
     return section;
 }
 
 QDateEdit& SunStudyForm::addDate(QFormLayout& section, const Caption& caption, int year, int month,
-                                 int day) {
+                                 int day, bool is_offered) {
     auto* field = new QDateEdit(this);
     field->setDisplayFormat(QString::fromLatin1("yyyy-MM-dd"));
     field->setCalendarPopup(true);
     field->setDateRange(QDate(100, 1, 1), QDate(9999, 12, 31));
     field->setDate(nearestDate(year, month, day));
     addField(section, caption, *field);
-    connect(field, &QDateEdit::dateChanged, this, [this] { review(); });
+    connect(field, &QDateEdit::dateChanged, this, [this, is_offered] {
+        if (is_offered)
+            changedByPerson();
+        review();
+    });
     return *field;
 }
 
@@ -127,7 +173,10 @@ QTimeEdit& SunStudyForm::addTime(QFormLayout& section, const Caption& caption, i
     auto* field = new QTimeEdit(nearestTime(hour, minute), this);
     field->setDisplayFormat(QString::fromLatin1("HH:mm"));
     addField(section, caption, *field);
-    connect(field, &QTimeEdit::timeChanged, this, [this] { review(); });
+    connect(field, &QTimeEdit::timeChanged, this, [this] {
+        changedByPerson();
+        review();
+    });
     return *field;
 }
 
@@ -136,11 +185,14 @@ void SunStudyForm::addStep(QFormLayout& section, const Caption& caption, int ste
     m_step = new CountField(0, longest, this);
     m_step->setValue(magnitude(step));
     addCount(section, caption, *m_step);
+    section.addRow(m_local_times);
     check(*m_step, [this, fault] { return m_step->count().value_or(-1) < 0 ? fault : QString(); });
 }
 
 void SunStudyForm::finishWith(const IZoetrixDataUI& lists,
                               const KM_3dmAnimationProperties& record) {
+    beginColumn();
+    m_offers_times = hasFirstTimes(record);
     m_recording = addRecording(lists, record, BadCharacters::refused);
     finish([this] { return outcome(); });
 }
@@ -152,8 +204,41 @@ int SunStudyForm::step() const {
 }
 
 void SunStudyForm::review() {
+    if (!m_local_times || m_is_offering)
+        return;
     m_place.tellZone();
+    m_place.followPlace();
+    offerTimes();
+    tellLocalTimes();
     Form::review();
+}
+
+void SunStudyForm::changedByPerson() {
+    if (!m_is_offering)
+        m_offers_times = false;
+}
+
+void SunStudyForm::offerTimes() {
+    const std::optional<QnSunStudyPlace> here = place();
+    if (!m_offers_times || !here)
+        return;
+    KM_3dmAnimationProperties times;
+    takeStart(span().start, times);
+    takeEnd(span().end, times);
+    takeStep(times);
+    offer(*here, times);
+    m_is_offering = true;
+    showTimes(times);
+    m_is_offering = false;
+}
+
+void SunStudyForm::tellLocalTimes() {
+    const std::optional<QnSunStudyPlace> here = place();
+    KM_3dmAnimationProperties times;
+    takeStart(span().start, times);
+    takeEnd(span().end, times);
+    m_local_times->setText(here ? toQt(QnLocalTimesOfSunStudy(*here, times, isOneDay()))
+                                : QString());
 }
 
 Outcome SunStudyForm::outcome() const {
