@@ -10,10 +10,9 @@ namespace quarn::desktop {
 namespace {
 
 QStringList datesOf(CQuarnDoc& document) {
-    KM_3dmAnimationProperties record = document.Properties().AnimationProperties();
     QStringList dates;
-    for (int i = 0; i < record.Dates().Count(); ++i)
-        dates.append(qtText(record.Dates()[i]));
+    for (const KM_wString& time : frameTimes(document))
+        dates.append(qtText(time));
     return dates;
 }
 

@@ -4,6 +4,7 @@
 #include "sdk/qncore/QnExport.h"
 
 #include <filesystem>
+#include <vector>
 
 class CQuarnDoc;
 
@@ -26,5 +27,10 @@ struct AnimationState {
 /// The animation of a document as it is now. Neither points nor file names are copied, so it may be
 /// asked for at every frame. While no plug-in keeps an animation there is none.
 QNCORE_API AnimationState animationState(CQuarnDoc& document);
+
+/// When each frame of a sun study is, by the clocks of the place that the document names:
+/// "2026-06-21 14:30 CEST"; as the record labels it where it names none. Empty for every other
+/// animation.
+QNCORE_API std::vector<KM_wString> frameTimes(CQuarnDoc& document);
 
 } // namespace quarn

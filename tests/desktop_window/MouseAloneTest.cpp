@@ -146,7 +146,7 @@ TEST(MouseAlone, ADayOfSunAtAPlaceOfTheMapIsSetUpPlayedAndRecorded) {
 
     // On the hour, while the sun is up: from seven to eight in the evening by the clocks there.
     play(desk, 13);
-    EXPECT_TRUE(desk.widget("frameDate").text.contains("18:00"));
+    EXPECT_TRUE(desk.widget("frameDate").text.contains("20:00 EEST"));
     record(desk);
     expectRecording(desk.documents() / "Animation", "jpg", 14, toldFrameSize(desk));
     const QImage morning = frame(desk, 0);
