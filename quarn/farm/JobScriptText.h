@@ -52,6 +52,7 @@ copy_whole() {
 
 child=
 stop_asked=
+must_ask_child=
 # Slurm sends SIGTERM to all processes of a job that is cancelled or preempted, but to this script
 # alone before its time is up. quarn ends between two frames; a second SIGTERM would end it at once.
 on_term() {
@@ -61,9 +62,18 @@ on_term() {
     COMPLETING | CANCELLED | PREEMPTED) tell "$JOB was asked to stop" ;;
     *)
         tell "$JOB nears the end of its time"
-        [ -z "$child" ] || kill -TERM "$child"
+        must_ask_child=yes
+        ask_child
         ;;
     esac
+}
+
+# The signal may come before the program that it is for has started.
+ask_child() {
+    if [ -n "$child" ] && [ -n "$must_ask_child" ]; then
+        must_ask_child=
+        kill -TERM "$child"
+    fi
 }
 
 run_quarn() {
@@ -71,6 +81,7 @@ run_quarn() {
     [ -z "$stop_asked" ] || return 143
     "$QUARN" "$@" </dev/null &
     child=$!
+    ask_child
     wait "$child"
     status=$?
     while kill -0 "$child" 2>/dev/null; do # a signal ended the wait
