@@ -18,8 +18,8 @@ Image sheetOf(const Image& map, const SunHoursRequest& request, const SunMoments
 /// "Hours of sun · pavilion"
 std::string titleOf(const SunHoursRequest& request, const SheetWords& words);
 
-/// "Athens, Greece · 21 Mar 2026 (EET) · at most 12 h of sun": what a person needs to read the numbers
-/// right.
+/// "Athens, Greece · 21 Mar 2026 (EET) · at most 12 h of sun": what a person needs to read the
+/// numbers right.
 std::string subtitleOf(const SunHoursRequest& request, const SunMoments& moments,
                        const SheetWords& words);
 
