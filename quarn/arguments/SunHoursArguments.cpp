@@ -3,6 +3,7 @@
 #include "quarn/arguments/Readings.h"
 #include "quarn/arguments/RecordingArguments.h"
 #include "quarn/arguments/SiteArguments.h"
+#include "quarn/arguments/StudyViewArguments.h"
 #include "quarn/arguments/Subcommands.h"
 #include "quarn/runs/SunHoursRun.h"
 #include "quarn/words/AnimationName.h"
@@ -74,10 +75,8 @@ std::optional<std::string> settleView(TypedHours& typed) {
     hours.width_px = typed.size.width_px;
     hours.height_px = typed.size.height_px;
     hours.is_plan = view.name && lowerCase(*view.name) == PLAN;
-    if (view.name && view.aims())
-        return "--view takes the place of --azimuth, --elevation and --target.";
-    if (view.lens_mm && (view.isParallel() || hours.is_plan))
-        return "--lens is for perspective views; --view " + *view.name + " has none.";
+    if (auto mistake = whyViewIsRefused(view, view.isParallel() || hours.is_plan))
+        return mistake;
     if (hours.is_plan && view.distance_factor)
         return "--distance does not go with --view plan, which fits the model.";
     if (!typed.wish.up_axis.empty() && isDocument(typed.wish.model))
@@ -112,20 +111,10 @@ void addTimes(const OptionAdder& add, TypedHours& typed) {
 }
 
 void addView(const OptionAdder& add, TypedHours& typed) {
-    StudyView& view = typed.wish.view;
-    add("--view", view.name, "NAME", scriptWord("the name of --view"),
-        "plan (straight from above, with a north arrow), Top, Front, Right, Perspective or a "
-        "camera of the model, in place of the next options");
-    add("--azimuth", view.azimuth_deg, "DEG", numberFrom(-360, 360, "degrees"),
-        "Where the camera stands, clockwise from the Y axis (default: 150, in front and to the "
-        "right)");
-    add("--elevation", view.elevation_deg, "DEG", numberFrom(0, 89, "degrees"),
-        "Angle of the camera above the model, 0 to 89 (default: 30)");
-    add("--target", view.target, "X,Y,Z", point(),
-        "Point to look at (default: the model's middle)");
-    add("--distance", view.distance_factor, "FACTOR", numberFrom(0.01, 1000),
-        "Distance of the camera, 1 where the model just fits into the picture (default: 1.1)");
-    addLens(add, view.lens_mm, "(default: 50; a document's own)");
+    addStudyView(
+        add, typed.wish.view,
+        "plan (straight from above, with a north arrow), Top, Front, Right, Perspective or "
+        "a camera of the model");
     add("--size", typed.size, "WxH", sizeOfPicture(),
         "Size of the picture in pixels, without its title and legend", "1280x720");
 }

@@ -3,6 +3,7 @@
 #include "quarn/arguments/Readings.h"
 #include "quarn/arguments/RecordingArguments.h"
 #include "quarn/arguments/SiteArguments.h"
+#include "quarn/arguments/StudyViewArguments.h"
 #include "quarn/arguments/Subcommands.h"
 #include "quarn/reports/PlaceList.h"
 #include "quarn/scripts/SunStudyScript.h"
@@ -22,29 +23,6 @@ struct TypedStudy {
     std::chrono::minutes time{}; ///< of a season: since midnight
     ScriptUse use;
 };
-
-void addViewOptions(const OptionAdder& add, StudyView& view) {
-    add("--view", view.name, "NAME", scriptWord("the name of --view"),
-        "Top, Front, Right, Perspective or a camera of the model, in place of the next options");
-    add("--azimuth", view.azimuth_deg, "DEG", numberFrom(-360, 360, "degrees"),
-        "Where the camera stands, clockwise from the Y axis (default: 150, in front and to the "
-        "right)");
-    add("--elevation", view.elevation_deg, "DEG", numberFrom(0, 89, "degrees"),
-        "Angle of the camera above the model, 0 to 89 (default: 30)");
-    add("--target", view.target, "X,Y,Z", point(),
-        "Point to look at (default: the model's middle)");
-    add("--distance", view.distance_factor, "FACTOR", numberFrom(0.01, 1000),
-        "Distance of the camera, 1 where the model just fits into the picture (default: 1.1)");
-    addLens(add, view.lens_mm, "(default: 50; a document's own)");
-}
-
-std::optional<std::string> checkView(const StudyView& view) {
-    if (view.name && view.aims())
-        return "--view takes the place of --azimuth, --elevation and --target.";
-    if (view.lens_mm && view.isParallel())
-        return "--lens is for perspective views; --view " + *view.name + " has none.";
-    return std::nullopt;
-}
 
 std::optional<std::chrono::year_month_day> dateOf(const std::optional<WantedDay>& day,
                                                   const Zone& zone) {
@@ -75,7 +53,7 @@ Outcome recordStudy(TypedStudy& typed) {
     SunStudyRequest& request = typed.request;
     std::optional<std::string> mistake = settle(request.recording);
     if (!mistake)
-        mistake = checkView(request.view);
+        mistake = whyViewIsRefused(request.view, request.view.isParallel());
     if (!mistake)
         mistake = settleCourse(typed);
     if (mistake)
@@ -84,7 +62,8 @@ Outcome recordStudy(TypedStudy& typed) {
 }
 
 Action finish(CLI::App& command, const std::shared_ptr<TypedStudy>& typed) {
-    addViewOptions(OptionAdder(command), typed->request.view);
+    addStudyView(OptionAdder(command), typed->request.view,
+                 "Top, Front, Right, Perspective or a camera of the model");
     addRecordingOptions(command, typed->request.recording, typed->use, CaptureSubject::moving_sun);
     return [typed] { return recordStudy(*typed); };
 }
