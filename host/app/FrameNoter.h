@@ -4,6 +4,8 @@
 #include "host/recording/RecordingFollower.h"
 #include "kelmar/KM_AnimationProperties.h"
 
+#include <optional>
+
 namespace quarn {
 
 class RunningRecording;
